@@ -1,0 +1,124 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/LaunchOptionParser.h"
+
+#include "app/XmlNesting.h"
+#include "common/xml/TorkXmlDepth.h"
+
+#include <QByteArray>
+#include <QFile>
+#include <QTextStream>
+
+#include <rapidxml.hpp>
+
+#include <cstring>
+#include <exception>
+#include <memory>
+
+namespace {
+
+using XmlAttribute = rapidxml::xml_attribute<char>;
+using XmlNode = rapidxml::xml_node<char>;
+
+template <class XmlItem>
+QString Name(XmlItem const& item)
+{
+    return QString::fromLocal8Bit(item.name(), static_cast<int>(item.name_size()));
+}
+
+// By its size: a character reference may have put a zero byte into the value.
+template <class XmlItem>
+QString Value(XmlItem const& item)
+{
+    return QString::fromLocal8Bit(item.value(), static_cast<int>(item.value_size()));
+}
+
+bool IsKey(XmlAttribute const* attribute)
+{
+    constexpr char key[] = "key";
+    const size_t length = sizeof(key) - 1;
+    return attribute && attribute->name_size() == length &&
+           std::memcmp(attribute->name(), key, length) == 0;
+}
+
+bool Apply(LaunchOptionParser& parser, XmlNode const& node)
+{
+    XmlAttribute const* attribute = node.first_attribute();
+    if (!IsKey(attribute))
+        return true;
+
+    LaunchOption* option = parser.FindOption(Value(*attribute));
+    if (!option) {
+        // Reading goes on all the same, whatever the message says.
+        parser.errorText +=
+            QStringLiteral("Unknown %1 = %2. Value: %3 failed to set. - Parsing terminated.")
+                .arg(Name(*attribute), Value(*attribute), Value(node));
+        return false;
+    }
+    option->value = Value(node);
+    option->isSet = true;
+    return true;
+}
+
+// Only the first node is chosen by its name: what follows it is visited whatever it is called.
+bool ApplyAll(LaunchOptionParser& parser, rapidxml::xml_document<char> const& document)
+{
+    bool allKnown = true;
+    for (XmlNode const* node = document.first_node("arg"); node; node = node->next_sibling())
+        allKnown = Apply(parser, *node) && allKnown;
+    return allKnown;
+}
+
+} // namespace
+
+LaunchOptionParser::LaunchOptionParser() : errorText(QLatin1String("")) {}
+
+LaunchOptionParser::~LaunchOptionParser()
+{
+    while (!options.isEmpty())
+        delete options.takeFirst();
+}
+
+void LaunchOptionParser::AddOption(LaunchOption* option)
+{
+    options.append(option);
+}
+
+LaunchOption* LaunchOptionParser::FindOption(QString const& key) const
+{
+    for (LaunchOption* option : options) {
+        if (option && option->name == key)
+            return option;
+    }
+    return nullptr;
+}
+
+bool LaunchOptionParser::ReadDataFile(QString const& path)
+{
+    if (!QFile::exists(path))
+        return false;
+
+    QFile file(path);
+    if (!file.open(QIODevice::ReadOnly | QIODevice::Text))
+        return false;
+
+    QString content = QTextStream(&file).readAll();
+    return content.isEmpty() || ParseOptions(content);
+}
+
+bool LaunchOptionParser::ParseOptions(QString& text)
+{
+    QByteArray xml = text.toLocal8Bit();
+    if (NestedDeeperThan(xml.constData(), TorkXmlMaximumDepth))
+        return false;
+
+    try {
+        // On the heap: the document brings a memory pool of some 64 KiB with it.
+        const auto document = std::make_unique<rapidxml::xml_document<char>>();
+        document->parse<rapidxml::parse_default>(xml.data());
+        return ApplyAll(*this, *document);
+    } catch (std::exception const&) {
+        return false;
+    }
+}

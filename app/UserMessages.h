@@ -1,0 +1,37 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include <QString>
+
+class QWidget;
+
+/// \file
+/// Message boxes that also log.
+///
+/// Each of the three functions shows `text` in a modal box with an OK button, titled with the
+/// application object's property "caption", and then issues the same text on one line as a toolkit
+/// message of its level, which the log records. The log line is thus written after the user has
+/// closed the box. GUI thread only.
+///
+///     CriticalMessage(window, "The index is damaged.\nIt will be rebuilt.", true);
+
+/// Tells of a failure; logged as critical.
+///
+/// @param parent  the window that the box belongs to; may be null
+/// @param text  shown as it stands; logged with line feeds and tabs as blanks
+/// @param show  false: only logs
+void CriticalMessage(QWidget* parent, QString const& text, bool show);
+
+/// Tells of a problem; logged as warning. Parameters as for CriticalMessage().
+void WarningMessage(QWidget* parent, QString const& text, bool show);
+
+/// Tells of something worth knowing; logged as debug. Parameters as for CriticalMessage().
+void DebugMessage(QWidget* parent, QString const& text, bool show);
+
+/// Replaces every line feed and every tab in `text` by one blank, and returns it.
+QString& StripFormatting(QString& text);
+
+/// Words an error for people: here `out` becomes `error` unchanged. Returns `out`.
+QString& FormatError(QString const& error, QString& out);

@@ -1,0 +1,53 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/AppPaths.h"
+#include "app/QuitOnSignal.h"
+#include "app/window/MainWindow.h"
+#include "common/log/TorkLog.h"
+
+#include <QApplication>
+#include <QDebug>
+#include <QMessageLogger>
+
+#include <cstdio>
+
+namespace {
+
+QString Caption()
+{
+    const QString product = QCoreApplication::applicationName();
+    return product.isEmpty() ? QStringLiteral("Velocor") : product;
+}
+
+// Started without a screen, the program can tell where its log is only on the terminal.
+void TellLogFileWithoutScreen()
+{
+    const QString platform = QGuiApplication::platformName();
+    if (platform != QLatin1String("offscreen") && platform != QLatin1String("minimal"))
+        return;
+
+    const QByteArray logFile = TorkLog::logger()->newLogFileName().toLocal8Bit();
+    std::printf("Log file: %s\n", logFile.constData());
+    std::fflush(stdout);
+}
+
+} // namespace
+
+// The order matters: the log's directory follows from the names, and message boxes from the
+// caption.
+int main(int argc, char** argv)
+{
+    QApplication application(argc, argv);
+    AppPaths::SetOrganizationAndProduct();
+    TorkLog::initialize(QStringLiteral("velocor"));
+    application.setProperty("caption", Caption());
+
+    QuitOnSignal quitOnSignal;
+    MainWindow window;
+    window.show();
+    TellLogFileWithoutScreen();
+
+    QMessageLogger().debug() << "app.exec() starting";
+    return QApplication::exec();
+}

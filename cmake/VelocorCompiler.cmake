@@ -1,0 +1,29 @@
+# SPDX-FileCopyrightText: The Velocor authors
+# SPDX-License-Identifier: MIT
+
+# velocor_build: the flags of this project's own targets, never passed on to who links them.
+
+add_library(velocor_build INTERFACE)
+
+if(CMAKE_CXX_COMPILER_ID MATCHES "GNU|Clang")
+    target_compile_options(velocor_build INTERFACE
+        -Wall -Wextra -Wpedantic -Wshadow -Wnon-virtual-dtor -Woverloaded-virtual)
+    if(VELOCOR_WERROR)
+        target_compile_options(velocor_build INTERFACE -Werror)
+    endif()
+endif()
+
+# Only what Qt 5.9 already offered is used, so what later versions deprecate stays quiet.
+target_compile_definitions(velocor_build INTERFACE
+    QT_DEPRECATED_WARNINGS_SINCE=0x050900
+    QT_NO_CAST_TO_ASCII
+    QT_NO_FOREACH)
+
+# Sanitizers concern every object of a program, so they are the one setting that is not a target's.
+if(VELOCOR_SANITIZE)
+    add_compile_options(-fsanitize=${VELOCOR_SANITIZE} -fno-omit-frame-pointer)
+    add_link_options(-fsanitize=${VELOCOR_SANITIZE})
+    if(VELOCOR_SANITIZE MATCHES "undefined")
+        add_compile_options(-fno-sanitize-recover=undefined)
+    endif()
+endif()

@@ -1,0 +1,324 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "common/config/TorkConfigFile.h"
+
+#include "common/config/TorkConfigFileDocHandler.h"
+#include "common/log/TorkLog.h"
+#include "common/xml/TorkErrorHandler.h"
+#include "common/xml/TorkXmlDepth.h"
+
+#include <QFile>
+#include <QObject>
+#include <QXmlInputSource>
+#include <QXmlSimpleReader>
+
+namespace {
+
+void TraceToLog(QString const& message)
+{
+    if (TorkLog* log = TorkLog::m_gLog)
+        log->trace(message);
+}
+
+QString WithoutSpaces(QString const& name)
+{
+    if (!name.contains(QLatin1Char(' ')))
+        return name;
+
+    QString cleaned = name;
+    return cleaned.remove(QLatin1Char(' '));
+}
+
+bool HoldsMarkup(QString const& text)
+{
+    for (char markup : {'&', '\'', '<', '>', '"'}) {
+        if (text.contains(QLatin1Char(markup)))
+            return true;
+    }
+    return false;
+}
+
+// Filled one after another, as ever: a key or value that holds a placeholder of its own comes out
+// changed, and files that hold such lines exist. Without a '%' joining gives the same text.
+QString ItemLine(QString const& key, QString const& value)
+{
+    if (key.contains(QLatin1Char('%')) || value.contains(QLatin1Char('%')))
+        return QStringLiteral("<%1>%2</%3>\n").arg(key).arg(value).arg(key);
+
+    return QLatin1Char('<') + key + QLatin1Char('>') + value + QLatin1String("</") + key +
+           QLatin1String(">\n");
+}
+
+QByteArray StartTag(QString const& name)
+{
+    return '<' + name.toLatin1() + ">\n";
+}
+
+QByteArray EndTag(QString const& name)
+{
+    return "</" + name.toLatin1() + ">\n";
+}
+
+// Ends the parse of a document that is nested too deep for the reader's stack.
+class DepthLimitedDocHandler : public TorkConfigFileDocHandler
+{
+public:
+    using TorkConfigFileDocHandler::TorkConfigFileDocHandler;
+
+    bool startElement(QString const& namespaceURI, QString const& localName, QString const& qName,
+                      QXmlAttributes const& attributes) override
+    {
+        return depth() < TorkXmlMaximumDepth &&
+               TorkConfigFileDocHandler::startElement(namespaceURI, localName, qName, attributes);
+    }
+};
+
+} // namespace
+
+TorkConfigFile::TorkConfigFile(QString const& fileName)
+    : TorkConfigFile(fileName, QStringLiteral("VelocorSettings"))
+{}
+
+TorkConfigFile::TorkConfigFile(QString const& fileName, QString const& rootElementName)
+    : m_fileName(fileName), m_rootElementName(rootElementName), m_currentElement(QLatin1String("")),
+      m_lastError(QLatin1String("")), m_screensSectionName(QStringLiteral("ApplicationScreens"))
+{}
+
+TorkConfigFile::~TorkConfigFile()
+{
+    Clear();
+}
+
+void TorkConfigFile::SetFileName(QString const& fileName)
+{
+    m_fileName = fileName;
+}
+
+void TorkConfigFile::Clear()
+{
+    for (auto const& entry : m_sections)
+        delete entry.value;
+    m_sections.clear();
+    m_replacedSections.clear();
+    m_currentSection = nullptr;
+}
+
+bool TorkConfigFile::Load()
+{
+    TraceToLog(QObject::tr("Loading configuration from %1").arg(m_fileName));
+
+    if (m_fileName.length() < 1) {
+        fail(QObject::tr("ConfigFile - Load failed - No file name specified."));
+        return false;
+    }
+    if (!QFile::exists(m_fileName)) {
+        fail(QObject::tr("ConfigFile - File not found."));
+        return false;
+    }
+
+    m_lastError = QLatin1String("");
+    Clear();
+    const bool parsed = parse();
+    if (!parsed)
+        fail(QObject::tr("ConfigFile - Could not parse the input file."));
+    return parsed;
+}
+
+bool TorkConfigFile::parse()
+{
+    m_atRoot = false;
+    m_expectingValue = false;
+    m_currentElement = QLatin1String("");
+
+    DepthLimitedDocHandler contentHandler(this);
+    TorkErrorHandler errorHandler(TorkLog::m_gLog);
+    QFile file(m_fileName);
+    QXmlInputSource source(&file);
+    QXmlSimpleReader reader;
+    reader.setContentHandler(&contentHandler);
+    reader.setErrorHandler(&errorHandler);
+
+    m_activeHandler = &contentHandler;
+    const bool parsed = reader.parse(source);
+    m_activeHandler = nullptr;
+    return parsed;
+}
+
+void TorkConfigFile::fail(QString const& message)
+{
+    m_lastError = message;
+    TraceToLog(message);
+}
+
+bool TorkConfigFile::Save()
+{
+    // Two characters here but one in Load(): existing callers rely on both.
+    if (m_fileName.length() < 2)
+        return true;
+
+    // Worded before the file is emptied, so that as little as possible can come between.
+    const QByteArray xml = toXml();
+    QFile file(m_fileName);
+    if (!file.open(QIODevice::WriteOnly)) {
+        m_lastError = QStringLiteral("Unable to open file: %1").arg(m_fileName);
+        return true;
+    }
+    file.write(xml);
+    file.close();
+    return true;
+}
+
+QByteArray TorkConfigFile::toXml()
+{
+    QByteArray xml = StartTag(m_rootElementName);
+    QString filtered;
+    for (auto const& section : m_sections) {
+        xml += StartTag(section.value->name());
+        for (auto const& item : section.value->values()) {
+            QString value = item.value;
+            FilterContent(value, filtered);
+            xml += ItemLine(item.key, filtered).toLatin1();
+        }
+        xml += EndTag(section.value->name());
+    }
+    return xml + EndTag(m_rootElementName);
+}
+
+bool TorkConfigFile::HasSection(QString const& name)
+{
+    return lookUp(name) != nullptr;
+}
+
+bool TorkConfigFile::HasSection(QString& name)
+{
+    return lookUp(name) != nullptr;
+}
+
+TorkConfigFileSection* TorkConfigFile::FindSection(QString const& name)
+{
+    return lookUp(name);
+}
+
+TorkConfigFileSection* TorkConfigFile::FindSection(QString& name)
+{
+    return lookUp(name);
+}
+
+TorkConfigFileSection* TorkConfigFile::lookUp(QString const& name)
+{
+    TorkConfigFileSection** found = m_sections.find(name);
+    if (!found)
+        return nullptr;
+
+    m_currentSection = *found;
+    return *found;
+}
+
+bool TorkConfigFile::AppendSection(TorkConfigFileSection* section)
+{
+    if (!section)
+        return true;
+
+    TorkConfigFileSection** replaced = m_sections.find(section->name());
+    if (replaced && *replaced == m_currentSection)
+        m_currentSection = section; // the replaced one may be deleted by whoever holds it
+    m_sections.insert(section->name(), section);
+    return true;
+}
+
+TorkConfigFileSection* TorkConfigFile::createSection(QString const& name)
+{
+    auto* section = new TorkConfigFileSection(name.toLatin1().constData());
+    TorkConfigFileSection** replaced = m_sections.find(section->name());
+    if (replaced)
+        m_replacedSections.emplace_back(*replaced);
+    AppendSection(section);
+    return section;
+}
+
+void TorkConfigFile::ClearSection(QString const& name)
+{
+    if (TorkConfigFileSection* section = lookUp(name))
+        section->Clear();
+}
+
+QStringList TorkConfigFile::keyList(QString const& section)
+{
+    TorkConfigFileSection* found = lookUp(section);
+    return found ? found->keyList() : QStringList();
+}
+
+QString const* TorkConfigFile::findValue(QString const& section, QString const& key)
+{
+    TorkConfigFileSection* found = lookUp(WithoutSpaces(section));
+    return found ? found->values().find(WithoutSpaces(key)) : nullptr;
+}
+
+bool TorkConfigFile::ReadItem(QString const& section, QString const& key, QString& defaultValue,
+                              QString& value)
+{
+    if (QString const* stored = findValue(section, key)) {
+        value = *stored;
+        return true;
+    }
+    value = defaultValue.isEmpty() ? QString(QLatin1String("")) : defaultValue;
+    return false;
+}
+
+bool TorkConfigFile::WriteItem(QString const& section, QString const& key, QString const& value)
+{
+    if (key.isNull() || value.isNull())
+        return false;
+
+    const QString sectionName = WithoutSpaces(section);
+    TorkConfigFileSection* target = lookUp(sectionName);
+    if (!target)
+        target = createSection(sectionName);
+    return target->AddValue(WithoutSpaces(key), value);
+}
+
+void TorkConfigFile::StartElement(QString& name)
+{
+    m_currentElement = name;
+
+    // White space inside a new section is no value, even where the item before had no text.
+    const int depth = m_activeHandler ? m_activeHandler->depth() : 0;
+    if (depth == 1 || depth == 2)
+        m_expectingValue = false;
+
+    m_atRoot = name == m_rootElementName;
+    if (m_atRoot)
+        return;
+
+    if (depth == 2 && !lookUp(name))
+        m_currentSection = createSection(name);
+    else if (depth == 3)
+        m_expectingValue = true;
+    // Deeper elements leave the flag: one inside an item without text is stored as if it were the
+    // item.
+}
+
+void TorkConfigFile::EndElement(QString&)
+{
+    m_currentElement = QLatin1String("");
+}
+
+bool TorkConfigFile::ProcessContent(QString& content)
+{
+    if (m_atRoot || !m_expectingValue)
+        return true;
+
+    m_expectingValue = false;
+    if (m_currentSection)
+        WriteItem(m_currentSection->name(), m_currentElement, content);
+    return true;
+}
+
+void TorkConfigFile::FilterContent(QString& in, QString& out)
+{
+    if (HoldsMarkup(in))
+        out = QLatin1String("<![CDATA[") + in + QLatin1String("]]>");
+    else
+        out = in;
+}

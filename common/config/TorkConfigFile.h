@@ -1,0 +1,241 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include "common/config/TorkConfigFileSection.h"
+#include "common/config/TorkOrderedHash.h"
+
+#include <QString>
+#include <QStringList>
+
+#include <memory>
+#include <vector>
+
+class QColor;
+class QFont;
+class QPoint;
+class QSize;
+class TorkConfigFileDocHandler;
+
+/// The settings of one component: named sections of key/value texts in one small XML file.
+///
+/// Only Load() and Save() touch the disk; everything else works on the sections in memory.
+/// The file has three levels: a root element, one element per section, one element per key with
+/// the value as its text. File format: docs/config-file.md.
+///
+/// In every operation that takes a section and a key, all space characters are removed from both
+/// before use ("Main Window" and "MainWindow" are the same section); lookups are then exact and
+/// case-sensitive. No reader ever stores a default: a missing key stays missing until it is
+/// written. A successful section lookup makes that section the current one.
+///
+/// One thread at a time. No operation throws.
+///
+///     TorkConfigFile settings(dataPath + "viewer.cfg");
+///     settings.Load(); // no file yet: the defaults below hold
+///     int columns = 0;
+///     settings.ReadInt("Main Window", "columns", 3, columns);
+///     settings.WriteItem("Main Window", "columns", columns + 1);
+///     settings.Save();
+///     if (!settings.m_lastError.isEmpty())
+///         WarningMessage(window, settings.m_lastError, true);
+class TorkConfigFile
+{
+public:
+    /// Settings under the root element name "VelocorSettings". Does not touch the disk.
+    ///
+    /// @param fileName  path of the XML file
+    explicit TorkConfigFile(QString const& fileName);
+
+    /// Settings under a root element name of the caller's choice. Does not touch the disk.
+    TorkConfigFile(QString const& fileName, QString const& rootElementName);
+
+    /// Deletes all sections. Saves nothing.
+    virtual ~TorkConfigFile();
+
+    TorkConfigFile(TorkConfigFile const&) = delete;
+    TorkConfigFile& operator=(TorkConfigFile const&) = delete;
+
+    /// Replaces the path of the file; sections and everything else stay.
+    void SetFileName(QString const& fileName);
+
+    /// Deletes every section. Pointers to sections that were handed out are invalid afterwards.
+    void Clear();
+
+    /// Reads the file, replacing all sections.
+    ///
+    /// Progress and failures are traced to the log when there is one. The text of a failure is
+    /// left in m_lastError, and the XML reader's own message goes to the log as a critical entry.
+    ///
+    /// @return false if the file name is empty or no such file exists (sections untouched), or if
+    ///         the file does not parse (what preceded the error is kept, earlier sections are gone)
+    bool Load();
+
+    /// Writes all sections, replacing the file.
+    ///
+    /// Each line is converted to Latin-1, with "?" for what Latin-1 lacks. Nothing is written for a
+    /// file name shorter than two characters.
+    ///
+    /// @return always true, for historical callers; whether the file could be opened shows only in
+    ///         m_lastError, which a successful Save() leaves as it was
+    bool Save();
+
+    /// Whether a section of exactly that name exists; `name` is used as it stands, blanks included.
+    bool HasSection(QString const& name);
+    bool HasSection(QString& name);
+
+    /// The section of exactly that name, still owned by the file; null if there is none.
+    TorkConfigFileSection* FindSection(QString const& name);
+    TorkConfigFileSection* FindSection(QString& name);
+
+    /// Adds a section under its own name and takes ownership of it.
+    ///
+    /// A section that already had the name leaves the file without being deleted: it belongs to
+    /// whoever holds it from then on.
+    ///
+    /// @return always true
+    bool AppendSection(TorkConfigFileSection* section);
+
+    /// Removes all values of a section, which stays under its name; nothing if it does not exist.
+    void ClearSection(QString const& name);
+
+    /// The keys of a section in no promised order; empty if the section does not exist.
+    QStringList keyList(QString const& section);
+
+    /// Reads a text.
+    ///
+    /// @param value  the stored text; on failure `defaultValue`, or an empty text where that is
+    ///               empty. May be the same object as `defaultValue`.
+    /// @return whether section and key exist
+    bool ReadItem(QString const& section, QString const& key, QString& defaultValue,
+                  QString& value);
+
+    /// Stores a text, making the section if need be. Nothing reaches the disk before Save().
+    ///
+    /// A new section takes its name from the Latin-1 bytes of `section` read as UTF-8, so only
+    /// ASCII names are found again under the name they were written with.
+    ///
+    /// @return false, with nothing stored, if `key` or `value` is a null text
+    bool WriteItem(QString const& section, QString const& key, QString const& value);
+
+    /// Stores a number in decimal. Result as for texts.
+    bool WriteItem(QString const& section, QString const& key, int value);
+    bool WriteItem(QString const& section, QString const& key, unsigned int value);
+
+    /// Reads a signed number in decimal.
+    ///
+    /// @param value  the number; `defaultValue` on failure
+    /// @return false if the key is missing or its text is no number in the int range
+    bool ReadInt(QString const& section, QString const& key, int defaultValue, int& value);
+
+    /// Reads an unsigned number, converted as a signed one: the format's rule.
+    ///
+    /// A stored negative number arrives wrapped into the unsigned range, and one above 2147483647
+    /// fails, as does a missing key with such a default.
+    ///
+    /// @param value  the number, or `defaultValue` if the key is missing; untouched on failure
+    /// @return true if the conversion succeeded, also for a missing key
+    bool ReadUint(QString const& section, QString const& key, unsigned int defaultValue,
+                  unsigned int& value);
+
+    /// Stores "yes" or "no".
+    bool WriteBool(QString const& section, QString const& key, bool value);
+
+    /// Reads a truth value: "1", "y", "yes", "t" and "true" in any letter case mean true, every
+    /// other text means false.
+    ///
+    /// @param value  the truth value; `defaultValue` if the key is missing
+    /// @return whether the key is present
+    bool ReadBool(QString const& section, QString const& key, bool defaultValue, bool& value);
+
+    /// Stores a colour as "red,green,blue" in decimal, 0 to 255; alpha is not stored.
+    bool WriteColor(QString const& section, QString const& key, QColor& colour);
+
+    /// Reads an opaque colour, stored as "red,green,blue".
+    ///
+    /// The text is split at commas and minus signs; a field that is no number counts as 0.
+    ///
+    /// @param colour  set on success only; numbers outside 0 to 255 make it an invalid colour
+    /// @return false if the key is missing or the text has not exactly three fields
+    bool ReadColor(QString const& section, QString const& key, QColor& colour);
+
+    /// Stores a size in pixels as "width,height" in decimal.
+    bool WriteSize(QString const& section, QString const& key, QSize& size);
+
+    /// Reads a size in pixels, stored as "width,height".
+    ///
+    /// The text is split at commas and minus signs; a field that is no number counts as 0.
+    ///
+    /// @param size  set on success only
+    /// @return false if the key is missing or the text has not exactly two fields
+    bool ReadSize(QString const& section, QString const& key, QSize& size);
+
+    /// Stores a font as QFont::toString() words it.
+    bool WriteFont(QString const& section, QString const& key, QFont& font);
+
+    /// Reads a font as QFont::fromString() understands it.
+    ///
+    /// @param font  untouched if the key is missing
+    /// @return whether the key is present
+    bool ReadFont(QString const& section, QString const& key, QFont& font);
+
+    /// Stores a window's rectangle as "x,y,width,height" in pixels in the screens section.
+    ///
+    /// @param name  the window's key, zero-terminated ASCII
+    bool WriteScreenMetrics(char const* name, QPoint& position, QSize& size);
+
+    /// Reads a window's rectangle and fits it to the desktop: at least 320 by 200 pixels, inside
+    /// the desktop's extent. Needs the GUI thread.
+    ///
+    /// @param position, size  (0, 0) and 0 by 0 if the key is missing or has not four fields;
+    ///                        untouched if a field is no number or there is no desktop
+    /// @return false if the key is missing, a field is no number, or there is no desktop
+    bool ReadScreenMetrics(char const* name, QPoint& position, QSize& size);
+
+    /// Load step: an element opened. Called by the document handler.
+    void StartElement(QString& name);
+
+    /// Load step: an element ended. Called by the document handler.
+    void EndElement(QString& name);
+
+    /// Load step: stores `content` as the value of the item that opened last, if it has none yet.
+    ///
+    /// @return always true
+    bool ProcessContent(QString& content);
+
+    /// Prepares a value for writing: wrapped in a CDATA section if it holds one of & ' < > ".
+    ///
+    /// Nothing else is escaped, so a value that holds "]]>" gives a file that does not parse.
+    ///
+    /// @param out  receives the prepared text; may be the same object as `in`
+    void FilterContent(QString& in, QString& out);
+
+private:
+    TorkConfigFileSection* lookUp(QString const& name);
+    TorkConfigFileSection* createSection(QString const& name);
+    QString const* findValue(QString const& section, QString const& key);
+    bool parse();
+    void fail(QString const& message);
+    QByteArray toXml();
+
+    QString m_fileName;
+    QString m_rootElementName;
+    bool m_atRoot = false;
+    bool m_expectingValue = false;
+    TorkOrderedHash<TorkConfigFileSection*> m_sections;
+    TorkConfigFileSection* m_currentSection = nullptr;
+    TorkConfigFileDocHandler* m_activeHandler = nullptr;
+    QString m_currentElement;
+
+public:
+    /// What the last Load() or Save() had to complain about; emptied by a Load() that finds its
+    /// file. Read it directly.
+    QString m_lastError;
+
+private:
+    QString m_screensSectionName;
+
+    // Sections that a section of the same name pushed out of the table while loading or writing:
+    // nobody else knows them, and somebody may still hold a pointer from FindSection().
+    std::vector<std::unique_ptr<TorkConfigFileSection>> m_replacedSections;
+};

@@ -1,0 +1,195 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// The typed values of TorkConfigFile: how each type is worded, and how its text is read back.
+
+#include "common/config/TorkConfigFile.h"
+
+#include "common/config/TorkScreenFit.h"
+
+#include <QApplication>
+#include <QColor>
+#include <QDesktopWidget>
+#include <QFont>
+#include <QPoint>
+#include <QRegExp>
+#include <QSize>
+#include <QStringList>
+#include <QVector>
+
+namespace {
+
+QString Join(std::initializer_list<int> numbers)
+{
+    QStringList fields;
+    for (int number : numbers)
+        fields.append(QString::number(number));
+    return fields.join(QLatin1Char(','));
+}
+
+// '-' separates too, so no negative number comes back: the format's rule.
+QVector<int> Numbers(QString const& text)
+{
+    QVector<int> numbers;
+    const QStringList fields = text.split(QRegExp(QStringLiteral("[,\\-]")));
+    for (QString const& field : fields)
+        numbers.append(field.toInt());
+    return numbers;
+}
+
+// Asking for the desktop without a QApplication ends the program.
+QDesktopWidget* Desktop()
+{
+    const bool haveApplication = qobject_cast<QApplication*>(QCoreApplication::instance());
+    return haveApplication ? QApplication::desktop() : nullptr;
+}
+
+// Reads all fields as numbers; false at the first that is none.
+bool ToInts(QStringList const& fields, QVector<int>& numbers)
+{
+    for (QString const& field : fields) {
+        bool converted = false;
+        numbers.append(field.toInt(&converted));
+        if (!converted)
+            return false;
+    }
+    return true;
+}
+
+bool MeansTrue(QString const& text)
+{
+    const QString lower = text.toLower();
+    for (char const* yes : {"1", "y", "yes", "t", "true"}) {
+        if (lower == QLatin1String(yes))
+            return true;
+    }
+    return false;
+}
+
+} // namespace
+
+bool TorkConfigFile::WriteItem(QString const& section, QString const& key, int value)
+{
+    return WriteItem(section, key, QString::number(value));
+}
+
+bool TorkConfigFile::WriteItem(QString const& section, QString const& key, unsigned int value)
+{
+    return WriteItem(section, key, QString::number(value));
+}
+
+bool TorkConfigFile::ReadInt(QString const& section, QString const& key, int defaultValue,
+                             int& value)
+{
+    QString const* text = findValue(section, key);
+    bool converted = false;
+    const int number = text ? text->toInt(&converted) : 0;
+    value = converted ? number : defaultValue;
+    return converted;
+}
+
+bool TorkConfigFile::ReadUint(QString const& section, QString const& key, unsigned int defaultValue,
+                              unsigned int& value)
+{
+    // The default takes the same way as a stored text, through the signed conversion.
+    QString const* text = findValue(section, key);
+    bool converted = false;
+    const int number = (text ? *text : QString::number(defaultValue)).toInt(&converted);
+    if (converted)
+        value = static_cast<unsigned int>(number);
+    return converted;
+}
+
+bool TorkConfigFile::WriteBool(QString const& section, QString const& key, bool value)
+{
+    return WriteItem(section, key, value ? QStringLiteral("yes") : QStringLiteral("no"));
+}
+
+bool TorkConfigFile::ReadBool(QString const& section, QString const& key, bool defaultValue,
+                              bool& value)
+{
+    QString const* text = findValue(section, key);
+    value = text ? MeansTrue(*text) : defaultValue;
+    return text != nullptr;
+}
+
+bool TorkConfigFile::WriteColor(QString const& section, QString const& key, QColor& colour)
+{
+    return WriteItem(section, key, Join({colour.red(), colour.green(), colour.blue()}));
+}
+
+bool TorkConfigFile::ReadColor(QString const& section, QString const& key, QColor& colour)
+{
+    QString const* text = findValue(section, key);
+    if (!text)
+        return false;
+
+    const QVector<int> numbers = Numbers(*text);
+    if (numbers.size() != 3)
+        return false;
+
+    colour.setRgb(numbers[0], numbers[1], numbers[2]);
+    return true;
+}
+
+bool TorkConfigFile::WriteSize(QString const& section, QString const& key, QSize& size)
+{
+    return WriteItem(section, key, Join({size.width(), size.height()}));
+}
+
+bool TorkConfigFile::ReadSize(QString const& section, QString const& key, QSize& size)
+{
+    QString const* text = findValue(section, key);
+    if (!text)
+        return false;
+
+    const QVector<int> numbers = Numbers(*text);
+    if (numbers.size() != 2)
+        return false;
+
+    size = QSize(numbers[0], numbers[1]);
+    return true;
+}
+
+bool TorkConfigFile::WriteFont(QString const& section, QString const& key, QFont& font)
+{
+    return WriteItem(section, key, font.toString());
+}
+
+bool TorkConfigFile::ReadFont(QString const& section, QString const& key, QFont& font)
+{
+    QString const* text = findValue(section, key);
+    if (!text)
+        return false;
+
+    font.fromString(*text);
+    return true;
+}
+
+bool TorkConfigFile::WriteScreenMetrics(char const* name, QPoint& position, QSize& size)
+{
+    return WriteItem(m_screensSectionName, QString::fromLatin1(name),
+                     Join({position.x(), position.y(), size.width(), size.height()}));
+}
+
+bool TorkConfigFile::ReadScreenMetrics(char const* name, QPoint& position, QSize& size)
+{
+    QString const* text = findValue(m_screensSectionName, QString::fromLatin1(name));
+    const QStringList fields = text ? text->split(QLatin1Char(',')) : QStringList();
+    if (fields.size() != 4) {
+        position = QPoint(0, 0);
+        size = QSize(0, 0);
+        return text != nullptr;
+    }
+
+    QDesktopWidget* desktop = Desktop();
+    QVector<int> numbers;
+    if (!desktop || !ToInts(fields, numbers))
+        return false;
+
+    const TorkWindowRect fitted = TorkFitToDesktop(numbers[0], numbers[1], numbers[2], numbers[3],
+                                                   desktop->geometry().size());
+    position = fitted.position;
+    size = fitted.size;
+    return true;
+}

@@ -1,0 +1,251 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// The files of the log: names, opening, trimming and rotation.
+//
+// Rotation of app.log with a limit of 3 older files:
+//
+//     before                   after
+//     app.log     too full     app.log      opened anew
+//     app.log.1                app.log.1    was app.log
+//     app.log.2                app.log.2    was app.log.1
+//     app.log.3                app.log.3    was app.log.2
+//                              (app.log.4, was app.log.3, is removed)
+
+#include "common/log/TorkLog.h"
+
+#include "common/log/TorkLogLock.h"
+
+#include <QDir>
+#include <QMap>
+#include <QTextStream>
+
+namespace {
+
+// As the names have always been formed: an empty path counts as ending in a slash.
+bool EndsInSlash(QString const& path)
+{
+    return path.lastIndexOf(QLatin1Char('/')) == path.length() - 1;
+}
+
+QString BeforeLastDot(QString const& fileName)
+{
+    return fileName.left(fileName.lastIndexOf(QLatin1Char('.')));
+}
+
+// The number of an older file: what follows the last dot; -1 if that is no number.
+int logFileNumber(QString const& fileName)
+{
+    const int dot = fileName.lastIndexOf(QLatin1Char('.'));
+    if (dot == -1)
+        return -1;
+
+    bool converted = false;
+    const int number = fileName.mid(dot + 1).toInt(&converted);
+    return converted ? number : -1;
+}
+
+// The files in `directory` that are named `name` and a further extension, in name order.
+//
+// Compared by hand: the toolkit's name filters are wildcards that split at blanks and semicolons,
+// read brackets as character sets and ignore letter case, and would take in files of others.
+QStringList NumberedFiles(QString const& directory, QString const& name)
+{
+    const QString start = name + QLatin1Char('.');
+    const QDir::Filters filters = QDir::Files | QDir::Hidden;
+    QStringList numbered;
+    const QStringList files = QDir(directory).entryList(filters, QDir::Name);
+    for (QString const& file : files) {
+        if (file.startsWith(start))
+            numbered.append(file);
+    }
+    return numbered;
+}
+
+} // namespace
+
+QString TorkLog::currentFileName() const
+{
+    return m_fileExtension.isEmpty() ? m_filePrefix
+                                     : m_filePrefix + QLatin1Char('.') + m_fileExtension;
+}
+
+QString TorkLog::currentFilePath() const
+{
+    const QString separator = EndsInSlash(m_path) ? QString() : QStringLiteral("/");
+    return m_path + separator + currentFileName();
+}
+
+QString& TorkLog::fileSpec(bool all)
+{
+    TorkLogLock lock(m_mutex);
+    m_fileSpec = currentFileName();
+    if (all)
+        m_fileSpec += QLatin1String(".*");
+    return m_fileSpec;
+}
+
+QString& TorkLog::newLogFileName()
+{
+    TorkLogLock lock(m_mutex);
+    const QString name = currentFilePath();
+    if (m_logFileName != name) // left alone where a reader of the buffer would see no change
+        m_logFileName = name;
+    return m_logFileName;
+}
+
+bool TorkLog::open(QString const& fileName)
+{
+    TorkLogLock lock(m_mutex);
+    return openFile(fileName);
+}
+
+bool TorkLog::close()
+{
+    TorkLogLock lock(m_mutex);
+    return closeFile();
+}
+
+bool TorkLog::openFile(QString const& fileName)
+{
+    closeFile();
+    m_file.setFileName(fileName);
+    // Neither appending nor truncating: entries go over the old content from its start on.
+    const bool opened = m_file.open(QIODevice::ReadWrite | QIODevice::Text);
+    if (!opened)
+        m_errorString = m_file.errorString();
+    return opened;
+}
+
+bool TorkLog::closeFile()
+{
+    if (!m_file.isOpen())
+        return false;
+
+    m_file.flush();
+    m_file.close();
+    return true;
+}
+
+bool TorkLog::fits(qint64 size, QString const& text) const
+{
+    return size < 1 || size + text.length() <= qint64(m_maxLogFileSize);
+}
+
+QFileInfo TorkLog::currentFile() const
+{
+    const QString name = currentFileName();
+    const bool isBareName = !name.isEmpty() && !name.contains(QLatin1Char('/'));
+    return isBareName ? QFileInfo(QDir(m_path).filePath(name)) : QFileInfo();
+}
+
+void TorkLog::makeLogDirectory() const
+{
+    // The last character goes, whatever it is: as a rule the final slash.
+    const QString directory = m_path.length() == 1 ? m_path : m_path.left(m_path.length() - 1);
+    QDir().mkpath(directory);
+}
+
+QFile* TorkLog::locateLogFile(QString const& text)
+{
+    if (m_file.isOpen()) {
+        if (!fits(m_file.size(), text))
+            trimOpenFile(text);
+        return &m_file;
+    }
+
+    QFileInfo current = currentFile();
+    if (!current.isFile()) {
+        makeLogDirectory();
+        current.refresh();
+    }
+
+    if (!current.isFile()) {
+        openFile(currentFilePath());
+    } else if (fits(current.size(), text)) {
+        if (m_logFileName != current.filePath())
+            m_logFileName = current.filePath();
+        openFile(current.filePath());
+    } else {
+        deleteOldFiles();
+        openFile(currentFilePath());
+    }
+    return m_file.isOpen() ? &m_file : nullptr;
+}
+
+// Looks for old content behind the last entry and, if there is any, cuts it down: without the
+// lines that the new text needs room for, and without their line ends. As a rule nothing follows
+// and the file grows beyond its limit; it is rotated when it is next opened.
+void TorkLog::trimOpenFile(QString const& text)
+{
+    QTextStream stream(&m_file);
+    stream.setCodec("ISO 8859-1"); // byte for byte, in any locale
+    stream.setAutoDetectUnicode(false);
+
+    QString kept;
+    qint64 count = 0;
+    bool keep = false;
+    while (!stream.atEnd()) {
+        const QString line = stream.readLine();
+        count += line.length();
+        keep = keep || count >= text.length();
+        if (keep)
+            kept += line;
+        m_file.resize(0);
+        stream << kept;
+    }
+}
+
+void TorkLog::deleteOldFiles()
+{
+    QString directory = m_path;
+    if (EndsInSlash(directory))
+        directory.chop(1);
+    shiftOldFiles(directory);
+
+    const QString current = currentFilePath();
+    QFile::copy(current, current + QLatin1String(".1"));
+    QFile::remove(current);
+}
+
+void TorkLog::shiftOldFiles(QString const& directory) const
+{
+    QMap<int, QString> numbered;
+    const QStringList files = NumberedFiles(directory, currentFileName());
+    for (QString const& file : files) {
+        const int number = logFileNumber(file);
+        if (number != -1)
+            numbered.insert(number, file);
+    }
+    if (numbered.isEmpty() || numbered.lastKey() < 0)
+        return;
+
+    // From the highest down, so that each new name is free. Directory and name are joined as they
+    // are: a directory without its final slash runs into the name.
+    const QList<int> numbers = numbered.keys();
+    for (auto number = numbers.crbegin(); number != numbers.crend() && *number >= 1; ++number) {
+        QString const& file = numbered[*number];
+        const QString next = QString::number(qint64(*number) + 1);
+        QFile::rename(m_path + file, m_path + BeforeLastDot(file) + QLatin1Char('.') + next);
+    }
+
+    if (numbered.lastKey() >= static_cast<int>(m_maxLogFiles.load()))
+        pruneOldFiles(directory, qint64(numbered.lastKey()) + 1);
+}
+
+// Removes the older files from `highest` down to the first above the limit, going by the names
+// that are there: a stray file with a huge number must not cost a billion attempts.
+void TorkLog::pruneOldFiles(QString const& directory, qint64 highest) const
+{
+    const qint64 lowest = qint64(static_cast<int>(m_maxLogFiles.load())) + 1;
+    const QString name = currentFileName();
+    const QString path = currentFilePath();
+
+    const QStringList files = NumberedFiles(directory, name);
+    for (QString const& file : files) {
+        const QString number = file.mid(name.length() + 1);
+        const qint64 value = number.toLongLong();
+        if (number == QString::number(value) && value >= lowest && value <= highest)
+            QFile::remove(path + QLatin1Char('.') + number);
+    }
+}

@@ -1,0 +1,16 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "common/xml/TorkErrorDictionary.h"
+
+TorkErrorDictionary::TorkErrorDictionary(QString const& name, unsigned int baseErrorCode)
+    : QObject(nullptr), m_name(name), m_baseErrorCode(baseErrorCode)
+{}
+
+TorkErrorDictionary::~TorkErrorDictionary() = default;
+
+bool TorkErrorDictionary::decode(int, QString& text)
+{
+    text = QLatin1String("");
+    return false;
+}

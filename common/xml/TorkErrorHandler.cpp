@@ -1,0 +1,50 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "common/xml/TorkErrorHandler.h"
+
+#include <QDebug>
+#include <QMessageLogger>
+#include <QXmlParseException>
+
+TorkErrorHandler::TorkErrorHandler(TorkLog* log) : m_log(log), m_errorText(QLatin1String("")) {}
+
+TorkErrorHandler::~TorkErrorHandler() = default;
+
+bool TorkErrorHandler::warning(QXmlParseException const& exception)
+{
+    QMessageLogger().warning() << format(exception);
+    return true;
+}
+
+// The two labels differ, and log readers of the family tell errors from fatal ones by them.
+bool TorkErrorHandler::error(QXmlParseException const& exception)
+{
+    format(exception);
+    QMessageLogger().critical() << "TorkErrorHandler::error " << m_errorText;
+    return true;
+}
+
+bool TorkErrorHandler::fatalError(QXmlParseException const& exception)
+{
+    format(exception);
+    QMessageLogger().critical() << "TorkErrorHandler::fatalError: " << m_errorText;
+    return false;
+}
+
+QString TorkErrorHandler::errorString() const
+{
+    return m_errorText;
+}
+
+QString& TorkErrorHandler::format(QXmlParseException const& exception)
+{
+    m_detailText = QStringLiteral("%1\nPublic ID: %2, System ID: %3\nLine: %4, Column: %5")
+                       .arg(exception.message())
+                       .arg(exception.publicId())
+                       .arg(exception.systemId())
+                       .arg(exception.lineNumber())
+                       .arg(exception.columnNumber());
+    m_errorText = QLatin1String("Xml Parse Failure.\n") + m_detailText;
+    return m_detailText;
+}

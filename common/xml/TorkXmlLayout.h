@@ -1,0 +1,29 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include <QString>
+
+/// The result codes of the XML writers' operations.
+namespace TorkXmlResult {
+enum Code : int {
+    Success = 0,
+    EmptyName = 1005,   ///< the element or attribute name is empty
+    WriteFailed = 1006, ///< Write() reported a negative count
+};
+}
+
+/// Where an XML writer stands: what each of the two writers keeps between calls.
+struct TorkXmlLayout
+{
+    /// Indentation units before a tag that starts a line; may become negative.
+    qint32 level = 0;
+
+    /// What one level of indentation looks like.
+    QString unit = QStringLiteral("  ");
+
+    /// The attributes of the start tag that is open, and its closing characters, until they are
+    /// written.
+    QString pending = QLatin1String("");
+};
