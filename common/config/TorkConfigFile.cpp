@@ -13,6 +13,8 @@
 #include <QXmlInputSource>
 #include <QXmlSimpleReader>
 
+#include <algorithm>
+
 namespace {
 
 void TraceToLog(QString const& message)
@@ -21,43 +23,73 @@ void TraceToLog(QString const& message)
         log->trace(message);
 }
 
+bool Contains(QString const& text, char character)
+{
+    const QChar wanted = QLatin1Char(character);
+    return std::find(text.constBegin(), text.constEnd(), wanted) != text.constEnd();
+}
+
 QString WithoutSpaces(QString const& name)
 {
-    if (!name.contains(QLatin1Char(' ')))
+    if (!Contains(name, ' '))
         return name;
 
     QString cleaned = name;
     return cleaned.remove(QLatin1Char(' '));
 }
 
+bool IsMarkup(QChar character)
+{
+    switch (character.unicode()) {
+    case '&':
+    case '\'':
+    case '<':
+    case '>':
+    case '"':
+        return true;
+    default:
+        return false;
+    }
+}
+
 bool HoldsMarkup(QString const& text)
 {
-    for (char markup : {'&', '\'', '<', '>', '"'}) {
-        if (text.contains(QLatin1Char(markup)))
-            return true;
-    }
-    return false;
+    return std::any_of(text.constBegin(), text.constEnd(), IsMarkup);
+}
+
+// As QString::toLatin1() converts, without a byte array of its own for each piece: half the time
+// of a save.
+void AppendLatin1(QByteArray& xml, QString const& text)
+{
+    const int end = xml.size();
+    xml.resize(end + text.size());
+    std::transform(text.constBegin(), text.constEnd(), xml.data() + end, [](QChar character) {
+        return character.unicode() > 0xff ? '?' : static_cast<char>(character.unicode());
+    });
+}
+
+void AppendTag(QByteArray& xml, char const* opening, QString const& name)
+{
+    xml += opening;
+    AppendLatin1(xml, name);
+    xml += ">\n";
 }
 
 // Filled one after another, as ever: a key or value that holds a placeholder of its own comes out
 // changed, and files that hold such lines exist. Without a '%' joining gives the same text.
-QString ItemLine(QString const& key, QString const& value)
+void AppendItem(QByteArray& xml, QString const& key, QString const& value)
 {
-    if (key.contains(QLatin1Char('%')) || value.contains(QLatin1Char('%')))
-        return QStringLiteral("<%1>%2</%3>\n").arg(key).arg(value).arg(key);
+    if (Contains(key, '%') || Contains(value, '%')) {
+        const QString line = QStringLiteral("<%1>%2</%3>\n");
+        AppendLatin1(xml, line.arg(key).arg(value).arg(key));
+        return;
+    }
 
-    return QLatin1Char('<') + key + QLatin1Char('>') + value + QLatin1String("</") + key +
-           QLatin1String(">\n");
-}
-
-QByteArray StartTag(QString const& name)
-{
-    return '<' + name.toLatin1() + ">\n";
-}
-
-QByteArray EndTag(QString const& name)
-{
-    return "</" + name.toLatin1() + ">\n";
+    xml += '<';
+    AppendLatin1(xml, key);
+    xml += '>';
+    AppendLatin1(xml, value);
+    AppendTag(xml, "</", key);
 }
 
 // Ends the parse of a document that is nested too deep for the reader's stack.
@@ -171,18 +203,20 @@ bool TorkConfigFile::Save()
 
 QByteArray TorkConfigFile::toXml()
 {
-    QByteArray xml = StartTag(m_rootElementName);
+    QByteArray xml;
+    AppendTag(xml, "<", m_rootElementName);
     QString filtered;
     for (auto const& section : m_sections) {
-        xml += StartTag(section.value->name());
+        AppendTag(xml, "<", section.value->name());
         for (auto const& item : section.value->values()) {
             QString value = item.value;
             FilterContent(value, filtered);
-            xml += ItemLine(item.key, filtered).toLatin1();
+            AppendItem(xml, item.key, filtered);
         }
-        xml += EndTag(section.value->name());
+        AppendTag(xml, "</", section.value->name());
     }
-    return xml + EndTag(m_rootElementName);
+    AppendTag(xml, "</", m_rootElementName);
+    return xml;
 }
 
 bool TorkConfigFile::HasSection(QString const& name)
@@ -234,6 +268,7 @@ TorkConfigFileSection* TorkConfigFile::createSection(QString const& name)
     if (replaced)
         m_replacedSections.emplace_back(*replaced);
     AppendSection(section);
+    m_currentSection = section;
     return section;
 }
 
@@ -292,7 +327,7 @@ void TorkConfigFile::StartElement(QString& name)
         return;
 
     if (depth == 2 && !lookUp(name))
-        m_currentSection = createSection(name);
+        createSection(name);
     else if (depth == 3)
         m_expectingValue = true;
     // Deeper elements leave the flag: one inside an item without text is stored as if it were the
@@ -310,8 +345,16 @@ bool TorkConfigFile::ProcessContent(QString& content)
         return true;
 
     m_expectingValue = false;
-    if (m_currentSection)
-        WriteItem(m_currentSection->name(), m_currentElement, content);
+    if (!m_currentSection)
+        return true;
+
+    // The current section stands in the table under its own name; only a name with spaces in it
+    // would lead elsewhere.
+    QString const& section = m_currentSection->name();
+    if (Contains(section, ' '))
+        WriteItem(section, m_currentElement, content);
+    else if (!content.isNull())
+        m_currentSection->AddValue(WithoutSpaces(m_currentElement), content);
     return true;
 }
 

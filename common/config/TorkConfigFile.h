@@ -36,6 +36,7 @@ class TorkConfigFileDocHandler;
 ///     int columns = 0;
 ///     settings.ReadInt("Main Window", "columns", 3, columns);
 ///     settings.WriteItem("Main Window", "columns", columns + 1);
+///     settings.m_lastError.clear(); // of a missing file, which Save() makes
 ///     settings.Save();
 ///     if (!settings.m_lastError.isEmpty())
 ///         WarningMessage(window, settings.m_lastError, true);

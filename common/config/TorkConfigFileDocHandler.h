@@ -15,6 +15,12 @@ class TorkConfigFile;
 /// the first text after a start tag: that text is an item's value. Attributes are ignored, element
 /// names are the local names. Every event returns true: this handler never stops a parse.
 /// One parse on one thread.
+///
+///     TorkConfigFileDocHandler handler; // no file to fill: it only keeps track
+///     QXmlSimpleReader reader;
+///     reader.setContentHandler(&handler);
+///     if (!reader.parse(source))
+///         qDebug() << "broken behind" << handler.lastOpenedElement();
 class TorkConfigFileDocHandler : public QXmlDefaultHandler
 {
 public:

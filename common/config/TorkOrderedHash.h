@@ -13,6 +13,12 @@
 /// Lookups cost one hash lookup; walking through the entries walks an array. A saved file thus
 /// keeps the order in which it was read, so that two saved files differ only where values differ.
 /// Keys match exactly and are unique. One thread at a time.
+///
+///     TorkOrderedHash<int> wheels;
+///     wheels.insert("car", 4);
+///     wheels.insert("bicycle", 2);
+///     for (auto const& entry : wheels)
+///         qDebug() << entry.key << entry.value; // the car first
 template <class Value>
 class TorkOrderedHash
 {
@@ -39,11 +45,12 @@ public:
     /// Stores `value` under `key`. An earlier value of that key is replaced at its old place.
     void insert(QString const& key, Value const& value)
     {
-        if (Value* present = find(key)) {
-            *present = value;
+        size_t& position = m_positions[key]; // one search for both cases: a new key comes out as 0
+        if (size_t(m_positions.size()) == m_entries.size()) {
+            m_entries[position].value = value;
             return;
         }
-        m_positions.insert(key, m_entries.size());
+        position = m_entries.size();
         m_entries.push_back({key, value});
     }
 

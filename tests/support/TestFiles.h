@@ -1,0 +1,71 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include <QByteArray>
+#include <QDir>
+#include <QDirIterator>
+#include <QFile>
+#include <QFileInfo>
+#include <QString>
+#include <QStringList>
+
+#include <algorithm>
+
+/// Whole files in, whole files out, for tests that compare what a program leaves on the disk.
+///
+///     TestFiles::write(folder + "app.log", "old\n");
+///     QCOMPARE(TestFiles::listing(folder), QStringList({"app.log: old\n"}));
+namespace TestFiles {
+
+/// Replaces the file by these bytes and makes the folders above it.
+inline bool write(QString const& path, QByteArray const& bytes)
+{
+    QDir().mkpath(QFileInfo(path).path());
+    QFile file(path);
+    if (!file.open(QIODevice::WriteOnly | QIODevice::Truncate)) {
+        qWarning("%s: %s", qPrintable(path), qPrintable(file.errorString()));
+        return false;
+    }
+    return file.write(bytes) == bytes.size();
+}
+
+/// The bytes of a file; of one that does not open, a text that no test expects.
+inline QByteArray read(QString const& path)
+{
+    QFile file(path);
+    if (!file.open(QIODevice::ReadOnly))
+        return "(does not open: " + file.errorString().toLocal8Bit() + ')';
+    return file.readAll();
+}
+
+/// The entries of a listing in the order of their names.
+inline QStringList sorted(QStringList entries)
+{
+    std::sort(entries.begin(), entries.end(), [](QString const& left, QString const& right) {
+        return left.section(": ", 0, 0) < right.section(": ", 0, 0);
+    });
+    return entries;
+}
+
+/// Everything below a folder, hidden entries too, in the order of the names: "name: content" for a
+/// file, "name/" for a folder. Bytes are shown as Latin-1.
+inline QStringList listing(QString const& folder)
+{
+    QStringList entries;
+    const QDir top(folder);
+    QDirIterator walk(folder, QDir::AllEntries | QDir::Hidden | QDir::System | QDir::NoDotAndDotDot,
+                      QDirIterator::Subdirectories);
+    while (walk.hasNext()) {
+        const QString path = walk.next();
+        const QString name = top.relativeFilePath(path);
+        if (walk.fileInfo().isDir())
+            entries.append(name + '/');
+        else
+            entries.append(name + ": " + QString::fromLatin1(read(path)));
+    }
+    return sorted(entries);
+}
+
+} // namespace TestFiles
