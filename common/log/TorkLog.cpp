@@ -9,8 +9,7 @@
 
 TorkLog::TorkLog() : TorkLog(QString(QLatin1String(""))) {}
 
-TorkLog::TorkLog(QString const& path)
-    : QObject(nullptr), m_lastEntryTime(QDateTime::currentMSecsSinceEpoch())
+TorkLog::TorkLog(QString const& path) : QObject(nullptr), m_lastEntryTime(wallClock())
 {
     clear();
     m_path = path;

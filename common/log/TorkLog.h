@@ -181,11 +181,14 @@ private:
     void makeLogDirectory() const;
     bool openFile(QString const& fileName);
     bool closeFile();
-    bool fits(qint64 size, QString const& text) const;
-    void trimOpenFile(QString const& text);
+    QFile* locate(int length);
+    qint64 openFileSize();
+    bool fits(qint64 size, int length) const;
+    void trimOpenFile(int length);
     void shiftOldFiles(QString const& directory) const;
     void pruneOldFiles(QString const& directory, qint64 highest) const;
 
+    static qint64 wallClock();
     QString entry(qint64 now, int severity, QString const& message) const;
     QString stamp(qint64 now) const;
     QString elapsedTime(qint64 now) const;
@@ -218,7 +221,7 @@ private:
     QString m_outputToConsoleKey;
     QString m_dateTimeFormat;
     QString m_dateTimeFormatKey;
-    std::atomic<qint64> m_lastEntryTime; // milliseconds since the epoch
+    std::atomic<qint64> m_lastEntryTime; // on the wall clock, in milliseconds
     std::atomic<bool> m_logElapsedTime{false};
     QString m_logElapsedTimeKey;
     QString m_elapsedTimePrefix;
@@ -228,6 +231,9 @@ private:
     QString m_logPipeToConsoleKey;
     int m_writing = 0;
     mutable QMutex m_mutex; // the files, and the texts that writing an entry reads
+
+    // Whether the file's buffer is empty, so that the toolkit's position is the system's too.
+    bool m_flushed = true;
 
     // Changes with every change of the date format, so that stamps kept for reuse can be told
     // stale.

@@ -11,24 +11,67 @@
 #include <QMessageLogger>
 
 #include <algorithm>
+#include <ctime>
 #include <type_traits>
 
 TorkLog* TorkLog::m_gLog = nullptr;
 
 namespace {
 
-// The stamp that this thread made last: entries come many to a millisecond, and asking for the
-// local time costs more than all the rest of an entry. Free of constructors and destructors, so
-// that entries may still be written while the program's static objects are destroyed.
-struct KeptStamp
+// What this thread found out last about the local time and wrote as a time stamp. Entries come many
+// to a millisecond, and asking for the local time costs more than all the rest of an entry. Free
+// of constructors and destructors, so that entries may still be written while the program's static
+// objects are destroyed.
+struct KeptTime
 {
+    qint64 minute;
+    long zone;
+    qint64 offset;
+
     quint64 formatGeneration;
-    qint64 time;
-    int length;
-    ushort text[64];
+    qint64 stampTime;
+    int stampLength;
+    ushort stamp[64];
 };
-static_assert(std::is_trivial<KeptStamp>::value, "lives in thread storage beyond destructors");
-thread_local KeptStamp t_stamp;
+static_assert(std::is_trivial<KeptTime>::value, "outlives all destructors");
+thread_local KeptTime t_kept;
+
+// Changes where the program is moved to another time zone.
+long Zone()
+{
+#ifdef __GLIBC__
+    return ::timezone;
+#else
+    return 0;
+#endif
+}
+
+// The wall clock's time as milliseconds since an epoch of its own. The distance from UTC holds for
+// the whole minute: no time zone changes its clocks within one.
+qint64 WallClock(qint64 now)
+{
+    const qint64 minute = now / 60000;
+    if (t_kept.minute != minute || t_kept.zone != Zone()) {
+        t_kept.offset = QDateTime::fromMSecsSinceEpoch(now).offsetFromUtc() * qint64(1000);
+        t_kept.minute = minute;
+        t_kept.zone = Zone();
+    }
+    return now + t_kept.offset;
+}
+
+// Milliseconds since midnight.
+int TimeOfDay(qint64 wallClock)
+{
+    return static_cast<int>(wallClock % (24 * 60 * 60 * 1000));
+}
+
+QString Stamp(qint64 now, QString const& format)
+{
+    const bool needsZone = format.contains(QLatin1Char('t'));
+    const QDateTime time = needsZone ? QDateTime::fromMSecsSinceEpoch(now)
+                                     : QDateTime::fromMSecsSinceEpoch(WallClock(now), Qt::UTC);
+    return time.toString(format);
+}
 
 QString SeverityText(int severity)
 {
@@ -56,12 +99,17 @@ QString& TorkLog::severityName(EventSeverity severity)
     return m_severityName;
 }
 
+qint64 TorkLog::wallClock()
+{
+    return WallClock(QDateTime::currentMSecsSinceEpoch());
+}
+
 void TorkLog::write(int severity, QString const& message)
 {
     const qint64 now = QDateTime::currentMSecsSinceEpoch();
     if (m_enabled)
         write(entry(now, severity, message));
-    m_lastEntryTime = now;
+    m_lastEntryTime = WallClock(now);
 }
 
 void TorkLog::write(QString const& line)
@@ -72,9 +120,9 @@ void TorkLog::write(QString const& line)
     const QByteArray bytes = line.toLatin1();
     TorkLogLock lock(m_mutex);
     m_writing = 1;
-    if (QFile* file = locateLogFile(line)) {
+    if (QFile* file = locate(line.length())) {
         file->write(bytes);
-        file->flush();
+        m_flushed = file->flush();
         if (m_logPipeToConsole)
             echo(line);
     }
@@ -87,7 +135,7 @@ void TorkLog::write(QString const& line)
 void TorkLog::echo(QString const& line) const
 {
     qInstallMessageHandler(TorkLog_MessageHandler);
-    QMessageLogger().debug() << line;
+    QMessageLogger(nullptr, 0, nullptr).debug() << line;
 }
 
 QString TorkLog::entry(qint64 now, int severity, QString const& message) const
@@ -109,8 +157,8 @@ QString TorkLog::entry(qint64 now, int severity, QString const& message) const
 
 QString TorkLog::stamp(qint64 now) const
 {
-    if (t_stamp.time == now && t_stamp.formatGeneration == m_formatGeneration)
-        return QString(reinterpret_cast<QChar const*>(t_stamp.text), t_stamp.length);
+    if (t_kept.stampTime == now && t_kept.formatGeneration == m_formatGeneration)
+        return QString(reinterpret_cast<QChar const*>(t_kept.stamp), t_kept.stampLength);
 
     QString format;
     quint64 generation = 0;
@@ -120,12 +168,12 @@ QString TorkLog::stamp(qint64 now) const
         generation = m_formatGeneration;
     }
 
-    const QString text = QDateTime::fromMSecsSinceEpoch(now).toString(format);
-    if (text.length() <= int(std::extent<decltype(t_stamp.text)>::value)) {
-        t_stamp.formatGeneration = generation;
-        t_stamp.time = now;
-        t_stamp.length = text.length();
-        std::copy_n(text.utf16(), text.length(), t_stamp.text);
+    const QString text = Stamp(now, format);
+    if (text.length() <= int(std::extent<decltype(t_kept.stamp)>::value)) {
+        t_kept.formatGeneration = generation;
+        t_kept.stampTime = now;
+        t_kept.stampLength = text.length();
+        std::copy_n(text.utf16(), text.length(), t_kept.stamp);
     }
     return text;
 }
@@ -138,7 +186,6 @@ QString TorkLog::elapsedTime(qint64 now) const
         TorkLogLock lock(m_mutex);
         prefix = m_elapsedTimePrefix;
     }
-    const QTime last = QDateTime::fromMSecsSinceEpoch(m_lastEntryTime).time();
-    const int elapsed = last.msecsTo(QDateTime::fromMSecsSinceEpoch(now).time());
+    const int elapsed = TimeOfDay(WallClock(now)) - TimeOfDay(m_lastEntryTime);
     return prefix + QLatin1Char('[') + QString::number(elapsed) + QLatin1Char(']');
 }

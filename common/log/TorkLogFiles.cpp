@@ -20,6 +20,10 @@
 #include <QMap>
 #include <QTextStream>
 
+#ifdef Q_OS_UNIX
+#include <unistd.h>
+#endif
+
 namespace {
 
 // As the names have always been formed: an empty path counts as ending in a slash.
@@ -110,6 +114,7 @@ bool TorkLog::openFile(QString const& fileName)
 {
     closeFile();
     m_file.setFileName(fileName);
+    m_flushed = true;
     // Neither appending nor truncating: entries go over the old content from its start on.
     const bool opened = m_file.open(QIODevice::ReadWrite | QIODevice::Text);
     if (!opened)
@@ -127,9 +132,9 @@ bool TorkLog::closeFile()
     return true;
 }
 
-bool TorkLog::fits(qint64 size, QString const& text) const
+bool TorkLog::fits(qint64 size, int length) const
 {
-    return size < 1 || size + text.length() <= qint64(m_maxLogFileSize);
+    return size < 1 || size + length <= qint64(m_maxLogFileSize);
 }
 
 QFileInfo TorkLog::currentFile() const
@@ -148,9 +153,33 @@ void TorkLog::makeLogDirectory() const
 
 QFile* TorkLog::locateLogFile(QString const& text)
 {
+    QFile* file = locate(text.length());
+    m_flushed = false; // whoever gets the file may leave text in its buffer
+    return file;
+}
+
+// The size of the open file. The position of its end tells as much as its status and is found ten
+// times as fast, but must be left where writing goes on.
+qint64 TorkLog::openFileSize()
+{
+#ifdef Q_OS_UNIX
+    if (m_flushed) {
+        const qint64 position = m_file.pos();
+        const qint64 end = ::lseek(m_file.handle(), 0, SEEK_END);
+        if (end == position || (end >= 0 && ::lseek(m_file.handle(), position, SEEK_SET) >= 0))
+            return end;
+    }
+#endif
+    return m_file.size();
+}
+
+QFile* TorkLog::locate(int length)
+{
     if (m_file.isOpen()) {
-        if (!fits(m_file.size(), text))
-            trimOpenFile(text);
+        const qint64 size = openFileSize();
+        // Behind the last entry there is as a rule nothing to trim.
+        if (!fits(size, length) && m_file.pos() != size)
+            trimOpenFile(length);
         return &m_file;
     }
 
@@ -162,7 +191,7 @@ QFile* TorkLog::locateLogFile(QString const& text)
 
     if (!current.isFile()) {
         openFile(currentFilePath());
-    } else if (fits(current.size(), text)) {
+    } else if (fits(current.size(), length)) {
         if (m_logFileName != current.filePath())
             m_logFileName = current.filePath();
         openFile(current.filePath());
@@ -176,7 +205,7 @@ QFile* TorkLog::locateLogFile(QString const& text)
 // Looks for old content behind the last entry and, if there is any, cuts it down: without the
 // lines that the new text needs room for, and without their line ends. As a rule nothing follows
 // and the file grows beyond its limit; it is rotated when it is next opened.
-void TorkLog::trimOpenFile(QString const& text)
+void TorkLog::trimOpenFile(int length)
 {
     QTextStream stream(&m_file);
     stream.setCodec("ISO 8859-1"); // byte for byte, in any locale
@@ -188,7 +217,7 @@ void TorkLog::trimOpenFile(QString const& text)
     while (!stream.atEnd()) {
         const QString line = stream.readLine();
         count += line.length();
-        keep = keep || count >= text.length();
+        keep = keep || count >= length;
         if (keep)
             kept += line;
         m_file.resize(0);

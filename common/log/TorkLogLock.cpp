@@ -7,11 +7,25 @@ namespace {
 
 thread_local bool t_holdsLock = false;
 
+// An entry holds the lock for about a microsecond, much less than a thread needs to fall asleep
+// and wake up again: trying for a moment first makes two writing threads nearly twice as fast.
+constexpr int Attempts = 1000;
+
+bool TryForAMoment(QMutex& mutex)
+{
+    for (int i = 0; i < Attempts; ++i) {
+        if (mutex.tryLock())
+            return true;
+    }
+    return false;
+}
+
 } // namespace
 
 TorkLogLock::TorkLogLock(QMutex& mutex) : m_mutex(mutex)
 {
-    m_mutex.lock();
+    if (!TryForAMoment(m_mutex))
+        m_mutex.lock();
     t_holdsLock = true;
 }
 

@@ -198,8 +198,8 @@ bool TorkLog::save()
 // On the first start the settings are saved before the first entry makes the log directory.
 void TorkLog::makeDirectoryOfPreferences() const
 {
-    const QString directory = QFileInfo(m_preferencesFileName).absolutePath();
-    const bool liesInLogDirectory = directory == QDir(path()).absolutePath();
+    const QString directory = QDir::cleanPath(QFileInfo(m_preferencesFileName).absolutePath());
+    const bool liesInLogDirectory = directory == QDir::cleanPath(QDir(path()).absolutePath());
     if (liesInLogDirectory && !QDir(directory).exists())
         makeLogDirectory();
 }

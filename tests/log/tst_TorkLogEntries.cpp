@@ -1,0 +1,821 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "common/log/TorkLog.h"
+#include "log/LogFolder.h"
+#include "support/ChildProcess.h"
+#include "support/ProcessLimits.h"
+#include "support/TestClock.h"
+
+#include <QDebug>
+#include <QTranslator>
+#include <QtTest>
+
+#include <csignal>
+
+class tst_TorkLogEntries : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void init();
+    void cleanup();
+
+    void loggerIsTheOneLog();
+    void entry_data();
+    void entry();
+    void shorthands();
+    void stamp_data();
+    void stamp();
+    void stampFollowsTheFormat();
+    void elapsedTime_data();
+    void elapsedTime();
+    void elapsedTimeBetweenEntries();
+    void elapsedTimePrefix_data();
+    void elapsedTimePrefix();
+    void readyLine_data();
+    void readyLine();
+    void disabled_data();
+    void disabled();
+    void opensAtFirstEntry();
+    void reachesTheFileAtOnce();
+
+    void severityName_data();
+    void severityName();
+    void severityNameIsOneBuffer();
+    void entriesLeaveTheSeverityNameAlone();
+    void severityNameIsTranslated();
+
+    void messageHandler_data();
+    void messageHandler();
+    void messageHandlerWithoutLog();
+    void toolkitMessages_data();
+    void toolkitMessages();
+    void fatalMessage();
+
+    void echo_data();
+    void echo();
+    void echoStaysOutOfTheLog();
+    void echoInstallsTheMessageHandler();
+    void nothingToEcho_data();
+    void nothingToEcho();
+    void messageUnderTheLock_data();
+    void messageUnderTheLock();
+    void entryIsBuiltOutsideTheLock();
+
+private:
+    QtMessageHandler m_handler;
+};
+
+namespace {
+
+// The default format makes the same of it in every release of the toolkit.
+const QDateTime& now()
+{
+    static const QDateTime time(QDate(2021, 3, 4), QTime(5, 6, 7, 123));
+    return time;
+}
+
+const char stampOfNow[] = "2021-03-04 05:06:07.123";
+
+} // namespace
+
+void tst_TorkLogEntries::init()
+{
+    m_handler = qInstallMessageHandler(nullptr);
+    qInstallMessageHandler(m_handler);
+    TestClock::set(now());
+}
+
+void tst_TorkLogEntries::cleanup()
+{
+    TorkLog::shutdown();
+    qInstallMessageHandler(m_handler);
+    TestClock::release();
+}
+
+void tst_TorkLogEntries::loggerIsTheOneLog()
+{
+    QVERIFY(!TorkLog::logger());
+    LogFolder folder;
+    TorkLog* const log = TorkLog::initialize(folder.logs(), "app", QString(), true);
+    QVERIFY(log);
+    QCOMPARE(TorkLog::logger(), log);
+    QCOMPARE(TorkLog::m_gLog, log);
+}
+
+void tst_TorkLogEntries::entry_data()
+{
+    QTest::addColumn<int>("severity");
+    QTest::addColumn<QString>("message");
+    QTest::addColumn<bool>("elapsedTime");
+    QTest::addColumn<QByteArray>("expected");
+
+    QTest::newRow("trace") << 0 << "x" << false << QByteArray("T Trace x\n");
+    QTest::newRow("notification") << 1 << "x" << false << QByteArray("T Notification x\n");
+    QTest::newRow("warning") << 2 << "x" << false << QByteArray("T Warning x\n");
+    QTest::newRow("error") << 3 << "x" << false << QByteArray("T Error x\n");
+    QTest::newRow("fatal") << 4 << "x" << false << QByteArray("T Fatal x\n");
+    QTest::newRow("unknown severity has no name") << 7 << "x" << false << QByteArray("T  x\n");
+    QTest::newRow("just behind the last severity") << 5 << "x" << false << QByteArray("T  x\n");
+    QTest::newRow("negative severity") << -1 << "x" << false << QByteArray("T  x\n");
+    QTest::newRow("elapsed time") << 2 << "x" << true << QByteArray("T Warning dT:[0] x\n");
+    QTest::newRow("elapsed time, unknown severity")
+        << 7 << "x" << true << QByteArray("T  dT:[0] x\n");
+    QTest::newRow("empty message") << 0 << "" << false << QByteArray("T Trace \n");
+    QTest::newRow("null message") << 0 << QString() << false << QByteArray("T Trace \n");
+    QTest::newRow("empty message, elapsed time")
+        << 0 << "" << true << QByteArray("T Trace dT:[0] \n");
+    QTest::newRow("blanks are kept") << 0 << "  x  " << false << QByteArray("T Trace   x  \n");
+    QTest::newRow("line ends are kept") << 0 << "a\nb\r\n"
+                                        << false << QByteArray("T Trace a\nb\r\n\n");
+    QTest::newRow("null character")
+        << 0 << QString::fromLatin1("a\0b", 3) << false << QByteArray("T Trace a\0b\n", 12);
+    QTest::newRow("markers are text")
+        << 0 << "%1 %2 %d %s %n%%" << true << QByteArray("T Trace dT:[0] %1 %2 %d %s %n%%\n");
+    QTest::newRow("Latin-1 letters")
+        << 0 << QString::fromUtf8("Äöü ÿ") << false << QByteArray("T Trace \xC4\xF6\xFC \xFF\n");
+    QTest::newRow("letters beyond Latin-1")
+        << 0 << QString::fromUtf8("Ā€日 x") << false << QByteArray("T Trace ??? x\n");
+    QTest::newRow("beyond the first plane, one for each half")
+        << 0 << QString::fromUtf8("😀") << false << QByteArray("T Trace ??\n");
+    QTest::newRow("long") << 0 << QString(100000, 'x') << false
+                          << QByteArray("T Trace " + QByteArray(100000, 'x') + '\n');
+}
+
+void tst_TorkLogEntries::entry()
+{
+    QFETCH(int, severity);
+    QFETCH(QString, message);
+    QFETCH(bool, elapsedTime);
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    log.setLogElapsedTime(elapsedTime);
+
+    log.write(severity, message);
+    QTEST(TestFiles::read(folder.logs() + "app.log"), "expected");
+}
+
+void tst_TorkLogEntries::shorthands()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    log.trace("a");
+    log.warning("b");
+    log.error("c");
+    log.fatal("d");
+
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"),
+             QByteArray("T Trace a\nT Warning b\nT Error c\nT Fatal d\n"));
+}
+
+void tst_TorkLogEntries::stamp_data()
+{
+    QTest::addColumn<QString>("format");
+    QTest::addColumn<QDateTime>("time");
+    QTest::addColumn<QByteArray>("expected");
+
+    const QDateTime early(QDate(2021, 3, 4), QTime(5, 6, 7, 8));
+    const QString usual("yyyy-MM-dd hh:mm:ss.z");
+    QTest::newRow("usual") << usual << now() << QByteArray(stampOfNow);
+    QTest::newRow("milliseconds as the toolkit has them")
+        << usual << early << early.toString(usual).toLatin1();
+    QTest::newRow("three digits of milliseconds")
+        << "yyyy-MM-dd hh:mm:ss.zzz" << early << QByteArray("2021-03-04 05:06:07.008");
+    QTest::newRow("before midnight")
+        << "dd.MM.yy hh:mm:ss" << QDateTime(QDate(1999, 12, 31), QTime(23, 59, 59, 999))
+        << QByteArray("31.12.99 23:59:59");
+    QTest::newRow("literal text") << "'at' hh 'o''clock'" << early << QByteArray("at 05 o'clock");
+    QTest::newRow("one blank") << " " << early << QByteArray(" ");
+    QTest::newRow("markers are text") << "'%1%d'" << early << QByteArray("%1%d");
+    QTest::newRow("letters beyond Latin-1")
+        << QString::fromUtf8("'ä€'hh") << early << QByteArray("\xE4?05");
+    QTest::newRow("long") << "'" + QString(500, 'x') + "'hh" << early
+                          << QByteArray(QByteArray(500, 'x') + "05");
+}
+
+void tst_TorkLogEntries::stamp()
+{
+    QFETCH(QString, format);
+    QFETCH(QDateTime, time);
+    QFETCH(QByteArray, expected);
+    TestClock::set(time);
+    LogFolder folder;
+    TorkLog log;
+    log.setOutputPath(folder.logs());
+    folder.configure(log, {{"dateTimeFormat", format}, {"filePrefix", "app"}});
+
+    log.trace("x");
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), expected + " Trace x\n");
+}
+
+// At one and the same moment, lest a stamp that was made for another format is used again.
+void tst_TorkLogEntries::stampFollowsTheFormat()
+{
+    LogFolder folder;
+    TorkLog first;
+    TorkLog second;
+    folder.prepare(first, "first");
+    first.trace("1");
+    folder.configure(second, {{"filePrefix", "second"}, {"dateTimeFormat", "'S'"}});
+    second.setOutputPath(folder.logs());
+    second.trace("2");
+    first.trace("3");
+    folder.configure(first, {{"dateTimeFormat", "'U'"}});
+    first.trace("4");
+    TestClock::advance(1);
+    second.trace("5");
+    first.trace("6");
+
+    QCOMPARE(folder.listing(),
+             QStringList({"first.log: T Trace 1\nT Trace 3\nU Trace 4\nU Trace 6\n",
+                          "second.log: S Trace 2\nS Trace 5\n"}));
+}
+
+// From time of day to time of day, whatever the dates.
+void tst_TorkLogEntries::elapsedTime_data()
+{
+    QTest::addColumn<QDateTime>("from");
+    QTest::addColumn<QDateTime>("to");
+    QTest::addColumn<QByteArray>("expected");
+
+    const QDate day(2021, 3, 4);
+    const QDateTime from(day, QTime(5, 6, 7, 8));
+    QTest::newRow("none") << from << from << QByteArray("T Trace dT:[0] x\n");
+    QTest::newRow("milliseconds") << from << from.addMSecs(250)
+                                  << QByteArray("T Trace dT:[250] x\n");
+    QTest::newRow("hours") << from << from.addSecs(7200) << QByteArray("T Trace dT:[7200000] x\n");
+    QTest::newRow("across midnight")
+        << QDateTime(day, QTime(23, 59, 59, 900)) << QDateTime(day.addDays(1), QTime(0, 0, 0, 100))
+        << QByteArray("T Trace dT:[-86399800] x\n");
+    QTest::newRow("nearly a whole day back")
+        << QDateTime(day, QTime(23, 59, 59, 999)) << QDateTime(day.addDays(1), QTime(0, 0))
+        << QByteArray("T Trace dT:[-86399999] x\n");
+    QTest::newRow("a day and a second")
+        << from << from.addDays(1).addSecs(1) << QByteArray("T Trace dT:[1000] x\n");
+    QTest::newRow("the clock was put back")
+        << from << from.addSecs(-60) << QByteArray("T Trace dT:[-60000] x\n");
+}
+
+void tst_TorkLogEntries::elapsedTime()
+{
+    QFETCH(QDateTime, from);
+    QFETCH(QDateTime, to);
+    LogFolder folder;
+    TestClock::set(from);
+    TorkLog log; // the first entry counts from here
+    folder.prepare(log, "app");
+    log.setLogElapsedTime(true);
+
+    TestClock::set(to);
+    log.trace("x");
+    QTEST(TestFiles::read(folder.logs() + "app.log"), "expected");
+}
+
+// Every entry restarts the count, also one that was not written; a ready line is none.
+void tst_TorkLogEntries::elapsedTimeBetweenEntries()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    TestClock::advance(1);
+    log.trace("elapsed time off");
+    log.setLogElapsedTime(true);
+    TestClock::advance(2);
+    log.trace("a");
+    TestClock::advance(4);
+    log.setEnable(false);
+    log.trace("log off");
+    log.setEnable(true);
+    TestClock::advance(8);
+    log.trace("b");
+    TestClock::advance(16);
+    log.write(QStringLiteral("ready\n"));
+    TestClock::advance(32);
+    log.trace("c");
+    TestClock::advance(64);
+    log.close();
+    log.setOutputPath(folder.root() + "missing");
+    log.trace("no file");
+    log.setOutputPath(folder.logs());
+    TestClock::advance(128);
+    log.trace("d");
+
+    // "d" was written over the start, as the file was opened anew.
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("T Trace dT:[128] d\ne off\n"
+                                                                    "T Trace dT:[2] a\n"
+                                                                    "T Trace dT:[8] b\n"
+                                                                    "ready\n"
+                                                                    "T Trace dT:[48] c\n"));
+}
+
+void tst_TorkLogEntries::elapsedTimePrefix_data()
+{
+    QTest::addColumn<QString>("prefix");
+    QTest::addColumn<QByteArray>("expected");
+
+    QTest::newRow("text") << "after " << QByteArray("T Trace after [5] x\n");
+    QTest::newRow("one blank") << " " << QByteArray("T Trace  [5] x\n");
+    QTest::newRow("markers are text") << "%1%d%2" << QByteArray("T Trace %1%d%2[5] x\n");
+    QTest::newRow("letters beyond Latin-1")
+        << QString::fromUtf8("Δä") << QByteArray("T Trace ?\xE4[5] x\n");
+}
+
+void tst_TorkLogEntries::elapsedTimePrefix()
+{
+    QFETCH(QString, prefix);
+    LogFolder folder;
+    TorkLog log;
+    log.setOutputPath(folder.logs());
+    folder.configure(
+        log, {{"filePrefix", "app"}, {"elapsedTimePrefix", prefix}, {"logElapsedTime", "yes"}});
+    TestClock::advance(5);
+
+    log.trace("x");
+    QTEST(TestFiles::read(folder.logs() + "app.log"), "expected");
+}
+
+void tst_TorkLogEntries::readyLine_data()
+{
+    QTest::addColumn<QString>("line");
+    QTest::addColumn<QByteArray>("expected");
+
+    QTest::newRow("as it is") << "any text\n" << QByteArray("any text\n");
+    QTest::newRow("without its end") << "any text" << QByteArray("any text");
+    QTest::newRow("empty") << "" << QByteArray();
+    QTest::newRow("beyond Latin-1") << QString::fromUtf8("ä€😀\n") << QByteArray("\xE4???\n");
+}
+
+void tst_TorkLogEntries::readyLine()
+{
+    QFETCH(QString, line);
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+
+    log.write(line);
+    QTEST(TestFiles::read(folder.logs() + "app.log"), "expected");
+}
+
+void tst_TorkLogEntries::disabled_data()
+{
+    QTest::addColumn<bool>("ready");
+
+    QTest::newRow("entry") << false;
+    QTest::newRow("ready line") << true;
+}
+
+void tst_TorkLogEntries::disabled()
+{
+    QFETCH(bool, ready);
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    const auto write = [&](const char* text) {
+        if (ready)
+            log.write(QString("T Trace %1\n").arg(text));
+        else
+            log.trace(text);
+    };
+
+    log.setEnable(false);
+    write("a");
+    QCOMPARE(folder.listing(), QStringList());
+    log.setEnable(true);
+    write("b");
+    log.setEnable(false);
+    write("c");
+    QCOMPARE(folder.listing(), QStringList("app.log: T Trace b\n"));
+}
+
+void tst_TorkLogEntries::opensAtFirstEntry()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    QCOMPARE(folder.listing(), QStringList());
+    QCOMPARE(log.close(), false);
+    log.trace("x");
+    QCOMPARE(log.close(), true);
+}
+
+void tst_TorkLogEntries::reachesTheFileAtOnce()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    log.trace("1");
+    QCOMPARE(folder.listing(), QStringList("app.log: T Trace 1\n"));
+    log.trace("2");
+    QCOMPARE(folder.listing(), QStringList("app.log: T Trace 1\nT Trace 2\n"));
+}
+
+void tst_TorkLogEntries::severityName_data()
+{
+    QTest::addColumn<int>("severity");
+    QTest::addColumn<QString>("name");
+
+    QTest::newRow("0") << 0 << "Trace";
+    QTest::newRow("1") << 1 << "Notification";
+    QTest::newRow("2") << 2 << "Warning";
+    QTest::newRow("3") << 3 << "Error";
+    QTest::newRow("4") << 4 << "Fatal";
+    QTest::newRow("behind the last") << 5 << "";
+    QTest::newRow("far behind") << 2147483647 << "";
+    QTest::newRow("negative") << -1 << "";
+}
+
+void tst_TorkLogEntries::severityName()
+{
+    QFETCH(int, severity);
+    TorkLog log;
+    QTEST(log.severityName(static_cast<TorkLog::EventSeverity>(severity)), "name");
+}
+
+void tst_TorkLogEntries::severityNameIsOneBuffer()
+{
+    TorkLog log;
+    QString& name = log.severityName(TorkLog::Fatal);
+    QCOMPARE(name, QString("Fatal"));
+    QCOMPARE(&log.severityName(TorkLog::Trace), &name);
+    QCOMPARE(name, QString("Trace"));
+    log.severityName(TorkLog::EventSeverity(9));
+    QCOMPARE(name, QString(""));
+}
+
+void tst_TorkLogEntries::entriesLeaveTheSeverityNameAlone()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    QString& name = log.severityName(TorkLog::Fatal);
+
+    log.warning("x");
+    QCOMPARE(name, QString("Fatal"));
+    QCOMPARE(folder.listing(), QStringList("app.log: T Warning x\n"));
+}
+
+namespace {
+
+class Translator : public QTranslator
+{
+public:
+    QString translate(const char* context, const char* source, const char* disambiguation,
+                      int number) const override
+    {
+        if (qstrcmp(source, "Warning") != 0)
+            return QString();
+        asked = QString("%1/%2/%3").arg(context, disambiguation ? "some" : "none").arg(number);
+        return QStringLiteral("Achtung");
+    }
+    bool isEmpty() const override { return false; }
+
+    mutable QString asked;
+};
+
+} // namespace
+
+void tst_TorkLogEntries::severityNameIsTranslated()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    Translator translator;
+    QCoreApplication::installTranslator(&translator);
+
+    QCOMPARE(log.severityName(TorkLog::Warning), QString("Achtung"));
+    QCOMPARE(translator.asked, QString("QObject/none/-1"));
+    QCOMPARE(log.severityName(TorkLog::Error), QString("Error"));
+    log.warning("x");
+    QCOMPARE(folder.listing(), QStringList("app.log: T Achtung x\n"));
+    QCoreApplication::removeTranslator(&translator);
+}
+
+void tst_TorkLogEntries::messageHandler_data()
+{
+    QTest::addColumn<int>("type");
+    QTest::addColumn<QByteArray>("expected");
+
+    QTest::newRow("debug") << int(QtDebugMsg) << QByteArray("Trace");
+    QTest::newRow("info") << int(QtInfoMsg) << QByteArray("Trace");
+    QTest::newRow("warning") << int(QtWarningMsg) << QByteArray("Warning");
+    QTest::newRow("critical") << int(QtCriticalMsg) << QByteArray("Error");
+    QTest::newRow("fatal does not abort by itself") << int(QtFatalMsg) << QByteArray("Fatal");
+    QTest::newRow("any other") << 99 << QByteArray("Trace");
+}
+
+// Whatever the context: it is not used.
+void tst_TorkLogEntries::messageHandler()
+{
+    QFETCH(int, type);
+    QFETCH(QByteArray, expected);
+    LogFolder folder;
+    TorkLog::initialize(folder.logs(), "app", QString(), true);
+
+    const QMessageLogContext none;
+    const QMessageLogContext some("file.cpp", 7, "void f()", "some.category");
+    TorkLog_MessageHandler(static_cast<QtMsgType>(type), none, QStringLiteral("x"));
+    TorkLog_MessageHandler(static_cast<QtMsgType>(type), some, QStringLiteral("y %1"));
+    const QByteArray start = QByteArray(stampOfNow) + ' ' + expected;
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), start + " x\n" + start + " y %1\n");
+}
+
+void tst_TorkLogEntries::messageHandlerWithoutLog()
+{
+    LogFolder folder;
+    QVERIFY(QDir::setCurrent(folder.root()));
+    TorkLog_MessageHandler(QtWarningMsg, QMessageLogContext(), QStringLiteral("lost"));
+    QCOMPARE(TestFiles::listing(folder.root()), QStringList("logs/"));
+    QVERIFY(QDir::setCurrent("/"));
+}
+
+void tst_TorkLogEntries::toolkitMessages_data()
+{
+    QTest::addColumn<int>("type");
+    QTest::addColumn<QByteArray>("expected");
+
+    QTest::newRow("debug stream") << 0 << QByteArray("Trace a \"b\\n\" 3");
+    QTest::newRow("debug text") << 1 << QByteArray("Trace a 3");
+    QTest::newRow("info") << 2 << QByteArray("Trace a");
+    QTest::newRow("warning") << 3 << QByteArray("Warning a");
+    QTest::newRow("critical") << 4 << QByteArray("Error a");
+    QTest::newRow("of the toolkit itself")
+        << 5 << QByteArray("Warning QDir::mkpath: Empty or null file name");
+}
+
+void tst_TorkLogEntries::toolkitMessages()
+{
+    QFETCH(int, type);
+    QFETCH(QByteArray, expected);
+    LogFolder folder;
+    TorkLog::initialize(folder.logs(), "app", QString(), true);
+
+    if (type == 0)
+        qDebug() << "a" << QString("b\n") << 3;
+    else if (type == 1)
+        qDebug("a %d", 3);
+    else if (type == 2)
+        qInfo("a");
+    else if (type == 3)
+        qWarning("a");
+    else if (type == 4)
+        qCritical("a");
+    else
+        QDir().mkpath(QString());
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"),
+             QByteArray(stampOfNow) + ' ' + expected + '\n');
+}
+
+namespace {
+
+// Cases for a process of their own; the first argument is the log directory.
+
+TorkLog* startLog(QString const& path)
+{
+    TestClock::set(now());
+    return TorkLog::initialize(path, QStringLiteral("app"), QString(), true);
+}
+
+int endsFatally(QStringList const& arguments)
+{
+    ProcessLimits::leaveNoCoreFile();
+    startLog(arguments.at(0));
+    qFatal("the end");
+    return 0;
+}
+
+int echoes(QStringList const& arguments)
+{
+    TorkLog* const log = startLog(arguments.at(0));
+    log->setLogPipeToConsole(true);
+    if (arguments.at(1) == "ready")
+        log->write(arguments.at(2));
+    else
+        log->warning(arguments.at(2));
+    return 0;
+}
+
+int echoesMessages(QStringList const& arguments)
+{
+    TorkLog* const log = startLog(arguments.at(0));
+    log->setLogPipeToConsole(true);
+    log->trace("entry");
+    qWarning("message");
+    log->setLogPipeToConsole(false);
+    qWarning("not echoed");
+    return 0;
+}
+
+int echoesOfAnotherLog(QStringList const& arguments)
+{
+    TorkLog log(arguments.at(0));
+    log.setEnable(true);
+    log.setLogPipeToConsole(true);
+    log.write(QStringLiteral("x\n"));
+    const QtMessageHandler installed = qInstallMessageHandler(nullptr);
+    return installed == TorkLog_MessageHandler ? 0 : 1;
+}
+
+int echoesNothing(QStringList const& arguments)
+{
+    TorkLog* const log = startLog(arguments.at(0));
+    if (arguments.at(1) == "switched off") {
+        log->setLogPipeToConsole(false);
+    } else if (arguments.at(1) == "log off") {
+        log->setLogPipeToConsole(true);
+        log->setEnable(false);
+    } else {
+        log->setLogPipeToConsole(true);
+        log->setOutputPath(arguments.at(0) + "missing/without/slash");
+    }
+    log->warning("x");
+    return 0;
+}
+
+// The toolkit complains about the empty path while the log's own lock is held.
+int warnsUnderTheLock(QStringList const& arguments)
+{
+    TorkLog* const log = startLog(arguments.at(0));
+    log->setLogPipeToConsole(arguments.at(1) == "echo");
+    log->setOutputPath(QString());
+    if (arguments.at(1) == "message")
+        qWarning("x");
+    else
+        log->warning("x");
+    log->setLogPipeToConsole(false);
+    qWarning("later");
+    return 0;
+}
+
+class TalkingTranslator : public QTranslator
+{
+public:
+    QString translate(const char*, const char*, const char*, int) const override
+    {
+        if (!m_asked) {
+            m_asked = true;
+            qDebug("asked for a translation");
+        }
+        return QString();
+    }
+    bool isEmpty() const override { return false; }
+
+private:
+    mutable bool m_asked = false;
+};
+
+int talksWhileAnEntryIsBuilt(QStringList const& arguments)
+{
+    TorkLog* const log = startLog(arguments.at(0));
+    TalkingTranslator translator;
+    QCoreApplication::installTranslator(&translator);
+    log->warning("x");
+    QCoreApplication::removeTranslator(&translator);
+    return 0;
+}
+
+const QByteArray stamped(const char* text)
+{
+    return QByteArray(stampOfNow) + ' ' + text;
+}
+
+} // namespace
+
+void tst_TorkLogEntries::fatalMessage()
+{
+    LogFolder folder;
+    const ChildProcess::Result child = ChildProcess::run("fatal", {folder.logs()});
+    QVERIFY2(child.inTime && child.crashed, child.report());
+    QCOMPARE(child.exitCode, SIGABRT);
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), stamped("Fatal the end\n"));
+}
+
+void tst_TorkLogEntries::echo_data()
+{
+    QTest::addColumn<QString>("kind");
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QByteArray>("echoed");
+    QTest::addColumn<QByteArray>("written");
+
+    QTest::newRow("entry is quoted, its line end escaped")
+        << "entry"
+        << "x" << '"' + stamped("Warning x\\n\"\n") << stamped("Warning x\n");
+    QTest::newRow("quotes and backslashes are escaped")
+        << "entry"
+        << "a \"b\" \\" << '"' + stamped("Warning a \\\"b\\\" \\\\\\n\"\n")
+        << stamped("Warning a \"b\" \\\n");
+    QTest::newRow("letters beyond Latin-1 are echoed")
+        << "entry" << QString::fromUtf8("ä€") << '"' + stamped("Warning ä€\\n\"\n")
+        << stamped("Warning \xE4?\n");
+    QTest::newRow("ready line") << "ready"
+                                << "x" << QByteArray("\"x\"\n") << QByteArray("x");
+    QTest::newRow("markers are text")
+        << "ready"
+        << "%1 %{type} %s" << QByteArray("\"%1 %{type} %s\"\n") << QByteArray("%1 %{type} %s");
+}
+
+void tst_TorkLogEntries::echo()
+{
+    QFETCH(QString, kind);
+    QFETCH(QString, text);
+    LogFolder folder;
+    const ChildProcess::Result child = ChildProcess::run("echo", {folder.logs(), kind, text});
+    QVERIFY2(child.ended(), child.report());
+    QTEST(child.errors, "echoed");
+    QCOMPARE(child.output, QByteArray());
+    QTEST(TestFiles::read(folder.logs() + "app.log"), "written");
+}
+
+void tst_TorkLogEntries::echoStaysOutOfTheLog()
+{
+    LogFolder folder;
+    const ChildProcess::Result child = ChildProcess::run("echo of messages", {folder.logs()});
+    QVERIFY2(child.ended(), child.report());
+    QCOMPARE(child.errors,
+             '"' + stamped("Trace entry\\n\"\n") + '"' + stamped("Warning message\\n\"\n"));
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), stamped("Trace entry\n") +
+                                                             stamped("Warning message\n") +
+                                                             stamped("Warning not echoed\n"));
+}
+
+// Also where it was not installed before: that is how the toolkit's messages find back.
+void tst_TorkLogEntries::echoInstallsTheMessageHandler()
+{
+    LogFolder folder;
+    const ChildProcess::Result child = ChildProcess::run("echo of another log", {folder.logs()});
+    QVERIFY2(child.ended(), child.report());
+    QCOMPARE(child.errors, QByteArray("\"x\\n\"\n"));
+}
+
+void tst_TorkLogEntries::nothingToEcho_data()
+{
+    QTest::addColumn<QString>("reason");
+
+    QTest::newRow("switched off") << "switched off";
+    QTest::newRow("log off") << "log off";
+    QTest::newRow("no file") << "no file";
+}
+
+void tst_TorkLogEntries::nothingToEcho()
+{
+    QFETCH(QString, reason);
+    LogFolder folder;
+    const ChildProcess::Result child = ChildProcess::run("no echo", {folder.logs(), reason});
+    QVERIFY2(child.ended(), child.report());
+    QCOMPARE(child.errors, QByteArray());
+    QCOMPARE(child.output, QByteArray());
+}
+
+void tst_TorkLogEntries::messageUnderTheLock_data()
+{
+    QTest::addColumn<QString>("kind");
+    QTest::addColumn<QByteArray>("errors");
+
+    const QByteArray complaint = "QDir::mkpath: Empty or null file name\n";
+    QTest::newRow("entry") << "entry" << complaint;
+    QTest::newRow("message") << "message" << complaint;
+    QTest::newRow("entry with echo") << "echo" << complaint + '"' + stamped("Warning x\\n\"\n");
+}
+
+// It goes to the toolkit's default output, once, and the entry is written.
+void tst_TorkLogEntries::messageUnderTheLock()
+{
+    QFETCH(QString, kind);
+    LogFolder folder;
+    QVERIFY(QDir(folder.root()).mkdir("work"));
+    const ChildProcess::Result child =
+        ChildProcess::run("message under the lock", {folder.logs(), kind}, folder.root() + "work");
+    QVERIFY2(child.ended(), child.report());
+    QTEST(child.errors, "errors");
+    QCOMPARE(TestFiles::listing(folder.root() + "work"),
+             QStringList("app.log: " + stamped("Warning x\n") + stamped("Warning later\n")));
+}
+
+// A message that is raised there is an entry like any other.
+void tst_TorkLogEntries::entryIsBuiltOutsideTheLock()
+{
+    LogFolder folder;
+    const ChildProcess::Result child =
+        ChildProcess::run("message of a translator", {folder.logs()});
+    QVERIFY2(child.ended(), child.report());
+    QCOMPARE(child.errors, QByteArray());
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"),
+             stamped("Trace asked for a translation\n") + stamped("Warning x\n"));
+}
+
+int main(int argc, char** argv)
+{
+    return ChildProcess::main<tst_TorkLogEntries>(
+        argc, argv,
+        {{"fatal", endsFatally},
+         {"echo", echoes},
+         {"echo of messages", echoesMessages},
+         {"echo of another log", echoesOfAnotherLog},
+         {"no echo", echoesNothing},
+         {"message under the lock", warnsUnderTheLock},
+         {"message of a translator", talksWhileAnEntryIsBuilt}});
+}
+
+#include "tst_TorkLogEntries.moc"

@@ -1,0 +1,295 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "common/log/TorkLog.h"
+#include "log/LogFolder.h"
+#include "support/ChildProcess.h"
+
+#include <QDebug>
+#include <QRegularExpression>
+#include <QtTest>
+
+#include <algorithm>
+#include <atomic>
+#include <functional>
+#include <thread>
+#include <vector>
+
+/// Eight threads write at once: every entry is whole and none is lost. Built for ThreadSanitizer,
+/// the program also fails on every data race; tests/support/ThreadSanitizerMutex.cpp makes the
+/// toolkit's mutexes known to it.
+class tst_TorkLogThreads : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void init();
+    void cleanup();
+
+    void entries_data();
+    void entries();
+    void rotationUnderWay();
+    void settingsChangedMeanwhile();
+    void severitiesAreNotExchanged();
+    void echo();
+    void shutdownMeanwhile();
+
+private:
+    QtMessageHandler m_handler;
+};
+
+namespace {
+
+const int threadCount = 8;
+const int entriesEach = 500;
+
+// Starts all threads at once and waits for them; each is given its number.
+void inThreads(std::function<void(int)> const& work)
+{
+    std::atomic<int> ready{0};
+    std::vector<std::thread> threads;
+    for (int number = 0; number < threadCount; ++number) {
+        threads.emplace_back([&, number] {
+            for (++ready; ready < threadCount;)
+                std::this_thread::yield();
+            work(number);
+        });
+    }
+    for (std::thread& thread : threads)
+        thread.join();
+}
+
+QString text(int thread, int entry)
+{
+    // Lengths differ, lest torn entries fit together again.
+    return QString("<%1.%2 %3>").arg(thread).arg(entry).arg(QString(thread * 7 + entry % 5, 'x'));
+}
+
+QStringList allTexts()
+{
+    QStringList texts;
+    for (int thread = 0; thread < threadCount; ++thread) {
+        for (int entry = 0; entry < entriesEach; ++entry)
+            texts.append(text(thread, entry));
+    }
+    texts.sort();
+    return texts;
+}
+
+// The messages of the entries, each of which has to match `start` before its message.
+QStringList messages(QByteArray const& entries, QString const& start)
+{
+    const QRegularExpression whole("^" + start + " (<[^<>]*>)$");
+    QStringList found;
+    QStringList lines = QString::fromLatin1(entries).split('\n');
+    if (!lines.takeLast().isEmpty())
+        return QStringList("(the last line has no end)");
+    for (QString const& line : lines) {
+        const QRegularExpressionMatch match = whole.match(line);
+        found.append(match.hasMatch() ? match.captured(1) : "(broken) " + line);
+    }
+    found.sort();
+    return found;
+}
+
+} // namespace
+
+void tst_TorkLogThreads::init()
+{
+    m_handler = qInstallMessageHandler(nullptr);
+    qInstallMessageHandler(m_handler);
+}
+
+void tst_TorkLogThreads::cleanup()
+{
+    TorkLog::shutdown();
+    qInstallMessageHandler(m_handler);
+}
+
+void tst_TorkLogThreads::entries_data()
+{
+    QTest::addColumn<QString>("kind");
+    QTest::addColumn<bool>("elapsedTime");
+    QTest::addColumn<QString>("start");
+
+    const QString stamp = "\\d{4}-\\d\\d-\\d\\d \\d\\d:\\d\\d:\\d\\d\\.\\d+ ";
+    QTest::newRow("entries") << "entry" << false << stamp + "Error";
+    QTest::newRow("entries with elapsed time")
+        << "entry" << true << stamp + "Error dT:\\[-?\\d+\\]";
+    QTest::newRow("ready lines") << "line" << false << "ready";
+    QTest::newRow("messages of the toolkit") << "message" << false << stamp + "Warning";
+    QTest::newRow("debug streams") << "stream" << true << stamp + "Trace dT:\\[-?\\d+\\]";
+}
+
+void tst_TorkLogThreads::entries()
+{
+    QFETCH(QString, kind);
+    QFETCH(bool, elapsedTime);
+    QFETCH(QString, start);
+    LogFolder folder;
+    TorkLog* const log = TorkLog::initialize(folder.logs(), "app", QString(), true);
+    log->setLogElapsedTime(elapsedTime);
+
+    inThreads([&](int thread) {
+        for (int entry = 0; entry < entriesEach; ++entry) {
+            if (kind == "entry")
+                log->error(text(thread, entry));
+            else if (kind == "line")
+                log->write("ready " + text(thread, entry) + '\n');
+            else if (kind == "message")
+                qWarning("%s", qPrintable(text(thread, entry)));
+            else
+                qDebug().noquote() << text(thread, entry);
+        }
+    });
+    QCOMPARE(messages(TestFiles::read(folder.logs() + "app.log"), start), allTexts());
+}
+
+// Nobody closes the file in earnest while others write; each opening may rotate it, though.
+void tst_TorkLogThreads::rotationUnderWay()
+{
+    LogFolder folder;
+    TorkLog log;
+    log.setOutputPath(folder.logs());
+    folder.configure(
+        log, {{"filePrefix", "app"}, {"maxLogFileSize", "100"}, {"maxLogFiles", "2147483647"}});
+
+    inThreads([&](int thread) {
+        for (int entry = 0; entry < entriesEach; ++entry) {
+            log.error(text(thread, entry));
+            if (entry % 100 == 99)
+                log.close();
+        }
+    });
+
+    // An opening with room left writes over the start of the file: that is not what this is about.
+    const QStringList files = folder.listing();
+    QVERIFY(files.size() > 1);
+    QVERIFY(files.size() <= threadCount * entriesEach / 100 + 1);
+}
+
+void tst_TorkLogThreads::settingsChangedMeanwhile()
+{
+    LogFolder folder;
+    TorkLog* const log = TorkLog::initialize(folder.logs(), "app", QString(), true);
+
+    inThreads([&](int thread) {
+        for (int entry = 0; entry < entriesEach; ++entry) {
+            if (thread == 0) {
+                log->setLogElapsedTime(entry % 2);
+                log->setMaxLogFiles(1 + entry % 9);
+                log->setMaxLogFileSize(4000000000u);
+            }
+            log->error(text(thread, entry));
+        }
+    });
+    QCOMPARE(messages(TestFiles::read(folder.logs() + "app.log"),
+                      "[-0-9]+ [:.0-9]+ Error(?: dT:\\[-?\\d+\\])?"),
+             allTexts());
+}
+
+void tst_TorkLogThreads::severitiesAreNotExchanged()
+{
+    const QStringList severities = {"Trace", "Notification", "Warning", "Error", "Fatal"};
+    LogFolder folder;
+    TorkLog* const log = TorkLog::initialize(folder.logs(), "app", QString(), true);
+    inThreads([&](int thread) {
+        for (int entry = 0; entry < entriesEach; ++entry)
+            log->write(thread % 5, text(thread, entry));
+    });
+
+    const QStringList lines =
+        QString::fromLatin1(TestFiles::read(folder.logs() + "app.log")).split('\n');
+    const QRegularExpression parts("^[-0-9]+ [:.0-9]+ ([A-Z][a-z]+) <(\\d)");
+    QCOMPARE(lines.size(), threadCount * entriesEach + 1);
+    for (int i = 0; i < lines.size() - 1; ++i) {
+        const QRegularExpressionMatch match = parts.match(lines[i]);
+        QCOMPARE(match.captured(1), severities.value(match.captured(2).toInt() % 5));
+    }
+}
+
+namespace {
+
+// Half of the threads write entries that are echoed, half raise messages.
+int echoes(QStringList const& arguments)
+{
+    TorkLog* const log =
+        TorkLog::initialize(arguments.at(0), QStringLiteral("app"), QString(), true);
+    log->setLogPipeToConsole(true);
+    inThreads([&](int thread) {
+        for (int entry = 0; entry < entriesEach; ++entry) {
+            if (thread % 2)
+                log->error(text(thread, entry));
+            else
+                qWarning("%s", qPrintable(text(thread, entry)));
+        }
+    });
+    return 0;
+}
+
+} // namespace
+
+// Nothing is lost between log and console: a message that finds the handler removed goes to the
+// console alone.
+void tst_TorkLogThreads::echo()
+{
+    LogFolder folder;
+    const ChildProcess::Result child = ChildProcess::run("echo", {folder.logs()});
+    QVERIFY2(child.ended(), child.report());
+
+    const QStringList logged =
+        messages(TestFiles::read(folder.logs() + "app.log"), "[-0-9]+ [:.0-9]+ (?:Error|Warning)");
+    QStringList echoed;
+    QStringList alone;
+    QStringList lines = QString::fromLocal8Bit(child.errors).split('\n');
+    QVERIFY(lines.takeLast().isEmpty());
+    const QRegularExpression quoted("^\"[-0-9]+ [:.0-9]+ (?:Error|Warning) (<[^<>]*>)\\\\n\"$");
+    for (QString const& line : lines) {
+        const QRegularExpressionMatch match = quoted.match(line);
+        if (match.hasMatch())
+            echoed.append(match.captured(1));
+        else
+            alone.append(line);
+    }
+    echoed.sort();
+    QCOMPARE(echoed, logged);
+    QStringList all = logged + alone;
+    all.sort();
+    QCOMPARE(all, allTexts());
+}
+
+// Messages find the log or no log, nothing in between.
+void tst_TorkLogThreads::shutdownMeanwhile()
+{
+    LogFolder folder;
+    TorkLog::initialize(folder.logs(), "app", QString(), true);
+    inThreads([&](int thread) {
+        for (int entry = 0; entry < entriesEach; ++entry) {
+            if (thread == 0 && entry == entriesEach / 2)
+                TorkLog::shutdown();
+            else
+                qWarning("%s", qPrintable(text(thread, entry)));
+        }
+    });
+    QVERIFY(!TorkLog::logger());
+
+    QStringList written =
+        messages(TestFiles::read(folder.logs() + "app.log"), "[-0-9]+ [:.0-9]+ Warning");
+    QVERIFY(written.size() >= entriesEach / 2);
+    const QStringList all = allTexts();
+    for (QString const& message : written)
+        QVERIFY2(std::binary_search(all.begin(), all.end(), message), qPrintable(message));
+    QCOMPARE(written.removeDuplicates(), 0);
+}
+
+int main(int argc, char** argv)
+{
+    // Without a time zone in the environment the C library reads the system's anew for every local
+    // time, under a lock that ThreadSanitizer does not see.
+    qputenv("TZ", "UTC");
+    QDateTime::currentDateTime().toString();
+
+    return ChildProcess::main<tst_TorkLogThreads>(argc, argv, {{"echo", echoes}});
+}
+
+#include "tst_TorkLogThreads.moc"
