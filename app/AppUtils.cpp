@@ -114,7 +114,8 @@ bool AppUtils::UpdateMRUList(QString const& file, QString& list, int maxCount, M
     if (!Update(entries, file, op))
         return false;
 
-    list = QStringList(entries.mid(0, qMax(0, maxCount))).join(Separator);
+    // Empty, never null: a null text is refused by the settings, which would keep the old list.
+    list = QLatin1String("") + QStringList(entries.mid(0, qMax(0, maxCount))).join(Separator);
     return true;
 }
 

@@ -29,7 +29,7 @@ void CriticalMessage(QWidget* parent, QString const& text, bool show)
     const QString shown = text; // the original may change or go while the box is open
     if (show)
         QMessageBox::critical(parent, Caption(), shown, QMessageBox::Ok, QMessageBox::NoButton);
-    QMessageLogger().critical() << OnOneLine(shown);
+    QMessageLogger(nullptr, 0, nullptr).critical() << OnOneLine(shown);
 }
 
 void WarningMessage(QWidget* parent, QString const& text, bool show)
@@ -37,7 +37,7 @@ void WarningMessage(QWidget* parent, QString const& text, bool show)
     const QString shown = text;
     if (show)
         QMessageBox::warning(parent, Caption(), shown, QMessageBox::Ok, QMessageBox::NoButton);
-    QMessageLogger().warning() << OnOneLine(shown);
+    QMessageLogger(nullptr, 0, nullptr).warning() << OnOneLine(shown);
 }
 
 void DebugMessage(QWidget* parent, QString const& text, bool show)
@@ -45,7 +45,7 @@ void DebugMessage(QWidget* parent, QString const& text, bool show)
     const QString shown = text;
     if (show)
         QMessageBox::information(parent, Caption(), shown, QMessageBox::Ok, QMessageBox::NoButton);
-    QMessageLogger().debug() << OnOneLine(shown);
+    QMessageLogger(nullptr, 0, nullptr).debug() << OnOneLine(shown);
 }
 
 QString& StripFormatting(QString& text)

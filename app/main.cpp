@@ -48,6 +48,6 @@ int main(int argc, char** argv)
     window.show();
     TellLogFileWithoutScreen();
 
-    QMessageLogger().debug() << "app.exec() starting";
+    QMessageLogger(nullptr, 0, nullptr).debug() << "app.exec() starting";
     return QApplication::exec();
 }

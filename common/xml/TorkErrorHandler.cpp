@@ -13,7 +13,7 @@ TorkErrorHandler::~TorkErrorHandler() = default;
 
 bool TorkErrorHandler::warning(QXmlParseException const& exception)
 {
-    QMessageLogger().warning() << format(exception);
+    QMessageLogger(nullptr, 0, nullptr).warning() << format(exception);
     return true;
 }
 
@@ -21,14 +21,15 @@ bool TorkErrorHandler::warning(QXmlParseException const& exception)
 bool TorkErrorHandler::error(QXmlParseException const& exception)
 {
     format(exception);
-    QMessageLogger().critical() << "TorkErrorHandler::error " << m_errorText;
+    QMessageLogger(nullptr, 0, nullptr).critical() << "TorkErrorHandler::error " << m_errorText;
     return true;
 }
 
 bool TorkErrorHandler::fatalError(QXmlParseException const& exception)
 {
     format(exception);
-    QMessageLogger().critical() << "TorkErrorHandler::fatalError: " << m_errorText;
+    QMessageLogger(nullptr, 0, nullptr).critical()
+        << "TorkErrorHandler::fatalError: " << m_errorText;
     return false;
 }
 

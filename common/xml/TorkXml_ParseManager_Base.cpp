@@ -156,7 +156,7 @@ void TorkXml_ParseManager_Base::AppendError(QString const& text)
 {
     m_errors.append(text);
     if (TorkLog::m_gLog)
-        QMessageLogger().warning() << text;
+        QMessageLogger(nullptr, 0, nullptr).warning() << text;
 }
 
 void TorkXml_ParseManager_Base::AppendError(QString const& text, int code)
