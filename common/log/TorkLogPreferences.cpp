@@ -124,7 +124,8 @@ bool TorkLog::setPreferencesFileName(QString const& name)
     if (!chosen.contains(QLatin1Char('/'))) {
         const QString directory = path();
         const bool endsInSlash = directory.lastIndexOf(QLatin1Char('/')) == directory.length() - 1;
-        chosen = endsInSlash ? directory + chosen : directory + QLatin1Char('/') + chosen;
+        const QString separator = endsInSlash ? QString() : QStringLiteral("/");
+        chosen = directory + separator + chosen;
     }
     m_preferencesFileName = chosen;
     return true;

@@ -44,7 +44,7 @@ public:
     QString& format(QXmlParseException const& exception);
 
 private:
-    TorkLog* m_log;
+    [[maybe_unused]] TorkLog* m_log; // messages reach it through the toolkit
     QString m_errorText;
     QString m_detailText;
 };

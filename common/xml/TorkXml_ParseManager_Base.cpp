@@ -47,9 +47,9 @@ bool TorkXml_ParseManager_Base::endPrefixMapping(QString const&)
 bool TorkXml_ParseManager_Base::startElement(QString const&, QString const& localName,
                                              QString const&, QXmlAttributes const& attributes)
 {
-    if (m_elements.size() >= TorkXmlMaximumDepth)
-        return false;
     PushElement(localName);
+    if (m_elements.size() > TorkXmlMaximumDepth)
+        return false;
 
     if (m_states.isEmpty()) {
         TorkXml_ParseState_Base* first = GetFirstState(localName);
