@@ -18,6 +18,12 @@ void Publish(char const* property, QString const& path)
         application->setProperty(property, path);
 }
 
+QString& StoredProductName()
+{
+    static QString name = QLatin1String("");
+    return name;
+}
+
 void TakeValue(LaunchOptionParser const& parser, QString const& key, QString& value)
 {
     LaunchOption const* option = parser.FindOption(key);
@@ -53,12 +59,18 @@ void AppPaths::SetOrganizationAndProduct()
 
 void AppPaths::SetOrganizationAndProduct(QString const& organization, QString const& product)
 {
+    StoredProductName() = product;
     AppUtils::SetOrganizationAndProduct(organization, product);
 
     QString root, data, documents;
     SetupRootPath(root);
     SetupDataRootPath(data);
     SetupDocumentPath(documents);
+}
+
+QString const& AppPaths::ProductName()
+{
+    return StoredProductName();
 }
 
 void AppPaths::SetupRootPath(QString& path)

@@ -25,6 +25,10 @@ public:
     /// Sets the given names, which the data directory depends on, and publishes the directories.
     static void SetOrganizationAndProduct(QString const& organization, QString const& product);
 
+    /// The product name that was set last; empty if it was set empty, where the application object
+    /// answers with the executable's name instead.
+    static QString const& ProductName();
+
     /// The installation root: the folder that holds the application bundle, or else the parent of
     /// the executable's folder. Published as "RootPath".
     ///

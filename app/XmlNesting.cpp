@@ -45,7 +45,7 @@ char const* SkipDocumentType(char const* text)
 char const* SkipSpecial(char const* text)
 {
     if (*text == '?')
-        return Behind(text, "?>");
+        return Behind(text + 1, "?>");
     if (StartsWith(text, "!--"))
         return Behind(text + 3, "-->");
     if (StartsWith(text, "![CDATA["))

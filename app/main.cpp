@@ -16,7 +16,7 @@ namespace {
 
 QString Caption()
 {
-    const QString product = QCoreApplication::applicationName();
+    QString const& product = AppPaths::ProductName();
     return product.isEmpty() ? QStringLiteral("Velocor") : product;
 }
 

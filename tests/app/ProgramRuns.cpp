@@ -1,0 +1,55 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "ProgramRuns.h"
+
+#include <QDir>
+#include <QFile>
+#include <QProcess>
+
+bool CopyProgram(QString const& program, QString const& folder, QString const& name)
+{
+    return QDir().mkpath(folder) && QFile::copy(program, folder + "/" + name);
+}
+
+QProcessEnvironment PrivateEnvironment(QString const& folder)
+{
+    QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
+    const struct
+    {
+        char const* variable;
+        char const* name;
+    } folders[] = {{"HOME", "home"},
+                   {"XDG_DATA_HOME", "data"},
+                   {"XDG_CONFIG_HOME", "config"},
+                   {"XDG_RUNTIME_DIR", "run"}};
+    for (auto const& entry : folders) {
+        const QString path = folder + "/" + entry.name;
+        QDir().mkpath(path);
+        environment.insert(entry.variable, path);
+    }
+    // The toolkit warns of a runtime folder that others may enter.
+    QFile::setPermissions(folder + "/run", QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+    environment.insert("LC_ALL", "C.UTF-8");
+    // What the platform plug-in remarks about the desktop is no part of what is tested.
+    environment.insert("QT_LOGGING_RULES", "qt.qpa.*=false");
+    // Some releases of the toolkit remark upon this name.
+    environment.remove("QT_LOGGING_TO_CONSOLE");
+    return environment;
+}
+
+ProgramResult RunProgram(QString const& program, QStringList const& arguments,
+                         QProcessEnvironment const& environment)
+{
+    QProcess process;
+    process.setProcessEnvironment(environment);
+    process.start(program, arguments);
+
+    ProgramResult result;
+    const bool ended = process.waitForFinished(60000);
+    result.finished = ended && process.exitStatus() == QProcess::NormalExit;
+    result.exitCode = process.exitCode();
+    result.output = process.readAllStandardOutput();
+    result.errors = process.readAllStandardError();
+    return result;
+}
