@@ -3,56 +3,438 @@
 
 #include "app/window/MainWindow.h"
 
-#include "common/log/TorkLog.h"
+#include "app/UserMessages.h"
+#include "app/window/FileTabs.h"
+#include "app/window/LogHealth.h"
+#include "app/window/LogPanel.h"
+#include "app/window/LogSettingsDialog.h"
+#include "app/window/NoticeBar.h"
+#include "app/window/PlacesPanel.h"
+#include "app/window/RecentFiles.h"
+#include "app/window/ReportDialog.h"
+#include "app/window/RunningLog.h"
+#include "app/window/SelectableMessageBoxes.h"
+#include "app/window/SettingsEditor.h"
+#include "app/window/SystemReport.h"
 
-#include <QCoreApplication>
-#include <QFormLayout>
+#include <QApplication>
+#include <QCloseEvent>
+#include <QDesktopWidget>
+#include <QFileDialog>
 #include <QLabel>
+#include <QMenuBar>
+#include <QMessageBox>
+#include <QMimeData>
+#include <QSplitter>
+#include <QStatusBar>
+#include <QUrl>
+#include <QVBoxLayout>
 #include <QVariant>
 
+// Resources of a static library have to be asked for, from outside of any namespace.
+static void InitResources()
+{
+    Q_INIT_RESOURCE(window);
+}
+
 namespace {
+
+constexpr int HealthInterval = 2000; // milliseconds
+constexpr int MessageTime = 6000;    // milliseconds
+constexpr int MostDropped = 20;
 
 QString Property(char const* name)
 {
     return QCoreApplication::instance()->property(name).toString();
 }
 
-QString LogFile()
+QIcon WindowIcon()
 {
-    TorkLog* log = TorkLog::logger();
-    return log ? log->newLogFileName() : QString();
-}
-
-void AddRow(QFormLayout* layout, QString const& caption, QString const& text)
-{
-    auto* value = new QLabel(text);
-    value->setTextFormat(Qt::PlainText);
-    value->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
-    value->setAccessibleName(caption);
-
-    auto* label = new QLabel(caption + QLatin1Char(':'));
-    label->setBuddy(value);
-    layout->addRow(label, value);
+    QIcon icon;
+    for (int size : {16, 32, 48, 128})
+        icon.addFile(QStringLiteral(":/velocor/velocor-%1.png").arg(size), QSize(size, size));
+    return icon;
 }
 
 } // namespace
 
-MainWindow::MainWindow(QWidget* parent) : QMainWindow(parent)
+MainWindow::MainWindow(QWidget* parent)
+    : QMainWindow(parent), m_settings(Property("DataPath")), m_notice(new NoticeBar),
+      m_splitter(new QSplitter), m_places(new PlacesPanel(m_settings.fileName())),
+      m_tabs(new FileTabs), m_summary(new QLabel), m_health(new QLabel)
 {
+    InitResources();
+    QGuiApplication::setWindowIcon(WindowIcon());
+    QGuiApplication::setDesktopFileName(QStringLiteral("org.tork.velocor"));
     setWindowTitle(Property("caption"));
-
-    auto* content = new QWidget;
-    auto* layout = new QFormLayout(content);
-    layout->setContentsMargins(24, 24, 24, 24);
-    layout->setHorizontalSpacing(16);
-    layout->setVerticalSpacing(10);
-    AddRow(layout, tr("Organization"), QCoreApplication::organizationName());
-    AddRow(layout, tr("Product"), QCoreApplication::applicationName());
-    AddRow(layout, tr("Installation"), Property("RootPath"));
-    AddRow(layout, tr("Data"), Property("DataPath"));
-    AddRow(layout, tr("Documents"), Property("DocPath"));
-    AddRow(layout, tr("Log file"), LogFile());
-    setCentralWidget(content);
+    setAcceptDrops(true);
+    new SelectableMessageBoxes(this);
+    makeContent();
+    makeStatusBar();
+    makeMenus();
+    restoreState();
+    updateState();
 }
 
-MainWindow::~MainWindow() = default;
+// A window that is deleted unclosed is hidden then, which ends the editing of a cell.
+MainWindow::~MainWindow()
+{
+    disconnect(m_tabs, nullptr, this, nullptr);
+}
+
+void MainWindow::makeContent()
+{
+    m_splitter->setAccessibleName(tr("Places and files"));
+    m_splitter->setChildrenCollapsible(false);
+    m_splitter->addWidget(m_places);
+    m_splitter->addWidget(m_tabs);
+    m_splitter->setStretchFactor(1, 1);
+    m_splitter->setSizes({250, 750});
+
+    auto* content = new QWidget;
+    auto* layout = new QVBoxLayout(content);
+    layout->setContentsMargins(0, 0, 0, 0);
+    layout->setSpacing(0);
+    layout->addWidget(m_notice);
+    layout->addWidget(m_splitter, 1);
+    setCentralWidget(content);
+
+    connect(m_places, &PlacesPanel::Said, this, &MainWindow::say);
+    connect(m_tabs, &FileTabs::Said, this, &MainWindow::say);
+    connect(m_tabs, &FileTabs::StateChanged, this, &MainWindow::updateState);
+    m_tabs->ownLog()->setFocus();
+}
+
+void MainWindow::makeStatusBar()
+{
+    m_health->setAccessibleName(tr("State of the log"));
+    m_health->setTextFormat(Qt::PlainText);
+    m_health->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
+    m_health->setContentsMargins(6, 0, 0, 0);
+    m_summary->setAccessibleName(tr("Lines shown"));
+    m_summary->setContentsMargins(0, 0, 6, 0);
+    statusBar()->setAccessibleName(tr("Status"));
+    statusBar()->addWidget(m_health, 1);
+    statusBar()->addPermanentWidget(m_summary);
+}
+
+QAction* MainWindow::addAction(QMenu* menu, QString const& text, QKeySequence const& shortcut,
+                               QString const& statusTip, std::function<void()> const& work)
+{
+    QAction* action = menu->addAction(text);
+    action->setShortcut(shortcut);
+    action->setStatusTip(statusTip);
+    action->setMenuRole(QAction::NoRole);
+    connect(action, &QAction::triggered, this, work);
+    return action;
+}
+
+QAction* MainWindow::addSwitch(QMenu* menu, QString const& text, QKeySequence const& shortcut,
+                               QString const& statusTip, std::function<void(bool)> const& work)
+{
+    QAction* action = addAction(menu, text, shortcut, statusTip, [] {});
+    action->setCheckable(true);
+    connect(action, &QAction::triggered, this, work);
+    return action;
+}
+
+void MainWindow::makeMenus()
+{
+    menuBar()->setAccessibleName(tr("Menus"));
+    makeFileMenu();
+    makeEditMenu();
+    makeViewMenu();
+    makeHelpMenu();
+}
+
+void MainWindow::makeFileMenu()
+{
+    QMenu* menu = menuBar()->addMenu(tr("&File"));
+    addAction(menu, tr("&Open..."), QKeySequence::Open, tr("Open a log file or a settings file"),
+              [this] { chooseFile(); });
+    m_recentMenu = menu->addMenu(tr("Open &Recent"));
+    m_recent = new RecentFiles(m_recentMenu, this);
+    connect(m_recent, &RecentFiles::Chosen, this, &MainWindow::OpenFile);
+    m_save = addAction(menu, tr("&Save"), QKeySequence::Save, tr("Save the settings file in front"),
+                       [this] { m_tabs->currentEditor()->Save(); });
+    m_close = addAction(menu, tr("&Close Tab"), QKeySequence::Close, tr("Close the file in front"),
+                        [this] { m_tabs->CloseCurrent(); });
+    menu->addSeparator();
+    addAction(menu, tr("Open Log &Folder"), QKeySequence(tr("Ctrl+Shift+O")),
+              tr("Show the log files in the file manager"), [this] { openLogFolder(); });
+    addAction(menu, tr("Save Re&port..."), QKeySequence(tr("Ctrl+Shift+R")),
+              tr("Collect what a bug report needs, look at it and save it"),
+              [this] { saveReport(); });
+    menu->addSeparator();
+    QAction* quit = addAction(menu, tr("&Quit"), QKeySequence(tr("Ctrl+Q")),
+                              tr("Close the program"), [this] { close(); });
+    quit->setMenuRole(QAction::QuitRole);
+}
+
+void MainWindow::makeEditMenu()
+{
+    QMenu* menu = menuBar()->addMenu(tr("&Edit"));
+    addAction(menu, tr("&Copy"), QKeySequence::Copy, tr("Copy the selected lines"),
+              [this] { copy(); });
+    addAction(menu, tr("Select &All"), QKeySequence::SelectAll, tr("Select all lines"),
+              [this] { selectAll(); });
+    menu->addSeparator();
+    m_logActions.append(addAction(menu, tr("&Filter"), QKeySequence::Find,
+                                  tr("Show only lines that contain a text"),
+                                  [this] { m_tabs->currentLog()->FocusFilter(); }));
+    m_logActions.append(addAction(menu, tr("Clear Fi&lter"), QKeySequence(tr("Ctrl+Shift+F")),
+                                  tr("Show all lines again"),
+                                  [this] { m_tabs->currentLog()->ClearFilter(); }));
+    menu->addSeparator();
+    QAction* settings = addAction(menu, tr("Log &Settings..."), QKeySequence(tr("Ctrl+,")),
+                                  tr("Change what the log writes and how much of it is kept"),
+                                  [this] { changeLogSettings(); });
+    settings->setMenuRole(QAction::PreferencesRole);
+}
+
+void MainWindow::makeViewMenu()
+{
+    QMenu* menu = menuBar()->addMenu(tr("&View"));
+    m_showPlaces = addSwitch(menu, tr("&Places"), QKeySequence(tr("F9")),
+                             tr("Show who the program is and where its files lie"),
+                             [this](bool shown) { m_places->setVisible(shown); });
+    m_showPlaces->setChecked(true);
+    menu->addSeparator();
+    m_earlierRuns = addSwitch(menu, tr("&Earlier Runs"), QKeySequence(tr("Ctrl+Shift+E")),
+                              tr("Show what earlier runs have left in the file"),
+                              [this](bool shown) { m_tabs->currentLog()->SetEarlierRuns(shown); });
+    m_pause = addSwitch(menu, tr("P&ause"), QKeySequence(tr("Ctrl+Shift+P")),
+                        tr("Leave the view as it is while the log goes on"),
+                        [this](bool paused) { m_tabs->currentLog()->SetPaused(paused); });
+    m_follow = addSwitch(menu, tr("&Follow Newest"), QKeySequence(tr("Ctrl+Shift+N")),
+                         tr("Keep the newest entry in view"),
+                         [this](bool follow) { m_tabs->currentLog()->SetFollowing(follow); });
+    menu->addSeparator();
+    m_logActions += {m_earlierRuns, m_pause, m_follow};
+    m_logActions.append(addAction(menu, tr("&Next Problem"), QKeySequence(tr("F8")),
+                                  tr("Go to the next warning or error"),
+                                  [this] { m_tabs->currentLog()->GoToProblem(1); }));
+    m_logActions.append(addAction(menu, tr("Pre&vious Problem"), QKeySequence(tr("Shift+F8")),
+                                  tr("Go to the previous warning or error"),
+                                  [this] { m_tabs->currentLog()->GoToProblem(-1); }));
+    menu->addSeparator();
+    m_logActions.append(addAction(menu, tr("&Reload"), QKeySequence(tr("F5")),
+                                  tr("Read the file anew"),
+                                  [this] { m_tabs->currentLog()->Reload(); }));
+}
+
+void MainWindow::makeHelpMenu()
+{
+    QMenu* menu = menuBar()->addMenu(tr("&Help"));
+    QAction* about =
+        addAction(menu, tr("&About %1").arg(QStringLiteral("Velocor")), QKeySequence(tr("F1")),
+                  tr("Versions, system and directories"), [this] { showAbout(); });
+    about->setMenuRole(QAction::AboutRole);
+}
+
+void MainWindow::restoreState()
+{
+    const QSize available = QApplication::desktop()->availableGeometry(this).size();
+    resize(QSize(1080, 680).boundedTo(available * 9 / 10));
+
+    const QString damage = m_settings.Load();
+    if (!damage.isEmpty())
+        m_notice->Tell(damage);
+    m_settings.RestoreGeometry(this);
+    const QList<int> sizes = m_settings.Numbers(QStringLiteral("panes"));
+    if (sizes.size() == m_splitter->count())
+        m_splitter->setSizes(sizes);
+    m_tabs->ownLog()->SetColumnWidths(m_settings.Numbers(QStringLiteral("columns")));
+    m_tabs->ownLog()->SetPaneSizes(m_settings.Numbers(QStringLiteral("linePane")));
+    m_recent->SetList(m_settings.Text(QStringLiteral("recentFiles")));
+    const bool placesShown = m_settings.Flag(QStringLiteral("placesShown"), true);
+    m_showPlaces->setChecked(placesShown);
+    m_places->setVisible(placesShown);
+}
+
+void MainWindow::saveState()
+{
+    m_settings.NoteGeometry(this);
+    m_settings.SetFlag(QStringLiteral("placesShown"), m_showPlaces->isChecked());
+    if (m_showPlaces->isChecked())
+        m_settings.SetNumbers(QStringLiteral("panes"), m_splitter->sizes());
+    m_settings.SetNumbers(QStringLiteral("columns"), m_tabs->ownLog()->columnWidths());
+    m_settings.SetNumbers(QStringLiteral("linePane"), m_tabs->ownLog()->paneSizes());
+    m_settings.SetText(QStringLiteral("recentFiles"), m_recent->list());
+
+    // Not in a box: the window may be closing because the system is.
+    const QString error = m_settings.Save();
+    if (!error.isEmpty())
+        WarningMessage(this, error, false);
+}
+
+bool MainWindow::event(QEvent* event)
+{
+    const bool result = QMainWindow::event(event);
+    if (event->type() == QEvent::Paint && !m_painted) {
+        m_painted = true;
+        QTimer::singleShot(0, this, &MainWindow::startWork);
+    }
+    return result;
+}
+
+void MainWindow::startWork()
+{
+    m_tabs->ownLog()->Open(RunningLog::FileName(), true);
+    m_logHealth = std::make_unique<LogHealth>();
+    connect(&m_healthTimer, &QTimer::timeout, this, &MainWindow::checkLog);
+    m_healthTimer.start(HealthInterval);
+    checkLog();
+}
+
+void MainWindow::checkLog()
+{
+    const QString problem = m_logHealth->Check();
+    if (problem == m_health->text())
+        return;
+    m_health->setText(problem);
+    m_health->setToolTip(problem);
+}
+
+void MainWindow::updateState()
+{
+    LogPanel const* log = m_tabs->currentLog();
+    SettingsEditor const* editor = m_tabs->currentEditor();
+    for (QAction* action : m_logActions)
+        action->setEnabled(log != nullptr);
+    m_save->setEnabled(editor && editor->isModified());
+    m_close->setEnabled(m_tabs->currentWidget() != m_tabs->ownLog());
+    m_summary->setText(log ? log->summary() : editor->path());
+    if (!log)
+        return;
+    m_pause->setChecked(log->isPaused());
+    m_follow->setChecked(log->isFollowing());
+    m_earlierRuns->setChecked(log->showsEarlierRuns());
+}
+
+void MainWindow::say(QString const& text)
+{
+    statusBar()->showMessage(text, MessageTime);
+}
+
+void MainWindow::chooseFile()
+{
+    const QString path = QFileDialog::getOpenFileName(
+        this, tr("Open"), Property("DataPath"),
+        tr("Logs and settings (*.log *.log.* *.cfg *.xml);;All files (*)"));
+    if (!path.isEmpty())
+        OpenFile(path);
+}
+
+void MainWindow::OpenFile(QString const& path)
+{
+    const QString full = QFileInfo(path).absoluteFilePath();
+    if (!QFileInfo::exists(full)) {
+        offerToForget(path);
+        return;
+    }
+    if (QFileInfo(full).isDir()) {
+        say(tr("%1 is a folder").arg(full));
+        return;
+    }
+    m_tabs->OpenFile(full);
+    m_recent->Add(full);
+}
+
+bool MainWindow::offerToForget(QString const& path)
+{
+    const QString list = QLatin1Char('|') + m_recent->list() + QLatin1Char('|');
+    if (!list.contains(QLatin1Char('|') + path + QLatin1Char('|'))) {
+        say(tr("There is no file %1").arg(path));
+        return false;
+    }
+    const QMessageBox::StandardButton answer = QMessageBox::question(
+        this, windowTitle(),
+        tr("There is no file %1 any more.\nRemove it from the list of recent files?").arg(path));
+    if (answer == QMessageBox::Yes)
+        m_recent->Remove(path);
+    return answer == QMessageBox::Yes;
+}
+
+void MainWindow::openLogFolder()
+{
+    if (!PlacesPanel::OpenPlace(RunningLog::FileName()))
+        say(tr("The log folder cannot be shown: it is not there, or there is no file manager"));
+}
+
+void MainWindow::saveReport()
+{
+    ReportDialog dialog(tr("Save Report"),
+                        tr("This is what the report holds. Look through it before you pass it on: "
+                           "the log may tell more than you want others to know."),
+                        SystemReport::Whole(m_settings.fileName()), true, this);
+    dialog.exec();
+}
+
+void MainWindow::showAbout()
+{
+    ReportDialog dialog(tr("About %1").arg(QStringLiteral("Velocor")),
+                        QStringLiteral("Velocor %1\n").arg(QLatin1String(VELOCOR_VERSION)) +
+                            tr("The start-up program of the Tork family. MIT licence."),
+                        SystemReport::Facts(m_settings.fileName()), false, this);
+    dialog.exec();
+}
+
+void MainWindow::changeLogSettings()
+{
+    LogSettingsDialog dialog(this);
+    if (dialog.exec() == QDialog::Accepted) {
+        say(tr("The log settings have been saved"));
+        checkLog();
+    }
+}
+
+// A text field in focus copies its own selection, also from the menu.
+void MainWindow::copy()
+{
+    QWidget* focused = QApplication::focusWidget();
+    if (focused && focused->metaObject()->indexOfSlot("copy()") >= 0)
+        QMetaObject::invokeMethod(focused, "copy");
+    else if (LogPanel* log = m_tabs->currentLog())
+        log->CopySelected();
+}
+
+void MainWindow::selectAll()
+{
+    QWidget* focused = QApplication::focusWidget();
+    if (focused && focused->metaObject()->indexOfSlot("selectAll()") >= 0)
+        QMetaObject::invokeMethod(focused, "selectAll");
+    else if (LogPanel* log = m_tabs->currentLog())
+        log->SelectAll();
+}
+
+void MainWindow::closeEvent(QCloseEvent* event)
+{
+    if (!m_tabs->MayCloseAll()) {
+        event->ignore();
+        return;
+    }
+    saveState();
+    event->accept();
+}
+
+void MainWindow::dragEnterEvent(QDragEnterEvent* event)
+{
+    const QList<QUrl> urls = event->mimeData()->urls();
+    for (QUrl const& url : urls) {
+        if (url.isLocalFile()) {
+            event->acceptProposedAction();
+            return;
+        }
+    }
+}
+
+void MainWindow::dropEvent(QDropEvent* event)
+{
+    const QList<QUrl> urls = event->mimeData()->urls().mid(0, MostDropped);
+    for (QUrl const& url : urls) {
+        if (url.isLocalFile())
+            OpenFile(url.toLocalFile());
+    }
+    event->acceptProposedAction();
+}

@@ -3,12 +3,29 @@
 
 #pragma once
 
-#include <QMainWindow>
+#include "app/window/WindowSettings.h"
 
-/// The program's top-level window: who the program is and where its files lie.
+#include <QMainWindow>
+#include <QTimer>
+
+#include <functional>
+#include <memory>
+
+class FileTabs;
+class LogHealth;
+class NoticeBar;
+class PlacesPanel;
+class QLabel;
+class QMenu;
+class QSplitter;
+class RecentFiles;
+
+/// The program's top-level window: its log, live; who it is and where its files lie; files of the
+/// family to look at; the log's settings; and what a bug report needs.
 ///
-/// Reads the application object's properties and the log once, when it is made; so make it after
-/// both are set up.
+/// Reads the application object's properties and the log when it is made, so make it after both are
+/// set up. It writes no log entry of its own while the program starts. What is slow is put off
+/// until the window has been painted for the first time.
 class MainWindow : public QMainWindow
 {
     Q_OBJECT
@@ -16,4 +33,66 @@ class MainWindow : public QMainWindow
 public:
     explicit MainWindow(QWidget* parent = nullptr);
     ~MainWindow() override;
+
+    /// Shows a log file or a settings file in a tab, and remembers it among the recent ones.
+    ///
+    /// For a file that is not there it offers to forget it.
+    void OpenFile(QString const& path);
+
+protected:
+    bool event(QEvent* event) override;
+    void closeEvent(QCloseEvent* event) override;
+    void dragEnterEvent(QDragEnterEvent* event) override;
+    void dropEvent(QDropEvent* event) override;
+
+private:
+    void makeContent();
+    void makeStatusBar();
+    void makeMenus();
+    void makeFileMenu();
+    void makeEditMenu();
+    void makeViewMenu();
+    void makeHelpMenu();
+    QAction* addAction(QMenu* menu, QString const& text, QKeySequence const& shortcut,
+                       QString const& statusTip, std::function<void()> const& work);
+    QAction* addSwitch(QMenu* menu, QString const& text, QKeySequence const& shortcut,
+                       QString const& statusTip, std::function<void(bool)> const& work);
+
+    void restoreState();
+    void saveState();
+    void startWork();
+    void updateState();
+    void checkLog();
+    void say(QString const& text);
+
+    void chooseFile();
+    void openLogFolder();
+    void saveReport();
+    void showAbout();
+    void changeLogSettings();
+    void copy();
+    void selectAll();
+    bool offerToForget(QString const& path);
+
+    WindowSettings m_settings;
+    NoticeBar* m_notice;
+    QSplitter* m_splitter;
+    PlacesPanel* m_places;
+    FileTabs* m_tabs;
+    QLabel* m_summary;
+    QLabel* m_health;
+    QMenu* m_recentMenu = nullptr;
+    RecentFiles* m_recent = nullptr;
+
+    QAction* m_save = nullptr;
+    QAction* m_close = nullptr;
+    QAction* m_showPlaces = nullptr;
+    QAction* m_earlierRuns = nullptr;
+    QAction* m_pause = nullptr;
+    QAction* m_follow = nullptr;
+    QList<QAction*> m_logActions; // those that need a log in front
+
+    std::unique_ptr<LogHealth> m_logHealth;
+    QTimer m_healthTimer;
+    bool m_painted = false;
 };

@@ -1,0 +1,162 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/FileTabs.h"
+
+#include "app/window/LogPanel.h"
+#include "app/window/SettingsEditor.h"
+
+#include <QFile>
+#include <QFileInfo>
+#include <QTabBar>
+#include <QToolButton>
+
+namespace {
+
+QString PathOf(QWidget const* page)
+{
+    if (auto const* log = qobject_cast<LogPanel const*>(page))
+        return log->path();
+    auto const* editor = qobject_cast<SettingsEditor const*>(page);
+    return editor ? editor->path() : QString();
+}
+
+QString TitleOf(QString const& path)
+{
+    QString title = QFileInfo(path).fileName();
+    return title.replace(QLatin1Char('&'), QLatin1String("&&"));
+}
+
+} // namespace
+
+FileTabs::FileTabs(QWidget* parent) : QTabWidget(parent)
+{
+    setDocumentMode(true);
+    setTabBarAutoHide(true);
+    setMovable(false);
+    setElideMode(Qt::ElideMiddle);
+    setAccessibleName(tr("Open files"));
+    tabBar()->setAccessibleName(tr("Open files"));
+    m_ownLog = addLog(tr("Log"), QString());
+    connect(this, &QTabWidget::currentChanged, this, &FileTabs::StateChanged);
+}
+
+// The style's own close button is an image that dark palettes swallow.
+void FileTabs::addCloseButton(QWidget* page, QString const& title)
+{
+    auto* button = new QToolButton;
+    button->setText(QString(QChar(0xd7)));
+    button->setAutoRaise(true);
+    button->setFocusPolicy(Qt::NoFocus); // Ctrl+W does the same
+    button->setAccessibleName(tr("Close %1").arg(title));
+    button->setToolTip(tr("Close the file (Ctrl+W)"));
+    connect(button, &QToolButton::clicked, this, [this, page] { closeTab(indexOf(page)); });
+    tabBar()->setTabButton(indexOf(page), QTabBar::RightSide, button);
+}
+
+LogPanel* FileTabs::addLog(QString const& title, QString const& path)
+{
+    auto* panel = new LogPanel;
+    panel->setAccessibleName(title);
+    connect(panel, &LogPanel::StateChanged, this, &FileTabs::StateChanged);
+    connect(panel, &LogPanel::Said, this, &FileTabs::Said);
+    if (!path.isEmpty())
+        panel->Open(path, false);
+    setTabToolTip(addTab(panel, title), path);
+    if (!path.isEmpty())
+        addCloseButton(panel, title);
+    return panel;
+}
+
+SettingsEditor* FileTabs::addEditor(QString const& title, QString const& path)
+{
+    auto* editor = new SettingsEditor;
+    editor->setAccessibleName(title);
+    editor->Open(path);
+    connect(editor, &SettingsEditor::Said, this, &FileTabs::Said);
+    connect(editor, &SettingsEditor::ModifiedChanged, this, [this, editor, title](bool modified) {
+        setTabText(indexOf(editor), modified ? title + QLatin1String(" *") : title);
+        emit StateChanged();
+    });
+    setTabToolTip(addTab(editor, title), path);
+    addCloseButton(editor, title);
+    return editor;
+}
+
+bool FileTabs::IsSettingsFile(QString const& path)
+{
+    QFile file(path);
+    if (!file.open(QIODevice::ReadOnly))
+        return false;
+    QByteArray start = file.read(1024);
+    if (start.startsWith("\xEF\xBB\xBF"))
+        start.remove(0, 3);
+    return start.trimmed().startsWith('<');
+}
+
+int FileTabs::positionOf(QString const& path) const
+{
+    for (int i = 0; i < count(); ++i) {
+        if (PathOf(widget(i)) == path)
+            return i;
+    }
+    return -1;
+}
+
+void FileTabs::OpenFile(QString const& path)
+{
+    int position = positionOf(path);
+    if (position < 0) {
+        QWidget* page = nullptr;
+        if (IsSettingsFile(path))
+            page = addEditor(TitleOf(path), path);
+        else
+            page = addLog(TitleOf(path), path);
+        position = indexOf(page);
+    }
+    setCurrentIndex(position);
+    widget(position)->setFocus();
+    emit StateChanged();
+}
+
+void FileTabs::CloseCurrent()
+{
+    closeTab(currentIndex());
+}
+
+void FileTabs::closeTab(int position)
+{
+    QWidget* page = widget(position);
+    if (!page || page == m_ownLog)
+        return;
+    auto* editor = qobject_cast<SettingsEditor*>(page);
+    if (editor && !editor->MayClose())
+        return;
+    removeTab(position);
+    page->deleteLater();
+    emit StateChanged();
+}
+
+bool FileTabs::MayCloseAll()
+{
+    for (int i = 0; i < count(); ++i) {
+        auto* editor = qobject_cast<SettingsEditor*>(widget(i));
+        if (!editor)
+            continue;
+        if (editor->isModified())
+            setCurrentIndex(i);
+        if (!editor->MayClose())
+            return false;
+    }
+    return true;
+}
+
+LogPanel* FileTabs::currentLog() const
+{
+    return qobject_cast<LogPanel*>(currentWidget());
+}
+
+SettingsEditor* FileTabs::currentEditor() const
+{
+    return qobject_cast<SettingsEditor*>(currentWidget());
+}

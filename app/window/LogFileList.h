@@ -1,0 +1,20 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include <QString>
+#include <QStringList>
+
+/// Finds the numbered older files of a log file.
+class LogFileList
+{
+public:
+    /// A log file and the older ones beside it, newest first: "app.log", "app.log.1", and so on.
+    ///
+    /// @param path  the log file or one of its older files; is in the list even if it is missing
+    static QStringList FilesOf(QString const& path);
+
+    /// The path without the number of an older file.
+    static QString CurrentOf(QString const& path);
+};

@@ -1,0 +1,96 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include <QList>
+#include <QString>
+#include <QWidget>
+
+class LogFilterBar;
+class LogModel;
+class LogView;
+class QCheckBox;
+class QComboBox;
+class QPlainTextEdit;
+class QSplitter;
+
+/// A log with all that belongs to it: the choice of its older files, filter, table, and the text of
+/// the current line.
+///
+///     auto* panel = new LogPanel;
+///     panel->Open(TorkLog::logger()->newLogFileName(), true);
+class LogPanel : public QWidget
+{
+    Q_OBJECT
+
+public:
+    explicit LogPanel(QWidget* parent = nullptr);
+    ~LogPanel() override;
+
+    /// Shows a log file.
+    ///
+    /// @param isCurrent  whether the running program writes to it
+    void Open(QString const& path, bool isCurrent);
+
+    /// Reads the file anew.
+    void Reload();
+
+    void SetPaused(bool paused);
+    bool isPaused() const;
+    void SetFollowing(bool following);
+    bool isFollowing() const;
+    void SetEarlierRuns(bool shown);
+    bool showsEarlierRuns() const;
+
+    void FocusFilter();
+    void ClearFilter();
+    void CopySelected();
+    void SelectAll();
+
+    /// Goes to the next (step 1) or previous (step -1) warning or worse, or tells that there is
+    /// none.
+    void GoToProblem(int step);
+
+    /// The file that is shown.
+    QString path() const;
+
+    /// What the rows are at the moment, in a few words.
+    QString summary() const;
+
+    QList<int> columnWidths() const;
+    void SetColumnWidths(QList<int> const& widths);
+    QList<int> paneSizes() const;
+    void SetPaneSizes(QList<int> const& sizes);
+
+    LogModel* model() const { return m_model; }
+    LogView* view() const { return m_view; }
+
+signals:
+    /// Something that the window's actions or its status line show has changed.
+    void StateChanged();
+
+    /// Something to be told in passing.
+    void Said(QString const& text);
+
+private:
+    void makeControls();
+    void makeLayout();
+    void connectAll();
+    void fillFileList();
+    void chooseFile(int position);
+    void showFile(QString const& path);
+    void showCurrentLine();
+    void updatePlaceholder();
+
+    LogModel* m_model;
+    LogView* m_view;
+    LogFilterBar* m_filterBar;
+    QComboBox* m_files;
+    QCheckBox* m_pause;
+    QCheckBox* m_follow;
+    QPlainTextEdit* m_line;
+    QSplitter* m_splitter;
+    QString m_currentPath; // the file that the running program writes, if it is one
+    int m_percent = 100;
+};

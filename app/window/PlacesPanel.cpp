@@ -1,0 +1,122 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/PlacesPanel.h"
+#include "app/window/RunningLog.h"
+
+#include <QClipboard>
+#include <QCoreApplication>
+#include <QDesktopServices>
+#include <QFileInfo>
+#include <QGuiApplication>
+#include <QLabel>
+#include <QLineEdit>
+#include <QScrollArea>
+#include <QToolButton>
+#include <QUrl>
+#include <QVBoxLayout>
+#include <QVariant>
+
+namespace {
+
+QString Property(char const* name)
+{
+    return QCoreApplication::instance()->property(name).toString();
+}
+
+QToolButton* MakeButton(QString const& text, QString const& name, QString const& toolTip)
+{
+    auto* button = new QToolButton;
+    button->setText(text);
+    button->setAutoRaise(true);
+    button->setAccessibleName(name);
+    button->setToolTip(toolTip);
+    return button;
+}
+
+} // namespace
+
+PlacesPanel::PlacesPanel(QString const& settingsFile, QWidget* parent) : QWidget(parent)
+{
+    auto* content = new QWidget;
+    m_layout = new QVBoxLayout(content);
+    m_layout->setContentsMargins(12, 10, 12, 10);
+    m_layout->setSpacing(2);
+    addValue(tr("Organization"), QCoreApplication::organizationName(), false);
+    addValue(tr("Product"), QCoreApplication::applicationName(), false);
+    addValue(tr("Installation"), Property("RootPath"), true);
+    addValue(tr("Data"), Property("DataPath"), true);
+    addValue(tr("Documents"), Property("DocPath"), true);
+    addValue(tr("Log file"), RunningLog::FileName(), true);
+    addValue(tr("Settings file"), settingsFile, true);
+    m_layout->addStretch(1);
+
+    auto* scroller = new QScrollArea;
+    scroller->setAccessibleName(tr("Identity and places"));
+    scroller->setFrameShape(QFrame::NoFrame);
+    scroller->setWidgetResizable(true);
+    scroller->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
+    scroller->setFocusPolicy(Qt::NoFocus);
+    scroller->setWidget(content);
+    auto* layout = new QVBoxLayout(this);
+    layout->setContentsMargins(0, 0, 0, 0);
+    layout->addWidget(scroller);
+    setMinimumWidth(180);
+}
+
+void PlacesPanel::addValue(QString const& caption, QString const& text, bool isPlace)
+{
+    auto* value = new QLineEdit(text);
+    value->setReadOnly(true);
+    value->setAccessibleName(caption);
+    value->setToolTip(text);
+    value->setCursorPosition(0);
+    QPalette flat; // only this role is set, so the others go on following the window's
+    flat.setBrush(QPalette::Base, Qt::transparent);
+    value->setPalette(flat);
+
+    auto* label = new QLabel(caption);
+    QFont bold = label->font();
+    bold.setBold(true);
+    label->setFont(bold);
+    label->setBuddy(value);
+
+    auto* row = new QHBoxLayout;
+    row->setSpacing(2);
+    row->addWidget(label, 1);
+    if (isPlace) {
+        QToolButton* open =
+            MakeButton(tr("Open"), tr("Open: %1").arg(caption), tr("Show it in the file manager"));
+        connect(open, &QToolButton::clicked, this, [this, text] { openPlace(text); });
+        row->addWidget(open);
+    }
+    QToolButton* copyButton =
+        MakeButton(tr("Copy"), tr("Copy: %1").arg(caption), tr("Copy the text to the clipboard"));
+    connect(copyButton, &QToolButton::clicked, this,
+            [this, caption, text] { copy(caption, text); });
+    row->addWidget(copyButton);
+
+    m_layout->addLayout(row);
+    m_layout->addWidget(value);
+    m_layout->addSpacing(6);
+}
+
+bool PlacesPanel::OpenPlace(QString const& path)
+{
+    const QFileInfo info(path);
+    const QString folder = info.isDir() ? info.absoluteFilePath() : info.absolutePath();
+    return !path.isEmpty() && QFileInfo(folder).isDir() &&
+           QDesktopServices::openUrl(QUrl::fromLocalFile(folder));
+}
+
+void PlacesPanel::openPlace(QString const& path)
+{
+    if (!OpenPlace(path))
+        emit Said(tr("%1 cannot be shown: it is not there, or there is no file manager").arg(path));
+}
+
+void PlacesPanel::copy(QString const& caption, QString const& text)
+{
+    QGuiApplication::clipboard()->setText(text);
+    emit Said(tr("Copied: %1").arg(caption));
+}

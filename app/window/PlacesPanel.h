@@ -1,0 +1,35 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include <QString>
+#include <QWidget>
+
+class QVBoxLayout;
+
+/// Who the program is and where its files lie, each to be opened in the file manager or copied.
+class PlacesPanel : public QWidget
+{
+    Q_OBJECT
+
+public:
+    /// @param settingsFile  the window's settings file
+    explicit PlacesPanel(QString const& settingsFile, QWidget* parent = nullptr);
+
+    /// Shows a file's folder or a folder in the system's file manager.
+    ///
+    /// @return false if there is no such folder or nothing to show it
+    static bool OpenPlace(QString const& path);
+
+signals:
+    /// A button could not do its work, or has done it.
+    void Said(QString const& text);
+
+private:
+    void addValue(QString const& caption, QString const& text, bool isPlace);
+    void openPlace(QString const& path);
+    void copy(QString const& caption, QString const& text);
+
+    QVBoxLayout* m_layout;
+};

@@ -1,0 +1,45 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include <QObject>
+#include <QString>
+
+class QMenu;
+
+/// The list of recently opened files and the menu that offers them, newest first.
+///
+///     RecentFiles recent(menu);
+///     recent.SetList(settings.Text("recentFiles"));
+///     connect(&recent, &RecentFiles::Chosen, this, &MainWindow::openFile);
+class RecentFiles : public QObject
+{
+    Q_OBJECT
+
+public:
+    /// @param menu  filled anew whenever the list changes; not owned
+    explicit RecentFiles(QMenu* menu, QObject* parent = nullptr);
+
+    /// Takes over a list as list() gave it. See AppUtils for its form.
+    void SetList(QString const& list);
+    QString const& list() const { return m_list; }
+
+    /// Puts a file at the front. A path with "|" in it cannot be kept and is passed over.
+    void Add(QString const& path);
+    void Remove(QString const& path);
+    void Clear();
+
+    /// The most files that are remembered.
+    static constexpr int MostFiles = 10;
+
+signals:
+    /// A file was chosen in the menu.
+    void Chosen(QString const& path);
+
+private:
+    void fillMenu();
+
+    QMenu* m_menu;
+    QString m_list;
+};

@@ -1,0 +1,92 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/ReportDialog.h"
+
+#include <QClipboard>
+#include <QCoreApplication>
+#include <QDialogButtonBox>
+#include <QFileDialog>
+#include <QFontDatabase>
+#include <QGuiApplication>
+#include <QIcon>
+#include <QLabel>
+#include <QMessageBox>
+#include <QPlainTextEdit>
+#include <QPushButton>
+#include <QSaveFile>
+#include <QVBoxLayout>
+#include <QVariant>
+
+ReportDialog::ReportDialog(QString const& title, QString const& heading, QString const& text,
+                           bool saves, QWidget* parent)
+    : QDialog(parent), m_text(new QPlainTextEdit(text))
+{
+    setWindowTitle(title);
+    m_text->setReadOnly(true);
+    m_text->setTabChangesFocus(true);
+    m_text->setLineWrapMode(QPlainTextEdit::NoWrap);
+    m_text->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
+    m_text->setAccessibleName(title);
+    m_text->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
+
+    auto* icon = new QLabel;
+    icon->setPixmap(QGuiApplication::windowIcon().pixmap(48));
+    icon->setAccessibleName(tr("Icon of the program"));
+    auto* label = new QLabel(heading);
+    label->setTextFormat(Qt::PlainText);
+    label->setWordWrap(true);
+    label->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
+    auto* top = new QHBoxLayout;
+    top->setSpacing(12);
+    top->addWidget(icon);
+    top->addWidget(label, 1);
+
+    auto* buttons = new QDialogButtonBox(QDialogButtonBox::Close);
+    QPushButton* copyButton = buttons->addButton(tr("&Copy"), QDialogButtonBox::ActionRole);
+    connect(copyButton, &QPushButton::clicked, this, &ReportDialog::Copy);
+    if (saves) {
+        QPushButton* save = buttons->addButton(tr("&Save..."), QDialogButtonBox::ActionRole);
+        connect(save, &QPushButton::clicked, this, &ReportDialog::chooseFile);
+    }
+    connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
+    const QList<QAbstractButton*> all = buttons->buttons();
+    for (QAbstractButton* button : all)
+        button->setIcon(QIcon());
+
+    auto* layout = new QVBoxLayout(this);
+    layout->setSpacing(10);
+    layout->addLayout(top);
+    layout->addWidget(m_text, 1);
+    layout->addWidget(buttons);
+    resize(680, 480);
+}
+
+void ReportDialog::Copy()
+{
+    QGuiApplication::clipboard()->setText(m_text->toPlainText());
+}
+
+QString ReportDialog::SaveTo(QString const& path) const
+{
+    QSaveFile file(path);
+    if (!file.open(QIODevice::WriteOnly))
+        return file.errorString();
+    file.write(m_text->toPlainText().toUtf8());
+    return file.commit() ? QString() : file.errorString();
+}
+
+void ReportDialog::chooseFile()
+{
+    const QString folder = QCoreApplication::instance()->property("DocPath").toString();
+    const QString path =
+        QFileDialog::getSaveFileName(this, windowTitle(), folder + tr("velocor-report.txt"),
+                                     tr("Text files (*.txt);;All files (*)"));
+    if (path.isEmpty())
+        return;
+    const QString error = SaveTo(path);
+    if (error.isEmpty())
+        accept();
+    else
+        QMessageBox::critical(this, windowTitle(), tr("%1 was not saved.\n%2").arg(path, error));
+}

@@ -1,0 +1,18 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include <QObject>
+
+/// While it lives, the texts of all message boxes of the program can be selected with mouse and
+/// keyboard, to be copied into a report or a search.
+class SelectableMessageBoxes : public QObject
+{
+    Q_OBJECT
+
+public:
+    explicit SelectableMessageBoxes(QObject* parent = nullptr);
+
+    bool eventFilter(QObject* object, QEvent* event) override;
+};

@@ -1,0 +1,183 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/SystemReport.h"
+
+#include "app/window/FileSizeText.h"
+#include "app/window/LogFileList.h"
+#include "app/window/LogIndex.h"
+#include "app/window/LogPreferences.h"
+#include "app/window/RunningLog.h"
+#include "common/log/TorkLog.h"
+
+#include <QApplication>
+#include <QDateTime>
+#include <QFile>
+#include <QFileInfo>
+#include <QFont>
+#include <QLocale>
+#include <QScreen>
+#include <QStorageInfo>
+#include <QStyle>
+#include <QSysInfo>
+#include <QVariant>
+
+namespace {
+
+// The most of the log that is looked at, in bytes.
+constexpr qint64 TailLimit = 16 << 20;
+
+QString Line(QString const& caption, QString const& text)
+{
+    return caption + QLatin1String(": ") + text + QLatin1Char('\n');
+}
+
+QString Compiler()
+{
+#if defined(Q_CC_CLANG)
+    return QStringLiteral("Clang %1.%2").arg(__clang_major__).arg(__clang_minor__);
+#elif defined(Q_CC_GNU)
+    return QStringLiteral("GCC %1.%2").arg(__GNUC__).arg(__GNUC_MINOR__);
+#else
+    return QObject::tr("unknown");
+#endif
+}
+
+QString ScreenText(QScreen const* screen)
+{
+    const QRect place = screen->geometry();
+    return QStringLiteral("%1, %2 x %3 at (%4, %5), scale %6, %7 dpi")
+        .arg(screen->name())
+        .arg(place.width())
+        .arg(place.height())
+        .arg(place.x())
+        .arg(place.y())
+        .arg(screen->devicePixelRatio())
+        .arg(qRound(screen->logicalDotsPerInch()));
+}
+
+QString Screens()
+{
+    QString text;
+    int number = 0;
+    const QList<QScreen*> screens = QGuiApplication::screens();
+    for (QScreen const* screen : screens)
+        text += Line(QObject::tr("Screen %1").arg(++number), ScreenText(screen));
+    return text;
+}
+
+QString Directory(QString const& caption, QString const& path)
+{
+    const QFileInfo info(path);
+    QString state = QObject::tr("not there");
+    if (info.isDir())
+        state = info.isWritable() ? QObject::tr("writable") : QObject::tr("not writable");
+    return Line(caption, QStringLiteral("%1 (%2)").arg(path, state));
+}
+
+QString File(QString const& caption, QString const& path)
+{
+    const QFileInfo info(path);
+    const QString size = info.isFile() ? FileSizeText(info.size()) : QObject::tr("not there");
+    return Line(caption, QStringLiteral("%1 (%2)").arg(path, size));
+}
+
+QString Property(char const* name)
+{
+    return QCoreApplication::instance()->property(name).toString();
+}
+
+QString LogState()
+{
+    TorkLog const* log = TorkLog::logger();
+    if (!log)
+        return QObject::tr("none");
+    QString text = log->enabled() ? QObject::tr("on") : QObject::tr("off");
+    text += QObject::tr(", limit %1 a file, %2 older files")
+                .arg(FileSizeText(log->maxLogFileSize()))
+                .arg(log->maxLogFiles());
+    if (!log->errorString().isEmpty())
+        text += QObject::tr(", last error: %1").arg(log->errorString());
+    return text;
+}
+
+QString OlderFiles()
+{
+    qint64 size = 0;
+    const QStringList files = LogFileList::FilesOf(RunningLog::FileName());
+    for (QString const& file : files)
+        size += QFileInfo(file).size();
+    return QObject::tr("%1, %2 in all").arg(files.size()).arg(FileSizeText(size));
+}
+
+QString Memory()
+{
+    const QStorageInfo storage(Property("DataPath"));
+    return storage.isValid() ? FileSizeText(storage.bytesAvailable()) : QObject::tr("unknown");
+}
+
+} // namespace
+
+QString SystemReport::Facts(QString const& settingsFile)
+{
+    QString text;
+    text += Line(QObject::tr("Program"),
+                 QStringLiteral("Velocor %1").arg(QLatin1String(VELOCOR_VERSION)));
+    text += Line(QObject::tr("Organization"), QCoreApplication::organizationName());
+    text += Line(QObject::tr("Product"), QCoreApplication::applicationName());
+    text += Line(QObject::tr("Toolkit built with"), QLatin1String(QT_VERSION_STR));
+    text += Line(QObject::tr("Toolkit running"), QLatin1String(qVersion()));
+    text += Line(QObject::tr("Compiler"), Compiler());
+    text += Line(QObject::tr("Built for"), QSysInfo::buildAbi());
+    text += Line(QObject::tr("System"), QSysInfo::prettyProductName());
+    text += Line(QObject::tr("Kernel"),
+                 QSysInfo::kernelType() + QLatin1Char(' ') + QSysInfo::kernelVersion());
+    text += Line(QObject::tr("Processor"), QSysInfo::currentCpuArchitecture());
+    text += Line(QObject::tr("Locale"), QLocale::system().name());
+    text += Line(QObject::tr("Platform"), QGuiApplication::platformName());
+    text += Line(QObject::tr("Style"), QApplication::style()->objectName());
+    text += Line(QObject::tr("Font"), QApplication::font().toString());
+    text += Screens();
+    text += Directory(QObject::tr("Installation"), Property("RootPath"));
+    text += Directory(QObject::tr("Data"), Property("DataPath"));
+    text += Directory(QObject::tr("Documents"), Property("DocPath"));
+    text += File(QObject::tr("Settings file"), settingsFile);
+    text += File(QObject::tr("Log settings"), LogPreferences::FileName());
+    text += File(QObject::tr("Log file"), RunningLog::FileName());
+    text += Line(QObject::tr("Log files"), OlderFiles());
+    text += Line(QObject::tr("Log"), LogState());
+    text += Line(QObject::tr("Free space for data"), Memory());
+    return text;
+}
+
+QString SystemReport::LogTail(int lines)
+{
+    QFile file(RunningLog::FileName());
+    if (!QFileInfo(file).isFile() || !file.open(QIODevice::ReadOnly))
+        return QString();
+
+    LogIndex index(LogPreferences::Parser());
+    const QByteArray bytes = file.read(TailLimit);
+    index.Begin();
+    index.Feed(bytes.constData(), bytes.size());
+    index.End();
+
+    const LogRows rows = index.Rows(LogFilter());
+    QStringList tail;
+    for (size_t row = rows.size(); row > 0 && tail.size() < lines; --row) {
+        const qint64 start = rows.starts[row - 1];
+        if (start < 0)
+            continue;
+        const int end = bytes.indexOf('\n', static_cast<int>(start));
+        const QByteArray line = bytes.mid(static_cast<int>(start), end < 0 ? -1 : end - int(start));
+        tail.prepend(QString::fromLatin1(line));
+    }
+    return tail.isEmpty() ? QString() : tail.join(QLatin1Char('\n')) + QLatin1Char('\n');
+}
+
+QString SystemReport::Whole(QString const& settingsFile)
+{
+    const QString time = QDateTime::currentDateTimeUtc().toString(Qt::ISODate);
+    return QObject::tr("Report of %1\n\n").arg(time) + Facts(settingsFile) +
+           QObject::tr("\nThe last %1 lines of the log\n\n").arg(TailLines) + LogTail(TailLines);
+}

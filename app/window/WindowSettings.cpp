@@ -1,0 +1,212 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/WindowSettings.h"
+
+#include "app/window/SettingsFileReader.h"
+
+#include <QDir>
+#include <QFile>
+#include <QFileInfo>
+#include <QGuiApplication>
+#include <QScreen>
+#include <QStringList>
+#include <QWidget>
+
+namespace {
+
+char const* const WindowName = "MainWindow";
+
+QString Section()
+{
+    return QStringLiteral("MainWindow");
+}
+
+// Whether enough of the rectangle's top is on a screen for the window to be seen and moved.
+bool MeetsAScreen(QRect const& rectangle)
+{
+    const QRect top(rectangle.topLeft(), QSize(rectangle.width(), 40));
+    const QList<QScreen*> screens = QGuiApplication::screens();
+    for (QScreen const* screen : screens) {
+        const QRect common = screen->availableGeometry().intersected(top);
+        if (common.width() >= 80 && common.height() >= 10)
+            return true;
+    }
+    return false;
+}
+
+QRect InTheMiddle(QSize const& size)
+{
+    QScreen const* screen = QGuiApplication::primaryScreen();
+    const QRect available = screen ? screen->availableGeometry() : QRect(0, 0, 800, 600);
+    QRect rectangle(QPoint(), size.boundedTo(available.size()));
+    rectangle.moveCenter(available.center());
+    return rectangle;
+}
+
+// Where the window is not maximised or in full screen, its normal geometry is its geometry.
+QRect NormalGeometry(QWidget const* window)
+{
+    const QRect normal = window->normalGeometry();
+    return normal.isValid() ? normal : window->geometry();
+}
+
+// The store keeps ASCII only, and neither "%1" nor "]]>"; paths may hold anything.
+QString Escaped(QString const& text)
+{
+    QString escaped;
+    for (QChar c : text) {
+        const bool plain = c.unicode() >= 0x20 && c.unicode() < 0x7f && c != QLatin1Char('\\') &&
+                           c != QLatin1Char('%') && c != QLatin1Char(']');
+        if (plain)
+            escaped += c;
+        else
+            escaped += QStringLiteral("\\u%1").arg(c.unicode(), 4, 16, QLatin1Char('0'));
+    }
+    return escaped;
+}
+
+QString Unescaped(QString const& text)
+{
+    QString plain;
+    for (int i = 0; i < text.length(); ++i) {
+        bool converted = false;
+        ushort code = 0;
+        if (text.midRef(i, 2) == QLatin1String("\\u"))
+            code = text.midRef(i + 2, 4).toUShort(&converted, 16);
+        plain += converted ? QChar(code) : text.at(i);
+        if (converted)
+            i += 5;
+    }
+    return plain;
+}
+
+} // namespace
+
+WindowSettings::WindowSettings(QString const& dataPath)
+    : m_fileName(dataPath + QLatin1String("velocor.cfg")), m_file(m_fileName)
+{}
+
+QString WindowSettings::Load()
+{
+    if (!QFile::exists(m_fileName))
+        return QString();
+
+    const SettingsDocument document = SettingsFileReader::Read(m_fileName);
+    if (!document.isReadable) {
+        m_mayWrite = false;
+        return QObject::tr("The settings file %1 cannot be read (%2). It is left as it is.")
+            .arg(m_fileName, document.error);
+    }
+    if (!document.isParsed)
+        return putAside();
+
+    for (SettingsDocument::Section const& section : document.sections) {
+        for (SettingsDocument::Item const& item : section.items)
+            m_file.WriteItem(section.name, item.key, item.value);
+    }
+    return QString();
+}
+
+QString WindowSettings::putAside()
+{
+    for (int number = 1; number < 1000; ++number) {
+        const QString name = QStringLiteral("%1.damaged-%2").arg(m_fileName).arg(number);
+        if (QFile::exists(name))
+            continue;
+        if (!QFile::rename(m_fileName, name))
+            break;
+        return QObject::tr("The settings file was damaged, so the window starts with its "
+                           "defaults. The damaged file is kept as %1.")
+            .arg(name);
+    }
+    m_mayWrite = false;
+    return QObject::tr("The settings file %1 is damaged and cannot be put aside. It is left as it "
+                       "is, and changes will not be saved.")
+        .arg(m_fileName);
+}
+
+QString WindowSettings::Save()
+{
+    if (!m_mayWrite)
+        return QString();
+    QDir().mkpath(QFileInfo(m_fileName).path());
+    m_file.m_lastError.clear();
+    m_file.Save();
+    return m_file.m_lastError;
+}
+
+void WindowSettings::RestoreGeometry(QWidget* window)
+{
+    QPoint position;
+    QSize size;
+    const bool found =
+        m_file.ReadScreenMetrics(WindowName, position, size) && size.isValid() && !size.isEmpty();
+    if (!found)
+        return;
+
+    QRect rectangle(position, size);
+    if (!MeetsAScreen(rectangle))
+        rectangle = InTheMiddle(size);
+    window->setGeometry(rectangle);
+    if (Flag(QStringLiteral("maximized"), false))
+        window->setWindowState(window->windowState() | Qt::WindowMaximized);
+}
+
+void WindowSettings::NoteGeometry(QWidget* window)
+{
+    const QRect normal = NormalGeometry(window);
+    QPoint position = normal.topLeft();
+    QSize size = normal.size();
+    m_file.WriteScreenMetrics(WindowName, position, size);
+    SetFlag(QStringLiteral("maximized"), window->isMaximized());
+}
+
+QList<int> WindowSettings::Numbers(QString const& key)
+{
+    QList<int> numbers;
+    const QString text = Text(key);
+    if (text.isEmpty())
+        return numbers;
+    const QStringList fields = text.split(QLatin1Char(','));
+    for (QString const& field : fields) {
+        bool converted = false;
+        numbers.append(field.toInt(&converted));
+        if (!converted || numbers.last() < 0 || numbers.last() > 100000)
+            return QList<int>();
+    }
+    return numbers;
+}
+
+void WindowSettings::SetNumbers(QString const& key, QList<int> const& numbers)
+{
+    QStringList fields;
+    for (int number : numbers)
+        fields.append(QString::number(number));
+    SetText(key, fields.join(QLatin1Char(',')));
+}
+
+bool WindowSettings::Flag(QString const& key, bool byDefault)
+{
+    bool value = byDefault;
+    m_file.ReadBool(Section(), key, byDefault, value);
+    return value;
+}
+
+void WindowSettings::SetFlag(QString const& key, bool value)
+{
+    m_file.WriteBool(Section(), key, value);
+}
+
+QString WindowSettings::Text(QString const& key)
+{
+    QString none;
+    QString value;
+    m_file.ReadItem(Section(), key, none, value);
+    return Unescaped(value);
+}
+
+void WindowSettings::SetText(QString const& key, QString const& value)
+{
+    m_file.WriteItem(Section(), key, QLatin1String("") + Escaped(value));
+}

@@ -1,0 +1,193 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// Makes pictures of every view of the window, in light and dark:
+//
+//     window_screenshots FOLDER
+//
+// The build target "screenshots" runs it on a virtual display and puts them into docs/images.
+
+#include "DemoLog.h"
+
+#include "app/window/LogPanel.h"
+#include "app/window/LogSettingsDialog.h"
+#include "app/window/MainWindow.h"
+#include "app/window/ReportDialog.h"
+#include "app/window/SettingsEditor.h"
+#include "app/window/SystemReport.h"
+#include "common/log/TorkLog.h"
+#include "support/TestFiles.h"
+
+#include <QApplication>
+#include <QComboBox>
+#include <QLineEdit>
+#include <QStyleFactory>
+#include <QTabWidget>
+#include <QTableView>
+#include <QTest>
+#include <QTextStream>
+
+namespace {
+
+QString const Home("/tmp/velocor-demo/");
+
+QByteArray const SettingsText("<?xml version=\"1.0\"?>\n"
+                              "<VelocorSettings>\n"
+                              "<!-- kept by hand -->\n"
+                              "<Editor><font>DejaVu Sans,10</font><wrap>yes</wrap></Editor>\n"
+                              "<Colours><marker>255,193,77</marker><paper>250,250,245</paper>\n"
+                              "<ink>30,30,30</ink></Colours>\n"
+                              "<Network><proxy>none</proxy><timeout>30</timeout></Network>\n"
+                              "</VelocorSettings>\n");
+
+QByteArray const BrokenText("<VelocorSettings>\n"
+                            "<Editor>\n"
+                            "<font>DejaVu Sans,10</fnt>\n"
+                            "</Editor>\n"
+                            "</VelocorSettings>\n");
+
+QPalette DarkPalette()
+{
+    const QColor text(0xe6, 0xe6, 0xe6);
+    const QColor window(0x2b, 0x2d, 0x30);
+    QPalette palette(QColor(0x36, 0x38, 0x3c), window); // works the shades out
+    palette.setColor(QPalette::Window, window);
+    palette.setColor(QPalette::WindowText, text);
+    palette.setColor(QPalette::Base, QColor(0x1e, 0x1f, 0x22));
+    palette.setColor(QPalette::AlternateBase, QColor(0x26, 0x28, 0x2b));
+    palette.setColor(QPalette::Text, text);
+    palette.setColor(QPalette::Button, QColor(0x36, 0x38, 0x3c));
+    palette.setColor(QPalette::ButtonText, text);
+    palette.setColor(QPalette::ToolTipBase, window);
+    palette.setColor(QPalette::ToolTipText, text);
+    palette.setColor(QPalette::Highlight, QColor(0x2f, 0x65, 0xca));
+    palette.setColor(QPalette::HighlightedText, Qt::white);
+    palette.setColor(QPalette::Link, QColor(0x78, 0xae, 0xed));
+    palette.setColor(QPalette::PlaceholderText, QColor(0x9a, 0x9a, 0x9a));
+    for (QPalette::ColorRole role : {QPalette::WindowText, QPalette::Text, QPalette::ButtonText})
+        palette.setColor(QPalette::Disabled, role, QColor(0x80, 0x80, 0x80));
+    return palette;
+}
+
+void SetUpProgram()
+{
+    QCoreApplication::setOrganizationName("Tork");
+    QCoreApplication::setApplicationName("Velocor");
+    qApp->setProperty("caption", "Velocor");
+    qApp->setProperty("RootPath", "/opt/velocor/");
+    qApp->setProperty("DataPath", Home);
+    qApp->setProperty("DocPath", "/home/ada/Documents/");
+    QDir(Home).removeRecursively();
+    TorkLog::initialize(Home + "logs/", "velocor", QString(), true);
+    TestFiles::write(Home + "logs/velocor.log", DemoLog::lifelike());
+    TestFiles::write(Home + "logs/velocor.log.1", DemoLog::run(200, QTime(8, 0), "older"));
+    TestFiles::write(Home + "viewer.cfg", SettingsText);
+    TestFiles::write(Home + "broken.cfg", BrokenText);
+}
+
+class Camera
+{
+public:
+    Camera(QString const& folder, QString const& suffix) : m_folder(folder), m_suffix(suffix) {}
+
+    void take(QWidget& widget, QString const& name) const
+    {
+        QTest::qWait(500);
+        const QString path = m_folder + "/" + name + m_suffix + ".png";
+        if (widget.grab().save(path))
+            QTextStream(stdout) << path << endl;
+        else
+            QTextStream(stderr) << path << " cannot be written" << endl;
+    }
+
+private:
+    QString m_folder;
+    QString m_suffix;
+};
+
+LogPanel* PanelOf(MainWindow& window)
+{
+    return window.findChild<LogPanel*>();
+}
+
+void TakeLogViews(MainWindow& window, Camera const& camera)
+{
+    LogPanel* panel = PanelOf(window);
+    auto* table = panel->findChild<QTableView*>();
+    panel->GoToProblem(-1);
+    camera.take(window, "window");
+
+    auto* filter = panel->findChild<QLineEdit*>();
+    filter->setText("index");
+    camera.take(window, "filter");
+    panel->ClearFilter();
+    table->clearSelection();
+}
+
+void TakeDialogs(MainWindow& window, Camera const& camera)
+{
+    LogSettingsDialog settings(&window);
+    settings.show();
+    camera.take(settings, "log-settings");
+    settings.close();
+
+    const QString own = Home + "velocor.cfg";
+    ReportDialog about("About Velocor",
+                       "Velocor " VELOCOR_VERSION
+                       "\nThe start-up program of the Tork family. MIT licence.",
+                       SystemReport::Facts(own), false, &window);
+    about.show();
+    camera.take(about, "about");
+    about.close();
+
+    ReportDialog report("Save Report",
+                        "This is what the report holds. Look through it before you pass it on: "
+                        "the log may tell more than you want others to know.",
+                        SystemReport::Whole(own), true, &window);
+    report.show();
+    camera.take(report, "report");
+}
+
+void TakeAll(QString const& folder, QString const& suffix)
+{
+    const Camera camera(folder, suffix);
+    MainWindow window;
+    window.resize(1080, 680);
+    window.show();
+    QTest::qWait(1000);
+    TakeLogViews(window, camera);
+    TakeDialogs(window, camera);
+
+    window.OpenFile(Home + "viewer.cfg");
+    camera.take(window, "settings");
+    window.OpenFile(Home + "broken.cfg");
+    camera.take(window, "broken-settings");
+
+    window.findChild<QTabWidget*>()->setCurrentIndex(0);
+    window.resize(800, 560);
+    camera.take(window, "small");
+    TestFiles::write(Home + "velocor.cfg", "<VelocorSettings>\n<MainWindow>\n<pan");
+    MainWindow damaged;
+    damaged.resize(1080, 680);
+    damaged.show();
+    camera.take(damaged, "damaged");
+    QDir(Home).remove("velocor.cfg");
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    QApplication application(argc, argv);
+    const QString folder = application.arguments().value(1, ".");
+    QApplication::setStyle(QStyleFactory::create("Fusion"));
+    const QPalette light = QApplication::style()->standardPalette();
+    SetUpProgram();
+    QApplication::setPalette(light);
+    TakeAll(folder, QString());
+    QApplication::setPalette(DarkPalette());
+    TakeAll(folder, "-dark");
+    TorkLog::shutdown();
+    QDir(Home).removeRecursively();
+    return 0;
+}

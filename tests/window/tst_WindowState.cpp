@@ -1,0 +1,420 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// What the window keeps between two runs, and the small helpers around it.
+
+#include "WindowTest.h"
+
+#include "app/window/FileSizeText.h"
+#include "app/window/InstanceList.h"
+#include "app/window/LogFileList.h"
+#include "app/window/LogHealth.h"
+#include "app/window/LogPreferences.h"
+#include "app/window/RecentFiles.h"
+#include "app/window/RunningLog.h"
+#include "app/window/SystemReport.h"
+#include "app/window/WindowSettings.h"
+
+#include <QLockFile>
+#include <QMenu>
+#include <QProcess>
+#include <QScreen>
+
+class tst_WindowState : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void texts_data();
+    void texts();
+    void numbers_data();
+    void numbers();
+    void loadLogsNothing();
+    void damagedFile();
+    void damagedTwice();
+    void damagedFileThatCannotBeMoved();
+    void geometry_data();
+    void geometry();
+    void recentFiles();
+    void recentMenu();
+    void fileSize_data();
+    void fileSize();
+    void logFileList();
+    void preferences();
+    void preferencesManyFiles();
+    void isKept_data();
+    void isKept();
+    void instances();
+    void instanceLeftBehind();
+    void health();
+    void healthDirectoryInTheWay();
+    void report();
+};
+
+void tst_WindowState::texts_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::newRow("plain") << "/home/ada/app.log";
+    QTest::newRow("markup") << "<a> & \"b\" 'c'";
+    QTest::newRow("end of CDATA") << "<x]]>";
+    QTest::newRow("placeholder") << "%1 %L2 %%";
+    QTest::newRow("beyond ASCII") << QString::fromUtf8("/K\xC3\xB6ln/\xE2\x82\xAC");
+    QTest::newRow("backslashes") << "\\u0041 \\ \\\\u";
+    QTest::newRow("control characters") << "a\tb\nc";
+    QTest::newRow("blanks around") << "  x  ";
+    QTest::newRow("empty") << "";
+}
+
+void tst_WindowState::texts()
+{
+    QFETCH(QString, text);
+    const WindowTest test;
+    {
+        WindowSettings settings(test.folder() + "data/");
+        settings.SetText("key", text);
+        QCOMPARE(settings.Save(), QString());
+    }
+    WindowSettings settings(test.folder() + "data/");
+    QCOMPARE(settings.Load(), QString());
+    QCOMPARE(settings.Text("key"), text);
+}
+
+void tst_WindowState::numbers_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QList<int>>("expected");
+    QTest::newRow("plain") << "1,20,300" << QList<int>({1, 20, 300});
+    QTest::newRow("empty") << "" << QList<int>();
+    QTest::newRow("no number") << "1,x" << QList<int>();
+    QTest::newRow("negative") << "1,-2" << QList<int>();
+    QTest::newRow("absurd") << "1,2000000000" << QList<int>();
+}
+
+void tst_WindowState::numbers()
+{
+    QFETCH(QString, text);
+    WindowSettings settings("/nowhere/");
+    settings.SetText("key", text);
+    QTEST(settings.Numbers("key"), "expected");
+}
+
+void tst_WindowState::loadLogsNothing()
+{
+    const WindowTest test;
+    QVERIFY(
+        TestFiles::write(test.settingsFile(),
+                         "<VelocorSettings><MainWindow><k>v</k></MainWindow></VelocorSettings>"));
+    WindowSettings settings(test.folder() + "data/");
+    QCOMPARE(settings.Load(), QString());
+    QCOMPARE(settings.Text("k"), QString("v"));
+    QVERIFY(!QFile::exists(test.logFile()));
+}
+
+void tst_WindowState::damagedFile()
+{
+    const WindowTest test;
+    const QByteArray damaged("<VelocorSettings><MainWin");
+    QVERIFY(TestFiles::write(test.settingsFile(), damaged));
+    WindowSettings settings(test.folder() + "data/");
+    const QString told = settings.Load();
+    QVERIFY2(told.contains("velocor.cfg.damaged-1"), qPrintable(told));
+    QCOMPARE(TestFiles::read(test.settingsFile() + ".damaged-1"), damaged);
+    QVERIFY(!QFile::exists(test.settingsFile()));
+    QCOMPARE(settings.Save(), QString());
+    QVERIFY(QFile::exists(test.settingsFile()));
+}
+
+void tst_WindowState::damagedTwice()
+{
+    const WindowTest test;
+    QVERIFY(TestFiles::write(test.settingsFile() + ".damaged-1", "first"));
+    QVERIFY(TestFiles::write(test.settingsFile(), "second"));
+    WindowSettings settings(test.folder() + "data/");
+    QVERIFY(settings.Load().contains("velocor.cfg.damaged-2"));
+    QCOMPARE(TestFiles::read(test.settingsFile() + ".damaged-1"), QByteArray("first"));
+    QCOMPARE(TestFiles::read(test.settingsFile() + ".damaged-2"), QByteArray("second"));
+}
+
+// A directory cannot be read as a file, and is left alone.
+void tst_WindowState::damagedFileThatCannotBeMoved()
+{
+    const WindowTest test;
+    QVERIFY(QDir().mkpath(test.settingsFile() + "/in the way"));
+    WindowSettings settings(test.folder() + "data/");
+    QVERIFY(!settings.Load().isEmpty());
+    QCOMPARE(settings.Save(), QString());
+    QVERIFY(QFileInfo(test.settingsFile() + "/in the way").isDir());
+}
+
+void tst_WindowState::geometry_data()
+{
+    QTest::addColumn<QString>("stored");
+    QTest::addColumn<bool>("isStored");
+    QTest::newRow("a place on the screen") << "100,120,500,400" << true;
+    QTest::newRow("nothing stored") << "" << false;
+    QTest::newRow("not four numbers") << "1,2,3" << false;
+    QTest::newRow("no numbers") << "a,b,c,d" << false;
+}
+
+void tst_WindowState::geometry()
+{
+    QFETCH(QString, stored);
+    QFETCH(bool, isStored);
+    const WindowTest test;
+    if (!stored.isEmpty())
+        QVERIFY(TestFiles::write(test.settingsFile(),
+                                 "<VelocorSettings><ApplicationScreens><MainWindow>" +
+                                     stored.toLatin1() +
+                                     "</MainWindow></ApplicationScreens></VelocorSettings>"));
+    WindowSettings settings(test.folder() + "data/");
+    QCOMPARE(settings.Load(), QString());
+    QWidget window;
+    window.resize(432, 234);
+    settings.RestoreGeometry(&window);
+    if (isStored)
+        QCOMPARE(window.geometry(), QRect(100, 120, 500, 400));
+    else
+        QCOMPARE(window.size(), QSize(432, 234));
+
+    settings.NoteGeometry(&window);
+    QWidget second;
+    settings.RestoreGeometry(&second);
+    QCOMPARE(second.size(), window.size());
+}
+
+void tst_WindowState::recentFiles()
+{
+    QMenu menu;
+    RecentFiles recent(&menu);
+    QVERIFY(!menu.isEnabled());
+    recent.Add("/a");
+    recent.Add("/b");
+    recent.Add("/a");
+    QCOMPARE(recent.list(), QString("/a|/b"));
+    recent.Add("/has|bar");
+    QCOMPARE(recent.list(), QString("/a|/b"));
+    recent.Remove("/a");
+    QCOMPARE(recent.list(), QString("/b"));
+    for (int i = 0; i < 20; ++i)
+        recent.Add(QString("/%1").arg(i));
+    QCOMPARE(recent.list().split('|').size(), int(RecentFiles::MostFiles));
+    recent.Clear();
+    QCOMPARE(recent.list(), QString());
+    QVERIFY(!menu.isEnabled());
+    recent.SetList("|/x||/y|");
+    QCOMPARE(recent.list(), QString("/x|/y"));
+}
+
+void tst_WindowState::recentMenu()
+{
+    QMenu menu;
+    RecentFiles recent(&menu);
+    recent.SetList("/one/a&b.log|/two/c.log");
+    QVERIFY(menu.toolTipsVisible());
+    const QList<QAction*> actions = menu.actions();
+    QCOMPARE(actions.size(), 4);
+    QCOMPARE(actions[0]->text(), QString("&1 a&&b.log"));
+    QCOMPARE(actions[0]->toolTip(), QString("/one/a&b.log"));
+    QVERIFY(actions[2]->isSeparator());
+    QCOMPARE(actions[3]->text(), QString("&Clear"));
+
+    QSignalSpy chosen(&recent, &RecentFiles::Chosen);
+    actions[0]->trigger();
+    QCOMPARE(chosen.count(), 1);
+    QCOMPARE(chosen[0][0].toString(), QString("/one/a&b.log"));
+    actions[3]->trigger();
+    QCOMPARE(chosen.count(), 1);
+    QCOMPARE(recent.list(), QString());
+}
+
+void tst_WindowState::fileSize_data()
+{
+    QTest::addColumn<qint64>("bytes");
+    QTest::addColumn<QString>("expected");
+    QTest::newRow("none") << qint64(0) << "0 bytes";
+    QTest::newRow("bytes") << qint64(999) << "999 bytes";
+    QTest::newRow("a tenth") << qint64(1234) << "1.2 kB";
+    QTest::newRow("whole") << qint64(12340) << "12 kB";
+    QTest::newRow("next unit") << qint64(999600) << "1.0 MB";
+    QTest::newRow("large") << qint64(1) * 5000000000 << "5.0 GB";
+}
+
+void tst_WindowState::fileSize()
+{
+    QFETCH(qint64, bytes);
+    QTEST(FileSizeText(bytes), "expected");
+}
+
+void tst_WindowState::logFileList()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("a[1] b.log");
+    for (char const* end : {"", ".1", ".2", ".10", ".x", ".01", ".bak.3"})
+        QVERIFY(TestFiles::write(log + end, "x"));
+    const QStringList all{log, log + ".1", log + ".2", log + ".10"};
+    QCOMPARE(LogFileList::FilesOf(log), all);
+    QCOMPARE(LogFileList::FilesOf(log + ".2"), all);
+    QCOMPARE(LogFileList::FilesOf(folder.filePath("none.log")),
+             QStringList(folder.filePath("none.log")));
+    QCOMPARE(LogFileList::CurrentOf(log + ".10"), log);
+    QCOMPARE(LogFileList::CurrentOf(log), log);
+}
+
+void tst_WindowState::preferences()
+{
+    const WindowTest test;
+    LogPreferences preferences = LogPreferences::Read();
+    QCOMPARE(preferences.dateFormat, QString("yyyy-MM-dd hh:mm:ss.z"));
+    QCOMPARE(preferences.filePrefix, QString("app"));
+    QCOMPARE(preferences.maxFiles, 10);
+
+    preferences.elapsedTime = true;
+    preferences.maxFiles = 7;
+    preferences.dateFormat = "hh:mm";
+    preferences.elapsedPrefix = "t=";
+    preferences.filePrefix = "other";
+    QCOMPARE(preferences.Apply(), QString());
+
+    // The first two hold at once, the others from the next start on.
+    TorkLog::logger()->trace("x");
+    const QByteArray line = TestFiles::read(test.logFile());
+    QVERIFY2(line.contains("Trace dT:[") && line.startsWith("20"), line);
+    QCOMPARE(TorkLog::logger()->maxLogFiles(), 7U);
+    QCOMPARE(LogPreferences::Read().filePrefix, QString("other"));
+
+    // The log opens its file before it knows of the other name, and the window goes by the file.
+    TorkLog::shutdown();
+    QVERIFY(QFile::remove(test.logFile()));
+    TorkLog::initialize(test.folder() + "data/logs/", "app", QString(), true);
+    TorkLog::logger()->trace("x");
+    const QByteArray next = TestFiles::read(test.logFile()).split('\n').value(1);
+    QVERIFY2(QRegularExpression("\\A\\d\\d:\\d\\d Trace t=\\[").match(QString(next)).hasMatch(),
+             next);
+    QCOMPARE(RunningLog::FileName(), test.logFile());
+}
+
+// The log's setter takes a number above 100 down to 100 first.
+void tst_WindowState::preferencesManyFiles()
+{
+    const WindowTest test;
+    TorkLog::logger()->setMaxLogFiles(500);
+    LogPreferences preferences = LogPreferences::Read();
+    QCOMPARE(preferences.maxFiles, 500);
+    preferences.maxFiles = 30;
+    QCOMPARE(preferences.Apply(), QString());
+    QCOMPARE(TorkLog::logger()->maxLogFiles(), 30U);
+}
+
+void tst_WindowState::isKept_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<bool>("expected");
+    QTest::newRow("plain") << "hh:mm" << true;
+    QTest::newRow("markup") << "<'x'>" << true;
+    QTest::newRow("empty") << "" << false;
+    QTest::newRow("end of CDATA") << "]]>" << false;
+    QTest::newRow("placeholder") << "%1" << false;
+    QTest::newRow("percent") << "%" << true;
+    QTest::newRow("umlaut") << QString::fromUtf8("\xC3\xA4") << false;
+    QTest::newRow("line feed") << "a\nb" << false;
+}
+
+void tst_WindowState::isKept()
+{
+    QFETCH(QString, text);
+    QTEST(LogPreferences::IsKept(text), "expected");
+}
+
+void tst_WindowState::instances()
+{
+    const WindowTest test;
+    const InstanceList own(test.logFile());
+    QCOMPARE(own.Others(), QList<qint64>());
+
+    QProcess other;
+    other.start(QCoreApplication::applicationFilePath(), {"--hold", test.logFile()});
+    QVERIFY(other.waitForReadyRead(20000));
+    QCOMPARE(own.Others(), QList<qint64>({other.processId()}));
+    LogHealth health;
+    const QString told = health.Check();
+    QVERIFY2(told.contains(QString::number(other.processId())), qPrintable(told));
+
+    other.closeWriteChannel();
+    QVERIFY(other.waitForFinished());
+    QCOMPARE(own.Others(), QList<qint64>());
+}
+
+// A program that was killed does not count any more.
+void tst_WindowState::instanceLeftBehind()
+{
+    const WindowTest test;
+    const InstanceList own(test.logFile());
+    QProcess other;
+    other.start(QCoreApplication::applicationFilePath(), {"--hold", test.logFile()});
+    QVERIFY(other.waitForReadyRead(20000));
+    other.kill();
+    other.waitForFinished();
+    QCOMPARE(own.Others(), QList<qint64>());
+}
+
+void tst_WindowState::health()
+{
+    const WindowTest test;
+    LogHealth health;
+    QCOMPARE(health.Check(), QString());
+    TorkLog::logger()->setEnable(false);
+    QCOMPARE(health.Check(), QString("The log is switched off"));
+    TorkLog::logger()->setEnable(true);
+    QCOMPARE(health.Check(), QString());
+    TorkLog::shutdown();
+    QCOMPARE(health.Check(), QString("There is no log"));
+}
+
+void tst_WindowState::healthDirectoryInTheWay()
+{
+    const WindowTest test;
+    QVERIFY(QDir().mkpath(test.logFile()));
+    TorkLog::logger()->trace("lost");
+    LogHealth health;
+    QVERIFY2(health.Check().startsWith("The log cannot be written: "), qPrintable(health.Check()));
+    QVERIFY(QDir(test.logFile()).removeRecursively());
+    TorkLog::logger()->trace("kept");
+    QCOMPARE(health.Check(), QString());
+}
+
+void tst_WindowState::report()
+{
+    const QByteArray older = DemoLog::run(300, QTime(17, 0), "older", true);
+    const QByteArray newer = DemoLog::run(20, QTime(9, 0), "newer");
+    const WindowTest test(DemoLog::writtenOver(older, newer));
+    const QString tail = SystemReport::LogTail(25);
+    QCOMPARE(tail.split('\n').size(), 26);
+    QVERIFY(tail.startsWith(QString(older).section('\n', 295, 295)));
+    QVERIFY(tail.endsWith(QString(newer)));
+
+    const QString facts = SystemReport::Facts(test.settingsFile());
+    for (QString const& expected :
+         {QString("Program: Velocor "), QString("Toolkit running: ") + qVersion(),
+          QString("Organization: Org\n"), QString("Product: Product\n"), QString("Locale: "),
+          QString("Style: "), QString("Screen 1: "), "Data: " + test.folder() + "data/ (",
+          "Log file: " + test.logFile() + " ("})
+        QVERIFY2(facts.contains(expected), qPrintable("missing: " + expected + "\n" + facts));
+    const QString whole = SystemReport::Whole(test.settingsFile());
+    QVERIFY(whole.contains(facts));
+    QVERIFY(whole.endsWith(SystemReport::LogTail(SystemReport::TailLines)));
+}
+
+// Started with "--hold FILE" it is another program that shares a log, until its input ends.
+int main(int argc, char** argv)
+{
+    QApplication application(argc, argv);
+    if (application.arguments().value(1) == "--hold") {
+        const InstanceList instances(application.arguments().value(2));
+        QTextStream(stdout) << "held\n" << flush;
+        QTextStream(stdin).readAll();
+        return 0;
+    }
+    tst_WindowState test;
+    return QTest::qExec(&test, argc, argv);
+}
+#include "tst_WindowState.moc"
