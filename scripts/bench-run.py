@@ -1,0 +1,415 @@
+#!/usr/bin/env python3
+# SPDX-FileCopyrightText: The Velocor authors
+# SPDX-License-Identifier: MIT
+"""Runs the benchmark programs and prints a table a group. Called by ./bench.
+
+    scripts/bench-run.py FOLDER-OF-THE-PROGRAMS [--quick] [--cpu] [--write-doc] [SECTION ...]
+"""
+
+import argparse
+import datetime
+import json
+import os
+import pathlib
+import platform
+import shutil
+import statistics
+import subprocess
+import sys
+import tempfile
+
+ROOT = pathlib.Path(__file__).resolve().parent.parent
+DOCUMENT = ROOT / "docs" / "performance.md"
+BEGIN = "<!-- tables: written by ./bench --write-doc -->"
+END = "<!-- end of the tables -->"
+FLOOR = "floor"
+
+
+class Goal:
+    """`what` costs at most `factor` times what `other` costs, in each of `groups`."""
+
+    def __init__(self, groups, what, factor, other):
+        self.groups, self.what, self.factor, self.other = groups, what, factor, other
+
+
+class Section:
+    def __init__(self, title, runs, repetitions, unit=None, goals=()):
+        self.title = title
+        self.runs = runs  # (program, how it is run)
+        self.repetitions = repetitions  # of a whole run, of a quick one
+        self.unit = unit  # what the counter "units" of a measurement counts
+        self.goals = goals
+
+
+ENTRY = ["entry, 1 thread", "entry, 2 threads", "entry, 4 threads"]
+PACED = ["paced, one a millisecond", "paced, one a second"]
+LOADS = ["load 20x50 values", "load 200x500 values"]
+SAVES = ["save 20x50 values", "save 200x500 values"]
+WRITES = ["document to file", "document to bytes"]
+PARSES = ["parse generated document", "parse shared MIME database"]
+
+SECTIONS = {
+    "log": Section(
+        "Log entries",
+        [("bench_log", "google"), ("bench_log_paced", "own")],
+        (15, 3),
+        goals=[
+            Goal(ENTRY, "TorkLog", 1.0, "spdlog basic_file_sink_mt"),
+            Goal(ENTRY, "TorkLog", 1.0, "spdlog rotating_file_sink_mt"),
+            Goal(ENTRY[:1], "TorkLog", 1.6, FLOOR),
+            Goal(PACED, "TorkLog", 1.0, "log4cplus"),
+            Goal(["off"], "TorkLog", 5.0, FLOOR),
+        ],
+    ),
+    "config": Section(
+        "Settings files",
+        [("bench_config", "google")],
+        (15, 3),
+        goals=[
+            Goal(LOADS, "TorkConfigFile", 1.25, FLOOR),
+            Goal(LOADS, "TorkConfigFile", 1.0, "KConfig"),
+            Goal(LOADS[1:], "TorkConfigFile", 1.0, "QSettings"),
+            Goal(SAVES, "TorkConfigFile", 1.2, "pugixml"),
+            Goal(SAVES, "TorkConfigFile", 0.1, "QSettings"),
+            Goal(["typed reads"], "TorkConfigFile", 1.5, FLOOR),
+        ],
+    ),
+    "write": Section(
+        "Writing XML",
+        [("bench_xml_write", "google")],
+        (11, 3),
+        unit="element",
+        goals=[
+            Goal(WRITES, "Tork", 3.0, FLOOR),
+            Goal(WRITES, "Tork", 1 / 3.5, "QXmlStreamWriter"),
+        ],
+    ),
+    "parse": Section(
+        "Parsing XML through states",
+        [("bench_xml_parse", "google")],
+        (7, 3),
+        goals=[Goal(PARSES, "parse manager", 1.10, FLOOR)],
+    ),
+    "start": Section(
+        "Start to the first painted window",
+        [("bench_start", "display")],
+        (40, 10),
+        goals=[
+            Goal(["start, time"], "velocor", 0.75, FLOOR),
+            Goal(["start, peak memory"], "velocor", 0.5, FLOOR),
+        ],
+    ),
+    "growth": Section("Cost as work grows", [("bench_growth", "google")], (5, 2)),
+}
+
+
+# What a run gives: for each group and contestant, in the order in which they came, the samples.
+
+
+class Samples:
+    def __init__(self):
+        self.groups = {}
+        self.units = {}
+
+    def add(self, group, name, value, unit, units=None):
+        samples = self.groups.setdefault(group, {}).setdefault(name, {"values": [], "unit": unit})
+        samples["values"].append(value)
+        if units:
+            self.units[(group, name)] = units
+
+    def median(self, group, name):
+        return statistics.median(self.groups[group][name]["values"])
+
+    def find(self, group, start):
+        """The full name of the first contestant of a group whose name starts so."""
+        names = sorted(self.groups.get(group, {}), key=lambda name: (name != start, name))
+        return next((name for name in names if name.startswith(start)), None)
+
+
+NANOSECONDS = {"ns": 1.0, "us": 1e3, "ms": 1e6, "s": 1e9}
+
+
+def in_base_unit(value, unit):
+    return (value * NANOSECONDS[unit], "ns") if unit in NANOSECONDS else (value, unit)
+
+
+def collect(samples, results, use_cpu):
+    threaded = {
+        entry["name"].split("/")[0] for entry in results["benchmarks"] if entry["threads"] > 1
+    }
+    # The order in which they were registered; they come in the order in which they happened to run.
+    for entry in sorted(results["benchmarks"], key=lambda entry: entry.get("family_index", 0)):
+        if entry.get("error_occurred"):
+            sys.exit(f"bench: {entry['name']}: {entry['error_message']}")
+        if entry["run_type"] != "iteration":
+            continue
+        full_name = entry["name"].split("/")[0]
+        group, name = full_name.rsplit("|", 1)
+        if full_name in threaded:
+            count = entry["threads"]
+            group += f", {count} thread" + ("s" if count > 1 else "")
+        time = entry["cpu_time"] if use_cpu and "cpu_time" in entry else entry["real_time"]
+        value, unit = in_base_unit(time, entry["time_unit"])
+        samples.add(group, name, value, unit, entry.get("units"))
+
+
+# Running the programs.
+
+
+def environment(home):
+    """No zone, no toolkit settings of the user's, and a home that nothing is kept in."""
+    kept = {
+        name: value
+        for name, value in os.environ.items()
+        if not name.startswith(("QT_", "XDG_", "KDE_")) and name not in ("TZ", "DISPLAY")
+    }
+    runtime = pathlib.Path(home) / "runtime"
+    runtime.mkdir(mode=0o700, exist_ok=True)
+    return {**kept, "HOME": home, "LC_ALL": "C.UTF-8", "XDG_RUNTIME_DIR": str(runtime)}
+
+
+def start_display():
+    """Starts a virtual display; returns the process and the display's name."""
+    reading, writing = os.pipe()
+    process = subprocess.Popen(
+        ["Xvfb", "-displayfd", str(writing), "-screen", "0", "1920x1080x24", "-nolisten", "tcp"],
+        pass_fds=[writing],
+        stderr=subprocess.DEVNULL,
+    )
+    os.close(writing)
+    with os.fdopen(reading) as pipe:
+        number = pipe.readline().strip()
+    if not number:
+        sys.exit("bench: the virtual display did not start")
+    return process, f":{number}"
+
+
+def run_quietly(command, variables):
+    result = subprocess.run(command, env=variables, capture_output=True, text=True, check=False)
+    if result.returncode:
+        sys.exit(f"bench: {command[0]} failed:\n{result.stderr}")
+
+
+def run_program(program, kind, repetitions, quick, home):
+    results = os.path.join(home, "results.json")
+    quick_flag = ["--quick"] if quick else []
+    variables = environment(home)
+    if kind == "google":
+        command = [program, *quick_flag]
+        command += [f"--benchmark_repetitions={repetitions}"]
+        command += ["--benchmark_enable_random_interleaving=true"]
+        command += [f"--benchmark_out={results}", "--benchmark_out_format=json"]
+        run_quietly(command, variables)
+    elif kind == "own":
+        subprocess.run([program, results, *quick_flag], env=variables, check=True)
+    else:
+        display, variables["DISPLAY"] = start_display()
+        try:
+            command = [program, results, str(repetitions)]
+            subprocess.run(command, env=variables, check=True)
+        finally:
+            display.terminate()
+            display.wait()
+    with open(results, encoding="utf-8") as file:
+        return json.load(file)
+
+
+def measure(section, programs, options):
+    samples = Samples()
+    repetitions = section.repetitions[1 if options.quick else 0]
+    for program, kind in section.runs:
+        home = tempfile.mkdtemp(prefix="velocor-bench-home-")
+        try:
+            path = programs / program
+            results = run_program(path, kind, repetitions, options.quick, home)
+            collect(samples, results, options.cpu)
+        finally:
+            shutil.rmtree(home)
+    return samples
+
+
+# The tables.
+
+
+def three_digits(value):
+    return f"{value:.{0 if value >= 99.95 else 1 if value >= 9.995 else 2}f}"
+
+
+def worded(value, unit):
+    if unit != "ns":
+        return f"{value / 1024:.1f} MiB" if unit == "KiB" else f"{value:.0f} {unit}"
+    for factor, name in ((1e9, "s"), (1e6, "ms"), (1e3, "µs")):
+        if value >= factor:
+            return f"{three_digits(value / factor)} {name}"
+    return f"{three_digits(value)} ns"
+
+
+def spread(values):
+    """Half the distance between the quartiles, as a part of the median."""
+    if len(values) < 3:
+        return "–"
+    lower, middle, upper = statistics.quantiles(values, n=4, method="inclusive")
+    return f"±{(upper - lower) / 2 / middle:.0%}" if middle else "–"
+
+
+def table(header, rows):
+    cells = [header] + rows
+    widths = [max(len(row[column]) for row in cells) for column in range(len(header))]
+
+    def line(row):
+        first = row[0].ljust(widths[0])
+        others = [text.rjust(width) for text, width in zip(row[1:], widths[1:])]
+        return "| " + " | ".join([first, *others]) + " |"
+
+    rule = "|" + "|".join(
+        "-" * (width + 1) + (":" if column else "-") for column, width in enumerate(widths)
+    ) + "|"
+    return "\n".join([line(header), rule] + [line(row) for row in rows])
+
+
+def contestants_table(samples, group, unit_name):
+    contestants = samples.groups[group]
+    floor = samples.find(group, FLOOR)
+    per_unit = unit_name and any((group, name) in samples.units for name in contestants)
+    header = ["", "median", "fastest", "spread"]
+    header += [f"a{'n' if unit_name[0] in 'aeiou' else ''} {unit_name}"] if per_unit else []
+    header += ["× floor"] if floor else []
+
+    rows = []
+    for name in sorted(contestants, key=lambda key: samples.median(group, key)):
+        values, unit = contestants[name]["values"], contestants[name]["unit"]
+        median = samples.median(group, name)
+        row = [name, worded(median, unit), worded(min(values), unit), spread(values)]
+        if per_unit:
+            row.append(worded(median / samples.units[(group, name)], unit))
+        if floor:
+            row.append(f"{median / samples.median(group, floor):.2f}")
+        rows.append(row)
+    return f"### {group[0].upper()}{group[1:]}\n\n{table(header, rows)}\n"
+
+
+def growth_table(samples):
+    """Groups are worded "growth|WHAT|COUNT": a row each WHAT, a column each size."""
+    kinds = {}
+    for group, contestants in samples.groups.items():
+        kind = group.split("|", 1)[1]
+        for name in contestants:
+            units = samples.units[(group, name)]
+            cost = samples.median(group, name) / units
+            kinds.setdefault(kind, []).append((int(name), cost))
+    rows = []
+    for kind, costs in kinds.items():
+        costs.sort()
+        row = [kind] + [f"{count:,}: {worded(cost, 'ns')}" for count, cost in costs]
+        rows.append(row + [f"{costs[-1][1] / costs[0][1]:.2f}"])
+    header = ["cost of one", "few", "ten times as many", "a hundred times", "last / first"]
+    return table(header, rows) + "\n"
+
+
+def goal_lines(section, samples):
+    lines = []
+    for goal in section.goals:
+        for group in goal.groups:
+            what, other = samples.find(group, goal.what), samples.find(group, goal.other)
+            if not what or not other:
+                sys.exit(f"bench: nothing was measured for a goal of '{group}'")
+            ratio = samples.median(group, what) / samples.median(group, other)
+            reference = FLOOR if goal.other == FLOOR else other
+            verdict = "reached" if ratio <= goal.factor else "NOT REACHED"
+            wanted = f"{what} at most {goal.factor:.3g} × {reference}"
+            lines.append(f"- {group}: {wanted}: {ratio:.2f}, {verdict}")
+    return "\n".join(lines) + "\n" if lines else ""
+
+
+def report(name, section, samples):
+    if name == "growth":
+        parts = [growth_table(samples)]
+    else:
+        parts = [contestants_table(samples, group, section.unit) for group in samples.groups]
+    goals = goal_lines(section, samples)
+    return "\n".join([f"## {section.title}\n", *parts] + ([goals] if goals else []))
+
+
+# Where and when it was measured.
+
+
+def first_line(command):
+    try:
+        result = subprocess.run(command, capture_output=True, text=True, check=True)
+        return result.stdout.split("\n")[0]
+    except (OSError, subprocess.CalledProcessError):
+        return "unknown"
+
+
+def value_in(path, key):
+    with open(path, encoding="utf-8") as file:
+        for line in file:
+            name, _, value = line.partition(":" if ":" in line else "=")
+            if name.strip() == key:
+                return value.strip().strip('"')
+    return "unknown"
+
+
+def versions():
+    packages = (
+        "libqt5core5a libspdlog-dev liblog4cplus-dev liblog4cxx-dev libboost-dev "
+        "libgoogle-glog-dev libkf5config-dev libpugixml-dev libxml2-dev libbenchmark-dev"
+    ).split()
+    query = ["dpkg-query", "-W", "-f=${Package} ${Version}\n", *packages]
+    result = subprocess.run(query, capture_output=True, text=True, check=False)
+    return ", ".join(result.stdout.split("\n")[:-1])
+
+
+def machine(options):
+    memory = int(value_in("/proc/meminfo", "MemTotal").split()[0]) / 1024**2
+    return "\n".join(
+        [
+            f"- Date: {datetime.date.today().isoformat()}",
+            f"- Processor: {value_in('/proc/cpuinfo', 'model name')}, {os.cpu_count()} cores; "
+            f"memory: {memory:.0f} GiB",
+            f"- System: {value_in('/etc/os-release', 'PRETTY_NAME')}, Linux {platform.release()}, "
+            f"{first_line(['c++', '--version'])}",
+            f"- Versions: {versions()}",
+            f"- Load when the run began (two cores busy would be 2.0): {os.getloadavg()[0]:.1f}",
+            f"- Measured: {'processor time' if options.cpu else 'time'}"
+            + (", quick run" if options.quick else ""),
+        ]
+    )
+
+
+def write_document(text):
+    document = DOCUMENT.read_text(encoding="utf-8")
+    before, _, rest = document.partition(BEGIN)
+    _, end, after = rest.partition(END)
+    if not end:
+        sys.exit(f"bench: {DOCUMENT} has no place for the tables")
+    DOCUMENT.write_text(f"{before}{BEGIN}\n\n{text}\n{END}{after}", encoding="utf-8")
+
+
+def main():
+    parser = argparse.ArgumentParser(prog="bench", description="Measures project and peers.")
+    parser.add_argument("programs", type=pathlib.Path, help=argparse.SUPPRESS)
+    parser.add_argument("sections", nargs="*", metavar="SECTION", help=", ".join(SECTIONS))
+    parser.add_argument("--quick", action="store_true", help="fewer and smaller measurements")
+    parser.add_argument("--cpu", action="store_true", help="processor time, for a busy machine")
+    parser.add_argument("--write-doc", action="store_true", help="write docs/performance.md")
+    options = parser.parse_intermixed_args()
+    names = options.sections or list(SECTIONS)
+    unknown = [name for name in names if name not in SECTIONS]
+    if unknown:
+        parser.error(f"no section is called {', '.join(unknown)}")
+    if options.write_doc and (options.sections or options.quick or options.cpu):
+        parser.error("the document is written from a whole run only")
+
+    parts = [machine(options) + "\n"]
+    print(parts[0], flush=True)
+    for name in names:
+        section = SECTIONS[name]
+        parts.append(report(name, section, measure(section, options.programs, options)))
+        print(parts[-1], flush=True)
+    if options.write_doc:
+        write_document("\n".join(parts))
+
+
+if __name__ == "__main__":
+    main()

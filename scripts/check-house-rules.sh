@@ -1,0 +1,78 @@
+#!/usr/bin/env bash
+# SPDX-FileCopyrightText: The Velocor authors
+# SPDX-License-Identifier: MIT
+#
+# The rules of this source tree that no compiler checks. Prints each breach, fails on any.
+set -euo pipefail
+cd "$(dirname "${BASH_SOURCE[0]}")/.."
+
+breaches=0
+
+# rule TEXT COMMAND...: what the command prints are the places where the rule is broken.
+rule() {
+    local text=$1 places
+    shift
+    places=$("$@")
+    [ -n "$places" ] || return 0
+    printf 'house rules: %s:\n%s\n' "$text" "$places"
+    breaches=$((breaches + 1))
+}
+
+# Every file that is tracked or would be, as git matches the patterns; a pattern's * takes in folders.
+tracked() {
+    local file
+    git ls-files --cached --others --exclude-standard -- "$@" | sort -u |
+        while IFS= read -r file; do
+            [ ! -f "$file" ] || printf '%s\0' "$file"
+        done
+}
+
+sources() {
+    tracked '*.cpp' '*.h' '*.cmake' '*CMakeLists.txt' '*.sh' '*.in' run test bench .ci/run .clang-tidy
+}
+
+# grep over the files named on standard input; finding nothing is no failure.
+search() { xargs -0 -r grep "$@" || [ $? -eq 123 ]; }
+
+without_spdx() {
+    local file
+    while IFS= read -r -d '' file; do
+        [ "$(head -n 5 "$file" | grep -cE \
+            'SPDX-FileCopyrightText: The Velocor authors|SPDX-License-Identifier: MIT')" -eq 2 ] ||
+            echo "$file"
+    done < <(sources)
+}
+
+without_pragma_once() { tracked '*.h' | search -LE '^#pragma once$'; }
+
+stray_blanks() { sources | search -nHP '\t|[ \t]+$'; }
+
+# Ada is the user of the samples. The names are broken up so as not to find themselves.
+machine_paths() {
+    local start='(^|[^]A-Za-z0-9_.}$)/-])' name='[A-Za-z0-9_.]+'
+    tracked | search -nHIP \
+        "$start/((home|Users)/(?!ada/)$name/$name|(root|wo""rk|workspace)/$name)|/tmp/[a-z]*_jo""bs"
+}
+
+# Of a folder's includes that name a folder of this tree, those of any folder but the given ones.
+includes_beyond() {
+    local folder=$1 allowed
+    shift
+    allowed=$(printf '|%s' "$@")
+    tracked "$folder/*.cpp" "$folder/*.h" |
+        search -nHP "^\s*#\s*include\s*[<\"](\.\./)*(?!(${allowed#|})/)(app|common/\w+)/"
+}
+
+rule "no SPDX lines at the top" without_spdx
+rule "a header without #pragma once" without_pragma_once
+rule "a tab, or blanks at a line's end" stray_blanks
+rule "a path of one machine" machine_paths
+rule "config may include log and xml, no more" \
+    includes_beyond common/config common/config common/log common/xml
+rule "log may include config, no more" \
+    includes_beyond common/log common/log common/config
+rule "xml may include log, no more" \
+    includes_beyond common/xml common/xml common/log
+
+[ "$breaches" -eq 0 ] || exit 1
+echo "house rules: $(sources | tr -dc '\0' | wc -c) files keep them"

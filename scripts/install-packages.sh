@@ -1,0 +1,102 @@
+#!/usr/bin/env bash
+# SPDX-FileCopyrightText: The Velocor authors
+# SPDX-License-Identifier: MIT
+#
+# Installs the packages of the named groups, as root or through sudo (brew on macOS).
+# Nothing is asked of the network, and no password, when all of them are there already.
+#
+#     scripts/install-packages.sh build          what the program is built from
+#     scripts/install-packages.sh wayland        the toolkit's backend for a screen without X11
+#     scripts/install-packages.sh build test     and what its tests need
+#     scripts/install-packages.sh build bench    and the peers that ./bench measures against
+#     scripts/install-packages.sh build fuzz     and the compiler with the fuzzing runtime
+#     scripts/install-packages.sh build lint     and the format and lint checks
+set -euo pipefail
+
+say() { echo "install-packages: $*" >&2; }
+
+# The names of one group's packages in the system's package manager.
+packages_of() {
+    case "$(uname -s)/$1" in
+    Darwin/build) echo cmake ninja qt@5 rapidxml ;;
+    Darwin/lint) echo clang-format@14 llvm@14 shellcheck ;;
+    Darwin/test | Darwin/wayland) ;;
+    */build) echo g++ cmake ninja-build qtbase5-dev librapidxml-dev ;;
+    */wayland) echo qtwayland5 ;;
+    */test) echo xvfb xauth shared-mime-info pkg-config valgrind ;;
+    */bench)
+        echo python3 xvfb xauth shared-mime-info libbenchmark-dev libspdlog-dev liblog4cplus-dev \
+            liblog4cxx-dev libboost-dev libboost-log-dev libgoogle-glog-dev libkf5config-dev \
+            libpugixml-dev libxml2-dev
+        ;;
+    */fuzz) echo clang-14 libclang-rt-14-dev ;;
+    */lint) echo git clang-format-14 clang-tidy-14 shellcheck ;;
+    *)
+        say "no group is called '$1'"
+        return 2
+        ;;
+    esac
+}
+
+missing_from_apt() {
+    local installed
+    # dpkg-query fails where it does not know a name: just what is asked here.
+    # shellcheck disable=SC2016
+    installed=$(dpkg-query -W -f='${db:Status-Status} ${Package}\n' "$@" 2>/dev/null || true)
+    for package in "$@"; do
+        grep -qxF "installed $package" <<<"$installed" || echo "$package"
+    done
+}
+
+missing_from_brew() {
+    for package in "$@"; do
+        brew list --formula "$package" >/dev/null 2>&1 || echo "$package"
+    done
+}
+
+as_root() {
+    if [ "$(id -u)" -eq 0 ]; then
+        "$@"
+    elif command -v sudo >/dev/null; then
+        sudo "$@"
+    else
+        say "not root and no sudo here; as root, run: apt-get install ${missing[*]}"
+        return 1
+    fi
+}
+
+install_with_apt() {
+    as_root apt-get update -q
+    as_root env DEBIAN_FRONTEND=noninteractive \
+        apt-get install -q -y --no-install-recommends "$@"
+}
+
+names=()
+for group in "$@"; do
+    packages=$(packages_of "$group")
+    read -r -a group_names <<<"$packages"
+    names+=(${group_names[@]+"${group_names[@]}"})
+done
+[ ${#names[@]} -gt 0 ] || exit 0
+
+if command -v dpkg-query >/dev/null && command -v apt-get >/dev/null; then
+    manager=apt
+elif command -v brew >/dev/null; then
+    manager=brew
+else
+    say "neither apt-get nor brew here; going on in the hope that these are installed: ${names[*]}"
+    exit 0
+fi
+
+missing=()
+while read -r package; do
+    missing+=("$package")
+done < <("missing_from_$manager" "${names[@]}")
+[ ${#missing[@]} -gt 0 ] || exit 0
+
+say "installing ${missing[*]}"
+if [ "$manager" = apt ]; then
+    install_with_apt "${missing[@]}"
+else
+    brew install "${missing[@]}"
+fi
