@@ -1,0 +1,29 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// A program outside the tree that the frame has to work for. Returns 0 if it does.
+
+#include "app/AppPaths.h"
+#include "app/AppUtils.h"
+#include "app/LaunchOptionParser.h"
+#include "app/UserMessages.h"
+
+#include <QApplication>
+#include <QMenu>
+#include <QVariant>
+
+int main(int argc, char** argv)
+{
+    QApplication application(argc, argv);
+    AppPaths::SetOrganizationAndProduct("Some Organization", "Some Product");
+    QString xml = "<arg key=\"name\">value</arg>";
+    LaunchOptionParser parser;
+    parser.AddOption(new LaunchOption("name", "name", "n", 1, ""));
+    QMenu menu;
+
+    const bool works = application.property("DataPath").toString().endsWith("/Some Product/") &&
+                       parser.ParseOptions(xml) && parser.FindOption("name")->value == "value" &&
+                       AppUtils::SetupMRUMenu(&menu, "b|a") && menu.actions().size() == 2;
+    WarningMessage(nullptr, "only logged", false);
+    return works ? 0 : 1;
+}
