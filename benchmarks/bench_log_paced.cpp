@@ -1,0 +1,142 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// What an entry costs where entries come slowly, and everything that is kept from one entry to
+// the next is cold or out of date: one a millisecond, and one a second.
+//
+// Google Benchmark has no pace, so the calls are timed here; the results are worded as its own.
+
+#include "log/LogEntrants.h"
+#include "support/ScratchFolder.h"
+
+#include <QCoreApplication>
+#include <QFile>
+#include <QJsonArray>
+#include <QJsonDocument>
+#include <QJsonObject>
+
+#include <algorithm>
+#include <chrono>
+#include <random>
+#include <thread>
+
+namespace {
+
+using Clock = std::chrono::steady_clock;
+
+struct Runner
+{
+    char const* name;
+    std::unique_ptr<ScratchFolder> folder;
+    std::unique_ptr<LogEntrant> log;
+};
+
+// The toolkit has one message handler, which the two entrants that go through it would take from
+// each other if they stood side by side.
+bool NeedsMessageHandler(LogEntrantDescription const& entrant)
+{
+    return entrant.make == MakeToolkitEntrant || entrant.make == MakeTorkLogByToolkitEntrant ||
+           entrant.make == MakeTorkLogBelowLimitEntrant;
+}
+
+double NanosecondsOfOneEntry(LogEntrant& log)
+{
+    const Clock::time_point before = Clock::now();
+    log.write();
+    return std::chrono::duration<double, std::nano>(Clock::now() - before).count();
+}
+
+QJsonObject Measurement(QString const& group, char const* name, double nanoseconds)
+{
+    return {{"name", group + '|' + QLatin1String(name)},
+            {"run_type", "iteration"},
+            {"threads", 1},
+            {"iterations", 1},
+            {"real_time", nanoseconds},
+            {"time_unit", "ns"}};
+}
+
+class PacedRun
+{
+public:
+    PacedRun()
+    {
+        for (LogEntrantDescription const& entrant : CheckedLogEntrants()) {
+            if (NeedsMessageHandler(entrant))
+                continue;
+            auto folder = std::make_unique<ScratchFolder>();
+            auto log = entrant.make(folder->path());
+            m_runners.push_back({entrant.name, std::move(folder), std::move(log)});
+        }
+    }
+
+    // Each round every entrant writes its entries in a row, one a millisecond. The first of the
+    // row follows a pause and is left out.
+    void oneAMillisecond(int rounds)
+    {
+        const int entries = 50;
+        for (int round = 0; round < rounds; ++round) {
+            shuffle();
+            for (Runner& runner : m_runners) {
+                Clock::time_point next = Clock::now();
+                for (int entry = 0; entry <= entries; ++entry) {
+                    std::this_thread::sleep_until(next += std::chrono::milliseconds(1));
+                    const double nanoseconds = NanosecondsOfOneEntry(*runner.log);
+                    if (entry > 0)
+                        keep("paced, one a millisecond", runner, nanoseconds);
+                }
+            }
+        }
+    }
+
+    // Each second every entrant writes one entry, spread over the second, always in one order so
+    // that a second passes between two entries of each.
+    void oneASecond(int seconds)
+    {
+        shuffle();
+        const auto step = std::chrono::microseconds(1000000 / m_runners.size());
+        Clock::time_point next = Clock::now();
+        for (int second = 0; second <= seconds; ++second) {
+            for (Runner& runner : m_runners) {
+                std::this_thread::sleep_until(next += step);
+                const double nanoseconds = NanosecondsOfOneEntry(*runner.log);
+                if (second > 0)
+                    keep("paced, one a second", runner, nanoseconds);
+            }
+        }
+    }
+
+    QJsonObject result() const { return {{"benchmarks", m_measurements}}; }
+
+private:
+    void shuffle() { std::shuffle(m_runners.begin(), m_runners.end(), m_random); }
+
+    void keep(QString const& group, Runner const& runner, double nanoseconds)
+    {
+        m_measurements.append(Measurement(group, runner.name, nanoseconds));
+    }
+
+    std::vector<Runner> m_runners;
+    QJsonArray m_measurements;
+    std::mt19937 m_random{std::random_device{}()};
+};
+
+} // namespace
+
+// bench_log_paced RESULTS [--quick]
+int main(int argc, char** argv)
+{
+    QCoreApplication application(argc, argv);
+    const QStringList arguments = QCoreApplication::arguments();
+    Require(arguments.size() > 1, QStringLiteral("usage: bench_log_paced RESULTS [--quick]"));
+    const bool quick = arguments.contains("--quick");
+
+    PacedRun run;
+    run.oneAMillisecond(quick ? 4 : 20);
+    run.oneASecond(quick ? 8 : 40);
+
+    QFile file(arguments[1]);
+    Require(file.open(QIODevice::WriteOnly), file.errorString());
+    file.write(QJsonDocument(run.result()).toJson());
+    return 0;
+}

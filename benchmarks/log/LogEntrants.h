@@ -1,0 +1,48 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include <QString>
+
+#include <memory>
+#include <string>
+#include <vector>
+
+/// One logging library, set up to write one-line entries with date, time to the millisecond,
+/// severity and message into a file, each flushed to the kernel before the call returns.
+class LogEntrant
+{
+public:
+    virtual ~LogEntrant() = default;
+
+    /// Writes one entry whose message is LogMessage(). Any thread.
+    virtual void write() = 0;
+};
+
+/// Makes an entrant that writes into `folder`, whose path ends in "/". One at a time in a process.
+using LogEntrantFactory = std::unique_ptr<LogEntrant> (*)(QString const& folder);
+
+struct LogEntrantDescription
+{
+    char const* name;
+    LogEntrantFactory make;
+};
+
+/// All entrants, after a check of each that an entry is in the file when the call returns.
+std::vector<LogEntrantDescription> CheckedLogEntrants();
+
+/// The message of every entry: 100 characters.
+std::string const& LogMessage();
+
+std::unique_ptr<LogEntrant> MakeFloorEntrant(QString const& folder);
+std::unique_ptr<LogEntrant> MakeTorkLogEntrant(QString const& folder);
+std::unique_ptr<LogEntrant> MakeTorkLogBelowLimitEntrant(QString const& folder);
+std::unique_ptr<LogEntrant> MakeTorkLogByToolkitEntrant(QString const& folder);
+std::unique_ptr<LogEntrant> MakeSpdlogBasicEntrant(QString const& folder);
+std::unique_ptr<LogEntrant> MakeSpdlogRotatingEntrant(QString const& folder);
+std::unique_ptr<LogEntrant> MakeLog4cplusEntrant(QString const& folder);
+std::unique_ptr<LogEntrant> MakeLog4cxxEntrant(QString const& folder);
+std::unique_ptr<LogEntrant> MakeBoostLogEntrant(QString const& folder);
+std::unique_ptr<LogEntrant> MakeGlogEntrant(QString const& folder);
+std::unique_ptr<LogEntrant> MakeToolkitEntrant(QString const& folder);

@@ -1,0 +1,65 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "log/LogEntrants.h"
+
+#include "common/config/TorkConfigFile.h"
+#include "common/log/TorkLog.h"
+
+#include <QDebug>
+#include <QMessageLogger>
+
+namespace {
+
+// The one log of the process, and the message handler that was there before it.
+class TorkLogEntrant : public LogEntrant
+{
+public:
+    explicit TorkLogEntrant(QString const& folder)
+        : m_handler(qInstallMessageHandler(nullptr)),
+          m_message(QString::fromStdString(LogMessage()))
+    {
+        TorkLog::initialize(folder, "bench", QString(), true);
+    }
+
+    ~TorkLogEntrant() override
+    {
+        TorkLog::shutdown();
+        qInstallMessageHandler(m_handler);
+    }
+
+    void write() override { TorkLog::m_gLog->write(TorkLog::Notification, m_message); }
+
+private:
+    QtMessageHandler m_handler;
+
+protected:
+    QString m_message;
+};
+
+class TorkLogByToolkitEntrant : public TorkLogEntrant
+{
+public:
+    using TorkLogEntrant::TorkLogEntrant;
+    void write() override { QMessageLogger().info().noquote() << m_message; }
+};
+
+} // namespace
+
+std::unique_ptr<LogEntrant> MakeTorkLogEntrant(QString const& folder)
+{
+    return std::make_unique<TorkLogEntrant>(folder);
+}
+
+std::unique_ptr<LogEntrant> MakeTorkLogBelowLimitEntrant(QString const& folder)
+{
+    TorkConfigFile settings(folder + "logsettings.cfg", "LogSettings");
+    settings.WriteItem("config", "maxLogFileSize", 2000000000);
+    settings.Save();
+    return MakeTorkLogEntrant(folder);
+}
+
+std::unique_ptr<LogEntrant> MakeTorkLogByToolkitEntrant(QString const& folder)
+{
+    return std::make_unique<TorkLogByToolkitEntrant>(folder);
+}
