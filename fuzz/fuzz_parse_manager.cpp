@@ -1,0 +1,103 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// The parse manager over any document, with states that accept and refuse as the input says: no
+// state is lost, none is deleted twice, and no document makes the manager fall.
+
+#include "FuzzInput.h"
+
+#include "common/xml/TorkXml_FlushUnknownElement.h"
+#include "common/xml/TorkXml_ParseManager_Base.h"
+
+#include <QXmlInputSource>
+#include <QXmlSimpleReader>
+
+namespace {
+
+int s_states = 0;
+
+// Answers by the bits of a byte and the name it is asked about.
+class MoodyState : public TorkXml_ParseState_Base
+{
+public:
+    MoodyState(QString const& element, TorkXml_ParseManager_Base* manager, FuzzInput& moods)
+        : TorkXml_ParseState_Base(element, manager), m_moods(moods)
+    {
+        ++s_states;
+    }
+
+    ~MoodyState() override { --s_states; }
+
+    bool CanHandleElement(QString const&) override { return m_moods.byte() % 8 == 1; }
+
+    TorkXml_ParseState_Base* GetNextState(QString const& name) override
+    {
+        switch (m_moods.byte() % 16) {
+        case 1:
+            return nullptr;
+        case 2:
+            return new TorkXml_FlushUnknownElement(name, ParseManager());
+        case 3: // for another element than the one it was asked for
+            return new MoodyState(name + "x", ParseManager(), m_moods);
+        default:
+            return new MoodyState(name, ParseManager(), m_moods);
+        }
+    }
+
+    bool ProcessContent(QString const& name, QString const& content) override
+    {
+        const uint8_t mood = m_moods.byte();
+        if (mood % 16 == 1)
+            ParseManager()->AppendError(name, content, mood);
+        return mood % 32 != 2;
+    }
+
+    bool EndElement(QString const&) override { return m_moods.byte() % 2; }
+
+private:
+    FuzzInput& m_moods;
+};
+
+class MoodyManager : public TorkXml_ParseManager_Base
+{
+public:
+    explicit MoodyManager(FuzzInput& moods) : m_moods(moods) {}
+
+    TorkXml_ParseState_Base* GetFirstState(QString const& name) override
+    {
+        return m_moods.byte() % 16 == 1 ? nullptr : new MoodyState(name, this, m_moods);
+    }
+
+private:
+    FuzzInput& m_moods;
+};
+
+} // namespace
+
+extern "C" int LLVMFuzzerInitialize(int*, char***)
+{
+    SilenceMessages();
+    return 0;
+}
+
+extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
+{
+    const size_t moodCount = size < 1 ? 0 : qMin<size_t>(data[0], size - 1);
+    FuzzInput moods(data + 1, moodCount);
+    QXmlInputSource source;
+    if (size > 0) {
+        char const* document = reinterpret_cast<char const*>(data) + 1 + moodCount;
+        source.setData(QByteArray(document, int(size - 1 - moodCount)));
+    }
+    {
+        MoodyManager manager(moods);
+        QXmlSimpleReader reader;
+        reader.setContentHandler(&manager);
+        reader.parse(source);
+        QString report;
+        manager.FormatErrors(report);
+        Require(report.startsWith("Failed to parse the XML content:\n"));
+    }
+    Require(s_states == 0);
+    return 0;
+}
