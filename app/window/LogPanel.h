@@ -86,10 +86,10 @@ private:
     LogModel* m_model;
     LogView* m_view;
     LogFilterBar* m_filterBar;
-    QComboBox* m_files;
+    QComboBox* m_files = nullptr;
     QCheckBox* m_pause;
     QCheckBox* m_follow;
-    QPlainTextEdit* m_line;
+    QPlainTextEdit* m_line = nullptr;
     QSplitter* m_splitter;
     QString m_currentPath; // the file that the running program writes, if it is one
     int m_percent = 100;

@@ -235,7 +235,7 @@ bool LogTimeReader::readToken(Token const& token, char const*& at, char const* e
     switch (token.kind) {
     case Exactly:
         if (end - at < token.text.size() ||
-            std::memcmp(at, token.text.constData(), static_cast<size_t>(token.text.size())))
+            std::memcmp(at, token.text.constData(), static_cast<size_t>(token.text.size())) != 0)
             return false;
         at += token.text.size();
         return true;

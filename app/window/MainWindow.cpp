@@ -59,35 +59,29 @@ QIcon WindowIcon()
 } // namespace
 
 MainWindow::MainWindow(QWidget* parent)
-    : QMainWindow(parent), m_settings(Property("DataPath")), m_notice(new NoticeBar),
-      m_splitter(new QSplitter), m_places(new PlacesPanel(m_settings.fileName())),
-      m_tabs(new FileTabs), m_summary(new QLabel), m_health(new QLabel)
+    : QMainWindow(parent), m_settings(Property("DataPath")), m_splitter(new QSplitter),
+      m_places(new PlacesPanel(m_settings.fileName()))
 {
-    InitResources();
-    QGuiApplication::setWindowIcon(WindowIcon());
-    QGuiApplication::setDesktopFileName(QStringLiteral("org.tork.velocor"));
     setWindowTitle(Property("caption"));
     setAcceptDrops(true);
-    new SelectableMessageBoxes(this);
-    makeContent();
-    makeStatusBar();
-    makeMenus();
-    restoreState();
-    updateState();
+    makeFirstContent();
+    restoreFirstState();
 }
 
 // A window that is deleted unclosed is hidden then, which ends the editing of a cell.
 MainWindow::~MainWindow()
 {
-    disconnect(m_tabs, nullptr, this, nullptr);
+    if (m_tabs)
+        disconnect(m_tabs, nullptr, this, nullptr);
 }
 
-void MainWindow::makeContent()
+// The menus are there from the start, so that nothing moves when they are filled.
+void MainWindow::makeFirstContent()
 {
     m_splitter->setAccessibleName(tr("Places and files"));
     m_splitter->setChildrenCollapsible(false);
     m_splitter->addWidget(m_places);
-    m_splitter->addWidget(m_tabs);
+    m_splitter->addWidget(new QWidget);
     m_splitter->setStretchFactor(1, 1);
     m_splitter->setSizes({250, 750});
 
@@ -95,10 +89,40 @@ void MainWindow::makeContent()
     auto* layout = new QVBoxLayout(content);
     layout->setContentsMargins(0, 0, 0, 0);
     layout->setSpacing(0);
-    layout->addWidget(m_notice);
     layout->addWidget(m_splitter, 1);
     setCentralWidget(content);
 
+    menuBar()->setAccessibleName(tr("Menus"));
+    for (QString const& title : {tr("&File"), tr("&Edit"), tr("&View"), tr("&Help")})
+        m_menus.append(menuBar()->addMenu(title));
+}
+
+void MainWindow::complete()
+{
+    if (m_tabs)
+        return;
+    InitResources();
+    QGuiApplication::setWindowIcon(WindowIcon());
+    QGuiApplication::setDesktopFileName(QStringLiteral("org.tork.velocor"));
+    new SelectableMessageBoxes(this);
+    makeTabs();
+    makeStatusBar();
+    makeMenus();
+    restoreState();
+    updateState();
+    startWork();
+}
+
+void MainWindow::makeTabs()
+{
+    m_notice = new NoticeBar;
+    static_cast<QVBoxLayout*>(centralWidget()->layout())->insertWidget(0, m_notice);
+    const QList<int> sizes = m_splitter->sizes();
+    m_tabs = new FileTabs;
+    delete m_splitter->replaceWidget(1, m_tabs);
+    m_tabs->show();
+    m_splitter->setStretchFactor(1, 1);
+    m_splitter->setSizes(sizes);
     connect(m_places, &PlacesPanel::Said, this, &MainWindow::say);
     connect(m_tabs, &FileTabs::Said, this, &MainWindow::say);
     connect(m_tabs, &FileTabs::StateChanged, this, &MainWindow::updateState);
@@ -107,6 +131,8 @@ void MainWindow::makeContent()
 
 void MainWindow::makeStatusBar()
 {
+    m_health = new QLabel;
+    m_summary = new QLabel;
     m_health->setAccessibleName(tr("State of the log"));
     m_health->setTextFormat(Qt::PlainText);
     m_health->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
@@ -140,7 +166,6 @@ QAction* MainWindow::addSwitch(QMenu* menu, QString const& text, QKeySequence co
 
 void MainWindow::makeMenus()
 {
-    menuBar()->setAccessibleName(tr("Menus"));
     makeFileMenu();
     makeEditMenu();
     makeViewMenu();
@@ -149,7 +174,7 @@ void MainWindow::makeMenus()
 
 void MainWindow::makeFileMenu()
 {
-    QMenu* menu = menuBar()->addMenu(tr("&File"));
+    QMenu* menu = m_menus.at(0);
     addAction(menu, tr("&Open..."), QKeySequence::Open, tr("Open a log file or a settings file"),
               [this] { chooseFile(); });
     m_recentMenu = menu->addMenu(tr("Open &Recent"));
@@ -173,7 +198,7 @@ void MainWindow::makeFileMenu()
 
 void MainWindow::makeEditMenu()
 {
-    QMenu* menu = menuBar()->addMenu(tr("&Edit"));
+    QMenu* menu = m_menus.at(1);
     addAction(menu, tr("&Copy"), QKeySequence::Copy, tr("Copy the selected lines"),
               [this] { copy(); });
     addAction(menu, tr("Select &All"), QKeySequence::SelectAll, tr("Select all lines"),
@@ -194,7 +219,7 @@ void MainWindow::makeEditMenu()
 
 void MainWindow::makeViewMenu()
 {
-    QMenu* menu = menuBar()->addMenu(tr("&View"));
+    QMenu* menu = m_menus.at(2);
     m_showPlaces = addSwitch(menu, tr("&Places"), QKeySequence(tr("F9")),
                              tr("Show who the program is and where its files lie"),
                              [this](bool shown) { m_places->setVisible(shown); });
@@ -225,31 +250,34 @@ void MainWindow::makeViewMenu()
 
 void MainWindow::makeHelpMenu()
 {
-    QMenu* menu = menuBar()->addMenu(tr("&Help"));
+    QMenu* menu = m_menus.at(3);
     QAction* about =
         addAction(menu, tr("&About %1").arg(QStringLiteral("Velocor")), QKeySequence(tr("F1")),
                   tr("Versions, system and directories"), [this] { showAbout(); });
     about->setMenuRole(QAction::AboutRole);
 }
 
-void MainWindow::restoreState()
+void MainWindow::restoreFirstState()
 {
     const QSize available = QApplication::desktop()->availableGeometry(this).size();
     resize(QSize(1080, 680).boundedTo(available * 9 / 10));
 
-    const QString damage = m_settings.Load();
-    if (!damage.isEmpty())
-        m_notice->Tell(damage);
+    m_damage = m_settings.Load();
     m_settings.RestoreGeometry(this);
     const QList<int> sizes = m_settings.Numbers(QStringLiteral("panes"));
     if (sizes.size() == m_splitter->count())
         m_splitter->setSizes(sizes);
+    m_places->setVisible(m_settings.Flag(QStringLiteral("placesShown"), true));
+}
+
+void MainWindow::restoreState()
+{
+    if (!m_damage.isEmpty())
+        m_notice->Tell(m_damage);
     m_tabs->ownLog()->SetColumnWidths(m_settings.Numbers(QStringLiteral("columns")));
     m_tabs->ownLog()->SetPaneSizes(m_settings.Numbers(QStringLiteral("linePane")));
     m_recent->SetList(m_settings.Text(QStringLiteral("recentFiles")));
-    const bool placesShown = m_settings.Flag(QStringLiteral("placesShown"), true);
-    m_showPlaces->setChecked(placesShown);
-    m_places->setVisible(placesShown);
+    m_showPlaces->setChecked(m_settings.Flag(QStringLiteral("placesShown"), true));
 }
 
 void MainWindow::saveState()
@@ -273,7 +301,7 @@ bool MainWindow::event(QEvent* event)
     const bool result = QMainWindow::event(event);
     if (event->type() == QEvent::Paint && !m_painted) {
         m_painted = true;
-        QTimer::singleShot(0, this, &MainWindow::startWork);
+        QTimer::singleShot(0, this, &MainWindow::complete);
     }
     return result;
 }
@@ -328,6 +356,7 @@ void MainWindow::chooseFile()
 
 void MainWindow::OpenFile(QString const& path)
 {
+    complete();
     const QString full = QFileInfo(path).absoluteFilePath();
     if (!QFileInfo::exists(full)) {
         offerToForget(path);
@@ -410,11 +439,12 @@ void MainWindow::selectAll()
 
 void MainWindow::closeEvent(QCloseEvent* event)
 {
-    if (!m_tabs->MayCloseAll()) {
+    if (m_tabs && !m_tabs->MayCloseAll()) {
         event->ignore();
         return;
     }
-    saveState();
+    if (m_tabs) // otherwise nothing can have changed
+        saveState();
     event->accept();
 }
 

@@ -24,8 +24,8 @@ class RecentFiles;
 /// family to look at; the log's settings; and what a bug report needs.
 ///
 /// Reads the application object's properties and the log when it is made, so make it after both are
-/// set up. It writes no log entry of its own while the program starts. What is slow is put off
-/// until the window has been painted for the first time.
+/// set up. It writes no log entry of its own while the program starts. For its first paint
+/// it has the identity and places only; all else is made right after that, or when it is needed.
 class MainWindow : public QMainWindow
 {
     Q_OBJECT
@@ -46,7 +46,9 @@ protected:
     void dropEvent(QDropEvent* event) override;
 
 private:
-    void makeContent();
+    void makeFirstContent();
+    void complete();
+    void makeTabs();
     void makeStatusBar();
     void makeMenus();
     void makeFileMenu();
@@ -58,6 +60,7 @@ private:
     QAction* addSwitch(QMenu* menu, QString const& text, QKeySequence const& shortcut,
                        QString const& statusTip, std::function<void(bool)> const& work);
 
+    void restoreFirstState();
     void restoreState();
     void saveState();
     void startWork();
@@ -75,12 +78,14 @@ private:
     bool offerToForget(QString const& path);
 
     WindowSettings m_settings;
-    NoticeBar* m_notice;
+    QString m_damage; ///< what is to be told of the settings file
+    NoticeBar* m_notice = nullptr;
     QSplitter* m_splitter;
     PlacesPanel* m_places;
-    FileTabs* m_tabs;
-    QLabel* m_summary;
-    QLabel* m_health;
+    FileTabs* m_tabs = nullptr; ///< null until the window is complete
+    QLabel* m_summary = nullptr;
+    QLabel* m_health = nullptr;
+    QList<QMenu*> m_menus; ///< in the order of the bar
     QMenu* m_recentMenu = nullptr;
     RecentFiles* m_recent = nullptr;
 

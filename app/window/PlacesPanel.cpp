@@ -76,9 +76,6 @@ void PlacesPanel::addValue(QString const& caption, QString const& text, bool isP
     value->setPalette(flat);
 
     auto* label = new QLabel(caption);
-    QFont bold = label->font();
-    bold.setBold(true);
-    label->setFont(bold);
     label->setBuddy(value);
 
     auto* row = new QHBoxLayout;

@@ -156,7 +156,7 @@ QIcon SeverityIcons::Icon(LogEntry::Severity severity, QPalette const& palette)
     QIcon& icon = (*icons)[key];
     if (icon.isNull()) {
         const QColor colour = IconColour(severity, palette);
-        const QColor selected = palette.color(QPalette::HighlightedText);
+        QColor const& selected = palette.color(QPalette::HighlightedText);
         for (int size : Sizes) {
             icon.addPixmap(Pixmap(size, severity, colour, palette.color(QPalette::Base)));
             icon.addPixmap(Pixmap(size, severity, selected, palette.color(QPalette::Highlight)),
