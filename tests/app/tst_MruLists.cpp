@@ -94,6 +94,7 @@ private slots:
     void update();
     void unchangedOnFailure_data();
     void unchangedOnFailure();
+    void removingTheLastEntryLeavesATextThatCanBeStored();
     void addStepByStep();
     void addInTurn();
     void entryWithSeparatorIsReadBackAsTwo();
@@ -403,6 +404,14 @@ void tst_MruLists::unchangedOnFailure()
     if (op == AppUtils::MRURemove)
         QCOMPARE(AppUtils::RemoveFromMRUList(file, list), false);
     QCOMPARE(list, before);
+}
+
+void tst_MruLists::removingTheLastEntryLeavesATextThatCanBeStored()
+{
+    QString list = QStringLiteral("a");
+    QVERIFY(AppUtils::RemoveFromMRUList(QStringLiteral("a"), list));
+    QVERIFY(list.isEmpty());
+    QVERIFY(!list.isNull()); // a null text would be refused by the settings
 }
 
 void tst_MruLists::addStepByStep()
