@@ -99,10 +99,16 @@ public:
         return top + "data/" + names + "/logs/";
     }
 
-    // Loads the spy into the program. See StartupSpy.cpp.
+    // Loads the spy into the program. See StartupSpy.cpp. A copy of it, because another user may
+    // not be let into the folder that was built in.
     void AddSpy(QString const& end)
     {
-        environment.insert("QT_PLUGIN_PATH", SPY_PLUGINS);
+        const QString folder = top + "plugins/generic/";
+        QDir().mkpath(folder);
+        const QDir built(QStringLiteral(SPY_PLUGINS) + "/generic");
+        for (QString const& file : built.entryList(QDir::Files))
+            QFile::copy(built.filePath(file), folder + file);
+        environment.insert("QT_PLUGIN_PATH", top + "plugins");
         environment.insert("QT_QPA_GENERIC_PLUGINS", "startupspy");
         environment.insert("SPY_REPORT", top + "report.json");
         environment.insert("SPY_END", end);
