@@ -390,8 +390,7 @@ void tst_LogModel::withTheLogItself()
     qInstallMessageHandler(handler);
 }
 
-// The interface stays alive while a file of 100 MB is read. How long that takes is measured in
-// docs/window.md, not judged here.
+// The interface stays alive while a file of 100 MB is read. How long that takes is not judged here.
 void tst_LogModel::millionLines()
 {
     const int lines = 1000000;
