@@ -230,9 +230,9 @@ void tst_TorkLogFiles::nameBuffersAreOverwritten()
     TorkLog log;
     folder.prepare(log, "app");
 
-    QString& spec = log.fileSpec(false);
-    QCOMPARE(&log.fileSpec(true), &spec);
-    QCOMPARE(spec, QString("app.log.*"));
+    QString& buffer = log.fileSpec(false);
+    QCOMPARE(&log.fileSpec(true), &buffer);
+    QCOMPARE(buffer, QString("app.log.*"));
 
     QString& name = log.newLogFileName();
     log.setOutputPath(QStringLiteral("/y/"));
