@@ -105,6 +105,7 @@ void MainWindow::complete()
     QGuiApplication::setWindowIcon(WindowIcon());
     QGuiApplication::setDesktopFileName(QStringLiteral("org.tork.velocor"));
     new SelectableMessageBoxes(this);
+    m_places->AddButtons();
     makeTabs();
     makeStatusBar();
     makeMenus();

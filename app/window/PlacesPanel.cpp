@@ -29,6 +29,7 @@ QToolButton* MakeButton(QString const& text, QString const& name, QString const&
     auto* button = new QToolButton;
     button->setText(text);
     button->setAutoRaise(true);
+    button->setMaximumHeight(button->fontMetrics().height() + 8);
     button->setAccessibleName(name);
     button->setToolTip(toolTip);
     return button;
@@ -78,24 +79,39 @@ void PlacesPanel::addValue(QString const& caption, QString const& text, bool isP
     auto* label = new QLabel(caption);
     label->setBuddy(value);
 
+    // As high as the buttons are going to be, so that nothing moves when they come.
+    label->setMinimumHeight(fontMetrics().height() + 8);
     auto* row = new QHBoxLayout;
     row->setSpacing(2);
     row->addWidget(label, 1);
-    if (isPlace) {
-        QToolButton* open =
-            MakeButton(tr("Open"), tr("Open: %1").arg(caption), tr("Show it in the file manager"));
-        connect(open, &QToolButton::clicked, this, [this, text] { openPlace(text); });
-        row->addWidget(open);
-    }
-    QToolButton* copyButton =
-        MakeButton(tr("Copy"), tr("Copy: %1").arg(caption), tr("Copy the text to the clipboard"));
-    connect(copyButton, &QToolButton::clicked, this,
-            [this, caption, text] { copy(caption, text); });
-    row->addWidget(copyButton);
-
     m_layout->addLayout(row);
     m_layout->addWidget(value);
     m_layout->addSpacing(6);
+    m_rows.append({row, caption, text, isPlace, value});
+}
+
+void PlacesPanel::AddButtons()
+{
+    for (Row const& row : m_rows) {
+        QToolButton* open = nullptr;
+        if (row.isPlace) {
+            open = MakeButton(tr("Open"), tr("Open: %1").arg(row.caption),
+                              tr("Show it in the file manager"));
+            connect(open, &QToolButton::clicked, this, [this, row] { openPlace(row.text); });
+            row.layout->addWidget(open);
+        }
+        QToolButton* copyButton = MakeButton(tr("Copy"), tr("Copy: %1").arg(row.caption),
+                                             tr("Copy the text to the clipboard"));
+        connect(copyButton, &QToolButton::clicked, this,
+                [this, row] { copy(row.caption, row.text); });
+        row.layout->addWidget(copyButton);
+        if (open) {
+            setTabOrder(row.value, open);
+            setTabOrder(open, copyButton);
+        } else {
+            setTabOrder(row.value, copyButton);
+        }
+    }
 }
 
 bool PlacesPanel::OpenPlace(QString const& path)

@@ -4,8 +4,10 @@
 #pragma once
 
 #include <QString>
+#include <QVector>
 #include <QWidget>
 
+class QHBoxLayout;
 class QVBoxLayout;
 
 /// Who the program is and where its files lie, each to be opened in the file manager or copied.
@@ -16,6 +18,9 @@ class PlacesPanel : public QWidget
 public:
     /// @param settingsFile  the window's settings file
     explicit PlacesPanel(QString const& settingsFile, QWidget* parent = nullptr);
+
+    /// Adds the buttons, once; the panel does without them until the window has been painted.
+    void AddButtons();
 
     /// Shows a file's folder or a folder in the system's file manager.
     ///
@@ -31,5 +36,15 @@ private:
     void openPlace(QString const& path);
     void copy(QString const& caption, QString const& text);
 
+    struct Row
+    {
+        QHBoxLayout* layout;
+        QString caption;
+        QString text;
+        bool isPlace;
+        QWidget* value;
+    };
+
     QVBoxLayout* m_layout;
+    QVector<Row> m_rows;
 };
