@@ -3,6 +3,7 @@
 
 #include "app/AppPaths.h"
 #include "app/QuitOnSignal.h"
+#include "app/WithoutOpenGl.h"
 #include "app/window/MainWindow.h"
 #include "common/log/TorkLog.h"
 
@@ -38,7 +39,9 @@ void TellLogFileWithoutScreen()
 // caption.
 int main(int argc, char** argv)
 {
+    WithoutOpenGl withoutOpenGl;
     QApplication application(argc, argv);
+    withoutOpenGl.End();
     AppPaths::SetOrganizationAndProduct();
     TorkLog::initialize(QStringLiteral("velocor"));
     application.setProperty("caption", Caption());

@@ -115,8 +115,11 @@ int main(int argc, char** argv)
     ::setenv("QT_PLUGIN_PATH", VELOCOR_PROBE_PLUGINS, 1);
     ::setenv("QT_QPA_GENERIC_PLUGINS", "startprobe", 1);
 
-    std::array<Program, 2> programs = {Program{"floor: bare QMainWindow", VELOCOR_BARE_WINDOW},
-                                       Program{"velocor", VELOCOR_PROGRAM}};
+    std::array<Program, 3> programs = {
+        Program{"floor: bare QMainWindow", VELOCOR_BARE_WINDOW},
+        Program{"window of labels, no OpenGL", VELOCOR_LABEL_WINDOW},
+        Program{"velocor", VELOCOR_PROGRAM},
+    };
     std::mt19937 random{std::random_device{}()};
     QJsonArray times;
     QJsonArray memory;

@@ -97,6 +97,7 @@ SECTIONS = {
         goals=[
             Goal(["start, time"], "velocor", 0.75, FLOOR),
             Goal(["start, peak memory"], "velocor", 0.5, FLOOR),
+            Goal(["start, time"], "velocor", 1.1, "window of labels"),
         ],
     ),
     "growth": Section("Cost as work grows", [("bench_growth", "google")], (5, 2)),

@@ -1,0 +1,53 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// The program with the least window that tells its user something: the same start-up steps, and
+// labels with the identity and the places. What the real window costs more is the price of its
+// own content.
+
+#include "app/AppPaths.h"
+#include "app/WithoutOpenGl.h"
+#include "common/log/TorkLog.h"
+
+#include <QApplication>
+#include <QFormLayout>
+#include <QLabel>
+#include <QMainWindow>
+
+namespace {
+
+QLabel* PropertyLabel(char const* name)
+{
+    return new QLabel(QCoreApplication::instance()->property(name).toString());
+}
+
+QWidget* Places()
+{
+    auto* content = new QWidget;
+    auto* layout = new QFormLayout(content);
+    layout->addRow(QStringLiteral("Organization:"), new QLabel(QApplication::organizationName()));
+    layout->addRow(QStringLiteral("Product:"), new QLabel(QApplication::applicationName()));
+    layout->addRow(QStringLiteral("Installation:"), PropertyLabel("RootPath"));
+    layout->addRow(QStringLiteral("Data:"), PropertyLabel("DataPath"));
+    layout->addRow(QStringLiteral("Documents:"), PropertyLabel("DocPath"));
+    layout->addRow(QStringLiteral("Log file:"), new QLabel(TorkLog::logger()->newLogFileName()));
+    return content;
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    WithoutOpenGl withoutOpenGl;
+    QApplication application(argc, argv);
+    withoutOpenGl.End();
+    AppPaths::SetOrganizationAndProduct();
+    TorkLog::initialize(QStringLiteral("velocor"));
+    application.setProperty("caption", QStringLiteral("Velocor"));
+
+    QMainWindow window;
+    window.setCentralWidget(Places());
+    window.resize(1080, 680); // as large as the real one: the size of the picture costs too
+    window.show();
+    return QApplication::exec();
+}
