@@ -163,8 +163,10 @@ QFile* TorkLog::locateLogFile(QString const& text)
 qint64 TorkLog::openFileSize()
 {
 #ifdef Q_OS_UNIX
-    if (m_flushed) {
-        const qint64 position = m_file.pos();
+    // A position of 0 may be that of a file whose status could not be told when it was opened: the
+    // toolkit counts none for it, and going back there would write over what was just written.
+    const qint64 position = m_file.pos();
+    if (m_flushed && position > 0) {
         const qint64 end = ::lseek(m_file.handle(), 0, SEEK_END);
         if (end == position || (end >= 0 && ::lseek(m_file.handle(), position, SEEK_SET) >= 0))
             return end;
@@ -216,6 +218,8 @@ void TorkLog::trimOpenFile(int length)
     bool keep = false;
     while (!stream.atEnd()) {
         const QString line = stream.readLine();
+        if (line.isNull()) // a file that cannot be read never comes to its end
+            break;
         count += line.length();
         keep = keep || count >= length;
         if (keep)

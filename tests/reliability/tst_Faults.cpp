@@ -1,0 +1,553 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// Every file call of the log and of the configuration store fails once, and every one with all
+// that follow it: the walk goes on until an operation is through before its fault comes up.
+
+#include "common/config/TorkConfigFile.h"
+#include "common/log/TorkLog.h"
+#include "log/LogFolder.h"
+#include "reliability/FaultyFiles.h"
+#include "reliability/Figures.h"
+
+#include <QtTest>
+
+#include <cerrno>
+#include <memory>
+
+class tst_Faults : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void init();
+    void cleanup();
+    void cleanupTestCase();
+
+    void firstEntry_data() { faults(); }
+    void firstEntry();
+    void entryIntoOpenFile_data() { faults(); }
+    void entryIntoOpenFile();
+    void entryThatRotates_data() { faults(); }
+    void entryThatRotates();
+    void entryThatTrims_data() { faults(); }
+    void entryThatTrims();
+    void closing_data() { faults(); }
+    void closing();
+    void firstStart_data() { faults(); }
+    void firstStart();
+    void settingsSaved_data() { faults(); }
+    void settingsSaved();
+    void settingsLoaded_data() { faults(); }
+    void settingsLoaded();
+    void configurationSaved_data() { faults(); }
+    void configurationSaved();
+    void configurationLoaded_data() { faults(); }
+    void configurationLoaded();
+
+    void diskFullAtEveryByteOfASave();
+    void diskFullAtEveryByteOfARotation();
+    void diskFullAtEveryByteOfAnEntry();
+
+private:
+    static void faults();
+
+    QtMessageHandler m_handler = nullptr;
+};
+
+namespace {
+
+int s_steps = 0;
+int s_bytes = 0;
+
+// The log and a configuration file among files that are none of their business.
+class Scene
+{
+public:
+    Scene() : files(folder.root())
+    {
+        folder.prepare(log, "app", 100);
+        TestFiles::write(folder.logs() + "app.log.old", "not numbered\n");
+        TestFiles::write(folder.logs() + "application.log.1", "of another log\n");
+        TestFiles::write(folder.root() + "notes.txt", "of the user\n");
+    }
+
+    bool othersAreUntouched() const
+    {
+        return TestFiles::read(folder.logs() + "app.log.old") == "not numbered\n" &&
+               TestFiles::read(folder.logs() + "application.log.1") == "of another log\n" &&
+               TestFiles::read(folder.root() + "notes.txt") == "of the user\n";
+    }
+
+    QString current() const { return folder.logs() + "app.log"; }
+    QString configuration() const { return folder.root() + "viewer.cfg"; }
+
+    // Sets the fault of this row.
+    void failAt(int step)
+    {
+        QFETCH(int, error);
+        QFETCH(bool, lasts);
+        if (error)
+            files.failAt(step, lasts ? FaultyFiles::FromThereOn : FaultyFiles::Once, error);
+        else
+            files.cutShortAt(step);
+    }
+
+    LogFolder folder;
+    FaultyFiles files;
+    TorkLog log;
+};
+
+// For the failed check.
+QByteArray where(Scene const& scene, int step)
+{
+    return "step " + QByteArray::number(step) + ": " + scene.files.call().toLatin1() + " of " +
+           scene.files.path().toLocal8Bit() + "\nlogs:\n    " +
+           scene.folder.listing().join("    ").toLocal8Bit();
+}
+
+#define CHECK(condition) QVERIFY2(condition, where(scene, step).constData())
+
+const QByteArray before = "written before\n";
+const QByteArray during = "written meanwhile\n";
+const QByteArray after = "written afterwards\n";
+
+void write(TorkLog& log, QByteArray const& line)
+{
+    log.write(QString::fromLatin1(line));
+}
+
+// The entry is there, once and whole, or the log says that it found no file to write it to.
+bool tellsWhatBecameOfIt(Scene const& scene, QByteArray const& content)
+{
+    return content.count(during) == 1 ||
+           (content.count("meanwhile") == 0 && !scene.log.errorString().isEmpty());
+}
+
+} // namespace
+
+namespace {
+
+// Most loads here end with a complaint of the XML reader.
+void dropMessage(QtMsgType, QMessageLogContext const&, QString const&) {}
+
+} // namespace
+
+void tst_Faults::init()
+{
+    m_handler = qInstallMessageHandler(dropMessage);
+}
+
+void tst_Faults::cleanup()
+{
+    TorkLog::shutdown();
+    qInstallMessageHandler(m_handler);
+}
+
+void tst_Faults::cleanupTestCase()
+{
+    if (!QTest::currentTestFailed())
+        Figures::print(QString("faults: %1 failing steps and %2 full disks, no crash, no hang, no "
+                               "other file touched, and it went on each time")
+                           .arg(s_steps)
+                           .arg(s_bytes));
+}
+
+void tst_Faults::faults()
+{
+    QTest::addColumn<int>("error"); // 0: writes only a part
+    QTest::addColumn<bool>("lasts");
+
+    QTest::newRow("device error") << EIO << false;
+    QTest::newRow("device error for a while") << EIO << true;
+    QTest::newRow("disk full") << ENOSPC << false;
+    QTest::newRow("disk full for a while") << ENOSPC << true;
+    QTest::newRow("permission denied") << EACCES << false;
+    QTest::newRow("permission denied for a while") << EACCES << true;
+    QTest::newRow("too many open files for a while") << EMFILE << true;
+    QTest::newRow("read-only file system for a while") << EROFS << true;
+    QTest::newRow("interrupted") << EINTR << false;
+    QTest::newRow("only half written") << 0 << false;
+}
+
+void tst_Faults::firstEntry()
+{
+    for (int step = 1;; ++step, ++s_steps) {
+        Scene scene;
+        scene.log.setOutputPath(scene.folder.root() + "new/folder/");
+        const QString file = scene.folder.root() + "new/folder/app.log";
+
+        scene.failAt(step);
+        write(scene.log, during);
+        scene.files.mend();
+        write(scene.log, after);
+
+        const QByteArray content = TestFiles::read(file);
+        CHECK(content == during + after || content == after);
+        CHECK(tellsWhatBecameOfIt(scene, content));
+        CHECK(scene.othersAreUntouched());
+        if (!scene.files.reached())
+            break;
+    }
+}
+
+void tst_Faults::entryIntoOpenFile()
+{
+    for (int step = 1;; ++step, ++s_steps) {
+        Scene scene;
+        write(scene.log, before);
+
+        scene.failAt(step);
+        write(scene.log, during);
+        scene.files.mend();
+        write(scene.log, after);
+
+        CHECK(TestFiles::read(scene.current()) == before + during + after);
+        CHECK(scene.othersAreUntouched());
+        if (!scene.files.reached())
+            break;
+    }
+}
+
+namespace {
+
+// The older files before the rotation, and what no number may hold but.
+const QByteArray full(120, 'c');
+const QByteArrayList older = {"first\n", "second\n", "third\n"};
+
+void makeOlderFiles(Scene const& scene)
+{
+    TestFiles::write(scene.current(), full);
+    for (int i = 0; i < older.size(); ++i)
+        TestFiles::write(scene.current() + '.' + QString::number(i + 1), older[i]);
+}
+
+// The contents of the numbered files.
+QByteArrayList numbered(Scene const& scene)
+{
+    QByteArrayList contents;
+    for (int i = 1; i < 6; ++i) {
+        const QString name = scene.current() + '.' + QString::number(i);
+        if (QFile::exists(name))
+            contents.append(TestFiles::read(name));
+    }
+    return contents;
+}
+
+// All older files are still there, each whole and once, but for the oldest above the limit.
+bool olderFilesAreKept(Scene const& scene)
+{
+    QByteArrayList contents = numbered(scene);
+    contents.removeOne(full);
+    contents.removeOne(older[2]);
+    return contents == older.mid(0, 2);
+}
+
+} // namespace
+
+// Where the current file could not be removed the entry goes over its start, and the next one trims
+// it: that is how the log treats any old content.
+void tst_Faults::entryThatRotates()
+{
+    for (int step = 1;; ++step, ++s_steps) {
+        Scene scene;
+        scene.log.setMaxLogFiles(3);
+        makeOlderFiles(scene);
+
+        scene.failAt(step);
+        write(scene.log, during);
+        scene.files.mend();
+        CHECK(olderFilesAreKept(scene));
+        QByteArray content = TestFiles::read(scene.current());
+        write(scene.log, after);
+        content += TestFiles::read(scene.current());
+
+        CHECK(content.count(after) == 1);
+        CHECK(content.contains(during) || tellsWhatBecameOfIt(scene, content));
+        CHECK(scene.othersAreUntouched());
+        if (!scene.files.reached()) {
+            CHECK(content == during + during + after);
+            CHECK(numbered(scene) == QByteArrayList({full}) + older.mid(0, 2));
+            break;
+        }
+    }
+}
+
+// The open file is too full and holds old lines behind the last entry. Trimming drops what the file
+// held, so an entry that a fault kept from the disk may go with it; the later one never.
+void tst_Faults::entryThatTrims()
+{
+    for (int step = 1;; ++step, ++s_steps) {
+        Scene scene;
+        TestFiles::write(scene.current(), QByteArray(60, 'a') + '\n' + QByteArray(30, 'b') + '\n');
+        write(scene.log, "x\n");
+
+        scene.failAt(step);
+        write(scene.log, during);
+        scene.files.mend();
+        write(scene.log, after);
+
+        const QByteArray content = TestFiles::read(scene.current());
+        CHECK(content.count(after) == 1);
+        CHECK(scene.othersAreUntouched());
+        if (!scene.files.reached()) {
+            CHECK(content.count(during) == 1);
+            break;
+        }
+    }
+}
+
+void tst_Faults::closing()
+{
+    for (int step = 1;; ++step, ++s_steps) {
+        Scene scene;
+        write(scene.log, before);
+
+        scene.failAt(step);
+        const bool closed = scene.log.close();
+        scene.files.mend();
+
+        CHECK(closed);
+        CHECK(TestFiles::read(scene.current()) == before);
+        CHECK(!scene.log.close());
+        write(scene.log, after);
+        CHECK(TestFiles::read(scene.current()) == after);
+        CHECK(scene.othersAreUntouched());
+        if (!scene.files.reached())
+            break;
+    }
+}
+
+// Makes the log directory, the settings file and the first entries.
+void tst_Faults::firstStart()
+{
+    for (int step = 1;; ++step, ++s_steps) {
+        Scene scene;
+        const QString logs = scene.folder.root() + "new/";
+
+        scene.failAt(step);
+        TorkLog* const log = TorkLog::initialize(logs, "app", QString(), true);
+        write(*log, during);
+        scene.files.mend();
+        write(*log, after);
+        CHECK(log->savePreferences());
+        TorkLog::shutdown();
+
+        CHECK(TestFiles::read(logs + "app.log").endsWith(after));
+        const QByteArray settings = TestFiles::read(logs + "logsettings.cfg");
+        CHECK(settings.startsWith("<LogSettings>\n") && settings.endsWith("</LogSettings>\n"));
+        CHECK(scene.othersAreUntouched());
+        if (!scene.files.reached())
+            break;
+    }
+}
+
+void tst_Faults::settingsSaved()
+{
+    for (int step = 1;; ++step, ++s_steps) {
+        Scene scene;
+        const QByteArray old = TestFiles::read(scene.folder.settingsFile());
+        scene.log.setMaxLogFiles(7);
+
+        scene.failAt(step);
+        CHECK(scene.log.savePreferences());
+        scene.files.mend();
+        const QByteArray left = TestFiles::read(scene.folder.settingsFile());
+        CHECK(scene.log.savePreferences());
+        const QByteArray whole = TestFiles::read(scene.folder.settingsFile());
+
+        CHECK(whole.contains("<maxLogFiles>7</maxLogFiles>"));
+        CHECK(left == old || whole.startsWith(left));
+        write(scene.log, after);
+        CHECK(TestFiles::read(scene.current()) == after);
+        CHECK(scene.othersAreUntouched());
+        if (!scene.files.reached()) {
+            CHECK(left == whole);
+            break;
+        }
+    }
+}
+
+// Every value is the stored one or the one that a file without the key gives.
+void tst_Faults::settingsLoaded()
+{
+    for (int step = 1;; ++step, ++s_steps) {
+        Scene scene;
+        TestFiles::write(
+            scene.folder.settingsFile(),
+            LogFolder::settingsText(
+                {{"filePrefix", "other"}, {"maxLogFiles", "7"}, {"maxLogFileSize", "3000"}}));
+
+        scene.failAt(step);
+        const bool loaded = scene.log.loadPreferences();
+        const bool attempted = scene.log.maxLogFileSize() != 100;
+        const unsigned int files = scene.log.maxLogFiles();
+        scene.files.mend();
+
+        CHECK(!loaded || files == 7);
+        CHECK(!attempted || files == 7 || files == 10);
+        CHECK(scene.log.loadPreferences());
+        CHECK(scene.log.maxLogFiles() == 7 && scene.log.maxLogFileSize() == 3000);
+        scene.log.write(QString::fromLatin1(after));
+        CHECK(TestFiles::read(scene.folder.logs() + "other.log") == after);
+        CHECK(scene.othersAreUntouched());
+        if (!scene.files.reached()) {
+            CHECK(loaded);
+            break;
+        }
+    }
+}
+
+namespace {
+
+const QByteArray oldConfiguration = "<VelocorSettings>\n<a>\n<b>1</b>\n</a>\n</VelocorSettings>\n";
+const QByteArray newConfiguration =
+    "<VelocorSettings>\n<a>\n<b>2</b>\n<c><![CDATA[x & y]]></c>\n</a>\n</VelocorSettings>\n";
+
+void fill(TorkConfigFile& configuration)
+{
+    configuration.WriteItem("a", "b", "2");
+    configuration.WriteItem("a", "c", "x & y");
+}
+
+QString value(TorkConfigFile& configuration, QString const& key)
+{
+    QString none;
+    QString found;
+    configuration.ReadItem("a", key, none, found);
+    return found;
+}
+
+} // namespace
+
+void tst_Faults::configurationSaved()
+{
+    for (int step = 1;; ++step, ++s_steps) {
+        Scene scene;
+        TestFiles::write(scene.configuration(), oldConfiguration);
+        TorkConfigFile configuration(scene.configuration());
+        fill(configuration);
+
+        scene.failAt(step);
+        CHECK(configuration.Save());
+        scene.files.mend();
+
+        const QByteArray left = TestFiles::read(scene.configuration());
+        if (configuration.m_lastError.isEmpty()) {
+            CHECK(newConfiguration.startsWith(left));
+        } else {
+            CHECK(configuration.m_lastError == "Unable to open file: " + scene.configuration());
+            CHECK(scene.files.reached());
+        }
+        CHECK(configuration.Save());
+        CHECK(TestFiles::read(scene.configuration()) == newConfiguration);
+        CHECK(scene.othersAreUntouched());
+        if (!scene.files.reached()) {
+            CHECK(left == newConfiguration);
+            break;
+        }
+    }
+}
+
+void tst_Faults::configurationLoaded()
+{
+    const QString notFound = "ConfigFile - File not found.";
+    const QString notParsed = "ConfigFile - Could not parse the input file.";
+    for (int step = 1;; ++step, ++s_steps) {
+        Scene scene;
+        TestFiles::write(scene.configuration(), newConfiguration);
+        TorkConfigFile configuration(scene.configuration());
+        configuration.WriteItem("a", "b", "unsaved");
+
+        scene.failAt(step);
+        const bool loaded = configuration.Load();
+        scene.files.mend();
+
+        if (loaded)
+            CHECK(value(configuration, "b") == "2" && value(configuration, "c") == "x & y");
+        else if (configuration.m_lastError == notFound)
+            CHECK(value(configuration, "b") == "unsaved");
+        else
+            CHECK(configuration.m_lastError == notParsed);
+        CHECK(configuration.Load());
+        CHECK(value(configuration, "b") == "2" && value(configuration, "c") == "x & y");
+        CHECK(TestFiles::read(scene.configuration()) == newConfiguration);
+        CHECK(scene.othersAreUntouched());
+        if (!scene.files.reached()) {
+            CHECK(loaded);
+            break;
+        }
+    }
+}
+
+// What had room is there, and nothing is said: a save tells only of a file that does not open.
+void tst_Faults::diskFullAtEveryByteOfASave()
+{
+    for (int step = 0; step <= newConfiguration.size(); ++step, ++s_bytes) {
+        Scene scene;
+        TestFiles::write(scene.configuration(), oldConfiguration);
+        TorkConfigFile configuration(scene.configuration());
+        fill(configuration);
+
+        scene.files.limitBytes(step);
+        CHECK(configuration.Save());
+        scene.files.mend();
+
+        CHECK(configuration.m_lastError.isEmpty());
+        CHECK(TestFiles::read(scene.configuration()) == newConfiguration.left(step));
+        CHECK(scene.files.reached() == (step < newConfiguration.size()));
+
+        TorkConfigFile loaded(scene.configuration());
+        CHECK(loaded.Load() == (step >= newConfiguration.size() - 1));
+        CHECK(configuration.Save());
+        CHECK(loaded.Load());
+        CHECK(value(loaded, "c") == "x & y");
+        CHECK(scene.othersAreUntouched());
+    }
+}
+
+// No older file is lost, none is left half-made; the entries follow when there is room again.
+void tst_Faults::diskFullAtEveryByteOfARotation()
+{
+    const int most = full.size() + during.size();
+    for (int step = 0; step <= most; ++step, ++s_bytes) {
+        Scene scene;
+        scene.log.setMaxLogFiles(3);
+        makeOlderFiles(scene);
+
+        scene.files.limitBytes(step);
+        write(scene.log, during);
+        scene.files.mend();
+        const QByteArray whileFull = TestFiles::read(scene.current());
+        write(scene.log, after);
+
+        CHECK(during.startsWith(whileFull));
+        CHECK(TestFiles::read(scene.current()) == during + after);
+        CHECK(olderFilesAreKept(scene));
+        if (step >= full.size())
+            CHECK(numbered(scene) == QByteArrayList({full}) + older.mid(0, 2));
+        CHECK(scene.files.reached() == (step < most));
+        CHECK(scene.othersAreUntouched());
+    }
+}
+
+void tst_Faults::diskFullAtEveryByteOfAnEntry()
+{
+    for (int step = 0; step <= during.size(); ++step, ++s_bytes) {
+        Scene scene;
+        write(scene.log, before);
+
+        scene.files.limitBytes(step);
+        write(scene.log, during);
+        scene.files.mend();
+        CHECK(TestFiles::read(scene.current()) == before + during.left(step));
+        write(scene.log, after);
+
+        CHECK(TestFiles::read(scene.current()) == before + during + after);
+        CHECK(scene.othersAreUntouched());
+    }
+}
+
+QTEST_GUILESS_MAIN(tst_Faults)
+
+#include "tst_Faults.moc"
