@@ -32,6 +32,13 @@ class Goal:
         self.groups, self.what, self.factor, self.other = groups, what, factor, other
 
 
+class Limit:
+    """`what` costs at most so many nanoseconds in each of `groups`."""
+
+    def __init__(self, groups, what, nanoseconds):
+        self.groups, self.what, self.nanoseconds = groups, what, nanoseconds
+
+
 class Section:
     def __init__(self, title, runs, repetitions, unit=None, goals=()):
         self.title = title
@@ -46,6 +53,7 @@ PACED = ["paced, one a millisecond", "paced, one a second"]
 LOADS = ["load 20x50 values", "load 200x500 values"]
 SAVES = ["save 20x50 values", "save 200x500 values"]
 WRITES = ["document to file", "document to bytes"]
+LARGE_LOG = ["log of 100 MB, 1,000,000 lines"]
 PARSES = ["parse generated document", "parse shared MIME database"]
 
 SECTIONS = {
@@ -98,6 +106,16 @@ SECTIONS = {
             Goal(["start, time"], "velocor", 0.75, FLOOR),
             Goal(["start, peak memory"], "velocor", 0.5, FLOOR),
             Goal(["start, time"], "velocor", 1.1, "window of labels"),
+        ],
+    ),
+    "window": Section(
+        "The view of a large log",
+        [("bench_window", "display")],
+        (5, 2),
+        goals=[
+            Limit(LARGE_LOG, "open", 2e9),
+            Limit(LARGE_LOG, "longest moment", 50e6),
+            Limit(LARGE_LOG, "a page scrolled", 16e6),
         ],
     ),
     "growth": Section("Cost as work grows", [("bench_growth", "google")], (5, 2)),
@@ -307,18 +325,33 @@ def growth_table(samples):
     return table(header, rows) + "\n"
 
 
+def measured(samples, group, start):
+    name = samples.find(group, start)
+    if not name:
+        sys.exit(f"bench: nothing was measured for a goal of '{group}'")
+    return name, samples.median(group, name)
+
+
+def judged(goal, samples, group):
+    """What was wanted, what was measured, and whether that is enough."""
+    what, value = measured(samples, group, goal.what)
+    if isinstance(goal, Limit):
+        limit = worded(goal.nanoseconds, "ns")
+        return f"{what}: at most {limit}", worded(value, "ns"), value <= goal.nanoseconds
+    other, other_value = measured(samples, group, goal.other)
+    reference = FLOOR if goal.other == FLOOR else other
+    ratio = value / other_value
+    wanted = f"{what} at most {goal.factor:.3g} × {reference}"
+    return wanted, f"{ratio:.2f}", ratio <= goal.factor
+
+
 def goal_lines(section, samples):
     lines = []
     for goal in section.goals:
         for group in goal.groups:
-            what, other = samples.find(group, goal.what), samples.find(group, goal.other)
-            if not what or not other:
-                sys.exit(f"bench: nothing was measured for a goal of '{group}'")
-            ratio = samples.median(group, what) / samples.median(group, other)
-            reference = FLOOR if goal.other == FLOOR else other
-            verdict = "reached" if ratio <= goal.factor else "NOT REACHED"
-            wanted = f"{what} at most {goal.factor:.3g} × {reference}"
-            lines.append(f"- {group}: {wanted}: {ratio:.2f}, {verdict}")
+            wanted, value, reached = judged(goal, samples, group)
+            verdict = "reached" if reached else "NOT REACHED"
+            lines.append(f"- {group}: {wanted}: {value}, {verdict}")
     return "\n".join(lines) + "\n" if lines else ""
 
 

@@ -33,9 +33,8 @@ bool LogFilter::SetText(QString const& text, bool isExpression, bool caseSensiti
     if (isExpression && !ErrorOf(text).isEmpty())
         return false;
 
-    m_text = text;
     m_isExpression = isExpression;
-    m_caseSensitivity = caseSensitive ? Qt::CaseSensitive : Qt::CaseInsensitive;
+    m_matcher = QStringMatcher(text, caseSensitive ? Qt::CaseSensitive : Qt::CaseInsensitive);
     m_expression = QRegularExpression(isExpression ? text : QRegularExpression::escape(text),
                                       caseSensitive ? QRegularExpression::NoPatternOption
                                                     : QRegularExpression::CaseInsensitiveOption);
@@ -46,8 +45,7 @@ bool LogFilter::Matches(QString const& line) const
 {
     if (!hasText())
         return true;
-    return m_isExpression ? m_expression.match(line).hasMatch()
-                          : line.contains(m_text, m_caseSensitivity);
+    return m_isExpression ? m_expression.match(line).hasMatch() : m_matcher.indexIn(line) >= 0;
 }
 
 QVector<QPair<int, int>> LogFilter::Ranges(QString const& text) const
