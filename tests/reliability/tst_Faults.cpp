@@ -53,6 +53,7 @@ private:
     static void faults();
 
     QtMessageHandler m_handler = nullptr;
+    bool m_failed = false;
 };
 
 namespace {
@@ -142,11 +143,12 @@ void tst_Faults::cleanup()
 {
     TorkLog::shutdown();
     qInstallMessageHandler(m_handler);
+    m_failed = m_failed || QTest::currentTestFailed();
 }
 
 void tst_Faults::cleanupTestCase()
 {
-    if (!QTest::currentTestFailed())
+    if (!m_failed)
         Figures::print(QString("faults: %1 failing steps and %2 full disks, no crash, no hang, no "
                                "other file touched, and it went on each time")
                            .arg(s_steps)

@@ -1,0 +1,74 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// Logs and saves until it is killed, and tells after each call that it has returned.
+//
+//     reliability_victim ROOT RUN ENTRIES
+//
+// ROOT holds the folder logs/, settings.cfg and report, the shared memory. The log file is closed
+// after every ENTRIES entries, so that the next one opens it again; 0: it stays open.
+
+#include "reliability/Victim.h"
+
+#include "common/config/TorkConfigFile.h"
+#include "common/log/TorkLog.h"
+
+#include <QFile>
+
+#include <cstdlib>
+
+namespace {
+
+const quint64 entriesPerSave = 100;
+
+Victim::Report* shared(QString const& path)
+{
+    static QFile file(path);
+    if (!file.open(QIODevice::ReadWrite))
+        return nullptr;
+    return reinterpret_cast<Victim::Report*>(file.map(0, sizeof(Victim::Report)));
+}
+
+void save(TorkConfigFile& configuration, quint64 run, quint64 number)
+{
+    configuration.WriteItem("state", "version", QString("%1.%2").arg(run).arg(number));
+    configuration.WriteItem("state", "filler", QString::fromLatin1(Victim::filler(number)));
+    configuration.Save();
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    if (argc != 4)
+        return 2;
+    const QString root = QFile::decodeName(argv[1]);
+    const quint64 run = std::strtoull(argv[2], nullptr, 10);
+    const quint64 entriesBetween = std::strtoull(argv[3], nullptr, 10);
+    Victim::Report* const report = shared(root + "report");
+    if (!report)
+        return 1;
+
+    // Off until the settings are loaded, lest loading them is traced into the file.
+    TorkLog* const log = TorkLog::initialize(root + "logs/", "app", root + "settings.cfg", false);
+    TorkConfigFile configuration(root + "app.cfg");
+    report->running = 1;
+
+    for (quint64 entry = 1;; ++entry) {
+        const QString message = QString::fromLatin1(Victim::message(run, entry));
+        report->entryBegun = entry;
+        if (entry % 2)
+            log->error(message);
+        else
+            qCritical("%s", qPrintable(message));
+        report->entryReturned = entry;
+
+        if (entriesBetween && entry % entriesBetween == 0)
+            log->close();
+        if (entry % entriesPerSave == 0) {
+            report->saveBegun = entry / entriesPerSave;
+            save(configuration, run, entry / entriesPerSave);
+            report->saveReturned = entry / entriesPerSave;
+        }
+    }
+}
