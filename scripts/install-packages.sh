@@ -11,6 +11,7 @@
 #     scripts/install-packages.sh build bench    and the peers that ./bench measures against
 #     scripts/install-packages.sh build fuzz     and the compiler with the fuzzing runtime
 #     scripts/install-packages.sh build lint     and the format and lint checks
+#     scripts/install-packages.sh build package  and what ./package validates and packs with
 set -euo pipefail
 
 say() { echo "install-packages: $*" >&2; }
@@ -20,7 +21,7 @@ packages_of() {
     case "$(uname -s)/$1" in
     Darwin/build) echo cmake ninja qt@5 rapidxml ;;
     Darwin/lint) echo clang-format@14 llvm@14 shellcheck ;;
-    Darwin/test | Darwin/wayland) ;;
+    Darwin/test | Darwin/wayland | Darwin/package) ;;
     */build) echo g++ cmake ninja-build qtbase5-dev librapidxml-dev ;;
     */wayland) echo qtwayland5 ;;
     */test) echo xvfb xauth shared-mime-info pkg-config valgrind doxygen ;;
@@ -30,6 +31,7 @@ packages_of() {
             libpugixml-dev libxml2-dev
         ;;
     */fuzz) echo clang-14 libclang-rt-14-dev ;;
+    */package) echo dpkg-dev desktop-file-utils appstream man-db ;;
     */lint) echo git clang-format-14 clang-tidy-14 shellcheck ;;
     *)
         say "no group is called '$1'"

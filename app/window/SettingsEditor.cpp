@@ -56,6 +56,8 @@ QPushButton* SettingsEditor::makeButton(QString const& text, QString const& tool
     auto* button = new QPushButton(text);
     button->setAutoDefault(false);
     button->setToolTip(toolTip);
+    button->setMinimumWidth(button->sizeHint().width() +
+                            2 * button->fontMetrics().averageCharWidth());
     return button;
 }
 
