@@ -15,7 +15,7 @@ class QWidget;
 ///
 /// The file is read by SettingsFileReader rather than by the store itself, whose traces would
 /// stand before the first entry of the log. A file that does not parse is put aside under another
-/// name, and is never written over. File format: docs/config-file.md.
+/// name, and is never written over. Keys and values: docs/window.md.
 ///
 ///     WindowSettings settings(dataPath);
 ///     settings.Load();
