@@ -4,21 +4,12 @@
 #include "app/window/InstanceList.h"
 
 #include <QCoreApplication>
-#include <QCryptographicHash>
 #include <QDir>
 #include <QFileInfo>
 #include <QLockFile>
 #include <QStringList>
 
 namespace {
-
-QString FolderFor(QString const& logFile)
-{
-    const QString path = QFileInfo(logFile).absoluteFilePath();
-    const QByteArray hash =
-        QCryptographicHash::hash(path.toUtf8(), QCryptographicHash::Sha1).toHex().left(20);
-    return QDir::tempPath() + QLatin1String("/velocor-") + QString::fromLatin1(hash);
-}
 
 QString OwnName()
 {
@@ -27,8 +18,7 @@ QString OwnName()
 
 } // namespace
 
-InstanceList::InstanceList(QString const& logFile)
-    : m_folder(FolderFor(logFile)), m_ownName(OwnName())
+InstanceList::InstanceList(QString const& folder) : m_folder(folder), m_ownName(OwnName())
 {
     QDir().mkpath(m_folder);
     m_lock = std::make_unique<QLockFile>(m_folder + QLatin1Char('/') + m_ownName);

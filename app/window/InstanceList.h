@@ -10,21 +10,24 @@
 
 class QLockFile;
 
-/// The running programs that share one log file, as far as they have a list like this.
+/// The running programs that share one log, as far as they have a list like this.
 ///
-/// Each holds a lock file of its own in a folder of the system's temporary directory; the locks of
-/// programs that ended without letting go are removed. Nothing beside the log is touched.
+/// Each holds a lock file of its own, called after its process number, in a folder that stands for
+/// the log; the locks of programs that ended without letting go are removed. Where the folder
+/// cannot be made, nobody else is found.
 ///
-///     InstanceList instances(logFile);
+///     InstanceList instances(dataPath + "running-program.log");
 ///     if (!instances.Others().isEmpty())
 ///         tell(...);
 class InstanceList
 {
 public:
     /// Joins the list.
-    explicit InstanceList(QString const& logFile);
+    ///
+    /// @param folder  made if need be; for lock files only
+    explicit InstanceList(QString const& folder);
 
-    /// Leaves it.
+    /// Leaves it. The last one removes the folder.
     ~InstanceList();
 
     InstanceList(InstanceList const&) = delete;

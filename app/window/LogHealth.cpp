@@ -7,10 +7,12 @@
 #include "app/window/RunningLog.h"
 #include "common/log/TorkLog.h"
 
+#include <QCoreApplication>
 #include <QFileInfo>
 #include <QObject>
 #include <QStorageInfo>
 #include <QStringList>
+#include <QVariant>
 
 LogHealth::LogHealth() = default;
 
@@ -51,7 +53,9 @@ QString LogHealth::sharingProblem()
     const QString logFile = RunningLog::FileName();
     if (!m_instances || m_logFile != logFile) {
         m_logFile = logFile;
-        m_instances = std::make_unique<InstanceList>(logFile);
+        m_instances = std::make_unique<InstanceList>(
+            QCoreApplication::instance()->property("DataPath").toString() +
+            QLatin1String("running-") + QFileInfo(logFile).fileName());
     }
 
     QStringList numbers;

@@ -45,6 +45,7 @@ private slots:
     void isKept_data();
     void isKept();
     void instances();
+    void instancesLeaveNothing();
     void instanceLeftBehind();
     void health();
     void healthDirectoryInTheWay();
@@ -325,14 +326,20 @@ void tst_WindowState::isKept()
     QTEST(LogPreferences::IsKept(text), "expected");
 }
 
+// Where the window looks for others.
+static QString runningFolder(WindowTest const& test)
+{
+    return test.folder() + "data/running-app.log";
+}
+
 void tst_WindowState::instances()
 {
     const WindowTest test;
-    const InstanceList own(test.logFile());
+    const InstanceList own(runningFolder(test));
     QCOMPARE(own.Others(), QList<qint64>());
 
     QProcess other;
-    other.start(QCoreApplication::applicationFilePath(), {"--hold", test.logFile()});
+    other.start(QCoreApplication::applicationFilePath(), {"--hold", runningFolder(test)});
     QVERIFY(other.waitForReadyRead(20000));
     QCOMPARE(own.Others(), QList<qint64>({other.processId()}));
     LogHealth health;
@@ -344,13 +351,23 @@ void tst_WindowState::instances()
     QCOMPARE(own.Others(), QList<qint64>());
 }
 
+void tst_WindowState::instancesLeaveNothing()
+{
+    const WindowTest test;
+    {
+        const InstanceList own(runningFolder(test));
+        QVERIFY(QFile::exists(runningFolder(test)));
+    }
+    QVERIFY(!QFile::exists(runningFolder(test)));
+}
+
 // A program that was killed does not count any more.
 void tst_WindowState::instanceLeftBehind()
 {
     const WindowTest test;
-    const InstanceList own(test.logFile());
+    const InstanceList own(runningFolder(test));
     QProcess other;
-    other.start(QCoreApplication::applicationFilePath(), {"--hold", test.logFile()});
+    other.start(QCoreApplication::applicationFilePath(), {"--hold", runningFolder(test)});
     QVERIFY(other.waitForReadyRead(20000));
     other.kill();
     other.waitForFinished();
