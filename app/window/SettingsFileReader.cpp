@@ -4,12 +4,12 @@
 #include "app/window/SettingsFileReader.h"
 
 #include "common/xml/TorkXmlDepth.h"
+#include "common/xml/TorkXmlGuard.h"
 
 #include <QBuffer>
 #include <QFile>
 #include <QFileInfo>
 #include <QObject>
-#include <QXmlInputSource>
 #include <QXmlSimpleReader>
 
 SettingsDocument SettingsFileReader::Read(QString const& path)
@@ -42,12 +42,15 @@ void SettingsFileReader::read(QIODevice& device)
         m_document.losses.append(QObject::tr("Line 1: the XML declaration"));
     m_document.lossCount = m_document.losses.size();
 
-    QXmlInputSource source(&device);
+    TorkXmlGuard source(&device);
+    m_guard = &source;
     QXmlSimpleReader reader;
+    source.Watch(reader);
     reader.setContentHandler(this);
     reader.setErrorHandler(this);
     reader.setLexicalHandler(this);
     m_document.isParsed = reader.parse(source);
+    m_guard = nullptr;
     if (!m_document.isParsed && m_document.error.isEmpty())
         m_document.error = QObject::tr("The file is no configuration file");
 }
@@ -161,10 +164,16 @@ bool SettingsFileReader::comment(QString const& text)
     return true;
 }
 
-bool SettingsFileReader::startDTD(QString const& name, QString const&, QString const&)
+bool SettingsFileReader::startDTD(QString const& name, QString const& publicId,
+                                  QString const& systemId)
 {
     lose(QObject::tr("the document type \"%1\"").arg(name));
-    return true;
+    return m_guard->startDTD(name, publicId, systemId);
+}
+
+bool SettingsFileReader::endDTD()
+{
+    return m_guard->endDTD();
 }
 
 bool SettingsFileReader::fatalError(QXmlParseException const& exception)

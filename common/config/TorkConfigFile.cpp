@@ -7,10 +7,10 @@
 #include "common/log/TorkLog.h"
 #include "common/xml/TorkErrorHandler.h"
 #include "common/xml/TorkXmlDepth.h"
+#include "common/xml/TorkXmlGuard.h"
 
 #include <QFile>
 #include <QObject>
-#include <QXmlInputSource>
 #include <QXmlSimpleReader>
 
 #include <algorithm>
@@ -166,8 +166,9 @@ bool TorkConfigFile::parse()
     DepthLimitedDocHandler contentHandler(this);
     TorkErrorHandler errorHandler(TorkLog::m_gLog);
     QFile file(m_fileName);
-    QXmlInputSource source(&file);
+    TorkXmlGuard source(&file);
     QXmlSimpleReader reader;
+    source.Watch(reader);
     reader.setContentHandler(&contentHandler);
     reader.setErrorHandler(&errorHandler);
 

@@ -59,8 +59,9 @@ struct Result
     }
 };
 
+/// @param limit  milliseconds after which the case counts as hanging
 inline Result run(QString const& name, QStringList const& arguments = QStringList(),
-                  QString const& workingFolder = QString())
+                  QString const& workingFolder = QString(), int limit = 60000)
 {
     QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
     environment.remove("QT_LOGGING_RULES");
@@ -78,7 +79,6 @@ inline Result run(QString const& name, QStringList const& arguments = QStringLis
                   QStringList({"--case", name}) + arguments);
 
     Result result;
-    const int limit = 60000;
     result.inTime = process.waitForFinished(limit);
     if (!result.inTime) {
         process.kill();

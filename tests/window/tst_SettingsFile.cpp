@@ -48,6 +48,7 @@ private slots:
     void errors();
     void unreadable();
     void deepNesting();
+    void deepDocumentType();
     void losses_data();
     void losses();
     void isName_data();
@@ -185,6 +186,15 @@ void tst_SettingsFile::deepNesting()
     const SettingsDocument document = SettingsFileReader::ReadBytes(text);
     QVERIFY(!document.isParsed);
     QCOMPARE(document.error, QString("elements are nested too deep"));
+}
+
+void tst_SettingsFile::deepDocumentType()
+{
+    QByteArray text = "<!DOCTYPE S [<!ELEMENT S ";
+    text += QByteArray(100000, '(') + "a" + QByteArray(100000, ')') + ">]><S/>";
+    const SettingsDocument document = SettingsFileReader::ReadBytes(text);
+    QVERIFY(!document.isParsed);
+    QVERIFY(!document.error.isEmpty());
 }
 
 void tst_SettingsFile::losses_data()

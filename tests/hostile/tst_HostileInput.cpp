@@ -1,0 +1,242 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// Documents made to harm who reads them end as any malformed document ends, or load, in memory that
+// is bounded by the size of the file. Each is read in a process of its own, which is what the
+// memory is measured of, and where an exhausted stack ends no other row.
+
+#include "HostileDocuments.h"
+
+#include "app/LaunchOptionParser.h"
+#include "app/window/SettingsFileReader.h"
+#include "common/config/TorkConfigFile.h"
+#include "common/xml/TorkXmlGuard.h"
+#include "common/xml/TorkXml_FlushUnknownElement.h"
+#include "common/xml/TorkXml_ParseManager_Base.h"
+#include "support/ChildProcess.h"
+
+#include <QElapsedTimer>
+#include <QFile>
+#include <QTemporaryDir>
+#include <QXmlSimpleReader>
+#include <QtTest>
+
+#ifdef Q_OS_UNIX
+#include <sys/resource.h>
+#endif
+
+namespace {
+
+// Both compilers' ways of saying that memory is watched, which takes more of it.
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+constexpr bool IsSanitized = true;
+#else
+constexpr bool IsSanitized = false;
+#endif
+
+constexpr qint64 Megabyte = 1024 * 1024;
+
+bool AllSizes()
+{
+    return qgetenv("VELOCOR_HOSTILE") == "full";
+}
+
+// What a reader takes of its own accord, and what of each byte of the file: text has two bytes a
+// character and passes through a few hands, and a key of one letter costs a node in a hash table.
+qint64 Bound(qint64 fileSize)
+{
+    return 64 * Megabyte + 24 * fileSize;
+}
+
+qint64 PeakMemory()
+{
+#ifdef Q_OS_UNIX
+    rusage usage = {};
+    getrusage(RUSAGE_SELF, &usage);
+#ifdef Q_OS_MACOS
+    return usage.ru_maxrss;
+#else
+    return usage.ru_maxrss * 1024;
+#endif
+#else
+    return 0;
+#endif
+}
+
+// A manager that lets everything pass.
+class SkippingManager : public TorkXml_ParseManager_Base
+{
+public:
+    TorkXml_ParseState_Base* GetFirstState(QString const& name) override
+    {
+        return new TorkXml_FlushUnknownElement(name, this);
+    }
+};
+
+bool ReadLaunchData(QString const& path)
+{
+    LaunchOptionParser parser;
+    parser.AddOption(new LaunchOption("product", "product", "p", 1, "product"));
+    const bool read = parser.ReadDataFile(path);
+    return read && parser.errorText.isEmpty();
+}
+
+// A failed load leaves its text, and nothing else does.
+bool ReadConfiguration(QString const& path)
+{
+    TorkConfigFile settings(path);
+    const bool loaded = settings.Load();
+    const QString expected = loaded ? "" : "ConfigFile - Could not parse the input file.";
+    if (settings.m_lastError != expected)
+        qFatal("the last error is \"%s\"", qPrintable(settings.m_lastError));
+    return loaded;
+}
+
+bool ReadWithManager(QString const& path)
+{
+    QFile file(path);
+    TorkXmlGuard source(&file);
+    QXmlSimpleReader reader;
+    source.Watch(reader);
+    SkippingManager manager;
+    reader.setContentHandler(&manager);
+    return reader.parse(source);
+}
+
+bool ReadInEditor(QString const& path)
+{
+    const SettingsDocument document = SettingsFileReader::Read(path);
+    if (document.isParsed != document.error.isEmpty())
+        qFatal("the error is \"%s\"", qPrintable(document.error));
+    return document.isParsed;
+}
+
+using Reader = bool (*)(QString const& path);
+
+const QMap<QString, Reader> Readers = {{"launch data", ReadLaunchData},
+                                       {"configuration", ReadConfiguration},
+                                       {"parse manager", ReadWithManager},
+                                       {"settings editor", ReadInEditor}};
+
+// Prints the result, the milliseconds and the peak of the memory in bytes.
+int Read(QStringList const& arguments)
+{
+    qInstallMessageHandler([](QtMsgType type, QMessageLogContext const&, QString const& text) {
+        if (type == QtFatalMsg)
+            std::fprintf(stderr, "%s\n", qPrintable(text));
+    });
+    QElapsedTimer timer;
+    timer.start();
+    const bool isRead = Readers.value(arguments.value(0))(arguments.value(1));
+    std::printf("%d %lld %lld", isRead, timer.elapsed(), PeakMemory());
+    return 0;
+}
+
+} // namespace
+
+class tst_HostileInput : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void read_data();
+    void read();
+
+private:
+    void add(char const* reader, char const* what, HostileDocuments::Writer writer, int size,
+             bool isRead);
+    void addStructures(char const* reader, bool readsTypes);
+    void addSizes(char const* reader);
+
+    QTemporaryDir m_folder;
+};
+
+Q_DECLARE_METATYPE(HostileDocuments::Writer)
+
+void tst_HostileInput::add(char const* reader, char const* what, HostileDocuments::Writer writer,
+                           int size, bool isRead)
+{
+    QTest::addRow("%s, %s", reader, what) << reader << writer << size << isRead;
+}
+
+// What is small in the file and large in the reader. One that passes over document types is harmed
+// by nesting alone.
+void tst_HostileInput::addStructures(char const* reader, bool readsTypes)
+{
+    using namespace HostileDocuments;
+    const bool skipsTypes = !readsTypes;
+    add(reader, "a million elements inside each other", nestedElements, 1000000, false);
+    add(reader, "a million open elements", openElements, 1000000, false);
+    add(reader, "1000 groups inside each other", nestedGroups, 1000, true);
+    add(reader, "1001 groups inside each other", nestedGroups, 1001, skipsTypes);
+    add(reader, "a million groups inside each other", nestedGroups, 1000000, skipsTypes);
+    add(reader, "a million groups from an entity", groupsFromEntity, 1000000, skipsTypes);
+    add(reader, "ten generations of text entities", textBomb, 10, skipsTypes);
+    add(reader, "ten generations of element entities", elementBomb, 10, skipsTypes);
+    add(reader, "ten generations of entities in an attribute", attributeBomb, 10, skipsTypes);
+    add(reader, "an entity of 100,000 characters named as often", longEntity, 100000, skipsTypes);
+    add(reader, "an entity that stands for itself", endlessEntity, 0, skipsTypes);
+    add(reader, "200 entities behind one another", entityChain, 200, true);
+    add(reader, "100,000 entities behind one another", entityChain, 100000, skipsTypes);
+}
+
+void tst_HostileInput::addSizes(char const* reader)
+{
+    using namespace HostileDocuments;
+    add(reader, "names of 1 MB", longNames, 1000000, true);
+    add(reader, "100,000 attributes", manyAttributes, 100000, true);
+    add(reader, "a value of 2 MB", longValue, 2000000, true);
+    add(reader, "100,000 keys", manyKeys, 100000, true);
+    if (AllSizes()) {
+        add(reader, "a value of 200 MB", longValue, 200000000, true);
+        add(reader, "ten million keys", manyKeys, 10000000, true);
+    }
+}
+
+void tst_HostileInput::read_data()
+{
+    QTest::addColumn<QString>("reader");
+    QTest::addColumn<HostileDocuments::Writer>("writer");
+    QTest::addColumn<int>("size");
+    QTest::addColumn<bool>("isRead");
+
+    for (char const* reader : {"configuration", "parse manager", "settings editor"})
+        addStructures(reader, true);
+    addStructures("launch data", false);
+    for (char const* reader : {"configuration", "parse manager", "launch data"})
+        addSizes(reader);
+}
+
+void tst_HostileInput::read()
+{
+    QFETCH(QString, reader);
+    QFETCH(HostileDocuments::Writer, writer);
+    QFETCH(int, size);
+    QFile file(m_folder.filePath("document"));
+    QVERIFY2(file.open(QIODevice::WriteOnly | QIODevice::Truncate), qPrintable(file.errorString()));
+    writer(file, size);
+    file.close();
+    QVERIFY2(file.error() == QFile::NoError, qPrintable(file.errorString()));
+
+    const int limit = 300000;
+    const ChildProcess::Result child =
+        ChildProcess::run("read", {reader, file.fileName()}, QString(), limit);
+    QVERIFY2(child.ended(), child.report());
+    const QList<QByteArray> figures = child.output.split(' ');
+    QCOMPARE(figures.size(), 3);
+    const qint64 memory = figures[2].toLongLong();
+    qInfo("figure: %s: %s; file %.1f MB, %.1f s, %lld MB at most", QTest::currentDataTag(),
+          figures[0] == "1" ? "read" : "refused", double(file.size()) / Megabyte,
+          figures[1].toDouble() / 1000, memory / Megabyte);
+
+    QTEST(figures[0] == "1", "isRead");
+    if (!IsSanitized)
+        QVERIFY(memory <= Bound(file.size()));
+}
+
+int main(int argc, char** argv)
+{
+    return ChildProcess::main<tst_HostileInput>(argc, argv, {{"read", Read}});
+}
+
+#include "tst_HostileInput.moc"
