@@ -7,6 +7,7 @@
 #include <QString>
 
 #include <cstdint>
+#include <cstdio>
 #include <cstdlib>
 #include <cstring>
 
@@ -57,11 +58,14 @@ private:
     size_t m_left;
 };
 
-/// Ends the run where a promise is broken; unlike an assertion, in every build.
-inline void Require(bool holds)
+/// Ends the run where a promise is broken, and says in which line; unlike an assertion, in every
+/// build.
+inline void Require(bool holds, int line = __builtin_LINE())
 {
-    if (!holds)
-        abort();
+    if (holds)
+        return;
+    std::fprintf(stderr, "line %d: broken promise\n", line);
+    std::abort();
 }
 
 /// Keeps the toolkit's warnings about broken input off the terminal.

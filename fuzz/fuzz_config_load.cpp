@@ -7,10 +7,19 @@
 #include "FuzzInput.h"
 
 #include "common/config/TorkConfigFile.h"
+#include "support/PrivateField.h"
 
 #include <QFile>
 #include <QMap>
 #include <QTemporaryDir>
+
+// The store tells nobody the names of its sections.
+struct SectionTable
+{
+    using Field = TorkOrderedHash<TorkConfigFileSection*> TorkConfigFile::*;
+    friend Field privateField(SectionTable);
+};
+template struct PrivateField<SectionTable, &TorkConfigFile::m_sections>;
 
 namespace {
 
@@ -18,61 +27,66 @@ using Sections = QMap<QString, QMap<QString, QString>>;
 
 bool IsPlainName(QString const& name)
 {
-    bool plain = !name.isEmpty() && name[0].isLetter();
+    bool plain = !name.isEmpty() && name[0].unicode() < 128 && name[0].isLetter();
     for (QChar c : name)
         plain = plain && c.unicode() < 128 && (c.isLetterOrNumber() || c == '_');
     return plain;
 }
 
-// Printable ASCII, not a terminator of CDATA, no placeholder, and no white space that a reader
-// would be free to change.
+// Printable ASCII and line ends, not a terminator of CDATA, no placeholder.
 bool IsPlainValue(QString const& value)
 {
     bool plain = !value.isEmpty() && !value.contains("]]>") && !value.contains('%');
     for (QChar c : value)
-        plain = plain && c.unicode() >= ' ' && c.unicode() < 127;
+        plain = plain && ((c.unicode() >= ' ' && c.unicode() < 127) || c == '\n' || c == '\t');
     return plain;
+}
+
+// An element that is called as the root is one more root to the loader.
+bool IsPromised(QString const& section, QString const& key, QString const& value)
+{
+    const QString root = "VelocorSettings";
+    return IsPlainName(section) && section != root && IsPlainName(key) && key != root &&
+           IsPlainValue(value);
 }
 
 void Write(QString const& path, QByteArray const& bytes)
 {
     QFile file(path);
     Require(file.open(QIODevice::WriteOnly));
-    file.write(bytes);
+    Require(file.write(bytes) == bytes.size());
 }
 
-// The names cannot be asked of the store, so they are guessed from the words of the document.
-QStringList Words(QByteArray const& bytes)
+Sections Contents(TorkConfigFile const& settings)
 {
-    QStringList words;
-    QString word;
-    for (char c : bytes + ' ') {
-        const QChar letter = QLatin1Char(c);
-        if (letter.unicode() < 128 && (letter.isLetterOrNumber() || letter == '_')) {
-            word += letter;
-        } else if (IsPlainName(word)) {
-            words.append(word);
-            word.clear();
-        } else {
-            word.clear();
-        }
+    Sections contents;
+    for (auto const& section : settings.*privateField(SectionTable())) {
+        Require(section.key == section.value->name());
+        auto& items = contents[section.key];
+        for (auto const& item : section.value->values())
+            items[item.key] = item.value;
     }
-    words.removeDuplicates();
-    return words.mid(0, 64);
+    return contents;
 }
 
-Sections Contents(TorkConfigFile& settings, QStringList const& names)
+Sections Promised(Sections const& contents)
 {
-    Sections sections;
-    for (QString const& name : names) {
-        const QStringList keys = settings.keyList(name);
-        for (QString const& key : keys) {
-            QString none, value;
-            if (settings.ReadItem(name, key, none, value))
-                sections[name][key] = value;
+    Sections promised;
+    for (auto section = contents.begin(); section != contents.end(); ++section) {
+        for (auto item = section->begin(); item != section->end(); ++item) {
+            if (IsPromised(section.key(), item.key(), *item))
+                promised[section.key()][item.key()] = *item;
         }
     }
-    return sections;
+    return promised;
+}
+
+void Fill(TorkConfigFile& settings, Sections const& contents)
+{
+    for (auto section = contents.begin(); section != contents.end(); ++section) {
+        for (auto item = section->begin(); item != section->end(); ++item)
+            Require(settings.WriteItem(section.key(), item.key(), *item));
+    }
 }
 
 } // namespace
@@ -87,29 +101,29 @@ extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
 {
     static QTemporaryDir folder;
     const QString path = folder.path() + "/settings.cfg";
-    const QByteArray bytes(reinterpret_cast<char const*>(data), int(size));
-    Write(path, bytes);
+    Write(path, QByteArray(reinterpret_cast<char const*>(data), int(size)));
 
     TorkConfigFile settings(path);
     const bool loaded = settings.Load();
     Require(loaded == settings.m_lastError.isEmpty());
 
-    const QStringList names = Words(bytes);
-    TorkConfigFile plain(path);
-    const Sections before = Contents(settings, names);
-    for (auto section = before.begin(); section != before.end(); ++section) {
-        for (auto item = section->begin(); item != section->end(); ++item) {
-            const bool isPlain = section.key() != "VelocorSettings" && IsPlainName(item.key()) &&
-                                 item.key() != "VelocorSettings" && IsPlainValue(*item);
-            if (isPlain)
-                plain.WriteItem(section.key(), item.key(), *item);
-        }
-    }
-    const Sections written = Contents(plain, names);
-    Require(plain.Save());
+    // Whatever was loaded can be saved, and what that makes can be looked at.
+    const Sections contents = Contents(settings);
+    Require(settings.Save());
+    TorkConfigFile saved(path);
+    const bool loadedAgain = saved.Load();
 
-    TorkConfigFile again(path);
-    Require(again.Load());
-    Require(Contents(again, names) == written);
+    const Sections promised = Promised(contents);
+    if (promised == contents) {
+        Require(loadedAgain);
+        Require(Contents(saved) == contents);
+        return 0;
+    }
+
+    TorkConfigFile rest(path);
+    Fill(rest, promised);
+    Require(rest.Save());
+    Require(saved.Load());
+    Require(Contents(saved) == promised);
     return 0;
 }

@@ -7,6 +7,24 @@
 
 #include "app/LaunchOptionParser.h"
 
+#include <algorithm>
+#include <clocale>
+
+namespace {
+
+bool IsSet(LaunchOption const* option)
+{
+    return option->isSet;
+}
+
+} // namespace
+
+extern "C" int LLVMFuzzerInitialize(int*, char***)
+{
+    std::setlocale(LC_ALL, ""); // as an application object does: the text goes through its encoding
+    return 0;
+}
+
 extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
 {
     LaunchOptionParser parser;
@@ -15,8 +33,16 @@ extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
 
     QString text = QString::fromUtf8(reinterpret_cast<char const*>(data), int(size));
     const bool parsed = parser.ParseOptions(text);
-    Require(!parsed || parser.errorText.isEmpty());
-    for (LaunchOption const* option : parser.options)
+    auto const& options = parser.options;
+    const bool anySet = std::any_of(options.begin(), options.end(), IsSet);
+
+    Require(options.size() == 2);
+    // A failure without a message is one of form, and then nothing at all is taken.
+    if (parser.errorText.isEmpty())
+        Require(parsed || !anySet);
+    else
+        Require(!parsed && parser.errorText.startsWith("Unknown key = "));
+    for (LaunchOption const* option : options)
         Require(option->isSet || option->value.isEmpty());
     return 0;
 }

@@ -7,6 +7,8 @@
 
 #include "app/window/LogLineParser.h"
 
+#include <vector>
+
 extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
 {
     FuzzInput input(data, size);
@@ -15,12 +17,18 @@ extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
     const LogLineParser parser(formats, prefixes);
     const QByteArray line = input.rest();
 
-    const LogLineParser::Parts parts = parser.Find(line.constData(), line.size());
-    Require(parts.timeLength >= 0 && parts.timeLength <= line.size());
-    Require(parts.message >= 0 && parts.message <= line.size());
-    Require(parts.elapsedLength >= 0 && parts.elapsed + parts.elapsedLength <= line.size());
+    // As in a file that is mapped into memory: no zero byte stands behind the line.
+    const std::vector<char> bytes(line.begin(), line.end());
+    const int length = line.size();
+    const LogLineParser::Parts parts = parser.Find(bytes.data(), length);
+    Require(parts.timeLength >= 0 && parts.timeLength <= length);
+    Require(parts.message >= parts.timeLength && parts.message <= length);
+    Require(parts.elapsedLength >= 0 && parts.elapsed >= 0);
+    Require(parts.elapsed + parts.elapsedLength <= parts.message);
+    Require(parts.isEntry || (parts.message == 0 && parts.severity == LogEntry::None));
 
     const LogEntry entry = parser.Parse(line);
-    Require(entry.isEntry == parts.isEntry);
+    Require(entry.isEntry == parts.isEntry && entry.severity == parts.severity);
+    Require(entry.message.size() == length - parts.message);
     return 0;
 }

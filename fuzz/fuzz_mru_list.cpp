@@ -28,6 +28,15 @@ bool UpdateModel(QString const& file, QStringList& entries, int maxCount, int op
     return true;
 }
 
+bool Update(QString const& file, QString& list, int maxCount, int op)
+{
+    if (op == AppUtils::MRURemove && maxCount == 10)
+        return AppUtils::RemoveFromMRUList(file, list);
+    if (op == AppUtils::MRUAdd && maxCount == 10)
+        return AppUtils::AddToMRUList(file, list, maxCount);
+    return AppUtils::UpdateMRUList(file, list, maxCount, static_cast<AppUtils::MRUOpCode>(op));
+}
+
 } // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
@@ -41,8 +50,7 @@ extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
         const int maxCount = static_cast<signed char>(input.byte());
         const int op = static_cast<signed char>(input.byte()) % 3;
         const QString before = list;
-        const bool changed =
-            AppUtils::UpdateMRUList(file, list, maxCount, static_cast<AppUtils::MRUOpCode>(op));
+        const bool changed = Update(file, list, maxCount, op);
         Require(changed == UpdateModel(file, model, maxCount, op));
         Require(changed || list == before);
         Require(list.split("|") == model);

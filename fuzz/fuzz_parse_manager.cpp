@@ -15,6 +15,7 @@
 namespace {
 
 int s_states = 0;
+bool s_refused = false; // whether a state refused the last piece of content
 
 // Answers by the bits of a byte and the name it is asked about.
 class MoodyState : public TorkXml_ParseState_Base
@@ -49,7 +50,8 @@ public:
         const uint8_t mood = m_moods.byte();
         if (mood % 16 == 1)
             ParseManager()->AppendError(name, content, mood);
-        return mood % 32 != 2;
+        s_refused = mood % 32 == 2;
+        return !s_refused;
     }
 
     bool EndElement(QString const&) override { return m_moods.byte() % 2; }
@@ -68,8 +70,32 @@ public:
         return m_moods.byte() % 16 == 1 ? nullptr : new MoodyState(name, this, m_moods);
     }
 
+    bool startElement(QString const& uri, QString const& localName, QString const& qName,
+                      QXmlAttributes const& attributes) override
+    {
+        const bool goesOn =
+            TorkXml_ParseManager_Base::startElement(uri, localName, qName, attributes);
+        Require(CurrentElement() == localName);
+        m_stopped = m_stopped || !goesOn;
+        return goesOn;
+    }
+
+    bool characters(QString const& text) override
+    {
+        s_refused = false;
+        const bool hasState = LastState() != nullptr;
+        const bool goesOn = TorkXml_ParseManager_Base::characters(text);
+        Require(goesOn == (hasState && !s_refused));
+        m_stopped = m_stopped || !goesOn;
+        return goesOn;
+    }
+
+    /// Whether any call told the reader to stop.
+    bool isStopped() const { return m_stopped; }
+
 private:
     FuzzInput& m_moods;
+    bool m_stopped = false;
 };
 
 } // namespace
@@ -93,7 +119,9 @@ extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
         MoodyManager manager(moods);
         QXmlSimpleReader reader;
         reader.setContentHandler(&manager);
-        reader.parse(source);
+        const bool parsed = reader.parse(source);
+        Require(!parsed || !manager.isStopped());
+        Require(!parsed || !manager.PopElement()); // every element that opened has ended
         QString report;
         manager.FormatErrors(report);
         Require(report.startsWith("Failed to parse the XML content:\n"));

@@ -2,31 +2,32 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 #
-# Builds the fuzzers and runs each for a fixed number of inputs, or for a time:
+# Builds the fuzzers and runs each, or those named, for a fixed number of inputs or for a time:
 #
-#     scripts/fuzz.sh                 20,000 inputs each
-#     scripts/fuzz.sh --runs 1000
+#     scripts/fuzz.sh                              20,000 inputs each
+#     scripts/fuzz.sh --runs 1000 screen_fit
 #     scripts/fuzz.sh --seconds 600
 #
 # An input that fails is left in build/fuzz/failed; keep it as a row in the ordinary tests.
 set -euo pipefail
 
 root=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd -P)
-limit=-runs=20000
+build=$root/build/fuzz
+export limit=-runs=20000
 case "${1:-}" in
---runs) limit=-runs=$2 ;;
---seconds) limit=-max_total_time=$2 ;;
+--runs) limit=-runs=$2 && shift 2 ;;
+--seconds) limit=-max_total_time=$2 && shift 2 ;;
 esac
 
 "$root/scripts/install-packages.sh" build fuzz
-"$root/scripts/build.sh" fuzz
+"$root/scripts/build.sh" fuzz fuzz/all
 
-build=$root/build/fuzz
-mkdir -p "$build/failed"
-export LC_ALL=C.UTF-8 QT_QPA_PLATFORM=offscreen
-# The toolkit keeps some of its own for the life of the program.
-export ASAN_OPTIONS=detect_leaks=1
-export LSAN_OPTIONS=suppressions=$root/tests/support/toolkit-leaks.supp:print_suppressions=0
+names=("$@")
+if [ ${#names[@]} -eq 0 ]; then
+    for seeds in "$root"/fuzz/seeds/*; do
+        names+=("$(basename "$seeds")")
+    done
+fi
 
 dictionary() {
     case "$1" in
@@ -36,19 +37,40 @@ dictionary() {
     esac
 }
 
-failed=0
-for seeds in "$root"/fuzz/seeds/*; do
-    name=$(basename "$seeds")
-    corpus=$build/corpus/$name
+# What a fuzzer says about itself at its end.
+stat_of() { sed -n "s/^stat::$2: *//p" "$build/$1.txt"; }
+
+# One fuzzer. The seeds are only read: what else is found goes to the corpus in the build folder.
+fuzz() {
+    local name=$1 corpus=$build/corpus/$1
     mkdir -p "$corpus"
     if "$build/fuzz/fuzz_$name" "$limit" -max_len=4096 -rss_limit_mb=2048 -timeout=20 \
         -dict="$root/fuzz/$(dictionary "$name")" -artifact_prefix="$build/failed/$name-" \
-        -print_final_stats=1 "$corpus" "$seeds" >"$build/$name.txt" 2>&1; then
-        echo "fuzz $name: $(sed -n 's/^stat::number_of_executed_units: *//p' "$build/$name.txt") inputs, no failure"
+        -print_final_stats=1 "$corpus" "$root/fuzz/seeds/$name" >"$build/$name.txt" 2>&1; then
+        echo "fuzz $name: $(stat_of "$name" number_of_executed_units) inputs," \
+            "$(stat_of "$name" peak_rss_mb) MB at most, no failure"
     else
-        failed=1
-        tail -n 40 "$build/$name.txt"
+        tail -n 60 "$build/$name.txt"
         echo "fuzz $name: FAILED"
+        return 1
     fi
-done
-exit "$failed"
+}
+export root build
+export -f fuzz dictionary stat_of
+
+# Files that fuzzers work on lie in memory if possible, and nothing stays behind of one that fell.
+mkdir -p "$build/failed"
+memory=/dev/shm
+[ -w "$memory" ] || memory=$build
+TMPDIR=$(mktemp -d "$memory/fuzz.XXXXXX")
+export TMPDIR
+trap 'rm -rf "$TMPDIR"' EXIT
+
+export LC_ALL=C.UTF-8 QT_QPA_PLATFORM=offscreen
+# The toolkit keeps some of its own for the life of the program.
+export ASAN_OPTIONS=detect_leaks=1
+export LSAN_OPTIONS=suppressions=$root/tests/support/toolkit-leaks.supp:print_suppressions=0
+
+# shellcheck disable=SC2016  # the name is the shell's that xargs starts
+printf '%s\0' "${names[@]}" |
+    xargs -0 -n 1 -P "$(getconf _NPROCESSORS_ONLN)" bash -c 'fuzz "$0"'
