@@ -27,3 +27,10 @@ if(VELOCOR_SANITIZE)
         add_compile_options(-fno-sanitize-recover=undefined)
     endif()
 endif()
+
+# Every object of a program has to agree on how its counts are kept, the tests' own included. Each
+# process adds its counts to those before it, and several may end at the same time.
+if(VELOCOR_COVERAGE)
+    add_compile_options(--coverage -fprofile-update=atomic)
+    add_link_options(--coverage)
+endif()
