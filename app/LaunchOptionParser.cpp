@@ -107,6 +107,7 @@ bool LaunchOptionParser::ReadDataFile(QString const& path)
     return content.isEmpty() || ParseOptions(content);
 }
 
+// cppcheck-suppress constParameter ; the interface stands
 bool LaunchOptionParser::ParseOptions(QString& text)
 {
     QByteArray xml = text.toLocal8Bit();

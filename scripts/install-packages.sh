@@ -12,6 +12,7 @@
 #     scripts/install-packages.sh build fuzz     and the compiler with the fuzzing runtime
 #     scripts/install-packages.sh build lint     and the format and lint checks
 #     scripts/install-packages.sh build package  and what ./package validates and packs with
+#     scripts/install-packages.sh build check    and what else ./check looks with
 set -euo pipefail
 
 say() { echo "install-packages: $*" >&2; }
@@ -32,6 +33,7 @@ packages_of() {
         ;;
     */fuzz) echo clang-14 libclang-rt-14-dev ;;
     */package) echo dpkg-dev desktop-file-utils appstream man-db ;;
+    */check) echo clazy cppcheck gcovr valgrind python3 ;;
     */lint) echo git clang-format-14 clang-tidy-14 shellcheck ;;
     *)
         say "no group is called '$1'"

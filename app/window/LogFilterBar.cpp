@@ -43,7 +43,7 @@ LogFilterBar::LogFilterBar(QWidget* parent)
     row->addWidget(m_expression);
     row->addSpacing(8);
     addSeverities();
-    for (QToolButton* button : m_severities)
+    for (QToolButton* button : qAsConst(m_severities))
         row->addWidget(button);
 
     auto* layout = new QVBoxLayout(this);
@@ -112,7 +112,7 @@ void LogFilterBar::FocusText()
 void LogFilterBar::Clear()
 {
     m_text->clear();
-    for (QToolButton* button : m_severities)
+    for (QToolButton* button : qAsConst(m_severities))
         button->setChecked(true);
     apply();
 }

@@ -31,7 +31,8 @@ LogSettingsDialog::LogSettingsDialog(QWidget* parent)
     for (QLineEdit* field : {m_elapsedPrefix, m_dateFormat, m_filePrefix})
         connect(field, &QLineEdit::textChanged, this, &LogSettingsDialog::check);
     connect(m_elapsed, &QCheckBox::toggled, this, &LogSettingsDialog::check);
-    for (QAbstractButton* button : m_buttons->buttons())
+    const QList<QAbstractButton*> buttons = m_buttons->buttons();
+    for (QAbstractButton* button : buttons)
         button->setIcon(QIcon());
     connect(m_buttons, &QDialogButtonBox::accepted, this, &LogSettingsDialog::accept);
     connect(m_buttons, &QDialogButtonBox::rejected, this, &LogSettingsDialog::reject);

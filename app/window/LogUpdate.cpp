@@ -28,6 +28,7 @@ void LogUpdate::Compare(LogRows const& before)
     while (front < shorter && SameRow(before, front, after, front))
         ++front;
     size_t back = 0;
+    // cppcheck-suppress knownConditionTrueFalse ; the loop above may stop before `shorter`
     while (back < shorter - front &&
            SameRow(before, before.earlier - 1 - back, after, after.earlier - 1 - back))
         ++back;

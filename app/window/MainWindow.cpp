@@ -329,7 +329,7 @@ void MainWindow::updateState()
 {
     LogPanel const* log = m_tabs->currentLog();
     SettingsEditor const* editor = m_tabs->currentEditor();
-    for (QAction* action : m_logActions)
+    for (QAction* action : qAsConst(m_logActions))
         action->setEnabled(log != nullptr);
     m_save->setEnabled(editor && editor->isModified());
     m_close->setEnabled(m_tabs->currentWidget() != m_tabs->ownLog());

@@ -92,7 +92,7 @@ void PlacesPanel::addValue(QString const& caption, QString const& text, bool isP
 
 void PlacesPanel::AddButtons()
 {
-    for (Row const& row : m_rows) {
+    for (Row const& row : qAsConst(m_rows)) {
         QToolButton* open = nullptr;
         if (row.isPlace) {
             open = MakeButton(tr("Open"), tr("Open: %1").arg(row.caption),

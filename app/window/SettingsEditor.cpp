@@ -81,7 +81,7 @@ QWidget* SettingsEditor::makeTreePage()
     connect(m_addValue, &QPushButton::clicked, this, &SettingsEditor::addValue);
     connect(m_remove, &QPushButton::clicked, this, &SettingsEditor::remove);
     connect(m_save, &QPushButton::clicked, this, &SettingsEditor::Save);
-    connect(m_tree, &QTreeWidget::currentItemChanged, this, [this](QTreeWidgetItem* current) {
+    connect(m_tree, &QTreeWidget::currentItemChanged, this, [this](QTreeWidgetItem const* current) {
         m_addValue->setEnabled(current != nullptr);
         m_remove->setEnabled(current != nullptr);
     });

@@ -73,7 +73,7 @@ QStringList SettingsFileWriter::Losses(SettingsDocument const& document)
     if (!folder.isValid() || !SaveUnchecked(path, harmless).isEmpty())
         return losses;
     const SettingsDocument readBack = SettingsFileReader::Read(path);
-    for (SettingsDocument::Section const& section : harmless.sections) {
+    for (SettingsDocument::Section const& section : qAsConst(harmless.sections)) {
         for (SettingsDocument::Item const& item : section.items) {
             if (readBack.Value(section.name, item.key, QString()) != item.value)
                 losses.append(QObject::tr("%1: the value would read differently afterwards")

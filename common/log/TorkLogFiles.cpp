@@ -45,7 +45,7 @@ int logFileNumber(QString const& fileName)
         return -1;
 
     bool converted = false;
-    const int number = fileName.mid(dot + 1).toInt(&converted);
+    const int number = fileName.midRef(dot + 1).toInt(&converted);
     return converted ? number : -1;
 }
 
@@ -93,7 +93,9 @@ QString& TorkLog::newLogFileName()
 {
     TorkLogLock lock(m_mutex);
     const QString name = currentFilePath();
-    if (m_logFileName != name) // left alone where a reader of the buffer would see no change
+    // Left alone where a reader of the buffer would see no change.
+    // cppcheck-suppress duplicateConditionalAssign ; an assignment would take the buffer away
+    if (m_logFileName != name)
         m_logFileName = name;
     return m_logFileName;
 }

