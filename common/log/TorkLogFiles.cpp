@@ -18,6 +18,7 @@
 
 #include <QDir>
 #include <QMap>
+#include <QTemporaryFile>
 #include <QTextStream>
 
 #ifdef Q_OS_UNIX
@@ -64,6 +65,37 @@ QStringList NumberedFiles(QString const& directory, QString const& name)
             numbered.append(file);
     }
     return numbered;
+}
+
+bool HasReachedTheDisk(QFileDevice& file)
+{
+    if (!file.flush())
+        return false;
+#ifdef Q_OS_UNIX
+    ::fsync(file.handle()); // some file systems cannot; the copy is good all the same
+#endif
+    return true;
+}
+
+// Makes `to`, which must not exist, whole or not at all. Where the directory takes no new file,
+// QFile::copy() would put the text into the system's temporary folder on the way.
+void Copy(QString const& from, QString const& to)
+{
+    QFile source(from);
+    QTemporaryFile copy(QFileInfo(to).path() + QLatin1String("/qt_temp.XXXXXX"));
+    if (QFile::exists(to) || !source.open(QIODevice::ReadOnly) || !copy.open())
+        return;
+
+    constexpr qint64 blockSize = 1 << 16;
+    QByteArray block = source.read(blockSize);
+    for (; !block.isEmpty(); block = source.read(blockSize)) {
+        if (copy.write(block) != block.size())
+            return;
+    }
+    const bool isWhole = source.error() == QFileDevice::NoError && HasReachedTheDisk(copy);
+    copy.setPermissions(source.permissions());
+    if (isWhole && copy.rename(to))
+        copy.setAutoRemove(false);
 }
 
 } // namespace
@@ -239,7 +271,7 @@ void TorkLog::deleteOldFiles()
     shiftOldFiles(directory);
 
     const QString current = currentFilePath();
-    QFile::copy(current, current + QLatin1String(".1"));
+    Copy(current, current + QLatin1String(".1"));
     QFile::remove(current);
 }
 

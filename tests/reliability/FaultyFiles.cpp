@@ -37,6 +37,7 @@ bool s_lasts;
 int s_error;
 qint64 s_room;
 bool s_reached;
+bool s_strayed;
 char const* s_call = "";
 char s_path[PATH_MAX];
 
@@ -131,6 +132,12 @@ ssize_t Allowed(char const* call, int descriptor, size_t length)
     return static_cast<ssize_t>(length);
 }
 
+void NoteStray(char const* path, int flags)
+{
+    if (s_fault != Fault::None && !Concerns(path) && (flags & O_ACCMODE) != O_RDONLY)
+        s_strayed = true;
+}
+
 mode_t ModeOf(int flags, va_list arguments)
 {
     const bool creates = (flags & O_CREAT) || (flags & O_TMPFILE) == O_TMPFILE;
@@ -144,6 +151,7 @@ void Start(Fault fault, int step, bool lasts, int error)
     s_error = error;
     s_count = 0;
     s_reached = false;
+    s_strayed = false;
     s_call = "";
     s_path[0] = '\0';
     s_fault = fault;
@@ -188,6 +196,11 @@ bool FaultyFiles::reached() const
     return s_reached;
 }
 
+bool FaultyFiles::strayed() const
+{
+    return s_strayed;
+}
+
 QString FaultyFiles::call() const
 {
     return QString::fromLatin1(s_call);
@@ -207,6 +220,7 @@ int open(char const* path, int flags, ...)
     va_start(arguments, flags);
     const mode_t mode = ModeOf(flags, arguments);
     va_end(arguments);
+    NoteStray(path, flags);
     if (Fails("open", path))
         return -1;
     const int descriptor = original(path, flags, mode);
@@ -221,6 +235,7 @@ int open64(char const* path, int flags, ...)
     va_start(arguments, flags);
     const mode_t mode = ModeOf(flags, arguments);
     va_end(arguments);
+    NoteStray(path, flags);
     if (Fails("open", path))
         return -1;
     const int descriptor = original(path, flags, mode);

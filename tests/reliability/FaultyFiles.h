@@ -45,6 +45,9 @@ public:
     /// Whether the fault came about.
     bool reached() const;
 
+    /// Whether a file outside the folder was opened for writing meanwhile.
+    bool strayed() const;
+
     /// The first call that failed: its name in the C library, and the path it was about.
     QString call() const;
     QString path() const;

@@ -75,7 +75,8 @@ public:
 
     bool othersAreUntouched() const
     {
-        return TestFiles::read(folder.logs() + "app.log.old") == "not numbered\n" &&
+        return !files.strayed() &&
+               TestFiles::read(folder.logs() + "app.log.old") == "not numbered\n" &&
                TestFiles::read(folder.logs() + "application.log.1") == "of another log\n" &&
                TestFiles::read(folder.root() + "notes.txt") == "of the user\n";
     }

@@ -1,0 +1,248 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// A library to be loaded in front of an unchanged program (LD_PRELOAD): it notes every file that
+// the program opens for writing, makes, moves or removes, and every program that it starts.
+//
+//     FILE_RECORDER  the file to note it in, a line "CALL PATH" each
+
+#include <cerrno>
+#include <climits>
+#include <cstdarg>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <dlfcn.h>
+#include <fcntl.h>
+#include <spawn.h>
+#include <sys/stat.h>
+#include <sys/syscall.h>
+#include <unistd.h>
+
+namespace {
+
+template <class Function>
+Function Original(Function, char const* name)
+{
+    void* found = dlsym(RTLD_NEXT, name);
+    if (!found)
+        std::abort();
+    return reinterpret_cast<Function>(found);
+}
+
+#define ORIGINAL(name) static const auto original = Original(&::name, #name)
+
+void Note(char const* call, char const* path)
+{
+    char const* report = std::getenv("FILE_RECORDER");
+    if (!report)
+        return;
+
+    const int kept = errno;
+    char folder[PATH_MAX] = "";
+    if (path[0] != '/' && getcwd(folder, sizeof folder - 1))
+        std::strcat(folder, "/");
+    char line[2 * PATH_MAX + 32];
+    const int length = std::snprintf(line, sizeof line, "%s %s%s\n", call, folder, path);
+    // By the bare system calls, which nobody listens to.
+    const long file = syscall(SYS_openat, AT_FDCWD, report, O_WRONLY | O_APPEND | O_CREAT, 0666);
+    if (file >= 0) {
+        syscall(SYS_write, file, line, length);
+        syscall(SYS_close, file);
+    }
+    errno = kept;
+}
+
+void NoteIfWriting(char const* path, int flags)
+{
+    if ((flags & O_ACCMODE) != O_RDONLY || (flags & (O_CREAT | O_TRUNC)))
+        Note("open", path);
+}
+
+void NoteIfWriting(char const* path, char const* mode)
+{
+    if (std::strpbrk(mode, "wa+"))
+        Note("open", path);
+}
+
+mode_t ModeOf(int flags, va_list arguments)
+{
+    const bool creates = (flags & O_CREAT) || (flags & O_TMPFILE) == O_TMPFILE;
+    return creates ? va_arg(arguments, mode_t) : 0;
+}
+
+} // namespace
+
+extern "C" {
+
+#define RECORD_OPEN(name)                                                                          \
+    int name(char const* path, int flags, ...)                                                     \
+    {                                                                                              \
+        ORIGINAL(name);                                                                            \
+        va_list arguments;                                                                         \
+        va_start(arguments, flags);                                                                \
+        const mode_t mode = ModeOf(flags, arguments);                                              \
+        va_end(arguments);                                                                         \
+        NoteIfWriting(path, flags);                                                                \
+        return original(path, flags, mode);                                                        \
+    }
+
+RECORD_OPEN(open)
+RECORD_OPEN(open64)
+
+#define RECORD_OPENAT(name)                                                                        \
+    int name(int folder, char const* path, int flags, ...)                                         \
+    {                                                                                              \
+        ORIGINAL(name);                                                                            \
+        va_list arguments;                                                                         \
+        va_start(arguments, flags);                                                                \
+        const mode_t mode = ModeOf(flags, arguments);                                              \
+        va_end(arguments);                                                                         \
+        NoteIfWriting(path, flags);                                                                \
+        return original(folder, path, flags, mode);                                                \
+    }
+
+RECORD_OPENAT(openat)
+RECORD_OPENAT(openat64)
+
+int creat(char const* path, mode_t mode)
+{
+    ORIGINAL(creat);
+    Note("open", path);
+    return original(path, mode);
+}
+
+FILE* fopen(char const* path, char const* mode)
+{
+    ORIGINAL(fopen);
+    NoteIfWriting(path, mode);
+    return original(path, mode);
+}
+
+FILE* fopen64(char const* path, char const* mode)
+{
+    ORIGINAL(fopen64);
+    NoteIfWriting(path, mode);
+    return original(path, mode);
+}
+
+int mkdir(char const* path, mode_t mode) noexcept
+{
+    ORIGINAL(mkdir);
+    Note("mkdir", path);
+    return original(path, mode);
+}
+
+int rename(char const* from, char const* to) noexcept
+{
+    ORIGINAL(rename);
+    Note("rename", from);
+    Note("rename", to);
+    return original(from, to);
+}
+
+int renameat2(int fromFolder, char const* from, int toFolder, char const* to,
+              unsigned flags) noexcept
+{
+    ORIGINAL(renameat2);
+    Note("rename", from);
+    Note("rename", to);
+    return original(fromFolder, from, toFolder, to, flags);
+}
+
+int link(char const* from, char const* to) noexcept
+{
+    ORIGINAL(link);
+    Note("link", to);
+    return original(from, to);
+}
+
+int linkat(int fromFolder, char const* from, int toFolder, char const* to, int flags) noexcept
+{
+    ORIGINAL(linkat);
+    Note("link", to);
+    return original(fromFolder, from, toFolder, to, flags);
+}
+
+int symlink(char const* target, char const* path) noexcept
+{
+    ORIGINAL(symlink);
+    Note("link", path);
+    return original(target, path);
+}
+
+int unlink(char const* path) noexcept
+{
+    ORIGINAL(unlink);
+    Note("remove", path);
+    return original(path);
+}
+
+int rmdir(char const* path) noexcept
+{
+    ORIGINAL(rmdir);
+    Note("remove", path);
+    return original(path);
+}
+
+int chmod(char const* path, mode_t mode) noexcept
+{
+    ORIGINAL(chmod);
+    Note("chmod", path);
+    return original(path, mode);
+}
+
+int execve(char const* path, char* const arguments[], char* const environment[]) noexcept
+{
+    ORIGINAL(execve);
+    Note("start", path);
+    return original(path, arguments, environment);
+}
+
+int execv(char const* path, char* const arguments[]) noexcept
+{
+    ORIGINAL(execv);
+    Note("start", path);
+    return original(path, arguments);
+}
+
+int execvp(char const* file, char* const arguments[]) noexcept
+{
+    ORIGINAL(execvp);
+    Note("start", file);
+    return original(file, arguments);
+}
+
+int posix_spawn(pid_t* process, char const* path, posix_spawn_file_actions_t const* actions,
+                posix_spawnattr_t const* attributes, char* const arguments[],
+                char* const environment[])
+{
+    ORIGINAL(posix_spawn);
+    Note("start", path);
+    return original(process, path, actions, attributes, arguments, environment);
+}
+
+int posix_spawnp(pid_t* process, char const* file, posix_spawn_file_actions_t const* actions,
+                 posix_spawnattr_t const* attributes, char* const arguments[],
+                 char* const environment[])
+{
+    ORIGINAL(posix_spawnp);
+    Note("start", file);
+    return original(process, file, actions, attributes, arguments, environment);
+}
+
+int system(char const* command)
+{
+    ORIGINAL(system);
+    Note("shell", command ? command : "");
+    return original(command);
+}
+
+FILE* popen(char const* command, char const* mode)
+{
+    ORIGINAL(popen);
+    Note("shell", command);
+    return original(command, mode);
+}
+
+} // extern "C"
