@@ -108,6 +108,16 @@ Files filesIn(QString const& logs)
     return files;
 }
 
+// Whether no other file is left in the log directory. A copy that was cut short has no name yet;
+// only where the file system knows no such files is it called qt_temp.
+bool holdsOnlyTheLog(QString const& logs)
+{
+    const QStringList names = QDir(logs).entryList(QDir::Files | QDir::Hidden);
+    return std::all_of(names.begin(), names.end(), [](QString const& name) {
+        return name == "app.log" || name.startsWith("app.log.") || name.startsWith("qt_temp.");
+    });
+}
+
 // Runs one victim and kills it.
 class Victims
 {
@@ -297,6 +307,7 @@ void tst_SuddenDeath::killed()
         QVERIFY(victims.runAndKill(run, entriesBetween));
         const Files after = filesIn(folder.logs());
         const QByteArray left = TestFiles::read(configurationFile);
+        QVERIFY(holdsOnlyTheLog(folder.logs()));
         Victim::Report const& report = *victims.report;
 
         const QString wrong =
