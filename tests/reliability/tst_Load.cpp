@@ -247,7 +247,8 @@ void writeFor(TorkLog& log, TorkConfigFile& configuration, int entries)
 
 } // namespace
 
-// The first entries are not counted: with them come the buffers that stay.
+// The first entries are not counted: with them come the buffers that stay. These may still grow a
+// little, but not with the number of entries.
 void tst_Load::aDayLeaksNothing()
 {
     if (heapInUse() < 0)
@@ -262,7 +263,7 @@ void tst_Load::aDayLeaksNothing()
     const qint64 start = heapInUse();
     writeFor(*log, configuration, entries);
     const qint64 end = heapInUse();
-    QVERIFY2(end <= start + 1024, qPrintable(QString("%1, then %2").arg(start).arg(end)));
+    QVERIFY2(end <= start + 4096, qPrintable(QString("%1, then %2").arg(start).arg(end)));
     Figures::print(QString("memory: %1 entries in a row, %2 bytes of the heap in use before, %3 "
                            "after")
                        .arg(entries)
