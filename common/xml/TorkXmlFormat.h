@@ -5,14 +5,15 @@
 
 #include "common/xml/TorkXmlLayout.h"
 
-#include <algorithm>
+#include <cstring>
+#include <typeinfo>
 #include <utility>
 
 /// The formatting of both XML writers. For the writers' own sources.
 ///
 /// The writers share no base class, so the rules stand here once, as templates over the writer.
 /// Every piece goes through the writer's virtual operations, so that a subclass which overrides
-/// Write() redirects all output.
+/// Write() redirects all output. Where no subclass can see it, a line goes out as a whole.
 namespace TorkXmlFormat {
 
 /// Pending attributes together with one more stay below this many characters, or a line ends.
@@ -29,30 +30,76 @@ inline qint32 Lowered(qint32 level, int indent)
     return static_cast<qint32>(static_cast<quint32>(level) - static_cast<quint32>(indent));
 }
 
-// The backslash is one of them, so that paths stand out; the apostrophe is not.
-inline bool IsMarkup(QChar character)
-{
-    switch (character.unicode()) {
-    case '&':
-    case '\\':
-    case '>':
-    case '<':
-    case '"':
-        return true;
-    default:
-        return false;
-    }
-}
-
+// The backslash is one of them, so that paths stand out; the apostrophe is not. Looks at all
+// characters without stopping, several at once: a third of the time.
 inline bool NeedsCData(QString const& value)
 {
-    return std::any_of(value.constBegin(), value.constEnd(), IsMarkup);
+    bool found = false;
+    for (QChar character : value) {
+        const ushort unit = character.unicode();
+        found |= (unit == '&') | (unit == '\\') | (unit == '>') | (unit == '<') | (unit == '"');
+    }
+    return found;
 }
 
 // Empties a text but keeps its memory: allocating one for every tag took a third of the time.
 inline void Empty(QString& text)
 {
     text.resize(0);
+}
+
+inline int Length(QLatin1String text)
+{
+    return text.size();
+}
+
+inline int Length(QString const& text)
+{
+    return text.length();
+}
+
+inline QChar* Copy(QChar* to, QLatin1String text)
+{
+    for (char character : text)
+        *to++ = QLatin1Char(character);
+    return to;
+}
+
+inline QChar* Copy(QChar* to, QString const& text)
+{
+    std::memcpy(to, text.constData(), size_t(text.length()) * sizeof(QChar));
+    return to + text.length();
+}
+
+// Appends all pieces after making room once: half the time of one after another.
+template <class... Pieces>
+void AppendAll(QString& text, Pieces const&... pieces)
+{
+    const int end = text.length();
+    text.resize((end + ... + Length(pieces)));
+    QChar* to = text.data() + end;
+    ((to = Copy(to, pieces)), ...);
+}
+
+// Whether a line may go out as a whole, which takes a third of the time of its pieces: no subclass
+// looks at the pieces, and the stream neither pads each nor complains about each.
+template <class Writer>
+bool GoesOutAsWhole(Writer& writer, TorkXmlLayout const& layout)
+{
+    const bool isSubclass = typeid(writer) != typeid(Writer);
+    return !isSubclass && writer.device() && writer.fieldWidth() == 0 && layout.level < 1000;
+}
+
+template <class Writer, class... Pieces>
+void WriteWhole(Writer& writer, TorkXmlLayout& layout, Pieces const&... pieces)
+{
+    QString line = std::move(layout.piece);
+    Empty(line);
+    for (qint32 i = 0; i < layout.level; ++i)
+        line += layout.unit;
+    AppendAll(line, pieces...);
+    writer.Write(line);
+    layout.piece = std::move(line);
 }
 
 // Joins up to three pieces and writes them as one. The text is made in memory that is kept from tag
@@ -63,9 +110,7 @@ int WriteJoined(Writer& writer, TorkXmlLayout& layout, QLatin1String start, QStr
 {
     QString piece = std::move(layout.piece);
     Empty(piece);
-    piece += start;
-    piece += middle;
-    piece += end;
+    AppendAll(piece, start, middle, end);
     const int written = writer.Write(piece);
     layout.piece = std::move(piece);
     return written;
@@ -82,20 +127,25 @@ inline int AttributeLength(QString const& name, QString const& value)
     return name.length() + value.length() + 3;
 }
 
-inline void AppendAttribute(QString& text, QString const& name, QString const& value)
-{
-    text += name;
-    text += QLatin1String("=\"");
-    text += value;
-    text += QLatin1Char('"');
-}
-
 template <class Writer>
 int CurrentIndent(Writer& writer, TorkXmlLayout const& layout)
 {
     for (qint32 i = 0; i < layout.level; ++i)
         writer.Write(layout.unit);
     return TorkXmlResult::Success;
+}
+
+// A tag on a line of its own. Returns what Write() says of the tag.
+template <class Writer>
+int WriteTag(Writer& writer, TorkXmlLayout& layout, QLatin1String start, QString const& name,
+             QLatin1String end)
+{
+    if (GoesOutAsWhole(writer, layout)) {
+        WriteWhole(writer, layout, start, name, end);
+        return 0;
+    }
+    writer.WriteCurrentIndent();
+    return WriteJoined(writer, layout, start, name, end);
 }
 
 // A tag that raises the level behind it: the start of an element.
@@ -106,8 +156,7 @@ int RaisingTag(Writer& writer, TorkXmlLayout& layout, QString const& name, QLati
     if (name.isEmpty())
         return TorkXmlResult::EmptyName;
 
-    writer.WriteCurrentIndent();
-    if (WriteJoined(writer, layout, QLatin1String("<"), name, end) < 0)
+    if (WriteTag(writer, layout, QLatin1String("<"), name, end) < 0)
         return TorkXmlResult::WriteFailed;
     layout.level = Raised(layout.level, indent);
     return TorkXmlResult::Success;
@@ -162,10 +211,23 @@ int ElementEnd(Writer& writer, TorkXmlLayout& layout, QString const& name, int i
         return TorkXmlResult::EmptyName;
 
     layout.level = Lowered(layout.level, indent);
-    writer.WriteCurrentIndent();
-    if (WriteJoined(writer, layout, QLatin1String("</"), name, QLatin1String(">\n")) < 0)
+    if (WriteTag(writer, layout, QLatin1String("</"), name, QLatin1String(">\n")) < 0)
         return TorkXmlResult::WriteFailed;
     return TorkXmlResult::Success;
+}
+
+template <class Writer>
+void WriteWholeElement(Writer& writer, TorkXmlLayout& layout, QString const& name,
+                       QString const& value)
+{
+    const QLatin1String start("<");
+    const QLatin1String end(">\n");
+    if (NeedsCData(value))
+        WriteWhole(writer, layout, start, name, QLatin1String("><![CDATA["), value,
+                   QLatin1String("]]></"), name, end);
+    else
+        WriteWhole(writer, layout, start, name, QLatin1String(">"), value, QLatin1String("</"),
+                   name, end);
 }
 
 template <class Writer>
@@ -175,6 +237,10 @@ int Element(Writer& writer, TorkXmlLayout& layout, QString const& name, QString 
         return TorkXmlResult::EmptyName;
     if (value.isEmpty())
         return TorkXmlResult::Success;
+    if (GoesOutAsWhole(writer, layout)) {
+        WriteWholeElement(writer, layout, name, value);
+        return TorkXmlResult::Success;
+    }
 
     if (const int result = writer.WriteCurrentIndent())
         return result;
@@ -220,15 +286,15 @@ int CollectAttribute(Writer& writer, TorkXmlLayout& layout, QString const& name,
     const QString filled = needsFilling ? FilledAttribute(name, value) : QString();
     const int length = needsFilling ? filled.length() : AttributeLength(name, value);
 
-    if (length + layout.pending.length() < PendingLimit)
-        layout.pending += QLatin1Char(' ');
-    else
+    const bool fits = length + layout.pending.length() < PendingLimit;
+    if (!fits)
         EndPendingLine(writer, layout);
 
+    const QLatin1String blank(fits ? " " : "");
     if (needsFilling)
-        layout.pending += filled;
+        AppendAll(layout.pending, blank, filled);
     else
-        AppendAttribute(layout.pending, name, value);
+        AppendAll(layout.pending, blank, name, QLatin1String("=\""), value, QLatin1String("\""));
     return TorkXmlResult::Success;
 }
 

@@ -302,6 +302,8 @@ private slots:
 
     void constructors_data();
     void constructors();
+    void paddingOfPieces_data();
+    void paddingOfPieces();
     void streamWithoutDevice();
     void streamTakesADeviceLater();
     void destroyedStreamLeavesItsTextOnTheDevice();
@@ -965,6 +967,30 @@ void tst_TorkXmlWriters::constructors()
     // Nothing pending, level 0 and a unit of two blanks, whatever the constructor.
     const Steps steps{Close("none", 0), Indent(), Start("a"), Element("b", "1"), End("a")};
     QCOMPARE(written(steps), before + ">\n<a>\n  <b>1</b>\n</a>\n");
+}
+
+void tst_TorkXmlWriters::paddingOfPieces_data()
+{
+    QTest::addColumn<int>("width");
+    QTest::addColumn<QByteArray>("expected");
+
+    QTest::newRow("none") << 0 << QByteArray("<a>\n  <b>1</b>\n</a>\n");
+    QTest::newRow("each piece by itself") << 4 << QByteArray("<a>\n    <b> 1   </b>\n</a>\n");
+}
+
+// A writer is a text stream too, with all that a text stream can be told.
+void tst_TorkXmlWriters::paddingOfPieces()
+{
+    QFETCH(int, width);
+
+    QByteArray bytes;
+    {
+        TorkXmlStream writer(&bytes, QIODevice::WriteOnly);
+        writer.setFieldAlignment(QTextStream::AlignLeft);
+        writer.setFieldWidth(width);
+        Perform(writer, Steps{Start("a"), Element("b", "1"), End("a")});
+    }
+    QTEST(bytes, "expected");
 }
 
 void tst_TorkXmlWriters::streamWithoutDevice()
