@@ -9,6 +9,7 @@
 #include <QMutex>
 #include <QObject>
 #include <QString>
+#include <QVarLengthArray>
 #include <QtGlobal>
 
 #include <atomic>
@@ -182,6 +183,8 @@ private:
     bool openFile(QString const& fileName);
     bool closeFile();
     QFile* locate(int length);
+    bool mayWriteDirectly() const;
+    void useFileObject();
     qint64 openFileSize();
     bool fits(qint64 size, int length) const;
     void trimOpenFile(int length);
@@ -189,8 +192,10 @@ private:
     void pruneOldFiles(QString const& directory, qint64 highest) const;
 
     static qint64 wallClock();
-    QString entry(qint64 now, int severity, QString const& message) const;
-    QString stamp(qint64 now) const;
+    void writeEntry(qint64 now, int severity, QString const& message);
+    void writeLine(ushort const* line, int length);
+    void writeToFile(char const* bytes, int length);
+    void appendStamp(QVarLengthArray<ushort, 512>& line, qint64 now) const;
     QString elapsedTime(qint64 now) const;
     void echo(QString const& line) const;
 
@@ -232,8 +237,11 @@ private:
     int m_writing = 0;
     mutable QMutex m_mutex; // the files, and the texts that writing an entry reads
 
-    // Whether the file's buffer is empty, so that the toolkit's position is the system's too.
-    bool m_flushed = true;
+    // Whether entries go straight to the system, at m_position, where the file object then is not:
+    // not after somebody else was given it, nor while a failed write left text in its buffer.
+    bool m_direct = false;
+    bool m_handedOut = false;
+    qint64 m_position = 0;
 
     // Changes with every change of the date format, so that stamps kept for reuse can be told
     // stale.

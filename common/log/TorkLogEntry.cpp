@@ -6,71 +6,25 @@
 #include "common/log/TorkLog.h"
 
 #include "common/log/TorkLogLock.h"
+#include "common/log/TorkLogStamp.h"
 
 #include <QDebug>
 #include <QMessageLogger>
 
 #include <algorithm>
-#include <ctime>
-#include <type_traits>
+
+#ifdef Q_OS_UNIX
+#include <unistd.h>
+#endif
 
 TorkLog* TorkLog::m_gLog = nullptr;
 
 namespace {
 
-// What this thread found out last about the local time and wrote as a time stamp. Entries come many
-// to a millisecond, and asking for the local time costs more than all the rest of an entry. Free
-// of constructors and destructors, so that entries may still be written while the program's static
-// objects are destroyed.
-struct KeptTime
-{
-    qint64 minute;
-    long zone;
-    qint64 offset;
-
-    quint64 formatGeneration;
-    qint64 stampTime;
-    int stampLength;
-    ushort stamp[64];
-};
-static_assert(std::is_trivial<KeptTime>::value, "outlives all destructors");
-thread_local KeptTime t_kept;
-
-// Changes where the program is moved to another time zone.
-long Zone()
-{
-#ifdef __GLIBC__
-    return ::timezone;
-#else
-    return 0;
-#endif
-}
-
-// The wall clock's time as milliseconds since an epoch of its own. The distance from UTC holds for
-// the whole minute: no time zone changes its clocks within one.
-qint64 WallClock(qint64 now)
-{
-    const qint64 minute = now / 60000;
-    if (t_kept.minute != minute || t_kept.zone != Zone()) {
-        t_kept.offset = QDateTime::fromMSecsSinceEpoch(now).offsetFromUtc() * qint64(1000);
-        t_kept.minute = minute;
-        t_kept.zone = Zone();
-    }
-    return now + t_kept.offset;
-}
-
 // Milliseconds since midnight.
 int TimeOfDay(qint64 wallClock)
 {
     return static_cast<int>(wallClock % (24 * 60 * 60 * 1000));
-}
-
-QString Stamp(qint64 now, QString const& format)
-{
-    const bool needsZone = format.contains(QLatin1Char('t'));
-    const QDateTime time = needsZone ? QDateTime::fromMSecsSinceEpoch(now)
-                                     : QDateTime::fromMSecsSinceEpoch(WallClock(now), Qt::UTC);
-    return time.toString(format);
 }
 
 QString SeverityText(int severity)
@@ -91,6 +45,38 @@ QString SeverityText(int severity)
     }
 }
 
+ushort const* Units(QString const& text)
+{
+    return reinterpret_cast<ushort const*>(text.constData());
+}
+
+void Append(TorkLogLine& line, QString const& text)
+{
+    line.append(Units(text), text.length());
+}
+
+// As QString::toLatin1() converts, without memory of its own.
+void ToLatin1(char* bytes, ushort const* text, int length)
+{
+    std::transform(text, text + length, bytes, [](ushort character) {
+        return character > 0xff ? '?' : static_cast<char>(character);
+    });
+}
+
+// Hands bytes to the system past the file object, which would copy them into its buffer and out
+// again. Returns how many the system took.
+qint64 WriteDirectly(int file, char const* bytes, int length)
+{
+#ifdef Q_OS_UNIX
+    return std::max<qint64>(0, ::write(file, bytes, static_cast<size_t>(length)));
+#else
+    Q_UNUSED(file);
+    Q_UNUSED(bytes);
+    Q_UNUSED(length);
+    return 0;
+#endif
+}
+
 } // namespace
 
 QString& TorkLog::severityName(EventSeverity severity)
@@ -101,32 +87,69 @@ QString& TorkLog::severityName(EventSeverity severity)
 
 qint64 TorkLog::wallClock()
 {
-    return WallClock(QDateTime::currentMSecsSinceEpoch());
+    return TorkLogStamp::wallClock(QDateTime::currentMSecsSinceEpoch());
 }
 
 void TorkLog::write(int severity, QString const& message)
 {
     const qint64 now = QDateTime::currentMSecsSinceEpoch();
     if (m_enabled)
-        write(entry(now, severity, message));
-    m_lastEntryTime = WallClock(now);
+        writeEntry(now, severity, message);
+    m_lastEntryTime = TorkLogStamp::wallClock(now);
+}
+
+void TorkLog::writeEntry(qint64 now, int severity, QString const& message)
+{
+    const ushort blank = ' ';
+    TorkLogLine line;
+    appendStamp(line, now);
+    line.append(blank);
+    Append(line, SeverityText(severity));
+    line.append(blank);
+    if (m_logElapsedTime) {
+        Append(line, elapsedTime(now));
+        line.append(blank);
+    }
+    Append(line, message);
+    line.append('\n');
+    writeLine(line.constData(), line.length());
 }
 
 void TorkLog::write(QString const& line)
 {
-    if (!m_enabled)
-        return;
+    if (m_enabled)
+        writeLine(Units(line), line.length());
+}
 
-    const QByteArray bytes = line.toLatin1();
+void TorkLog::writeLine(ushort const* line, int length)
+{
+    QVarLengthArray<char, 512> bytes(length);
+    ToLatin1(bytes.data(), line, length);
+
     TorkLogLock lock(m_mutex);
     m_writing = 1;
-    if (QFile* file = locate(line.length())) {
-        file->write(bytes);
-        m_flushed = file->flush();
+    if (locate(length)) {
+        writeToFile(bytes.constData(), length);
         if (m_logPipeToConsole)
-            echo(line);
+            echo(QString(reinterpret_cast<QChar const*>(line), length));
     }
     m_writing = 0;
+}
+
+void TorkLog::writeToFile(char const* bytes, int length)
+{
+    qint64 written = 0;
+    if (m_direct) {
+        written = WriteDirectly(m_file.handle(), bytes, length);
+        m_position += written;
+        if (written == length)
+            return;
+        m_file.seek(m_position);
+    }
+    m_file.write(bytes + written, length - written);
+    const bool flushed = m_file.flush();
+    m_direct = flushed && mayWriteDirectly();
+    m_position = m_file.pos();
 }
 
 // The lock is held, so that the handler passes the line on to the toolkit's default output.
@@ -138,27 +161,10 @@ void TorkLog::echo(QString const& line) const
     QMessageLogger(nullptr, 0, nullptr).debug() << line;
 }
 
-QString TorkLog::entry(qint64 now, int severity, QString const& message) const
+void TorkLog::appendStamp(TorkLogLine& line, qint64 now) const
 {
-    const QLatin1Char blank(' ');
-    QString line = stamp(now);
-    line.reserve(line.length() + message.length() + 32);
-    line += blank;
-    line += SeverityText(severity);
-    line += blank;
-    if (m_logElapsedTime) {
-        line += elapsedTime(now);
-        line += blank;
-    }
-    line += message;
-    line += QLatin1Char('\n');
-    return line;
-}
-
-QString TorkLog::stamp(qint64 now) const
-{
-    if (t_kept.stampTime == now && t_kept.formatGeneration == m_formatGeneration)
-        return QString(reinterpret_cast<QChar const*>(t_kept.stamp), t_kept.stampLength);
+    if (TorkLogStamp::append(line, now, m_formatGeneration))
+        return;
 
     QString format;
     quint64 generation = 0;
@@ -167,15 +173,7 @@ QString TorkLog::stamp(qint64 now) const
         format = m_dateTimeFormat;
         generation = m_formatGeneration;
     }
-
-    const QString text = Stamp(now, format);
-    if (text.length() <= int(std::extent<decltype(t_kept.stamp)>::value)) {
-        t_kept.formatGeneration = generation;
-        t_kept.stampTime = now;
-        t_kept.stampLength = text.length();
-        std::copy_n(text.utf16(), text.length(), t_kept.stamp);
-    }
-    return text;
+    TorkLogStamp::learn(line, now, format, generation);
 }
 
 // Between times of day only: an interval across midnight comes out negative.
@@ -186,6 +184,6 @@ QString TorkLog::elapsedTime(qint64 now) const
         TorkLogLock lock(m_mutex);
         prefix = m_elapsedTimePrefix;
     }
-    const int elapsed = TimeOfDay(WallClock(now)) - TimeOfDay(m_lastEntryTime);
+    const int elapsed = TimeOfDay(TorkLogStamp::wallClock(now)) - TimeOfDay(m_lastEntryTime);
     return prefix + QLatin1Char('[') + QString::number(elapsed) + QLatin1Char(']');
 }

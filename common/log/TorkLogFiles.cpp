@@ -148,11 +148,13 @@ bool TorkLog::openFile(QString const& fileName)
 {
     closeFile();
     m_file.setFileName(fileName);
-    m_flushed = true;
     // Neither appending nor truncating: entries go over the old content from its start on.
     const bool opened = m_file.open(QIODevice::ReadWrite | QIODevice::Text);
     if (!opened)
         m_errorString = m_file.errorString();
+    m_handedOut = false;
+    m_direct = opened && mayWriteDirectly();
+    m_position = 0;
     return opened;
 }
 
@@ -188,8 +190,27 @@ void TorkLog::makeLogDirectory() const
 QFile* TorkLog::locateLogFile(QString const& text)
 {
     QFile* file = locate(text.length());
-    m_flushed = false; // whoever gets the file may leave text in its buffer
+    m_handedOut = true;
+    useFileObject();
     return file;
+}
+
+bool TorkLog::mayWriteDirectly() const
+{
+#ifdef Q_OS_UNIX
+    // A file whose status could not be told has no position for the toolkit to go back to.
+    return !m_handedOut && !m_file.isSequential();
+#else
+    return false; // there the toolkit's text mode makes other line ends
+#endif
+}
+
+// From here on the file object writes, from where the last entry ended.
+void TorkLog::useFileObject()
+{
+    if (m_direct)
+        m_file.seek(m_position);
+    m_direct = false;
 }
 
 // The size of the open file. The position of its end tells as much as its status and is found ten
@@ -197,12 +218,9 @@ QFile* TorkLog::locateLogFile(QString const& text)
 qint64 TorkLog::openFileSize()
 {
 #ifdef Q_OS_UNIX
-    // A position of 0 may be that of a file whose status could not be told when it was opened: the
-    // toolkit counts none for it, and going back there would write over what was just written.
-    const qint64 position = m_file.pos();
-    if (m_flushed && position > 0) {
+    if (m_direct) {
         const qint64 end = ::lseek(m_file.handle(), 0, SEEK_END);
-        if (end == position || (end >= 0 && ::lseek(m_file.handle(), position, SEEK_SET) >= 0))
+        if (end == m_position || (end >= 0 && ::lseek(m_file.handle(), m_position, SEEK_SET) >= 0))
             return end;
     }
 #endif
@@ -214,7 +232,7 @@ QFile* TorkLog::locate(int length)
     if (m_file.isOpen()) {
         const qint64 size = openFileSize();
         // Behind the last entry there is as a rule nothing to trim.
-        if (!fits(size, length) && m_file.pos() != size)
+        if (!fits(size, length) && (m_direct ? m_position : m_file.pos()) != size)
             trimOpenFile(length);
         return &m_file;
     }
@@ -243,6 +261,7 @@ QFile* TorkLog::locate(int length)
 // and the file grows beyond its limit; it is rotated when it is next opened.
 void TorkLog::trimOpenFile(int length)
 {
+    useFileObject();
     QTextStream stream(&m_file);
     stream.setCodec("ISO 8859-1"); // byte for byte, in any locale
     stream.setAutoDetectUnicode(false);

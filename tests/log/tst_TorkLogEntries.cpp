@@ -27,6 +27,8 @@ private slots:
     void shorthands();
     void stamp_data();
     void stamp();
+    void stampFollowsTheClock_data();
+    void stampFollowsTheClock();
     void stampFollowsTheFormat();
     void elapsedTime_data();
     void elapsedTime();
@@ -209,6 +211,52 @@ void tst_TorkLogEntries::stamp()
 
     log.trace("x");
     QCOMPARE(TestFiles::read(folder.logs() + "app.log"), expected + " Trace x\n");
+}
+
+void tst_TorkLogEntries::stampFollowsTheClock_data()
+{
+    QTest::addColumn<QString>("format");
+
+    QTest::newRow("usual") << "yyyy-MM-dd hh:mm:ss.z";
+    QTest::newRow("three digits of milliseconds") << "dd.MM.yyyy HH:mm:ss,zzz";
+    QTest::newRow("two digits of milliseconds are none") << "ss.zz";
+    QTest::newRow("without leading zeros") << "d.M.yyyy H:m:s.z";
+    QTest::newRow("without separators") << "yyyyMMddhhmmsszzz";
+    QTest::newRow("year of two digits") << "yy-MM-dd ss";
+    QTest::newRow("year of one, three and five letters") << "y yyy yyyyy ss";
+    QTest::newRow("more letters than a number has") << "MMMMM ddddd hhh mmm sss zzzz";
+    QTest::newRow("names") << "dddd, MMM d, ss";
+    QTest::newRow("half days") << "h:mm:ss.z AP";
+    QTest::newRow("half days, small letters") << "hh:ss ap";
+    QTest::newRow("zone") << "hh:mm:ss t";
+    QTest::newRow("quotes") << "hh 'h' ''ss";
+    QTest::newRow("an open quote") << "ss 'ss";
+    QTest::newRow("other letters") << "yyyy-MM-ddThh:mm:ss xyz";
+    QTest::newRow("other signs") << QString::fromUtf8("hhä%1 %d ss");
+    QTest::newRow("no moment at all") << "-";
+    QTest::newRow("as long as is kept") << QString(62, '.') + "ss";
+    QTest::newRow("longer than is kept") << QString(63, '.') + "ss";
+    QTest::newRow("longer only in words") << QString(60, '.') + "zsh";
+}
+
+// What is kept from one entry to the next says what the toolkit would say anew.
+void tst_TorkLogEntries::stampFollowsTheClock()
+{
+    QFETCH(QString, format);
+    LogFolder folder;
+    TorkLog log;
+    log.setOutputPath(folder.logs());
+    folder.configure(log, {{"dateTimeFormat", format}, {"filePrefix", "app"}});
+
+    QByteArray expected;
+    QDateTime time(QDate(2023, 9, 30), QTime(9, 59, 8, 5));
+    for (int step : {0, 1, 94, 900, 0, 9000, 40000, 1000, 60000, 3600000, -3600000, 36000000}) {
+        time = time.addMSecs(step);
+        TestClock::set(time);
+        log.trace("x");
+        expected += time.toString(format).toLatin1() + " Trace x\n";
+    }
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), expected);
 }
 
 // At one and the same moment, lest a stamp that was made for another format is used again.

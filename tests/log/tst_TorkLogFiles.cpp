@@ -42,6 +42,7 @@ private slots:
     void emptyPathIsTheWorkingDirectory();
     void locateReturnsTheCurrentFile_data();
     void locateReturnsTheCurrentFile();
+    void locateReturnsTheFileWhereEntriesEnd();
     void locateReturnsNullWithoutFile();
     void sizeLimitOnOpening_data();
     void sizeLimitOnOpening();
@@ -435,6 +436,29 @@ void tst_TorkLogFiles::locateReturnsTheCurrentFile()
     QCOMPARE(file->pos(), 0);
     QTEST(folder.listing(), "after");
     QCOMPARE(log.locateLogFile("xx"), file);
+}
+
+void tst_TorkLogFiles::locateReturnsTheFileWhereEntriesEnd()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    log.write(QStringLiteral("12\n"));
+    log.write(QStringLiteral("34\n"));
+
+    QFile* file = log.locateLogFile("x");
+    QVERIFY(file);
+    QCOMPARE(file->pos(), 6);
+    file->write("5");
+    log.write(QStringLiteral("6\n"));
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("12\n34\n56\n"));
+
+    // Whoever has it may use it again.
+    log.write(QStringLiteral("7\n"));
+    QCOMPARE(file->pos(), 11);
+    file->write("8\n");
+    log.write(QStringLiteral("9\n"));
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("12\n34\n56\n7\n8\n9\n"));
 }
 
 void tst_TorkLogFiles::locateReturnsNullWithoutFile()
