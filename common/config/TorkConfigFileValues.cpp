@@ -48,14 +48,19 @@ QDesktopWidget* Desktop()
 // toolkit's conversion costs twice as much as finding the value does.
 int ToInt(QString const& text, bool* converted)
 {
-    const bool negative = text.startsWith(QLatin1Char('-'));
-    const int digits = text.length() - (negative ? 1 : 0);
+    QChar const* const characters = text.constData();
+    const int length = text.length();
+    const bool negative = length > 0 && characters[0] == QLatin1Char('-');
+    const int digits = length - (negative ? 1 : 0);
+    if (digits > 9)
+        return text.toInt(converted);
+
     int number = 0;
-    for (int i = negative ? 1 : 0; i < text.length(); ++i) {
-        const ushort digit = text[i].unicode();
-        if (digit < '0' || digit > '9' || digits > 9)
+    for (int i = length - digits; i < length; ++i) {
+        const uint digit = characters[i].unicode() - uint('0');
+        if (digit > 9)
             return text.toInt(converted);
-        number = 10 * number + (digit - '0');
+        number = 10 * number + static_cast<int>(digit);
     }
     *converted = digits > 0;
     return negative ? -number : number;

@@ -427,6 +427,13 @@ void tst_TorkConfigFile::appendSectionKeepsBlanksInTheName()
     QString value;
     QVERIFY(!file.ReadItem("My Section", "k", none, value));
     QCOMPARE(value, QString("none"));
+
+    // Nor a key that holds one, while others are still found.
+    file.WriteItem("MySection", "k", "w");
+    file.FindSection("MySection")->AddValue("my key", "x");
+    QVERIFY(!file.ReadItem("My Section", "my key", none, value));
+    QVERIFY(file.ReadItem("My Section", " k ", none, value));
+    QCOMPARE(value, QString("w"));
 }
 
 void tst_TorkConfigFile::clearForgetsAllSections()
