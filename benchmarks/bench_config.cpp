@@ -27,6 +27,7 @@
 #include <algorithm>
 #include <functional>
 #include <random>
+#include <utility>
 #include <vector>
 
 namespace {
@@ -276,8 +277,35 @@ void LoadSettings(benchmark::State& state, Size size)
     TimeLoads(state, file, [size](QString const& name) { Contestant::load(name, size); });
 }
 
-// The file of TorkConfigFile, read by the reader that it reads with, for nobody.
-void LoadFloor(benchmark::State& state, Size size)
+// The least that a store has to do: key and text of each item in memory of their own.
+class KeepingHandler : public QXmlDefaultHandler
+{
+public:
+    bool startElement(QString const&, QString const& name, QString const&,
+                      QXmlAttributes const&) override
+    {
+        m_name = QString(name.constData(), name.length());
+        m_isFirst = true;
+        return true;
+    }
+
+    bool characters(QString const& text) override
+    {
+        if (m_isFirst)
+            m_items.emplace_back(m_name, QString(text.constData(), text.length()));
+        m_isFirst = false;
+        return true;
+    }
+
+private:
+    QString m_name;
+    bool m_isFirst = false;
+    std::vector<std::pair<QString, QString>> m_items;
+};
+
+// The file of TorkConfigFile, read by the reader that it reads with.
+template <class Handler>
+void LoadWithReader(benchmark::State& state, Size size)
 {
     const ScratchFolder folder;
     const QString file = folder.file("settings");
@@ -288,7 +316,7 @@ void LoadFloor(benchmark::State& state, Size size)
     TimeLoads(state, file, [](QString const& name) {
         QFile device(name);
         QXmlInputSource source(&device);
-        QXmlDefaultHandler handler;
+        Handler handler;
         QXmlSimpleReader reader;
         reader.setContentHandler(&handler);
         reader.setErrorHandler(&handler);
@@ -499,7 +527,9 @@ void RegisterSize(Size size)
     const int times = size.sections * size.keys > 10000 ? 1 : 20;
 
     const std::string load = "load " + size.text();
-    Register(load, "floor: SAX reader, empty handler", times, LoadFloor, size);
+    Register(load, "floor: SAX reader, empty handler", times, LoadWithReader<QXmlDefaultHandler>,
+             size);
+    Register(load, "SAX reader, texts kept", times, LoadWithReader<KeepingHandler>, size);
     Register(load, Tork::Name, times, LoadSettings<Tork>, size);
     Register(load, ToolkitSettings::Name, times, LoadSettings<ToolkitSettings>, size);
     Register(load, KdeConfig::Name, times, LoadSettings<KdeConfig>, size);

@@ -5,7 +5,9 @@
 
 #include "support/ScratchFolder.h"
 
+#include <QDateTime>
 #include <QFile>
+#include <QObject>
 
 #include <fcntl.h>
 #include <unistd.h>
@@ -32,9 +34,28 @@ public:
             Require(false, QStringLiteral("write(2) failed"));
     }
 
-private:
+protected:
     int m_file;
+
+private:
     std::string m_line;
+};
+
+// What the log's fixed behaviour asks for besides: the time, the severity's name in the language of
+// the moment, and the file's size.
+class FixedPartsEntrant : public FloorEntrant
+{
+public:
+    using FloorEntrant::FloorEntrant;
+
+    void write() override
+    {
+        const qint64 now = QDateTime::currentMSecsSinceEpoch();
+        const QString name = QObject::tr("Notification");
+        const qint64 size = ::lseek(m_file, 0, SEEK_END);
+        Require(now > 0 && !name.isEmpty() && size >= 0, QStringLiteral("a part is missing"));
+        FloorEntrant::write();
+    }
 };
 
 } // namespace
@@ -42,4 +63,9 @@ private:
 std::unique_ptr<LogEntrant> MakeFloorEntrant(QString const& folder)
 {
     return std::make_unique<FloorEntrant>(folder);
+}
+
+std::unique_ptr<LogEntrant> MakeFixedPartsEntrant(QString const& folder)
+{
+    return std::make_unique<FixedPartsEntrant>(folder);
 }

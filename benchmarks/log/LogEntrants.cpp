@@ -38,6 +38,7 @@ std::vector<LogEntrantDescription> CheckedLogEntrants()
 {
     const std::vector<LogEntrantDescription> entrants = {
         {"floor: write(2) of the ready line", MakeFloorEntrant},
+        {"the fixed parts and write(2)", MakeFixedPartsEntrant},
         {"TorkLog", MakeTorkLogEntrant},
         {"TorkLog, size limit not reached", MakeTorkLogBelowLimitEntrant},
         {"TorkLog, through qInfo()", MakeTorkLogByToolkitEntrant},

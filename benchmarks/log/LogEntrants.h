@@ -36,6 +36,7 @@ std::vector<LogEntrantDescription> CheckedLogEntrants();
 std::string const& LogMessage();
 
 std::unique_ptr<LogEntrant> MakeFloorEntrant(QString const& folder);
+std::unique_ptr<LogEntrant> MakeFixedPartsEntrant(QString const& folder);
 std::unique_ptr<LogEntrant> MakeTorkLogEntrant(QString const& folder);
 std::unique_ptr<LogEntrant> MakeTorkLogBelowLimitEntrant(QString const& folder);
 std::unique_ptr<LogEntrant> MakeTorkLogByToolkitEntrant(QString const& folder);
