@@ -86,7 +86,7 @@ void tst_ShownFolders::namesArriveAsOneArgument()
 void tst_ShownFolders::cleanupTestCase()
 {
     Figures::print(
-        QString("shown folders: %1 names with commands in them, each arrived at the file "
+        QString("trust in names: %1 names with commands in them, each arrived at the file "
                 "manager as one argument")
             .arg(m_arrived));
 }

@@ -251,7 +251,7 @@ void tst_SystemLimits::folderRemoved()
 
 void tst_SystemLimits::cleanupTestCase()
 {
-    Figures::print("system limits: logging and saving outlived " + m_shown.join(", "));
+    Figures::print("faults of the system: logging and saving outlived " + m_shown.join(", "));
 }
 
 int main(int argc, char** argv)
