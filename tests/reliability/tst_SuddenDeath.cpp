@@ -21,6 +21,8 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
+extern char** environ; // not in every system's headers
+
 class tst_SuddenDeath : public QObject
 {
     Q_OBJECT
