@@ -26,18 +26,37 @@ void TorkXmlGuard::Watch(QXmlSimpleReader& reader)
     reader.setDeclHandler(this);
 }
 
-// The toolkit's own calls this one again where it has to fetch more: that is still one character.
 QChar TorkXmlGuard::next()
 {
-    const bool isWatching = m_inDocumentType || m_longestEntity > 0;
-    if (!isWatching || m_fetching)
-        return QXmlInputSource::next();
+    if (m_next == m_end)
+        return fetchNext();
 
-    m_fetching = true;
-    const QChar character = QXmlInputSource::next();
-    m_fetching = false;
+    const QChar character = *m_next++;
+    if (m_inDocumentType || m_longestEntity > 0)
+        return checked(character);
+    // As a character of the text it would be taken for a sign of the source's.
+    return character == QChar(EndOfData) ? QChar(EndOfDocument) : character;
+}
+
+// Tells once that what was fetched is used up, for a reader that wants to come back later, and
+// fetches more when it is asked again.
+QChar TorkXmlGuard::fetchNext()
+{
+    m_toldEndOfData = !m_toldEndOfData;
+    if (m_toldEndOfData)
+        return QChar(EndOfData);
+
+    fetchData();
+    m_fetched = data();
+    m_next = m_fetched.constData();
+    m_end = m_next + m_fetched.length();
+    return m_next == m_end ? QChar(EndOfDocument) : next();
+}
+
+QChar TorkXmlGuard::checked(QChar character)
+{
     m_refused = m_refused || nestsTooDeep(character) || expandsTooFar(character);
-    return m_refused ? QChar(QXmlInputSource::EndOfDocument) : character;
+    return m_refused || character == QChar(EndOfData) ? QChar(EndOfDocument) : character;
 }
 
 // Groups do not reach from one declaration into another, and text is full of harmless brackets.

@@ -5,6 +5,7 @@
 #include "common/xml/TorkXmlGuard.h"
 
 #include <QBuffer>
+#include <QTextCodec>
 #include <QXmlDefaultHandler>
 #include <QXmlSimpleReader>
 #include <QtTest>
@@ -59,6 +60,8 @@ private slots:
     void parse_data();
     void parse();
     void textIsUntouched();
+    void readsWhatAPlainSourceReads_data();
+    void readsWhatAPlainSourceReads();
 };
 
 void tst_TorkXmlGuard::parse_data()
@@ -128,6 +131,51 @@ void tst_TorkXmlGuard::textIsUntouched()
     reader.setContentHandler(&text);
     QVERIFY(reader.parse(source));
     QCOMPARE(text.all, expected + "x");
+}
+
+void tst_TorkXmlGuard::readsWhatAPlainSourceReads_data()
+{
+    QTest::addColumn<QByteArray>("document");
+
+    const QString text = QString("<r>%1</r>").arg(QString(3000, QChar(0xe4)));
+    QTest::newRow("nothing") << QByteArray();
+    QTest::newRow("two bytes a character") << text.toUtf8();
+    QTest::newRow("declared as Latin-1")
+        << "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?>" + text.toLatin1();
+    for (char const* name : {"UTF-16LE", "UTF-16BE", "UTF-32"}) {
+        QTextCodec const* codec = QTextCodec::codecForName(name);
+        QTest::newRow(name) << codec->fromUnicode(QChar(QChar::ByteOrderMark) + text);
+    }
+    QTest::newRow("an end of data in the text") << QByteArray("<r>a\xef\xbf\xbe"
+                                                              "b</r>");
+    QTest::newRow("an end of document in the text") << QByteArray("<r>a\xef\xbf\xbf"
+                                                                  "b</r>");
+    QTest::newRow("an end of data in the document type")
+        << QByteArray("<!DOCTYPE r [<!--\xef\xbf\xbe-->]><r>a</r>");
+    QTest::newRow("a zero in the text") << QByteArray("<r>a\0b</r>", 10);
+    QTest::newRow("cut short") << text.toUtf8().left(2001);
+    QTest::newRow("text behind the root") << QByteArray("<r>a</r>b");
+    QTest::newRow("line ends of all kinds") << QByteArray("<r>a\r\nb\rc\n\n\rd</r>");
+}
+
+void tst_TorkXmlGuard::readsWhatAPlainSourceReads()
+{
+    QFETCH(QByteArray, document);
+    QBuffer plainBuffer(&document);
+    QXmlInputSource plain(&plainBuffer);
+    Text expected;
+    QXmlSimpleReader plainReader;
+    plainReader.setContentHandler(&expected);
+    const bool parses = plainReader.parse(plain);
+
+    QBuffer buffer(&document);
+    TorkXmlGuard source(&buffer);
+    Text text;
+    QXmlSimpleReader reader;
+    source.Watch(reader);
+    reader.setContentHandler(&text);
+    QCOMPARE(reader.parse(source), parses);
+    QCOMPARE(text.all, expected.all);
 }
 
 QTEST_GUILESS_MAIN(tst_TorkXmlGuard)
