@@ -159,6 +159,7 @@ private slots:
     void appendSectionTakesOwnership_data();
     void appendSectionTakesOwnership();
     void appendSectionReplacesWithoutDeleting();
+    void appendNoSection();
     void appendSectionKeepsBlanksInTheName();
     void clearForgetsAllSections();
     void clearSection_data();
@@ -410,6 +411,14 @@ void tst_TorkConfigFile::appendSectionReplacesWithoutDeleting()
     QCOMPARE(newDeleted, 1);
     QCOMPARE(oldDeleted, 0);
     QCOMPARE(old->keyList(), QStringList{"old"});
+}
+
+void tst_TorkConfigFile::appendNoSection()
+{
+    TorkConfigFile file{QString()};
+    file.WriteItem("One", "k", "v");
+    QVERIFY(file.AppendSection(nullptr));
+    QCOMPARE(ConfigContents::of(file, {"One", ""}), QString("One{k=[v]}"));
 }
 
 void tst_TorkConfigFile::appendSectionKeepsBlanksInTheName()

@@ -83,6 +83,9 @@ class tst_LogModel : public QObject
 private slots:
     void init();
     void columns();
+    void details();
+    void headings();
+    void nothingOpen();
     void grows();
     void newestRunWritesOverTheOlder();
     void changes_data();
@@ -142,6 +145,82 @@ void tst_LogModel::columns()
     for (int column = 0; column < 4; ++column)
         titles.append(model.headerData(column, Qt::Horizontal, Qt::DisplayRole).toString());
     QCOMPARE(titles, QStringList({"Time", "Severity", "Elapsed", "Message"}));
+}
+
+void tst_LogModel::details()
+{
+    LogModel model;
+    open(model, "2025-03-03 09:02:11.031 Warning dT:[250] a < b\nmore\n");
+    const auto of = [&](int row, int column, int role) {
+        return model.index(row, column).data(role);
+    };
+
+    // A long message is wrapped, which takes rich text, in which it must not be taken for markup.
+    QCOMPARE(of(0, LogModel::MessageColumn, Qt::ToolTipRole).toString(),
+             QString("<p>a &lt; b</p>"));
+    QCOMPARE(of(0, LogModel::TimeColumn, Qt::ToolTipRole).toString(), QString());
+    QVERIFY(!of(0, LogModel::SeverityColumn, Qt::DecorationRole).value<QIcon>().isNull());
+    QVERIFY(!of(1, LogModel::SeverityColumn, Qt::DecorationRole).isValid());
+    QVERIFY(!of(0, LogModel::MessageColumn, Qt::DecorationRole).isValid());
+    QCOMPARE(of(0, LogModel::SeverityColumn, LogModel::SeverityRole).toInt(),
+             int(LogEntry::Warning));
+    QCOMPARE(of(0, LogModel::ElapsedColumn, Qt::TextAlignmentRole).toInt(),
+             int(Qt::AlignRight | Qt::AlignVCenter));
+    QCOMPARE(of(0, LogModel::TimeColumn, Qt::TextAlignmentRole).toInt(),
+             int(Qt::AlignLeft | Qt::AlignVCenter));
+    QVERIFY(!of(0, LogModel::EarlierRole, LogModel::EarlierRole).toBool());
+    QVERIFY(!of(0, LogModel::TimeColumn, Qt::FontRole).isValid());
+
+    QVERIFY(model.flags(model.index(0, 0)) & Qt::ItemIsSelectable);
+    QCOMPARE(model.flags(QModelIndex()), Qt::ItemFlags(Qt::NoItemFlags));
+    QCOMPARE(model.rowCount(model.index(0, 0)), 0);
+    QCOMPARE(model.columnCount(model.index(0, 0)), 0);
+    QCOMPARE(model.LineText(-1, 100), QString());
+    QCOMPARE(model.LineText(2, 100), QString());
+    QCOMPARE(model.LineText(1, 2), QString("mo"));
+
+    QStringList titles;
+    for (int column = 0; column < model.columnCount(); ++column)
+        titles.append(model.headerData(column, Qt::Horizontal, Qt::DisplayRole).toString());
+    QCOMPARE(titles, QStringList({"Time", "Severity", "Elapsed", "Message"}));
+    QVERIFY(!model.headerData(0, Qt::Vertical, Qt::DisplayRole).isValid());
+    QVERIFY(!model.headerData(0, Qt::Horizontal, Qt::FontRole).isValid());
+    QCOMPARE(LogModel::SeverityName(LogEntry::None), QString());
+}
+
+// What an earlier run left behind stands under a heading, which is no line of its own.
+void tst_LogModel::headings()
+{
+    const QByteArray older = run(8, QTime(17, 0), "older", true);
+    const QByteArray newer = run(3, QTime(9, 0), "new"); // ends in the middle of an older entry
+    LogModel model;
+    open(model, writtenOver(older, newer));
+
+    const QModelIndex heading = model.index(0, LogModel::TimeColumn);
+    QVERIFY(heading.data(LogModel::HeadingRole).toBool());
+    QCOMPARE(heading.data().toString(), QString("Earlier"));
+    QVERIFY(heading.data(LogModel::EarlierRole).toBool());
+    QCOMPARE(heading.data(Qt::ToolTipRole).toString(), QString());
+    QVERIFY(!(model.flags(heading) & Qt::ItemIsSelectable));
+    QCOMPARE(model.index(0, LogModel::MessageColumn).data().toString(), QString());
+    QCOMPARE(model.LineText(0, 100), QString());
+
+    const QModelIndex torn = model.index(1, LogModel::MessageColumn);
+    QCOMPARE(torn.data(Qt::ToolTipRole).toString(),
+             QString("What is left of an entry that a later run wrote over"));
+    QVERIFY(!torn.sibling(1, LogModel::SeverityColumn).data(Qt::DecorationRole).isValid());
+}
+
+void tst_LogModel::nothingOpen()
+{
+    LogModel model;
+    model.Reload();
+    model.SetPaused(true);
+    model.SetPaused(false);
+    model.SetFilter(LogFilter());
+    QCOMPARE(model.rowCount(), 0);
+    QVERIFY(!model.isReading());
+    QCOMPARE(model.LineText(0, 100), QString());
 }
 
 void tst_LogModel::grows()
@@ -424,5 +503,5 @@ void tst_LogModel::millionLines()
     QTRY_COMPARE_WITH_TIMEOUT(model.rowCount(), lines + 1, Patience);
 }
 
-QTEST_GUILESS_MAIN(tst_LogModel)
+QTEST_MAIN(tst_LogModel)
 #include "tst_LogModel.moc"

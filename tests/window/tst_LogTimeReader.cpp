@@ -47,6 +47,20 @@ void tst_LogTimeReader::length_data()
         << QString("'at ") << QByteArray("at x") << 3 << false;
     QTest::newRow("empty format") << QString("") << QByteArray("x") << 0 << false;
     QTest::newRow("12 hours") << QString("h:mm ap") << QByteArray("9:30 pm x") << 7 << true;
+    QTest::newRow("time zone") << QString("hh:mm t") << QByteArray("09:30 CET x") << 9 << true;
+    QTest::newRow("half of the day in one letter")
+        << QString("h:mm a") << QByteArray("9:30 pm x") << 7 << true;
+    QTest::newRow("half of the day at the end of a line")
+        << QString("h:mm ap") << QByteArray("9:30 pm") << 7 << true;
+    QTest::newRow("a year of one letter stands for itself")
+        << QString("y hh:mm") << QByteArray("y 09:30 x") << 7 << true;
+    QTest::newRow("two names of the month")
+        << QString("MMM MMMM hh:mm") << QByteArray("May May 09:30 x") << 13 << true;
+    QTest::newRow("a month cut off") << QString("MMM") << QByteArray("Ma") << -1 << false;
+    QTest::newRow("minutes without hours") << QString("mm") << QByteArray("30 x") << 2 << false;
+    QTest::newRow("hours without minutes") << QString("hh") << QByteArray("09 x") << 2 << false;
+    QTest::newRow("nothing between two quotes")
+        << QString("hh'':mm") << QByteArray("09':30 x") << 6 << true;
     QTest::newRow("unknown month") << QString("MMM d") << QByteArray("Foo 3") << -1 << false;
 }
 
@@ -129,6 +143,8 @@ void tst_LogTimeReader::hasDate_data()
     QTest::newRow("default") << QString("yyyy-MM-dd hh:mm:ss.z") << true;
     QTest::newRow("time only") << QString("hh:mm:ss") << false;
     QTest::newRow("no year") << QString("MM-dd hh:mm:ss") << false;
+    QTest::newRow("no month") << QString("yyyy dd") << false;
+    QTest::newRow("no day") << QString("yyyy-MM") << false;
     QTest::newRow("short year") << QString("d.M.yy") << true;
 }
 

@@ -181,6 +181,8 @@ private slots:
     void filterBySeverity();
     void pauses();
     void copiesLines();
+    void copiesFromTheMenu();
+    void opensNoFolder();
     void problems();
     void currentLine();
     void olderFiles();
@@ -451,6 +453,37 @@ void tst_MainWindow::copiesLines()
     QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
     QCOMPARE(QGuiApplication::clipboard()->text(), QString(log));
     QCOMPARE(window->statusBar()->currentMessage(), QString("20 line(s) copied"));
+}
+
+// From the menu too, a text field in focus is meant before the log is.
+void tst_MainWindow::copiesFromTheMenu()
+{
+    const QByteArray log = run(3, QTime(9, 0), "x");
+    const WindowTest test(log);
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
+    View(*window)->clearSelection();
+    window->setFocus();
+    Action(*window, "Copy")->trigger();
+    QCOMPARE(window->statusBar()->currentMessage(), QString("No line is selected"));
+    Action(*window, "Select All")->trigger();
+    Action(*window, "Copy")->trigger();
+    QCOMPARE(QGuiApplication::clipboard()->text(), QString(log));
+
+    QLineEdit field("text", window.get());
+    field.show();
+    field.setFocus();
+    Action(*window, "Select All")->trigger();
+    Action(*window, "Copy")->trigger();
+    QCOMPARE(QGuiApplication::clipboard()->text(), QString("text"));
+}
+
+void tst_MainWindow::opensNoFolder()
+{
+    const WindowTest test;
+    const auto window = WindowTest::show();
+    window->OpenFile(test.folder() + "documents");
+    QCOMPARE(window->statusBar()->currentMessage(), test.folder() + "documents is a folder");
 }
 
 void tst_MainWindow::problems()

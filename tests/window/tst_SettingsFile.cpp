@@ -51,6 +51,11 @@ private slots:
     void deepDocumentType();
     void losses_data();
     void losses();
+    void lossesOfNames_data();
+    void lossesOfNames();
+    void sameValues_data();
+    void sameValues();
+    void valueByName();
     void isName_data();
     void isName();
     void save();
@@ -227,6 +232,71 @@ void tst_SettingsFile::losses()
     SettingsFileWriter::Save(folder.filePath("x.cfg"), document, &error);
     const SettingsDocument after = SettingsFileReader::Read(folder.filePath("x.cfg"));
     QCOMPARE(after.isParsed && after.HasSameValues(document), isKept);
+}
+
+void tst_SettingsFile::lossesOfNames_data()
+{
+    QTest::addColumn<QString>("section");
+    QTest::addColumn<QString>("key");
+    QTest::addColumn<QStringList>("expected");
+    QTest::newRow("names") << "S"
+                           << "k" << QStringList();
+    QTest::newRow("blank in a key")
+        << "S"
+        << "a b" << QStringList("S / a b: the key is no name that the store can write");
+    QTest::newRow("blank in a section")
+        << "A B"
+        << "k" << QStringList("A B: the section has no name that the store can write");
+    QTest::newRow("section without a name")
+        << ""
+        << "k" << QStringList(": the section has no name that the store can write");
+    QTest::newRow("section called as the root") << "Root"
+                                                << "k" << QStringList();
+}
+
+void tst_SettingsFile::lossesOfNames()
+{
+    QFETCH(QString, section);
+    QFETCH(QString, key);
+    SettingsDocument document;
+    document.rootName = "Root";
+    document.SetValue(section, key, "v");
+    QTEST(SettingsFileWriter::Losses(document), "expected");
+}
+
+void tst_SettingsFile::sameValues_data()
+{
+    QTest::addColumn<QByteArray>("other");
+    QTest::addColumn<bool>("isSame");
+    QTest::newRow("the same") << QByteArray("<R><S><a>1</a><b>2</b></S></R>") << true;
+    QTest::newRow("under another root") << QByteArray("<Q><S><a>1</a><b>2</b></S></Q>") << true;
+    QTest::newRow("another value") << QByteArray("<R><S><a>1</a><b>3</b></S></R>") << false;
+    QTest::newRow("another key") << QByteArray("<R><S><a>1</a><c>2</c></S></R>") << false;
+    QTest::newRow("another order") << QByteArray("<R><S><b>2</b><a>1</a></S></R>") << false;
+    QTest::newRow("a key less") << QByteArray("<R><S><a>1</a></S></R>") << false;
+    QTest::newRow("another section") << QByteArray("<R><T><a>1</a><b>2</b></T></R>") << false;
+    QTest::newRow("a section more") << QByteArray("<R><S><a>1</a><b>2</b></S><T/></R>") << false;
+}
+
+void tst_SettingsFile::sameValues()
+{
+    QFETCH(QByteArray, other);
+    const SettingsDocument one = SettingsFileReader::ReadBytes("<R><S><a>1</a><b>2</b></S></R>");
+    QTEST(one.HasSameValues(SettingsFileReader::ReadBytes(other)), "isSame");
+    QTEST(SettingsFileReader::ReadBytes(other).HasSameValues(one), "isSame");
+}
+
+void tst_SettingsFile::valueByName()
+{
+    SettingsDocument document =
+        SettingsFileReader::ReadBytes("<R><S><a>1</a></S><T><a>2</a></T></R>");
+    QCOMPARE(document.Value("T", "a", "none"), QString("2"));
+    QCOMPARE(document.Value("T", "b", "none"), QString("none"));
+    QCOMPARE(document.Value("U", "a", "none"), QString("none"));
+    document.SetValue("T", "a", "3");
+    document.SetValue("T", "b", "4");
+    document.SetValue("U", "a", "5");
+    QCOMPARE(Joined(document), QString("[S] a=1 [T] a=3 b=4 [U] a=5"));
 }
 
 void tst_SettingsFile::isName_data()

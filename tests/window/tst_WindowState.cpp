@@ -8,10 +8,12 @@
 #include "app/window/FileSizeText.h"
 #include "app/window/InstanceList.h"
 #include "app/window/LogFileList.h"
+#include "app/window/LogFilter.h"
 #include "app/window/LogHealth.h"
 #include "app/window/LogPreferences.h"
 #include "app/window/RecentFiles.h"
 #include "app/window/RunningLog.h"
+#include "app/window/SeverityIcons.h"
 #include "app/window/SystemReport.h"
 #include "app/window/WindowSettings.h"
 
@@ -35,6 +37,7 @@ private slots:
     void damagedFileThatCannotBeMoved();
     void geometry_data();
     void geometry();
+    void maximized();
     void recentFiles();
     void recentMenu();
     void fileSize_data();
@@ -42,6 +45,9 @@ private slots:
     void logFileList();
     void preferences();
     void preferencesManyFiles();
+    void preferencesCannotBeSaved();
+    void withoutALog();
+    void filter();
     void isKept_data();
     void isKept();
     void instances();
@@ -50,6 +56,8 @@ private slots:
     void health();
     void healthDirectoryInTheWay();
     void report();
+    void reportOfATroubledLog();
+    void severityIcons();
 };
 
 void tst_WindowState::texts_data()
@@ -183,6 +191,19 @@ void tst_WindowState::geometry()
     QCOMPARE(second.size(), window.size());
 }
 
+void tst_WindowState::maximized()
+{
+    const WindowTest test;
+    WindowSettings settings(test.folder() + "data/");
+    QWidget window;
+    window.setGeometry(100, 120, 500, 400);
+    window.setWindowState(Qt::WindowMaximized);
+    settings.NoteGeometry(&window);
+    QWidget second;
+    settings.RestoreGeometry(&second);
+    QVERIFY(second.windowState() & Qt::WindowMaximized);
+}
+
 void tst_WindowState::recentFiles()
 {
     QMenu menu;
@@ -238,6 +259,7 @@ void tst_WindowState::fileSize_data()
     QTest::newRow("whole") << qint64(12340) << "12 kB";
     QTest::newRow("next unit") << qint64(999600) << "1.0 MB";
     QTest::newRow("large") << qint64(1) * 5000000000 << "5.0 GB";
+    QTest::newRow("beyond the last unit") << qint64(1) * 5000000000000000 << "5,000 TB";
 }
 
 void tst_WindowState::fileSize()
@@ -304,6 +326,60 @@ void tst_WindowState::preferencesManyFiles()
     preferences.maxFiles = 30;
     QCOMPARE(preferences.Apply(), QString());
     QCOMPARE(TorkLog::logger()->maxLogFiles(), 30U);
+}
+
+void tst_WindowState::preferencesCannotBeSaved()
+{
+    const WindowTest test;
+    const LogPreferences preferences = LogPreferences::Read();
+    const QString file = LogPreferences::FileName();
+    QFile::remove(file);
+    QVERIFY(QDir().mkpath(file + "/in the way"));
+    QCOMPARE(preferences.Apply(), "The settings file " + file + " could not be saved.");
+}
+
+void tst_WindowState::withoutALog()
+{
+    const WindowTest test;
+    TorkLog::shutdown();
+    QCOMPARE(RunningLog::FileName(), QString());
+    QCOMPARE(LogPreferences::FileName(), QString());
+    QCOMPARE(LogPreferences::Read().dateFormat, QString("yyyy-MM-dd hh:mm:ss.z"));
+    QCOMPARE(LogPreferences().Apply(), QString("There is no log."));
+    QCOMPARE(SystemReport::LogTail(10), QString());
+    const QString facts = SystemReport::Facts(test.settingsFile());
+    QVERIFY2(facts.contains("Log: none\n"), qPrintable(facts));
+}
+
+void tst_WindowState::filter()
+{
+    LogFilter filter;
+    QVERIFY(filter.Shows(LogEntry::Trace) && filter.Shows(LogEntry::None));
+    filter.SetSeverity(LogEntry::None, false); // lines without a severity have no switch
+    QVERIFY(filter.Shows(LogEntry::None));
+    filter.SetSeverity(LogEntry::Trace, false);
+    QVERIFY(!filter.Shows(LogEntry::Trace) && !filter.Shows(LogEntry::None));
+    QVERIFY(filter.Shows(LogEntry::Fatal));
+    filter.SetSeverity(LogEntry::Trace, true);
+    QVERIFY(filter.Shows(LogEntry::Trace) && filter.Shows(LogEntry::None));
+
+    using Ranges = QVector<QPair<int, int>>;
+    QCOMPARE(filter.Ranges("any"), Ranges());
+    QVERIFY(filter.SetText("a", false, false));
+    QCOMPARE(filter.Ranges("Banana"), Ranges({{1, 1}, {3, 1}, {5, 1}}));
+    QVERIFY(filter.Matches("BANANA") && !filter.Matches("kiwi"));
+    QVERIFY(filter.SetText("A", false, true));
+    QVERIFY(filter.Matches("BANANA") && !filter.Matches("banana"));
+    QVERIFY(filter.SetText("n*", true, false)); // matches nothing at all in many places
+    QCOMPARE(filter.Ranges("Banana"), Ranges({{2, 1}, {4, 1}}));
+    QVERIFY(!filter.SetText("(", true, false));
+    QCOMPARE(filter.Ranges("Banana"), Ranges({{2, 1}, {4, 1}}));
+    LogFilter other;
+    QVERIFY(!other.HasSameText(filter));
+    QVERIFY(other.SetText("n*", false, false));
+    QVERIFY(!other.HasSameText(filter));
+    QVERIFY(other.SetText("n*", true, false));
+    QVERIFY(other.HasSameText(filter));
 }
 
 void tst_WindowState::isKept_data()
@@ -419,6 +495,43 @@ void tst_WindowState::report()
     const QString whole = SystemReport::Whole(test.settingsFile());
     QVERIFY(whole.contains(facts));
     QVERIFY(whole.endsWith(SystemReport::LogTail(SystemReport::TailLines)));
+}
+
+void tst_WindowState::reportOfATroubledLog()
+{
+    const WindowTest test;
+    QVERIFY(QDir().mkpath(test.logFile()));
+    TorkLog::logger()->trace("lost");
+    TorkLog::logger()->setEnable(false);
+    const QString facts = SystemReport::Facts(test.settingsFile());
+    QVERIFY2(facts.contains("Log: off, ") && facts.contains(", last error: "), qPrintable(facts));
+    QCOMPARE(SystemReport::LogTail(10), QString());
+
+    TestFiles::write(test.folder() + "data/logs/only.log", "");
+    QVERIFY(QDir(test.logFile()).removeRecursively());
+    QCOMPARE(SystemReport::LogTail(10), QString());
+}
+
+void tst_WindowState::severityIcons()
+{
+    QPalette dark;
+    dark.setColor(QPalette::Base, Qt::black);
+    QPalette light;
+    light.setColor(QPalette::Base, Qt::white);
+    QVERIFY(SeverityIcons::IsDark(dark) && !SeverityIcons::IsDark(light));
+    QVERIFY(SeverityIcons::Icon(LogEntry::None, light).isNull());
+    for (int i = LogEntry::Trace; i <= LogEntry::Fatal; ++i) {
+        const auto severity = static_cast<LogEntry::Severity>(i);
+        const auto image = [&](QPalette const& palette) {
+            return SeverityIcons::Icon(severity, palette).pixmap(16).toImage();
+        };
+        QVERIFY(!image(light).isNull());
+        // Trace has the text's colour, which is the same in both here.
+        const bool isSame = severity == LogEntry::Trace;
+        QCOMPARE(image(light) == image(dark), isSame);
+        QCOMPARE(SeverityIcons::Colour(severity, light) == SeverityIcons::Colour(severity, dark),
+                 isSame);
+    }
 }
 
 // Started with "--hold FILE" it is another program that shares a log, until its input ends.
