@@ -28,7 +28,7 @@ tracked() {
 }
 
 sources() {
-    tracked '*.cpp' '*.h' '*.cmake' '*CMakeLists.txt' '*.sh' '*.in' run test bench package .ci/run .clang-tidy
+    tracked '*.cpp' '*.h' '*.cmake' '*CMakeLists.txt' '*.sh' '*.in' run test bench package check .ci/run .clang-tidy
 }
 
 # grep over the files named on standard input; finding nothing is no failure.

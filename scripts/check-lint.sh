@@ -19,6 +19,6 @@ printf '%s\0' "${sources[@]}" |
         clang-tidy-14 --quiet -p build/dev --extra-arg=-std=c++17 \
         2> >(grep -vE '^[0-9]+ warnings? (generated|and)' >&2 || true)
 
-scripts=(run test bench package .ci/run scripts/*.sh)
+scripts=(run test bench package check .ci/run scripts/*.sh)
 shellcheck "${scripts[@]}"
 echo "lint: ${#sources[@]} sources and ${#scripts[@]} scripts are clean"

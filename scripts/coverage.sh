@@ -8,9 +8,9 @@
 #     scripts/coverage.sh               all tests but those of the package
 #     scripts/coverage.sh --no-run      what the last run counted
 #
-# The compiler counts a branch to the handling of exceptions behind almost every call; no exception
-# crosses an interface here, so these are left out, as are branches that it marks as unreachable.
-# Lines between LCOV_EXCL_START and LCOV_EXCL_STOP are left out too: each such pair says why.
+# The compiler puts a branch to the handling of exceptions behind almost every call. No exception
+# crosses an interface here, so the product is built without them, but for the one source that
+# catches some; there, and in what it marks as unreachable, such branches are not counted.
 # Which lines and branches are missed stands in build/coverage/report/index.html.
 set -euo pipefail
 
@@ -21,11 +21,26 @@ build=$root/build/coverage
 "$root/scripts/build.sh" coverage
 
 if [ "${1:-}" != --no-run ]; then
+    # Empty files of counts that everyone may write, for tests that become another user.
     find "$build" -name '*.gcda' -delete
-    ctest --test-dir "$build" -j2 --no-tests=error -LE package --output-on-failure --quiet \
-        --output-log "$build/tests.txt" || { tail -n 60 "$build/tests.txt"; exit 1; }
+    # shellcheck disable=SC2016  # the shell is the one that xargs starts
+    find "$build" -name '*.gcno' | sed 's/gcno$/gcda/' | tr '\n' '\0' |
+        xargs -0 sh -c 'umask 0 && for file; do : >"$file"; done' sh
+    # Some tests compare all that a program says, or leave it no room on the disk for its counts.
+    export GCOV_ERROR_FILE=/dev/null
+    ctest --test-dir "$build" -j2 --no-tests=error -LE package -V --quiet \
+        --output-log "$build/tests.txt" || {
+        grep -A 4 'FAIL!' "$build/tests.txt" || true
+        sed -n '/^The following tests FAILED/,/^$/p' "$build/tests.txt"
+        exit 1
+    }
+    # What the proofs among them measured.
+    sed -En 's/^[0-9]+: ((hostile input|faults|sudden death|load|memory|trust)[a-z ]*: )/\1/p' \
+        "$build/tests.txt"
+    grep '% tests passed' "$build/tests.txt"
 fi
 
+find "$build" -name '*.gcda' -empty -delete
 mkdir -p "$build/report"
 gcovr --root "$root" --filter "$root/app/" --filter "$root/common/" \
     --exclude-throw-branches --exclude-unreachable-branches \

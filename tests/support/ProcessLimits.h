@@ -7,6 +7,7 @@
 
 #ifdef Q_OS_UNIX
 #include <csignal>
+#include <cstdlib>
 #include <grp.h>
 #include <sys/resource.h>
 #include <unistd.h>
@@ -39,23 +40,7 @@ inline bool becomeOrdinaryUser()
 #endif
 }
 
-/// From now on no file grows beyond this number of bytes: writing fails as on a full disk.
-inline bool limitFileSize(unsigned long bytes)
-{
-#ifdef Q_OS_UNIX
-    std::signal(SIGXFSZ, SIG_IGN);
-    rlimit limit = {};
-    if (getrlimit(RLIMIT_FSIZE, &limit) != 0)
-        return false;
-    limit.rlim_cur = bytes;
-    return setrlimit(RLIMIT_FSIZE, &limit) == 0;
-#else
-    Q_UNUSED(bytes)
-    return false;
-#endif
-}
-
-/// Lifts the limit again.
+/// Lifts the limit of limitFileSize() again.
 inline bool unlimitFileSize()
 {
 #ifdef Q_OS_UNIX
@@ -65,6 +50,24 @@ inline bool unlimitFileSize()
     limit.rlim_cur = limit.rlim_max;
     return setrlimit(RLIMIT_FSIZE, &limit) == 0;
 #else
+    return false;
+#endif
+}
+
+/// From now on no file grows beyond this number of bytes: writing fails as on a full disk. The
+/// limit ends with the program, before a build that measures coverage adds its counts to a file.
+inline bool limitFileSize(unsigned long bytes)
+{
+#ifdef Q_OS_UNIX
+    std::atexit([] { unlimitFileSize(); });
+    std::signal(SIGXFSZ, SIG_IGN);
+    rlimit limit = {};
+    if (getrlimit(RLIMIT_FSIZE, &limit) != 0)
+        return false;
+    limit.rlim_cur = bytes;
+    return setrlimit(RLIMIT_FSIZE, &limit) == 0;
+#else
+    Q_UNUSED(bytes)
     return false;
 #endif
 }

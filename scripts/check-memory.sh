@@ -1,0 +1,16 @@
+#!/usr/bin/env bash
+# SPDX-FileCopyrightText: The Velocor authors
+# SPDX-License-Identifier: MIT
+#
+# The log and config tests under valgrind memcheck: every error in the use of memory and every lost
+# block fails. Only the toolkit's own are suppressed. Takes the tests of the preset `coverage`, which
+# ./check has built by then.
+set -euo pipefail
+
+root=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd -P)
+
+"$root/scripts/install-packages.sh" build test check
+"$root/scripts/build.sh" coverage tests/log/all tests/config/all
+
+exec "$root/scripts/memcheck-run.py" "$root/build/coverage" "$root/tests/support/toolkit.supp" \
+    '^(log|config)$'
