@@ -142,6 +142,7 @@ class tst_HostileInput : public QObject
 private slots:
     void read_data();
     void read();
+    void cleanupTestCase();
 
 private:
     void add(char const* reader, char const* what, HostileDocuments::Writer writer, int size,
@@ -149,7 +150,12 @@ private:
     void addStructures(char const* reader, bool readsTypes);
     void addSizes(char const* reader);
 
+    void tell(QString const& what, bool isRead, qint64 fileSize, double seconds, qint64 memory);
+
     QTemporaryDir m_folder;
+    int m_count = 0;
+    double m_mostSeconds = 0;
+    qint64 m_mostMemory = 0;
 };
 
 Q_DECLARE_METATYPE(HostileDocuments::Writer)
@@ -226,16 +232,39 @@ void tst_HostileInput::read()
     const QList<QByteArray> figures = child.output.split(' ');
     QCOMPARE(figures.size(), 3);
     const qint64 memory = figures[2].toLongLong();
-    const QString figure = "hostile input: %1: %2 MB %3 in %4 s and %5 MB of memory";
-    const QString fileSize = QString::number(double(file.size()) / Megabyte, 'f', 1);
-    const QString seconds = QString::number(figures[1].toDouble() / 1000, 'f', 1);
-    Figures::print(figure.arg(QTest::currentDataTag(), fileSize,
-                              figures[0] == "1" ? "read" : "refused", seconds,
-                              QString::number(memory / Megabyte)));
+    tell(QTest::currentDataTag(), figures[0] == "1", file.size(), figures[1].toDouble() / 1000,
+         memory);
 
     QTEST(figures[0] == "1", "isRead");
     if (!IsSanitized)
         QVERIFY(memory <= Bound(file.size()));
+}
+
+// The small ones are too many for a line each.
+void tst_HostileInput::tell(QString const& what, bool isRead, qint64 fileSize, double seconds,
+                            qint64 memory)
+{
+    ++m_count;
+    if (fileSize < 10 * Megabyte) {
+        m_mostSeconds = qMax(m_mostSeconds, seconds);
+        m_mostMemory = qMax(m_mostMemory, memory);
+        return;
+    }
+    Figures::print(QString("hostile input: %1 (%2 MB): %3 in %4 s with %5 MB of memory")
+                       .arg(what)
+                       .arg(fileSize / Megabyte)
+                       .arg(isRead ? "read" : "refused")
+                       .arg(seconds, 0, 'f', 1)
+                       .arg(memory / Megabyte));
+}
+
+void tst_HostileInput::cleanupTestCase()
+{
+    Figures::print(QString("hostile input: %1 documents; of those below 10 MB none took more than "
+                           "%2 s and %3 MB of memory")
+                       .arg(m_count)
+                       .arg(m_mostSeconds, 0, 'f', 1)
+                       .arg(m_mostMemory / Megabyte));
 }
 
 int main(int argc, char** argv)
