@@ -116,6 +116,16 @@ int WriteJoined(Writer& writer, TorkXmlLayout& layout, QLatin1String start, QStr
     return written;
 }
 
+// Names are so short that the toolkit's search takes longer to begin than to end.
+inline bool HoldsPlaceholder(QString const& name)
+{
+    for (QChar character : name) {
+        if (character == QLatin1Char('%'))
+            return true;
+    }
+    return false;
+}
+
 // Filled one after another: a name that holds a placeholder takes the value in its place.
 inline QString FilledAttribute(QString const& name, QString const& value)
 {
@@ -282,7 +292,7 @@ int CollectAttribute(Writer& writer, TorkXmlLayout& layout, QString const& name,
     if (name.isEmpty())
         return TorkXmlResult::EmptyName;
 
-    const bool needsFilling = name.contains(QLatin1Char('%'));
+    const bool needsFilling = HoldsPlaceholder(name);
     const QString filled = needsFilling ? FilledAttribute(name, value) : QString();
     const int length = needsFilling ? filled.length() : AttributeLength(name, value);
 
