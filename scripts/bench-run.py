@@ -60,7 +60,7 @@ SECTIONS = {
     "log": Section(
         "Log entries",
         [("bench_log", "google"), ("bench_log_paced", "own")],
-        (15, 3),
+        (11, 3),
         goals=[
             Goal(ENTRY, "TorkLog", 1.0, "spdlog basic_file_sink_mt"),
             Goal(ENTRY, "TorkLog", 1.0, "spdlog rotating_file_sink_mt"),
@@ -72,7 +72,7 @@ SECTIONS = {
     "config": Section(
         "Settings files",
         [("bench_config", "google")],
-        (15, 3),
+        (11, 3),
         goals=[
             Goal(LOADS, "TorkConfigFile", 1.25, FLOOR),
             Goal(LOADS, "TorkConfigFile", 1.0, "KConfig"),
@@ -85,7 +85,7 @@ SECTIONS = {
     "write": Section(
         "Writing XML",
         [("bench_xml_write", "google")],
-        (11, 3),
+        (7, 3),
         unit="element",
         goals=[
             Goal(WRITES, "Tork", 3.0, FLOOR),
@@ -95,7 +95,7 @@ SECTIONS = {
     "parse": Section(
         "Parsing XML through states",
         [("bench_xml_parse", "google")],
-        (7, 3),
+        (5, 3),
         goals=[Goal(PARSES, "parse manager", 1.10, FLOOR)],
     ),
     "start": Section(
