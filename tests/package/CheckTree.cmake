@@ -21,6 +21,7 @@ set(expected
     include/tork/common/xml/TorkErrorHandler.h
     include/tork/common/xml/TorkXmlDepth.h
     include/tork/common/xml/TorkXmlFile.h
+    include/tork/common/xml/TorkXmlGuard.h
     include/tork/common/xml/TorkXmlLayout.h
     include/tork/common/xml/TorkXmlStream.h
     include/tork/common/xml/TorkXml_FlushUnknownElement.h
