@@ -116,6 +116,7 @@ private:
     void grow()
     {
         const std::vector<Slot> before = std::move(m_slots);
+        // cppcheck-suppress accessMoved ; assign() does not care what was left
         m_slots.assign(before.empty() ? 8 : 2 * before.size(), Slot{0, 0});
         m_entries.reserve(m_slots.size() / 2);
         const size_t mask = m_slots.size() - 1;

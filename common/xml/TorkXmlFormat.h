@@ -37,6 +37,7 @@ inline bool NeedsCData(QString const& value)
     bool found = false;
     for (QChar character : value) {
         const ushort unit = character.unicode();
+        // cppcheck-suppress bitwiseOnBoolean ; without a jump
         found |= (unit == '&') | (unit == '\\') | (unit == '>') | (unit == '<') | (unit == '"');
     }
     return found;
