@@ -13,8 +13,6 @@
 #include <QObject>
 #include <QXmlSimpleReader>
 
-#include <algorithm>
-
 namespace {
 
 void TraceToLog(QString const& message)
@@ -49,66 +47,6 @@ auto FindWithoutSpaces(Table& table, QString const& name)
 {
     auto* const found = table.holdsSpaces() ? nullptr : table.find(name);
     return found ? found : table.find(WithoutSpaces(name));
-}
-
-bool HoldsMarkup(QString const& text)
-{
-    bool found = false;
-    for (QChar character : text) {
-        const ushort unit = character.unicode();
-        // cppcheck-suppress bitwiseOnBoolean ; without a jump, several characters at once
-        found |= (unit == '&') | (unit == '\'') | (unit == '<') | (unit == '>') | (unit == '"');
-    }
-    return found;
-}
-
-constexpr char CDataStart[] = "<![CDATA[";
-constexpr char CDataEnd[] = "]]>";
-
-char* Copy(char* to, QLatin1String text)
-{
-    return std::copy(text.begin(), text.end(), to);
-}
-
-// As QString::toLatin1() converts.
-char* Copy(char* to, QString const& text)
-{
-    return std::transform(text.constBegin(), text.constEnd(), to, [](QChar character) {
-        return character.unicode() > 0xff ? '?' : static_cast<char>(character.unicode());
-    });
-}
-
-// Appends all pieces after making room once, without a byte array of its own for each: half the
-// time of a save.
-template <class... Pieces>
-void Append(QByteArray& xml, Pieces const&... pieces)
-{
-    const int end = xml.size();
-    xml.resize((end + ... + pieces.size()));
-    char* to = xml.data() + end;
-    ((to = Copy(to, pieces)), ...);
-}
-
-void AppendTag(QByteArray& xml, char const* opening, QString const& name)
-{
-    Append(xml, QLatin1String(opening), name, QLatin1String(">\n"));
-}
-
-// Filled one after another, as ever: a key or value that holds a placeholder of its own comes out
-// changed, and files that hold such lines exist. Without a '%' joining gives the same text.
-void AppendItem(QByteArray& xml, QString const& key, QString const& value)
-{
-    const bool isWrapped = HoldsMarkup(value);
-    const QLatin1String before(isWrapped ? CDataStart : "");
-    const QLatin1String behind(isWrapped ? CDataEnd : "");
-    if (Contains(key, '%') || Contains(value, '%')) {
-        const QString filtered = before + value + behind;
-        const QString line = QStringLiteral("<%1>%2</%3>\n");
-        Append(xml, line.arg(key).arg(filtered).arg(key)); // clazy:exclude=qstring-arg
-        return;
-    }
-    Append(xml, QLatin1String("<"), key, QLatin1String(">"), before, value, behind,
-           QLatin1String("</"), key, QLatin1String(">\n"));
 }
 
 // Ends the parse of a document that is nested too deep for the reader's stack.
@@ -201,38 +139,6 @@ void TorkConfigFile::fail(QString const& message)
 {
     m_lastError = message;
     TraceToLog(message);
-}
-
-bool TorkConfigFile::Save()
-{
-    // Two characters here but one in Load(): existing callers rely on both.
-    if (m_fileName.length() < 2)
-        return true;
-
-    // Worded before the file is emptied, so that as little as possible can come between.
-    const QByteArray xml = toXml();
-    QFile file(m_fileName);
-    if (!file.open(QIODevice::WriteOnly)) {
-        m_lastError = QStringLiteral("Unable to open file: %1").arg(m_fileName);
-        return true;
-    }
-    file.write(xml);
-    file.close();
-    return true;
-}
-
-QByteArray TorkConfigFile::toXml()
-{
-    QByteArray xml;
-    AppendTag(xml, "<", m_rootElementName);
-    for (auto const& section : m_sections) {
-        AppendTag(xml, "<", section.value->name());
-        for (auto const& item : section.value->values())
-            AppendItem(xml, item.key, item.value);
-        AppendTag(xml, "</", section.value->name());
-    }
-    AppendTag(xml, "</", m_rootElementName);
-    return xml;
 }
 
 bool TorkConfigFile::HasSection(QString const& name)
@@ -381,13 +287,4 @@ bool TorkConfigFile::ProcessContent(QString& content)
     else if (!content.isNull())
         m_currentSection->AddValue(m_currentElement, content);
     return true;
-}
-
-// cppcheck-suppress constParameter ; the interface stands
-void TorkConfigFile::FilterContent(QString& in, QString& out)
-{
-    if (HoldsMarkup(in))
-        out = QLatin1String(CDataStart) + in + QLatin1String(CDataEnd);
-    else
-        out = in;
 }
