@@ -17,6 +17,16 @@ QString SettingsDocument::Value(QString const& section, QString const& key,
     return byDefault;
 }
 
+SettingsValues SettingsDocument::AllValues() const
+{
+    SettingsValues values;
+    for (Section const& section : sections) {
+        for (Item const& item : section.items)
+            values.insert({section.name, item.key}, item.value);
+    }
+    return values;
+}
+
 void SettingsDocument::SetValue(QString const& section, QString const& key, QString const& value)
 {
     int at = 0;

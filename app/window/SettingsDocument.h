@@ -3,9 +3,14 @@
 
 #pragma once
 
+#include <QHash>
+#include <QPair>
 #include <QString>
 #include <QStringList>
 #include <QVector>
+
+/// Values by section and key.
+using SettingsValues = QHash<QPair<QString, QString>, QString>;
 
 /// What a configuration-store file holds, in its own order, and what the store makes of it.
 /// A plain record.
@@ -39,6 +44,9 @@ struct SettingsDocument
     /// The value under a section and a key; `byDefault` if there is none.
     QString Value(QString const& section, QString const& key,
                   QString const& byDefault = QString()) const;
+
+    /// All values, for looking up many of them.
+    SettingsValues AllValues() const;
 
     /// Stores a value, making the section if need be.
     void SetValue(QString const& section, QString const& key, QString const& value);

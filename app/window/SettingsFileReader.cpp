@@ -66,14 +66,16 @@ void SettingsFileReader::lose(QString const& what)
 
 void SettingsFileReader::openSection(QString const& name)
 {
-    QVector<SettingsDocument::Section>& sections = m_document.sections;
-    for (m_section = 0; m_section < sections.size(); ++m_section) {
-        if (sections.at(m_section).name == name) {
-            lose(QObject::tr("a second section \"%1\", merged with the first").arg(name));
-            return;
-        }
+    const auto found = m_sectionPlaces.constFind(name);
+    if (found != m_sectionPlaces.constEnd()) {
+        m_section = *found;
+        lose(QObject::tr("a second section \"%1\", merged with the first").arg(name));
+        return;
     }
-    sections.append({name, {}});
+    m_section = m_document.sections.size();
+    m_sectionPlaces.insert(name, m_section);
+    m_itemPlaces.append(QHash<QString, int>());
+    m_document.sections.append({name, {}});
 }
 
 void SettingsFileReader::store(QString const& key, QString const& value)
@@ -82,15 +84,16 @@ void SettingsFileReader::store(QString const& key, QString const& value)
         lose(QObject::tr("\"%1\", which is in no section").arg(key));
         return;
     }
-    SettingsDocument::Section& section = m_document.sections[m_section];
-    for (SettingsDocument::Item& item : section.items) {
-        if (item.key == key) {
-            lose(QObject::tr("a second value of \"%1\", in the place of the first").arg(key));
-            item.value = value;
-            return;
-        }
+    QVector<SettingsDocument::Item>& items = m_document.sections[m_section].items;
+    QHash<QString, int>& places = m_itemPlaces[m_section];
+    const auto found = places.constFind(key);
+    if (found != places.constEnd()) {
+        lose(QObject::tr("a second value of \"%1\", in the place of the first").arg(key));
+        items[*found].value = value;
+        return;
     }
-    section.items.append({key, value});
+    places.insert(key, items.size());
+    items.append({key, value});
 }
 
 bool SettingsFileReader::startElement(QString const&, QString const& localName, QString const&,

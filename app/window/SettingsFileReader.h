@@ -5,6 +5,8 @@
 
 #include "app/window/SettingsDocument.h"
 
+#include <QHash>
+#include <QVector>
 #include <QXmlDefaultHandler>
 
 class QIODevice;
@@ -54,6 +56,8 @@ private:
     TorkXmlGuard* m_guard = nullptr; ///< it has to hear of document types as well
     int m_depth = 0;
     int m_section = -1;
+    QHash<QString, int> m_sectionPlaces;
+    QVector<QHash<QString, int>> m_itemPlaces; // of each section
     bool m_atRoot = false;
     bool m_expectingValue = false;
     bool m_justOpened = false;

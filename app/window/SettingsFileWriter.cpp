@@ -6,10 +6,13 @@
 #include "app/window/SettingsFileReader.h"
 #include "common/config/TorkConfigFile.h"
 
+#include <QCoreApplication>
+#include <QDir>
 #include <QFile>
 #include <QObject>
 #include <QRegularExpression>
 #include <QTemporaryDir>
+#include <QVariant>
 
 #include <algorithm>
 
@@ -23,6 +26,15 @@ bool IsLatin1(QString const& text)
 QString Quoted(SettingsDocument::Item const& item, QString const& section)
 {
     return QStringLiteral("%1 / %2").arg(section, item.key);
+}
+
+// Where a file is saved to see what the store makes of it: settings are nobody else's business, so
+// not in a folder that all users share, unless the program has no other.
+QString TrialFolder()
+{
+    const QString data = QCoreApplication::instance()->property("DataPath").toString();
+    const bool isThere = !data.isEmpty() && QDir().mkpath(data);
+    return (isThere ? data : QDir::tempPath() + QLatin1Char('/')) + QLatin1String("trial-XXXXXX");
 }
 
 } // namespace
@@ -68,14 +80,14 @@ QStringList SettingsFileWriter::Losses(SettingsDocument const& document)
             return losses;
     }
 
-    const QTemporaryDir folder;
+    const QTemporaryDir folder(TrialFolder());
     const QString path = folder.filePath(QStringLiteral("trial.cfg"));
     if (!folder.isValid() || !SaveUnchecked(path, harmless).isEmpty())
         return losses;
-    const SettingsDocument readBack = SettingsFileReader::Read(path);
+    const SettingsValues readBack = SettingsFileReader::Read(path).AllValues();
     for (SettingsDocument::Section const& section : qAsConst(harmless.sections)) {
         for (SettingsDocument::Item const& item : section.items) {
-            if (readBack.Value(section.name, item.key, QString()) != item.value)
+            if (readBack.value({section.name, item.key}) != item.value)
                 losses.append(QObject::tr("%1: the value would read differently afterwards")
                                   .arg(Quoted(item, section.name)));
         }
