@@ -11,6 +11,7 @@ root=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd -P)
 
 "$root/scripts/install-packages.sh" build test check
 "$root/scripts/build.sh" coverage tests/log/all tests/config/all
+"$root/scripts/prepare-coverage.sh"
 
 exec "$root/scripts/memcheck-run.py" "$root/build/coverage" "$root/tests/support/toolkit.supp" \
     '^(log|config)$'

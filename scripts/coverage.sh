@@ -21,11 +21,8 @@ build=$root/build/coverage
 "$root/scripts/build.sh" coverage
 
 if [ "${1:-}" != --no-run ]; then
-    # Empty files of counts that everyone may write, for tests that become another user.
     find "$build" -name '*.gcda' -delete
-    # shellcheck disable=SC2016  # the shell is the one that xargs starts
-    find "$build" -name '*.gcno' | sed 's/gcno$/gcda/' | tr '\n' '\0' |
-        xargs -0 sh -c 'umask 0 && for file; do : >"$file"; done' sh
+    "$root/scripts/prepare-coverage.sh"
     # Some tests compare all that a program says, or leave it no room on the disk for its counts.
     export GCOV_ERROR_FILE=/dev/null
     ctest --test-dir "$build" -j2 --no-tests=error -LE package -V --quiet \
