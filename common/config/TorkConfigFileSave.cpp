@@ -38,8 +38,11 @@ bool HoldsMarkup(QString const& text)
     });
 }
 
-constexpr char CDataStart[] = "<![CDATA[";
-constexpr char CDataEnd[] = "]]>";
+// A value as it stands in the file.
+QString Filtered(QString const& value)
+{
+    return HoldsMarkup(value) ? QLatin1String("<![CDATA[") + value + QLatin1String("]]>") : value;
+}
 
 char* Copy(char* to, QLatin1String text)
 {
@@ -74,10 +77,8 @@ void AppendTag(QByteArray& xml, char const* opening, QString const& name)
 // changed, and files that hold such lines exist.
 QString FilledItem(QString const& key, QString const& value)
 {
-    const QString filtered =
-        HoldsMarkup(value) ? QLatin1String(CDataStart) + value + QLatin1String(CDataEnd) : value;
     const QString line = QStringLiteral("<%1>%2</%3>\n");
-    return line.arg(key).arg(filtered).arg(key); // clazy:exclude=qstring-arg
+    return line.arg(key).arg(Filtered(value)).arg(key); // clazy:exclude=qstring-arg
 }
 
 // As QString::toLatin1() converts, noting what the characters demand. Other characters with the
@@ -156,8 +157,5 @@ QByteArray TorkConfigFile::toXml()
 // cppcheck-suppress constParameter ; the interface stands
 void TorkConfigFile::FilterContent(QString& in, QString& out)
 {
-    if (HoldsMarkup(in))
-        out = QLatin1String(CDataStart) + in + QLatin1String(CDataEnd);
-    else
-        out = in;
+    out = Filtered(in);
 }
