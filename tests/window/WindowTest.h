@@ -10,6 +10,7 @@
 #include "support/TestFiles.h"
 
 #include <QApplication>
+#include <QPointer>
 #include <QTemporaryDir>
 #include <QtTest>
 
@@ -63,7 +64,8 @@ public:
         return window;
     }
 
-    /// Does something with the modal dialog that comes up next, soon after it is on the screen.
+    /// Does something with the modal dialog that comes up next, soon after it is on the screen. The
+    /// dialog is closed if the test fails meanwhile, or else nothing would go on behind it.
     template <class Dialog>
     static void whenShown(std::function<void(Dialog*)> const& work)
     {
@@ -74,7 +76,10 @@ public:
                 return;
             timer->stop();
             timer->deleteLater();
+            const QPointer<Dialog> open(dialog);
             work(dialog);
+            if (QTest::currentTestFailed() && open)
+                open->reject();
         });
         timer->start(20);
     }

@@ -27,6 +27,7 @@
 #include <QHeaderView>
 #include <QLabel>
 #include <QLineEdit>
+#include <QLoggingCategory>
 #include <QMenuBar>
 #include <QMessageBox>
 #include <QMimeData>
@@ -226,7 +227,9 @@ private slots:
 
 void tst_MainWindow::initTestCase()
 {
-    QVERIFY(qputenv("QT_LOGGING_RULES", "qt.qpa.*=false"));
+    // Where a window goes while the X11 plugin asks about it, that warns, over a test's log. The
+    // environment would come too late for it: it was read with the application object.
+    QLoggingCategory::setFilterRules("qt.qpa.*=false");
 }
 
 void tst_MainWindow::cleanup()
@@ -1021,7 +1024,7 @@ void tst_MainWindow::saveReport()
     WindowTest::whenShown<ReportDialog>([&](ReportDialog* dialog) {
         // What is saved is what is shown.
         auto const* shown = Child<QPlainTextEdit>(dialog, "Save Report");
-        QVERIFY(shown->toPlainText().endsWith(QString(log)));
+        QCOMPARE(shown->toPlainText().right(log.size()), QString(log));
         WindowTest::whenShown<QFileDialog>([&](QFileDialog* chooser) {
             auto* name = chooser->findChild<QLineEdit*>("fileNameEdit");
             name->setText(file);
