@@ -25,7 +25,7 @@ if [ "${1:-}" != --no-run ]; then
     "$root/scripts/prepare-coverage.sh"
     # Some tests compare all that a program says, or leave it no room on the disk for its counts.
     export GCOV_ERROR_FILE=/dev/null
-    ctest --test-dir "$build" -j2 --no-tests=error -LE package -V --quiet \
+    ctest --test-dir "$build" -j3 --no-tests=error -LE package -V --quiet \
         --output-log "$build/tests.txt" || {
         grep -A 4 'FAIL!' "$build/tests.txt" || true
         sed -n '/^The following tests FAILED/,/^$/p' "$build/tests.txt"

@@ -519,7 +519,7 @@ void tst_TorkConfigFile::writeItem_data()
     QTest::addColumn<QString>("expectedSection");
     QTest::addColumn<QString>("expectedKey");
 
-    const QString replacement(QChar(QChar::ReplacementCharacter));
+    const QString replacement = QChar(QChar::ReplacementCharacter);
     QTest::newRow("plain") << "Main"
                            << "key"
                            << "value"
@@ -645,7 +645,7 @@ void tst_TorkConfigFile::writeItemReplaces()
 void tst_TorkConfigFile::newSectionPushesOutItsNamesake()
 {
     const QString written("\u00E9");
-    const QString stored(QChar(QChar::ReplacementCharacter));
+    const QString stored = QChar(QChar::ReplacementCharacter);
     TorkConfigFile file{QString()};
 
     QVERIFY(file.WriteItem(written, "first", "1"));

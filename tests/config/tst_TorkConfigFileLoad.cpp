@@ -358,7 +358,7 @@ void tst_TorkConfigFileLoad::encodings_data()
     QTest::addColumn<QByteArray>("document");
     QTest::addColumn<QString>("expected");
 
-    const QString replacement(QChar(QChar::ReplacementCharacter));
+    const QString replacement = QChar(QChar::ReplacementCharacter);
     QTest::newRow("UTF-8 without declaration")
         << QByteArray("<r><s><k>\xC3\xA9</k></s></r>") << QString("s{k=[\u00E9]}");
     QTest::newRow("UTF-8 with byte order mark")

@@ -38,7 +38,7 @@ void tst_TorkConfigFileSection::name_data()
     QTest::addColumn<bool>("isNull");
     QTest::addColumn<QString>("expected");
 
-    const QString replacement(QChar(QChar::ReplacementCharacter));
+    const QString replacement = QChar(QChar::ReplacementCharacter);
     QTest::newRow("ASCII") << QByteArray("Window") << false << "Window";
     QTest::newRow("empty") << QByteArray("") << false << "";
     QTest::newRow("null") << QByteArray() << true << "UnknownSection";

@@ -9,7 +9,9 @@
 #include <QSize>
 #include <QtTest>
 
+#include <algorithm>
 #include <functional>
+#include <initializer_list>
 #include <limits>
 
 namespace {
@@ -26,6 +28,12 @@ QString Stored(TorkConfigFile& file, QString const& section, QString const& key)
     QString text;
     file.ReadItem(section, key, missing, text);
     return text;
+}
+
+// Of several calls, each of which is made.
+bool Any(std::initializer_list<bool> results)
+{
+    return std::max(results);
 }
 
 } // namespace
@@ -252,28 +260,28 @@ void tst_TorkConfigFileValues::readersLeaveTheFileAlone_data()
 
     QTest::newRow("int") << Action([](TorkConfigFile& f) {
         int value = 0;
-        return f.ReadInt("s", "missing", 7, value) | f.ReadInt("new", "k", 7, value);
+        return Any({f.ReadInt("s", "missing", 7, value), f.ReadInt("new", "k", 7, value)});
     });
     QTest::newRow("unsigned, default out of range") << Action([](TorkConfigFile& f) {
         unsigned int value = 0;
-        return f.ReadUint("s", "missing", 4000000000U, value) |
-               f.ReadUint("new", "k", 4000000000U, value);
+        return Any({f.ReadUint("s", "missing", 4000000000U, value),
+                    f.ReadUint("new", "k", 4000000000U, value)});
     });
     QTest::newRow("bool") << Action([](TorkConfigFile& f) {
         bool value = false;
-        return f.ReadBool("s", "missing", true, value) | f.ReadBool("new", "k", true, value);
+        return Any({f.ReadBool("s", "missing", true, value), f.ReadBool("new", "k", true, value)});
     });
     QTest::newRow("colour") << Action([](TorkConfigFile& f) {
         QColor colour(Qt::red);
-        return f.ReadColor("s", "missing", colour) | f.ReadColor("new", "k", colour);
+        return Any({f.ReadColor("s", "missing", colour), f.ReadColor("new", "k", colour)});
     });
     QTest::newRow("size") << Action([](TorkConfigFile& f) {
         QSize size(1, 2);
-        return f.ReadSize("s", "missing", size) | f.ReadSize("new", "k", size);
+        return Any({f.ReadSize("s", "missing", size), f.ReadSize("new", "k", size)});
     });
     QTest::newRow("font") << Action([](TorkConfigFile& f) {
         QFont font("Helvetica", 12);
-        return f.ReadFont("s", "missing", font) | f.ReadFont("new", "k", font);
+        return Any({f.ReadFont("s", "missing", font), f.ReadFont("new", "k", font)});
     });
 }
 

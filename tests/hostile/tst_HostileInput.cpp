@@ -15,6 +15,7 @@
 #include "common/xml/TorkXml_ParseManager_Base.h"
 #include "reliability/Figures.h"
 #include "support/ChildProcess.h"
+#include "support/Sanitizers.h"
 
 #include <QElapsedTimer>
 #include <QFile>
@@ -28,8 +29,7 @@
 
 namespace {
 
-// Both compilers' ways of saying that memory is watched, which takes more of it.
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+#if defined(TEST_UNDER_ADDRESS_SANITIZER) || defined(TEST_UNDER_THREAD_SANITIZER)
 constexpr bool IsSanitized = true;
 #else
 constexpr bool IsSanitized = false;

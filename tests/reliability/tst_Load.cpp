@@ -10,6 +10,7 @@
 #include "common/log/TorkLog.h"
 #include "log/LogFolder.h"
 #include "reliability/Figures.h"
+#include "support/Sanitizers.h"
 
 #include <QDebug>
 #include <QtTest>
@@ -211,19 +212,10 @@ void tst_Load::threads()
 
 namespace {
 
-#if defined(__has_feature)
-#if __has_feature(address_sanitizer) || __has_feature(thread_sanitizer)
-#define OTHER_HEAP
-#endif
-#endif
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
-#define OTHER_HEAP
-#endif
-
 // Bytes in use; -1 where the heap does not tell.
 qint64 heapInUse()
 {
-#if defined(OTHER_HEAP)
+#if defined(TEST_UNDER_ADDRESS_SANITIZER) || defined(TEST_UNDER_THREAD_SANITIZER)
     return -1;
 #elif defined(__GLIBC__) && __GLIBC_PREREQ(2, 33)
     const struct mallinfo2 info = mallinfo2();

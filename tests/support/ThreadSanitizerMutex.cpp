@@ -6,14 +6,7 @@
 // This program's own definitions stand in front of the library's, call them, and tell the sanitizer
 // what they did. Without the sanitizer this file is empty.
 
-#if defined(__has_feature)
-#if __has_feature(thread_sanitizer)
-#define TEST_UNDER_THREAD_SANITIZER
-#endif
-#endif
-#if defined(__SANITIZE_THREAD__)
-#define TEST_UNDER_THREAD_SANITIZER
-#endif
+#include "support/Sanitizers.h"
 
 #ifdef TEST_UNDER_THREAD_SANITIZER
 
