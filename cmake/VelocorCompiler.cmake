@@ -32,19 +32,25 @@ if(VELOCOR_SANITIZE)
     endif()
 endif()
 
-# Every object of a program has to agree on how its counts are kept, the tests' own included. Each
-# process adds its counts to those before it, and several may end at the same time.
-if(VELOCOR_COVERAGE)
-    add_compile_options(--coverage -fprofile-update=atomic)
-    add_link_options(--coverage)
-endif()
-
 # The product throws nothing, and what catches the XML parser's exceptions is named here. Where
 # coverage is measured, everything else is built without the branches that would clean up after an
-# exception behind almost every call: nothing can reach them.
-function(velocor_count_without_exceptions target)
+# exception behind almost every call: nothing can reach them. Each process adds its counts to those
+# before it, and several may end at the same time. The tests themselves are not counted.
+if(VELOCOR_COVERAGE)
+    add_link_options(--coverage)
+endif()
+function(velocor_measure_coverage target)
     if(VELOCOR_COVERAGE)
-        target_compile_options(${target} PRIVATE -fno-exceptions)
+        target_compile_options(${target} PRIVATE
+            --coverage -fprofile-update=atomic -fno-exceptions)
         set_source_files_properties(LaunchOptionParser.cpp PROPERTIES COMPILE_OPTIONS -fexceptions)
+    endif()
+endfunction()
+
+# For builds that are made from nothing each time: faster, but a missing #include stays unseen, and
+# tools that read the compiler's commands cannot read its precompiled headers.
+function(velocor_precompile target)
+    if(VELOCOR_PRECOMPILE)
+        target_precompile_headers(${target} PRIVATE <QtWidgets> <QtXml>)
     endif()
 endfunction()
