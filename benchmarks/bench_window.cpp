@@ -8,8 +8,8 @@
 // Google Benchmark knows no event loop, so the waits are timed here; the results are worded as its
 // own.
 
-#include "app/window/LogModel.h"
-#include "app/window/LogView.h"
+#include "app/window/log/LogModel.h"
+#include "app/window/log/LogView.h"
 #include "support/ScratchFolder.h"
 
 #include <QApplication>

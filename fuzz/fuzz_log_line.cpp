@@ -5,7 +5,7 @@
 
 #include "FuzzInput.h"
 
-#include "app/window/LogLineParser.h"
+#include "app/logfile/LogLineParser.h"
 
 #include <vector>
 

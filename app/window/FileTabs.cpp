@@ -3,8 +3,8 @@
 
 #include "app/window/FileTabs.h"
 
-#include "app/window/LogPanel.h"
-#include "app/window/SettingsEditor.h"
+#include "app/window/log/LogPanel.h"
+#include "app/window/settings/SettingsEditor.h"
 
 #include <QFile>
 #include <QFileInfo>

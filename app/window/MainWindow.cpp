@@ -4,18 +4,18 @@
 #include "app/window/MainWindow.h"
 
 #include "app/UserMessages.h"
+#include "app/runninglog/LogHealth.h"
+#include "app/runninglog/RunningLog.h"
 #include "app/window/FileTabs.h"
-#include "app/window/LogHealth.h"
-#include "app/window/LogPanel.h"
-#include "app/window/LogSettingsDialog.h"
-#include "app/window/NoticeBar.h"
 #include "app/window/PlacesPanel.h"
 #include "app/window/RecentFiles.h"
 #include "app/window/ReportDialog.h"
-#include "app/window/RunningLog.h"
 #include "app/window/SelectableMessageBoxes.h"
-#include "app/window/SettingsEditor.h"
 #include "app/window/SystemReport.h"
+#include "app/window/log/LogPanel.h"
+#include "app/window/log/LogSettingsDialog.h"
+#include "app/window/log/NoticeBar.h"
+#include "app/window/settings/SettingsEditor.h"
 
 #include <QApplication>
 #include <QCloseEvent>

@@ -2,7 +2,7 @@
 // SPDX-License-Identifier: MIT
 
 #include "app/window/PlacesPanel.h"
-#include "app/window/RunningLog.h"
+#include "app/runninglog/RunningLog.h"
 
 #include <QClipboard>
 #include <QCoreApplication>

@@ -3,11 +3,11 @@
 
 #include "app/window/SystemReport.h"
 
-#include "app/window/FileSizeText.h"
-#include "app/window/LogFileList.h"
-#include "app/window/LogIndex.h"
-#include "app/window/LogPreferences.h"
-#include "app/window/RunningLog.h"
+#include "app/logfile/LogFileList.h"
+#include "app/logfile/LogIndex.h"
+#include "app/runninglog/LogPreferences.h"
+#include "app/runninglog/RunningLog.h"
+#include "app/window/log/FileSizeText.h"
 #include "common/log/TorkLog.h"
 
 #include <QApplication>

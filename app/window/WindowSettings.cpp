@@ -3,7 +3,7 @@
 
 #include "app/window/WindowSettings.h"
 
-#include "app/window/SettingsFileReader.h"
+#include "app/settingsfile/SettingsFileReader.h"
 
 #include <QDir>
 #include <QFile>

@@ -8,7 +8,7 @@
 #include "HostileDocuments.h"
 
 #include "app/LaunchOptionParser.h"
-#include "app/window/SettingsFileReader.h"
+#include "app/settingsfile/SettingsFileReader.h"
 #include "common/config/TorkConfigFile.h"
 #include "common/xml/TorkXmlGuard.h"
 #include "common/xml/TorkXml_FlushUnknownElement.h"

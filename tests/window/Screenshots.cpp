@@ -7,15 +7,14 @@
 //
 // The build target "screenshots" runs it on a virtual display and puts them into docs/images.
 
-#include "DemoLog.h"
-
-#include "app/window/LogPanel.h"
-#include "app/window/LogSettingsDialog.h"
 #include "app/window/MainWindow.h"
 #include "app/window/ReportDialog.h"
-#include "app/window/SettingsEditor.h"
 #include "app/window/SystemReport.h"
+#include "app/window/log/LogPanel.h"
+#include "app/window/log/LogSettingsDialog.h"
+#include "app/window/settings/SettingsEditor.h"
 #include "common/log/TorkLog.h"
+#include "support/DemoLog.h"
 #include "support/TestFiles.h"
 
 #include <QApplication>

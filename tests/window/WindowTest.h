@@ -3,10 +3,9 @@
 
 #pragma once
 
-#include "DemoLog.h"
-
 #include "app/window/MainWindow.h"
 #include "common/log/TorkLog.h"
+#include "support/DemoLog.h"
 #include "support/TestFiles.h"
 
 #include <QApplication>

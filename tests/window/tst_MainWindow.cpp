@@ -7,15 +7,15 @@
 
 #include "app/UserMessages.h"
 #include "app/window/FileTabs.h"
-#include "app/window/LogFilterBar.h"
-#include "app/window/LogModel.h"
-#include "app/window/LogPanel.h"
-#include "app/window/LogSettingsDialog.h"
-#include "app/window/LogView.h"
-#include "app/window/NoticeBar.h"
 #include "app/window/PlacesPanel.h"
 #include "app/window/ReportDialog.h"
-#include "app/window/SettingsEditor.h"
+#include "app/window/log/LogFilterBar.h"
+#include "app/window/log/LogModel.h"
+#include "app/window/log/LogPanel.h"
+#include "app/window/log/LogSettingsDialog.h"
+#include "app/window/log/LogView.h"
+#include "app/window/log/NoticeBar.h"
+#include "app/window/settings/SettingsEditor.h"
 
 #include <QAbstractButton>
 #include <QCheckBox>

@@ -5,17 +5,17 @@
 
 #include "WindowTest.h"
 
-#include "app/window/FileSizeText.h"
-#include "app/window/InstanceList.h"
-#include "app/window/LogFileList.h"
-#include "app/window/LogFilter.h"
-#include "app/window/LogHealth.h"
-#include "app/window/LogPreferences.h"
+#include "app/logfile/LogFileList.h"
+#include "app/logfile/LogFilter.h"
+#include "app/runninglog/InstanceList.h"
+#include "app/runninglog/LogHealth.h"
+#include "app/runninglog/LogPreferences.h"
+#include "app/runninglog/RunningLog.h"
 #include "app/window/RecentFiles.h"
-#include "app/window/RunningLog.h"
-#include "app/window/SeverityIcons.h"
 #include "app/window/SystemReport.h"
 #include "app/window/WindowSettings.h"
+#include "app/window/log/FileSizeText.h"
+#include "app/window/log/SeverityIcons.h"
 
 #include <QLockFile>
 #include <QMenu>

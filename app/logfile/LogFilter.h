@@ -1,0 +1,62 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include "app/logfile/LogEntry.h"
+
+#include <QPair>
+#include <QRegularExpression>
+#include <QString>
+#include <QStringMatcher>
+#include <QVector>
+
+/// Which lines of a log are shown: by severity, by text, by run.
+///
+/// A plain value; any thread may use its own copy.
+///
+///     LogFilter filter;
+///     filter.SetText("disk (full|gone)", true, false);
+///     if (filter.Matches(line))
+///         ranges = filter.Ranges(line);
+class LogFilter
+{
+public:
+    /// Shows everything.
+    LogFilter();
+
+    /// Shows or hides one severity. Lines without one are shown as long as all severities are.
+    void SetSeverity(LogEntry::Severity severity, bool shown);
+    bool Shows(LogEntry::Severity severity) const;
+
+    /// Sets the text that lines have to contain, or the regular expression they have to match.
+    ///
+    /// @param text  empty: every line matches
+    /// @return false, with the filter as it was, if the expression is not valid
+    bool SetText(QString const& text, bool isExpression, bool caseSensitive);
+
+    /// Whether entries of runs before the newest are shown.
+    void SetEarlierRuns(bool shown) { m_earlierRuns = shown; }
+    bool earlierRuns() const { return m_earlierRuns; }
+
+    bool hasText() const { return !m_expression.pattern().isEmpty(); }
+
+    /// Whether a line, as it stands in the file, contains the text.
+    bool Matches(QString const& line) const;
+
+    /// The places in a text where it does: start and length, in order.
+    QVector<QPair<int, int>> Ranges(QString const& text) const;
+
+    /// What is wrong with an expression, for people; empty if it is valid.
+    static QString ErrorOf(QString const& expression);
+
+    /// Whether both let the same lines through the text filter.
+    bool HasSameText(LogFilter const& other) const;
+
+private:
+    unsigned m_severities;
+    bool m_earlierRuns = true;
+    bool m_isExpression = false;
+    QStringMatcher m_matcher; // skips ahead, so it is far faster on many lines than contains()
+    QRegularExpression m_expression;
+};

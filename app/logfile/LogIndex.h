@@ -1,0 +1,115 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include "app/logfile/LogFilter.h"
+#include "app/logfile/LogLineParser.h"
+#include "app/logfile/LogRows.h"
+
+#include <QByteArray>
+
+#include <vector>
+
+/// Knows where the lines of a log file begin, how serious they are, and which run wrote them.
+///
+/// The log opens its file without truncating it and writes from the start on. After a restart the
+/// newest entries therefore stand on top and older ones behind them, the first of those torn as a
+/// rule; behind them may be what even earlier runs left:
+///
+///     newest run  |  rest of the run before  |  rest of an earlier one
+///                 ^ the seam                 ^ another
+///
+/// A seam is where an entry is older than both the entry before it and the first entry of its run.
+/// While the newest run writes on, its seam moves; Begin() goes back to the last entry before it,
+/// and Feed() stops as soon as it meets a line that it knows.
+///
+/// Pure: it is fed the bytes. One thread at a time.
+///
+///     qint64 offset = index.Begin();
+///     while (... && index.Feed(bytes, count)) {}
+///     index.End();
+///     LogRows rows = index.Rows(filter);
+class LogIndex
+{
+public:
+    explicit LogIndex(LogLineParser const& parser = LogLineParser(),
+                      LogFilter const& filter = LogFilter());
+
+    /// Starts a pass over the file.
+    ///
+    /// @return the offset from which the file has to be read: 0 in the first pass
+    qint64 Begin();
+
+    /// Takes the next bytes of the file.
+    ///
+    /// @return false if the rest of the file is known from the pass before; read no further then
+    bool Feed(char const* bytes, int count);
+
+    /// Ends the pass at the end of the file; a last line without line end counts as a line.
+    void End();
+
+    /// The lines that a filter lets through. Its text is the one that the index was made with.
+    LogRows Rows(LogFilter const& filter) const;
+
+    /// Where the next pass is going to begin. What lies before is settled.
+    qint64 resumeOffset() const;
+
+    /// How many lines the file has.
+    size_t size() const { return m_starts.size(); }
+
+    /// How many runs left entries in the file, at most 64: what lies behind is not told apart.
+    size_t runs() const { return m_runs.size(); }
+
+    /// Whether any entry has an elapsed time.
+    bool hasElapsed() const { return m_hasElapsed; }
+
+    /// How far into a line the text filter looks, in bytes.
+    static constexpr int LineLimit = 64 * 1024;
+
+private:
+    struct Run
+    {
+        size_t firstLine = 0;
+        size_t timedLines = 0;
+        qint64 firstTime = -1;
+        bool hasDate = false;
+    };
+
+    size_t resumeLine() const;
+    void forgetFrom(size_t line);
+    bool addLine(char const* line, int length, bool complete);
+    quint8 markOf(LogLineParser::Parts const& parts, char const* line, int length) const;
+    bool isOlder(LogLineParser::Parts const& parts) const;
+    void beginRun(LogLineParser::Parts const& parts);
+    bool joinKnownLines(qint64 start);
+    void noteTime(LogLineParser::Parts const& parts);
+
+    LogLineParser m_parser;
+    LogFilter m_filter;
+
+    std::vector<qint64> m_starts;
+    std::vector<quint8> m_marks;
+    std::vector<Run> m_runs; // newest first, as in the file
+    bool m_hasElapsed = false;
+    bool m_lastIsComplete = true;
+
+    // The newest run's last entry with a time: behind it the next pass begins.
+    bool m_newestIsTimed = false;
+    size_t m_newestLastTimed = 0;
+    qint64 m_newestLastTime = -1;
+
+    // The pass.
+    qint64 m_position = 0;
+    qint64 m_lineStart = 0;
+    QByteArray m_partialLine;
+    bool m_lineIsPartial = false;
+    bool m_runHasTimed = false;
+    size_t m_lastTimed = 0;
+    qint64 m_lastTime = -1;
+
+    // What the pass before found behind the seam.
+    std::vector<qint64> m_knownStarts;
+    std::vector<quint8> m_knownMarks;
+    std::vector<Run> m_knownRuns;
+};

@@ -1,0 +1,167 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/logfile/LogLineParser.h"
+
+#include <QObject>
+
+#include <algorithm>
+#include <cstring>
+
+namespace {
+
+// No stamp is longer; a severity name further on is part of a message.
+constexpr int LongestStamp = 80;
+
+QStringList WithDefault(QStringList texts, QString const& byDefault)
+{
+    texts.append(byDefault);
+    texts.removeAll(QString());
+    texts.removeDuplicates();
+    return texts;
+}
+
+bool IsDigit(char c)
+{
+    return c >= '0' && c <= '9';
+}
+
+bool HoldsDigit(char const* text, int length)
+{
+    return std::any_of(text, text + length, IsDigit);
+}
+
+// The number of bytes that "[-12] " takes up to its "]"; 0 if there is no such number.
+int NumberInBrackets(char const* text, int length)
+{
+    int at = 1;
+    if (at < length && text[at] == '-')
+        ++at;
+    const int firstDigit = at;
+    while (at < length && IsDigit(text[at]))
+        ++at;
+    const bool complete = at > firstDigit && at < length && text[at] == ']';
+    return length > 0 && text[0] == '[' && complete ? at + 1 : 0;
+}
+
+} // namespace
+
+LogLineParser::LogLineParser() : LogLineParser(QStringList(), QStringList()) {}
+
+LogLineParser::LogLineParser(QStringList const& dateFormats, QStringList const& elapsedPrefixes)
+{
+    const QStringList formats = WithDefault(dateFormats, QStringLiteral("yyyy-MM-dd hh:mm:ss.z"));
+    for (QString const& format : formats)
+        m_readers.emplace_back(format);
+    const QStringList prefixes = WithDefault(elapsedPrefixes, QStringLiteral("dT:"));
+    for (QString const& prefix : prefixes)
+        m_elapsedPrefixes.push_back(prefix.toLatin1());
+
+    // The log translates its severity names, so a file may hold both kinds.
+    char const* const names[] = {"Trace", "Notification", "Warning", "Error", "Fatal"};
+    for (int i = 0; i < LogEntry::None; ++i) {
+        const auto severity = static_cast<LogEntry::Severity>(i);
+        const QByteArray translated = QObject::tr(names[i]).toLatin1();
+        m_names.push_back({names[i], severity});
+        if (translated != names[i] && !translated.isEmpty())
+            m_names.push_back({translated, severity});
+    }
+}
+
+LogLineParser::Name const* LogLineParser::nameAt(char const* text, int length) const
+{
+    for (Name const& name : m_names) {
+        const int size = name.text.size();
+        if (length < size || *text != name.text.at(0) ||
+            std::memcmp(text, name.text.constData(), static_cast<size_t>(size)) != 0)
+            continue;
+        if (length == size || text[size] == ' ')
+            return &name;
+    }
+    return nullptr;
+}
+
+bool LogLineParser::findByFormat(char const* line, int length, Parts& parts) const
+{
+    for (LogTimeReader const& reader : m_readers) {
+        const LogTimeReader::Stamp stamp = reader.Read(line, length);
+        const int blank = stamp.length;
+        if (blank < 0 || blank >= length || line[blank] != ' ')
+            continue;
+
+        Name const* name = nameAt(line + blank + 1, length - blank - 1);
+        const bool nameless = blank + 1 < length && line[blank + 1] == ' ';
+        if (!name && !nameless)
+            continue;
+        parts.isEntry = true;
+        parts.timeLength = blank;
+        parts.timeKey = stamp.key;
+        parts.hasDate = reader.hasDate();
+        parts.severity = name ? name->severity : LogEntry::None;
+        parts.message = std::min(length, blank + 2 + (name ? name->text.size() : 0));
+        return true;
+    }
+    return false;
+}
+
+bool LogLineParser::findByName(char const* line, int length, Parts& parts) const
+{
+    const int limit = std::min(length, LongestStamp);
+    for (int blank = 0; blank < limit; ++blank) {
+        if (line[blank] != ' ')
+            continue;
+        Name const* name = nameAt(line + blank + 1, length - blank - 1);
+        if (!name)
+            continue;
+        if (blank > 0 && !HoldsDigit(line, blank))
+            return false;
+        parts.isEntry = true;
+        parts.timeLength = blank;
+        parts.severity = name->severity;
+        parts.message = std::min(length, blank + 2 + name->text.size());
+        return true;
+    }
+    return false;
+}
+
+void LogLineParser::findElapsed(char const* line, int length, Parts& parts) const
+{
+    char const* const rest = line + parts.message;
+    const int restLength = length - parts.message;
+    for (QByteArray const& prefix : m_elapsedPrefixes) {
+        const int size = prefix.size();
+        if (restLength < size ||
+            std::memcmp(rest, prefix.constData(), static_cast<size_t>(size)) != 0)
+            continue;
+        const int number = NumberInBrackets(rest + size, restLength - size);
+        const int after = size + number;
+        if (number == 0 || (after < restLength && rest[after] != ' '))
+            continue;
+        parts.elapsed = parts.message + size + 1;
+        parts.elapsedLength = number - 2;
+        parts.message = std::min(length, parts.message + after + 1);
+        return;
+    }
+}
+
+LogLineParser::Parts LogLineParser::Find(char const* line, int length) const
+{
+    Parts parts;
+    length = std::min(length, SearchLimit);
+    if (findByFormat(line, length, parts) || findByName(line, length, parts))
+        findElapsed(line, length, parts);
+    return parts;
+}
+
+LogEntry LogLineParser::Parse(QByteArray const& line) const
+{
+    const Parts parts = Find(line.constData(), line.size());
+    LogEntry entry;
+    entry.isEntry = parts.isEntry;
+    entry.severity = parts.severity;
+    entry.time = QString::fromLatin1(line.constData(), parts.timeLength);
+    entry.elapsed = QString::fromLatin1(line.constData() + parts.elapsed, parts.elapsedLength);
+    entry.message =
+        QString::fromLatin1(line.constData() + parts.message, line.size() - parts.message);
+    return entry;
+}

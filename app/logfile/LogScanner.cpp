@@ -1,0 +1,184 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/logfile/LogScanner.h"
+
+#include <QFile>
+#include <QFileInfo>
+
+#include <algorithm>
+
+namespace {
+
+constexpr int SliceSize = 1 << 20;
+constexpr int HeadSize = 256;
+constexpr int AnchorSize = 256;
+
+// So long after a change another one may carry the same time of change.
+constexpr qint64 StampUncertainty = 2000; // milliseconds
+
+QByteArray BytesAt(QFile& file, qint64 offset, qint64 count)
+{
+    return file.seek(offset) ? file.read(count) : QByteArray();
+}
+
+} // namespace
+
+LogScanner::LogScanner(QObject* parent) : QObject(parent), m_rows(std::make_shared<LogRows>())
+{
+    qRegisterMetaType<LogUpdate>();
+    qRegisterMetaType<LogFilter>();
+    qRegisterMetaType<LogLineParser>();
+}
+
+void LogScanner::Open(int request, QString const& path, LogLineParser const& parser,
+                      LogFilter const& filter)
+{
+    m_request = request;
+    m_path = path;
+    m_parser = parser;
+    m_filter = filter;
+    if (isWanted())
+        readAnew();
+}
+
+void LogScanner::SetFilter(int request, LogFilter const& filter)
+{
+    const bool sameText = filter.HasSameText(m_filter);
+    m_request = request;
+    m_filter = filter;
+    if (!isWanted())
+        m_complete = m_complete && sameText; // the text is still to be looked for
+    else if (sameText && m_complete)
+        tell(true);
+    else
+        readAnew();
+}
+
+void LogScanner::startOver()
+{
+    m_index = LogIndex(m_parser, m_filter);
+    m_rows = std::make_shared<LogRows>();
+    m_head.clear();
+    m_anchor.clear();
+    m_size = 0;
+    m_modified = QDateTime();
+    m_complete = false;
+}
+
+void LogScanner::readAnew()
+{
+    startOver();
+    QFile file(m_path);
+    if (!QFileInfo(m_path).isFile() || !file.open(QIODevice::ReadOnly)) {
+        m_error = QFileInfo::exists(m_path) ? file.errorString() : QString();
+        tellMissing();
+        return;
+    }
+    m_exists = true;
+    m_error.clear();
+    if (readFrom(file, m_index.Begin()))
+        tell(true);
+}
+
+void LogScanner::tellMissing()
+{
+    startOver();
+    m_exists = false;
+    m_complete = true;
+    tell(true);
+}
+
+// False if another request has come up meanwhile.
+bool LogScanner::readFrom(QFile& file, qint64 offset)
+{
+    m_modified = QFileInfo(m_path).lastModified();
+    const qint64 size = file.size();
+    QByteArray slice(SliceSize, Qt::Uninitialized);
+    bool more = file.seek(offset);
+    int told = 0;
+    while (more) {
+        if (!isWanted())
+            return false;
+        const qint64 count = file.read(slice.data(), slice.size());
+        if (count <= 0)
+            break;
+        more = m_index.Feed(slice.constData(), static_cast<int>(count));
+        const int percent = size > 0 ? static_cast<int>(file.pos() * 100 / size) : 100;
+        if (percent >= told + 10) {
+            told = percent;
+            emit Progressed(m_request, percent);
+        }
+    }
+    m_index.End();
+    m_complete = true;
+    noteFile(file);
+    return true;
+}
+
+void LogScanner::noteFile(QFile& file)
+{
+    m_size = file.size();
+    m_anchorEnd = m_index.resumeOffset();
+    m_head = BytesAt(file, 0, std::min<qint64>(HeadSize, m_anchorEnd));
+    const qint64 start = std::max<qint64>(0, m_anchorEnd - AnchorSize);
+    m_anchor = BytesAt(file, start, m_anchorEnd - start);
+}
+
+bool LogScanner::isSameFile(QFile& file) const
+{
+    if (file.size() < m_size || !BytesAt(file, 0, HeadSize).startsWith(m_head))
+        return false;
+    return BytesAt(file, m_anchorEnd - m_anchor.size(), m_anchor.size()) == m_anchor;
+}
+
+bool LogScanner::looksUnchanged() const
+{
+    const QFileInfo file(m_path);
+    if (!file.isFile())
+        return !m_exists;
+    if (!m_exists || file.size() != m_size || file.lastModified() != m_modified)
+        return false;
+    return qAbs(m_modified.msecsTo(QDateTime::currentDateTime())) > StampUncertainty;
+}
+
+void LogScanner::Poll()
+{
+    if (m_path.isEmpty() || !isWanted() || (m_complete && looksUnchanged())) {
+        emit Polled();
+        return;
+    }
+
+    QFile file(m_path);
+    const bool opened = QFileInfo(m_path).isFile() && file.open(QIODevice::ReadOnly);
+    if (!opened && (m_exists || !m_complete)) {
+        m_error = QFileInfo::exists(m_path) ? file.errorString() : QString();
+        tellMissing();
+    } else if (opened && (!m_complete || !m_exists || !isSameFile(file))) {
+        readAnew();
+    } else if (opened) {
+        m_complete = false; // until the pass is over
+        if (readFrom(file, m_index.Begin()))
+            tell(false);
+    }
+    emit Polled();
+}
+
+void LogScanner::tell(bool isReset)
+{
+    LogUpdate update;
+    update.request = m_request;
+    update.rows = std::make_shared<LogRows>(m_index.Rows(m_filter));
+    if (!isReset)
+        update.Compare(*m_rows);
+    const bool nothingNew = !update.isReset && update.removed == 0 && update.inserted == 0 &&
+                            update.changedTail == 0 && update.rows->size() == m_rows->size();
+    m_rows = update.rows;
+    update.exists = m_exists;
+    update.error = m_error;
+    update.fileSize = m_size;
+    update.lines = m_index.size();
+    update.hasElapsed = m_index.hasElapsed();
+    if (!nothingNew)
+        emit Updated(update);
+}

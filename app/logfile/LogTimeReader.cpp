@@ -1,0 +1,291 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/logfile/LogTimeReader.h"
+
+#include <QLocale>
+#include <QTime>
+
+#include <algorithm>
+#include <cstring>
+
+namespace {
+
+bool IsDigit(char c)
+{
+    return c >= '0' && c <= '9';
+}
+
+// Letters of any language: what is not a letter of ASCII but above it may be one.
+bool IsWordCharacter(char c)
+{
+    const unsigned char byte = static_cast<unsigned char>(c);
+    return (byte >= 'a' && byte <= 'z') || (byte >= 'A' && byte <= 'Z') || byte >= 0x80;
+}
+
+// One-digit milliseconds: "5" is a half second for newer toolkits, 5 ms for older ones.
+bool WritesFractions()
+{
+    return QTime(0, 0, 0, 5).toString(QStringLiteral("z")) == QLatin1String("005");
+}
+
+// How many of equal letters make one field.
+int TakenAtOnce(QChar letter, int count)
+{
+    switch (letter.toLatin1()) {
+    case 'y':
+        return count >= 4 ? 4 : std::min(count, 2);
+    case 'M':
+    case 'd':
+        return std::min(count, 4);
+    case 'z':
+        return count >= 3 ? 3 : 1;
+    case 'A':
+    case 'a':
+    case 't':
+        return 1;
+    default:
+        return std::min(count, 2);
+    }
+}
+
+int ScaledToMilliseconds(int value, int digits)
+{
+    for (; digits < 3; ++digits)
+        value *= 10;
+    return value;
+}
+
+} // namespace
+
+struct LogTimeReader::Values
+{
+    int number[HalfDay + 1] = {};
+};
+
+LogTimeReader::LogTimeReader(QString const& format) : m_fractionOfSecond(WritesFractions())
+{
+    parseFormat(format);
+
+    bool found[HalfDay + 1] = {};
+    for (Token const& token : m_tokens)
+        found[token.field] = true;
+    m_hasDate = (found[Year] || found[ShortYear]) && found[Month] && found[Day];
+    m_hasTime = found[Hour] && found[Minute];
+}
+
+void LogTimeReader::parseFormat(QString const& format)
+{
+    const QString fieldLetters = QStringLiteral("dMyhHmszAat");
+    int position = 0;
+    while (position < format.length()) {
+        const QChar letter = format.at(position);
+        if (letter == QLatin1Char('\'')) {
+            position = addQuoted(format, position);
+            continue;
+        }
+        int count = 1;
+        while (position + count < format.length() && format.at(position + count) == letter)
+            ++count;
+        if (fieldLetters.contains(letter))
+            addFields(letter, count);
+        else
+            addLiteral(QString(count, letter));
+        position += count;
+        if ((letter == QLatin1Char('A') || letter == QLatin1Char('a')) &&
+            position < format.length() && format.at(position).toLower() == QLatin1Char('p'))
+            ++position;
+    }
+}
+
+// Quoted text stands for itself, and two quotes in a row for one, as the toolkit writes them.
+int LogTimeReader::addQuoted(QString const& format, int position)
+{
+    const QLatin1Char quote('\'');
+    if (format.mid(position, 2) == QLatin1String("''")) {
+        addLiteral(QString(quote));
+        return position + 2;
+    }
+
+    QString text;
+    for (++position; position < format.length(); ++position) {
+        if (format.at(position) != quote) {
+            text += format.at(position);
+        } else if (format.mid(position, 2) == QLatin1String("''")) {
+            text += quote;
+            ++position;
+        } else {
+            ++position;
+            break;
+        }
+    }
+    addLiteral(text);
+    return position;
+}
+
+void LogTimeReader::addLiteral(QString const& text)
+{
+    if (text.isEmpty())
+        return;
+    if (!m_tokens.empty() && m_tokens.back().kind == Exactly)
+        m_tokens.back().text += text.toLatin1();
+    else
+        m_tokens.push_back({Exactly, Literal, 0, 0, text.toLatin1()});
+}
+
+void LogTimeReader::addNumber(Field field, int minimum, int maximum)
+{
+    m_tokens.push_back({Number, field, minimum, maximum, QByteArray()});
+}
+
+// `count` equal letters, which may be more than one field: "yyyyyy" is a long and a short year.
+void LogTimeReader::addFields(QChar letter, int count)
+{
+    while (count > 0) {
+        const int taken = TakenAtOnce(letter, count);
+        addField(letter, taken);
+        count -= taken;
+    }
+}
+
+void LogTimeReader::addField(QChar letter, int length)
+{
+    switch (letter.toLatin1()) {
+    case 'y':
+        if (length == 1)
+            addLiteral(QString(letter));
+        else
+            addNumber(length == 4 ? Year : ShortYear, length, length);
+        break;
+    case 'M':
+        if (length < 3)
+            addNumber(Month, length, 2);
+        else
+            addMonthName();
+        break;
+    case 'd':
+        if (length < 3)
+            addNumber(Day, length, 2);
+        else
+            m_tokens.push_back({Word, Literal, 0, 0, QByteArray()});
+        break;
+    case 'h':
+    case 'H':
+        addNumber(Hour, length, 2);
+        break;
+    case 'm':
+        addNumber(Minute, length, 2);
+        break;
+    case 's':
+        addNumber(Second, length, 2);
+        break;
+    case 'z':
+        addNumber(Fraction, length, 3);
+        break;
+    default: { // half of the day, time zone
+        const Field field = letter == QLatin1Char('t') ? Literal : HalfDay;
+        m_tokens.push_back({Word, field, 0, 0, QByteArray()});
+    }
+    }
+}
+
+void LogTimeReader::addMonthName()
+{
+    m_tokens.push_back({MonthName, Month, 0, 0, QByteArray()});
+    if (!m_monthNames.empty())
+        return;
+    for (QLocale const& locale : {QLocale::system(), QLocale::c()}) {
+        for (int month = 1; month <= 12; ++month) {
+            for (QLocale::FormatType type : {QLocale::LongFormat, QLocale::ShortFormat}) {
+                const QString name = locale.monthName(month, type);
+                m_monthNames.push_back(name.toLatin1());
+            }
+        }
+    }
+}
+
+LogTimeReader::Stamp LogTimeReader::Read(char const* text, int length) const
+{
+    Stamp stamp;
+    Values values;
+    char const* at = text;
+    char const* const end = text + length;
+    for (Token const& token : m_tokens) {
+        if (!readToken(token, at, end, values))
+            return stamp;
+    }
+
+    stamp.length = static_cast<int>(at - text);
+    if (!m_hasTime)
+        return stamp;
+    int const* number = values.number;
+    qint64 key = number[Year] + number[ShortYear];
+    key = key * 13 + number[Month];
+    key = key * 32 + number[Day];
+    key = key * 25 + number[Hour] + number[HalfDay];
+    key = key * 60 + number[Minute];
+    key = key * 61 + number[Second];
+    stamp.key = key * 1000 + number[Fraction];
+    return stamp;
+}
+
+bool LogTimeReader::readToken(Token const& token, char const*& at, char const* end,
+                              Values& values) const
+{
+    switch (token.kind) {
+    case Exactly:
+        if (end - at < token.text.size() ||
+            std::memcmp(at, token.text.constData(), static_cast<size_t>(token.text.size())) != 0)
+            return false;
+        at += token.text.size();
+        return true;
+    case Number:
+        return readNumber(token, at, end, values);
+    case MonthName:
+        return readMonth(at, end, values);
+    case Word:
+        break;
+    }
+
+    char const* const start = at;
+    while (at != end && IsWordCharacter(*at))
+        ++at;
+    if (token.field == HalfDay && at != start) {
+        const bool afternoon = *start == 'p' || *start == 'P';
+        const bool twelve = values.number[Hour] == 12;
+        values.number[HalfDay] = afternoon ? (twelve ? 0 : 12) : (twelve ? -12 : 0);
+    }
+    return at != start;
+}
+
+bool LogTimeReader::readNumber(Token const& token, char const*& at, char const* end,
+                               Values& values) const
+{
+    int value = 0;
+    int digits = 0;
+    while (at != end && digits < token.maximum && IsDigit(*at)) {
+        value = value * 10 + (*at - '0');
+        ++at;
+        ++digits;
+    }
+    if (digits < token.minimum)
+        return false;
+    if (token.field == Fraction && m_fractionOfSecond)
+        value = ScaledToMilliseconds(value, digits);
+    values.number[token.field] = value;
+    return true;
+}
+
+bool LogTimeReader::readMonth(char const*& at, char const* end, Values& values) const
+{
+    for (size_t i = 0; i < m_monthNames.size(); ++i) {
+        QByteArray const& name = m_monthNames[i];
+        if (name.isEmpty() || end - at < name.size() ||
+            std::memcmp(at, name.constData(), static_cast<size_t>(name.size())) != 0)
+            continue;
+        at += name.size();
+        values.number[Month] = static_cast<int>(i / 2 % 12) + 1;
+        return true;
+    }
+    return false;
+}

@@ -1,0 +1,69 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/runninglog/LogHealth.h"
+
+#include "app/runninglog/InstanceList.h"
+#include "app/runninglog/RunningLog.h"
+#include "common/log/TorkLog.h"
+
+#include <QCoreApplication>
+#include <QFileInfo>
+#include <QObject>
+#include <QStorageInfo>
+#include <QStringList>
+#include <QVariant>
+
+LogHealth::LogHealth() = default;
+
+LogHealth::~LogHealth() = default;
+
+QString LogHealth::Check()
+{
+    const QString problem = WritingProblem();
+    return problem.isEmpty() ? sharingProblem() : problem;
+}
+
+QString LogHealth::WritingProblem()
+{
+    TorkLog* log = TorkLog::logger();
+    if (!log)
+        return QObject::tr("There is no log");
+    if (!log->enabled())
+        return QObject::tr("The log is switched off");
+
+    // The log keeps the text of its last failure also when a later try succeeds.
+    const QFileInfo file(RunningLog::FileName());
+    const bool usable = file.isFile() && file.isWritable();
+    if (!log->errorString().isEmpty() && !usable)
+        return QObject::tr("The log cannot be written: %1").arg(log->errorString());
+    if (file.exists() && !usable)
+        return QObject::tr("The log cannot be written: %1 is no writable file")
+            .arg(file.filePath());
+
+    const QStorageInfo storage(file.path());
+    if (storage.isValid() && storage.isReady() && storage.bytesTotal() > 0 &&
+        storage.bytesAvailable() == 0)
+        return QObject::tr("The log cannot be written: the disk is full");
+    return QString();
+}
+
+QString LogHealth::sharingProblem()
+{
+    const QString logFile = RunningLog::FileName();
+    if (!m_instances || m_logFile != logFile) {
+        m_logFile = logFile;
+        m_instances = std::make_unique<InstanceList>(
+            QCoreApplication::instance()->property("DataPath").toString() +
+            QLatin1String("running-") + QFileInfo(logFile).fileName());
+    }
+
+    QStringList numbers;
+    const QList<qint64> others = m_instances->Others();
+    for (qint64 number : others)
+        numbers.append(QString::number(number));
+    if (numbers.isEmpty())
+        return QString();
+    return QObject::tr("Another running program writes to the same log (process %1)")
+        .arg(numbers.join(QLatin1String(", ")));
+}

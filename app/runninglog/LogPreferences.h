@@ -1,0 +1,51 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include "app/logfile/LogLineParser.h"
+
+#include <QString>
+
+/// The log's settings, those in force and those that its settings file keeps for the next start.
+///
+/// The log has setters for some of its settings only; the others are changed in its settings file.
+/// Nothing here is logged. GUI thread. Settings: docs/log-settings.md.
+///
+///     LogPreferences preferences = LogPreferences::Read();
+///     preferences.elapsedTime = true;
+///     const QString error = preferences.Apply();
+struct LogPreferences
+{
+    // Set at once.
+    bool enabled = true;
+    bool elapsedTime = false;
+    bool echo = false;
+    int maxFiles = 10;
+
+    // From the next start on.
+    QString elapsedPrefix;
+    QString dateFormat;
+    QString filePrefix;
+
+    /// What the log has in force, and for the rest what its settings file says.
+    static LogPreferences Read();
+
+    /// Puts them in force as far as that is possible, and saves all of them.
+    ///
+    /// @return the reason of a failure; empty if all is well
+    QString Apply() const;
+
+    /// The log's settings file.
+    static QString FileName();
+
+    /// A parser for what the log writes, by its settings file.
+    static LogLineParser Parser();
+
+    /// Whether a settings file keeps this text as a value: not empty, printable ASCII, neither
+    /// "]]>" nor a "%" with a digit in it.
+    static bool IsKept(QString const& text);
+
+    /// Whether log files can be called so: kept, no "/", and not "." or "..".
+    static bool IsFilePrefix(QString const& text);
+};

@@ -1,0 +1,34 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include "app/logfile/LogFilter.h"
+
+#include <QStyledItemDelegate>
+
+/// Draws the cells of a log view: headings between runs, colours of severities, and the places
+/// where the filter's text was found.
+class LogDelegate : public QStyledItemDelegate
+{
+    Q_OBJECT
+
+public:
+    explicit LogDelegate(QObject* parent = nullptr);
+
+    /// Marks what this filter finds.
+    void SetFilter(LogFilter const& filter) { m_filter = filter; }
+
+    void paint(QPainter* painter, QStyleOptionViewItem const& option,
+               QModelIndex const& index) const override;
+
+protected:
+    void initStyleOption(QStyleOptionViewItem* option, QModelIndex const& index) const override;
+
+private:
+    void paintMarked(QPainter* painter, QStyleOptionViewItem const& option,
+                     QVector<QPair<int, int>> const& ranges) const;
+    static void PaintHeading(QPainter* painter, QStyleOptionViewItem const& option);
+
+    LogFilter m_filter;
+};

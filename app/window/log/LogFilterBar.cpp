@@ -1,0 +1,140 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/log/LogFilterBar.h"
+
+#include "app/window/log/LogModel.h"
+#include "app/window/log/SeverityIcons.h"
+
+#include <QCheckBox>
+#include <QEvent>
+#include <QHBoxLayout>
+#include <QLabel>
+#include <QLineEdit>
+#include <QToolButton>
+
+namespace {
+
+constexpr int TypingPause = 150; // milliseconds
+
+} // namespace
+
+LogFilterBar::LogFilterBar(QWidget* parent)
+    : QWidget(parent), m_text(new QLineEdit), m_error(new QLabel)
+{
+    m_text->setPlaceholderText(tr("Filter"));
+    m_text->setClearButtonEnabled(true);
+    m_text->setAccessibleName(tr("Filter by text"));
+    m_text->setAcceptDrops(false); // files dropped here are for the window
+    m_text->setToolTip(tr("Show only lines that contain this text (Ctrl+F)"));
+    m_error->setAccessibleName(tr("Error in the filter"));
+    m_error->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
+    m_error->setWordWrap(true);
+    m_error->hide();
+
+    m_case = makeOption(tr("Aa"), tr("Match case"), tr("Tell capital letters from small ones"));
+    m_expression = makeOption(tr(".*"), tr("Regular expression"),
+                              tr("The text is a regular expression, matched against whole lines"));
+
+    auto* row = new QHBoxLayout;
+    row->setSpacing(6);
+    row->addWidget(m_text, 1);
+    row->addWidget(m_case);
+    row->addWidget(m_expression);
+    row->addSpacing(8);
+    addSeverities();
+    for (QToolButton* button : qAsConst(m_severities))
+        row->addWidget(button);
+
+    auto* layout = new QVBoxLayout(this);
+    layout->setContentsMargins(0, 0, 0, 0);
+    layout->setSpacing(4);
+    layout->addLayout(row);
+    layout->addWidget(m_error);
+
+    m_typing.setSingleShot(true);
+    m_typing.setInterval(TypingPause);
+    connect(&m_typing, &QTimer::timeout, this, &LogFilterBar::apply);
+    connect(m_text, &QLineEdit::textChanged, this, [this] { m_typing.start(); });
+    connect(m_text, &QLineEdit::returnPressed, this, &LogFilterBar::apply);
+}
+
+QCheckBox* LogFilterBar::makeOption(QString const& text, QString const& name,
+                                    QString const& toolTip)
+{
+    auto* option = new QCheckBox(text);
+    option->setAccessibleName(name);
+    option->setToolTip(name + QLatin1String(": ") + toolTip);
+    connect(option, &QCheckBox::toggled, this, &LogFilterBar::apply);
+    return option;
+}
+
+void LogFilterBar::addSeverities()
+{
+    for (int i = 0; i < LogEntry::None; ++i) {
+        const QString name = LogModel::SeverityName(static_cast<LogEntry::Severity>(i));
+        auto* button = new QToolButton;
+        button->setCheckable(true);
+        button->setChecked(true);
+        button->setFocusPolicy(Qt::TabFocus);
+        button->setText(name);
+        button->setAccessibleName(tr("Show %1").arg(name));
+        button->setToolTip(
+            tr("Show or hide entries of severity %1 (Ctrl+%2)").arg(name).arg(i + 1));
+        button->setShortcut(QKeySequence(Qt::CTRL | (Qt::Key_1 + i)));
+        button->setToolButtonStyle(Qt::ToolButtonIconOnly);
+        connect(button, &QToolButton::toggled, this, &LogFilterBar::apply);
+        m_severities.append(button);
+    }
+    updateIcons();
+}
+
+void LogFilterBar::updateIcons()
+{
+    for (int i = 0; i < m_severities.size(); ++i)
+        m_severities.at(i)->setIcon(
+            SeverityIcons::SwitchIcon(static_cast<LogEntry::Severity>(i), palette()));
+}
+
+void LogFilterBar::changeEvent(QEvent* event)
+{
+    QWidget::changeEvent(event);
+    if (event->type() == QEvent::PaletteChange)
+        updateIcons();
+}
+
+void LogFilterBar::FocusText()
+{
+    m_text->setFocus(Qt::ShortcutFocusReason);
+    m_text->selectAll();
+}
+
+void LogFilterBar::Clear()
+{
+    m_text->clear();
+    for (QToolButton* button : qAsConst(m_severities))
+        button->setChecked(true);
+    apply();
+}
+
+void LogFilterBar::SetEarlierRuns(bool shown)
+{
+    m_filter.SetEarlierRuns(shown);
+    emit Changed();
+}
+
+void LogFilterBar::apply()
+{
+    if (m_severities.size() < LogEntry::None)
+        return; // while the controls are being made
+    m_typing.stop();
+    for (int i = 0; i < m_severities.size(); ++i)
+        m_filter.SetSeverity(static_cast<LogEntry::Severity>(i), m_severities.at(i)->isChecked());
+
+    const bool isExpression = m_expression->isChecked();
+    const QString error = isExpression ? LogFilter::ErrorOf(m_text->text()) : QString();
+    m_error->setText(tr("Not a valid expression: %1").arg(error));
+    m_error->setVisible(!error.isEmpty());
+    m_filter.SetText(m_text->text(), isExpression, m_case->isChecked());
+    emit Changed();
+}

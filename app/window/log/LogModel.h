@@ -1,0 +1,129 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include "app/logfile/LogEntry.h"
+#include "app/logfile/LogFilter.h"
+#include "app/logfile/LogLineParser.h"
+#include "app/logfile/LogUpdate.h"
+
+#include <QAbstractTableModel>
+#include <QCache>
+#include <QFile>
+#include <QThread>
+#include <QTimer>
+
+class LogScanner;
+
+/// A log file as a table, live: time, severity, elapsed time and message of each line, oldest
+/// first.
+///
+/// Lines are read from the file when a view asks for them; all searching is done by a LogScanner in
+/// another thread. Heading rows stand between the runs. GUI thread.
+///
+///     LogModel model;
+///     model.Open(TorkLog::logger()->newLogFileName(), LogLineParser());
+///     view->setModel(&model);
+class LogModel : public QAbstractTableModel
+{
+    Q_OBJECT
+
+public:
+    enum Column { TimeColumn, SeverityColumn, ElapsedColumn, MessageColumn, ColumnCount };
+    enum Role {
+        SeverityRole = Qt::UserRole, ///< a LogEntry::Severity
+        HeadingRole,                 ///< whether the row is a heading
+        EarlierRole,                 ///< whether the row is of an earlier run
+        LineRole                     ///< the line as it stands in the file
+    };
+
+    explicit LogModel(QObject* parent = nullptr);
+    ~LogModel() override;
+
+    /// Shows another file, or the same one read anew. The rows come when they have been found.
+    ///
+    /// @param isCurrent  whether the running program writes it; only words the heading
+    void Open(QString const& path, LogLineParser const& parser, bool isCurrent);
+
+    /// Reads the file anew, whatever is known of it.
+    void Reload();
+
+    /// Shows the rows that a filter lets through.
+    void SetFilter(LogFilter const& filter);
+    LogFilter const& filter() const { return m_filter; }
+
+    /// While the model is paused it does not look for changes.
+    void SetPaused(bool paused);
+    bool isPaused() const { return m_paused; }
+
+    /// The nearest row after (step 1) or before (step -1) `row` that tells of a warning or worse;
+    /// -1 if there is none.
+    int FindProblem(int row, int step) const;
+
+    /// A row's line as it stands in the file, without its line end; empty for a heading.
+    ///
+    /// @param limit  the most bytes to read
+    QString LineText(int row, int limit) const;
+
+    QString const& path() const { return m_path; }
+    LogUpdate const& state() const { return m_state; }
+    bool isReading() const { return m_reading; }
+
+    int rowCount(QModelIndex const& parent = QModelIndex()) const override;
+    int columnCount(QModelIndex const& parent = QModelIndex()) const override;
+    QVariant data(QModelIndex const& index, int role) const override;
+    QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
+    Qt::ItemFlags flags(QModelIndex const& index) const override;
+
+    /// What a severity is called; empty for None.
+    static QString SeverityName(LogEntry::Severity severity);
+
+    /// How often the file is looked at, in milliseconds.
+    static constexpr int PollInterval = 250;
+
+    /// The most of a line that is shown, in bytes.
+    static constexpr int ShownLimit = 4096;
+
+signals:
+    /// The rows have been brought up to date.
+    void Refreshed();
+
+    /// Reading goes on; 100 when it is done.
+    void Progressed(int percent);
+
+    // To the scanner's thread.
+    void openWanted(int request, QString const& path, LogLineParser const& parser,
+                    LogFilter const& filter);
+    void filterWanted(int request, LogFilter const& filter);
+    void pollWanted();
+
+private:
+    void startScanner();
+    void take(LogUpdate const& update);
+    void reset(LogUpdate const& update);
+    void applyChange(LogUpdate const& update);
+    void poll();
+    bool isHeading(int row) const;
+    LogEntry const& entry(int row) const;
+    QString headingText(int row) const;
+    QString cellText(int row, int column) const;
+    QString toolTip(int row, int column) const;
+
+    QThread m_thread;
+    LogScanner* m_scanner = nullptr;
+    QTimer m_pollTimer;
+    bool m_polling = false;
+    bool m_paused = false;
+    bool m_reading = false;
+    bool m_isCurrent = false;
+    int m_request = 0;
+
+    QString m_path;
+    LogLineParser m_parser;
+    LogFilter m_filter;
+    LogUpdate m_state;
+    int m_rowCount = 0; // less than the rows of m_state only while a change is being announced
+    mutable QFile m_file;
+    mutable QCache<qint64, LogEntry> m_entries;
+};

@@ -1,0 +1,329 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/log/LogPanel.h"
+
+#include "app/logfile/LogFileList.h"
+#include "app/logfile/LogIndex.h"
+#include "app/runninglog/LogPreferences.h"
+#include "app/window/log/FileSizeText.h"
+#include "app/window/log/LogFilterBar.h"
+#include "app/window/log/LogModel.h"
+#include "app/window/log/LogView.h"
+
+#include <QCheckBox>
+#include <QComboBox>
+#include <QFileInfo>
+#include <QHBoxLayout>
+#include <QLabel>
+#include <QLocale>
+#include <QPlainTextEdit>
+#include <QSignalBlocker>
+#include <QSplitter>
+
+#include <functional>
+
+namespace {
+
+// Fills itself with the files that are there at the moment when it is opened.
+class FileBox : public QComboBox
+{
+public:
+    std::function<void()> fill;
+
+    void showPopup() override
+    {
+        fill();
+        QComboBox::showPopup();
+    }
+};
+
+} // namespace
+
+LogPanel::LogPanel(QWidget* parent)
+    : QWidget(parent), m_model(new LogModel(this)), m_view(new LogView(m_model)),
+      m_filterBar(new LogFilterBar), m_pause(new QCheckBox(tr("Pause"))),
+      m_follow(new QCheckBox(tr("Follow newest"))), m_splitter(new QSplitter(Qt::Vertical))
+{
+    makeControls();
+    makeLayout();
+    connectAll();
+    setFocusProxy(m_view);
+}
+
+// The model and the view tell of changes while they are deleted.
+LogPanel::~LogPanel()
+{
+    disconnect(m_view->selectionModel(), nullptr, this, nullptr);
+    disconnect(m_view, nullptr, this, nullptr);
+    disconnect(m_model, nullptr, this, nullptr);
+    disconnect(m_model, nullptr, m_view, nullptr);
+}
+
+void LogPanel::makeControls()
+{
+    auto* files = new FileBox;
+    files->fill = [this] {
+        fillFileList();
+    };
+    m_files = files;
+    m_files->setAccessibleName(tr("Log file"));
+    m_files->setToolTip(tr("The current log file and the older ones beside it"));
+    m_files->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon);
+    m_files->setMinimumContentsLength(16);
+
+    m_pause->setToolTip(tr("Leave the view as it is while the log goes on (Ctrl+Shift+P)"));
+    m_follow->setToolTip(tr("Keep the newest entry in view (Ctrl+Shift+N)"));
+    m_follow->setChecked(true);
+
+    m_line = new QPlainTextEdit;
+    m_line->setReadOnly(true);
+    m_line->setTabChangesFocus(true);
+    m_line->setAccessibleName(tr("The current line in full"));
+    m_line->setPlaceholderText(tr("Choose a line to see all of it here"));
+    m_line->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
+}
+
+void LogPanel::makeLayout()
+{
+    auto* label = new QLabel(tr("&File:"));
+    label->setBuddy(m_files);
+    auto* top = new QHBoxLayout;
+    top->setSpacing(8);
+    top->addWidget(label);
+    top->addWidget(m_files, 1);
+    top->addWidget(m_pause);
+    top->addWidget(m_follow);
+
+    m_splitter->setAccessibleName(tr("Log entries and current line"));
+    m_splitter->setChildrenCollapsible(false);
+    m_splitter->addWidget(m_view);
+    m_splitter->addWidget(m_line);
+    m_splitter->setStretchFactor(0, 1);
+    m_line->setMinimumHeight(m_line->fontMetrics().lineSpacing() * 2 + 12);
+    m_splitter->setSizes({400, m_line->fontMetrics().lineSpacing() * 3 + 12});
+
+    auto* layout = new QVBoxLayout(this);
+    layout->setContentsMargins(8, 8, 8, 8);
+    layout->setSpacing(6);
+    layout->addLayout(top);
+    layout->addWidget(m_filterBar);
+    layout->addWidget(m_splitter, 1);
+}
+
+void LogPanel::connectAll()
+{
+    connect(m_files, QOverload<int>::of(&QComboBox::activated), this, &LogPanel::chooseFile);
+    connect(m_pause, &QCheckBox::toggled, this, &LogPanel::SetPaused);
+    connect(m_follow, &QCheckBox::toggled, this, &LogPanel::SetFollowing);
+    connect(m_filterBar, &LogFilterBar::Changed, this, [this] {
+        m_model->SetFilter(m_filterBar->filter());
+        m_view->UpdateMarks();
+    });
+    connect(m_view, &LogView::FollowingChanged, this, [this](bool following) {
+        m_follow->setChecked(following);
+        emit StateChanged();
+    });
+    connect(m_view->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
+            &LogPanel::showCurrentLine);
+    connect(m_model, &LogModel::Refreshed, this, [this] {
+        updatePlaceholder();
+        if (!m_view->currentIndex().isValid())
+            showCurrentLine();
+        emit StateChanged();
+    });
+    connect(m_model, &LogModel::Progressed, this, [this](int percent) {
+        m_percent = percent;
+        updatePlaceholder();
+        emit StateChanged();
+    });
+}
+
+void LogPanel::Open(QString const& path, bool isCurrent)
+{
+    m_currentPath = isCurrent ? path : QString();
+    {
+        const QSignalBlocker blocker(m_files);
+        m_files->clear();
+        m_files->addItem(QFileInfo(path).fileName(), path);
+    }
+    showFile(path);
+}
+
+void LogPanel::showFile(QString const& path)
+{
+    m_files->setToolTip(path);
+    m_model->Open(path, LogPreferences::Parser(), path == m_currentPath);
+    updatePlaceholder();
+}
+
+void LogPanel::fillFileList()
+{
+    const QSignalBlocker blocker(m_files);
+    m_files->clear();
+    const QStringList files = LogFileList::FilesOf(path());
+    for (QString const& file : files) {
+        const QFileInfo info(file);
+        const QString size = info.exists() ? FileSizeText(info.size()) : tr("not there");
+        m_files->addItem(tr("%1 (%2)").arg(info.fileName(), size), file);
+        m_files->setItemData(m_files->count() - 1, file, Qt::ToolTipRole);
+    }
+    m_files->setCurrentIndex(m_files->findData(path()));
+}
+
+void LogPanel::chooseFile(int position)
+{
+    const QString file = m_files->itemData(position).toString();
+    if (file != path())
+        showFile(file);
+}
+
+void LogPanel::Reload()
+{
+    m_model->Reload();
+}
+
+void LogPanel::SetPaused(bool paused)
+{
+    m_model->SetPaused(paused);
+    m_pause->setChecked(paused);
+    emit StateChanged();
+}
+
+bool LogPanel::isPaused() const
+{
+    return m_model->isPaused();
+}
+
+void LogPanel::SetFollowing(bool following)
+{
+    m_view->SetFollowing(following);
+    m_follow->setChecked(following);
+}
+
+bool LogPanel::isFollowing() const
+{
+    return m_view->isFollowing();
+}
+
+void LogPanel::SetEarlierRuns(bool shown)
+{
+    m_filterBar->SetEarlierRuns(shown);
+}
+
+bool LogPanel::showsEarlierRuns() const
+{
+    return m_filterBar->filter().earlierRuns();
+}
+
+void LogPanel::FocusFilter()
+{
+    m_filterBar->FocusText();
+}
+
+void LogPanel::ClearFilter()
+{
+    m_filterBar->Clear();
+}
+
+void LogPanel::CopySelected()
+{
+    const int count = m_view->CopySelected();
+    if (count == 0)
+        emit Said(tr("No line is selected"));
+    else if (count >= LogView::MostCopied)
+        emit Said(tr("The first %L1 of the selected lines have been copied").arg(count));
+    else
+        emit Said(tr("%Ln line(s) copied", nullptr, count));
+}
+
+void LogPanel::SelectAll()
+{
+    m_view->selectAll();
+}
+
+void LogPanel::GoToProblem(int step)
+{
+    if (m_view->GoToProblem(step)) {
+        m_view->setFocus();
+        return;
+    }
+    emit Said(step > 0 ? tr("No further warning or error below")
+                       : tr("No further warning or error above"));
+}
+
+QString LogPanel::path() const
+{
+    return m_model->path();
+}
+
+QString LogPanel::summary() const
+{
+    if (m_model->isReading() && m_percent < 100)
+        return tr("Reading, %1 %").arg(m_percent);
+    LogUpdate const& state = m_model->state();
+    const QString separator = QStringLiteral("  %1  ").arg(QChar(0xb7)); // a dot in the middle
+    const QLocale locale;
+    const auto lines = static_cast<qlonglong>(state.lines);
+    qlonglong shown = m_model->rowCount();
+    if (state.rows->earlier > 0)
+        shown -= 2; // the headings
+    QString text = shown < lines
+                       ? tr("%1 of %2 lines").arg(locale.toString(shown), locale.toString(lines))
+                       : tr("%1 lines").arg(locale.toString(lines));
+    const auto problems = static_cast<qlonglong>(state.rows->problems);
+    text += separator +
+            (problems == 1 ? tr("1 problem") : tr("%1 problems").arg(locale.toString(problems)));
+    if (isPaused())
+        text += separator + tr("paused");
+    return text;
+}
+
+void LogPanel::updatePlaceholder()
+{
+    LogUpdate const& state = m_model->state();
+    if (m_model->isReading())
+        m_view->SetPlaceholder(m_percent < 100 ? tr("Reading, %1 %").arg(m_percent) : QString());
+    else if (!state.error.isEmpty())
+        m_view->SetPlaceholder(tr("%1 cannot be read:\n%2").arg(path(), state.error));
+    else if (!state.exists)
+        m_view->SetPlaceholder(tr("There is no file %1 at the moment.").arg(path()));
+    else if (state.lines > 0)
+        m_view->SetPlaceholder(tr("No line passes the filter."));
+    else
+        m_view->SetPlaceholder(tr("The log is empty."));
+}
+
+void LogPanel::showCurrentLine()
+{
+    const QModelIndex current = m_view->currentIndex();
+    m_line->setPlainText(current.isValid() ? m_model->LineText(current.row(), LogIndex::LineLimit)
+                                           : QString());
+}
+
+QList<int> LogPanel::columnWidths() const
+{
+    QList<int> widths;
+    for (int column = 0; column < LogModel::MessageColumn; ++column)
+        widths.append(m_view->columnWidth(column));
+    return widths;
+}
+
+void LogPanel::SetColumnWidths(QList<int> const& widths)
+{
+    for (int column = 0; column < LogModel::MessageColumn && column < widths.size(); ++column) {
+        if (widths.at(column) >= 10)
+            m_view->setColumnWidth(column, widths.at(column));
+    }
+}
+
+QList<int> LogPanel::paneSizes() const
+{
+    return m_splitter->sizes();
+}
+
+void LogPanel::SetPaneSizes(QList<int> const& sizes)
+{
+    if (sizes.size() == m_splitter->count())
+        m_splitter->setSizes(sizes);
+}

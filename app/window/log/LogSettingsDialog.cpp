@@ -1,0 +1,140 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/log/LogSettingsDialog.h"
+
+#include "app/window/log/LogModel.h"
+
+#include <QCheckBox>
+#include <QDateTime>
+#include <QDialogButtonBox>
+#include <QFontDatabase>
+#include <QFormLayout>
+#include <QGroupBox>
+#include <QLabel>
+#include <QLineEdit>
+#include <QMessageBox>
+#include <QPushButton>
+#include <QSpinBox>
+
+LogSettingsDialog::LogSettingsDialog(QWidget* parent)
+    : QDialog(parent), m_enabled(new QCheckBox(tr("&Write the log"))),
+      m_elapsed(new QCheckBox(tr("&Log the time since the entry before"))),
+      m_echo(new QCheckBox(tr("&Echo entries to the console"))), m_maxFiles(new QSpinBox),
+      m_elapsedPrefix(new QLineEdit), m_dateFormat(new QLineEdit), m_filePrefix(new QLineEdit),
+      m_sample(new QLabel), m_problem(new QLabel),
+      m_buttons(new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel))
+{
+    setWindowTitle(tr("Log Settings"));
+    makeFields();
+    fill(LogPreferences::Read());
+    for (QLineEdit* field : {m_elapsedPrefix, m_dateFormat, m_filePrefix})
+        connect(field, &QLineEdit::textChanged, this, &LogSettingsDialog::check);
+    connect(m_elapsed, &QCheckBox::toggled, this, &LogSettingsDialog::check);
+    const QList<QAbstractButton*> buttons = m_buttons->buttons();
+    for (QAbstractButton* button : buttons)
+        button->setIcon(QIcon());
+    connect(m_buttons, &QDialogButtonBox::accepted, this, &LogSettingsDialog::accept);
+    connect(m_buttons, &QDialogButtonBox::rejected, this, &LogSettingsDialog::reject);
+    check();
+}
+
+void LogSettingsDialog::makeFields()
+{
+    m_maxFiles->setRange(1, 100);
+    m_maxFiles->setAccessibleName(tr("Older files kept"));
+    m_sample->setAccessibleName(tr("Sample of an entry"));
+    m_sample->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
+    m_sample->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
+    m_sample->setTextFormat(Qt::PlainText);
+    m_problem->setAccessibleName(tr("Problem with the settings"));
+    m_problem->setTextFormat(Qt::PlainText);
+    m_problem->setWordWrap(true);
+
+    auto* now = new QGroupBox(tr("At once"));
+    auto* nowForm = new QFormLayout(now);
+    nowForm->addRow(m_enabled);
+    nowForm->addRow(m_elapsed);
+    nowForm->addRow(m_echo);
+    nowForm->addRow(tr("&Older files kept:"), m_maxFiles);
+
+    auto* later = new QGroupBox(tr("From the next start"));
+    auto* laterForm = new QFormLayout(later);
+    addNextStartField(laterForm, tr("&Date format:"), m_dateFormat);
+    addNextStartField(laterForm, tr("&Prefix of the elapsed time:"), m_elapsedPrefix);
+    addNextStartField(laterForm, tr("&Name of the log files:"), m_filePrefix);
+    laterForm->addRow(tr("Sample:"), m_sample);
+
+    auto* layout = new QVBoxLayout(this);
+    layout->addWidget(now);
+    layout->addWidget(later);
+    layout->addWidget(m_problem);
+    layout->addWidget(m_buttons);
+}
+
+void LogSettingsDialog::addNextStartField(QFormLayout* form, QString const& caption,
+                                          QLineEdit* field)
+{
+    field->setMinimumWidth(260);
+    field->setAccessibleName(QString(caption).remove(QLatin1Char('&')).remove(QLatin1Char(':')));
+    field->setAccessibleDescription(tr("From the next start"));
+    field->setToolTip(tr("From the next start"));
+    form->addRow(caption, field);
+}
+
+void LogSettingsDialog::fill(LogPreferences const& preferences)
+{
+    m_enabled->setChecked(preferences.enabled);
+    m_elapsed->setChecked(preferences.elapsedTime);
+    m_echo->setChecked(preferences.echo);
+    m_maxFiles->setValue(preferences.maxFiles);
+    m_elapsedPrefix->setText(preferences.elapsedPrefix);
+    m_dateFormat->setText(preferences.dateFormat);
+    m_filePrefix->setText(preferences.filePrefix);
+}
+
+LogPreferences LogSettingsDialog::preferences() const
+{
+    LogPreferences preferences;
+    preferences.enabled = m_enabled->isChecked();
+    preferences.elapsedTime = m_elapsed->isChecked();
+    preferences.echo = m_echo->isChecked();
+    preferences.maxFiles = m_maxFiles->value();
+    preferences.elapsedPrefix = m_elapsedPrefix->text();
+    preferences.dateFormat = m_dateFormat->text();
+    preferences.filePrefix = m_filePrefix->text();
+    return preferences;
+}
+
+QString LogSettingsDialog::problem() const
+{
+    if (!LogPreferences::IsKept(m_dateFormat->text()))
+        return tr("The settings file cannot keep this date format.");
+    if (!LogPreferences::IsKept(m_elapsedPrefix->text()))
+        return tr("The settings file cannot keep this prefix of the elapsed time.");
+    if (!LogPreferences::IsFilePrefix(m_filePrefix->text()))
+        return tr("Log files cannot be called like this.");
+    return QString();
+}
+
+void LogSettingsDialog::check()
+{
+    QString sample = QDateTime::currentDateTime().toString(m_dateFormat->text()) +
+                     QLatin1Char(' ') + LogModel::SeverityName(LogEntry::Trace) + QLatin1Char(' ');
+    if (m_elapsed->isChecked())
+        sample += m_elapsedPrefix->text() + QLatin1String("[250] ");
+    m_sample->setText(sample + tr("message"));
+    m_problem->setText(problem());
+    m_buttons->button(QDialogButtonBox::Ok)->setEnabled(problem().isEmpty());
+}
+
+void LogSettingsDialog::accept()
+{
+    if (!problem().isEmpty())
+        return;
+    const QString error = preferences().Apply();
+    if (error.isEmpty())
+        QDialog::accept();
+    else
+        QMessageBox::critical(this, windowTitle(), error);
+}

@@ -1,0 +1,47 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include "app/runninglog/LogPreferences.h"
+
+#include <QDialog>
+
+class QCheckBox;
+class QDialogButtonBox;
+class QFormLayout;
+class QLabel;
+class QLineEdit;
+class QSpinBox;
+
+/// Changes the log's settings. What the log cannot take over while it runs says so.
+class LogSettingsDialog : public QDialog
+{
+    Q_OBJECT
+
+public:
+    explicit LogSettingsDialog(QWidget* parent = nullptr);
+
+    /// What the fields say.
+    LogPreferences preferences() const;
+
+    void accept() override;
+
+private:
+    void makeFields();
+    void addNextStartField(QFormLayout* form, QString const& caption, QLineEdit* field);
+    void fill(LogPreferences const& preferences);
+    void check();
+    QString problem() const;
+
+    QCheckBox* m_enabled;
+    QCheckBox* m_elapsed;
+    QCheckBox* m_echo;
+    QSpinBox* m_maxFiles;
+    QLineEdit* m_elapsedPrefix;
+    QLineEdit* m_dateFormat;
+    QLineEdit* m_filePrefix;
+    QLabel* m_sample;
+    QLabel* m_problem;
+    QDialogButtonBox* m_buttons;
+};

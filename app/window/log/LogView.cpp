@@ -1,0 +1,213 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/log/LogView.h"
+
+#include "app/logfile/LogIndex.h"
+#include "app/window/log/LogDelegate.h"
+#include "app/window/log/LogModel.h"
+
+#include <QAbstractButton>
+#include <QClipboard>
+#include <QEvent>
+#include <QGuiApplication>
+#include <QHeaderView>
+#include <QPainter>
+#include <QScopedValueRollback>
+#include <QScrollBar>
+
+#include <algorithm>
+
+LogView::LogView(LogModel* model, QWidget* parent)
+    : QTableView(parent), m_model(model), m_delegate(new LogDelegate(this))
+{
+    setUp();
+    setModel(model);
+    SetDefaultWidths();
+    connect(verticalScrollBar(), &QScrollBar::valueChanged, this, &LogView::noteScrolled);
+    connect(model, &LogModel::Refreshed, this, &LogView::afterRefresh);
+}
+
+void LogView::setUp()
+{
+    setAccessibleName(tr("Log entries"));
+    setItemDelegate(m_delegate);
+    setSelectionBehavior(SelectRows);
+    setSelectionMode(ExtendedSelection);
+    setEditTriggers(NoEditTriggers);
+    setShowGrid(false);
+    setWordWrap(false);
+    setTabKeyNavigation(false);
+    setVerticalScrollMode(ScrollPerItem);
+    setHorizontalScrollMode(ScrollPerPixel);
+    setTextElideMode(Qt::ElideRight);
+    verticalHeader()->hide();
+    verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
+    horizontalHeader()->setStretchLastSection(true);
+    horizontalHeader()->setHighlightSections(false);
+    horizontalHeader()->setSectionsMovable(false);
+    horizontalHeader()->setAccessibleName(tr("Columns of the log"));
+    verticalHeader()->setAccessibleName(tr("Rows of the log"));
+    if (auto* corner = findChild<QAbstractButton*>()) // hidden with the rows' header, yet there
+        corner->setAccessibleName(tr("Select all rows"));
+    setRowHeight();
+}
+
+void LogView::setRowHeight()
+{
+    verticalHeader()->setMinimumSectionSize(1);
+    verticalHeader()->setDefaultSectionSize(fontMetrics().height() + 6);
+}
+
+void LogView::SetDefaultWidths()
+{
+    const QFontMetrics metrics = fontMetrics();
+    const int padding = 16;
+    setColumnWidth(LogModel::TimeColumn,
+                   metrics.boundingRect(QStringLiteral("2000-00-00 00:00:00.000")).width() +
+                       padding);
+    setColumnWidth(LogModel::SeverityColumn,
+                   metrics.boundingRect(LogModel::SeverityName(LogEntry::Notification)).width() +
+                       24 + padding);
+    setColumnWidth(LogModel::ElapsedColumn,
+                   metrics.boundingRect(QStringLiteral("00000 ms")).width() + padding);
+}
+
+void LogView::changeEvent(QEvent* event)
+{
+    QTableView::changeEvent(event);
+    if (event->type() == QEvent::FontChange || event->type() == QEvent::StyleChange)
+        setRowHeight();
+}
+
+void LogView::SetFollowing(bool following)
+{
+    if (following) {
+        const QScopedValueRollback<bool> guard(m_scrollingItself, true);
+        scrollToBottom();
+    }
+    if (following == m_following)
+        return;
+    m_following = following;
+    emit FollowingChanged(following);
+}
+
+void LogView::noteScrolled(int value)
+{
+    if (!m_scrollingItself && m_model->rowCount() > 0)
+        SetFollowing(value == verticalScrollBar()->maximum());
+}
+
+// New rows above the ones in view would push them out of it.
+void LogView::rowsInserted(QModelIndex const& parent, int first, int last)
+{
+    const bool above = !m_following && first < rowAt(0);
+    QTableView::rowsInserted(parent, first, last);
+    if (!above)
+        return;
+    const QScopedValueRollback<bool> guard(m_scrollingItself, true);
+    updateGeometries();
+    verticalScrollBar()->setValue(verticalScrollBar()->value() + last - first + 1);
+}
+
+void LogView::rowsAboutToBeRemoved(QModelIndex const& parent, int first, int last)
+{
+    const int top = rowAt(0);
+    QTableView::rowsAboutToBeRemoved(parent, first, last);
+    if (m_following || first >= top)
+        return;
+    const QScopedValueRollback<bool> guard(m_scrollingItself, true);
+    verticalScrollBar()->setValue(verticalScrollBar()->value() - (std::min(last + 1, top) - first));
+}
+
+void LogView::afterRefresh()
+{
+    const QScopedValueRollback<bool> guard(m_scrollingItself, true);
+    setColumnHidden(LogModel::ElapsedColumn, !m_model->state().hasElapsed);
+    updateHeadings();
+    if (m_following) {
+        updateGeometries(); // brings the scroll bar's range up to date
+        scrollToBottom();
+    }
+    viewport()->update();
+}
+
+// A heading goes over the whole width.
+void LogView::updateHeadings()
+{
+    const int earlier = static_cast<int>(m_model->state().rows->earlier);
+    if (earlier == m_earlierRows)
+        return;
+    clearSpans();
+    m_earlierRows = earlier;
+    if (earlier == 0)
+        return;
+    setSpan(0, 0, 1, LogModel::ColumnCount);
+    setSpan(earlier, 0, 1, LogModel::ColumnCount);
+}
+
+bool LogView::GoToProblem(int step)
+{
+    const int from = currentIndex().isValid() ? currentIndex().row()
+                     : step > 0               ? -1
+                                              : m_model->rowCount();
+    const int row = m_model->FindProblem(from, step);
+    if (row < 0)
+        return false;
+    setCurrentIndex(m_model->index(row, LogModel::TimeColumn));
+    scrollTo(currentIndex(), EnsureVisible);
+    return true;
+}
+
+QList<int> LogView::selectedRowNumbers() const
+{
+    QList<int> rows;
+    const QItemSelection selection = selectionModel()->selection();
+    for (QItemSelectionRange const& range : selection) {
+        for (int row = range.top(); row <= range.bottom() && rows.size() < MostCopied; ++row)
+            rows.append(row);
+    }
+    std::sort(rows.begin(), rows.end());
+    rows.erase(std::unique(rows.begin(), rows.end()), rows.end());
+    return rows;
+}
+
+int LogView::CopySelected()
+{
+    const QList<int> rows = selectedRowNumbers();
+    QString text;
+    int count = 0;
+    for (int row : rows) {
+        if (m_model->index(row, 0).data(LogModel::HeadingRole).toBool())
+            continue;
+        text += m_model->LineText(row, LogIndex::LineLimit) + QLatin1Char('\n');
+        ++count;
+    }
+    if (count > 0)
+        QGuiApplication::clipboard()->setText(text);
+    return count;
+}
+
+void LogView::SetPlaceholder(QString const& text)
+{
+    m_placeholder = text;
+    setAccessibleDescription(text);
+    viewport()->update();
+}
+
+void LogView::UpdateMarks()
+{
+    m_delegate->SetFilter(m_model->filter());
+    viewport()->update();
+}
+
+void LogView::paintEvent(QPaintEvent* event)
+{
+    QTableView::paintEvent(event);
+    if (m_placeholder.isEmpty() || m_model->rowCount() > 0)
+        return;
+    QPainter painter(viewport());
+    painter.setPen(palette().color(QPalette::Text));
+    const QRect area = viewport()->rect().adjusted(24, 24, -24, -24);
+    painter.drawText(area, Qt::AlignCenter | Qt::TextWordWrap, m_placeholder);
+}

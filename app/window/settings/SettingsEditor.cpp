@@ -1,0 +1,374 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/settings/SettingsEditor.h"
+
+#include "app/settingsfile/SettingsFileReader.h"
+#include "app/settingsfile/SettingsFileWriter.h"
+#include "app/window/log/NoticeBar.h"
+
+#include <QFile>
+#include <QFileInfo>
+#include <QFontDatabase>
+#include <QHBoxLayout>
+#include <QHeaderView>
+#include <QMessageBox>
+#include <QPlainTextEdit>
+#include <QPushButton>
+#include <QScopedValueRollback>
+#include <QStackedWidget>
+#include <QTextBlock>
+#include <QTreeWidget>
+
+namespace {
+
+// The most of a broken file that is shown, in bytes.
+constexpr qint64 ShownLimit = 1 << 20;
+
+QString NameRole()
+{
+    return QObject::tr("Letters, digits, \"_\", \"-\" and \".\", with a letter or \"_\" first");
+}
+
+} // namespace
+
+SettingsEditor::SettingsEditor(QWidget* parent)
+    : QWidget(parent), m_notice(new NoticeBar), m_pages(new QStackedWidget)
+{
+    m_pages->addWidget(makeTreePage());
+    m_pages->addWidget(makeTextPage());
+    auto* layout = new QVBoxLayout(this);
+    layout->setContentsMargins(8, 8, 8, 8);
+    layout->setSpacing(6);
+    layout->addWidget(m_notice);
+    layout->addWidget(m_pages, 1);
+    setFocusProxy(m_tree);
+}
+
+// A cell that is being edited tells of its end while the tree is deleted.
+SettingsEditor::~SettingsEditor()
+{
+    disconnect(m_tree, nullptr, this, nullptr);
+}
+
+QPushButton* SettingsEditor::makeButton(QString const& text, QString const& toolTip)
+{
+    auto* button = new QPushButton(text);
+    button->setAutoDefault(false);
+    button->setToolTip(toolTip);
+    button->setMinimumWidth(button->sizeHint().width() +
+                            2 * button->fontMetrics().averageCharWidth());
+    return button;
+}
+
+QWidget* SettingsEditor::makeTreePage()
+{
+    m_tree = new QTreeWidget;
+    m_tree->setAccessibleName(tr("Settings"));
+    m_tree->setHeaderLabels({tr("Section / key"), tr("Value")});
+    m_tree->header()->setAccessibleName(tr("Columns of the settings"));
+    m_tree->setEditTriggers(QAbstractItemView::DoubleClicked | QAbstractItemView::EditKeyPressed |
+                            QAbstractItemView::AnyKeyPressed);
+    m_tree->setAlternatingRowColors(true);
+    m_tree->setUniformRowHeights(true);
+    connect(m_tree, &QTreeWidget::itemChanged, this, &SettingsEditor::checkNames);
+
+    QPushButton* addSectionButton = makeButton(tr("Add &Section"), tr("Add an empty section"));
+    m_addValue = makeButton(tr("Add &Key"), tr("Add a key to the chosen section"));
+    m_remove = makeButton(tr("&Remove"), tr("Remove the chosen section or key"));
+    m_save = makeButton(tr("Sa&ve"), tr("Save the file (Ctrl+S)"));
+    connect(addSectionButton, &QPushButton::clicked, this, &SettingsEditor::addSection);
+    connect(m_addValue, &QPushButton::clicked, this, &SettingsEditor::addValue);
+    connect(m_remove, &QPushButton::clicked, this, &SettingsEditor::remove);
+    connect(m_save, &QPushButton::clicked, this, &SettingsEditor::Save);
+    connect(m_tree, &QTreeWidget::currentItemChanged, this, [this](QTreeWidgetItem const* current) {
+        m_addValue->setEnabled(current != nullptr);
+        m_remove->setEnabled(current != nullptr);
+    });
+
+    auto* buttons = new QHBoxLayout;
+    buttons->addWidget(addSectionButton);
+    buttons->addWidget(m_addValue);
+    buttons->addWidget(m_remove);
+    buttons->addStretch(1);
+    buttons->addWidget(m_save);
+
+    auto* page = new QWidget;
+    auto* layout = new QVBoxLayout(page);
+    layout->setContentsMargins(0, 0, 0, 0);
+    layout->addWidget(m_tree, 1);
+    layout->addLayout(buttons);
+    return page;
+}
+
+QWidget* SettingsEditor::makeTextPage()
+{
+    m_text = new QPlainTextEdit;
+    m_text->setReadOnly(true);
+    m_text->setTabChangesFocus(true);
+    m_text->setLineWrapMode(QPlainTextEdit::NoWrap);
+    m_text->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
+    m_text->setAccessibleName(tr("The file as text"));
+    m_text->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
+    return m_text;
+}
+
+void SettingsEditor::Open(QString const& path)
+{
+    m_path = path;
+    m_hasBackup = false;
+    m_notice->Dismiss();
+    const SettingsDocument document = SettingsFileReader::Read(path);
+    m_read = QFileInfo(path).lastModified();
+    if (document.isParsed)
+        showTree(document);
+    else
+        showBroken(document);
+    setModified(false);
+}
+
+void SettingsEditor::showTree(SettingsDocument const& document)
+{
+    m_rootName = document.rootName;
+    m_fileLosses = document.losses;
+    m_fileLossCount = document.lossCount;
+    {
+        const QScopedValueRollback<bool> filling(m_filling, true);
+        m_tree->clear();
+        for (SettingsDocument::Section const& section : document.sections) {
+            QTreeWidgetItem* top = addItem(nullptr, section.name, QString());
+            for (SettingsDocument::Item const& item : section.items)
+                addItem(top, item.key, item.value);
+        }
+        m_tree->expandAll();
+        m_tree->resizeColumnToContents(0);
+        m_tree->setColumnWidth(0, qBound(160, m_tree->columnWidth(0) + 24, 360));
+    }
+    m_tree->setCurrentItem(m_tree->topLevelItem(0));
+    m_addValue->setEnabled(m_tree->currentItem());
+    m_remove->setEnabled(m_tree->currentItem());
+    m_pages->setCurrentIndex(0);
+    setFocusProxy(m_tree);
+    if (m_fileLossCount > 0)
+        m_notice->Tell(
+            m_fileLossCount == 1
+                ? tr("This file holds one thing that saving would lose.")
+                : tr("This file holds %1 things that saving would lose.").arg(m_fileLossCount));
+}
+
+void SettingsEditor::showBroken(SettingsDocument const& document)
+{
+    QString message = tr("%1 is not shown as a tree: %2").arg(m_path, document.error);
+    if (document.line > 0)
+        message += tr(" (line %1, column %2)").arg(document.line).arg(document.column);
+    m_notice->Tell(message);
+
+    QFile file(m_path);
+    if (document.isReadable && file.open(QIODevice::ReadOnly))
+        m_text->setPlainText(QString::fromUtf8(file.read(ShownLimit)));
+    const QTextBlock block = m_text->document()->findBlockByNumber(document.line - 1);
+    if (block.isValid()) {
+        QTextCursor cursor(block);
+        cursor.select(QTextCursor::LineUnderCursor);
+        m_text->setTextCursor(cursor);
+        QTextEdit::ExtraSelection error;
+        error.cursor = QTextCursor(block);
+        error.format.setProperty(QTextFormat::FullWidthSelection, true);
+        error.format.setUnderlineStyle(QTextCharFormat::WaveUnderline);
+        error.format.setUnderlineColor(Qt::red);
+        m_text->setExtraSelections({error});
+    }
+    m_pages->setCurrentIndex(1);
+    setFocusProxy(m_text);
+}
+
+QTreeWidgetItem* SettingsEditor::addItem(QTreeWidgetItem* section, QString const& key,
+                                         QString const& value)
+{
+    auto* item = section ? new QTreeWidgetItem(section) : new QTreeWidgetItem(m_tree);
+    item->setText(0, key);
+    item->setText(1, value);
+    item->setToolTip(0, NameRole());
+    item->setFlags(Qt::ItemIsEnabled | Qt::ItemIsSelectable | Qt::ItemIsEditable);
+    if (!section) {
+        QFont bold = m_tree->font();
+        bold.setBold(true);
+        item->setFont(0, bold);
+    }
+    return item;
+}
+
+QString SettingsEditor::freeName(QTreeWidgetItem* section, QString const& base) const
+{
+    QStringList taken;
+    const int count = section ? section->childCount() : m_tree->topLevelItemCount();
+    for (int i = 0; i < count; ++i)
+        taken.append(section ? section->child(i)->text(0) : m_tree->topLevelItem(i)->text(0));
+    QString name = base;
+    for (int number = 2; taken.contains(name); ++number)
+        name = base + QString::number(number);
+    return name;
+}
+
+void SettingsEditor::addSection()
+{
+    QTreeWidgetItem* item = nullptr;
+    {
+        const QScopedValueRollback<bool> filling(m_filling, true);
+        item = addItem(nullptr, freeName(nullptr, QStringLiteral("Section")), QString());
+    }
+    setModified(true);
+    m_tree->setCurrentItem(item);
+    m_tree->editItem(item, 0);
+}
+
+void SettingsEditor::addValue()
+{
+    QTreeWidgetItem* current = m_tree->currentItem();
+    if (!current)
+        return;
+    QTreeWidgetItem* section = current->parent() ? current->parent() : current;
+    QTreeWidgetItem* item = nullptr;
+    {
+        const QScopedValueRollback<bool> filling(m_filling, true);
+        item = addItem(section, freeName(section, QStringLiteral("key")), tr("value"));
+    }
+    setModified(true);
+    section->setExpanded(true);
+    m_tree->setCurrentItem(item);
+    m_tree->editItem(item, 0);
+}
+
+void SettingsEditor::remove()
+{
+    delete m_tree->currentItem();
+    setModified(true);
+}
+
+// A name that the store cannot write, or that is there already, is put right at once; a section
+// has no value of its own.
+void SettingsEditor::checkNames(QTreeWidgetItem* item)
+{
+    if (m_filling)
+        return;
+    const QScopedValueRollback<bool> filling(m_filling, true);
+    QTreeWidgetItem* section = item->parent();
+    QString name = item->text(0);
+    name.remove(QLatin1Char(' '));
+    if (!SettingsFileWriter::IsName(name)) {
+        emit Said(tr("\"%1\" is no name for a section or key: %2").arg(name, NameRole()));
+        name = section ? QStringLiteral("key") : QStringLiteral("Section");
+    }
+    item->setText(0, QString());
+    item->setText(0, freeName(section, name));
+    if (!section)
+        item->setText(1, QString());
+    setModified(true);
+}
+
+void SettingsEditor::setModified(bool modified)
+{
+    m_save->setEnabled(modified);
+    if (modified == m_modified)
+        return;
+    m_modified = modified;
+    emit ModifiedChanged(modified);
+}
+
+SettingsDocument SettingsEditor::document() const
+{
+    SettingsDocument document;
+    document.rootName = m_rootName;
+    for (int i = 0; i < m_tree->topLevelItemCount(); ++i) {
+        QTreeWidgetItem const* top = m_tree->topLevelItem(i);
+        SettingsDocument::Section section{top->text(0), {}};
+        for (int j = 0; j < top->childCount(); ++j)
+            section.items.append({top->child(j)->text(0), top->child(j)->text(1)});
+        document.sections.append(section);
+    }
+    return document;
+}
+
+bool SettingsEditor::ask(QString const& text, QString const& details, QString const& goOn)
+{
+    QMessageBox box(QMessageBox::Warning, window()->windowTitle(), text, QMessageBox::Cancel, this);
+    box.setInformativeText(details);
+    QPushButton* yes = box.addButton(goOn, QMessageBox::AcceptRole);
+    box.setDefaultButton(QMessageBox::Cancel);
+    box.exec();
+    return box.clickedButton() == yes;
+}
+
+bool SettingsEditor::mayLose()
+{
+    QStringList losses = m_fileLosses + SettingsFileWriter::Losses(document());
+    const int unworded = m_fileLossCount - m_fileLosses.size();
+    if (losses.isEmpty())
+        return true;
+
+    const int most = 12;
+    const int more = losses.size() - most + unworded;
+    if (losses.size() > most)
+        losses = losses.mid(0, most);
+    if (more > 0)
+        losses.append(tr("and %1 more").arg(more));
+    return ask(tr("Saving %1 would lose this:").arg(QFileInfo(m_path).fileName()),
+               losses.join(QLatin1Char('\n')), tr("Save All the Same"));
+}
+
+bool SettingsEditor::mayReplaceChanged()
+{
+    if (!QFileInfo::exists(m_path) || QFileInfo(m_path).lastModified() == m_read)
+        return true;
+    return ask(tr("%1 has been changed by another program.").arg(QFileInfo(m_path).fileName()),
+               tr("Saving would undo those changes."), tr("Save All the Same"));
+}
+
+bool SettingsEditor::keepBackup()
+{
+    if (m_hasBackup)
+        return true;
+    QString error;
+    m_hasBackup = SettingsFileWriter::KeepBackup(m_path, &error);
+    if (m_hasBackup)
+        return true;
+    return ask(tr("No copy of %1 can be kept.").arg(QFileInfo(m_path).fileName()), error,
+               tr("Save Without a Copy"));
+}
+
+bool SettingsEditor::Save()
+{
+    if (m_pages->currentIndex() != 0)
+        return false;
+    m_pages->setFocus(); // ends the editing of a cell
+    if (!mayReplaceChanged() || !mayLose() || !keepBackup())
+        return false;
+
+    QString error;
+    if (!SettingsFileWriter::Save(m_path, document(), &error)) {
+        QMessageBox::critical(this, window()->windowTitle(),
+                              tr("%1 was not saved.\n%2").arg(m_path, error));
+        return false;
+    }
+    m_read = QFileInfo(m_path).lastModified();
+    m_fileLosses.clear();
+    m_fileLossCount = 0;
+    m_notice->Dismiss();
+    setModified(false);
+    emit Said(tr("Saved %1").arg(QFileInfo(m_path).fileName()));
+    return true;
+}
+
+bool SettingsEditor::MayClose()
+{
+    m_pages->setFocus(); // ends the editing of a cell
+    if (!m_modified)
+        return true;
+    const QMessageBox::StandardButton answer = QMessageBox::question(
+        this, window()->windowTitle(),
+        tr("%1 has been changed. Save it?").arg(QFileInfo(m_path).fileName()),
+        QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel, QMessageBox::Save);
+    if (answer == QMessageBox::Save)
+        return Save();
+    return answer == QMessageBox::Discard;
+}

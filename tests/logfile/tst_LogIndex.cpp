@@ -1,0 +1,395 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/logfile/LogIndex.h"
+#include "support/DemoLog.h"
+
+#include <QtTest>
+
+#include <random>
+
+using DemoLog::entry;
+using DemoLog::run;
+using DemoLog::writtenOver;
+
+namespace {
+
+// One pass over a file, in slices of the given size.
+void Pass(LogIndex& index, QByteArray const& file, int slice)
+{
+    qint64 offset = index.Begin();
+    bool more = true;
+    while (more && offset < file.size()) {
+        const QByteArray bytes = file.mid(static_cast<int>(offset), slice);
+        more = index.Feed(bytes.constData(), bytes.size());
+        offset += bytes.size();
+    }
+    index.End();
+}
+
+// The rows as texts: the lines of the file, and the headings in brackets.
+QStringList Texts(LogIndex const& index, QByteArray const& file,
+                  LogFilter const& filter = LogFilter())
+{
+    QStringList texts;
+    const LogRows rows = index.Rows(filter);
+    for (size_t row = 0; row < rows.size(); ++row) {
+        const int start = static_cast<int>(rows.starts[row]);
+        if (start < 0) {
+            texts.append(start == LogRows::EarlierHeading ? "[earlier]" : "[newest]");
+            continue;
+        }
+        const int end = file.indexOf('\n', start);
+        const QString torn = rows.marks[row] & LogRows::Torn ? "torn: " : "";
+        texts.append(torn + QString::fromLatin1(file.mid(start, end < 0 ? -1 : end - start)));
+    }
+    return texts;
+}
+
+QStringList Lines(QByteArray const& text)
+{
+    QStringList lines = QString::fromLatin1(text).split('\n');
+    if (lines.last().isEmpty())
+        lines.removeLast();
+    return lines;
+}
+
+QStringList TextsOf(QByteArray const& file, LogLineParser const& parser = LogLineParser())
+{
+    LogIndex index(parser);
+    Pass(index, file, 1 << 20);
+    return Texts(index, file);
+}
+
+} // namespace
+
+class tst_LogIndex : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void order_data();
+    void order();
+    void slices_data();
+    void slices();
+    void threeRuns();
+    void manyRuns();
+    void dateFormats_data();
+    void dateFormats();
+    void filter_data();
+    void filter();
+    void continuedLinesGoWithTheirEntry();
+    void textFilter();
+    void problems();
+    void passesOverAWritingRun_data();
+    void passesOverAWritingRun();
+    void readsOnlyWhatIsNew();
+    void incompleteLastLine();
+    void anyBytes();
+};
+
+void tst_LogIndex::order_data()
+{
+    QTest::addColumn<QByteArray>("file");
+    QTest::addColumn<QStringList>("rows");
+
+    const QByteArray older = run(6, QTime(17, 0), "older", true);
+    const QByteArray newer = run(3, QTime(9, 0), "newer");
+    QTest::newRow("empty file") << QByteArray() << QStringList();
+    QTest::newRow("one line") << newer.left(newer.indexOf('\n') + 1)
+                              << QStringList(Lines(newer).first());
+    QTest::newRow("one run") << newer << Lines(newer);
+    QTest::newRow("one run without its last line end")
+        << newer.left(newer.size() - 1) << Lines(newer);
+    QTest::newRow("no entries at all")
+        << QByteArray("a\nb\n\nc") << QStringList({"a", "b", "", "c"});
+
+    QByteArray file = newer + older.mid(older.indexOf('\n') + 1);
+    QTest::newRow("seam between two lines") << file
+                                            << QStringList({"[earlier]"}) + Lines(older).mid(1) +
+                                                   QStringList("[newest]") + Lines(newer);
+
+    file = newer + "er 0\n" + older.mid(older.indexOf('\n') + 1);
+    QTest::newRow("torn line at the seam")
+        << file
+        << QStringList({"[earlier]", "torn: er 0"}) + Lines(older).mid(1) +
+               QStringList("[newest]") + Lines(newer);
+
+    file = newer + "17:00:00.000 Error older\n" + older.mid(older.indexOf('\n') + 1);
+    QTest::newRow("torn line that looks like an entry")
+        << file
+        << QStringList({"[earlier]", "torn: 17:00:00.000 Error older"}) + Lines(older).mid(1) +
+               QStringList("[newest]") + Lines(newer);
+
+    file = newer + "continued\n" + "er 0\n" + older.mid(older.indexOf('\n') + 1);
+    QTest::newRow("a line that goes on with the newest entry stays with it")
+        << file
+        << QStringList({"[earlier]", "torn: er 0"}) + Lines(older).mid(1) +
+               QStringList("[newest]") + Lines(newer) + QStringList("continued");
+
+    QTest::newRow("nothing but a torn line behind the run")
+        << QByteArray(newer + "er 0\n") << Lines(newer) + QStringList("er 0");
+
+    // In an hour that is set back, entries are older than those before, yet not than the first.
+    const QByteArray back =
+        entry("01:00:00.000", "Trace", "start") + entry("02:59:59.000", "Trace", "summer") +
+        entry("02:00:01.000", "Trace", "winter") + entry("02:30:00.000", "Trace", "on");
+    QTest::newRow("a clock that is set back is no seam") << back << Lines(back);
+
+    const QByteArray threads = entry("09:00:00.010", "Trace", "a") +
+                               entry("09:00:00.012", "Trace", "b") +
+                               entry("09:00:00.009", "Trace", "c");
+    QTest::newRow("entries of threads that overtake each other are no seam")
+        << threads << Lines(threads);
+}
+
+void tst_LogIndex::order()
+{
+    QFETCH(QByteArray, file);
+    QFETCH(QStringList, rows);
+    QCOMPARE(TextsOf(file), rows);
+}
+
+void tst_LogIndex::slices_data()
+{
+    QTest::addColumn<int>("slice");
+    for (int slice : {1, 2, 3, 7, 64, 1000})
+        QTest::newRow(qPrintable(QString("%1 bytes").arg(slice))) << slice;
+}
+
+// However the file comes in, the rows are the same.
+void tst_LogIndex::slices()
+{
+    QFETCH(int, slice);
+    const QByteArray file =
+        writtenOver(run(30, QTime(17, 0), "older", true), run(11, QTime(9, 0), "newer")) +
+        "no line end";
+    LogIndex index;
+    Pass(index, file, slice);
+    QCOMPARE(Texts(index, file), TextsOf(file));
+    QCOMPARE(index.runs(), size_t(2));
+}
+
+void tst_LogIndex::threeRuns()
+{
+    const QByteArray first = run(9, QTime(7, 0), "first");
+    const QByteArray second = run(6, QTime(8, 0), "second");
+    const QByteArray third = run(2, QTime(9, 0), "third");
+    const QByteArray file = writtenOver(writtenOver(first, second), third);
+    const QStringList rows = TextsOf(file);
+    QCOMPARE(rows.first(), QString("[earlier]"));
+    QCOMPARE(rows.mid(rows.indexOf("[newest]") + 1), Lines(third));
+    // What is left of the first run comes before what is left of the second.
+    QVERIFY(rows.indexOf(Lines(first).last()) < rows.indexOf(Lines(second).last()));
+    QVERIFY(rows.indexOf(Lines(first).last()) > 0);
+}
+
+// Beyond a number of runs the order is no longer told, but every line is still there.
+void tst_LogIndex::manyRuns()
+{
+    QByteArray file;
+    for (int i = 1000; i > 0; --i)
+        file += entry(QTime(0, 0).addSecs(i * 60).toString("hh:mm:ss.zzz"), "Trace",
+                      QString::number(i));
+    LogIndex index;
+    Pass(index, file, 4096);
+    QVERIFY(index.runs() <= 64);
+    QCOMPARE(index.size(), size_t(1000));
+    QCOMPARE(index.Rows(LogFilter()).size(), size_t(1002));
+}
+
+void tst_LogIndex::dateFormats_data()
+{
+    QTest::addColumn<QString>("format");
+    QTest::addColumn<QByteArray>("newer");
+    QTest::addColumn<QByteArray>("older");
+
+    QTest::newRow("with a date")
+        << "dd.MM.yyyy hh:mm" << QByteArray("02.04.2025 09:00 Trace a\n02.04.2025 09:01 Trace b\n")
+        << QByteArray("03.03.2025 09:00 Trace c\n03.03.2025 09:01 Trace d\n");
+    QTest::newRow("time of day only") << "hh:mm" << QByteArray("09:00 Trace a\n09:01 Trace b\n")
+                                      << QByteArray("08:00 Trace c\n08:01 Trace d\n");
+    QTest::newRow("the first entry is still in the default format")
+        << "hh:mm" << QByteArray("2025-03-03 09:00:00.000 Trace a\n09:01 Trace b\n09:02 Trace x\n")
+        << QByteArray("08:00 Trace c\n08:01 Trace d\n");
+    QTest::newRow("the older run wrote dates")
+        << "hh:mm" << QByteArray("09:00 Trace a\n09:01 Trace b\n")
+        << QByteArray("2025-03-03 10:00:00.000 Trace c\n2025-03-03 10:00:01.000 Trace d\n");
+}
+
+void tst_LogIndex::dateFormats()
+{
+    QFETCH(QString, format);
+    QFETCH(QByteArray, newer);
+    QFETCH(QByteArray, older);
+    QCOMPARE(TextsOf(newer + older, LogLineParser({format}, {})),
+             QStringList("[earlier]") + Lines(older) + QStringList("[newest]") + Lines(newer));
+
+    const QByteArray midnight("23:59 Trace a\n00:00 Trace b\n00:01 Trace c\n");
+    QCOMPARE(TextsOf(midnight, LogLineParser({"hh:mm"}, {})), Lines(midnight));
+}
+
+void tst_LogIndex::filter_data()
+{
+    QTest::addColumn<QList<int>>("hidden");
+    QTest::addColumn<QStringList>("rows");
+
+    QTest::newRow("all shown") << QList<int>()
+                               << QStringList({"a", "b", "c", "d", "e", "more", "?"});
+    QTest::newRow("no traces") << QList<int>({LogEntry::Trace})
+                               << QStringList({"b", "c", "d", "e", "more"});
+    QTest::newRow("problems only") << QList<int>({LogEntry::Trace, LogEntry::Notification})
+                                   << QStringList({"c", "d", "e", "more"});
+    QTest::newRow("none") << QList<int>({0, 1, 2, 3, 4}) << QStringList();
+}
+
+void tst_LogIndex::filter()
+{
+    QFETCH(QList<int>, hidden);
+    QFETCH(QStringList, rows);
+    const QByteArray file =
+        entry("09:00:00.000", "Trace", "a") + entry("09:00:01.000", "Notification", "b") +
+        entry("09:00:02.000", "Warning", "c") + entry("09:00:03.000", "Error", "d") +
+        entry("09:00:04.000", "Fatal", "e") + "more\n" + entry("09:00:05.000", "", "?");
+    LogIndex index;
+    Pass(index, file, 4096);
+    LogFilter filter;
+    for (int severity : hidden)
+        filter.SetSeverity(static_cast<LogEntry::Severity>(severity), false);
+
+    QStringList messages;
+    const QStringList texts = Texts(index, file, filter);
+    for (QString const& text : texts)
+        messages.append(text.section(' ', -1));
+    QCOMPARE(messages, rows);
+}
+
+void tst_LogIndex::continuedLinesGoWithTheirEntry()
+{
+    const QByteArray file = entry("09:00:00.000", "Error", "first") + "second\nthird\n" +
+                            entry("09:00:01.000", "Trace", "x");
+    LogIndex index;
+    Pass(index, file, 4096);
+    const LogRows rows = index.Rows(LogFilter());
+    for (size_t row = 0; row < 3; ++row)
+        QCOMPARE(rows.severity(row), LogEntry::Error);
+    QCOMPARE(rows.marks[0] & LogRows::Continued, 0);
+    QVERIFY(rows.marks[1] & LogRows::Continued);
+    QCOMPARE(rows.problems, size_t(1));
+}
+
+void tst_LogIndex::textFilter()
+{
+    const QByteArray file = run(30, QTime(9, 0), "newer");
+    LogFilter filter;
+    QVERIFY(filter.SetText("NEWER 2", false, false));
+    LogIndex index{LogLineParser(), filter};
+    Pass(index, file, 100);
+    QCOMPARE(Texts(index, file, filter).size(), 11);
+
+    // A match behind the limit of a very long line is not looked for; one before it is.
+    const QByteArray longLine = entry("09:00:00.000", "Trace", QString(LogIndex::LineLimit, 'x'));
+    LogFilter longFilter;
+    QVERIFY(longFilter.SetText("xxx", false, true));
+    LogIndex longIndex{LogLineParser(), longFilter};
+    Pass(longIndex, longLine, 1000);
+    QCOMPARE(longIndex.Rows(longFilter).size(), size_t(1));
+}
+
+void tst_LogIndex::problems()
+{
+    const QByteArray file =
+        entry("09:00:00.000", "Trace", "a") + entry("09:00:01.000", "Warning", "b") +
+        entry("09:00:02.000", "Error", "c") + entry("09:00:03.000", "Fatal", "d") +
+        entry("09:00:04.000", "Notification", "e");
+    LogIndex index;
+    Pass(index, file, 4096);
+    QCOMPARE(index.Rows(LogFilter()).problems, size_t(3));
+}
+
+void tst_LogIndex::passesOverAWritingRun_data()
+{
+    QTest::addColumn<unsigned>("seed");
+    for (unsigned seed = 1; seed <= 20; ++seed)
+        QTest::newRow(qPrintable(QString("seed %1").arg(seed))) << seed;
+}
+
+// A run writes over what older ones left, entry by entry; after each few entries a pass from where
+// the last one ended finds the same rows as a fresh look at the whole file.
+void tst_LogIndex::passesOverAWritingRun()
+{
+    QFETCH(unsigned, seed);
+    std::mt19937 random(seed);
+    const auto upTo = [&](int most) {
+        return static_cast<int>(random() % static_cast<unsigned>(most)) + 1;
+    };
+    QByteArray file =
+        writtenOver(run(upTo(60), QTime(6, 0), "first"), run(upTo(40), QTime(7, 0), "second run"));
+    QTime time(9, 0);
+    QByteArray newest = entry(time.toString("hh:mm:ss.zzz"), "Trace", "start");
+    LogIndex index;
+    for (int step = 0; step < 60; ++step) {
+        file = writtenOver(file, newest);
+        Pass(index, file, upTo(200));
+        QCOMPARE(Texts(index, file), TextsOf(file));
+        for (int added = upTo(4); added > 0; --added) {
+            time = time.addMSecs(upTo(2000));
+            newest += entry(time.toString("hh:mm:ss.zzz"), "Warning", QString(upTo(50), 'n'));
+            if (upTo(5) == 1)
+                newest += "it goes on\n";
+        }
+    }
+}
+
+void tst_LogIndex::readsOnlyWhatIsNew()
+{
+    QByteArray file = run(5000, QTime(9, 0), "newer");
+    LogIndex index;
+    Pass(index, file, 4096);
+    QCOMPARE(index.resumeOffset(), qint64(file.size()));
+    const qint64 end = file.size();
+    file += entry("23:00:00.000", "Trace", "new");
+    QCOMPARE(index.Begin(), end);
+    index.End();
+
+    // Behind a seam nothing is read that was read before.
+    const int seam = file.lastIndexOf('\n', 1000) + 1;
+    const QByteArray overwritten =
+        writtenOver(run(5000, QTime(17, 0), "older", true), file.left(seam));
+    LogIndex second;
+    Pass(second, overwritten, 4096);
+    QCOMPARE(second.Begin(), qint64(seam));
+    const QByteArray rest = overwritten.mid(seam);
+    QVERIFY(!second.Feed(rest.constData(), rest.size()));
+    second.End();
+    QCOMPARE(Texts(second, overwritten), TextsOf(overwritten));
+}
+
+void tst_LogIndex::incompleteLastLine()
+{
+    const QByteArray whole = run(3, QTime(9, 0), "newer");
+    LogIndex index;
+    for (int length = 1; length <= whole.size(); ++length) {
+        Pass(index, whole.left(length), 4096);
+        QCOMPARE(Texts(index, whole.left(length)), TextsOf(whole.left(length)));
+    }
+}
+
+void tst_LogIndex::anyBytes()
+{
+    std::mt19937 random(7);
+    for (int i = 0; i < 300; ++i) {
+        QByteArray file = run(40, QTime(9, 0), "x");
+        for (int change = 0; change < 60; ++change)
+            file[static_cast<int>(random() % static_cast<unsigned>(file.size()))] =
+                change % 3 ? static_cast<char>(random()) : '\n';
+        LogIndex index;
+        Pass(index, file, 333);
+        Pass(index, file, 333);
+        QCOMPARE(Texts(index, file), TextsOf(file));
+        QCOMPARE(index.size(), size_t(file.count('\n') + (file.endsWith('\n') ? 0 : 1)));
+    }
+}
+
+QTEST_GUILESS_MAIN(tst_LogIndex)
+#include "tst_LogIndex.moc"

@@ -1,0 +1,159 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/logfile/LogLineParser.h"
+
+#include <QtTest>
+
+#include <random>
+
+Q_DECLARE_METATYPE(LogEntry::Severity)
+
+class tst_LogLineParser : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void parse_data();
+    void parse();
+    void settings_data();
+    void settings();
+    void anyBytes();
+};
+
+void tst_LogLineParser::parse_data()
+{
+    QTest::addColumn<QByteArray>("line");
+    QTest::addColumn<bool>("isEntry");
+    QTest::addColumn<QString>("time");
+    QTest::addColumn<LogEntry::Severity>("severity");
+    QTest::addColumn<QString>("elapsed");
+    QTest::addColumn<QString>("message");
+
+    const QByteArray stamp("2025-03-03 09:02:11.031");
+    const QString time(stamp);
+    const auto entry = [&](char const* name, QByteArray const& rest, LogEntry::Severity severity,
+                           QString const& elapsed, QString const& message) {
+        QTest::newRow(name) << QByteArray(stamp + ' ' + rest) << true << time << severity << elapsed
+                            << message;
+    };
+    const auto noEntry = [](char const* name, QByteArray const& line) {
+        QTest::newRow(name) << line << false << QString() << LogEntry::None << QString()
+                            << QString::fromLatin1(line);
+    };
+
+    entry("trace", "Trace hello", LogEntry::Trace, "", "hello");
+    entry("notification", "Notification hello", LogEntry::Notification, "", "hello");
+    entry("warning", "Warning hello", LogEntry::Warning, "", "hello");
+    entry("error", "Error hello", LogEntry::Error, "", "hello");
+    entry("fatal", "Fatal hello", LogEntry::Fatal, "", "hello");
+    entry("empty message", "Trace ", LogEntry::Trace, "", "");
+    entry("cut behind the name", "Trace", LogEntry::Trace, "", "");
+    entry("blanks in front of the message stay", "Trace   x", LogEntry::Trace, "", "  x");
+    entry("elapsed time", "Trace dT:[250] x", LogEntry::Trace, "250", "x");
+    entry("negative elapsed time", "Trace dT:[-86399999] x", LogEntry::Trace, "-86399999", "x");
+    entry("elapsed time alone", "Trace dT:[250] ", LogEntry::Trace, "250", "");
+    entry("elapsed time without its end", "Trace dT:[250", LogEntry::Trace, "", "dT:[250");
+    entry("elapsed time without number", "Trace dT:[] x", LogEntry::Trace, "", "dT:[] x");
+    entry("elapsed time that a text follows", "Trace dT:[1]x", LogEntry::Trace, "", "dT:[1]x");
+    entry("severity without a name", " x", LogEntry::None, "", "x");
+    entry("severity name in the message", "Trace Error x", LogEntry::Trace, "", "Error x");
+    entry("Latin-1", "Trace caf\xE9", LogEntry::Trace, "", QString::fromLatin1("caf\xE9"));
+
+    noEntry("empty line", "");
+    noEntry("plain text", "no stamp here");
+    noEntry("severity name in plain text", "the last Error was this");
+    noEntry("severity name as part of a word", stamp + " Traces x");
+    noEntry("severity name far behind", QByteArray(200, '1') + " Error x");
+    noEntry("stamp alone", stamp);
+
+    QTest::newRow("any stamp with a digit counts")
+        << QByteArray("Mon 3rd Warning x") << true << "Mon 3rd" << LogEntry::Warning << ""
+        << "x";
+    QTest::newRow("empty stamp") << QByteArray(" Warning x") << true << "" << LogEntry::Warning
+                                 << ""
+                                 << "x";
+}
+
+void tst_LogLineParser::parse()
+{
+    QFETCH(QByteArray, line);
+    const LogEntry entry = LogLineParser().Parse(line);
+    QTEST(entry.isEntry, "isEntry");
+    QTEST(entry.time, "time");
+    QTEST(entry.severity, "severity");
+    QTEST(entry.elapsed, "elapsed");
+    QTEST(entry.message, "message");
+}
+
+void tst_LogLineParser::settings_data()
+{
+    QTest::addColumn<QString>("format");
+    QTest::addColumn<QString>("prefix");
+    QTest::addColumn<QByteArray>("line");
+    QTest::addColumn<QString>("time");
+    QTest::addColumn<QString>("elapsed");
+    QTest::addColumn<QString>("message");
+
+    QTest::newRow("own format") << "dd.MM. hh:mm"
+                                << "dT:" << QByteArray("03.03. 09:02 Trace x") << "03.03. 09:02"
+                                << ""
+                                << "x";
+    QTest::newRow("the default format besides")
+        << "dd.MM. hh:mm"
+        << "dT:" << QByteArray("2025-03-03 09:02:11.031 Trace x") << "2025-03-03 09:02:11.031"
+        << ""
+        << "x";
+    QTest::newRow("a severity name in the stamp")
+        << "'Error' hh:mm"
+        << "dT:" << QByteArray("Error 09:02 Trace x") << "Error 09:02"
+        << ""
+        << "x";
+    QTest::newRow("own prefix with a blank")
+        << "hh:mm"
+        << "it took " << QByteArray("09:02 Trace it took [3] x") << "09:02"
+        << "3"
+        << "x";
+    QTest::newRow("empty settings")
+        << ""
+        << "" << QByteArray("2025-03-03 09:02:11.031 Trace dT:[3] x") << "2025-03-03 09:02:11.031"
+        << "3"
+        << "x";
+}
+
+void tst_LogLineParser::settings()
+{
+    QFETCH(QString, format);
+    QFETCH(QString, prefix);
+    QFETCH(QByteArray, line);
+    const LogEntry entry = LogLineParser({format}, {prefix}).Parse(line);
+    QTEST(entry.time, "time");
+    QTEST(entry.elapsed, "elapsed");
+    QTEST(entry.message, "message");
+}
+
+// No bytes are read beyond the line, and the parts always add up. Meant for the sanitizers too.
+void tst_LogLineParser::anyBytes()
+{
+    std::mt19937 random(1);
+    const LogLineParser parser({"dddd, d MMMM yyyy h:mm:ss AP"}, {"t["});
+    const QByteArray seed(
+        "2025-03-03 09:02:11.031 Trace dT:[250] x Monday, 3 March 2025 9:30:00 PM "
+        "Error t[[1] y");
+    for (int i = 0; i < 20000; ++i) {
+        QByteArray line =
+            seed.mid(static_cast<int>(random() % 90), static_cast<int>(random() % 90));
+        for (int change = static_cast<int>(random() % 4); change > 0 && !line.isEmpty(); --change)
+            line[static_cast<int>(random() % static_cast<unsigned>(line.size()))] =
+                static_cast<char>(random());
+        const QByteArray exact(line.constData(), line.size());
+        const LogLineParser::Parts parts = parser.Find(exact.constData(), exact.size());
+        QVERIFY(parts.timeLength >= 0 && parts.timeLength <= exact.size());
+        QVERIFY(parts.message >= parts.timeLength && parts.message <= exact.size());
+        QVERIFY(parts.elapsed + parts.elapsedLength <= exact.size());
+        QVERIFY(parser.Parse(exact).message.size() == exact.size() - parts.message);
+    }
+}
+
+QTEST_GUILESS_MAIN(tst_LogLineParser)
+#include "tst_LogLineParser.moc"

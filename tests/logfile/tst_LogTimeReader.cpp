@@ -1,0 +1,158 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/logfile/LogTimeReader.h"
+
+#include <QDateTime>
+#include <QtTest>
+
+class tst_LogTimeReader : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void length_data();
+    void length();
+    void readsWhatTheToolkitWrites_data();
+    void readsWhatTheToolkitWrites();
+    void order_data();
+    void order();
+    void hasDate_data();
+    void hasDate();
+};
+
+void tst_LogTimeReader::length_data()
+{
+    QTest::addColumn<QString>("format");
+    QTest::addColumn<QByteArray>("text");
+    QTest::addColumn<int>("length");
+    QTest::addColumn<bool>("tellsTime");
+
+    const QString byDefault("yyyy-MM-dd hh:mm:ss.z");
+    QTest::newRow("default") << byDefault << QByteArray("2025-03-03 09:02:11.031 Trace x") << 23
+                             << true;
+    QTest::newRow("one digit of milliseconds")
+        << byDefault << QByteArray("2025-03-03 09:02:11.5 Trace x") << 21 << true;
+    QTest::newRow("cut at the front")
+        << byDefault << QByteArray("03-03 09:02:11.031 Trace x") << -1 << false;
+    QTest::newRow("cut at the end") << byDefault << QByteArray("2025-03-03 09:02:1") << -1 << false;
+    QTest::newRow("empty line") << byDefault << QByteArray("") << -1 << false;
+    QTest::newRow("letters for digits")
+        << byDefault << QByteArray("2025-0x-03 09:02:11.031 Trace x") << -1 << false;
+    QTest::newRow("quoted text alone")
+        << QString("'now'") << QByteArray("now Trace x") << 3 << false;
+    QTest::newRow("two quotes stand for one")
+        << QString("hh''mm") << QByteArray("09'30 x") << 5 << true;
+    QTest::newRow("a quote that is never closed")
+        << QString("'at ") << QByteArray("at x") << 3 << false;
+    QTest::newRow("empty format") << QString("") << QByteArray("x") << 0 << false;
+    QTest::newRow("12 hours") << QString("h:mm ap") << QByteArray("9:30 pm x") << 7 << true;
+    QTest::newRow("time zone") << QString("hh:mm t") << QByteArray("09:30 CET x") << 9 << true;
+    QTest::newRow("half of the day in one letter")
+        << QString("h:mm a") << QByteArray("9:30 pm x") << 7 << true;
+    QTest::newRow("half of the day at the end of a line")
+        << QString("h:mm ap") << QByteArray("9:30 pm") << 7 << true;
+    QTest::newRow("a year of one letter stands for itself")
+        << QString("y hh:mm") << QByteArray("y 09:30 x") << 7 << true;
+    QTest::newRow("two names of the month")
+        << QString("MMM MMMM hh:mm") << QByteArray("May May 09:30 x") << 13 << true;
+    QTest::newRow("a month cut off") << QString("MMM") << QByteArray("Ma") << -1 << false;
+    QTest::newRow("minutes without hours") << QString("mm") << QByteArray("30 x") << 2 << false;
+    QTest::newRow("hours without minutes") << QString("hh") << QByteArray("09 x") << 2 << false;
+    QTest::newRow("nothing between two quotes")
+        << QString("hh'':mm") << QByteArray("09':30 x") << 6 << true;
+    QTest::newRow("unknown month") << QString("MMM d") << QByteArray("Foo 3") << -1 << false;
+}
+
+void tst_LogTimeReader::length()
+{
+    QFETCH(QString, format);
+    QFETCH(QByteArray, text);
+    QFETCH(bool, tellsTime);
+    const LogTimeReader::Stamp stamp = LogTimeReader(format).Read(text.constData(), text.size());
+    QTEST(stamp.length, "length");
+    QCOMPARE(stamp.key >= 0, tellsTime);
+}
+
+void tst_LogTimeReader::readsWhatTheToolkitWrites_data()
+{
+    QTest::addColumn<QString>("format");
+
+    for (char const* format :
+         {"yyyy-MM-dd hh:mm:ss.z", "yyyy-MM-dd hh:mm:ss.zzz", "yy-M-d h:m:s.z",
+          "dd.MM.yyyy HH:mm:ss", "ddd MMM d yyyy hh:mm:ss", "dddd, d MMMM yyyy h:mm:ss AP",
+          "hh:mm:ss.zzz", "'at' hh 'o''clock' mm", "yyyyMMddhhmmsszzz", "yyyy-MM-ddThh:mm:ss"})
+        QTest::newRow(format) << QString(format);
+}
+
+// Whatever a format makes of a time is read to its end, and later times read as later ones.
+void tst_LogTimeReader::readsWhatTheToolkitWrites()
+{
+    QFETCH(QString, format);
+    const LogTimeReader reader(format);
+    qint64 last = -1;
+    for (int minute = 0; minute < 24 * 60; minute += 7) {
+        const QDateTime time(QDate(2025, 10, 9), QTime(minute / 60, minute % 60, minute % 60, 120));
+        const QByteArray text = time.toString(format).toLatin1();
+        const QByteArray line = text + " Trace x";
+        const LogTimeReader::Stamp stamp = reader.Read(line.constData(), line.size());
+        QVERIFY2(stamp.length == text.size(), line);
+        QVERIFY2(stamp.key > last, line);
+        last = stamp.key;
+    }
+}
+
+void tst_LogTimeReader::order_data()
+{
+    QTest::addColumn<QString>("format");
+    QTest::addColumn<QByteArray>("earlier");
+    QTest::addColumn<QByteArray>("later");
+
+    const QString byDefault("yyyy-MM-dd hh:mm:ss.z");
+    QTest::newRow("years") << byDefault << QByteArray("2024-12-31 23:59:59.999")
+                           << QByteArray("2025-01-01 00:00:00.000");
+    QTest::newRow("months before days") << byDefault << QByteArray("2025-01-31 00:00:00.000")
+                                        << QByteArray("2025-02-01 00:00:00.000");
+    QTest::newRow("leap second") << byDefault << QByteArray("2025-01-31 00:00:60.999")
+                                 << QByteArray("2025-01-31 00:01:00.000");
+    QTest::newRow("noon is after eleven")
+        << QString("h:mm ap") << QByteArray("11:59 am") << QByteArray("12:00 pm");
+    QTest::newRow("midnight is before one")
+        << QString("h:mm ap") << QByteArray("12:59 am") << QByteArray("1:00 am");
+    QTest::newRow("names of months")
+        << QString("yyyy MMM d hh:mm") << QByteArray("2025 Apr 1 00:00")
+        << QByteArray("2025 Aug 1 00:00");
+}
+
+void tst_LogTimeReader::order()
+{
+    QFETCH(QString, format);
+    QFETCH(QByteArray, earlier);
+    QFETCH(QByteArray, later);
+    const LogTimeReader reader(format);
+    const qint64 first = reader.Read(earlier.constData(), earlier.size()).key;
+    QVERIFY(first >= 0);
+    QVERIFY(first < reader.Read(later.constData(), later.size()).key);
+}
+
+void tst_LogTimeReader::hasDate_data()
+{
+    QTest::addColumn<QString>("format");
+    QTest::addColumn<bool>("expected");
+
+    QTest::newRow("default") << QString("yyyy-MM-dd hh:mm:ss.z") << true;
+    QTest::newRow("time only") << QString("hh:mm:ss") << false;
+    QTest::newRow("no year") << QString("MM-dd hh:mm:ss") << false;
+    QTest::newRow("no month") << QString("yyyy dd") << false;
+    QTest::newRow("no day") << QString("yyyy-MM") << false;
+    QTest::newRow("short year") << QString("d.M.yy") << true;
+}
+
+void tst_LogTimeReader::hasDate()
+{
+    QFETCH(QString, format);
+    QTEST(LogTimeReader(format).hasDate(), "expected");
+}
+
+QTEST_GUILESS_MAIN(tst_LogTimeReader)
+#include "tst_LogTimeReader.moc"

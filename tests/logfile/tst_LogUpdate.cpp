@@ -1,0 +1,99 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/logfile/LogUpdate.h"
+
+#include <QtTest>
+
+namespace {
+
+// Rows, a letter each: first those of the earlier part. Where a row starts tells rows apart, and
+// here the letter does.
+std::shared_ptr<LogRows> Rows(char const* earlier, char const* newest)
+{
+    auto rows = std::make_shared<LogRows>();
+    const QByteArray all = QByteArray(earlier) + newest;
+    for (char letter : all) {
+        rows->starts.push_back(letter);
+        rows->marks.push_back(0);
+    }
+    rows->earlier = qstrlen(earlier);
+    return rows;
+}
+
+} // namespace
+
+class tst_LogUpdate : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void compare_data();
+    void compare();
+    void marksCount();
+};
+
+// The numbers are: the place of the change, how many rows went and came there, and how many rows
+// at the former end read differently.
+void tst_LogUpdate::compare_data()
+{
+    QTest::addColumn<QByteArray>("earlierBefore");
+    QTest::addColumn<QByteArray>("newestBefore");
+    QTest::addColumn<QByteArray>("earlierAfter");
+    QTest::addColumn<QByteArray>("newestAfter");
+    QTest::addColumn<bool>("isReset");
+    QTest::addColumn<QList<int>>("numbers");
+
+    const auto row = [](char const* name, char const* earlierBefore, char const* newestBefore,
+                        char const* earlierAfter, char const* newestAfter, bool isReset,
+                        QList<int> const& numbers) {
+        QTest::newRow(name) << QByteArray(earlierBefore) << QByteArray(newestBefore)
+                            << QByteArray(earlierAfter) << QByteArray(newestAfter) << isReset
+                            << numbers;
+    };
+    row("nothing new", "ab", "xy", "ab", "xy", false, {2, 0, 0, 0});
+    row("nothing at all", "", "", "", "", false, {0, 0, 0, 0});
+    row("the newest run grows", "ab", "x", "ab", "xyz", false, {2, 0, 0, 0});
+    row("the last row reads differently", "ab", "xy", "ab", "xz", false, {2, 0, 0, 1});
+    row("all rows read differently", "", "xy", "", "pqr", false, {0, 0, 0, 2});
+    row("the earlier part loses its first rows", "abcd", "x", "cd", "xy", false, {0, 2, 0, 0});
+    row("the earlier part loses its last rows", "abcd", "x", "ab", "x", false, {2, 2, 0, 0});
+    row("the earlier part loses rows in its middle", "abcd", "x", "ad", "x", false, {1, 2, 0, 0});
+    row("the earlier part gains rows", "ad", "x", "abcd", "x", false, {1, 0, 2, 0});
+    row("a row of the earlier part is another", "abc", "x", "aec", "x", false, {1, 1, 1, 0});
+    row("equal rows are not counted from both ends", "aa", "x", "a", "x", false, {1, 1, 0, 0});
+    row("the newest run is shorter", "ab", "xy", "ab", "x", true, {});
+    row("the earlier part is gone", "ab", "xy", "", "xy", true, {});
+    row("there is an earlier part now", "", "xy", "ab", "xy", true, {});
+}
+
+void tst_LogUpdate::compare()
+{
+    QFETCH(QByteArray, earlierBefore);
+    QFETCH(QByteArray, newestBefore);
+    QFETCH(QByteArray, earlierAfter);
+    QFETCH(QByteArray, newestAfter);
+    QFETCH(QList<int>, numbers);
+    LogUpdate update;
+    update.rows = Rows(earlierAfter, newestAfter);
+    update.Compare(*Rows(earlierBefore, newestBefore));
+    QTEST(update.isReset, "isReset");
+    if (!update.isReset)
+        QCOMPARE(QList<int>({int(update.changeAt), int(update.removed), int(update.inserted),
+                             int(update.changedTail)}),
+                 numbers);
+}
+
+void tst_LogUpdate::marksCount()
+{
+    LogUpdate update;
+    const auto after = Rows("", "xy");
+    after->marks[1] = LogRows::Torn;
+    update.rows = after;
+    update.Compare(*Rows("", "xy"));
+    QVERIFY(!update.isReset);
+    QCOMPARE(update.changedTail, size_t(1));
+}
+
+QTEST_APPLESS_MAIN(tst_LogUpdate)
+#include "tst_LogUpdate.moc"

@@ -1,0 +1,379 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// Reading configuration-store files beside the store, and saving them through it.
+
+#include "app/settingsfile/SettingsFileReader.h"
+#include "app/settingsfile/SettingsFileWriter.h"
+#include "common/config/TorkConfigFile.h"
+#include "support/ProcessLimits.h"
+#include "support/TestFiles.h"
+
+#include <QTemporaryDir>
+#include <QtTest>
+
+namespace {
+
+QString Joined(SettingsDocument const& document)
+{
+    QStringList texts;
+    for (SettingsDocument::Section const& section : document.sections) {
+        texts.append("[" + section.name + "]");
+        for (SettingsDocument::Item const& item : section.items)
+            texts.append(item.key + "=" + item.value);
+    }
+    return texts.join(' ');
+}
+
+SettingsDocument OneValue(QString const& value)
+{
+    SettingsDocument document;
+    document.rootName = "Root";
+    document.SetValue("S", "k", value);
+    return document;
+}
+
+} // namespace
+
+class tst_SettingsFile : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void read_data();
+    void read();
+    void readsWhatTheStoreReads_data();
+    void readsWhatTheStoreReads();
+    void errors_data();
+    void errors();
+    void unreadable();
+    void deepNesting();
+    void deepDocumentType();
+    void losses_data();
+    void losses();
+    void lossesOfNames_data();
+    void lossesOfNames();
+    void sameValues_data();
+    void sameValues();
+    void valueByName();
+    void isName_data();
+    void isName();
+    void save();
+    void saveFails();
+    void fullDisk();
+    void backup();
+};
+
+void tst_SettingsFile::read_data()
+{
+    QTest::addColumn<QByteArray>("text");
+    QTest::addColumn<QString>("values");
+    QTest::addColumn<int>("lossCount");
+    QTest::addColumn<QString>("firstLoss");
+
+    const auto row = [](char const* name, QByteArray const& inside, char const* values,
+                        int lossCount, char const* loss) {
+        QTest::newRow(name) << QByteArray("<R>\n" + inside + "\n</R>\n") << QString(values)
+                            << lossCount << QString(loss);
+    };
+    row("empty", "", "", 0, "");
+    row("values in their order", "<S><b>1</b><a>2</a></S><Q><c>3</c></Q>", "[S] b=1 a=2 [Q] c=3", 0,
+        "");
+    row("markup in CDATA", "<S><a><![CDATA[<&>]]></a></S>", "[S] a=<&>", 0, "");
+    row("attribute", "<S><a x='1'>v</a></S>", "[S] a=v", 1, "Line 2: the attribute \"x\" of \"a\"");
+    row("comment", "<S><!-- why --><a>v</a></S>", "[S] a=v", 1, "Line 2: the comment \"why\"");
+    row("nesting", "<S><a>v<deep>w</deep></a></S>", "[S] a=v", 2,
+        "Line 2: the nesting of the element \"deep\"");
+    row("element without text", "<S><a></a></S>", "[S]", 1, "Line 2: \"a\", which has no text");
+    row("empty element", "<S><a/></S>", "[S]", 1, "Line 2: \"a\", which has no text");
+    row("key twice", "<S><a>1</a><a>2</a></S>", "[S] a=2", 1,
+        "Line 2: a second value of \"a\", in the place of the first");
+    row("section twice", "<S><a>1</a></S><S><b>2</b></S>", "[S] a=1 b=2", 1,
+        "Line 2: a second section \"S\", merged with the first");
+    row("text in a section", "<S>text<a>1</a></S>", "[S] a=1", 1,
+        "Line 2: the text \"text\" outside of values");
+    row("instruction", "<?do it?><S><a>1</a></S>", "[S] a=1", 1, "Line 2: the instruction \"do\"");
+    row("section called like the root", "<R><a>1</a></R>", "", 2,
+        "Line 2: the element \"R\", which is called like the root");
+    QTest::newRow("declaration") << QByteArray("<?xml version=\"1.0\"?><R><S><a>1</a></S></R>")
+                                 << "[S] a=1" << 1 << "Line 1: the XML declaration";
+}
+
+void tst_SettingsFile::read()
+{
+    QFETCH(QByteArray, text);
+    QFETCH(QString, firstLoss);
+    const SettingsDocument document = SettingsFileReader::ReadBytes(text);
+    QVERIFY2(document.isParsed, qPrintable(document.error));
+    QCOMPARE(document.rootName, QString("R"));
+    QTEST(Joined(document), "values");
+    if (!firstLoss.isEmpty())
+        QCOMPARE(document.losses.value(0), firstLoss);
+    QTEST(document.lossCount, "lossCount");
+}
+
+void tst_SettingsFile::readsWhatTheStoreReads_data()
+{
+    QTest::addColumn<QByteArray>("inside");
+    QTest::newRow("plain") << QByteArray("<S><a>1</a><b> </b></S>");
+    QTest::newRow("entities") << QByteArray("<S><a>x&amp;y</a><b>&lt;</b></S>");
+    QTest::newRow("CDATA in pieces") << QByteArray("<S><a>x<![CDATA[y]]>z</a></S>");
+    QTest::newRow("nested") << QByteArray("<S><a><b>1</b></a><c>2</c></S>");
+    QTest::newRow("nested behind a text") << QByteArray("<S><a>0<b>1</b></a></S>");
+    QTest::newRow("no text") << QByteArray("<S><a/></S><T>text<b>1</b></T>");
+    QTest::newRow("called like the root") << QByteArray("<R><a>1</a></R><S><R>2</R><b>3</b></S>");
+    QTest::newRow("comment in a value") << QByteArray("<S><a>x<!-- c -->y</a></S>");
+    QTest::newRow("comment before a value") << QByteArray("<S><a><!-- c -->y</a></S>");
+    QTest::newRow("long value") << "<S><a>" + QByteArray(100000, 'x') + "</a></S>";
+    QTest::newRow("Latin-1 bytes") << QByteArray("<S><a>\xE9t\xE9</a></S>");
+}
+
+void tst_SettingsFile::readsWhatTheStoreReads()
+{
+    QFETCH(QByteArray, inside);
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("x.cfg");
+    QVERIFY(TestFiles::write(path, "<R>\n" + inside + "\n</R>\n"));
+    const SettingsDocument document = SettingsFileReader::Read(path);
+    TorkConfigFile store(path, document.rootName);
+    QVERIFY(store.Load());
+    for (SettingsDocument::Section const& section : document.sections) {
+        QVERIFY2(store.HasSection(section.name), qPrintable(section.name));
+        QCOMPARE(store.keyList(section.name).size(), section.items.size());
+        for (SettingsDocument::Item const& item : section.items) {
+            QString none;
+            QString value;
+            QVERIFY2(store.ReadItem(section.name, item.key, none, value), qPrintable(item.key));
+            QCOMPARE(value, item.value);
+        }
+    }
+}
+
+void tst_SettingsFile::errors_data()
+{
+    QTest::addColumn<QByteArray>("text");
+    QTest::addColumn<int>("line");
+    QTest::newRow("empty") << QByteArray("") << 1;
+    QTest::newRow("no XML") << QByteArray("a = 1\n") << 1;
+    QTest::newRow("cut off") << QByteArray("<R>\n<S>\n<a>1") << 3;
+    QTest::newRow("wrong end") << QByteArray("<R>\n<S>\n<a>1</b>\n</S>\n</R>\n") << 3;
+    QTest::newRow("two roots") << QByteArray("<R/>\n<R/>") << 2;
+    QTest::newRow("binary") << QByteArray("\x7f\x45\x4c\x46\0\1", 6) << 1;
+}
+
+void tst_SettingsFile::errors()
+{
+    QFETCH(QByteArray, text);
+    const SettingsDocument document = SettingsFileReader::ReadBytes(text);
+    QVERIFY(document.isReadable);
+    QVERIFY(!document.isParsed);
+    QVERIFY(!document.error.isEmpty());
+    QTEST(document.line, "line");
+    QVERIFY(document.column > 0);
+}
+
+void tst_SettingsFile::unreadable()
+{
+    const QTemporaryDir folder;
+    for (QString const& path : {folder.filePath("missing.cfg"), folder.path()}) {
+        const SettingsDocument document = SettingsFileReader::Read(path);
+        QVERIFY(!document.isReadable);
+        QVERIFY(!document.isParsed);
+        QVERIFY(!document.error.isEmpty());
+    }
+}
+
+void tst_SettingsFile::deepNesting()
+{
+    QByteArray text;
+    for (int i = 0; i < 100000; ++i)
+        text += "<a>";
+    const SettingsDocument document = SettingsFileReader::ReadBytes(text);
+    QVERIFY(!document.isParsed);
+    QCOMPARE(document.error, QString("elements are nested too deep"));
+}
+
+void tst_SettingsFile::deepDocumentType()
+{
+    QByteArray text = "<!DOCTYPE S [<!ELEMENT S ";
+    text += QByteArray(100000, '(') + "a" + QByteArray(100000, ')') + ">]><S/>";
+    const SettingsDocument document = SettingsFileReader::ReadBytes(text);
+    QVERIFY(!document.isParsed);
+    QVERIFY(!document.error.isEmpty());
+}
+
+void tst_SettingsFile::losses_data()
+{
+    QTest::addColumn<QString>("value");
+    QTest::addColumn<bool>("isKept");
+    QTest::newRow("plain") << "value" << true;
+    QTest::newRow("markup") << "<a href=\"x\">&'" << true;
+    QTest::newRow("blank") << " " << true;
+    QTest::newRow("line feed") << "a\nb" << true;
+    QTest::newRow("percent") << "100 %" << true;
+    QTest::newRow("placeholder") << "%1" << false;
+    QTest::newRow("end of CDATA") << "x]]>y" << false;
+    QTest::newRow("outside Latin-1") << QString::fromUtf8("\xE2\x82\xAC") << false;
+    QTest::newRow("empty") << "" << false;
+    QTest::newRow("carriage return") << "a\rb" << true;
+    QTest::newRow("null character") << QString("a") + QChar(0) << true;
+}
+
+// What is said to be kept comes back the same, what is said to be lost does not.
+void tst_SettingsFile::losses()
+{
+    QFETCH(QString, value);
+    QFETCH(bool, isKept);
+    const SettingsDocument document = OneValue(value);
+    QCOMPARE(SettingsFileWriter::Losses(document).isEmpty(), isKept);
+
+    const QTemporaryDir folder;
+    QString error;
+    SettingsFileWriter::Save(folder.filePath("x.cfg"), document, &error);
+    const SettingsDocument after = SettingsFileReader::Read(folder.filePath("x.cfg"));
+    QCOMPARE(after.isParsed && after.HasSameValues(document), isKept);
+}
+
+void tst_SettingsFile::lossesOfNames_data()
+{
+    QTest::addColumn<QString>("section");
+    QTest::addColumn<QString>("key");
+    QTest::addColumn<QStringList>("expected");
+    QTest::newRow("names") << "S"
+                           << "k" << QStringList();
+    QTest::newRow("blank in a key")
+        << "S"
+        << "a b" << QStringList("S / a b: the key is no name that the store can write");
+    QTest::newRow("blank in a section")
+        << "A B"
+        << "k" << QStringList("A B: the section has no name that the store can write");
+    QTest::newRow("section without a name")
+        << ""
+        << "k" << QStringList(": the section has no name that the store can write");
+    QTest::newRow("section called as the root") << "Root"
+                                                << "k" << QStringList();
+}
+
+void tst_SettingsFile::lossesOfNames()
+{
+    QFETCH(QString, section);
+    QFETCH(QString, key);
+    SettingsDocument document;
+    document.rootName = "Root";
+    document.SetValue(section, key, "v");
+    QTEST(SettingsFileWriter::Losses(document), "expected");
+}
+
+void tst_SettingsFile::sameValues_data()
+{
+    QTest::addColumn<QByteArray>("other");
+    QTest::addColumn<bool>("isSame");
+    QTest::newRow("the same") << QByteArray("<R><S><a>1</a><b>2</b></S></R>") << true;
+    QTest::newRow("under another root") << QByteArray("<Q><S><a>1</a><b>2</b></S></Q>") << true;
+    QTest::newRow("another value") << QByteArray("<R><S><a>1</a><b>3</b></S></R>") << false;
+    QTest::newRow("another key") << QByteArray("<R><S><a>1</a><c>2</c></S></R>") << false;
+    QTest::newRow("another order") << QByteArray("<R><S><b>2</b><a>1</a></S></R>") << false;
+    QTest::newRow("a key less") << QByteArray("<R><S><a>1</a></S></R>") << false;
+    QTest::newRow("another section") << QByteArray("<R><T><a>1</a><b>2</b></T></R>") << false;
+    QTest::newRow("a section more") << QByteArray("<R><S><a>1</a><b>2</b></S><T/></R>") << false;
+}
+
+void tst_SettingsFile::sameValues()
+{
+    QFETCH(QByteArray, other);
+    const SettingsDocument one = SettingsFileReader::ReadBytes("<R><S><a>1</a><b>2</b></S></R>");
+    QTEST(one.HasSameValues(SettingsFileReader::ReadBytes(other)), "isSame");
+    QTEST(SettingsFileReader::ReadBytes(other).HasSameValues(one), "isSame");
+}
+
+void tst_SettingsFile::valueByName()
+{
+    SettingsDocument document =
+        SettingsFileReader::ReadBytes("<R><S><a>1</a></S><T><a>2</a></T></R>");
+    QCOMPARE(document.Value("T", "a", "none"), QString("2"));
+    QCOMPARE(document.Value("T", "b", "none"), QString("none"));
+    QCOMPARE(document.Value("U", "a", "none"), QString("none"));
+    document.SetValue("T", "a", "3");
+    document.SetValue("T", "b", "4");
+    document.SetValue("U", "a", "5");
+    QCOMPARE(Joined(document), QString("[S] a=1 [T] a=3 b=4 [U] a=5"));
+}
+
+void tst_SettingsFile::isName_data()
+{
+    QTest::addColumn<QString>("name");
+    QTest::addColumn<bool>("expected");
+    QTest::newRow("letters") << "abc" << true;
+    QTest::newRow("underscore first") << "_a" << true;
+    QTest::newRow("digits behind") << "a1.b-c" << true;
+    QTest::newRow("digit first") << "1a" << false;
+    QTest::newRow("blank") << "a b" << false;
+    QTest::newRow("markup") << "a<" << false;
+    QTest::newRow("empty") << "" << false;
+    QTest::newRow("umlaut") << QString::fromUtf8("\xC3\xA4") << false;
+    QTest::newRow("line feed behind") << "a\n" << false;
+}
+
+void tst_SettingsFile::isName()
+{
+    QFETCH(QString, name);
+    QTEST(SettingsFileWriter::IsName(name), "expected");
+}
+
+void tst_SettingsFile::save()
+{
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("x.cfg");
+    SettingsDocument document;
+    document.rootName = "LogSettings";
+    document.SetValue("config", "filePrefix", "app");
+    document.SetValue("config", "x", "<");
+    document.sections.append(SettingsDocument::Section{"Empty", {}});
+    QString error;
+    QVERIFY2(SettingsFileWriter::Save(path, document, &error), qPrintable(error));
+    QCOMPARE(TestFiles::read(path),
+             QByteArray("<LogSettings>\n<config>\n<filePrefix>app</filePrefix>\n"
+                        "<x><![CDATA[<]]></x>\n</config>\n<Empty>\n</Empty>\n</LogSettings>\n"));
+}
+
+void tst_SettingsFile::saveFails()
+{
+    const QTemporaryDir folder;
+    QString error;
+    QVERIFY(!SettingsFileWriter::Save(folder.filePath("no/x.cfg"), OneValue("v"), &error));
+    QCOMPARE(error, "Unable to open file: " + folder.filePath("no/x.cfg"));
+}
+
+void tst_SettingsFile::fullDisk()
+{
+    const QTemporaryDir folder;
+    if (!ProcessLimits::limitFileSize(100))
+        QSKIP("the size of files cannot be limited here");
+    QString error;
+    const bool saved =
+        SettingsFileWriter::Save(folder.filePath("x.cfg"), OneValue(QString(1000, 'v')), &error);
+    ProcessLimits::unlimitFileSize();
+    QVERIFY(!saved);
+    QVERIFY(!error.isEmpty());
+}
+
+void tst_SettingsFile::backup()
+{
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("x.cfg");
+    QString error;
+    QVERIFY(SettingsFileWriter::KeepBackup(path, &error)); // nothing to lose
+    QVERIFY(TestFiles::write(path, "one"));
+    QVERIFY(SettingsFileWriter::KeepBackup(path, &error));
+    QCOMPARE(TestFiles::read(path + ".bak"), QByteArray("one"));
+    QVERIFY(TestFiles::write(path, "two"));
+    QVERIFY(SettingsFileWriter::KeepBackup(path, &error));
+    QCOMPARE(TestFiles::read(path + ".bak"), QByteArray("two"));
+    QVERIFY(QFile::remove(path + ".bak"));
+    QVERIFY(QDir().mkpath(path + ".bak/in the way"));
+    QVERIFY(!SettingsFileWriter::KeepBackup(path, &error));
+    QVERIFY(!error.isEmpty());
+}
+
+QTEST_GUILESS_MAIN(tst_SettingsFile)
+#include "tst_SettingsFile.moc"
