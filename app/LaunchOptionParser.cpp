@@ -111,7 +111,7 @@ bool LaunchOptionParser::ReadDataFile(QString const& path)
 bool LaunchOptionParser::ParseOptions(QString& text)
 {
     QByteArray xml = text.toLocal8Bit();
-    if (NestedDeeperThan(xml.constData(), TorkXmlMaximumDepth))
+    if (Velocor::NestedDeeperThan(xml.constData(), TorkXmlMaximumDepth))
         return false;
 
     try {

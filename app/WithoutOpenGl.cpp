@@ -7,6 +7,8 @@
 #include <QGuiApplication>
 #include <QOpenGLContext>
 
+namespace Velocor {
+
 namespace {
 
 constexpr char const* Variable = "QT_XCB_GL_INTEGRATION";
@@ -36,3 +38,5 @@ void WithoutOpenGl::End()
     qunsetenv(Variable);
     m_isSet = false;
 }
+
+} // namespace Velocor

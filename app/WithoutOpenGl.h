@@ -3,13 +3,15 @@
 
 #pragma once
 
+namespace Velocor {
+
 /// Keeps the toolkit's X11 plugin from setting up OpenGL, which nothing here draws with.
 ///
 /// The set-up loads a graphics driver before the first window can show: more than half of the
 /// start's time and two thirds of its memory. The plugin asks the environment once, and is made to
 /// do so as soon as the application object stands:
 ///
-///     WithoutOpenGl withoutOpenGl;
+///     Velocor::WithoutOpenGl withoutOpenGl;
 ///     QApplication app(argc, argv);
 ///     withoutOpenGl.End();
 ///
@@ -30,3 +32,5 @@ public:
 private:
     bool m_isSet;
 };
+
+} // namespace Velocor

@@ -5,6 +5,8 @@
 
 #include <cstring>
 
+namespace Velocor {
+
 namespace {
 
 enum class Tag { Start, Empty, Broken };
@@ -115,3 +117,5 @@ bool NestedDeeperThan(char const* xml, int limit)
     }
     return false;
 }
+
+} // namespace Velocor

@@ -3,6 +3,8 @@
 
 #pragma once
 
+namespace Velocor {
+
 /// Whether an XML text nests elements deeper than `limit`, counted without recursion.
 ///
 /// rapidxml calls itself once per open element, so this is asked before it gets to see a text. The
@@ -11,3 +13,5 @@
 ///
 /// @param xml  zero-terminated, in an encoding that leaves ASCII alone
 bool NestedDeeperThan(char const* xml, int limit);
+
+} // namespace Velocor

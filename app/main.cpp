@@ -39,7 +39,7 @@ void TellLogFileWithoutScreen()
 // caption.
 int main(int argc, char** argv)
 {
-    WithoutOpenGl withoutOpenGl;
+    Velocor::WithoutOpenGl withoutOpenGl;
     QApplication application(argc, argv);
     withoutOpenGl.End();
     AppPaths::SetOrganizationAndProduct();
@@ -47,7 +47,7 @@ int main(int argc, char** argv)
     application.setProperty("caption", Caption());
 
     QuitOnSignal quitOnSignal;
-    MainWindow window;
+    Velocor::MainWindow window;
     window.show();
     TellLogFileWithoutScreen();
 

@@ -24,6 +24,8 @@
 
 #include <malloc.h>
 
+using namespace Velocor;
+
 namespace {
 
 constexpr int LargeLog = 1000000; // lines

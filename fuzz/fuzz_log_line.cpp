@@ -9,6 +9,8 @@
 
 #include <vector>
 
+using namespace Velocor;
+
 extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
 {
     FuzzInput input(data, size);

@@ -5,6 +5,8 @@
 
 #include <QString>
 
+namespace Velocor {
+
 /// One line of a log file, taken apart for people. A plain record.
 struct LogEntry
 {
@@ -17,3 +19,5 @@ struct LogEntry
     QString message;      ///< the rest of the line, or all of a line that is no entry
     bool isEntry = false; ///< false: goes on with the entry above it, or is torn
 };
+
+} // namespace Velocor

@@ -7,6 +7,8 @@
 #include <QFileInfo>
 #include <QMap>
 
+namespace Velocor {
+
 namespace {
 
 // The number behind the last dot; -1 if there is none.
@@ -47,3 +49,5 @@ QStringList LogFileList::FilesOf(QString const& path)
         files.prepend(path);
     return files;
 }
+
+} // namespace Velocor

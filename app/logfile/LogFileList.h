@@ -6,6 +6,8 @@
 #include <QString>
 #include <QStringList>
 
+namespace Velocor {
+
 /// Finds the numbered older files of a log file.
 class LogFileList
 {
@@ -18,3 +20,5 @@ public:
     /// The path without the number of an older file.
     static QString CurrentOf(QString const& path);
 };
+
+} // namespace Velocor

@@ -5,6 +5,8 @@
 
 #include <QObject>
 
+namespace Velocor {
+
 namespace {
 
 constexpr unsigned AllSeverities = (1U << LogEntry::None) - 1;
@@ -76,3 +78,5 @@ bool LogFilter::HasSameText(LogFilter const& other) const
 {
     return m_expression == other.m_expression && m_isExpression == other.m_isExpression;
 }
+
+} // namespace Velocor

@@ -11,6 +11,8 @@
 #include <QStringMatcher>
 #include <QVector>
 
+namespace Velocor {
+
 /// Which lines of a log are shown: by severity, by text, by run.
 ///
 /// A plain value; any thread may use its own copy.
@@ -60,3 +62,5 @@ private:
     QStringMatcher m_matcher; // skips ahead, so it is far faster on many lines than contains()
     QRegularExpression m_expression;
 };
+
+} // namespace Velocor

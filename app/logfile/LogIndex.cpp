@@ -6,6 +6,8 @@
 #include <algorithm>
 #include <cstring>
 
+namespace Velocor {
+
 namespace {
 
 constexpr size_t MostRuns = 64;
@@ -278,3 +280,5 @@ LogRows LogIndex::Rows(LogFilter const& filter) const
     addRun(0);
     return rows;
 }
+
+} // namespace Velocor

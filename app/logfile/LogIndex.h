@@ -11,6 +11,8 @@
 
 #include <vector>
 
+namespace Velocor {
+
 /// Knows where the lines of a log file begin, how serious they are, and which run wrote them.
 ///
 /// The log opens its file without truncating it and writes from the start on. After a restart the
@@ -113,3 +115,5 @@ private:
     std::vector<quint8> m_knownMarks;
     std::vector<Run> m_knownRuns;
 };
+
+} // namespace Velocor

@@ -8,6 +8,8 @@
 #include <algorithm>
 #include <cstring>
 
+namespace Velocor {
+
 namespace {
 
 // No stamp is longer; a severity name further on is part of a message.
@@ -165,3 +167,5 @@ LogEntry LogLineParser::Parse(QByteArray const& line) const
         QString::fromLatin1(line.constData() + parts.message, line.size() - parts.message);
     return entry;
 }
+
+} // namespace Velocor

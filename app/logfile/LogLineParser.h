@@ -12,6 +12,8 @@
 
 #include <vector>
 
+namespace Velocor {
+
 /// Takes the lines of a log file apart: time stamp, severity name, elapsed time, message.
 ///
 /// The stamp's format is a setting that may have changed while a file was being written, so the
@@ -71,3 +73,5 @@ private:
     std::vector<QByteArray> m_elapsedPrefixes;
     std::vector<Name> m_names;
 };
+
+} // namespace Velocor

@@ -9,6 +9,8 @@
 
 #include <vector>
 
+namespace Velocor {
+
 /// The rows of the log view, oldest first: where in the file each begins, and what it is.
 ///
 /// Nine bytes a row; the texts stay in the file. If entries of earlier runs are among them, two
@@ -44,3 +46,5 @@ struct LogRows
         return static_cast<LogEntry::Severity>(marks[row] & SeverityMask);
     }
 };
+
+} // namespace Velocor

@@ -8,6 +8,8 @@
 
 #include <algorithm>
 
+namespace Velocor {
+
 namespace {
 
 constexpr int SliceSize = 1 << 20;
@@ -182,3 +184,5 @@ void LogScanner::tell(bool isReset)
     if (!nothingNew)
         emit Updated(update);
 }
+
+} // namespace Velocor

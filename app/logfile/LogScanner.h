@@ -14,6 +14,8 @@
 
 class QFile;
 
+namespace Velocor {
+
 /// Reads a log file in a thread of its own and tells what rows a view of it has.
 ///
 /// The file is read in slices through an ordinary handle: a mapped one would end the program when
@@ -77,5 +79,7 @@ private:
     qint64 m_anchorEnd = 0;
 };
 
-Q_DECLARE_METATYPE(LogFilter)
-Q_DECLARE_METATYPE(LogLineParser)
+} // namespace Velocor
+
+Q_DECLARE_METATYPE(Velocor::LogFilter)
+Q_DECLARE_METATYPE(Velocor::LogLineParser)

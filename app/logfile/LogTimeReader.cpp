@@ -9,6 +9,8 @@
 #include <algorithm>
 #include <cstring>
 
+namespace Velocor {
+
 namespace {
 
 bool IsDigit(char c)
@@ -289,3 +291,5 @@ bool LogTimeReader::readMonth(char const*& at, char const* end, Values& values) 
     }
     return false;
 }
+
+} // namespace Velocor

@@ -8,6 +8,8 @@
 
 #include <vector>
 
+namespace Velocor {
+
 /// Reads the time stamps of log entries that were written in one date format.
 ///
 /// A format is taken apart once; reading a stamp then costs some ten nanoseconds, which matters in
@@ -68,3 +70,5 @@ private:
     bool m_hasTime = false;
     bool m_fractionOfSecond = false;
 };
+
+} // namespace Velocor

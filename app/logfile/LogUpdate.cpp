@@ -5,6 +5,8 @@
 
 #include <algorithm>
 
+namespace Velocor {
+
 namespace {
 
 bool SameRow(LogRows const& a, size_t i, LogRows const& b, size_t j)
@@ -42,3 +44,5 @@ void LogUpdate::Compare(LogRows const& before)
         ++same;
     changedTail = newestBefore - same;
 }
+
+} // namespace Velocor

@@ -10,6 +10,8 @@
 
 #include <memory>
 
+namespace Velocor {
+
 /// What a LogScanner found: all rows, and how they differ from those it told of before.
 ///
 /// A change keeps both ends of the earlier part and all but the last rows of the newest run's, so
@@ -33,4 +35,7 @@ struct LogUpdate
     /// Works the numbers out from the rows before and after.
     void Compare(LogRows const& before);
 };
-Q_DECLARE_METATYPE(LogUpdate)
+
+} // namespace Velocor
+
+Q_DECLARE_METATYPE(Velocor::LogUpdate)

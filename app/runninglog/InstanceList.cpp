@@ -9,6 +9,8 @@
 #include <QLockFile>
 #include <QStringList>
 
+namespace Velocor {
+
 namespace {
 
 QString OwnName()
@@ -49,3 +51,5 @@ QList<qint64> InstanceList::Others() const
     }
     return others;
 }
+
+} // namespace Velocor

@@ -10,6 +10,8 @@
 
 class QLockFile;
 
+namespace Velocor {
+
 /// The running programs that share one log, as far as they have a list like this.
 ///
 /// Each holds a lock file of its own, called after its process number, in a folder that stands for
@@ -41,3 +43,5 @@ private:
     QString m_ownName;
     std::unique_ptr<QLockFile> m_lock;
 };
+
+} // namespace Velocor

@@ -14,6 +14,8 @@
 #include <QStringList>
 #include <QVariant>
 
+namespace Velocor {
+
 LogHealth::LogHealth() = default;
 
 LogHealth::~LogHealth() = default;
@@ -67,3 +69,5 @@ QString LogHealth::sharingProblem()
     return QObject::tr("Another running program writes to the same log (process %1)")
         .arg(numbers.join(QLatin1String(", ")));
 }
+
+} // namespace Velocor

@@ -7,6 +7,8 @@
 
 #include <memory>
 
+namespace Velocor {
+
 class InstanceList;
 
 /// Whether the program's log can be relied on: it is on, can be written, and is nobody else's too.
@@ -29,3 +31,5 @@ private:
     std::unique_ptr<InstanceList> m_instances;
     QString m_logFile;
 };
+
+} // namespace Velocor

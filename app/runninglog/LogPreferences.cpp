@@ -12,6 +12,8 @@
 
 #include <algorithm>
 
+namespace Velocor {
+
 namespace {
 
 QString Section()
@@ -103,3 +105,5 @@ bool LogPreferences::IsFilePrefix(QString const& text)
     return IsKept(text) && !text.contains(QLatin1Char('/')) && text != QLatin1String(".") &&
            text != QLatin1String("..");
 }
+
+} // namespace Velocor

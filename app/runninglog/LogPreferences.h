@@ -7,6 +7,8 @@
 
 #include <QString>
 
+namespace Velocor {
+
 /// The log's settings, those in force and those that its settings file keeps for the next start.
 ///
 /// The log has setters for some of its settings only; the others are changed in its settings file.
@@ -49,3 +51,5 @@ struct LogPreferences
     /// Whether log files can be called so: kept, no "/", and not "." or "..".
     static bool IsFilePrefix(QString const& text);
 };
+
+} // namespace Velocor

@@ -8,6 +8,8 @@
 #include <QDir>
 #include <QFileInfo>
 
+namespace Velocor {
+
 QString RunningLog::FileName()
 {
     TorkLog* log = TorkLog::logger();
@@ -22,3 +24,5 @@ QString RunningLog::FileName()
         folder.entryInfoList({QStringLiteral("*.log")}, QDir::Files, QDir::Time);
     return others.isEmpty() ? name : folder.path() + QLatin1Char('/') + others.first().fileName();
 }
+
+} // namespace Velocor

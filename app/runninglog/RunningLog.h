@@ -5,6 +5,8 @@
 
 #include <QString>
 
+namespace Velocor {
+
 /// The file that the running program's log writes to.
 class RunningLog
 {
@@ -17,3 +19,5 @@ public:
     /// meant.
     static QString FileName();
 };
+
+} // namespace Velocor

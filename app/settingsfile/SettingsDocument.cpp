@@ -3,6 +3,8 @@
 
 #include "app/settingsfile/SettingsDocument.h"
 
+namespace Velocor {
+
 QString SettingsDocument::Value(QString const& section, QString const& key,
                                 QString const& byDefault) const
 {
@@ -61,3 +63,5 @@ bool SettingsDocument::HasSameValues(SettingsDocument const& other) const
     }
     return true;
 }
+
+} // namespace Velocor

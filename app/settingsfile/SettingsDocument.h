@@ -9,6 +9,8 @@
 #include <QStringList>
 #include <QVector>
 
+namespace Velocor {
+
 /// Values by section and key.
 using SettingsValues = QHash<QPair<QString, QString>, QString>;
 
@@ -54,3 +56,5 @@ struct SettingsDocument
     /// Whether both hold the same sections, keys and values in the same order.
     bool HasSameValues(SettingsDocument const& other) const;
 };
+
+} // namespace Velocor

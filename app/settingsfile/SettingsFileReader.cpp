@@ -12,6 +12,8 @@
 #include <QObject>
 #include <QXmlSimpleReader>
 
+namespace Velocor {
+
 SettingsDocument SettingsFileReader::Read(QString const& path)
 {
     SettingsFileReader reader;
@@ -191,3 +193,5 @@ QString SettingsFileReader::errorString() const
 {
     return QObject::tr("elements are nested too deep");
 }
+
+} // namespace Velocor

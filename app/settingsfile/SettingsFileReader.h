@@ -12,6 +12,8 @@
 class QIODevice;
 class TorkXmlGuard;
 
+namespace Velocor {
+
 /// Reads a configuration-store file as the store does, and notes what the store passes over.
 ///
 /// Unlike TorkConfigFile::Load() it enumerates sections, tells where a file is broken, and writes
@@ -64,3 +66,5 @@ private:
     bool m_hasValue = false;
     QString m_element;
 };
+
+} // namespace Velocor

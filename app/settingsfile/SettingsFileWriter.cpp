@@ -16,6 +16,8 @@
 
 #include <algorithm>
 
+namespace Velocor {
+
 namespace {
 
 bool IsLatin1(QString const& text)
@@ -139,3 +141,5 @@ bool SettingsFileWriter::KeepBackup(QString const& path, QString* error)
     *error = file.errorString();
     return false;
 }
+
+} // namespace Velocor

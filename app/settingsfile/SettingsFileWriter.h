@@ -5,6 +5,8 @@
 
 #include "app/settingsfile/SettingsDocument.h"
 
+namespace Velocor {
+
 /// Saves a settings document through the configuration store, and tells what that would lose.
 ///
 ///     const QStringList losses = SettingsFileWriter::Losses(document);
@@ -35,3 +37,5 @@ private:
     static bool StartsLoss(SettingsDocument::Item const& item, QString const& section,
                            QStringList& losses);
 };
+
+} // namespace Velocor

@@ -11,6 +11,8 @@
 #include <QTabBar>
 #include <QToolButton>
 
+namespace Velocor {
+
 namespace {
 
 QString PathOf(QWidget const* page)
@@ -160,3 +162,5 @@ SettingsEditor* FileTabs::currentEditor() const
 {
     return qobject_cast<SettingsEditor*>(currentWidget());
 }
+
+} // namespace Velocor

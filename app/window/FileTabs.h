@@ -6,6 +6,8 @@
 #include <QString>
 #include <QTabWidget>
 
+namespace Velocor {
+
 class LogPanel;
 class SettingsEditor;
 
@@ -55,3 +57,5 @@ private:
 
     LogPanel* m_ownLog;
 };
+
+} // namespace Velocor

@@ -37,6 +37,8 @@ static void InitResources()
     Q_INIT_RESOURCE(window);
 }
 
+namespace Velocor {
+
 namespace {
 
 constexpr int HealthInterval = 2000; // milliseconds
@@ -469,3 +471,5 @@ void MainWindow::dropEvent(QDropEvent* event)
     }
     event->acceptProposedAction();
 }
+
+} // namespace Velocor

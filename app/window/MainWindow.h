@@ -11,13 +11,16 @@
 #include <functional>
 #include <memory>
 
+class QLabel;
+class QMenu;
+class QSplitter;
+
+namespace Velocor {
+
 class FileTabs;
 class LogHealth;
 class NoticeBar;
 class PlacesPanel;
-class QLabel;
-class QMenu;
-class QSplitter;
 class RecentFiles;
 
 /// The program's top-level window: its log, live; who it is and where its files lie; files of the
@@ -101,3 +104,5 @@ private:
     QTimer m_healthTimer;
     bool m_painted = false;
 };
+
+} // namespace Velocor

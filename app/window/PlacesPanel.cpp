@@ -17,6 +17,8 @@
 #include <QVBoxLayout>
 #include <QVariant>
 
+namespace Velocor {
+
 namespace {
 
 QString Property(char const* name)
@@ -133,3 +135,5 @@ void PlacesPanel::copy(QString const& caption, QString const& text)
     QGuiApplication::clipboard()->setText(text);
     emit Said(tr("Copied: %1").arg(caption));
 }
+
+} // namespace Velocor

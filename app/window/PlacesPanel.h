@@ -10,6 +10,8 @@
 class QHBoxLayout;
 class QVBoxLayout;
 
+namespace Velocor {
+
 /// Who the program is and where its files lie, each to be opened in the file manager or copied.
 class PlacesPanel : public QWidget
 {
@@ -48,3 +50,5 @@ private:
     QVBoxLayout* m_layout;
     QVector<Row> m_rows;
 };
+
+} // namespace Velocor

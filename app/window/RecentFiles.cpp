@@ -9,6 +9,8 @@
 #include <QFileInfo>
 #include <QMenu>
 
+namespace Velocor {
+
 namespace {
 
 constexpr QLatin1Char Separator('|');
@@ -84,3 +86,5 @@ void RecentFiles::fillMenu()
     clear->setToolTip(tr("Forget all recently opened files"));
     connect(clear, &QAction::triggered, this, &RecentFiles::Clear);
 }
+
+} // namespace Velocor

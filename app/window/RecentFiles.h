@@ -8,6 +8,8 @@
 
 class QMenu;
 
+namespace Velocor {
+
 /// The list of recently opened files and the menu that offers them, newest first.
 ///
 ///     RecentFiles recent(menu);
@@ -43,3 +45,5 @@ private:
     QMenu* m_menu;
     QString m_list;
 };
+
+} // namespace Velocor

@@ -18,6 +18,8 @@
 #include <QVBoxLayout>
 #include <QVariant>
 
+namespace Velocor {
+
 ReportDialog::ReportDialog(QString const& title, QString const& heading, QString const& text,
                            bool saves, QWidget* parent)
     : QDialog(parent), m_text(new QPlainTextEdit(text))
@@ -90,3 +92,5 @@ void ReportDialog::chooseFile()
     else
         QMessageBox::critical(this, windowTitle(), tr("%1 was not saved.\n%2").arg(path, error));
 }
+
+} // namespace Velocor

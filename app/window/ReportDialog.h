@@ -8,6 +8,8 @@
 
 class QPlainTextEdit;
 
+namespace Velocor {
+
 /// Shows a text that is meant for others before it is copied or saved.
 class ReportDialog : public QDialog
 {
@@ -32,3 +34,5 @@ private:
 
     QPlainTextEdit* m_text;
 };
+
+} // namespace Velocor

@@ -7,6 +7,8 @@
 #include <QEvent>
 #include <QMessageBox>
 
+namespace Velocor {
+
 SelectableMessageBoxes::SelectableMessageBoxes(QObject* parent) : QObject(parent)
 {
     QCoreApplication::instance()->installEventFilter(this);
@@ -21,3 +23,5 @@ bool SelectableMessageBoxes::eventFilter(QObject* object, QEvent* event)
     }
     return false;
 }
+
+} // namespace Velocor

@@ -5,6 +5,8 @@
 
 #include <QObject>
 
+namespace Velocor {
+
 /// While it lives, the texts of all message boxes of the program can be selected with mouse and
 /// keyboard, to be copied into a report or a search.
 class SelectableMessageBoxes : public QObject
@@ -16,3 +18,5 @@ public:
 
     bool eventFilter(QObject* object, QEvent* event) override;
 };
+
+} // namespace Velocor

@@ -22,6 +22,8 @@
 #include <QSysInfo>
 #include <QVariant>
 
+namespace Velocor {
+
 namespace {
 
 // The most of the log that is looked at, in bytes.
@@ -181,3 +183,5 @@ QString SystemReport::Whole(QString const& settingsFile)
     return QObject::tr("Report of %1\n\n").arg(time) + Facts(settingsFile) +
            QObject::tr("\nThe last %1 lines of the log\n\n").arg(TailLines) + LogTail(TailLines);
 }
+
+} // namespace Velocor

@@ -5,6 +5,8 @@
 
 #include <QString>
 
+namespace Velocor {
+
 /// What a bug report needs: versions, system, screens, directories, sizes, and the end of the log.
 class SystemReport
 {
@@ -24,3 +26,5 @@ public:
     /// How many lines of the log a whole report has.
     static constexpr int TailLines = 200;
 };
+
+} // namespace Velocor

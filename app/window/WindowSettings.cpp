@@ -13,6 +13,8 @@
 #include <QStringList>
 #include <QWidget>
 
+namespace Velocor {
+
 namespace {
 
 char const* const WindowName = "MainWindow";
@@ -210,3 +212,5 @@ void WindowSettings::SetText(QString const& key, QString const& value)
 {
     m_file.WriteItem(Section(), key, QLatin1String("") + Escaped(value));
 }
+
+} // namespace Velocor

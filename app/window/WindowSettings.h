@@ -10,6 +10,8 @@
 
 class QWidget;
 
+namespace Velocor {
+
 /// The state of the window between two runs, in the settings file "velocor.cfg" of the data
 /// directory.
 ///
@@ -62,3 +64,5 @@ private:
     TorkConfigFile m_file;
     bool m_mayWrite = true;
 };
+
+} // namespace Velocor

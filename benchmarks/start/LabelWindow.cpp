@@ -38,7 +38,7 @@ QWidget* Places()
 
 int main(int argc, char** argv)
 {
-    WithoutOpenGl withoutOpenGl;
+    Velocor::WithoutOpenGl withoutOpenGl;
     QApplication application(argc, argv);
     withoutOpenGl.End();
     AppPaths::SetOrganizationAndProduct();

@@ -7,7 +7,7 @@
 
 int main(int argc, char** argv)
 {
-    WithoutOpenGl withoutOpenGl;
+    Velocor::WithoutOpenGl withoutOpenGl;
     QApplication app(argc, argv);
     withoutOpenGl.End();
     return QApplication::exec();

@@ -7,6 +7,8 @@
 #include <QFile>
 #include <QtTest>
 
+using namespace Velocor;
+
 namespace {
 
 constexpr char const* Variable = "QT_XCB_GL_INTEGRATION";

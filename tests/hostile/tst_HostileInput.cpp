@@ -27,6 +27,8 @@
 #include <sys/resource.h>
 #endif
 
+using namespace Velocor;
+
 namespace {
 
 #if defined(TEST_UNDER_ADDRESS_SANITIZER) || defined(TEST_UNDER_THREAD_SANITIZER)

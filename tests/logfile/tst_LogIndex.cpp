@@ -8,6 +8,8 @@
 
 #include <random>
 
+using namespace Velocor;
+
 using DemoLog::entry;
 using DemoLog::run;
 using DemoLog::writtenOver;

@@ -7,6 +7,8 @@
 
 #include <random>
 
+using namespace Velocor;
+
 Q_DECLARE_METATYPE(LogEntry::Severity)
 
 class tst_LogLineParser : public QObject

@@ -6,6 +6,8 @@
 #include <QDateTime>
 #include <QtTest>
 
+using namespace Velocor;
+
 class tst_LogTimeReader : public QObject
 {
     Q_OBJECT

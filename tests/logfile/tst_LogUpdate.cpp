@@ -5,6 +5,8 @@
 
 #include <QtTest>
 
+using namespace Velocor;
+
 namespace {
 
 // Rows, a letter each: first those of the earlier part. Where a row starts tells rows apart, and

@@ -14,6 +14,8 @@
 #include <QUrl>
 #include <QtTest>
 
+using namespace Velocor;
+
 class tst_ShownFolders : public QObject
 {
     Q_OBJECT

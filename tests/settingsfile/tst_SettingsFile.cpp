@@ -12,6 +12,8 @@
 #include <QTemporaryDir>
 #include <QtTest>
 
+using namespace Velocor;
+
 namespace {
 
 QString Joined(SettingsDocument const& document)

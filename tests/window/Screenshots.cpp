@@ -26,6 +26,8 @@
 #include <QTest>
 #include <QTextStream>
 
+using namespace Velocor;
+
 namespace {
 
 QString const Home("/tmp/velocor-demo/");

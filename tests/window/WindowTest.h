@@ -51,9 +51,9 @@ public:
     QString settingsFile() const { return folder() + "data/velocor.cfg"; }
 
     /// A window on the screen, with the keyboard and with its log read.
-    static std::unique_ptr<MainWindow> show()
+    static std::unique_ptr<Velocor::MainWindow> show()
     {
-        auto window = std::make_unique<MainWindow>();
+        auto window = std::make_unique<Velocor::MainWindow>();
         window->show();
         // Where no window manager does it, the window has to ask for the keyboard itself.
         if (QTest::qWaitForWindowExposed(window.get()))

@@ -41,6 +41,8 @@
 #include <QToolButton>
 #include <QTreeWidget>
 
+using namespace Velocor;
+
 using DemoLog::entry;
 using DemoLog::run;
 using DemoLog::writtenOver;

@@ -22,6 +22,8 @@
 #include <QProcess>
 #include <QScreen>
 
+using namespace Velocor;
+
 class tst_WindowState : public QObject
 {
     Q_OBJECT

@@ -6,6 +6,8 @@
 #include <QLocale>
 #include <QObject>
 
+namespace Velocor {
+
 QString FileSizeText(qint64 bytes)
 {
     if (bytes < 1000)
@@ -22,3 +24,5 @@ QString FileSizeText(qint64 bytes)
     const int decimals = value < 9.95 ? 1 : 0;
     return QLocale().toString(value, 'f', decimals) + QLatin1Char(' ') + QLatin1String(unit);
 }
+
+} // namespace Velocor

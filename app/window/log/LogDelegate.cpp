@@ -10,6 +10,8 @@
 #include <QPainter>
 #include <QTextLayout>
 
+namespace Velocor {
+
 namespace {
 
 QColor Mixed(QColor const& a, QColor const& b, qreal share)
@@ -136,3 +138,5 @@ void LogDelegate::paintMarked(QPainter* painter, QStyleOptionViewItem const& opt
     layout.draw(painter, QPointF(x, area.top() + (area.height() - line.height()) / 2));
     painter->restore();
 }
+
+} // namespace Velocor

@@ -7,6 +7,8 @@
 
 #include <QStyledItemDelegate>
 
+namespace Velocor {
+
 /// Draws the cells of a log view: headings between runs, colours of severities, and the places
 /// where the filter's text was found.
 class LogDelegate : public QStyledItemDelegate
@@ -32,3 +34,5 @@ private:
 
     LogFilter m_filter;
 };
+
+} // namespace Velocor

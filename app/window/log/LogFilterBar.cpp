@@ -13,6 +13,8 @@
 #include <QLineEdit>
 #include <QToolButton>
 
+namespace Velocor {
+
 namespace {
 
 constexpr int TypingPause = 150; // milliseconds
@@ -138,3 +140,5 @@ void LogFilterBar::apply()
     m_filter.SetText(m_text->text(), isExpression, m_case->isChecked());
     emit Changed();
 }
+
+} // namespace Velocor

@@ -13,6 +13,8 @@ class QLabel;
 class QLineEdit;
 class QToolButton;
 
+namespace Velocor {
+
 /// The controls of a log view's filter: a text, how it is meant, and one button per severity.
 class LogFilterBar : public QWidget
 {
@@ -52,3 +54,5 @@ private:
     QTimer m_typing;
     LogFilter m_filter;
 };
+
+} // namespace Velocor

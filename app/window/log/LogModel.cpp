@@ -11,6 +11,8 @@
 
 #include <algorithm>
 
+namespace Velocor {
+
 namespace {
 
 // Control characters would break rows or vanish.
@@ -353,3 +355,5 @@ Qt::ItemFlags LogModel::flags(QModelIndex const& index) const
                ? Qt::ItemFlags(Qt::ItemIsEnabled)
                : Qt::ItemIsEnabled | Qt::ItemIsSelectable | Qt::ItemNeverHasChildren;
 }
+
+} // namespace Velocor

@@ -14,6 +14,8 @@
 #include <QThread>
 #include <QTimer>
 
+namespace Velocor {
+
 class LogScanner;
 
 /// A log file as a table, live: time, severity, elapsed time and message of each line, oldest
@@ -127,3 +129,5 @@ private:
     mutable QFile m_file;
     mutable QCache<qint64, LogEntry> m_entries;
 };
+
+} // namespace Velocor

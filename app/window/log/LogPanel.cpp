@@ -23,6 +23,8 @@
 
 #include <functional>
 
+namespace Velocor {
+
 namespace {
 
 // Fills itself with the files that are there at the moment when it is opened.
@@ -327,3 +329,5 @@ void LogPanel::SetPaneSizes(QList<int> const& sizes)
     if (sizes.size() == m_splitter->count())
         m_splitter->setSizes(sizes);
 }
+
+} // namespace Velocor

@@ -7,13 +7,16 @@
 #include <QString>
 #include <QWidget>
 
-class LogFilterBar;
-class LogModel;
-class LogView;
 class QCheckBox;
 class QComboBox;
 class QPlainTextEdit;
 class QSplitter;
+
+namespace Velocor {
+
+class LogFilterBar;
+class LogModel;
+class LogView;
 
 /// A log with all that belongs to it: the choice of its older files, filter, table, and the text of
 /// the current line.
@@ -94,3 +97,5 @@ private:
     QString m_currentPath; // the file that the running program writes, if it is one
     int m_percent = 100;
 };
+
+} // namespace Velocor

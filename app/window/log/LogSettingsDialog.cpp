@@ -17,6 +17,8 @@
 #include <QPushButton>
 #include <QSpinBox>
 
+namespace Velocor {
+
 LogSettingsDialog::LogSettingsDialog(QWidget* parent)
     : QDialog(parent), m_enabled(new QCheckBox(tr("&Write the log"))),
       m_elapsed(new QCheckBox(tr("&Log the time since the entry before"))),
@@ -138,3 +140,5 @@ void LogSettingsDialog::accept()
     else
         QMessageBox::critical(this, windowTitle(), error);
 }
+
+} // namespace Velocor

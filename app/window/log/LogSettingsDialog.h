@@ -14,6 +14,8 @@ class QLabel;
 class QLineEdit;
 class QSpinBox;
 
+namespace Velocor {
+
 /// Changes the log's settings. What the log cannot take over while it runs says so.
 class LogSettingsDialog : public QDialog
 {
@@ -45,3 +47,5 @@ private:
     QLabel* m_problem;
     QDialogButtonBox* m_buttons;
 };
+
+} // namespace Velocor

@@ -18,6 +18,8 @@
 
 #include <algorithm>
 
+namespace Velocor {
+
 LogView::LogView(LogModel* model, QWidget* parent)
     : QTableView(parent), m_model(model), m_delegate(new LogDelegate(this))
 {
@@ -211,3 +213,5 @@ void LogView::paintEvent(QPaintEvent* event)
     const QRect area = viewport()->rect().adjusted(24, 24, -24, -24);
     painter.drawText(area, Qt::AlignCenter | Qt::TextWordWrap, m_placeholder);
 }
+
+} // namespace Velocor

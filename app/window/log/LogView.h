@@ -5,6 +5,8 @@
 
 #include <QTableView>
 
+namespace Velocor {
+
 class LogDelegate;
 class LogModel;
 
@@ -69,3 +71,5 @@ private:
     bool m_scrollingItself = false;
     int m_earlierRows = -1;
 };
+
+} // namespace Velocor

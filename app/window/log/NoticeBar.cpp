@@ -9,6 +9,8 @@
 #include <QLabel>
 #include <QPushButton>
 
+namespace Velocor {
+
 NoticeBar::NoticeBar(QWidget* parent) : QFrame(parent), m_icon(new QLabel), m_label(new QLabel)
 {
     setFrameShape(StyledPanel);
@@ -51,3 +53,5 @@ QString NoticeBar::text() const
 {
     return m_label->text();
 }
+
+} // namespace Velocor

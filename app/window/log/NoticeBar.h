@@ -7,6 +7,8 @@
 
 class QLabel;
 
+namespace Velocor {
+
 /// A strip above a view that tells of something without stopping the work; can be dismissed. Its
 /// text can be selected.
 class NoticeBar : public QFrame
@@ -29,3 +31,5 @@ private:
     QLabel* m_icon;
     QLabel* m_label;
 };
+
+} // namespace Velocor

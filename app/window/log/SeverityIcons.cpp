@@ -9,6 +9,8 @@
 #include <QPalette>
 #include <QPixmap>
 
+namespace Velocor {
+
 namespace {
 
 constexpr qreal Box = 16; // the shapes below are drawn in a square of this size
@@ -178,3 +180,5 @@ QIcon SeverityIcons::SwitchIcon(LogEntry::Severity severity, QPalette const& pal
     }
     return icon;
 }
+
+} // namespace Velocor

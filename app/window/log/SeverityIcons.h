@@ -10,6 +10,8 @@
 
 class QPalette;
 
+namespace Velocor {
+
 /// Colours and icons of the severities. Each icon has a shape of its own, so that they are told
 /// apart without their colours; colours suit the light or dark background of a palette.
 class SeverityIcons
@@ -28,3 +30,5 @@ public:
     /// Whether a palette's background is dark.
     static bool IsDark(QPalette const& palette);
 };
+
+} // namespace Velocor

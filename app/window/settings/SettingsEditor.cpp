@@ -20,6 +20,8 @@
 #include <QTextBlock>
 #include <QTreeWidget>
 
+namespace Velocor {
+
 namespace {
 
 // The most of a broken file that is shown, in bytes.
@@ -372,3 +374,5 @@ bool SettingsEditor::MayClose()
         return Save();
     return answer == QMessageBox::Discard;
 }
+
+} // namespace Velocor

@@ -8,12 +8,15 @@
 #include <QDateTime>
 #include <QWidget>
 
-class NoticeBar;
 class QPlainTextEdit;
 class QPushButton;
 class QStackedWidget;
 class QTreeWidget;
 class QTreeWidgetItem;
+
+namespace Velocor {
+
+class NoticeBar;
 
 /// A configuration-store file as a tree of sections, keys and values that can be edited and saved.
 ///
@@ -86,3 +89,5 @@ private:
     QPushButton* m_remove = nullptr;
     QPushButton* m_save = nullptr;
 };
+
+} // namespace Velocor

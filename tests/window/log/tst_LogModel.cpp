@@ -11,6 +11,8 @@
 #include <QTemporaryDir>
 #include <QtTest>
 
+using namespace Velocor;
+
 using DemoLog::entry;
 using DemoLog::run;
 using DemoLog::writtenOver;
