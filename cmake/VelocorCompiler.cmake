@@ -49,8 +49,13 @@ endfunction()
 
 # For builds that are made from nothing each time: faster, but a missing #include stays unseen, and
 # tools that read the compiler's commands cannot read its precompiled headers.
+# velocor_precompile(target [headers ...]), those of all modules if none are named.
 function(velocor_precompile target)
+    set(headers ${ARGN})
+    if(NOT headers)
+        set(headers <QtWidgets> <QtXml>)
+    endif()
     if(VELOCOR_PRECOMPILE)
-        target_precompile_headers(${target} PRIVATE <QtWidgets> <QtXml>)
+        target_precompile_headers(${target} PRIVATE ${headers})
     endif()
 endfunction()
