@@ -10,6 +10,8 @@
 #include <QFile>
 #include <QTextStream>
 
+// A program that links this may have a rapidxml of its own, of another version or set up otherwise.
+#define rapidxml VelocorRapidXml
 #include <rapidxml.hpp>
 
 #include <cstring>

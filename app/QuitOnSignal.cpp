@@ -16,7 +16,10 @@ namespace {
 
 int s_pipe[2] = {-1, -1};
 
-extern "C" void WakeEventLoop(int)
+extern "C" {
+
+// Static, for a namespace does not keep the name of a C function from other files.
+static void WakeEventLoop(int)
 {
     const int savedErrno = errno;
     const char byte = 0;
@@ -24,6 +27,8 @@ extern "C" void WakeEventLoop(int)
     static_cast<void>(written); // a full pipe has woken the loop already
     errno = savedErrno;
 }
+
+} // extern "C"
 
 void Handle(int signalNumber, void (*handler)(int))
 {

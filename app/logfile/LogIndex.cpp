@@ -3,6 +3,8 @@
 
 #include "app/logfile/LogIndex.h"
 
+#include "app/logfile/LogSeverities.h"
+
 #include <algorithm>
 #include <cstring>
 
@@ -261,8 +263,7 @@ LogRows LogIndex::Rows(LogFilter const& filter) const
             if ((mark & LogRows::Unmatched) || !filter.Shows(severity))
                 continue;
             rows.add(m_starts[line], mark);
-            if (severity != LogEntry::None && severity >= LogEntry::Warning &&
-                !(mark & LogRows::Continued))
+            if (LogSeverities::IsProblem(severity) && !(mark & LogRows::Continued))
                 ++rows.problems;
         }
     };

@@ -3,7 +3,7 @@
 
 #include "app/logfile/LogLineParser.h"
 
-#include <QObject>
+#include "app/logfile/LogSeverities.h"
 
 #include <algorithm>
 #include <cstring>
@@ -60,12 +60,12 @@ LogLineParser::LogLineParser(QStringList const& dateFormats, QStringList const& 
         m_elapsedPrefixes.push_back(prefix.toLatin1());
 
     // The log translates its severity names, so a file may hold both kinds.
-    char const* const names[] = {"Trace", "Notification", "Warning", "Error", "Fatal"};
     for (int i = 0; i < LogEntry::None; ++i) {
         const auto severity = static_cast<LogEntry::Severity>(i);
-        const QByteArray translated = QObject::tr(names[i]).toLatin1();
-        m_names.push_back({names[i], severity});
-        if (translated != names[i] && !translated.isEmpty())
+        const QByteArray name = LogSeverities::LoggedName(severity);
+        const QByteArray translated = LogSeverities::Name(severity).toLatin1();
+        m_names.push_back({name, severity});
+        if (translated != name && !translated.isEmpty())
             m_names.push_back({translated, severity});
     }
 }

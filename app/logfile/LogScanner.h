@@ -36,17 +36,17 @@ public:
 
 public slots:
     /// Reads a file from its start.
-    void Open(int request, QString const& path, LogLineParser const& parser,
-              LogFilter const& filter);
+    void Open(int request, QString const& path, Velocor::LogLineParser const& parser,
+              Velocor::LogFilter const& filter);
 
     /// Looks for changes and reads them. Always answers with Polled().
     void Poll();
 
     /// Shows other rows of the same file.
-    void SetFilter(int request, LogFilter const& filter);
+    void SetFilter(int request, Velocor::LogFilter const& filter);
 
 signals:
-    void Updated(LogUpdate const& update);
+    void Updated(Velocor::LogUpdate const& update);
     void Progressed(int request, int percent);
     void Polled();
 

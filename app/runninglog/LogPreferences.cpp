@@ -84,12 +84,6 @@ QString LogPreferences::Apply() const
                          .arg(FileName());
 }
 
-LogLineParser LogPreferences::Parser()
-{
-    const LogPreferences preferences = Read();
-    return LogLineParser({preferences.dateFormat}, {preferences.elapsedPrefix});
-}
-
 bool LogPreferences::IsKept(QString const& text)
 {
     static const QRegularExpression placeholder(QStringLiteral("%L?[0-9]"));

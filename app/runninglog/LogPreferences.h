@@ -3,8 +3,6 @@
 
 #pragma once
 
-#include "app/logfile/LogLineParser.h"
-
 #include <QString>
 
 namespace Velocor {
@@ -40,9 +38,6 @@ struct LogPreferences
 
     /// The log's settings file.
     static QString FileName();
-
-    /// A parser for what the log writes, by its settings file.
-    static LogLineParser Parser();
 
     /// Whether a settings file keeps this text as a value: not empty, printable ASCII, neither
     /// "]]>" nor a "%" with a digit in it.

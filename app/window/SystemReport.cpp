@@ -8,6 +8,7 @@
 #include "app/runninglog/LogPreferences.h"
 #include "app/runninglog/RunningLog.h"
 #include "app/window/log/FileSizeText.h"
+#include "app/window/log/RunningLogParser.h"
 #include "common/log/TorkLog.h"
 
 #include <QApplication>
@@ -158,7 +159,7 @@ QString SystemReport::LogTail(int lines)
     if (!QFileInfo(file).isFile() || !file.open(QIODevice::ReadOnly))
         return QString();
 
-    LogIndex index(LogPreferences::Parser());
+    LogIndex index(RunningLogParser());
     const QByteArray bytes = file.read(TailLimit);
     index.Begin();
     index.Feed(bytes.constData(), bytes.size());

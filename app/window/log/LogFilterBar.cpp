@@ -3,7 +3,7 @@
 
 #include "app/window/log/LogFilterBar.h"
 
-#include "app/window/log/LogModel.h"
+#include "app/logfile/LogSeverities.h"
 #include "app/window/log/SeverityIcons.h"
 
 #include <QCheckBox>
@@ -74,7 +74,7 @@ QCheckBox* LogFilterBar::makeOption(QString const& text, QString const& name,
 void LogFilterBar::addSeverities()
 {
     for (int i = 0; i < LogEntry::None; ++i) {
-        const QString name = LogModel::SeverityName(static_cast<LogEntry::Severity>(i));
+        const QString name = LogSeverities::Name(static_cast<LogEntry::Severity>(i));
         auto* button = new QToolButton;
         button->setCheckable(true);
         button->setChecked(true);

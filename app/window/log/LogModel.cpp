@@ -4,6 +4,7 @@
 #include "app/window/log/LogModel.h"
 
 #include "app/logfile/LogScanner.h"
+#include "app/logfile/LogSeverities.h"
 #include "app/window/log/SeverityIcons.h"
 
 #include <QGuiApplication>
@@ -174,8 +175,7 @@ int LogModel::FindProblem(int row, int step) const
     LogRows const& rows = *m_state.rows;
     for (row += step; row >= 0 && row < m_rowCount; row += step) {
         const auto position = static_cast<size_t>(row);
-        const LogEntry::Severity severity = rows.severity(position);
-        if (severity != LogEntry::None && severity >= LogEntry::Warning &&
+        if (LogSeverities::IsProblem(rows.severity(position)) &&
             !(rows.marks[position] & LogRows::Continued))
             return row;
     }
@@ -237,25 +237,6 @@ QString LogModel::headingText(int row) const
     return m_isCurrent ? tr("This run") : tr("Latest run in this file");
 }
 
-QString LogModel::SeverityName(LogEntry::Severity severity)
-{
-    switch (severity) {
-    case LogEntry::Trace:
-        return QObject::tr("Trace");
-    case LogEntry::Notification:
-        return QObject::tr("Notification");
-    case LogEntry::Warning:
-        return QObject::tr("Warning");
-    case LogEntry::Error:
-        return QObject::tr("Error");
-    case LogEntry::Fatal:
-        return QObject::tr("Fatal");
-    case LogEntry::None:
-        break;
-    }
-    return QString();
-}
-
 QString LogModel::cellText(int row, int column) const
 {
     if (isHeading(row))
@@ -265,7 +246,7 @@ QString LogModel::cellText(int row, int column) const
     case TimeColumn:
         return entry(row).time;
     case SeverityColumn:
-        return SeverityName(entry(row).severity);
+        return LogSeverities::Name(entry(row).severity);
     case ElapsedColumn:
         return entry(row).elapsed.isEmpty() ? QString() : tr("%1 ms").arg(entry(row).elapsed);
     default:

@@ -78,9 +78,6 @@ public:
     QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
     Qt::ItemFlags flags(QModelIndex const& index) const override;
 
-    /// What a severity is called; empty for None.
-    static QString SeverityName(LogEntry::Severity severity);
-
     /// How often the file is looked at, in milliseconds.
     static constexpr int PollInterval = 250;
 
@@ -94,10 +91,10 @@ signals:
     /// Reading goes on; 100 when it is done.
     void Progressed(int percent);
 
-    // To the scanner's thread.
-    void openWanted(int request, QString const& path, LogLineParser const& parser,
-                    LogFilter const& filter);
-    void filterWanted(int request, LogFilter const& filter);
+    // To the scanner's thread. A queued call finds its types by the names given here.
+    void openWanted(int request, QString const& path, Velocor::LogLineParser const& parser,
+                    Velocor::LogFilter const& filter);
+    void filterWanted(int request, Velocor::LogFilter const& filter);
     void pollWanted();
 
 private:

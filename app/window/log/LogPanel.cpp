@@ -5,11 +5,11 @@
 
 #include "app/logfile/LogFileList.h"
 #include "app/logfile/LogIndex.h"
-#include "app/runninglog/LogPreferences.h"
 #include "app/window/log/FileSizeText.h"
 #include "app/window/log/LogFilterBar.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogView.h"
+#include "app/window/log/RunningLogParser.h"
 
 #include <QCheckBox>
 #include <QComboBox>
@@ -155,7 +155,7 @@ void LogPanel::Open(QString const& path, bool isCurrent)
 void LogPanel::showFile(QString const& path)
 {
     m_files->setToolTip(path);
-    m_model->Open(path, LogPreferences::Parser(), path == m_currentPath);
+    m_model->Open(path, RunningLogParser(), path == m_currentPath);
     updatePlaceholder();
 }
 

@@ -3,7 +3,7 @@
 
 #include "app/window/log/LogSettingsDialog.h"
 
-#include "app/window/log/LogModel.h"
+#include "app/logfile/LogSeverities.h"
 
 #include <QCheckBox>
 #include <QDateTime>
@@ -122,7 +122,7 @@ QString LogSettingsDialog::problem() const
 void LogSettingsDialog::check()
 {
     QString sample = QDateTime::currentDateTime().toString(m_dateFormat->text()) +
-                     QLatin1Char(' ') + LogModel::SeverityName(LogEntry::Trace) + QLatin1Char(' ');
+                     QLatin1Char(' ') + LogSeverities::Name(LogEntry::Trace) + QLatin1Char(' ');
     if (m_elapsed->isChecked())
         sample += m_elapsedPrefix->text() + QLatin1String("[250] ");
     m_sample->setText(sample + tr("message"));

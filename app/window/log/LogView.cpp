@@ -4,6 +4,7 @@
 #include "app/window/log/LogView.h"
 
 #include "app/logfile/LogIndex.h"
+#include "app/logfile/LogSeverities.h"
 #include "app/window/log/LogDelegate.h"
 #include "app/window/log/LogModel.h"
 
@@ -69,8 +70,8 @@ void LogView::SetDefaultWidths()
                    metrics.boundingRect(QStringLiteral("2000-00-00 00:00:00.000")).width() +
                        padding);
     setColumnWidth(LogModel::SeverityColumn,
-                   metrics.boundingRect(LogModel::SeverityName(LogEntry::Notification)).width() +
-                       24 + padding);
+                   metrics.boundingRect(LogSeverities::Name(LogEntry::Notification)).width() + 24 +
+                       padding);
     setColumnWidth(LogModel::ElapsedColumn,
                    metrics.boundingRect(QStringLiteral("00000 ms")).width() + padding);
 }

@@ -1,0 +1,13 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include "app/logfile/LogLineParser.h"
+
+namespace Velocor {
+
+/// A parser for what the log of this run writes, by its settings file. GUI thread.
+LogLineParser RunningLogParser();
+
+} // namespace Velocor
