@@ -54,25 +54,58 @@ machine_paths() {
         "$start/((home|Users)/(?!ada/)$name/$name|(root|wo""rk|workspace)/$name)|/tmp/[a-z]*_jo""bs"
 }
 
-# Of a folder's includes that name a folder of this tree, those of any folder but the given ones.
+# Of the includes of a folder's own files that name a folder of this tree, those of any folder but
+# this one and the given ones; of a relative path it cannot be told. The entry point is above all.
 includes_beyond() {
-    local folder=$1 allowed
-    shift
+    local allowed
     allowed=$(printf '|%s' "$@")
-    tracked "$folder/*.cpp" "$folder/*.h" |
-        search -nHP "^\s*#\s*include\s*[<\"](\.\./)*(?!(${allowed#|})/)(app|common/\w+)/"
+    tracked ":(glob)$1/*.cpp" ":(glob)$1/*.h" | grep -zvxF app/main.cpp |
+        search -nHP "^\s*#\s*include\s*[<\"](?!(${allowed#|})/[^/]+[>\"])(\.\.?/|(app|common)/)"
+}
+
+# What a folder's files may include of this tree besides each other: the arrows between the rooms.
+may_include() {
+    local folder=$1
+    shift
+    rule "$folder may include ${*:-nothing else}, no more" includes_beyond "$folder" "$@"
+}
+
+rooms() {
+    may_include common/config common/log common/xml
+    may_include common/log common/config
+    may_include common/xml common/log
+    may_include app common/config common/log common/xml
+    may_include app/logfile
+    may_include app/settingsfile common/config common/xml
+    may_include app/runninglog app/settingsfile common/log
+    may_include app/window/log app/logfile app/runninglog
+    may_include app/window/settings app/settingsfile app/window/log
+    may_include app/window app app/logfile app/runninglog app/settingsfile \
+        app/window/log app/window/settings common/config common/log
+}
+
+# A folder that the rooms do not name would have no rule.
+folders_without_rule() {
+    local folder
+    while IFS= read -r folder; do
+        declare -f rooms | grep -qE "may_include $folder( |;|\$)" || echo "$folder"
+    done < <(git ls-files --cached --others --exclude-standard 'app/*.h' 'common/*.h' |
+        sed 's,/[^/]*$,,' | sort -u)
+}
+
+# The rooms below the window could include the headers of widgets through the framework.
+widgets_below_the_window() {
+    tracked 'app/logfile/*' 'app/settingsfile/*' 'app/runninglog/*' |
+        search -nHP '^\s*#\s*include\s*<(Qt(Gui|Widgets)\b|Q\w*(Widget|Dialog|Color|Font|Icon|Image|Pixmap|Paint|Palette|Screen|Style|Menu|Label|Button|Layout|MessageBox|Window|Clipboard|GuiApplication)|QApplication)'
 }
 
 rule "no SPDX lines at the top" without_spdx
 rule "a header without #pragma once" without_pragma_once
 rule "a tab, or blanks at a line's end" stray_blanks
 rule "a path of one machine" machine_paths
-rule "config may include log and xml, no more" \
-    includes_beyond common/config common/config common/log common/xml
-rule "log may include config, no more" \
-    includes_beyond common/log common/log common/config
-rule "xml may include log, no more" \
-    includes_beyond common/xml common/xml common/log
+rooms
+rule "a folder that no rule says what it may include" folders_without_rule
+rule "a widget below the window" widgets_below_the_window
 
 [ "$breaches" -eq 0 ] || exit 1
 echo "house rules: $(sources | tr -dc '\0' | wc -c) files keep them"

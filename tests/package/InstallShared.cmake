@@ -1,8 +1,9 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 
-# Builds the framework of the project in SOURCE as a shared library and installs it into PREFIX. Only
-# that, for the program would take long: BUILD/common is the framework's part of the build tree.
+# Builds the framework of the project in SOURCE as a shared library and the frame on top of it, and
+# installs both into PREFIX. Not the program, which would take long: BUILD/common is the framework's
+# part of the build tree, and of the program's part only what belongs to the frame is taken.
 
 execute_process(COMMAND "${CMAKE_COMMAND}" -S "${SOURCE}" -B "${BUILD}" -G "${GENERATOR}"
     ${OPTIONS} -DBUILD_SHARED_LIBS=ON -DVELOCOR_BUILD_TESTS=OFF
@@ -10,7 +11,7 @@ execute_process(COMMAND "${CMAKE_COMMAND}" -S "${SOURCE}" -B "${BUILD}" -G "${GE
 if(NOT result EQUAL 0)
     message(FATAL_ERROR "not configured")
 endif()
-execute_process(COMMAND "${CMAKE_COMMAND}" --build "${BUILD}" --target tork_common
+execute_process(COMMAND "${CMAKE_COMMAND}" --build "${BUILD}" --target tork_common velocor_frame
     RESULT_VARIABLE result)
 if(NOT result EQUAL 0)
     message(FATAL_ERROR "not built")
@@ -19,7 +20,13 @@ endif()
 set(BUILD "${BUILD}/common")
 include("${CMAKE_CURRENT_LIST_DIR}/Install.cmake")
 
-file(GLOB archives "${PREFIX}/lib/*.a")
+execute_process(COMMAND "${CMAKE_COMMAND}" --install "${BUILD}/../app" --prefix "${PREFIX}"
+    --component frame RESULT_VARIABLE result)
+if(NOT result EQUAL 0)
+    message(FATAL_ERROR "the frame is not installed: ${result}")
+endif()
+
+file(GLOB archives "${PREFIX}/lib/libtork*.a")
 if(archives)
     message(FATAL_ERROR "no shared library: ${archives}")
 endif()
