@@ -32,7 +32,10 @@ class LogFilter
 public:
     LogFilter() : m_texts({"a", "b"}) {}
     bool Matches(QString const& line) const { return m_texts.contains(line); }
-    bool isWhole() const { return m_texts.size() == 2 && m_end == 4711 && Matches("b"); }
+    bool isWhole() const
+    {
+        return m_texts.size() == 2 && m_end == 4711 && m_numbers[99] == 0 && Matches("b");
+    }
 
 private:
     long m_numbers[100] = {};
@@ -46,7 +49,7 @@ class LogView
 public:
     LogView() = default;
     virtual ~LogView();
-    virtual bool isWhole() const { return m_text == "view"; }
+    virtual bool isWhole() const { return m_text == "view" && m_padding[299] == 0; }
 
 private:
     char m_padding[300] = {};
@@ -66,7 +69,7 @@ public:
     bool isWhole()
     {
         emit Chosen(1, 2);
-        return m_chosen == 1 && m_list.isEmpty();
+        return m_chosen == 1 && m_list.isEmpty() && m_padding[49] == 0;
     }
 
 signals:

@@ -4,51 +4,21 @@
 #pragma once
 
 #include "app/window/MainWindow.h"
-#include "common/log/TorkLog.h"
 #include "support/DemoLog.h"
-#include "support/TestFiles.h"
+#include "support/TestRun.h"
 
 #include <QApplication>
 #include <QPointer>
-#include <QTemporaryDir>
 #include <QtTest>
 
 #include <functional>
 #include <memory>
 
-/// A program's surroundings for tests of its window: identity, directories and a log, all in a
-/// folder that goes when the object does.
-class WindowTest
+/// A program's surroundings, and what tests of its window do in them.
+class WindowTest : public TestRun
 {
 public:
-    /// @param log  what stands in the log file before the window opens it
-    explicit WindowTest(QByteArray const& log = QByteArray())
-    {
-        m_handler = qInstallMessageHandler(nullptr);
-        QCoreApplication::setOrganizationName("Org");
-        QCoreApplication::setApplicationName("Product");
-        qApp->setProperty("caption", "Caption");
-        qApp->setProperty("RootPath", folder() + "root/");
-        qApp->setProperty("DataPath", folder() + "data/");
-        qApp->setProperty("DocPath", folder() + "documents/");
-        QDir().mkpath(folder() + "documents");
-        TorkLog::initialize(folder() + "data/logs/", "app", QString(), true);
-        if (!log.isNull())
-            TestFiles::write(logFile(), log);
-    }
-
-    ~WindowTest()
-    {
-        TorkLog::shutdown();
-        qInstallMessageHandler(m_handler);
-    }
-
-    WindowTest(WindowTest const&) = delete;
-    WindowTest& operator=(WindowTest const&) = delete;
-
-    QString folder() const { return QFileInfo(m_folder.path()).canonicalFilePath() + "/"; }
-    QString logFile() const { return folder() + "data/logs/app.log"; }
-    QString settingsFile() const { return folder() + "data/velocor.cfg"; }
+    using TestRun::TestRun;
 
     /// A window on the screen, with the keyboard and with its log read.
     static std::unique_ptr<Velocor::MainWindow> show()
@@ -82,8 +52,4 @@ public:
         });
         timer->start(20);
     }
-
-private:
-    QTemporaryDir m_folder;
-    QtMessageHandler m_handler = nullptr;
 };

@@ -5,10 +5,6 @@
 
 #include "WindowTest.h"
 
-#include "app/logfile/LogFileList.h"
-#include "app/logfile/LogFilter.h"
-#include "app/runninglog/InstanceList.h"
-#include "app/runninglog/LogHealth.h"
 #include "app/runninglog/LogPreferences.h"
 #include "app/runninglog/RunningLog.h"
 #include "app/window/RecentFiles.h"
@@ -17,9 +13,7 @@
 #include "app/window/log/FileSizeText.h"
 #include "app/window/log/SeverityIcons.h"
 
-#include <QLockFile>
 #include <QMenu>
-#include <QProcess>
 #include <QScreen>
 
 using namespace Velocor;
@@ -44,19 +38,7 @@ private slots:
     void recentMenu();
     void fileSize_data();
     void fileSize();
-    void logFileList();
-    void preferences();
-    void preferencesManyFiles();
-    void preferencesCannotBeSaved();
     void withoutALog();
-    void filter();
-    void isKept_data();
-    void isKept();
-    void instances();
-    void instancesLeaveNothing();
-    void instanceLeftBehind();
-    void health();
-    void healthDirectoryInTheWay();
     void report();
     void reportOfATroubledLog();
     void severityIcons();
@@ -270,76 +252,6 @@ void tst_WindowState::fileSize()
     QTEST(FileSizeText(bytes), "expected");
 }
 
-void tst_WindowState::logFileList()
-{
-    const QTemporaryDir folder;
-    const QString log = folder.filePath("a[1] b.log");
-    for (char const* end : {"", ".1", ".2", ".10", ".x", ".01", ".bak.3"})
-        QVERIFY(TestFiles::write(log + end, "x"));
-    const QStringList all{log, log + ".1", log + ".2", log + ".10"};
-    QCOMPARE(LogFileList::FilesOf(log), all);
-    QCOMPARE(LogFileList::FilesOf(log + ".2"), all);
-    QCOMPARE(LogFileList::FilesOf(folder.filePath("none.log")),
-             QStringList(folder.filePath("none.log")));
-    QCOMPARE(LogFileList::CurrentOf(log + ".10"), log);
-    QCOMPARE(LogFileList::CurrentOf(log), log);
-}
-
-void tst_WindowState::preferences()
-{
-    const WindowTest test;
-    LogPreferences preferences = LogPreferences::Read();
-    QCOMPARE(preferences.dateFormat, QString("yyyy-MM-dd hh:mm:ss.z"));
-    QCOMPARE(preferences.filePrefix, QString("app"));
-    QCOMPARE(preferences.maxFiles, 10);
-
-    preferences.elapsedTime = true;
-    preferences.maxFiles = 7;
-    preferences.dateFormat = "hh:mm";
-    preferences.elapsedPrefix = "t=";
-    preferences.filePrefix = "other";
-    QCOMPARE(preferences.Apply(), QString());
-
-    // The first two hold at once, the others from the next start on.
-    TorkLog::logger()->trace("x");
-    const QByteArray line = TestFiles::read(test.logFile());
-    QVERIFY2(line.contains("Trace dT:[") && line.startsWith("20"), line);
-    QCOMPARE(TorkLog::logger()->maxLogFiles(), 7U);
-    QCOMPARE(LogPreferences::Read().filePrefix, QString("other"));
-
-    // The log opens its file before it knows of the other name, and the window goes by the file.
-    TorkLog::shutdown();
-    QVERIFY(QFile::remove(test.logFile()));
-    TorkLog::initialize(test.folder() + "data/logs/", "app", QString(), true);
-    TorkLog::logger()->trace("x");
-    const QByteArray next = TestFiles::read(test.logFile()).split('\n').value(1);
-    QVERIFY2(QRegularExpression("\\A\\d\\d:\\d\\d Trace t=\\[").match(QString(next)).hasMatch(),
-             next);
-    QCOMPARE(RunningLog::FileName(), test.logFile());
-}
-
-// The log's setter takes a number above 100 down to 100 first.
-void tst_WindowState::preferencesManyFiles()
-{
-    const WindowTest test;
-    TorkLog::logger()->setMaxLogFiles(500);
-    LogPreferences preferences = LogPreferences::Read();
-    QCOMPARE(preferences.maxFiles, 500);
-    preferences.maxFiles = 30;
-    QCOMPARE(preferences.Apply(), QString());
-    QCOMPARE(TorkLog::logger()->maxLogFiles(), 30U);
-}
-
-void tst_WindowState::preferencesCannotBeSaved()
-{
-    const WindowTest test;
-    const LogPreferences preferences = LogPreferences::Read();
-    const QString file = LogPreferences::FileName();
-    QFile::remove(file);
-    QVERIFY(QDir().mkpath(file + "/in the way"));
-    QCOMPARE(preferences.Apply(), "The settings file " + file + " could not be saved.");
-}
-
 void tst_WindowState::withoutALog()
 {
     const WindowTest test;
@@ -351,130 +263,6 @@ void tst_WindowState::withoutALog()
     QCOMPARE(SystemReport::LogTail(10), QString());
     const QString facts = SystemReport::Facts(test.settingsFile());
     QVERIFY2(facts.contains("Log: none\n"), qPrintable(facts));
-}
-
-void tst_WindowState::filter()
-{
-    LogFilter filter;
-    QVERIFY(filter.Shows(LogEntry::Trace) && filter.Shows(LogEntry::None));
-    filter.SetSeverity(LogEntry::None, false); // lines without a severity have no switch
-    QVERIFY(filter.Shows(LogEntry::None));
-    filter.SetSeverity(LogEntry::Trace, false);
-    QVERIFY(!filter.Shows(LogEntry::Trace) && !filter.Shows(LogEntry::None));
-    QVERIFY(filter.Shows(LogEntry::Fatal));
-    filter.SetSeverity(LogEntry::Trace, true);
-    QVERIFY(filter.Shows(LogEntry::Trace) && filter.Shows(LogEntry::None));
-
-    using Ranges = QVector<QPair<int, int>>;
-    QCOMPARE(filter.Ranges("any"), Ranges());
-    QVERIFY(filter.SetText("a", false, false));
-    QCOMPARE(filter.Ranges("Banana"), Ranges({{1, 1}, {3, 1}, {5, 1}}));
-    QVERIFY(filter.Matches("BANANA") && !filter.Matches("kiwi"));
-    QVERIFY(filter.SetText("A", false, true));
-    QVERIFY(filter.Matches("BANANA") && !filter.Matches("banana"));
-    QVERIFY(filter.SetText("n*", true, false)); // matches nothing at all in many places
-    QCOMPARE(filter.Ranges("Banana"), Ranges({{2, 1}, {4, 1}}));
-    QVERIFY(!filter.SetText("(", true, false));
-    QCOMPARE(filter.Ranges("Banana"), Ranges({{2, 1}, {4, 1}}));
-    LogFilter other;
-    QVERIFY(!other.HasSameText(filter));
-    QVERIFY(other.SetText("n*", false, false));
-    QVERIFY(!other.HasSameText(filter));
-    QVERIFY(other.SetText("n*", true, false));
-    QVERIFY(other.HasSameText(filter));
-}
-
-void tst_WindowState::isKept_data()
-{
-    QTest::addColumn<QString>("text");
-    QTest::addColumn<bool>("expected");
-    QTest::newRow("plain") << "hh:mm" << true;
-    QTest::newRow("markup") << "<'x'>" << true;
-    QTest::newRow("empty") << "" << false;
-    QTest::newRow("end of CDATA") << "]]>" << false;
-    QTest::newRow("placeholder") << "%1" << false;
-    QTest::newRow("percent") << "%" << true;
-    QTest::newRow("umlaut") << QString::fromUtf8("\xC3\xA4") << false;
-    QTest::newRow("line feed") << "a\nb" << false;
-}
-
-void tst_WindowState::isKept()
-{
-    QFETCH(QString, text);
-    QTEST(LogPreferences::IsKept(text), "expected");
-}
-
-// Where the window looks for others.
-static QString runningFolder(WindowTest const& test)
-{
-    return test.folder() + "data/running-app.log";
-}
-
-void tst_WindowState::instances()
-{
-    const WindowTest test;
-    const InstanceList own(runningFolder(test));
-    QCOMPARE(own.Others(), QList<qint64>());
-
-    QProcess other;
-    other.start(QCoreApplication::applicationFilePath(), {"--hold", runningFolder(test)});
-    QVERIFY(other.waitForReadyRead(20000));
-    QCOMPARE(own.Others(), QList<qint64>({other.processId()}));
-    LogHealth health;
-    const QString told = health.Check();
-    QVERIFY2(told.contains(QString::number(other.processId())), qPrintable(told));
-
-    other.closeWriteChannel();
-    QVERIFY(other.waitForFinished());
-    QCOMPARE(own.Others(), QList<qint64>());
-}
-
-void tst_WindowState::instancesLeaveNothing()
-{
-    const WindowTest test;
-    {
-        const InstanceList own(runningFolder(test));
-        QVERIFY(QFile::exists(runningFolder(test)));
-    }
-    QVERIFY(!QFile::exists(runningFolder(test)));
-}
-
-// A program that was killed does not count any more.
-void tst_WindowState::instanceLeftBehind()
-{
-    const WindowTest test;
-    const InstanceList own(runningFolder(test));
-    QProcess other;
-    other.start(QCoreApplication::applicationFilePath(), {"--hold", runningFolder(test)});
-    QVERIFY(other.waitForReadyRead(20000));
-    other.kill();
-    other.waitForFinished();
-    QCOMPARE(own.Others(), QList<qint64>());
-}
-
-void tst_WindowState::health()
-{
-    const WindowTest test;
-    LogHealth health;
-    QCOMPARE(health.Check(), QString());
-    TorkLog::logger()->setEnable(false);
-    QCOMPARE(health.Check(), QString("The log is switched off"));
-    TorkLog::logger()->setEnable(true);
-    QCOMPARE(health.Check(), QString());
-    TorkLog::shutdown();
-    QCOMPARE(health.Check(), QString("There is no log"));
-}
-
-void tst_WindowState::healthDirectoryInTheWay()
-{
-    const WindowTest test;
-    QVERIFY(QDir().mkpath(test.logFile()));
-    TorkLog::logger()->trace("lost");
-    LogHealth health;
-    QVERIFY2(health.Check().startsWith("The log cannot be written: "), qPrintable(health.Check()));
-    QVERIFY(QDir(test.logFile()).removeRecursively());
-    TorkLog::logger()->trace("kept");
-    QCOMPARE(health.Check(), QString());
 }
 
 void tst_WindowState::report()
@@ -536,17 +324,5 @@ void tst_WindowState::severityIcons()
     }
 }
 
-// Started with "--hold FILE" it is another program that shares a log, until its input ends.
-int main(int argc, char** argv)
-{
-    QApplication application(argc, argv);
-    if (application.arguments().value(1) == "--hold") {
-        const InstanceList instances(application.arguments().value(2));
-        QTextStream(stdout) << "held\n" << flush;
-        QTextStream(stdin).readAll();
-        return 0;
-    }
-    tst_WindowState test;
-    return QTest::qExec(&test, argc, argv);
-}
+QTEST_MAIN(tst_WindowState)
 #include "tst_WindowState.moc"

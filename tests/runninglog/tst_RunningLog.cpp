@@ -1,0 +1,197 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// Preferences and health of the log, and the other programs that write to it.
+
+#include "app/runninglog/InstanceList.h"
+#include "app/runninglog/LogHealth.h"
+#include "app/runninglog/LogPreferences.h"
+#include "app/runninglog/RunningLog.h"
+#include "support/TestRun.h"
+
+#include <QProcess>
+#include <QRegularExpression>
+#include <QTextStream>
+#include <QtTest>
+
+using namespace Velocor;
+
+class tst_RunningLog : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void preferences();
+    void preferencesManyFiles();
+    void preferencesCannotBeSaved();
+    void isKept_data();
+    void isKept();
+    void instances();
+    void instancesLeaveNothing();
+    void instanceLeftBehind();
+    void health();
+    void healthDirectoryInTheWay();
+};
+
+// Where the window looks for others.
+static QString runningFolder(TestRun const& test)
+{
+    return test.folder() + "data/running-app.log";
+}
+
+void tst_RunningLog::preferences()
+{
+    const TestRun test;
+    LogPreferences preferences = LogPreferences::Read();
+    QCOMPARE(preferences.dateFormat, QString("yyyy-MM-dd hh:mm:ss.z"));
+    QCOMPARE(preferences.filePrefix, QString("app"));
+    QCOMPARE(preferences.maxFiles, 10);
+
+    preferences.elapsedTime = true;
+    preferences.maxFiles = 7;
+    preferences.dateFormat = "hh:mm";
+    preferences.elapsedPrefix = "t=";
+    preferences.filePrefix = "other";
+    QCOMPARE(preferences.Apply(), QString());
+
+    // The first two hold at once, the others from the next start on.
+    TorkLog::logger()->trace("x");
+    const QByteArray line = TestFiles::read(test.logFile());
+    QVERIFY2(line.contains("Trace dT:[") && line.startsWith("20"), line);
+    QCOMPARE(TorkLog::logger()->maxLogFiles(), 7U);
+    QCOMPARE(LogPreferences::Read().filePrefix, QString("other"));
+
+    // The log opens its file before it knows of the other name, and the window goes by the file.
+    TorkLog::shutdown();
+    QVERIFY(QFile::remove(test.logFile()));
+    TorkLog::initialize(test.folder() + "data/logs/", "app", QString(), true);
+    TorkLog::logger()->trace("x");
+    const QByteArray next = TestFiles::read(test.logFile()).split('\n').value(1);
+    QVERIFY2(QRegularExpression("\\A\\d\\d:\\d\\d Trace t=\\[").match(QString(next)).hasMatch(),
+             next);
+    QCOMPARE(RunningLog::FileName(), test.logFile());
+}
+
+// The log's setter takes a number above 100 down to 100 first.
+void tst_RunningLog::preferencesManyFiles()
+{
+    const TestRun test;
+    TorkLog::logger()->setMaxLogFiles(500);
+    LogPreferences preferences = LogPreferences::Read();
+    QCOMPARE(preferences.maxFiles, 500);
+    preferences.maxFiles = 30;
+    QCOMPARE(preferences.Apply(), QString());
+    QCOMPARE(TorkLog::logger()->maxLogFiles(), 30U);
+}
+
+void tst_RunningLog::preferencesCannotBeSaved()
+{
+    const TestRun test;
+    const LogPreferences preferences = LogPreferences::Read();
+    const QString file = LogPreferences::FileName();
+    QFile::remove(file);
+    QVERIFY(QDir().mkpath(file + "/in the way"));
+    QCOMPARE(preferences.Apply(), "The settings file " + file + " could not be saved.");
+}
+
+void tst_RunningLog::isKept_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<bool>("expected");
+    QTest::newRow("plain") << "hh:mm" << true;
+    QTest::newRow("markup") << "<'x'>" << true;
+    QTest::newRow("empty") << "" << false;
+    QTest::newRow("end of CDATA") << "]]>" << false;
+    QTest::newRow("placeholder") << "%1" << false;
+    QTest::newRow("percent") << "%" << true;
+    QTest::newRow("umlaut") << QString::fromUtf8("\xC3\xA4") << false;
+    QTest::newRow("line feed") << "a\nb" << false;
+}
+
+void tst_RunningLog::isKept()
+{
+    QFETCH(QString, text);
+    QTEST(LogPreferences::IsKept(text), "expected");
+}
+
+void tst_RunningLog::instances()
+{
+    const TestRun test;
+    const InstanceList own(runningFolder(test));
+    QCOMPARE(own.Others(), QList<qint64>());
+
+    QProcess other;
+    other.start(QCoreApplication::applicationFilePath(), {"--hold", runningFolder(test)});
+    QVERIFY(other.waitForReadyRead(20000));
+    QCOMPARE(own.Others(), QList<qint64>({other.processId()}));
+    LogHealth health;
+    const QString told = health.Check();
+    QVERIFY2(told.contains(QString::number(other.processId())), qPrintable(told));
+
+    other.closeWriteChannel();
+    QVERIFY(other.waitForFinished());
+    QCOMPARE(own.Others(), QList<qint64>());
+}
+
+void tst_RunningLog::instancesLeaveNothing()
+{
+    const TestRun test;
+    {
+        const InstanceList own(runningFolder(test));
+        QVERIFY(QFile::exists(runningFolder(test)));
+    }
+    QVERIFY(!QFile::exists(runningFolder(test)));
+}
+
+// A program that was killed does not count any more.
+void tst_RunningLog::instanceLeftBehind()
+{
+    const TestRun test;
+    const InstanceList own(runningFolder(test));
+    QProcess other;
+    other.start(QCoreApplication::applicationFilePath(), {"--hold", runningFolder(test)});
+    QVERIFY(other.waitForReadyRead(20000));
+    other.kill();
+    other.waitForFinished();
+    QCOMPARE(own.Others(), QList<qint64>());
+}
+
+void tst_RunningLog::health()
+{
+    const TestRun test;
+    LogHealth health;
+    QCOMPARE(health.Check(), QString());
+    TorkLog::logger()->setEnable(false);
+    QCOMPARE(health.Check(), QString("The log is switched off"));
+    TorkLog::logger()->setEnable(true);
+    QCOMPARE(health.Check(), QString());
+    TorkLog::shutdown();
+    QCOMPARE(health.Check(), QString("There is no log"));
+}
+
+void tst_RunningLog::healthDirectoryInTheWay()
+{
+    const TestRun test;
+    QVERIFY(QDir().mkpath(test.logFile()));
+    TorkLog::logger()->trace("lost");
+    LogHealth health;
+    QVERIFY2(health.Check().startsWith("The log cannot be written: "), qPrintable(health.Check()));
+    QVERIFY(QDir(test.logFile()).removeRecursively());
+    TorkLog::logger()->trace("kept");
+    QCOMPARE(health.Check(), QString());
+}
+
+// Started with "--hold FILE" it is another program that shares a log, until its input ends.
+int main(int argc, char** argv)
+{
+    QCoreApplication application(argc, argv);
+    if (application.arguments().value(1) == "--hold") {
+        const InstanceList instances(application.arguments().value(2));
+        QTextStream(stdout) << "held\n" << flush;
+        QTextStream(stdin).readAll();
+        return 0;
+    }
+    tst_RunningLog test;
+    return QTest::qExec(&test, argc, argv);
+}
+#include "tst_RunningLog.moc"
