@@ -63,6 +63,21 @@ includes_beyond() {
         search -nHP "^\s*#\s*include\s*[<\"](\.\./)*(?!(${allowed#|})/)(app|common/\w+)/"
 }
 
+# Statements that match a pattern and hold no call of PlainToolTip(); they may go over several lines.
+bare_tool_tips() {
+    local rest='((?!PlainToolTip\()[^;{}])*'
+    tracked 'app/*.cpp' 'app/*.h' | search -HPzo \
+        "\bset(Tab)?ToolTip\($rest(?=;)|(?<=[;{}])$rest,\s*Qt::ToolTipRole\)|ToolTipRole:$rest(?=;)|WhatsThis\(" |
+        tr -s '\0\n' '\n'
+}
+
+# PlainText.cpp is where they are made plain; UserMessages shows boxes as its callers want them.
+guessing_widgets() {
+    local boxes='(critical|warning|information|question|about)'
+    tracked 'app/*.cpp' 'app/*.h' ':!app/UserMessages.cpp' ':!*/PlainText.*' | search -nHP \
+        "new QLabel\b|\bQLabel\s+\w+\s*[;({]|QMessageBox::$boxes\(|new QMessageBox\b|\bQMessageBox\s+\w+\s*[;({]|QMessageBox\(|addRow\(\s*(tr\(|QString|\")|QErrorMessage|QProgressDialog|QInputDialog|QTextBrowser|QToolTip::"
+}
+
 rule "no SPDX lines at the top" without_spdx
 rule "a header without #pragma once" without_pragma_once
 rule "a tab, or blanks at a line's end" stray_blanks
@@ -73,6 +88,8 @@ rule "log may include config, no more" \
     includes_beyond common/log common/log common/config
 rule "xml may include log, no more" \
     includes_beyond common/xml common/xml common/log
+rule "a tool tip that does not come from PlainToolTip()" bare_tool_tips
+rule "a widget that guesses whether its text is rich; see app/window/PlainText.h" guessing_widgets
 
 [ "$breaches" -eq 0 ] || exit 1
 echo "house rules: $(sources | tr -dc '\0' | wc -c) files keep them"

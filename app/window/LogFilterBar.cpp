@@ -4,6 +4,7 @@
 #include "app/window/LogFilterBar.h"
 
 #include "app/window/LogModel.h"
+#include "app/window/PlainText.h"
 #include "app/window/SeverityIcons.h"
 
 #include <QCheckBox>
@@ -20,13 +21,14 @@ constexpr int TypingPause = 150; // milliseconds
 } // namespace
 
 LogFilterBar::LogFilterBar(QWidget* parent)
-    : QWidget(parent), m_text(new QLineEdit), m_error(new QLabel)
+    : QWidget(parent), m_text(new QLineEdit), m_error(Velocor::NewPlainLabel())
 {
     m_text->setPlaceholderText(tr("Filter"));
     m_text->setClearButtonEnabled(true);
     m_text->setAccessibleName(tr("Filter by text"));
     m_text->setAcceptDrops(false); // files dropped here are for the window
-    m_text->setToolTip(tr("Show only lines that contain this text (Ctrl+F)"));
+    m_text->setToolTip(
+        Velocor::PlainToolTip(tr("Show only lines that contain this text (Ctrl+F)")));
     m_error->setAccessibleName(tr("Error in the filter"));
     m_error->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
     m_error->setWordWrap(true);
@@ -64,7 +66,7 @@ QCheckBox* LogFilterBar::makeOption(QString const& text, QString const& name,
 {
     auto* option = new QCheckBox(text);
     option->setAccessibleName(name);
-    option->setToolTip(name + QLatin1String(": ") + toolTip);
+    option->setToolTip(Velocor::PlainToolTip(name + QLatin1String(": ") + toolTip));
     connect(option, &QCheckBox::toggled, this, &LogFilterBar::apply);
     return option;
 }
@@ -79,8 +81,8 @@ void LogFilterBar::addSeverities()
         button->setFocusPolicy(Qt::TabFocus);
         button->setText(name);
         button->setAccessibleName(tr("Show %1").arg(name));
-        button->setToolTip(
-            tr("Show or hide entries of severity %1 (Ctrl+%2)").arg(name).arg(i + 1));
+        button->setToolTip(Velocor::PlainToolTip(
+            tr("Show or hide entries of severity %1 (Ctrl+%2)").arg(name).arg(i + 1)));
         button->setShortcut(QKeySequence(Qt::CTRL | (Qt::Key_1 + i)));
         button->setToolButtonStyle(Qt::ToolButtonIconOnly);
         connect(button, &QToolButton::toggled, this, &LogFilterBar::apply);

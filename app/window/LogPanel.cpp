@@ -10,6 +10,7 @@
 #include "app/window/LogModel.h"
 #include "app/window/LogPreferences.h"
 #include "app/window/LogView.h"
+#include "app/window/PlainText.h"
 
 #include <QCheckBox>
 #include <QComboBox>
@@ -68,12 +69,14 @@ void LogPanel::makeControls()
     };
     m_files = files;
     m_files->setAccessibleName(tr("Log file"));
-    m_files->setToolTip(tr("The current log file and the older ones beside it"));
+    m_files->setToolTip(
+        Velocor::PlainToolTip(tr("The current log file and the older ones beside it")));
     m_files->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon);
     m_files->setMinimumContentsLength(16);
 
-    m_pause->setToolTip(tr("Leave the view as it is while the log goes on (Ctrl+Shift+P)"));
-    m_follow->setToolTip(tr("Keep the newest entry in view (Ctrl+Shift+N)"));
+    m_pause->setToolTip(
+        Velocor::PlainToolTip(tr("Leave the view as it is while the log goes on (Ctrl+Shift+P)")));
+    m_follow->setToolTip(Velocor::PlainToolTip(tr("Keep the newest entry in view (Ctrl+Shift+N)")));
     m_follow->setChecked(true);
 
     m_line = new QPlainTextEdit;
@@ -86,7 +89,7 @@ void LogPanel::makeControls()
 
 void LogPanel::makeLayout()
 {
-    auto* label = new QLabel(tr("&File:"));
+    QLabel* label = Velocor::NewPlainLabel(tr("&File:"));
     label->setBuddy(m_files);
     auto* top = new QHBoxLayout;
     top->setSpacing(8);
@@ -152,7 +155,8 @@ void LogPanel::Open(QString const& path, bool isCurrent)
 
 void LogPanel::showFile(QString const& path)
 {
-    m_files->setToolTip(path);
+    m_files->setToolTip(Velocor::PlainToolTip(path));
+    m_files->setAccessibleDescription(path);
     m_model->Open(path, LogPreferences::Parser(), path == m_currentPath);
     updatePlaceholder();
 }
@@ -166,7 +170,7 @@ void LogPanel::fillFileList()
         const QFileInfo info(file);
         const QString size = info.exists() ? FileSizeText(info.size()) : tr("not there");
         m_files->addItem(tr("%1 (%2)").arg(info.fileName(), size), file);
-        m_files->setItemData(m_files->count() - 1, file, Qt::ToolTipRole);
+        m_files->setItemData(m_files->count() - 1, Velocor::PlainToolTip(file), Qt::ToolTipRole);
     }
     m_files->setCurrentIndex(m_files->findData(path()));
 }

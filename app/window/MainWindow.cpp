@@ -10,6 +10,7 @@
 #include "app/window/LogSettingsDialog.h"
 #include "app/window/NoticeBar.h"
 #include "app/window/PlacesPanel.h"
+#include "app/window/PlainText.h"
 #include "app/window/RecentFiles.h"
 #include "app/window/ReportDialog.h"
 #include "app/window/RunningLog.h"
@@ -42,6 +43,7 @@ namespace {
 constexpr int HealthInterval = 2000; // milliseconds
 constexpr int MessageTime = 6000;    // milliseconds
 constexpr int MostDropped = 20;
+constexpr int LongestMessage = 1000; // characters
 
 QString Property(char const* name)
 {
@@ -132,10 +134,9 @@ void MainWindow::makeTabs()
 
 void MainWindow::makeStatusBar()
 {
-    m_health = new QLabel;
-    m_summary = new QLabel;
+    m_health = Velocor::NewPlainLabel();
+    m_summary = Velocor::NewPlainLabel();
     m_health->setAccessibleName(tr("State of the log"));
-    m_health->setTextFormat(Qt::PlainText);
     m_health->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
     m_health->setContentsMargins(6, 0, 0, 0);
     m_summary->setAccessibleName(tr("Lines shown"));
@@ -322,7 +323,8 @@ void MainWindow::checkLog()
     if (problem == m_health->text())
         return;
     m_health->setText(problem);
-    m_health->setToolTip(problem);
+    m_health->setToolTip(Velocor::PlainToolTip(problem));
+    m_health->setAccessibleDescription(problem);
 }
 
 void MainWindow::updateState()
@@ -343,7 +345,7 @@ void MainWindow::updateState()
 
 void MainWindow::say(QString const& text)
 {
-    statusBar()->showMessage(text, MessageTime);
+    statusBar()->showMessage(Velocor::Shortened(text, LongestMessage), MessageTime);
 }
 
 void MainWindow::chooseFile()
@@ -367,6 +369,10 @@ void MainWindow::OpenFile(QString const& path)
         say(tr("%1 is a folder").arg(full));
         return;
     }
+    if (!QFileInfo(full).isFile()) { // opening a pipe waits, and a device may have no end
+        say(tr("%1 is not a regular file").arg(full));
+        return;
+    }
     m_tabs->OpenFile(full);
     m_recent->Add(full);
 }
@@ -378,12 +384,14 @@ bool MainWindow::offerToForget(QString const& path)
         say(tr("There is no file %1").arg(path));
         return false;
     }
-    const QMessageBox::StandardButton answer = QMessageBox::question(
-        this, windowTitle(),
-        tr("There is no file %1 any more.\nRemove it from the list of recent files?").arg(path));
-    if (answer == QMessageBox::Yes)
-        m_recent->Remove(path);
-    return answer == QMessageBox::Yes;
+    Velocor::PlainMessageBox box(
+        QMessageBox::Question, this,
+        tr("There is no file %1 any more.\nRemove it from the list of recent files?").arg(path),
+        QMessageBox::Yes | QMessageBox::No);
+    if (box.exec() != QMessageBox::Yes)
+        return false;
+    m_recent->Remove(path);
+    return true;
 }
 
 void MainWindow::openLogFolder()

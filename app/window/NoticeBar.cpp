@@ -3,18 +3,19 @@
 
 #include "app/window/NoticeBar.h"
 
+#include "app/window/PlainText.h"
 #include "app/window/SeverityIcons.h"
 
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QPushButton>
 
-NoticeBar::NoticeBar(QWidget* parent) : QFrame(parent), m_icon(new QLabel), m_label(new QLabel)
+NoticeBar::NoticeBar(QWidget* parent)
+    : QFrame(parent), m_icon(Velocor::NewPlainLabel()), m_label(Velocor::NewPlainLabel())
 {
     setFrameShape(StyledPanel);
     setAutoFillBackground(true);
     setBackgroundRole(QPalette::Base);
-    m_label->setTextFormat(Qt::PlainText);
     m_label->setWordWrap(true);
     m_label->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
     m_label->setAccessibleName(tr("Notice"));

@@ -2,6 +2,8 @@
 // SPDX-License-Identifier: MIT
 
 #include "app/window/PlacesPanel.h"
+
+#include "app/window/PlainText.h"
 #include "app/window/RunningLog.h"
 
 #include <QClipboard>
@@ -31,7 +33,7 @@ QToolButton* MakeButton(QString const& text, QString const& name, QString const&
     button->setAutoRaise(true);
     button->setMaximumHeight(button->fontMetrics().height() + 8);
     button->setAccessibleName(name);
-    button->setToolTip(toolTip);
+    button->setToolTip(Velocor::PlainToolTip(toolTip));
     return button;
 }
 
@@ -70,13 +72,14 @@ void PlacesPanel::addValue(QString const& caption, QString const& text, bool isP
     auto* value = new QLineEdit(text);
     value->setReadOnly(true);
     value->setAccessibleName(caption);
-    value->setToolTip(text);
+    value->setToolTip(Velocor::PlainToolTip(text));
+    value->setAccessibleDescription(text);
     value->setCursorPosition(0);
     QPalette flat; // only this role is set, so the others go on following the window's
     flat.setBrush(QPalette::Base, Qt::transparent);
     value->setPalette(flat);
 
-    auto* label = new QLabel(caption);
+    QLabel* label = Velocor::NewPlainLabel(caption);
     label->setBuddy(value);
 
     // As high as the buttons are going to be, so that nothing moves when they come.
