@@ -36,6 +36,7 @@
 #include <QTreeWidget>
 
 #include <atomic>
+#include <cerrno>
 #include <thread>
 
 #include <fcntl.h>
@@ -73,7 +74,7 @@ public:
     bool wasOpened() const { return m_opened; }
 
 private:
-    // Readers wait for a writer, writers for a reader: both get one here.
+    // Readers wait for a writer and writers for a reader: each gets one here, in turns.
     void lookForOthers()
     {
         while (!m_over) {
@@ -82,7 +83,15 @@ private:
                 m_opened = true;
                 close(out);
             }
-            usleep(2000);
+            const int in = open(m_path.constData(), O_RDONLY | O_NONBLOCK);
+            usleep(1000);
+            char byte = 0;
+            const ssize_t count = in >= 0 ? read(in, &byte, 1) : 0;
+            if (count > 0 || (count < 0 && errno == EAGAIN))
+                m_opened = true;
+            if (in >= 0)
+                close(in);
+            usleep(1000);
         }
     }
 
@@ -298,6 +307,7 @@ void tst_HostileFiles::windowSettings()
         QVERIFY(QFile::link(file, test.settingsFile()));
     {
         const auto window = WindowTest::show();
+        QTRY_VERIFY(window->findChild<NoticeBar*>());
         const QString told = window->findChild<NoticeBar*>()->text();
         QVERIFY2(told.contains(test.settingsFile() + " cannot be read (Not a regular file)"),
                  qPrintable(told));
@@ -311,6 +321,7 @@ void tst_HostileFiles::windowSettingsAtTheEnd()
 {
     const WindowTest test;
     const auto window = WindowTest::show();
+    QTRY_VERIFY(window->findChild<FileTabs*>()); // before that, nothing is saved
     const Pipe pipe(test.settingsFile());
     window->close();
     QVERIFY(!pipe.wasOpened());
@@ -388,6 +399,7 @@ void tst_HostileFiles::recentFilesInTheWindow()
                                               "</recentFiles></MainWindow></VelocorSettings>");
     {
         const auto window = WindowTest::show();
+        QTRY_VERIFY(Action(*window, "Open Recent"));
         QCOMPARE(Action(*window, "Open Recent")->menu()->actions().size(),
                  RecentFiles::MostFiles + 2);
         window->close();
