@@ -74,7 +74,7 @@ bare_tool_tips() {
 # PlainText.cpp is where they are made plain; UserMessages shows boxes as its callers want them.
 guessing_widgets() {
     local boxes='(critical|warning|information|question|about)'
-    tracked 'app/*.cpp' 'app/*.h' ':!app/UserMessages.cpp' ':!*/PlainText.*' | search -nHP \
+    tracked 'app/*.cpp' 'app/*.h' ':!app/UserMessages.cpp' ':(exclude,glob)app/**/PlainText.*' | search -nHP \
         "new QLabel\b|\bQLabel\s+\w+\s*[;({]|QMessageBox::$boxes\(|new QMessageBox\b|\bQMessageBox\s+\w+\s*[;({]|QMessageBox\(|addRow\(\s*(tr\(|QString|\")|QErrorMessage|QProgressDialog|QInputDialog|QTextBrowser|QToolTip::"
 }
 

@@ -464,6 +464,8 @@ void tst_HostileFiles::longValueSurvivesOtherEdits()
     QTest::keyClicks(tree->findChild<QLineEdit*>(), "yes");
     QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
     QTRY_VERIFY(!tree->findChild<QLineEdit*>());
+    window->activateWindow();
+    QVERIFY(QTest::qWaitForWindowActive(window.get()));
     QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
     QVERIFY(!editor->isModified());
     const QByteArray expected = WithValue(value, "yes").replace("long>", "renamed>");
@@ -520,6 +522,8 @@ void tst_HostileFiles::longValueIsEdited()
     QTest::qWait(50);
     QVERIFY(!QApplication::activeModalWidget());
     QVERIFY(LongestCell(tree) <= 1000);
+    window->activateWindow();
+    QVERIFY(QTest::qWaitForWindowActive(window.get()));
     QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
     QVERIFY(TestFiles::read(file) == WithValue(value + "end"));
 }
