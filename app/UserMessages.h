@@ -16,11 +16,20 @@ class QWidget;
 /// closed the box. GUI thread only.
 ///
 ///     CriticalMessage(window, "The index is damaged.\nIt will be rebuilt.", true);
+///
+/// The box guesses whether `text` is rich text, as Qt's message boxes do, and a file called
+/// `<img src=...>` makes the guess wrong: the box loads that image. So escape a text that holds
+/// something from outside if it looks rich. The log then holds the escaped text:
+///
+///     QString text = "Cannot open " + path;
+///     if (Qt::mightBeRichText(text))
+///         text = "<p style='white-space:pre-wrap'>" + text.toHtmlEscaped() + "</p>";
+///     CriticalMessage(window, text, true);
 
 /// Tells of a failure; logged as critical.
 ///
 /// @param parent  the window that the box belongs to; may be null
-/// @param text  shown as it stands; logged with line feeds and tabs as blanks
+/// @param text  shown, as rich text if it looks rich; line feeds and tabs are logged as blanks
 /// @param show  false: only logs
 void CriticalMessage(QWidget* parent, QString const& text, bool show);
 

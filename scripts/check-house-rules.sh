@@ -78,10 +78,11 @@ rooms() {
     may_include app/logfile
     may_include app/settingsfile common/config common/xml
     may_include app/runninglog app/settingsfile common/log
-    may_include app/window/log app/logfile app/runninglog
-    may_include app/window/settings app/settingsfile app/window/log
+    may_include app/window/widgets app/logfile
+    may_include app/window/log app/logfile app/runninglog app/window/widgets
+    may_include app/window/settings app/settingsfile app/window/widgets
     may_include app/window app app/logfile app/runninglog app/settingsfile \
-        app/window/log app/window/settings common/config common/log
+        app/window/log app/window/settings app/window/widgets common/config common/log
 }
 
 # A folder that the rooms do not name would have no rule.
@@ -99,6 +100,21 @@ widgets_below_the_window() {
         search -nHP '^\s*#\s*include\s*<(Qt(Gui|Widgets)\b|Q\w*(Widget|Dialog|Color|Font|Icon|Image|Pixmap|Paint|Palette|Screen|Style|Menu|Label|Button|Layout|MessageBox|Window|Clipboard|GuiApplication)|QApplication)'
 }
 
+# Statements that match a pattern and hold no call of PlainToolTip(); they may go over several lines.
+bare_tool_tips() {
+    local rest='((?!PlainToolTip\()[^;{}])*'
+    tracked 'app/*.cpp' 'app/*.h' | search -HPzo \
+        "\bset(Tab)?ToolTip\($rest(?=;)|(?<=[;{}])$rest,\s*Qt::ToolTipRole\)|ToolTipRole:$rest(?=;)|WhatsThis\(" |
+        tr -s '\0\n' '\n'
+}
+
+# PlainText.cpp is where they are made plain; UserMessages shows boxes as its callers want them.
+guessing_widgets() {
+    local boxes='(critical|warning|information|question|about)'
+    tracked 'app/*.cpp' 'app/*.h' ':!app/UserMessages.cpp' ':(exclude,glob)app/**/PlainText.*' | search -nHP \
+        "new QLabel\b|\bQLabel\s+\w+\s*[;({]|QMessageBox::$boxes\(|new QMessageBox\b|\bQMessageBox\s+\w+\s*[;({]|QMessageBox\(|addRow\(\s*(tr\(|QString|\")|QErrorMessage|QProgressDialog|QInputDialog|QTextBrowser|QToolTip::"
+}
+
 rule "no SPDX lines at the top" without_spdx
 rule "a header without #pragma once" without_pragma_once
 rule "a tab, or blanks at a line's end" stray_blanks
@@ -106,6 +122,8 @@ rule "a path of one machine" machine_paths
 rooms
 rule "a folder that no rule says what it may include" folders_without_rule
 rule "a widget below the window" widgets_below_the_window
+rule "a tool tip that does not come from PlainToolTip()" bare_tool_tips
+rule "a widget that guesses whether its text is rich; see app/window/PlainText.h" guessing_widgets
 
 [ "$breaches" -eq 0 ] || exit 1
 echo "house rules: $(sources | tr -dc '\0' | wc -c) files keep them"

@@ -24,6 +24,15 @@ QByteArray BytesAt(QFile& file, qint64 offset, qint64 count)
     return file.seek(offset) ? file.read(count) : QByteArray();
 }
 
+// Why a file has not been opened; empty if there is none.
+QString ErrorOf(QFile const& file)
+{
+    const QFileInfo info(file.fileName());
+    if (!info.exists())
+        return QString();
+    return info.isFile() ? file.errorString() : QObject::tr("Not a regular file");
+}
+
 } // namespace
 
 LogScanner::LogScanner(QObject* parent) : QObject(parent), m_rows(std::make_shared<LogRows>())
@@ -73,7 +82,7 @@ void LogScanner::readAnew()
     startOver();
     QFile file(m_path);
     if (!QFileInfo(m_path).isFile() || !file.open(QIODevice::ReadOnly)) {
-        m_error = QFileInfo::exists(m_path) ? file.errorString() : QString();
+        m_error = ErrorOf(file);
         tellMissing();
         return;
     }
@@ -154,7 +163,7 @@ void LogScanner::Poll()
     QFile file(m_path);
     const bool opened = QFileInfo(m_path).isFile() && file.open(QIODevice::ReadOnly);
     if (!opened && (m_exists || !m_complete)) {
-        m_error = QFileInfo::exists(m_path) ? file.errorString() : QString();
+        m_error = ErrorOf(file);
         tellMissing();
     } else if (opened && (!m_complete || !m_exists || !isSameFile(file))) {
         readAnew();

@@ -40,7 +40,7 @@ QList<qint64> InstanceList::Others() const
     const QStringList names =
         QDir(m_folder).entryList({QStringLiteral("*.lock")}, QDir::Files, QDir::Name);
     for (QString const& name : names) {
-        if (name == m_ownName)
+        if (name == m_ownName || !QFileInfo(m_folder + QLatin1Char('/') + name).isFile())
             continue;
         QLockFile lock(m_folder + QLatin1Char('/') + name);
         lock.setStaleLockTime(0);

@@ -18,12 +18,15 @@ SettingsDocument SettingsFileReader::Read(QString const& path)
 {
     SettingsFileReader reader;
     QFile file(path);
-    if (QFileInfo(path).isDir() || !file.open(QIODevice::ReadOnly)) {
-        reader.m_document.error =
-            QFileInfo(path).isDir() ? QObject::tr("Is a folder") : file.errorString();
-        return reader.m_document;
-    }
-    reader.read(file);
+    const QFileInfo info(path);
+    if (info.isDir())
+        reader.m_document.error = QObject::tr("Is a folder");
+    else if (info.exists() && !info.isFile()) // opening a pipe waits, and a device may have no end
+        reader.m_document.error = QObject::tr("Not a regular file");
+    else if (!file.open(QIODevice::ReadOnly))
+        reader.m_document.error = file.errorString();
+    else
+        reader.read(file);
     return reader.m_document;
 }
 

@@ -9,6 +9,7 @@
 #include <QCoreApplication>
 #include <QDir>
 #include <QFile>
+#include <QFileInfo>
 #include <QObject>
 #include <QRegularExpression>
 #include <QTemporaryDir>
@@ -113,7 +114,10 @@ QString SettingsFileWriter::SaveUnchecked(QString const& path, SettingsDocument 
 
 bool SettingsFileWriter::Save(QString const& path, SettingsDocument const& document, QString* error)
 {
-    *error = SaveUnchecked(path, document);
+    if (QFileInfo::exists(path) && !QFileInfo(path).isFile())
+        *error = QObject::tr("Not a regular file");
+    else
+        *error = SaveUnchecked(path, document);
     if (!error->isEmpty())
         return false;
 
@@ -131,6 +135,10 @@ bool SettingsFileWriter::KeepBackup(QString const& path, QString* error)
     const QString copy = path + QLatin1String(".bak");
     if (!QFile::exists(path))
         return true;
+    if (!QFileInfo(path).isFile()) {
+        *error = QObject::tr("Not a regular file");
+        return false;
+    }
     if (QFile::exists(copy) && !QFile::remove(copy)) {
         *error = QObject::tr("The file %1 cannot be replaced.").arg(copy);
         return false;

@@ -5,6 +5,7 @@
 
 #include "app/window/log/LogPanel.h"
 #include "app/window/settings/SettingsEditor.h"
+#include "app/window/widgets/PlainText.h"
 
 #include <QFile>
 #include <QFileInfo>
@@ -44,14 +45,14 @@ FileTabs::FileTabs(QWidget* parent) : QTabWidget(parent)
 }
 
 // The style's own close button is an image that dark palettes swallow.
-void FileTabs::addCloseButton(QWidget* page, QString const& title)
+void FileTabs::addCloseButton(QWidget* page, QString const& name)
 {
     auto* button = new QToolButton;
     button->setText(QString(QChar(0xd7)));
     button->setAutoRaise(true);
     button->setFocusPolicy(Qt::NoFocus); // Ctrl+W does the same
-    button->setAccessibleName(tr("Close %1").arg(title));
-    button->setToolTip(tr("Close the file (Ctrl+W)"));
+    button->setAccessibleName(tr("Close %1").arg(name));
+    button->setToolTip(PlainToolTip(tr("Close the file (Ctrl+W)")));
     connect(button, &QToolButton::clicked, this, [this, page] { closeTab(indexOf(page)); });
     tabBar()->setTabButton(indexOf(page), QTabBar::RightSide, button);
 }
@@ -59,36 +60,38 @@ void FileTabs::addCloseButton(QWidget* page, QString const& title)
 LogPanel* FileTabs::addLog(QString const& title, QString const& path)
 {
     auto* panel = new LogPanel;
-    panel->setAccessibleName(title);
+    const QString name = path.isEmpty() ? title : QFileInfo(path).fileName();
+    panel->setAccessibleName(name);
     connect(panel, &LogPanel::StateChanged, this, &FileTabs::StateChanged);
     connect(panel, &LogPanel::Said, this, &FileTabs::Said);
     if (!path.isEmpty())
         panel->Open(path, false);
-    setTabToolTip(addTab(panel, title), path);
+    setTabToolTip(addTab(panel, title), PlainToolTip(path));
     if (!path.isEmpty())
-        addCloseButton(panel, title);
+        addCloseButton(panel, name);
     return panel;
 }
 
 SettingsEditor* FileTabs::addEditor(QString const& title, QString const& path)
 {
     auto* editor = new SettingsEditor;
-    editor->setAccessibleName(title);
+    const QString name = QFileInfo(path).fileName();
+    editor->setAccessibleName(name);
     editor->Open(path);
     connect(editor, &SettingsEditor::Said, this, &FileTabs::Said);
     connect(editor, &SettingsEditor::ModifiedChanged, this, [this, editor, title](bool modified) {
         setTabText(indexOf(editor), modified ? title + QLatin1String(" *") : title);
         emit StateChanged();
     });
-    setTabToolTip(addTab(editor, title), path);
-    addCloseButton(editor, title);
+    setTabToolTip(addTab(editor, title), PlainToolTip(path));
+    addCloseButton(editor, name);
     return editor;
 }
 
 bool FileTabs::IsSettingsFile(QString const& path)
 {
     QFile file(path);
-    if (!file.open(QIODevice::ReadOnly))
+    if (!QFileInfo(path).isFile() || !file.open(QIODevice::ReadOnly))
         return false;
     QByteArray start = file.read(1024);
     if (start.startsWith("\xEF\xBB\xBF"))

@@ -53,7 +53,7 @@ private:
     SettingsEditor* addEditor(QString const& title, QString const& path);
     void closeTab(int position);
     int positionOf(QString const& path) const;
-    void addCloseButton(QWidget* page, QString const& title);
+    void addCloseButton(QWidget* page, QString const& name);
 
     LogPanel* m_ownLog;
 };

@@ -14,8 +14,9 @@
 #include "app/window/SystemReport.h"
 #include "app/window/log/LogPanel.h"
 #include "app/window/log/LogSettingsDialog.h"
-#include "app/window/log/NoticeBar.h"
 #include "app/window/settings/SettingsEditor.h"
+#include "app/window/widgets/NoticeBar.h"
+#include "app/window/widgets/PlainText.h"
 
 #include <QApplication>
 #include <QCloseEvent>
@@ -44,6 +45,7 @@ namespace {
 constexpr int HealthInterval = 2000; // milliseconds
 constexpr int MessageTime = 6000;    // milliseconds
 constexpr int MostDropped = 20;
+constexpr int LongestMessage = 1000; // characters
 
 QString Property(char const* name)
 {
@@ -134,10 +136,9 @@ void MainWindow::makeTabs()
 
 void MainWindow::makeStatusBar()
 {
-    m_health = new QLabel;
-    m_summary = new QLabel;
+    m_health = NewPlainLabel();
+    m_summary = NewPlainLabel();
     m_health->setAccessibleName(tr("State of the log"));
-    m_health->setTextFormat(Qt::PlainText);
     m_health->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
     m_health->setContentsMargins(6, 0, 0, 0);
     m_summary->setAccessibleName(tr("Lines shown"));
@@ -324,7 +325,8 @@ void MainWindow::checkLog()
     if (problem == m_health->text())
         return;
     m_health->setText(problem);
-    m_health->setToolTip(problem);
+    m_health->setToolTip(PlainToolTip(problem));
+    m_health->setAccessibleDescription(problem);
 }
 
 void MainWindow::updateState()
@@ -345,7 +347,7 @@ void MainWindow::updateState()
 
 void MainWindow::say(QString const& text)
 {
-    statusBar()->showMessage(text, MessageTime);
+    statusBar()->showMessage(Shortened(text, LongestMessage), MessageTime);
 }
 
 void MainWindow::chooseFile()
@@ -369,6 +371,10 @@ void MainWindow::OpenFile(QString const& path)
         say(tr("%1 is a folder").arg(full));
         return;
     }
+    if (!QFileInfo(full).isFile()) { // opening a pipe waits, and a device may have no end
+        say(tr("%1 is not a regular file").arg(full));
+        return;
+    }
     m_tabs->OpenFile(full);
     m_recent->Add(full);
 }
@@ -380,12 +386,14 @@ bool MainWindow::offerToForget(QString const& path)
         say(tr("There is no file %1").arg(path));
         return false;
     }
-    const QMessageBox::StandardButton answer = QMessageBox::question(
-        this, windowTitle(),
-        tr("There is no file %1 any more.\nRemove it from the list of recent files?").arg(path));
-    if (answer == QMessageBox::Yes)
-        m_recent->Remove(path);
-    return answer == QMessageBox::Yes;
+    PlainMessageBox box(
+        QMessageBox::Question, this,
+        tr("There is no file %1 any more.\nRemove it from the list of recent files?").arg(path),
+        QMessageBox::Yes | QMessageBox::No);
+    if (box.exec() != QMessageBox::Yes)
+        return false;
+    m_recent->Remove(path);
+    return true;
 }
 
 void MainWindow::openLogFolder()

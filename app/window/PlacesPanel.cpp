@@ -2,7 +2,9 @@
 // SPDX-License-Identifier: MIT
 
 #include "app/window/PlacesPanel.h"
+
 #include "app/runninglog/RunningLog.h"
+#include "app/window/widgets/PlainText.h"
 
 #include <QClipboard>
 #include <QCoreApplication>
@@ -33,7 +35,7 @@ QToolButton* MakeButton(QString const& text, QString const& name, QString const&
     button->setAutoRaise(true);
     button->setMaximumHeight(button->fontMetrics().height() + 8);
     button->setAccessibleName(name);
-    button->setToolTip(toolTip);
+    button->setToolTip(PlainToolTip(toolTip));
     return button;
 }
 
@@ -72,13 +74,14 @@ void PlacesPanel::addValue(QString const& caption, QString const& text, bool isP
     auto* value = new QLineEdit(text);
     value->setReadOnly(true);
     value->setAccessibleName(caption);
-    value->setToolTip(text);
+    value->setToolTip(PlainToolTip(text));
+    value->setAccessibleDescription(text);
     value->setCursorPosition(0);
     QPalette flat; // only this role is set, so the others go on following the window's
     flat.setBrush(QPalette::Base, Qt::transparent);
     value->setPalette(flat);
 
-    auto* label = new QLabel(caption);
+    QLabel* label = NewPlainLabel(caption);
     label->setBuddy(value);
 
     // As high as the buttons are going to be, so that nothing moves when they come.

@@ -4,6 +4,7 @@
 #include "app/window/RecentFiles.h"
 
 #include "app/AppUtils.h"
+#include "app/window/widgets/PlainText.h"
 
 #include <QAction>
 #include <QFileInfo>
@@ -15,12 +16,31 @@ namespace {
 
 constexpr QLatin1Char Separator('|');
 
-// The empty list reads as one empty entry, which would stay behind the files for good.
-QString WithoutEmptyEntries(QString const& list)
+constexpr int LongestName = 100; // characters shown in the menu
+
+// The empty list reads as one empty entry, which would stay behind the files for good. A path that
+// is too long is left out: shortened, it would name another file.
+QString UsableEntries(QString const& list)
 {
-    QStringList entries = list.split(Separator);
-    entries.removeAll(QString());
+    QStringList entries;
+    int start = 0;
+    while (start < list.size() && entries.size() < RecentFiles::MostFiles) {
+        int end = list.indexOf(Separator, start);
+        if (end < 0)
+            end = list.size();
+        if (end > start && end - start <= RecentFiles::LongestPath)
+            entries.append(list.mid(start, end - start));
+        start = end + 1;
+    }
     return entries.join(Separator);
+}
+
+// "&" would mark a key, and a tab would set off a shortcut.
+QString MenuText(QString const& path)
+{
+    QString name = Shortened(QFileInfo(path).fileName(), LongestName);
+    name.replace(QLatin1Char('\t'), QLatin1Char(' '));
+    return name.replace(QLatin1Char('&'), QLatin1String("&&"));
 }
 
 } // namespace
@@ -38,13 +58,13 @@ RecentFiles::RecentFiles(QMenu* menu, QObject* parent) : QObject(parent), m_menu
 
 void RecentFiles::SetList(QString const& list)
 {
-    m_list = WithoutEmptyEntries(list);
+    m_list = UsableEntries(list);
     fillMenu();
 }
 
 void RecentFiles::Add(QString const& path)
 {
-    if (path.contains(Separator))
+    if (path.contains(Separator) || path.size() > LongestPath)
         return;
     AppUtils::AddToMRUList(path, m_list, MostFiles);
     SetList(m_list);
@@ -74,16 +94,15 @@ void RecentFiles::fillMenu()
     const QList<QAction*> actions = m_menu->actions();
     for (QAction* action : actions) {
         const QString path = action->text();
-        QString name = QFileInfo(path).fileName();
-        name.replace(QLatin1Char('&'), QLatin1String("&&"));
+        const QString name = MenuText(path);
         action->setData(path);
-        action->setToolTip(path);
+        action->setToolTip(PlainToolTip(path));
         action->setStatusTip(path);
         action->setText(++number < 10 ? QStringLiteral("&%1 %2").arg(number).arg(name) : name);
     }
     m_menu->addSeparator();
     QAction* clear = m_menu->addAction(tr("&Clear"));
-    clear->setToolTip(tr("Forget all recently opened files"));
+    clear->setToolTip(PlainToolTip(tr("Forget all recently opened files")));
     connect(clear, &QAction::triggered, this, &RecentFiles::Clear);
 }
 

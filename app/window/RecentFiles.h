@@ -23,17 +23,22 @@ public:
     /// @param menu  filled anew whenever the list changes; not owned
     explicit RecentFiles(QMenu* menu, QObject* parent = nullptr);
 
-    /// Takes over a list as list() gave it. See AppUtils for its form.
+    /// Takes over a list as list() gave it. See AppUtils for its form. Of a list from elsewhere,
+    /// the first `MostFiles` entries are kept that are neither empty nor longer than `LongestPath`.
     void SetList(QString const& list);
     QString const& list() const { return m_list; }
 
-    /// Puts a file at the front. A path with "|" in it cannot be kept and is passed over.
+    /// Puts a file at the front. A path with "|" in it, or one longer than
+    /// `LongestPath`, cannot be kept and is passed over.
     void Add(QString const& path);
     void Remove(QString const& path);
     void Clear();
 
     /// The most files that are remembered.
     static constexpr int MostFiles = 10;
+
+    /// The longest path that is remembered, in characters.
+    static constexpr int LongestPath = 4096;
 
 signals:
     /// A file was chosen in the menu.

@@ -3,15 +3,17 @@
 
 #include "app/window/ReportDialog.h"
 
+#include "app/window/widgets/PlainText.h"
+
 #include <QClipboard>
 #include <QCoreApplication>
 #include <QDialogButtonBox>
 #include <QFileDialog>
+#include <QFileInfo>
 #include <QFontDatabase>
 #include <QGuiApplication>
 #include <QIcon>
 #include <QLabel>
-#include <QMessageBox>
 #include <QPlainTextEdit>
 #include <QPushButton>
 #include <QSaveFile>
@@ -32,11 +34,10 @@ ReportDialog::ReportDialog(QString const& title, QString const& heading, QString
     m_text->setAccessibleName(title);
     m_text->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
 
-    auto* icon = new QLabel;
+    QLabel* icon = NewPlainLabel();
     icon->setPixmap(QGuiApplication::windowIcon().pixmap(48));
     icon->setAccessibleName(tr("Icon of the program"));
-    auto* label = new QLabel(heading);
-    label->setTextFormat(Qt::PlainText);
+    QLabel* label = NewPlainLabel(heading);
     label->setWordWrap(true);
     label->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
     auto* top = new QHBoxLayout;
@@ -71,6 +72,8 @@ void ReportDialog::Copy()
 
 QString ReportDialog::SaveTo(QString const& path) const
 {
+    if (QFileInfo::exists(path) && !QFileInfo(path).isFile())
+        return tr("Not a regular file");
     QSaveFile file(path);
     if (!file.open(QIODevice::WriteOnly))
         return file.errorString();
@@ -90,7 +93,8 @@ void ReportDialog::chooseFile()
     if (error.isEmpty())
         accept();
     else
-        QMessageBox::critical(this, windowTitle(), tr("%1 was not saved.\n%2").arg(path, error));
+        PlainMessageBox(QMessageBox::Critical, this, tr("%1 was not saved.\n%2").arg(path, error))
+            .exec();
 }
 
 } // namespace Velocor

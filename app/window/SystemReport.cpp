@@ -7,8 +7,8 @@
 #include "app/logfile/LogIndex.h"
 #include "app/runninglog/LogPreferences.h"
 #include "app/runninglog/RunningLog.h"
-#include "app/window/log/FileSizeText.h"
 #include "app/window/log/RunningLogParser.h"
+#include "app/window/widgets/FileSizeText.h"
 #include "common/log/TorkLog.h"
 
 #include <QApplication>
@@ -27,8 +27,8 @@ namespace Velocor {
 
 namespace {
 
-// The most of the log that is looked at, in bytes.
-constexpr qint64 TailLimit = 16 << 20;
+// How much of the log is read at once, in bytes.
+constexpr int SliceSize = 1 << 20;
 
 QString Line(QString const& caption, QString const& text)
 {
@@ -81,8 +81,10 @@ QString Directory(QString const& caption, QString const& path)
 QString File(QString const& caption, QString const& path)
 {
     const QFileInfo info(path);
-    const QString size = info.isFile() ? FileSizeText(info.size()) : QObject::tr("not there");
-    return Line(caption, QStringLiteral("%1 (%2)").arg(path, size));
+    QString state = QObject::tr("not there");
+    if (info.exists())
+        state = info.isFile() ? FileSizeText(info.size()) : QObject::tr("not a regular file");
+    return Line(caption, QStringLiteral("%1 (%2)").arg(path, state));
 }
 
 QString Property(char const* name)
@@ -111,6 +113,30 @@ QString OlderFiles()
     for (QString const& file : files)
         size += QFileInfo(file).size();
     return QObject::tr("%1, %2 in all").arg(files.size()).arg(FileSizeText(size));
+}
+
+// The whole log, because its newest entries may be anywhere in the file.
+LogRows RowsOf(QFile& file)
+{
+    LogIndex index(RunningLogParser());
+    QByteArray slice(SliceSize, Qt::Uninitialized);
+    qint64 count = 0;
+    file.seek(index.Begin());
+    while ((count = file.read(slice.data(), slice.size())) > 0)
+        index.Feed(slice.constData(), static_cast<int>(count));
+    index.End();
+    return index.Rows(LogFilter());
+}
+
+// A line without its end; of a very long one, the start.
+QString LineAt(QFile& file, qint64 start)
+{
+    file.seek(start);
+    QByteArray line = file.read(LogIndex::LineLimit + 1);
+    const int end = line.indexOf('\n');
+    const bool isCut = end < 0 && line.size() > LogIndex::LineLimit;
+    line.truncate(end < 0 ? int(LogIndex::LineLimit) : end);
+    return QString::fromLatin1(line) + (isCut ? QString(QChar(0x2026)) : QString());
 }
 
 QString Memory()
@@ -159,21 +185,12 @@ QString SystemReport::LogTail(int lines)
     if (!QFileInfo(file).isFile() || !file.open(QIODevice::ReadOnly))
         return QString();
 
-    LogIndex index(RunningLogParser());
-    const QByteArray bytes = file.read(TailLimit);
-    index.Begin();
-    index.Feed(bytes.constData(), bytes.size());
-    index.End();
-
-    const LogRows rows = index.Rows(LogFilter());
+    const LogRows rows = RowsOf(file);
     QStringList tail;
     for (size_t row = rows.size(); row > 0 && tail.size() < lines; --row) {
         const qint64 start = rows.starts[row - 1];
-        if (start < 0)
-            continue;
-        const int end = bytes.indexOf('\n', static_cast<int>(start));
-        const QByteArray line = bytes.mid(static_cast<int>(start), end < 0 ? -1 : end - int(start));
-        tail.prepend(QString::fromLatin1(line));
+        if (start >= 0)
+            tail.prepend(LineAt(file, start));
     }
     return tail.isEmpty() ? QString() : tail.join(QLatin1Char('\n')) + QLatin1Char('\n');
 }

@@ -17,7 +17,9 @@ public:
     static QString Facts(QString const& settingsFile);
 
     /// The last lines of the current log, oldest first. Those of the newest run come last, whatever
-    /// stands behind them in the file.
+    /// stands behind them in the file. The whole file is read to find them.
+    ///
+    /// Of a line longer than LogIndex::LineLimit bytes comes the start, followed by an ellipsis.
     static QString LogTail(int lines);
 
     /// Both under headings.

@@ -132,6 +132,8 @@ QString WindowSettings::Save()
 {
     if (!m_mayWrite)
         return QString();
+    if (QFileInfo::exists(m_fileName) && !QFileInfo(m_fileName).isFile())
+        return QObject::tr("The settings file %1 is not a regular file").arg(m_fileName);
     QDir().mkpath(QFileInfo(m_fileName).path());
     m_file.m_lastError.clear();
     m_file.Save();

@@ -14,8 +14,8 @@
 #include "app/window/log/LogPanel.h"
 #include "app/window/log/LogSettingsDialog.h"
 #include "app/window/log/LogView.h"
-#include "app/window/log/NoticeBar.h"
 #include "app/window/settings/SettingsEditor.h"
+#include "app/window/widgets/NoticeBar.h"
 
 #include <QAbstractButton>
 #include <QCheckBox>

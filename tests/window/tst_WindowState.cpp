@@ -10,8 +10,8 @@
 #include "app/window/RecentFiles.h"
 #include "app/window/SystemReport.h"
 #include "app/window/WindowSettings.h"
-#include "app/window/log/FileSizeText.h"
-#include "app/window/log/SeverityIcons.h"
+#include "app/window/widgets/FileSizeText.h"
+#include "app/window/widgets/SeverityIcons.h"
 
 #include <QMenu>
 #include <QScreen>

@@ -4,7 +4,7 @@
 #include "app/window/log/LogDelegate.h"
 
 #include "app/window/log/LogModel.h"
-#include "app/window/log/SeverityIcons.h"
+#include "app/window/widgets/SeverityIcons.h"
 
 #include <QApplication>
 #include <QPainter>

@@ -4,7 +4,8 @@
 #include "app/window/log/LogFilterBar.h"
 
 #include "app/logfile/LogSeverities.h"
-#include "app/window/log/SeverityIcons.h"
+#include "app/window/widgets/PlainText.h"
+#include "app/window/widgets/SeverityIcons.h"
 
 #include <QCheckBox>
 #include <QEvent>
@@ -22,13 +23,13 @@ constexpr int TypingPause = 150; // milliseconds
 } // namespace
 
 LogFilterBar::LogFilterBar(QWidget* parent)
-    : QWidget(parent), m_text(new QLineEdit), m_error(new QLabel)
+    : QWidget(parent), m_text(new QLineEdit), m_error(NewPlainLabel())
 {
     m_text->setPlaceholderText(tr("Filter"));
     m_text->setClearButtonEnabled(true);
     m_text->setAccessibleName(tr("Filter by text"));
     m_text->setAcceptDrops(false); // files dropped here are for the window
-    m_text->setToolTip(tr("Show only lines that contain this text (Ctrl+F)"));
+    m_text->setToolTip(PlainToolTip(tr("Show only lines that contain this text (Ctrl+F)")));
     m_error->setAccessibleName(tr("Error in the filter"));
     m_error->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
     m_error->setWordWrap(true);
@@ -66,7 +67,7 @@ QCheckBox* LogFilterBar::makeOption(QString const& text, QString const& name,
 {
     auto* option = new QCheckBox(text);
     option->setAccessibleName(name);
-    option->setToolTip(name + QLatin1String(": ") + toolTip);
+    option->setToolTip(PlainToolTip(name + QLatin1String(": ") + toolTip));
     connect(option, &QCheckBox::toggled, this, &LogFilterBar::apply);
     return option;
 }
@@ -82,7 +83,7 @@ void LogFilterBar::addSeverities()
         button->setText(name);
         button->setAccessibleName(tr("Show %1").arg(name));
         button->setToolTip(
-            tr("Show or hide entries of severity %1 (Ctrl+%2)").arg(name).arg(i + 1));
+            PlainToolTip(tr("Show or hide entries of severity %1 (Ctrl+%2)").arg(name).arg(i + 1)));
         button->setShortcut(QKeySequence(Qt::CTRL | (Qt::Key_1 + i)));
         button->setToolButtonStyle(Qt::ToolButtonIconOnly);
         connect(button, &QToolButton::toggled, this, &LogFilterBar::apply);

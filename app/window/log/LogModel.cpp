@@ -5,8 +5,10 @@
 
 #include "app/logfile/LogScanner.h"
 #include "app/logfile/LogSeverities.h"
-#include "app/window/log/SeverityIcons.h"
+#include "app/window/widgets/PlainText.h"
+#include "app/window/widgets/SeverityIcons.h"
 
+#include <QFileInfo>
 #include <QGuiApplication>
 #include <QPalette>
 
@@ -193,7 +195,8 @@ QString LogModel::LineText(int row, int limit) const
         return QString();
     if (!m_file.isOpen()) {
         m_file.setFileName(m_path);
-        if (!m_file.open(QIODevice::ReadOnly | QIODevice::Unbuffered))
+        if (!QFileInfo(m_path).isFile() ||
+            !m_file.open(QIODevice::ReadOnly | QIODevice::Unbuffered))
             return QString();
     }
     if (!m_file.seek(m_state.rows->starts[static_cast<size_t>(row)]))
@@ -262,8 +265,7 @@ QString LogModel::toolTip(int row, int column) const
         return tr("What is left of an entry that a later run wrote over");
     if (column != MessageColumn)
         return QString();
-    // As rich text it is wrapped; a plain one would be as wide as the message is long.
-    return QLatin1String("<p>") + cellText(row, column).toHtmlEscaped() + QLatin1String("</p>");
+    return cellText(row, column);
 }
 
 int LogModel::rowCount(QModelIndex const& parent) const
@@ -291,7 +293,7 @@ QVariant LogModel::data(QModelIndex const& index, int role) const
             return SeverityIcons::Icon(entry(row).severity, QGuiApplication::palette());
         return QVariant();
     case Qt::ToolTipRole:
-        return toolTip(row, index.column());
+        return PlainToolTip(toolTip(row, index.column()));
     case Qt::TextAlignmentRole:
         return index.column() == ElapsedColumn ? int(Qt::AlignRight | Qt::AlignVCenter)
                                                : int(Qt::AlignLeft | Qt::AlignVCenter);

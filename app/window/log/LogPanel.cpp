@@ -5,11 +5,12 @@
 
 #include "app/logfile/LogFileList.h"
 #include "app/logfile/LogIndex.h"
-#include "app/window/log/FileSizeText.h"
 #include "app/window/log/LogFilterBar.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogView.h"
 #include "app/window/log/RunningLogParser.h"
+#include "app/window/widgets/FileSizeText.h"
+#include "app/window/widgets/PlainText.h"
 
 #include <QCheckBox>
 #include <QComboBox>
@@ -70,12 +71,13 @@ void LogPanel::makeControls()
     };
     m_files = files;
     m_files->setAccessibleName(tr("Log file"));
-    m_files->setToolTip(tr("The current log file and the older ones beside it"));
+    m_files->setToolTip(PlainToolTip(tr("The current log file and the older ones beside it")));
     m_files->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon);
     m_files->setMinimumContentsLength(16);
 
-    m_pause->setToolTip(tr("Leave the view as it is while the log goes on (Ctrl+Shift+P)"));
-    m_follow->setToolTip(tr("Keep the newest entry in view (Ctrl+Shift+N)"));
+    m_pause->setToolTip(
+        PlainToolTip(tr("Leave the view as it is while the log goes on (Ctrl+Shift+P)")));
+    m_follow->setToolTip(PlainToolTip(tr("Keep the newest entry in view (Ctrl+Shift+N)")));
     m_follow->setChecked(true);
 
     m_line = new QPlainTextEdit;
@@ -88,7 +90,7 @@ void LogPanel::makeControls()
 
 void LogPanel::makeLayout()
 {
-    auto* label = new QLabel(tr("&File:"));
+    QLabel* label = NewPlainLabel(tr("&File:"));
     label->setBuddy(m_files);
     auto* top = new QHBoxLayout;
     top->setSpacing(8);
@@ -154,7 +156,8 @@ void LogPanel::Open(QString const& path, bool isCurrent)
 
 void LogPanel::showFile(QString const& path)
 {
-    m_files->setToolTip(path);
+    m_files->setToolTip(PlainToolTip(path));
+    m_files->setAccessibleDescription(path);
     m_model->Open(path, RunningLogParser(), path == m_currentPath);
     updatePlaceholder();
 }
@@ -168,7 +171,7 @@ void LogPanel::fillFileList()
         const QFileInfo info(file);
         const QString size = info.exists() ? FileSizeText(info.size()) : tr("not there");
         m_files->addItem(tr("%1 (%2)").arg(info.fileName(), size), file);
-        m_files->setItemData(m_files->count() - 1, file, Qt::ToolTipRole);
+        m_files->setItemData(m_files->count() - 1, PlainToolTip(file), Qt::ToolTipRole);
     }
     m_files->setCurrentIndex(m_files->findData(path()));
 }

@@ -4,6 +4,7 @@
 #include "app/window/log/LogSettingsDialog.h"
 
 #include "app/logfile/LogSeverities.h"
+#include "app/window/widgets/PlainText.h"
 
 #include <QCheckBox>
 #include <QDateTime>
@@ -13,7 +14,6 @@
 #include <QGroupBox>
 #include <QLabel>
 #include <QLineEdit>
-#include <QMessageBox>
 #include <QPushButton>
 #include <QSpinBox>
 
@@ -24,7 +24,7 @@ LogSettingsDialog::LogSettingsDialog(QWidget* parent)
       m_elapsed(new QCheckBox(tr("&Log the time since the entry before"))),
       m_echo(new QCheckBox(tr("&Echo entries to the console"))), m_maxFiles(new QSpinBox),
       m_elapsedPrefix(new QLineEdit), m_dateFormat(new QLineEdit), m_filePrefix(new QLineEdit),
-      m_sample(new QLabel), m_problem(new QLabel),
+      m_sample(NewPlainLabel()), m_problem(NewPlainLabel()),
       m_buttons(new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel))
 {
     setWindowTitle(tr("Log Settings"));
@@ -48,9 +48,7 @@ void LogSettingsDialog::makeFields()
     m_sample->setAccessibleName(tr("Sample of an entry"));
     m_sample->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
     m_sample->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
-    m_sample->setTextFormat(Qt::PlainText);
     m_problem->setAccessibleName(tr("Problem with the settings"));
-    m_problem->setTextFormat(Qt::PlainText);
     m_problem->setWordWrap(true);
 
     auto* now = new QGroupBox(tr("At once"));
@@ -58,14 +56,14 @@ void LogSettingsDialog::makeFields()
     nowForm->addRow(m_enabled);
     nowForm->addRow(m_elapsed);
     nowForm->addRow(m_echo);
-    nowForm->addRow(tr("&Older files kept:"), m_maxFiles);
+    addRow(nowForm, tr("&Older files kept:"), m_maxFiles);
 
     auto* later = new QGroupBox(tr("From the next start"));
     auto* laterForm = new QFormLayout(later);
     addNextStartField(laterForm, tr("&Date format:"), m_dateFormat);
     addNextStartField(laterForm, tr("&Prefix of the elapsed time:"), m_elapsedPrefix);
     addNextStartField(laterForm, tr("&Name of the log files:"), m_filePrefix);
-    laterForm->addRow(tr("Sample:"), m_sample);
+    addRow(laterForm, tr("Sample:"), m_sample);
 
     auto* layout = new QVBoxLayout(this);
     layout->addWidget(now);
@@ -74,14 +72,21 @@ void LogSettingsDialog::makeFields()
     layout->addWidget(m_buttons);
 }
 
+void LogSettingsDialog::addRow(QFormLayout* form, QString const& caption, QWidget* field)
+{
+    QLabel* label = NewPlainLabel(caption);
+    label->setBuddy(field);
+    form->addRow(label, field);
+}
+
 void LogSettingsDialog::addNextStartField(QFormLayout* form, QString const& caption,
                                           QLineEdit* field)
 {
     field->setMinimumWidth(260);
     field->setAccessibleName(QString(caption).remove(QLatin1Char('&')).remove(QLatin1Char(':')));
     field->setAccessibleDescription(tr("From the next start"));
-    field->setToolTip(tr("From the next start"));
-    form->addRow(caption, field);
+    field->setToolTip(PlainToolTip(tr("From the next start")));
+    addRow(form, caption, field);
 }
 
 void LogSettingsDialog::fill(LogPreferences const& preferences)
@@ -138,7 +143,7 @@ void LogSettingsDialog::accept()
     if (error.isEmpty())
         QDialog::accept();
     else
-        QMessageBox::critical(this, windowTitle(), error);
+        PlainMessageBox(QMessageBox::Critical, this, error).exec();
 }
 
 } // namespace Velocor

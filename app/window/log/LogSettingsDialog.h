@@ -31,6 +31,7 @@ public:
 
 private:
     void makeFields();
+    static void addRow(QFormLayout* form, QString const& caption, QWidget* field);
     void addNextStartField(QFormLayout* form, QString const& caption, QLineEdit* field);
     void fill(LogPreferences const& preferences);
     void check();

@@ -5,7 +5,9 @@
 
 #include "app/settingsfile/SettingsFileReader.h"
 #include "app/settingsfile/SettingsFileWriter.h"
-#include "app/window/log/NoticeBar.h"
+#include "app/window/settings/ValueDialog.h"
+#include "app/window/widgets/NoticeBar.h"
+#include "app/window/widgets/PlainText.h"
 
 #include <QFile>
 #include <QFileInfo>
@@ -17,8 +19,12 @@
 #include <QPushButton>
 #include <QScopedValueRollback>
 #include <QStackedWidget>
+#include <QStyledItemDelegate>
 #include <QTextBlock>
+#include <QTimer>
 #include <QTreeWidget>
+
+#include <functional>
 
 namespace Velocor {
 
@@ -26,6 +32,52 @@ namespace {
 
 // The most of a broken file that is shown, in bytes.
 constexpr qint64 ShownLimit = 1 << 20;
+
+// The most characters of a name or value that a cell shows, and that are edited in it. Qt would
+// measure and lay out all of a text for each look at its cell.
+constexpr int LongestCell = 1000;
+constexpr int ShownOfLong = 200;
+
+// The most characters of each line in a box that asks.
+constexpr int LongestLoss = 300;
+
+// Holds the text of a cell that shows only its start.
+constexpr int FullTextRole = Qt::UserRole;
+
+bool IsLong(QTreeWidgetItem const* item, int column)
+{
+    return item->data(column, FullTextRole).isValid();
+}
+
+QString FullText(QTreeWidgetItem const* item, int column)
+{
+    return IsLong(item, column) ? item->data(column, FullTextRole).toString() : item->text(column);
+}
+
+void SetFullText(QTreeWidgetItem* item, int column, QString const& text)
+{
+    const bool isLong = text.size() > LongestCell;
+    item->setData(column, FullTextRole, isLong ? QVariant(text) : QVariant());
+    item->setText(column, isLong ? Shortened(text, ShownOfLong) : text);
+}
+
+// Keeps the shortened text of a cell from being edited as if it were all of it.
+class CellDelegate : public QStyledItemDelegate
+{
+public:
+    using QStyledItemDelegate::QStyledItemDelegate;
+
+    std::function<void()> editLong;
+
+    QWidget* createEditor(QWidget* parent, QStyleOptionViewItem const& option,
+                          QModelIndex const& index) const override
+    {
+        if (!index.data(FullTextRole).isValid())
+            return QStyledItemDelegate::createEditor(parent, option, index);
+        editLong();
+        return nullptr;
+    }
+};
 
 QString NameRole()
 {
@@ -57,7 +109,7 @@ QPushButton* SettingsEditor::makeButton(QString const& text, QString const& tool
 {
     auto* button = new QPushButton(text);
     button->setAutoDefault(false);
-    button->setToolTip(toolTip);
+    button->setToolTip(PlainToolTip(toolTip));
     button->setMinimumWidth(button->sizeHint().width() +
                             2 * button->fontMetrics().averageCharWidth());
     return button;
@@ -73,7 +125,13 @@ QWidget* SettingsEditor::makeTreePage()
                             QAbstractItemView::AnyKeyPressed);
     m_tree->setAlternatingRowColors(true);
     m_tree->setUniformRowHeights(true);
+    auto* delegate = new CellDelegate(m_tree);
+    delegate->editLong = [this] {
+        editLongValueSoon();
+    };
+    m_tree->setItemDelegate(delegate);
     connect(m_tree, &QTreeWidget::itemChanged, this, &SettingsEditor::checkNames);
+    connect(m_tree, &QTreeWidget::itemActivated, this, &SettingsEditor::editLongValueSoon);
 
     QPushButton* addSectionButton = makeButton(tr("Add &Section"), tr("Add an empty section"));
     m_addValue = makeButton(tr("Add &Key"), tr("Add a key to the chosen section"));
@@ -188,9 +246,9 @@ QTreeWidgetItem* SettingsEditor::addItem(QTreeWidgetItem* section, QString const
                                          QString const& value)
 {
     auto* item = section ? new QTreeWidgetItem(section) : new QTreeWidgetItem(m_tree);
-    item->setText(0, key);
-    item->setText(1, value);
-    item->setToolTip(0, NameRole());
+    SetFullText(item, 0, key);
+    SetFullText(item, 1, value);
+    item->setToolTip(0, PlainToolTip(NameRole()));
     item->setFlags(Qt::ItemIsEnabled | Qt::ItemIsSelectable | Qt::ItemIsEditable);
     if (!section) {
         QFont bold = m_tree->font();
@@ -205,7 +263,7 @@ QString SettingsEditor::freeName(QTreeWidgetItem* section, QString const& base) 
     QStringList taken;
     const int count = section ? section->childCount() : m_tree->topLevelItemCount();
     for (int i = 0; i < count; ++i)
-        taken.append(section ? section->child(i)->text(0) : m_tree->topLevelItem(i)->text(0));
+        taken.append(FullText(section ? section->child(i) : m_tree->topLevelItem(i), 0));
     QString name = base;
     for (int number = 2; taken.contains(name); ++number)
         name = base + QString::number(number);
@@ -255,16 +313,45 @@ void SettingsEditor::checkNames(QTreeWidgetItem* item)
         return;
     const QScopedValueRollback<bool> filling(m_filling, true);
     QTreeWidgetItem* section = item->parent();
-    QString name = item->text(0);
+    QString name = FullText(item, 0);
     name.remove(QLatin1Char(' '));
     if (!SettingsFileWriter::IsName(name)) {
-        emit Said(tr("\"%1\" is no name for a section or key: %2").arg(name, NameRole()));
+        emit Said(tr("\"%1\" is no name for a section or key: %2")
+                      .arg(Shortened(name, ShownOfLong), NameRole()));
         name = section ? QStringLiteral("key") : QStringLiteral("Section");
     }
-    item->setText(0, QString());
-    item->setText(0, freeName(section, name));
-    if (!section)
-        item->setText(1, QString());
+    SetFullText(item, 0, QString());
+    SetFullText(item, 0, freeName(section, name));
+    SetFullText(item, 1, section ? FullText(item, 1) : QString());
+    setModified(true);
+}
+
+// Later, because the tree is still busy with the key or click; and once, though a double click both
+// edits a cell and activates it.
+void SettingsEditor::editLongValueSoon()
+{
+    if (m_editingLongValue)
+        return;
+    m_editingLongValue = true;
+    QTimer::singleShot(0, this, [this] {
+        editLongValue();
+        m_editingLongValue = false;
+    });
+}
+
+void SettingsEditor::editLongValue()
+{
+    QTreeWidgetItem* item = m_tree->currentItem();
+    if (!item || !IsLong(item, 1))
+        return;
+    const QString name = tr("%1 / %2").arg(item->parent()->text(0), item->text(0));
+    ValueDialog dialog(name, FullText(item, 1), this);
+    if (dialog.exec() != QDialog::Accepted || !dialog.isModified())
+        return;
+    {
+        const QScopedValueRollback<bool> filling(m_filling, true);
+        SetFullText(item, 1, dialog.value());
+    }
     setModified(true);
 }
 
@@ -283,9 +370,9 @@ SettingsDocument SettingsEditor::document() const
     document.rootName = m_rootName;
     for (int i = 0; i < m_tree->topLevelItemCount(); ++i) {
         QTreeWidgetItem const* top = m_tree->topLevelItem(i);
-        SettingsDocument::Section section{top->text(0), {}};
+        SettingsDocument::Section section{FullText(top, 0), {}};
         for (int j = 0; j < top->childCount(); ++j)
-            section.items.append({top->child(j)->text(0), top->child(j)->text(1)});
+            section.items.append({FullText(top->child(j), 0), FullText(top->child(j), 1)});
         document.sections.append(section);
     }
     return document;
@@ -293,8 +380,7 @@ SettingsDocument SettingsEditor::document() const
 
 bool SettingsEditor::ask(QString const& text, QString const& details, QString const& goOn)
 {
-    QMessageBox box(QMessageBox::Warning, window()->windowTitle(), text, QMessageBox::Cancel, this);
-    box.setInformativeText(details);
+    PlainMessageBox box(QMessageBox::Warning, this, text, QMessageBox::Cancel, details);
     QPushButton* yes = box.addButton(goOn, QMessageBox::AcceptRole);
     box.setDefaultButton(QMessageBox::Cancel);
     box.exec();
@@ -312,6 +398,8 @@ bool SettingsEditor::mayLose()
     const int more = losses.size() - most + unworded;
     if (losses.size() > most)
         losses = losses.mid(0, most);
+    for (QString& loss : losses)
+        loss = Shortened(loss, LongestLoss);
     if (more > 0)
         losses.append(tr("and %1 more").arg(more));
     return ask(tr("Saving %1 would lose this:").arg(QFileInfo(m_path).fileName()),
@@ -348,8 +436,8 @@ bool SettingsEditor::Save()
 
     QString error;
     if (!SettingsFileWriter::Save(m_path, document(), &error)) {
-        QMessageBox::critical(this, window()->windowTitle(),
-                              tr("%1 was not saved.\n%2").arg(m_path, error));
+        PlainMessageBox(QMessageBox::Critical, this, tr("%1 was not saved.\n%2").arg(m_path, error))
+            .exec();
         return false;
     }
     m_read = QFileInfo(m_path).lastModified();
@@ -366,10 +454,11 @@ bool SettingsEditor::MayClose()
     m_pages->setFocus(); // ends the editing of a cell
     if (!m_modified)
         return true;
-    const QMessageBox::StandardButton answer = QMessageBox::question(
-        this, window()->windowTitle(),
-        tr("%1 has been changed. Save it?").arg(QFileInfo(m_path).fileName()),
-        QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel, QMessageBox::Save);
+    PlainMessageBox box(QMessageBox::Question, this,
+                        tr("%1 has been changed. Save it?").arg(QFileInfo(m_path).fileName()),
+                        QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel);
+    box.setDefaultButton(QMessageBox::Save);
+    const int answer = box.exec();
     if (answer == QMessageBox::Save)
         return Save();
     return answer == QMessageBox::Discard;

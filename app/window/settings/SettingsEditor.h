@@ -23,6 +23,9 @@ class NoticeBar;
 /// Before the first save a copy of the file is kept as ".bak". What the store would lose is told
 /// before saving. A file that does not parse is shown as text, with the place of the error, and
 /// cannot be saved.
+///
+/// A cell shows only the start of a long text, with its size. A long value is edited in a dialog of
+/// its own, and a long name not at all; both are saved in full.
 class SettingsEditor : public QWidget
 {
     Q_OBJECT
@@ -65,6 +68,8 @@ private:
     void remove();
     void setModified(bool modified);
     void checkNames(QTreeWidgetItem* item);
+    void editLongValueSoon();
+    void editLongValue();
     QTreeWidgetItem* addItem(QTreeWidgetItem* section, QString const& key, QString const& value);
     QString freeName(QTreeWidgetItem* section, QString const& base) const;
     bool mayLose();
@@ -80,6 +85,7 @@ private:
     bool m_modified = false;
     bool m_filling = false;
     bool m_hasBackup = false;
+    bool m_editingLongValue = false;
 
     NoticeBar* m_notice;
     QStackedWidget* m_pages;

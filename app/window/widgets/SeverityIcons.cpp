@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-#include "app/window/log/SeverityIcons.h"
+#include "app/window/widgets/SeverityIcons.h"
 
 #include <QHash>
 #include <QPainter>

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-#include "app/window/log/FileSizeText.h"
+#include "app/window/widgets/FileSizeText.h"
 
 #include <QLocale>
 #include <QObject>

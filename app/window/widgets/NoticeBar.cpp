@@ -1,9 +1,10 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-#include "app/window/log/NoticeBar.h"
+#include "app/window/widgets/NoticeBar.h"
 
-#include "app/window/log/SeverityIcons.h"
+#include "app/window/widgets/PlainText.h"
+#include "app/window/widgets/SeverityIcons.h"
 
 #include <QHBoxLayout>
 #include <QLabel>
@@ -11,12 +12,12 @@
 
 namespace Velocor {
 
-NoticeBar::NoticeBar(QWidget* parent) : QFrame(parent), m_icon(new QLabel), m_label(new QLabel)
+NoticeBar::NoticeBar(QWidget* parent)
+    : QFrame(parent), m_icon(NewPlainLabel()), m_label(NewPlainLabel())
 {
     setFrameShape(StyledPanel);
     setAutoFillBackground(true);
     setBackgroundRole(QPalette::Base);
-    m_label->setTextFormat(Qt::PlainText);
     m_label->setWordWrap(true);
     m_label->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
     m_label->setAccessibleName(tr("Notice"));

@@ -1,0 +1,155 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/settings/ValueDialog.h"
+
+#include "app/window/widgets/FileSizeText.h"
+#include "app/window/widgets/PlainText.h"
+
+#include <QDialogButtonBox>
+#include <QFontDatabase>
+#include <QIcon>
+#include <QKeyEvent>
+#include <QLabel>
+#include <QMimeData>
+#include <QPlainTextEdit>
+#include <QPushButton>
+#include <QTextDocument>
+#include <QVBoxLayout>
+
+namespace Velocor {
+
+namespace {
+
+constexpr int PieceLength = 1000;
+
+// The sign for a line break in front, others only for values that contain it.
+QChar FreeMark(QString const& value)
+{
+    for (ushort candidate : {0x2424, 0x21b5, 0x240a, 0x00b6}) {
+        if (!value.contains(QChar(candidate)))
+            return QChar(candidate);
+    }
+    ushort candidate = 0xe000; // for private use
+    while (value.contains(QChar(candidate)) && candidate < 0xf8ff)
+        ++candidate;
+    return QChar(candidate);
+}
+
+bool HasLongLine(QString const& value)
+{
+    int start = 0;
+    while (value.size() - start > ValueDialog::LongestLine) {
+        const int end = value.indexOf(QLatin1Char('\n'), start);
+        if (end < 0 || end - start > ValueDialog::LongestLine)
+            return true;
+        start = end + 1;
+    }
+    return false;
+}
+
+QString InPieces(QString const& value, QChar mark)
+{
+    QString text;
+    text.reserve(value.size() + value.size() / PieceLength + 1);
+    int inLine = 0;
+    for (QChar c : value) {
+        if (c == QLatin1Char('\n')) {
+            text += mark;
+            inLine = 0;
+        } else if (inLine >= PieceLength && !c.isLowSurrogate()) {
+            text += QLatin1Char('\n');
+            inLine = 0;
+        }
+        text += c;
+        if (c != QLatin1Char('\n'))
+            ++inLine;
+    }
+    return text;
+}
+
+// Where line breaks are marked, those that are typed or pasted are marked as well.
+class ValueEdit : public QPlainTextEdit
+{
+public:
+    explicit ValueEdit(QChar mark) : m_mark(mark) {}
+
+protected:
+    void keyPressEvent(QKeyEvent* event) override
+    {
+        const bool isBreak = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
+        if (isBreak && !m_mark.isNull())
+            insertPlainText(QString(m_mark) + QLatin1Char('\n'));
+        else
+            QPlainTextEdit::keyPressEvent(event);
+    }
+
+    void insertFromMimeData(QMimeData const* source) override
+    {
+        if (m_mark.isNull()) {
+            QPlainTextEdit::insertFromMimeData(source);
+            return;
+        }
+        QString text = source->text();
+        text.replace(QLatin1String("\r\n"), QLatin1String("\n"));
+        insertPlainText(InPieces(text, m_mark));
+    }
+
+private:
+    QChar m_mark;
+};
+
+} // namespace
+
+ValueDialog::ValueDialog(QString const& name, QString const& value, QWidget* parent)
+    : QDialog(parent), m_value(value), m_mark(HasLongLine(value) ? FreeMark(value) : QChar()),
+      m_text(new ValueEdit(m_mark))
+{
+    setWindowTitle(QObject::tr("Edit Value"));
+    QString heading = QStringLiteral("%1 (%2)").arg(name, FileSizeText(value.toUtf8().size()));
+    if (!m_mark.isNull())
+        heading +=
+            QLatin1Char('\n') +
+            QObject::tr("Long lines are shown in pieces; only %1 marks a line break.").arg(m_mark);
+    QLabel* label = NewPlainLabel(heading);
+    label->setWordWrap(true);
+    m_text->setLineWrapMode(QPlainTextEdit::NoWrap);
+    m_text->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
+    m_text->setTabChangesFocus(true);
+    m_text->setAccessibleName(QObject::tr("Value"));
+    m_text->setPlainText(m_mark.isNull() ? value : InPieces(value, m_mark));
+    m_text->document()->setModified(false);
+
+    auto* buttons = new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel);
+    connect(buttons, &QDialogButtonBox::accepted, this, &QDialog::accept);
+    connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
+    const QList<QAbstractButton*> all = buttons->buttons();
+    for (QAbstractButton* button : all)
+        button->setIcon(QIcon());
+
+    auto* layout = new QVBoxLayout(this);
+    layout->setSpacing(10);
+    layout->addWidget(label);
+    layout->addWidget(m_text, 1);
+    layout->addWidget(buttons);
+    resize(680, 480);
+}
+
+bool ValueDialog::isModified() const
+{
+    return m_text->document()->isModified();
+}
+
+// Not toPlainText(), which turns no-break spaces into spaces.
+QString ValueDialog::value() const
+{
+    if (!isModified())
+        return m_value;
+    QString text = m_text->document()->toRawText();
+    if (m_mark.isNull())
+        return text.replace(QChar(QChar::ParagraphSeparator), QLatin1Char('\n'));
+    text.remove(QChar(QChar::ParagraphSeparator));
+    return text.replace(m_mark, QLatin1Char('\n'));
+}
+
+} // namespace Velocor

@@ -1,0 +1,70 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/widgets/PlainText.h"
+
+#include "app/window/widgets/FileSizeText.h"
+
+#include <QLabel>
+#include <QTextDocument>
+
+namespace Velocor {
+
+namespace {
+
+// Qt shows a plain tool tip on one line, however long it is.
+constexpr int LongestLine = 120;
+
+} // namespace
+
+QString PlainToolTip(QString const& text)
+{
+    const QString shown = Shortened(text, LongestToolTip);
+    if (shown.size() <= LongestLine && !Qt::mightBeRichText(shown))
+        return shown;
+    // Without a tag around it, escaped text is not always taken for rich: "&amp;lt;" is not.
+    return QLatin1String("<p style=\"white-space:pre-wrap\">") + shown.toHtmlEscaped() +
+           QLatin1String("</p>");
+}
+
+QString Shortened(QString const& text, int limit)
+{
+    if (text.size() <= limit)
+        return text;
+    const int end = text.at(limit - 1).isHighSurrogate() ? limit - 1 : limit;
+    return text.left(end) + QChar(0x2026) +
+           QStringLiteral(" (%1)").arg(FileSizeText(text.toUtf8().size()));
+}
+
+QLabel* NewPlainLabel(QString const& text)
+{
+    auto* label = new QLabel;
+    label->setTextFormat(Qt::PlainText);
+    label->setText(text);
+    return label;
+}
+
+// The labels are made plain before they get a text from outside: a box makes the second label when
+// its text is set, and that one opens links by itself.
+PlainMessageBox::PlainMessageBox(Icon icon, QWidget* parent, QString const& text,
+                                 StandardButtons buttons, QString const& details)
+    : QMessageBox(icon, parent ? parent->window()->windowTitle() : QString(), QString(), buttons,
+                  parent)
+{
+    if (!details.isEmpty())
+        setInformativeText(QStringLiteral(" "));
+    MakePlain(this);
+    setText(text);
+    if (!details.isEmpty())
+        setInformativeText(details);
+}
+
+void PlainMessageBox::MakePlain(QMessageBox* box)
+{
+    box->setTextFormat(Qt::PlainText);
+    const QList<QLabel*> labels = box->findChildren<QLabel*>();
+    for (QLabel* label : labels)
+        label->setTextFormat(Qt::PlainText);
+}
+
+} // namespace Velocor

@@ -1,0 +1,705 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// Files that are none, and files that are far too large, opened in the window.
+
+#include "WindowTest.h"
+
+#include "app/logfile/LogIndex.h"
+#include "app/runninglog/InstanceList.h"
+#include "app/settingsfile/SettingsFileReader.h"
+#include "app/settingsfile/SettingsFileWriter.h"
+#include "app/window/FileTabs.h"
+#include "app/window/RecentFiles.h"
+#include "app/window/ReportDialog.h"
+#include "app/window/SystemReport.h"
+#include "app/window/WindowSettings.h"
+#include "app/window/log/LogModel.h"
+#include "app/window/log/LogPanel.h"
+#include "app/window/log/LogView.h"
+#include "app/window/settings/SettingsEditor.h"
+#include "app/window/settings/ValueDialog.h"
+#include "app/window/widgets/NoticeBar.h"
+
+#include <QClipboard>
+#include <QDropEvent>
+#include <QLabel>
+#include <QLineEdit>
+#include <QLoggingCategory>
+#include <QMenu>
+#include <QMessageBox>
+#include <QMimeData>
+#include <QPlainTextEdit>
+#include <QPushButton>
+#include <QStatusBar>
+#include <QTextBlock>
+#include <QTreeWidget>
+
+#include <atomic>
+#include <cerrno>
+#include <thread>
+
+#include <fcntl.h>
+#include <sys/socket.h>
+#include <sys/stat.h>
+#include <sys/un.h>
+#include <unistd.h>
+
+namespace {
+
+constexpr int Patience = 20000; // milliseconds
+constexpr int TenMegabytes = 10000000;
+
+// A named pipe that notes whether anybody has opened it, and lets go whoever did.
+class Pipe
+{
+public:
+    explicit Pipe(QString const& path) : m_path(QFile::encodeName(path))
+    {
+        QFile::remove(path);
+        if (mkfifo(m_path.constData(), 0600) != 0)
+            qFatal("no pipe");
+        m_writer = std::thread([this] { lookForOthers(); });
+    }
+
+    ~Pipe()
+    {
+        m_over = true;
+        m_writer.join();
+    }
+
+    Pipe(Pipe const&) = delete;
+    Pipe& operator=(Pipe const&) = delete;
+
+    bool wasOpened() const { return m_opened; }
+
+private:
+    // Readers wait for a writer and writers for a reader: each gets one here, in turns.
+    void lookForOthers()
+    {
+        while (!m_over) {
+            const int out = open(m_path.constData(), O_WRONLY | O_NONBLOCK);
+            if (out >= 0) {
+                m_opened = true;
+                close(out);
+            }
+            const int in = open(m_path.constData(), O_RDONLY | O_NONBLOCK);
+            usleep(1000);
+            char byte = 0;
+            const ssize_t count = in >= 0 ? read(in, &byte, 1) : 0;
+            if (count > 0 || (count < 0 && errno == EAGAIN))
+                m_opened = true;
+            if (in >= 0)
+                close(in);
+            usleep(1000);
+        }
+    }
+
+    QByteArray m_path;
+    std::atomic<bool> m_over{false};
+    std::atomic<bool> m_opened{false};
+    std::thread m_writer;
+};
+
+bool MakeSocket(QString const& path)
+{
+    sockaddr_un address = {};
+    address.sun_family = AF_UNIX;
+    qstrncpy(address.sun_path, QFile::encodeName(path).constData(), sizeof(address.sun_path));
+    const int handle = socket(AF_UNIX, SOCK_STREAM, 0);
+    const bool bound = bind(handle, reinterpret_cast<sockaddr*>(&address), sizeof(address)) == 0;
+    close(handle);
+    return bound;
+}
+
+void Drop(MainWindow& window, QString const& file)
+{
+    QMimeData files;
+    files.setUrls({QUrl::fromLocalFile(file)});
+    QDragEnterEvent enter(QPoint(50, 50), Qt::CopyAction, &files, Qt::LeftButton, Qt::NoModifier);
+    QCoreApplication::sendEvent(&window, &enter);
+    QDropEvent drop(QPoint(50, 50), Qt::CopyAction, &files, Qt::LeftButton, Qt::NoModifier);
+    QCoreApplication::sendEvent(&window, &drop);
+}
+
+QAction* Action(MainWindow& window, QString const& text)
+{
+    const QList<QAction*> all = window.findChildren<QAction*>();
+    for (QAction* action : all) {
+        if (QString(action->text()).remove('&') == text)
+            return action;
+    }
+    return nullptr;
+}
+
+QByteArray WithValue(QByteArray const& value, QByteArray const& other = "no")
+{
+    return "<R>\n<S>\n<long>" + value + "</long>\n<other>" + other + "</other>\n</S>\n</R>\n";
+}
+
+// Ten megabytes in which no piece can be taken for another.
+QByteArray LongValue()
+{
+    QByteArray value;
+    value.reserve(TenMegabytes + 20);
+    for (int i = 0; value.size() < TenMegabytes; ++i)
+        value += QByteArray::number(i) + ' ';
+    value.truncate(TenMegabytes - 1);
+    return value + '.';
+}
+
+// The longest text that the tree has to measure.
+int LongestCell(QTreeWidget const* tree)
+{
+    int longest = 0;
+    QTreeWidgetItemIterator item(const_cast<QTreeWidget*>(tree));
+    for (; *item; ++item)
+        longest = qMax(longest, qMax((*item)->text(0).size(), (*item)->text(1).size()));
+    return longest;
+}
+
+} // namespace
+
+class tst_HostileFiles : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void initTestCase();
+
+    void isToldAndNotOpened_data();
+    void isToldAndNotOpened();
+    void becomesAPipe();
+    void readersAndWriters();
+    void windowSettings_data();
+    void windowSettings();
+    void windowSettingsAtTheEnd();
+    void logIsAPipe();
+    void lockIsAPipe();
+
+    void recentFilesAreCapped_data();
+    void recentFilesAreCapped();
+    void longNamesInTheMenu();
+    void recentFilesInTheWindow();
+
+    void longValueIsShownShortened();
+    void longValueSurvivesOtherEdits();
+    void longValueIsEdited_data();
+    void longValueIsEdited();
+    void longValueIsTypedOver();
+    void longValueIsPasted();
+    void longName();
+    void longLoss();
+    void valueDialog_data();
+    void valueDialog();
+    void valueDialogPastes();
+
+    void reportEndsWithTheLastLine();
+    void reportOfALongNewestRun();
+    void reportOfLongLines();
+};
+
+void tst_HostileFiles::initTestCase()
+{
+    QLoggingCategory::setFilterRules("qt.qpa.*=false");
+}
+
+void tst_HostileFiles::isToldAndNotOpened_data()
+{
+    QTest::addColumn<QString>("kind");
+    for (char const* kind : {"pipe", "link to a pipe", "socket", "endless device", "empty device"})
+        QTest::newRow(kind) << kind;
+}
+
+void tst_HostileFiles::isToldAndNotOpened()
+{
+    QFETCH(QString, kind);
+    const WindowTest test;
+    QString file = test.folder() + "file.cfg";
+    const std::unique_ptr<Pipe> pipe(kind.contains("pipe") ? new Pipe(test.folder() + "pipe")
+                                                           : nullptr);
+    if (kind == "pipe")
+        file = test.folder() + "pipe";
+    else if (kind == "link to a pipe")
+        QVERIFY(QFile::link(test.folder() + "pipe", file));
+    else if (kind == "socket")
+        QVERIFY(MakeSocket(file));
+    else
+        file = kind == "endless device" ? "/dev/zero" : "/dev/null";
+
+    TestFiles::write(test.settingsFile(), "<VelocorSettings><MainWindow><recentFiles>" +
+                                              QFile::encodeName(file) +
+                                              "</recentFiles></MainWindow></VelocorSettings>");
+    const auto window = WindowTest::show();
+    const QString told = file + " is not a regular file";
+    const std::function<void()> ways[] = {
+        [&] { window->OpenFile(file); },
+        [&] { Drop(*window, file); },
+        [&] { Action(*window, "Open Recent")->menu()->actions().first()->trigger(); },
+    };
+    for (auto const& open : ways) {
+        window->statusBar()->clearMessage();
+        open();
+        QCOMPARE(window->statusBar()->currentMessage(), told);
+        QCOMPARE(window->findChild<FileTabs*>()->count(), 1);
+    }
+    QVERIFY(!FileTabs::IsSettingsFile(file));
+    if (pipe)
+        QVERIFY(!pipe->wasOpened());
+}
+
+// A file in a tab that is replaced by a pipe.
+void tst_HostileFiles::becomesAPipe()
+{
+    const WindowTest test;
+    const QString log = test.folder() + "other.log";
+    QVERIFY(TestFiles::write(log, DemoLog::run(5, QTime(9, 0), "x")));
+    LogPanel panel;
+    panel.resize(600, 400);
+    panel.show();
+    panel.Open(log, false);
+    QTRY_COMPARE_WITH_TIMEOUT(panel.model()->rowCount(), 5, Patience);
+    const Pipe pipe(log);
+    QTRY_COMPARE_WITH_TIMEOUT(panel.model()->rowCount(), 0, Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(panel.view()->accessibleDescription().endsWith("\nNot a regular file"),
+                             Patience);
+    QCOMPARE(panel.model()->LineText(0, 100), QString());
+    QVERIFY(!pipe.wasOpened());
+}
+
+void tst_HostileFiles::readersAndWriters()
+{
+    const WindowTest test;
+    const QString file = test.folder() + "pipe.cfg";
+    const Pipe pipe(file);
+    const SettingsDocument document = SettingsFileReader::Read(file);
+    QVERIFY(!document.isReadable && !document.isParsed);
+    QCOMPARE(document.error, QString("Not a regular file"));
+
+    QString error;
+    QVERIFY(!SettingsFileWriter::Save(file, SettingsDocument(), &error));
+    QCOMPARE(error, QString("Not a regular file"));
+    TestFiles::write(file + ".bak", "kept");
+    QVERIFY(!SettingsFileWriter::KeepBackup(file, &error));
+    QCOMPARE(error, QString("Not a regular file"));
+    QCOMPARE(TestFiles::read(file + ".bak"), QByteArray("kept"));
+    const ReportDialog dialog("T", "H", "text", true);
+    QCOMPARE(dialog.SaveTo(file), QString("Not a regular file"));
+    QVERIFY(!QFileInfo(file).isFile());
+    QVERIFY(!pipe.wasOpened());
+    QVERIFY(SystemReport::Facts(file).contains(file + " (not a regular file)"));
+}
+
+void tst_HostileFiles::windowSettings_data()
+{
+    QTest::addColumn<bool>("isLink");
+    QTest::newRow("pipe") << false;
+    QTest::newRow("link to a pipe") << true;
+}
+
+void tst_HostileFiles::windowSettings()
+{
+    QFETCH(bool, isLink);
+    const WindowTest test;
+    const QString file = isLink ? test.folder() + "pipe" : test.settingsFile();
+    const Pipe pipe(file);
+    if (isLink)
+        QVERIFY(QFile::link(file, test.settingsFile()));
+    {
+        const auto window = WindowTest::show();
+        QTRY_VERIFY(window->findChild<NoticeBar*>());
+        const QString told = window->findChild<NoticeBar*>()->text();
+        QVERIFY2(told.contains(test.settingsFile() + " cannot be read (Not a regular file)"),
+                 qPrintable(told));
+        window->close();
+    }
+    QVERIFY(!pipe.wasOpened());
+    QVERIFY(QFileInfo::exists(file) && !QFileInfo(file).isFile());
+}
+
+void tst_HostileFiles::windowSettingsAtTheEnd()
+{
+    const WindowTest test;
+    const auto window = WindowTest::show();
+    QTRY_VERIFY(window->findChild<FileTabs*>()); // before that, nothing is saved
+    const Pipe pipe(test.settingsFile());
+    window->close();
+    QVERIFY(!pipe.wasOpened());
+    WindowSettings settings(test.folder() + "data/");
+    QCOMPARE(settings.Save(),
+             "The settings file " + test.settingsFile() + " is not a regular file");
+}
+
+void tst_HostileFiles::logIsAPipe()
+{
+    const WindowTest test;
+    const Pipe pipe(test.logFile());
+    QCOMPARE(SystemReport::LogTail(10), QString());
+    LogPanel panel;
+    panel.Open(test.logFile(), true);
+    QTRY_VERIFY_WITH_TIMEOUT(panel.view()->accessibleDescription().endsWith("\nNot a regular file"),
+                             Patience);
+    QVERIFY(!pipe.wasOpened());
+}
+
+void tst_HostileFiles::lockIsAPipe()
+{
+    const WindowTest test;
+    const InstanceList list(test.folder() + "running");
+    const Pipe pipe(test.folder() + "pipe");
+    QVERIFY(QFile::link(test.folder() + "pipe", test.folder() + "running/1.lock"));
+    QCOMPARE(list.Others(), QList<qint64>());
+    QVERIFY(!pipe.wasOpened());
+}
+
+void tst_HostileFiles::recentFilesAreCapped_data()
+{
+    QTest::addColumn<QString>("list");
+    QTest::addColumn<QString>("kept");
+    const QString most(RecentFiles::LongestPath, 'x');
+    QTest::newRow("nothing") << ""
+                             << "";
+    QTest::newRow("only separators") << QString(1700000, '|') << "";
+    QTest::newRow("many") << QString("/a|").repeated(600000)
+                          << "/a" + QString("|/a").repeated(RecentFiles::MostFiles - 1);
+    QTest::newRow("one long") << QString(1700000, 'x') << "";
+    QTest::newRow("as long as may be") << most << most;
+    QTest::newRow("too long by one") << most + "x|/b"
+                                     << "/b";
+    QTest::newRow("behind a long one") << "/a|" + QString(1700000, 'x') + "|/b"
+                                       << "/a|/b";
+}
+
+void tst_HostileFiles::recentFilesAreCapped()
+{
+    QFETCH(QString, list);
+    QMenu menu;
+    RecentFiles recent(&menu);
+    recent.SetList(list);
+    QTEST(recent.list(), "kept");
+    recent.SetList("/a");
+    recent.Add('/' + QString(RecentFiles::LongestPath, 'x'));
+    QCOMPARE(recent.list(), QString("/a"));
+}
+
+void tst_HostileFiles::longNamesInTheMenu()
+{
+    QMenu menu;
+    RecentFiles recent(&menu);
+    recent.SetList('/' + QString(3000, 'x') + "|/a\tb&c");
+    QVERIFY2(menu.actions().at(0)->text().size() < 130, qPrintable(menu.actions().at(0)->text()));
+    QCOMPARE(menu.actions().at(1)->text(), QString("&2 a b&&c"));
+}
+
+void tst_HostileFiles::recentFilesInTheWindow()
+{
+    const WindowTest test;
+    TestFiles::write(test.settingsFile(), "<VelocorSettings><MainWindow><recentFiles>" +
+                                              QByteArray("/some/file.log|").repeated(113000) +
+                                              "</recentFiles></MainWindow></VelocorSettings>");
+    {
+        const auto window = WindowTest::show();
+        QTRY_VERIFY(Action(*window, "Open Recent"));
+        QCOMPARE(Action(*window, "Open Recent")->menu()->actions().size(),
+                 RecentFiles::MostFiles + 2);
+        window->close();
+    }
+    QVERIFY(QFileInfo(test.settingsFile()).size() < 2000);
+}
+
+void tst_HostileFiles::longValueIsShownShortened()
+{
+    const WindowTest test;
+    const QByteArray value = LongValue();
+    const QString file = test.folder() + "some.cfg";
+    QVERIFY(TestFiles::write(file, WithValue(value)));
+    SettingsEditor editor;
+    editor.Open(file);
+    editor.resize(700, 500);
+    editor.show();
+    auto* tree = editor.findChild<QTreeWidget*>();
+    const QString shown = tree->topLevelItem(0)->child(0)->text(1);
+    QVERIFY2(shown.startsWith("0 1 2 3 ") && shown.endsWith(QChar(0x2026) + QString(" (10 MB)")),
+             qPrintable(shown.left(300)));
+    QVERIFY(LongestCell(tree) <= 1000);
+    QCOMPARE(editor.document().Value("S", "long", ""), QString::fromLatin1(value));
+    QVERIFY(!editor.isModified());
+}
+
+void tst_HostileFiles::longValueSurvivesOtherEdits()
+{
+    const WindowTest test;
+    const QByteArray value = LongValue();
+    const QString file = test.folder() + "some.cfg";
+    QVERIFY(TestFiles::write(file, WithValue(value)));
+    const auto window = WindowTest::show();
+    window->OpenFile(file);
+    auto* editor = window->findChild<FileTabs*>()->currentEditor();
+    auto* tree = editor->findChild<QTreeWidget*>();
+
+    // The long value is looked at.
+    tree->setFocus();
+    tree->setCurrentItem(tree->topLevelItem(0)->child(0), 1);
+    QString looked;
+    WindowTest::whenShown<QDialog>([&](QDialog* dialog) {
+        looked = dialog->findChild<QLabel*>()->text();
+        QTest::keyClick(dialog, Qt::Key_Escape);
+    });
+    QTest::keyClick(tree, Qt::Key_F2);
+    QTRY_VERIFY_WITH_TIMEOUT(!looked.isEmpty(), Patience);
+    QVERIFY2(looked.startsWith("S / long (10 MB)\n"), qPrintable(looked));
+    QTRY_VERIFY(!QApplication::activeModalWidget());
+    QVERIFY(!editor->isModified());
+
+    // Its key gets another name, and another value is changed.
+    tree->setCurrentItem(tree->topLevelItem(0)->child(0), 0);
+    QTest::keyClick(tree, Qt::Key_F2);
+    QTRY_VERIFY(tree->findChild<QLineEdit*>());
+    QTest::keyClicks(tree->findChild<QLineEdit*>(), "renamed");
+    QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
+    QTRY_VERIFY(!tree->findChild<QLineEdit*>());
+    tree->setCurrentItem(tree->topLevelItem(0)->child(1), 1);
+    QTest::keyClick(tree, Qt::Key_F2);
+    QTRY_VERIFY(tree->findChild<QLineEdit*>());
+    QTest::keyClicks(tree->findChild<QLineEdit*>(), "yes");
+    QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
+    QTRY_VERIFY(!tree->findChild<QLineEdit*>());
+    window->activateWindow();
+    QVERIFY(QTest::qWaitForWindowActive(window.get()));
+    QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
+    QVERIFY(!editor->isModified());
+    const QByteArray expected = WithValue(value, "yes").replace("long>", "renamed>");
+    QVERIFY(TestFiles::read(file) == expected);
+    QVERIFY(LongestCell(tree) <= 1000);
+}
+
+void tst_HostileFiles::longValueIsEdited_data()
+{
+    QTest::addColumn<QString>("way");
+    for (char const* way : {"F2", "Enter", "double click", "letter"})
+        QTest::newRow(way) << way;
+}
+
+void tst_HostileFiles::longValueIsEdited()
+{
+    QFETCH(QString, way);
+    const WindowTest test;
+    const QByteArray value = LongValue();
+    const QString file = test.folder() + "some.cfg";
+    QVERIFY(TestFiles::write(file, WithValue(value)));
+    const auto window = WindowTest::show();
+    window->OpenFile(file);
+    auto* editor = window->findChild<FileTabs*>()->currentEditor();
+    auto* tree = editor->findChild<QTreeWidget*>();
+    tree->setFocus();
+    QTreeWidgetItem* item = tree->topLevelItem(0)->child(0);
+    tree->setCurrentItem(item, 1);
+
+    int shown = 0;
+    WindowTest::whenShown<QDialog>([&](QDialog* dialog) {
+        ++shown;
+        auto* text = dialog->findChild<QPlainTextEdit*>();
+        text->setFocus();
+        QTest::keyClick(text, Qt::Key_End, Qt::ControlModifier);
+        QTest::keyClicks(text, "end");
+        QTest::keyClick(dialog, Qt::Key_Tab); // out of the text, to OK
+        QTest::keyClick(dialog->focusWidget(), Qt::Key_Return);
+    });
+    if (way == "F2")
+        QTest::keyClick(tree, Qt::Key_F2);
+    else if (way == "Enter")
+        QTest::keyClick(tree, Qt::Key_Return);
+    else if (way == "letter")
+        QTest::keyClick(tree, Qt::Key_X);
+    else {
+        const QPoint place = tree->visualItemRect(item).center();
+        const QPoint cell(tree->columnViewportPosition(1) + 20, place.y());
+        QTest::mouseClick(tree->viewport(), Qt::LeftButton, Qt::NoModifier, cell);
+        QTest::mouseDClick(tree->viewport(), Qt::LeftButton, Qt::NoModifier, cell);
+    }
+    QTRY_COMPARE_WITH_TIMEOUT(shown, 1, Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(editor->isModified(), Patience);
+    QTest::qWait(50);
+    QVERIFY(!QApplication::activeModalWidget());
+    QVERIFY(LongestCell(tree) <= 1000);
+    window->activateWindow();
+    QVERIFY(QTest::qWaitForWindowActive(window.get()));
+    QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
+    QVERIFY(TestFiles::read(file) == WithValue(value + "end"));
+}
+
+// A long value can become short; its cell is then edited as any other.
+void tst_HostileFiles::longValueIsTypedOver()
+{
+    const WindowTest test;
+    const QString file = test.folder() + "some.cfg";
+    QVERIFY(TestFiles::write(file, WithValue(LongValue())));
+    SettingsEditor editor;
+    editor.Open(file);
+    editor.resize(700, 500);
+    editor.show();
+    auto* tree = editor.findChild<QTreeWidget*>();
+    tree->setFocus();
+    tree->setCurrentItem(tree->topLevelItem(0)->child(0), 1);
+    WindowTest::whenShown<QDialog>([&](QDialog* dialog) {
+        auto* text = dialog->findChild<QPlainTextEdit*>();
+        text->setFocus();
+        QTest::keyClick(text, Qt::Key_A, Qt::ControlModifier);
+        QTest::keyClicks(text, "short");
+        QTest::keyClick(dialog, Qt::Key_Tab);
+        QTest::keyClick(dialog->focusWidget(), Qt::Key_Return);
+    });
+    QTest::keyClick(tree, Qt::Key_F2);
+    QTRY_COMPARE_WITH_TIMEOUT(tree->topLevelItem(0)->child(0)->text(1), QString("short"), Patience);
+    QTest::keyClick(tree, Qt::Key_F2);
+    QTRY_VERIFY(tree->findChild<QLineEdit*>());
+    QTest::keyClicks(tree->findChild<QLineEdit*>(), "shorter");
+    QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
+    QTRY_COMPARE(editor.document().Value("S", "long", ""), QString("shorter"));
+    QVERIFY(editor.Save());
+    QCOMPARE(TestFiles::read(file), WithValue("shorter"));
+}
+
+void tst_HostileFiles::longValueIsPasted()
+{
+    const WindowTest test;
+    const QString file = test.folder() + "some.cfg";
+    QVERIFY(TestFiles::write(file, WithValue("v")));
+    SettingsEditor editor;
+    editor.Open(file);
+    auto* tree = editor.findChild<QTreeWidget*>();
+    const QString pasted = QString("p").repeated(5000);
+    tree->topLevelItem(0)->child(0)->setText(1, pasted); // as a cell's editor does
+    QVERIFY(LongestCell(tree) <= 1000);
+    QCOMPARE(editor.document().Value("S", "long", ""), pasted);
+    QVERIFY(editor.Save());
+    QCOMPARE(TestFiles::read(file), WithValue(pasted.toLatin1()));
+}
+
+void tst_HostileFiles::longName()
+{
+    const WindowTest test;
+    const QString file = test.folder() + "some.cfg";
+    const QByteArray name(1000000, 'n');
+    const QByteArray content =
+        "<R>\n<" + name + ">\n<" + name + ">v</" + name + ">\n</" + name + ">\n</R>\n";
+    QVERIFY(TestFiles::write(file, content));
+    SettingsEditor editor;
+    editor.Open(file);
+    editor.resize(700, 500);
+    editor.show();
+    auto* tree = editor.findChild<QTreeWidget*>();
+    QVERIFY(LongestCell(tree) <= 1000);
+    tree->setCurrentItem(tree->topLevelItem(0)->child(0), 0);
+    QTest::keyClick(tree, Qt::Key_F2);
+    QTest::qWait(50);
+    QVERIFY(!tree->findChild<QLineEdit*>() && !QApplication::activeModalWidget());
+    tree->topLevelItem(0)->child(0)->setText(1, "w");
+    QVERIFY(editor.Save());
+    QVERIFY(TestFiles::read(file) == QByteArray(content).replace(">v<", ">w<"));
+}
+
+void tst_HostileFiles::longLoss()
+{
+    const WindowTest test;
+    const QString file = test.folder() + "some.cfg";
+    QVERIFY(TestFiles::write(file, "<R><S " + QByteArray(1000000, 'a') + "='1'><k>v</k></S></R>"));
+    SettingsEditor editor;
+    editor.Open(file);
+    editor.show();
+    editor.findChild<QTreeWidget*>()->topLevelItem(0)->child(0)->setText(1, "w");
+    int length = -1;
+    WindowTest::whenShown<QMessageBox>([&](QMessageBox* box) {
+        length = box->informativeText().size();
+        QTest::keyClick(box, Qt::Key_Escape);
+    });
+    QVERIFY(!editor.Save());
+    QVERIFY2(length > 0 && length < 400, qPrintable(QString::number(length)));
+}
+
+void tst_HostileFiles::valueDialog_data()
+{
+    QTest::addColumn<QString>("value");
+    QTest::addColumn<bool>("inPieces");
+    const QString longLine(Velocor::ValueDialog::LongestLine + 1, 'x');
+    QTest::newRow("empty") << "" << false;
+    QTest::newRow("lines") << "a\nb\n\nc\n" << false;
+    QTest::newRow("no-break space") << QString("a") + QChar(0xa0) + "b" << false;
+    QTest::newRow("just short enough") << longLine.mid(1) + '\n' + longLine.mid(1) << false;
+    QTest::newRow("long line") << longLine << true;
+    QTest::newRow("long line among others") << "a\n\n" + longLine + "\nb\n" << true;
+    QTest::newRow("the sign itself") << longLine + QChar(0x2424) + '\n' + QChar(0x21b5) << true;
+    QTest::newRow("pairs of surrogates")
+        << QString::fromUtf8("\xF0\x9F\x98\x80").repeated(6000) + "\nx" << true;
+}
+
+void tst_HostileFiles::valueDialog()
+{
+    QFETCH(QString, value);
+    QFETCH(bool, inPieces);
+    Velocor::ValueDialog dialog("name", value);
+    dialog.show();
+    QVERIFY(!dialog.isModified());
+    QVERIFY(dialog.value() == value);
+    QCOMPARE(dialog.findChild<QLabel*>()->text().contains('\n'), inPieces);
+    auto* text = dialog.findChild<QPlainTextEdit*>();
+    QTest::keyClick(text, Qt::Key_Home, Qt::ControlModifier);
+    QTest::keyClicks(text, "a");
+    QTest::keyClick(text, Qt::Key_Return);
+    QVERIFY(dialog.isModified());
+    QVERIFY(dialog.value() == "a\n" + value);
+    for (QTextBlock block = text->document()->begin(); block.isValid(); block = block.next())
+        QVERIFY(block.length() <= Velocor::ValueDialog::LongestLine + 1);
+}
+
+void tst_HostileFiles::valueDialogPastes()
+{
+    const QString value(Velocor::ValueDialog::LongestLine + 1, 'x');
+    const QString pasted = QString("p").repeated(20000) + "\nq";
+    Velocor::ValueDialog dialog("name", value);
+    dialog.show();
+    QGuiApplication::clipboard()->setText(pasted);
+    auto* text = dialog.findChild<QPlainTextEdit*>();
+    QTest::keyClick(text, Qt::Key_End, Qt::ControlModifier);
+    QTest::keyClick(text, Qt::Key_V, Qt::ControlModifier);
+    QVERIFY(dialog.value() == value + pasted);
+}
+
+void tst_HostileFiles::reportEndsWithTheLastLine()
+{
+    QByteArray log = DemoLog::run(40000, QTime(1, 0), qPrintable(QString(500, 'x')));
+    QVERIFY(log.size() > 18 << 20);
+    const QByteArray last = DemoLog::entry("23:00:00.000", "Fatal", "the end");
+    const WindowTest test(log + last);
+    const QString tail = SystemReport::LogTail(SystemReport::TailLines);
+    QVERIFY2(tail.endsWith('\n' + last), qPrintable(tail.right(200)));
+    QCOMPARE(tail.count('\n'), int(SystemReport::TailLines));
+}
+
+// The newest run on top ends after more than 16 MiB, and an older one follows.
+void tst_HostileFiles::reportOfALongNewestRun()
+{
+    const QByteArray padding(500, 'x');
+    const QByteArray older = DemoLog::run(45000, QTime(1, 0), ("old" + padding).constData(), true);
+    const QByteArray newer = DemoLog::run(40000, QTime(1, 0), ("new" + padding).constData());
+    QVERIFY(newer.size() > 18 << 20 && older.size() > newer.size() + (1 << 20));
+    const WindowTest test(DemoLog::writtenOver(older, newer));
+    const QString tail = SystemReport::LogTail(3);
+    QCOMPARE(tail, QString(newer).section('\n', -4));
+}
+
+void tst_HostileFiles::reportOfLongLines()
+{
+    const QByteArray whole = DemoLog::entry("09:00:00.000", "Trace", QString(60000, 'w'));
+    const QByteArray cut = DemoLog::entry("09:00:01.000", "Trace", QString(20 << 20, 'c'));
+    const QByteArray last = DemoLog::entry("09:00:02.000", "Fatal", "the end");
+    const WindowTest test(whole + cut + last);
+    const QStringList lines = SystemReport::LogTail(10).split('\n');
+    QCOMPARE(lines.size(), 4);
+    QCOMPARE(lines.at(0) + '\n', QString(whole));
+    QCOMPARE(lines.at(1), QString(cut.left(LogIndex::LineLimit)) + QChar(0x2026));
+    QCOMPARE(lines.at(2) + '\n', QString(last));
+}
+
+QTEST_MAIN(tst_HostileFiles)
+#include "tst_HostileFiles.moc"
