@@ -25,7 +25,7 @@ packages_of() {
     Darwin/test | Darwin/wayland | Darwin/package) ;;
     */build) echo g++ cmake ninja-build qtbase5-dev librapidxml-dev ;;
     */wayland) echo qtwayland5 ;;
-    */test) echo xvfb xauth shared-mime-info pkg-config valgrind doxygen ;;
+    */test) echo xvfb xauth shared-mime-info pkg-config valgrind doxygen locales-all ;;
     */bench)
         echo python3 xvfb xauth shared-mime-info libbenchmark-dev libspdlog-dev liblog4cplus-dev \
             liblog4cxx-dev libboost-dev libboost-log-dev libgoogle-glog-dev libkf5config-dev \

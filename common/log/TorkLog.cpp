@@ -6,10 +6,13 @@
 #include "common/log/TorkLog.h"
 
 #include "common/log/TorkLogLock.h"
+#include "common/log/TorkLogStamp.h"
 
 TorkLog::TorkLog() : TorkLog(QString(QLatin1String(""))) {}
 
-TorkLog::TorkLog(QString const& path) : QObject(nullptr), m_lastEntryTime(wallClock())
+TorkLog::TorkLog(QString const& path)
+    : QObject(nullptr),
+      m_lastEntryTime(TorkLogStamp::timeOfDay(QDateTime::currentMSecsSinceEpoch()))
 {
     clear();
     m_path = path;

@@ -191,12 +191,11 @@ private:
     void shiftOldFiles(QString const& directory) const;
     void pruneOldFiles(QString const& directory, qint64 highest) const;
 
-    static qint64 wallClock();
-    void writeEntry(qint64 now, int severity, QString const& message);
+    int writeEntry(qint64 now, int severity, QString const& message);
     void writeLine(ushort const* line, int length);
     void writeToFile(char const* bytes, int length);
-    void appendStamp(QVarLengthArray<ushort, 512>& line, qint64 now) const;
-    QString elapsedTime(qint64 now) const;
+    int appendStamp(QVarLengthArray<ushort, 512>& line, qint64 now) const;
+    QString elapsedTime(int timeOfDay) const;
     void echo(QString const& line) const;
 
     bool load();
@@ -226,7 +225,7 @@ private:
     QString m_outputToConsoleKey;
     QString m_dateTimeFormat;
     QString m_dateTimeFormatKey;
-    std::atomic<qint64> m_lastEntryTime; // on the wall clock, in milliseconds
+    std::atomic<int> m_lastEntryTime; // local time of day, in milliseconds since midnight
     std::atomic<bool> m_logElapsedTime{false};
     QString m_logElapsedTimeKey;
     QString m_elapsedTimePrefix;
@@ -243,8 +242,8 @@ private:
     bool m_handedOut = false;
     qint64 m_position = 0;
 
-    // Changes with every change of the date format, so that stamps kept for reuse can be told
-    // stale.
+    // Changes with every change of the date format, so that no stamp kept for the old one is
+    // reused.
     std::atomic<quint64> m_formatGeneration{0};
 };
 

@@ -21,12 +21,6 @@ TorkLog* TorkLog::m_gLog = nullptr;
 
 namespace {
 
-// Milliseconds since midnight.
-int TimeOfDay(qint64 wallClock)
-{
-    return static_cast<int>(wallClock % (24 * 60 * 60 * 1000));
-}
-
 QString SeverityText(int severity)
 {
     switch (severity) {
@@ -85,34 +79,29 @@ QString& TorkLog::severityName(EventSeverity severity)
     return m_severityName;
 }
 
-qint64 TorkLog::wallClock()
-{
-    return TorkLogStamp::wallClock(QDateTime::currentMSecsSinceEpoch());
-}
-
 void TorkLog::write(int severity, QString const& message)
 {
     const qint64 now = QDateTime::currentMSecsSinceEpoch();
-    if (m_enabled)
-        writeEntry(now, severity, message);
-    m_lastEntryTime = TorkLogStamp::wallClock(now);
+    m_lastEntryTime = m_enabled ? writeEntry(now, severity, message) : TorkLogStamp::timeOfDay(now);
 }
 
-void TorkLog::writeEntry(qint64 now, int severity, QString const& message)
+// Returns the time of day of `now`.
+int TorkLog::writeEntry(qint64 now, int severity, QString const& message)
 {
     const ushort blank = ' ';
     TorkLogLine line;
-    appendStamp(line, now);
+    const int timeOfDay = appendStamp(line, now);
     line.append(blank);
     Append(line, SeverityText(severity));
     line.append(blank);
     if (m_logElapsedTime) {
-        Append(line, elapsedTime(now));
+        Append(line, elapsedTime(timeOfDay));
         line.append(blank);
     }
     Append(line, message);
     line.append('\n');
     writeLine(line.constData(), line.length());
+    return timeOfDay;
 }
 
 void TorkLog::write(QString const& line)
@@ -161,10 +150,12 @@ void TorkLog::echo(QString const& line) const
     QMessageLogger(nullptr, 0, nullptr).debug() << line;
 }
 
-void TorkLog::appendStamp(TorkLogLine& line, qint64 now) const
+// Returns the time of day of `now`.
+int TorkLog::appendStamp(TorkLogLine& line, qint64 now) const
 {
-    if (TorkLogStamp::append(line, now, m_formatGeneration))
-        return;
+    const int timeOfDay = TorkLogStamp::append(line, now, m_formatGeneration);
+    if (timeOfDay >= 0)
+        return timeOfDay;
 
     QString format;
     quint64 generation = 0;
@@ -173,17 +164,17 @@ void TorkLog::appendStamp(TorkLogLine& line, qint64 now) const
         format = m_dateTimeFormat;
         generation = m_formatGeneration;
     }
-    TorkLogStamp::learn(line, now, format, generation);
+    return TorkLogStamp::make(line, now, format, generation);
 }
 
 // Between times of day only: an interval across midnight comes out negative.
-QString TorkLog::elapsedTime(qint64 now) const
+QString TorkLog::elapsedTime(int timeOfDay) const
 {
     QString prefix;
     {
         TorkLogLock lock(m_mutex);
         prefix = m_elapsedTimePrefix;
     }
-    const int elapsed = TimeOfDay(TorkLogStamp::wallClock(now)) - TimeOfDay(m_lastEntryTime);
+    const int elapsed = timeOfDay - m_lastEntryTime;
     return prefix + QLatin1Char('[') + QString::number(elapsed) + QLatin1Char(']');
 }

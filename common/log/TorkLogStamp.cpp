@@ -4,210 +4,116 @@
 #include "common/log/TorkLogStamp.h"
 
 #include <QDateTime>
+#include <QLocale>
 
 #include <algorithm>
-#include <ctime>
 #include <type_traits>
 
 namespace {
 
 constexpr int Capacity = 64;
 
-// Who words a stamp within the minute: the toolkit, or Fill() where it is known to say the same.
-enum Wording : int { NotComparedYet = 0, ByFill, ByToolkit };
-
-// What this thread found out last. Free of constructors and destructors, so that entries may still
+// What this thread found out last. Without constructors and destructors, so that entries may still
 // be written while the program's static objects are destroyed.
 struct Kept
 {
-    qint64 minute;
-    long zone;
-    qint64 offset;
-    int year;
-    int month;
-    int day;
-    int hour;
-    int minuteOfHour;
+    bool isSet; // all zeros are a moment, too: the first of 1970
+    qint64 now;
+    int zoneLength; // -1: TZ is not set
+    char zone[Capacity];
+    int timeOfDay;
 
-    quint64 generation;
-    Wording wording;
-    int formatLength;
-    ushort format[Capacity];
-
-    qint64 stampTime;
+    quint64 generation; // 0: no stamp
     int stampLength;
     ushort stamp[Capacity];
 };
 static_assert(std::is_trivial<Kept>::value, "outlives all destructors");
 thread_local Kept t_kept;
 
-// Changes where the program is moved to another time zone.
-long Zone()
+// Not getenv(): other threads may be setting variables with qputenv().
+QByteArray Zone()
 {
-#ifdef __GLIBC__
-    return ::timezone;
-#else
-    return 0;
-#endif
+    return qgetenv("TZ");
 }
 
-// The distance from UTC holds for the whole minute: no time zone changes its clocks within one.
-void LookAtClock(Kept& kept, qint64 now)
+// An empty TZ is UTC; without TZ it is the system's time zone.
+int LengthOf(QByteArray const& zone)
 {
-    kept.offset = QDateTime::fromMSecsSinceEpoch(now).offsetFromUtc() * qint64(1000);
-    kept.minute = now / 60000;
-    kept.zone = Zone();
-
-    const QDateTime time = QDateTime::fromMSecsSinceEpoch(now + kept.offset, Qt::UTC);
-    kept.year = time.date().year();
-    kept.month = time.date().month();
-    kept.day = time.date().day();
-    kept.hour = time.time().hour();
-    kept.minuteOfHour = time.time().minute();
-    kept.wording = kept.offset % 60000 == 0 ? NotComparedYet : ByToolkit;
-    kept.stampTime = -1;
+    return zone.isNull() ? -1 : zone.size();
 }
 
-QString ToolkitStamp(qint64 now, QString const& format)
+bool IsKept(qint64 now)
 {
-    const bool needsZone = format.contains(QLatin1Char('t'));
-    const QDateTime time =
-        needsZone ? QDateTime::fromMSecsSinceEpoch(now)
-                  : QDateTime::fromMSecsSinceEpoch(TorkLogStamp::wallClock(now), Qt::UTC);
-    return time.toString(format);
+    Kept const& kept = t_kept;
+    if (!kept.isSet || kept.now != now)
+        return false;
+
+    const QByteArray zone = Zone();
+    return kept.zoneLength == LengthOf(zone) && std::equal(zone.cbegin(), zone.cend(), kept.zone);
 }
 
-void Keep(Kept& kept, qint64 now, QString const& stamp)
+// Without a stamp so far. A longer time zone than usual is not kept.
+void Keep(QDateTime const& time, qint64 now, QByteArray const& zone)
 {
-    kept.stampTime = now;
+    Kept& kept = t_kept;
+    kept.isSet = zone.size() <= Capacity;
+    kept.now = now;
+    kept.zoneLength = LengthOf(zone);
+    std::copy_n(zone.cbegin(), kept.isSet ? zone.size() : 0, kept.zone);
+    kept.timeOfDay = time.time().msecsSinceStartOfDay();
+    kept.generation = 0;
+}
+
+void KeepStamp(QString const& stamp, quint64 generation)
+{
+    if (stamp.length() > Capacity)
+        return;
+    Kept& kept = t_kept;
+    kept.generation = generation;
     kept.stampLength = stamp.length();
     std::copy_n(stamp.utf16(), stamp.length(), kept.stamp);
 }
 
-// Writes `number` with at least `width` digits at `to`; returns the end.
-ushort* Digits(ushort* to, int number, int width)
+bool IsLatin1(QString const& text)
 {
-    const int length = std::max(width, number > 999 ? 4 : number > 99 ? 3 : number > 9 ? 2 : 1);
-    for (int i = length - 1; i >= 0; --i) {
-        to[i] = static_cast<ushort>('0' + number % 10);
-        number /= 10;
-    }
-    return to + length;
+    return std::all_of(text.cbegin(), text.cend(),
+                       [](QChar character) { return character.unicode() <= 0xff; });
 }
 
-// The number that `count` times `letter` stands for in a format; -1 where it stands for none, or
-// where only the toolkit knows.
-int Number(Kept const& kept, int ofMinute, ushort letter, int count)
+// In some languages the digits are beyond Latin-1, and a whole stamp would be question marks.
+QString Stamp(QDateTime const& time, QString const& format)
 {
-    const bool isShort = count <= 2;
-    switch (letter) {
-    case 'y':
-        return count == 4 ? kept.year : -1;
-    case 'M':
-        return isShort ? kept.month : -1;
-    case 'd':
-        return isShort ? kept.day : -1;
-    case 'h':
-    case 'H':
-        return isShort ? kept.hour : -1;
-    case 'm':
-        return isShort ? kept.minuteOfHour : -1;
-    case 's':
-        return isShort ? ofMinute / 1000 : -1;
-    case 'z':
-        return count == 1 || count == 3 ? ofMinute % 1000 : -1;
-    default:
-        return -1;
-    }
-}
-
-bool IsLetter(ushort character)
-{
-    return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z');
-}
-
-// Makes the stamp from numbers and what stands between them, for a tenth of the toolkit's work.
-// False for all other formats, and `kept.stamp` is then undefined.
-bool Fill(Kept& kept, qint64 now)
-{
-    const int ofMinute = static_cast<int>(now % 60000);
-    ushort* to = kept.stamp;
-    for (int i = 0; i < kept.formatLength;) {
-        const ushort letter = kept.format[i];
-        int count = 1;
-        while (i + count < kept.formatLength && kept.format[i + count] == letter)
-            ++count;
-        i += count;
-
-        if (kept.stamp + Capacity - to < std::max(count, 4) || letter == '\'')
-            return false;
-        const int number = Number(kept, ofMinute, letter, count);
-        if (number >= 0)
-            to = Digits(to, number, count);
-        else if (!IsLetter(letter))
-            to = std::fill_n(to, count, letter);
-        else
-            return false;
-    }
-    kept.stampTime = now;
-    kept.stampLength = static_cast<int>(to - kept.stamp);
-    return true;
-}
-
-// Fill() is trusted for the rest of a minute for which it once said what the toolkit says.
-Wording Compare(Kept& kept, qint64 now, QString const& stamp)
-{
-    const bool isSame = Fill(kept, now) && stamp.length() == kept.stampLength &&
-                        std::equal(kept.stamp, kept.stamp + kept.stampLength, stamp.utf16());
-    return isSame ? ByFill : ByToolkit;
-}
-
-void AppendAndKeep(TorkLogLine& line, qint64 now, QString const& format)
-{
-    Kept& kept = t_kept;
-    const QString stamp = ToolkitStamp(now, format);
-    if (kept.wording == NotComparedYet)
-        kept.wording = Compare(kept, now, stamp);
-    if (stamp.length() <= Capacity)
-        Keep(kept, now, stamp);
-    else
-        kept.stampTime = -1;
-    line.append(stamp.utf16(), stamp.length());
+    const QString stamp = time.toString(format);
+    return IsLatin1(stamp) ? stamp : QLocale::c().toString(time, format);
 }
 
 } // namespace
 
-qint64 TorkLogStamp::wallClock(qint64 now)
+int TorkLogStamp::timeOfDay(qint64 now)
 {
-    Kept& kept = t_kept;
-    if (kept.minute != now / 60000 || kept.zone != Zone())
-        LookAtClock(kept, now);
-    return now + kept.offset;
+    if (!IsKept(now)) {
+        const QByteArray zone = Zone();
+        Keep(QDateTime::fromMSecsSinceEpoch(now), now, zone);
+    }
+    return t_kept.timeOfDay;
 }
 
-bool TorkLogStamp::append(TorkLogLine& line, qint64 now, quint64 generation)
+int TorkLogStamp::append(TorkLogLine& line, qint64 now, quint64 generation)
 {
-    Kept& kept = t_kept;
-    if (kept.generation != generation)
-        return false;
-
-    wallClock(now);
-    const bool isKept = kept.stampTime == now || (kept.wording == ByFill && Fill(kept, now));
-    if (isKept)
-        line.append(kept.stamp, kept.stampLength);
-    else
-        AppendAndKeep(line, now,
-                      QString(reinterpret_cast<QChar const*>(kept.format), kept.formatLength));
-    return true;
+    Kept const& kept = t_kept;
+    if (kept.generation != generation || !IsKept(now))
+        return -1;
+    line.append(kept.stamp, kept.stampLength);
+    return kept.timeOfDay;
 }
 
-void TorkLogStamp::learn(TorkLogLine& line, qint64 now, QString const& format, quint64 generation)
+int TorkLogStamp::make(TorkLogLine& line, qint64 now, QString const& format, quint64 generation)
 {
-    Kept& kept = t_kept;
-    const bool fits = format.length() <= Capacity;
-    kept.generation = fits ? generation : 0;
-    kept.wording = fits ? NotComparedYet : ByToolkit;
-    kept.formatLength = fits ? format.length() : 0;
-    std::copy_n(format.utf16(), kept.formatLength, kept.format);
-    AppendAndKeep(line, now, format);
+    const QByteArray zone = Zone();
+    const QDateTime time = QDateTime::fromMSecsSinceEpoch(now);
+    const QString stamp = Stamp(time, format);
+    line.append(stamp.utf16(), stamp.length());
+    Keep(time, now, zone);
+    KeepStamp(stamp, generation);
+    return t_kept.timeOfDay;
 }

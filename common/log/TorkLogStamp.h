@@ -7,28 +7,33 @@
 #include <QVarLengthArray>
 #include <QtGlobal>
 
-/// The text of an entry while it is made: on the stack, as asking for memory costs as much as
+/// The text of an entry while it is built: on the stack, as allocating memory costs as much as
 /// filling it.
 using TorkLogLine = QVarLengthArray<ushort, 512>;
 
-/// The local time, and how an entry words it. For the log's own sources.
+/// The local time of an entry, and its time stamp. For the log's own sources.
 ///
-/// Entries come many to a millisecond, and asking for the local time costs more than all the rest
-/// of an entry; each thread keeps what it found out last. All times are given in milliseconds since
-/// the epoch of QDateTime::currentMSecsSinceEpoch().
+/// Many entries share a millisecond, and Qt's formatting costs more than all the rest of an entry.
+/// So each thread keeps what Qt said until the millisecond, the format or the time zone (`TZ`)
+/// changes. `now` is always what QDateTime::currentMSecsSinceEpoch() returned. Any thread.
+///
+/// The functions return the local time of day of `now`, in milliseconds since midnight.
 namespace TorkLogStamp {
 
-/// The wall clock's time as milliseconds since an epoch of its own.
-qint64 wallClock(qint64 now);
+/// The time of day without a stamp, for an entry that is not written.
+int timeOfDay(qint64 now);
 
-/// Appends `now` in the format that this thread has learned as `generation`.
+/// Appends the stamp that this thread made last, if it is still the right one.
 ///
-/// @return false, with nothing appended, if it has not: then learn() must come first
-bool append(TorkLogLine& line, qint64 now, quint64 generation);
+/// @param generation  of the format, see make()
+/// @return -1, with nothing appended, if it is not: then make() is to be called
+int append(TorkLogLine& line, qint64 now, quint64 generation);
 
-/// Appends `now` in the toolkit's words for `format`, which is kept for append().
+/// Appends `now` as QDateTime::toString() formats it, and keeps that for append().
 ///
-/// @param generation  unique to the format, and never 0
-void learn(TorkLogLine& line, qint64 now, QString const& format, quint64 generation);
+/// A stamp that Latin-1 cannot hold, such as one in Arabic digits, is formatted in the C locale.
+///
+/// @param generation  unique to this format among all logs, and never 0
+int make(TorkLogLine& line, qint64 now, QString const& format, quint64 generation);
 
 } // namespace TorkLogStamp

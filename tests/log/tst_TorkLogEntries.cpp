@@ -3,6 +3,7 @@
 
 #include "common/log/TorkLog.h"
 #include "log/LogFolder.h"
+#include "log/PlainStamp.h"
 #include "support/ChildProcess.h"
 #include "support/ProcessLimits.h"
 #include "support/TestClock.h"
@@ -12,6 +13,7 @@
 #include <QtTest>
 
 #include <csignal>
+#include <ctime>
 
 class tst_TorkLogEntries : public QObject
 {
@@ -30,9 +32,21 @@ private slots:
     void stampFollowsTheClock_data();
     void stampFollowsTheClock();
     void stampFollowsTheFormat();
+    void stampAfterDroppedEntry();
+    void stampFollowsTheTimeZone_data();
+    void stampFollowsTheTimeZone();
+    void stampInRepeatedHour_data();
+    void stampInRepeatedHour();
+    void firstEntryIn1970_data();
+    void firstEntryIn1970();
+    void stampInTheUsersLanguage_data();
+    void stampInTheUsersLanguage();
     void elapsedTime_data();
     void elapsedTime();
     void elapsedTimeBetweenEntries();
+    void elapsedTimeFollowsTheTimeZone_data();
+    void elapsedTimeFollowsTheTimeZone();
+    void elapsedTimeInRepeatedHour();
     void elapsedTimePrefix_data();
     void elapsedTimePrefix();
     void readyLine_data();
@@ -66,12 +80,13 @@ private slots:
     void entryIsBuiltOutsideTheLock();
 
 private:
-    QtMessageHandler m_handler;
+    QtMessageHandler m_handler = nullptr;
+    QByteArray m_zone; // null: TZ is not set
 };
 
 namespace {
 
-// The default format makes the same of it in every release of the toolkit.
+// Three digits of milliseconds look the same in every Qt, however it formats a single z.
 const QDateTime& now()
 {
     static const QDateTime time(QDate(2021, 3, 4), QTime(5, 6, 7, 123));
@@ -80,10 +95,28 @@ const QDateTime& now()
 
 const char stampOfNow[] = "2021-03-04 05:06:07.123";
 
+QDateTime utc(QDate const& date, QTime const& time)
+{
+    return QDateTime(date, time, Qt::UTC);
+}
+
+// Null: not set. Qt sees it at once; the C library does after tzset() only.
+void setZone(QByteArray const& zone)
+{
+    if (zone.isNull())
+        qunsetenv("TZ");
+    else
+        qputenv("TZ", zone);
+}
+
+// The whole moment, the same in every Qt.
+const char stampFormat[] = "yyyy-MM-dd hh:mm:ss.zzz";
+
 } // namespace
 
 void tst_TorkLogEntries::init()
 {
+    m_zone = qgetenv("TZ");
     m_handler = qInstallMessageHandler(nullptr);
     qInstallMessageHandler(m_handler);
     TestClock::set(now());
@@ -93,6 +126,8 @@ void tst_TorkLogEntries::cleanup()
 {
     TorkLog::shutdown();
     qInstallMessageHandler(m_handler);
+    setZone(m_zone);
+    tzset();
     TestClock::release();
 }
 
@@ -182,8 +217,9 @@ void tst_TorkLogEntries::stamp_data()
     const QDateTime early(QDate(2021, 3, 4), QTime(5, 6, 7, 8));
     const QString usual("yyyy-MM-dd hh:mm:ss.z");
     QTest::newRow("usual") << usual << now() << QByteArray(stampOfNow);
-    QTest::newRow("milliseconds as the toolkit has them")
-        << usual << early << early.toString(usual).toLatin1();
+    QTest::newRow("milliseconds as Qt formats them") << usual << early << plainStamp(early, usual);
+    QTest::newRow("milliseconds that end in zero, too")
+        << usual << early.addMSecs(302) << plainStamp(early.addMSecs(302), usual);
     QTest::newRow("three digits of milliseconds")
         << "yyyy-MM-dd hh:mm:ss.zzz" << early << QByteArray("2021-03-04 05:06:07.008");
     QTest::newRow("before midnight")
@@ -239,7 +275,7 @@ void tst_TorkLogEntries::stampFollowsTheClock_data()
     QTest::newRow("longer only in words") << QString(60, '.') + "zsh";
 }
 
-// What is kept from one entry to the next says what the toolkit would say anew.
+// What is kept from one entry to the next is what Qt would say again.
 void tst_TorkLogEntries::stampFollowsTheClock()
 {
     QFETCH(QString, format);
@@ -254,7 +290,7 @@ void tst_TorkLogEntries::stampFollowsTheClock()
         time = time.addMSecs(step);
         TestClock::set(time);
         log.trace("x");
-        expected += time.toString(format).toLatin1() + " Trace x\n";
+        expected += plainStamp(time, format) + " Trace x\n";
     }
     QCOMPARE(TestFiles::read(folder.logs() + "app.log"), expected);
 }
@@ -280,6 +316,200 @@ void tst_TorkLogEntries::stampFollowsTheFormat()
     QCOMPARE(folder.listing(),
              QStringList({"first.log: T Trace 1\nT Trace 3\nU Trace 4\nU Trace 6\n",
                           "second.log: S Trace 2\nS Trace 5\n"}));
+}
+
+// A dropped entry moves the time of the last entry only.
+void tst_TorkLogEntries::stampAfterDroppedEntry()
+{
+    LogFolder folder;
+    TorkLog log;
+    log.setOutputPath(folder.logs());
+    folder.configure(log, {{"dateTimeFormat", stampFormat}, {"filePrefix", "app"}});
+
+    log.trace("x");
+    TestClock::advance(1);
+    log.setEnable(false);
+    log.trace("dropped");
+    log.setEnable(true);
+    log.trace("y");
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"),
+             QByteArray("2021-03-04 05:06:07.123 Trace x\n2021-03-04 05:06:07.124 Trace y\n"));
+}
+
+void tst_TorkLogEntries::stampFollowsTheTimeZone_data()
+{
+    QTest::addColumn<QByteArray>("from");
+    QTest::addColumn<QByteArray>("to");
+    QTest::addColumn<bool>("tellsTheLibrary");
+    QTest::addColumn<QByteArray>("expected");
+
+    const QByteArray berlin("Europe/Berlin");
+    const QByteArray tokyo("Asia/Tokyo");
+    // Longer than what is kept, and the same up to there.
+    const QByteArray longWay(":/usr/share/zoneinfo" + QByteArray("/.").repeated(40));
+    const QByteArray inBerlin("2021-03-04 13:00:00.000");
+    const QByteArray inTokyo("2021-03-04 21:00:00.000");
+    const QByteArray inUtc("2021-03-04 12:00:00.000");
+    QTest::newRow("changed") << berlin << tokyo << false << inTokyo;
+    QTest::newRow("changed, and tzset() called") << berlin << tokyo << true << inTokyo;
+    QTest::newRow("the same length")
+        << QByteArray("XXX-1") << QByteArray("XXX-9") << false << inTokyo;
+    QTest::newRow("longer by the end") << QByteArray("XXX-1") << QByteArray("XXX-1:30") << false
+                                       << QByteArray("2021-03-04 13:30:00.000");
+    QTest::newRow("shorter by the end")
+        << QByteArray("XXX-1:30") << QByteArray("XXX-1") << false << inBerlin;
+    QTest::newRow("from empty") << QByteArray("") << tokyo << false << inTokyo;
+    QTest::newRow("to empty") << berlin << QByteArray("") << false << inUtc;
+    QTest::newRow("from unset") << QByteArray() << tokyo << false << inTokyo;
+    QTest::newRow("long names") << longWay + "/Europe/Berlin" << longWay + "/Asia/Shanghai" << false
+                                << QByteArray("2021-03-04 20:00:00.000");
+    QTest::newRow("from a long name") << longWay + "/Europe/Berlin" << tokyo << false << inTokyo;
+}
+
+void tst_TorkLogEntries::stampFollowsTheTimeZone()
+{
+    QFETCH(QByteArray, from);
+    QFETCH(QByteArray, to);
+    QFETCH(bool, tellsTheLibrary);
+    QFETCH(QByteArray, expected);
+    LogFolder folder;
+    TorkLog log;
+    log.setOutputPath(folder.logs());
+    folder.configure(log, {{"dateTimeFormat", stampFormat}, {"filePrefix", "app"}});
+    TestClock::set(utc(QDate(2021, 3, 4), QTime(12, 0)));
+
+    setZone(from);
+    log.trace("x");
+    setZone(to);
+    if (tellsTheLibrary)
+        tzset();
+    log.trace("y");
+    const QByteArray second = TestFiles::read(folder.logs() + "app.log").split('\n').value(1);
+    QCOMPARE(second, expected + " Trace y");
+}
+
+void tst_TorkLogEntries::stampInRepeatedHour_data()
+{
+    QTest::addColumn<QByteArray>("zone");
+    QTest::addColumn<QDateTime>("change");
+    QTest::addColumn<QByteArray>("expected");
+
+    // Standard time itself steps back, so that both hours are called the same.
+    QTest::newRow("Kazakhstan 2024")
+        << QByteArray("Asia/Almaty") << utc(QDate(2024, 2, 29), QTime(18, 0))
+        << QByteArray("23:59:59 23:00:00 23:30:00 23:59:59 00:00:00");
+    QTest::newRow("Russia 2014") << QByteArray("Europe/Moscow")
+                                 << utc(QDate(2014, 10, 25), QTime(22, 0))
+                                 << QByteArray("01:59:59 01:00:00 01:30:00 01:59:59 02:00:00");
+    QTest::newRow("Sudan 2017") << QByteArray("Africa/Khartoum")
+                                << utc(QDate(2017, 10, 31), QTime(21, 0))
+                                << QByteArray("23:59:59 23:00:00 23:30:00 23:59:59 00:00:00");
+    QTest::newRow("South Sudan 2021")
+        << QByteArray("Africa/Juba") << utc(QDate(2021, 1, 31), QTime(21, 0))
+        << QByteArray("23:59:59 23:00:00 23:30:00 23:59:59 00:00:00");
+    QTest::newRow("end of daylight saving time")
+        << QByteArray("Europe/Berlin") << utc(QDate(2023, 10, 29), QTime(1, 0))
+        << QByteArray("02:59:59 02:00:00 02:30:00 02:59:59 03:00:00");
+}
+
+void tst_TorkLogEntries::stampInRepeatedHour()
+{
+    QFETCH(QByteArray, zone);
+    QFETCH(QDateTime, change);
+    LogFolder folder;
+    TorkLog log;
+    log.setOutputPath(folder.logs());
+    folder.configure(log, {{"dateTimeFormat", "hh:mm:ss"}, {"filePrefix", "app"}});
+
+    setZone(zone);
+    for (int seconds : {-1, 0, 1800, 3599, 3600}) {
+        TestClock::set(change.addSecs(seconds));
+        log.trace("x");
+    }
+    QByteArray written = TestFiles::read(folder.logs() + "app.log");
+    QTEST(written.replace(" Trace x\n", " ").trimmed(), "expected");
+}
+
+void tst_TorkLogEntries::firstEntryIn1970_data()
+{
+    QTest::addColumn<qint64>("moment");
+    QTest::addColumn<QByteArray>("zone");
+    QTest::addColumn<QByteArray>("expected");
+
+    QTest::newRow("first moment") << qint64(0) << QByteArray("Asia/Tokyo")
+                                  << QByteArray("1970-01-01 09:00:00.000");
+    QTest::newRow("first moment in UTC")
+        << qint64(0) << QByteArray("") << QByteArray("1970-01-01 00:00:00.000");
+    QTest::newRow("first minute") << qint64(59999) << QByteArray("Asia/Tokyo")
+                                  << QByteArray("1970-01-01 09:00:59.999");
+    QTest::newRow("just before") << qint64(-1) << QByteArray("Asia/Tokyo")
+                                 << QByteArray("1970-01-01 08:59:59.999");
+    QTest::newRow("the day before")
+        << qint64(-86399999) << QByteArray("") << QByteArray("1969-12-31 00:00:00.001");
+}
+
+// In a process that has written nothing yet.
+void tst_TorkLogEntries::firstEntryIn1970()
+{
+    QFETCH(qint64, moment);
+    QFETCH(QByteArray, zone);
+    QFETCH(QByteArray, expected);
+    LogFolder folder;
+    QVERIFY(TestFiles::write(
+        folder.settingsFile(),
+        LogFolder::settingsText(
+            {{"dateTimeFormat", stampFormat}, {"logElapsedTime", "yes"}, {"filePrefix", "app"}})));
+    setZone(zone);
+    const ChildProcess::Result child = ChildProcess::run(
+        "first entry", {folder.logs(), folder.settingsFile(), QString::number(moment)});
+    QVERIFY2(child.ended(), child.report());
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), expected + " Trace dT:[0] x\n");
+}
+
+void tst_TorkLogEntries::stampInTheUsersLanguage_data()
+{
+    QTest::addColumn<QByteArray>("language");
+    QTest::addColumn<QString>("format");
+    QTest::addColumn<QByteArray>("expected"); // on a Tuesday in March and one in August
+
+    const QString numbers("yyyy-MM-dd hh:mm:ss.zzz");
+    const QString names("dddd d MMMM");
+    const QByteArray plain("2021-03-02 05:06:07.008|2021-08-03 05:06:07.008");
+    for (const char* language : {"de_DE", "tr_TR", "ar_EG", "fa_IR", "my_MM", "ne_NP", "mr_IN"}) {
+        QTest::addRow("numbers in %s", language) << QByteArray(language) << numbers << plain;
+    }
+    QTest::newRow("letters of Latin-1 stay")
+        << QByteArray("de_DE") << names << QByteArray("Dienstag 2 M\xE4rz|Dienstag 3 August");
+    QTest::newRow("each stamp by itself")
+        << QByteArray("tr_TR") << "d MMMM" << QByteArray("2 Mart|3 August");
+    QTest::newRow("with a name beyond Latin-1 all names are those of the C locale")
+        << QByteArray("tr_TR") << names << QByteArray("Tuesday 2 March|Tuesday 3 August");
+    QTest::newRow("digits and names beyond Latin-1")
+        << QByteArray("ar_EG") << names << QByteArray("Tuesday 2 March|Tuesday 3 August");
+    QTest::newRow("text beyond Latin-1 in the format")
+        << QByteArray("de_DE") << QString::fromUtf8("'€' MMMM") << QByteArray("? March|? August");
+    QTest::newRow("no moment in the format")
+        << QByteArray("fa_IR") << "'at'" << QByteArray("at|at");
+}
+
+void tst_TorkLogEntries::stampInTheUsersLanguage()
+{
+    QFETCH(QByteArray, language);
+    QFETCH(QString, format);
+    QFETCH(QByteArray, expected);
+    LogFolder folder;
+    QVERIFY(TestFiles::write(
+        folder.settingsFile(),
+        LogFolder::settingsText({{"dateTimeFormat", format}, {"filePrefix", "app"}})));
+
+    const QByteArray own = qgetenv("LC_ALL");
+    qputenv("LC_ALL", language + ".UTF-8");
+    const ChildProcess::Result child =
+        ChildProcess::run("user's language", {folder.logs(), folder.settingsFile()});
+    qputenv("LC_ALL", own);
+    QVERIFY2(child.ended(), child.report());
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"),
+             expected.replace("|", " Trace x\n") + " Trace x\n");
 }
 
 // From time of day to time of day, whatever the dates.
@@ -357,6 +587,55 @@ void tst_TorkLogEntries::elapsedTimeBetweenEntries()
                                                                     "T Trace dT:[8] b\n"
                                                                     "ready\n"
                                                                     "T Trace dT:[48] c\n"));
+}
+
+void tst_TorkLogEntries::elapsedTimeFollowsTheTimeZone_data()
+{
+    QTest::addColumn<bool>("enabled"); // while the entry before is written
+
+    QTest::newRow("from entry to entry") << true;
+    QTest::newRow("from an entry that is dropped") << false;
+}
+
+// Each time of day is that of the zone in force then.
+void tst_TorkLogEntries::elapsedTimeFollowsTheTimeZone()
+{
+    QFETCH(bool, enabled);
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    log.setLogElapsedTime(true);
+    TestClock::set(utc(QDate(2021, 3, 4), QTime(12, 0)));
+
+    setZone("Europe/Berlin");
+    log.setEnable(false);
+    log.trace("dropped");
+    log.setEnable(enabled);
+    log.trace("x");
+    log.setEnable(true);
+    setZone("Asia/Tokyo");
+    log.trace("y");
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"),
+             QByteArray(enabled ? "T Trace dT:[0] x\n" : "") + "T Trace dT:[28800000] y\n");
+}
+
+// The clocks go back by an hour between the two.
+void tst_TorkLogEntries::elapsedTimeInRepeatedHour()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    log.setLogElapsedTime(true);
+    const QDateTime change = utc(QDate(2024, 2, 29), QTime(18, 0));
+
+    setZone("Asia/Almaty");
+    TestClock::set(change.addMSecs(-100));
+    log.setEnable(false);
+    log.trace("dropped");
+    log.setEnable(true);
+    TestClock::set(change.addMSecs(100));
+    log.trace("x");
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("T Trace dT:[-3599800] x\n"));
 }
 
 void tst_TorkLogEntries::elapsedTimePrefix_data()
@@ -626,6 +905,30 @@ TorkLog* startLog(QString const& path)
     return TorkLog::initialize(path, QStringLiteral("app"), QString(), true);
 }
 
+// Arguments: log directory, settings file, milliseconds since the epoch.
+int writesFirstEntry(QStringList const& arguments)
+{
+    TestClock::set(QDateTime::fromMSecsSinceEpoch(arguments.at(2).toLongLong(), Qt::UTC));
+    TorkLog log(arguments.at(0));
+    log.setPreferencesFileName(arguments.at(1));
+    log.loadPreferences();
+    log.trace("x");
+    return 0;
+}
+
+// Arguments: log directory, settings file.
+int writesInTheUsersLanguage(QStringList const& arguments)
+{
+    TorkLog log(arguments.at(0));
+    log.setPreferencesFileName(arguments.at(1));
+    log.loadPreferences();
+    for (QDate const& day : {QDate(2021, 3, 2), QDate(2021, 8, 3)}) {
+        TestClock::set(QDateTime(day, QTime(5, 6, 7, 8)));
+        log.trace("x");
+    }
+    return 0;
+}
+
 int endsFatally(QStringList const& arguments)
 {
     ProcessLimits::leaveNoCoreFile();
@@ -724,7 +1027,7 @@ int talksWhileAnEntryIsBuilt(QStringList const& arguments)
     return 0;
 }
 
-const QByteArray stamped(const char* text)
+QByteArray stamped(const char* text)
 {
     return QByteArray(stampOfNow) + ' ' + text;
 }
@@ -857,7 +1160,9 @@ int main(int argc, char** argv)
 {
     return ChildProcess::main<tst_TorkLogEntries>(
         argc, argv,
-        {{"fatal", endsFatally},
+        {{"first entry", writesFirstEntry},
+         {"user's language", writesInTheUsersLanguage},
+         {"fatal", endsFatally},
          {"echo", echoes},
          {"echo of messages", echoesMessages},
          {"echo of another log", echoesOfAnotherLog},

@@ -13,10 +13,13 @@
 #include "support/TestFiles.h"
 
 #include <QColor>
+#include <QDateTime>
 #include <QDebug>
 #include <QDir>
+#include <QLibraryInfo>
 #include <QRegularExpression>
 #include <QTemporaryDir>
+#include <QVersionNumber>
 #include <QXmlInputSource>
 #include <QXmlSimpleReader>
 #include <QtTest>
@@ -32,6 +35,7 @@ private slots:
     void configFile();
     void logSettings();
     void logFile();
+    void logMilliseconds();
     void recentFiles();
     void xmlOutput();
     void xmlReport();
@@ -164,6 +168,20 @@ void tst_DocSamples::logFile()
     const QString written = QString::fromUtf8(TestFiles::read(path + "velocor.log"));
     QCOMPARE(WithoutTimes(written), WithoutTimes(Sample("log-file.md", "log-file")));
     QVERIFY(WithoutTimes(written).startsWith("STAMP Trace"));
+}
+
+void tst_DocSamples::logMilliseconds()
+{
+    QStringList lines = Sample("log-file.md", "log-milliseconds").trimmed().split('\n');
+    if (QLibraryInfo::version() < QVersionNumber(5, 15))
+        QSKIP("the sample shows what Qt 5.15 does");
+    QVERIFY2(lines.size() > 2, qPrintable(lines.join('\n')));
+    QCOMPARE(lines.takeFirst().simplified(), QString("milliseconds z zzz"));
+    for (QString const& line : lines) {
+        const QStringList fields = line.simplified().split(' ');
+        const QDateTime time(QDate(2025, 3, 3), QTime(9, 2, 11, fields[0].toInt()));
+        QCOMPARE(fields.mid(1), QStringList({time.toString("z"), time.toString("zzz")}));
+    }
 }
 
 void tst_DocSamples::recentFiles()

@@ -11,8 +11,8 @@
 
 /// How much a comparison with the plain wording tries, and from which seed.
 ///
-/// `VELOCOR_PLAIN=full` asks for the full size, as ./check does; `VELOCOR_SEED` replays one run. The
-/// seed of every run is printed, so that a failure can be repeated.
+/// `VELOCOR_PLAIN=full` asks for the full size, as ./check does; `VELOCOR_SEED` replays one run.
+/// The seed of every run is printed, so that a failure can be repeated.
 namespace Rounds {
 
 /// Whether the full size is asked for.

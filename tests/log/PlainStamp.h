@@ -1,0 +1,19 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include <QByteArray>
+#include <QDateTime>
+#include <QLocale>
+#include <QString>
+
+/// The stamp of an entry in plain words: what Qt makes of the format; in the C locale where Latin-1
+/// lacks a character of that.
+inline QByteArray plainStamp(QDateTime const& time, QString const& format)
+{
+    const QString stamp = time.toString(format);
+    if (QString::fromLatin1(stamp.toLatin1()) == stamp)
+        return stamp.toLatin1();
+    return QLocale::c().toString(time, format).toLatin1();
+}
