@@ -3,6 +3,7 @@
 
 #include "app/window/MainWindow.h"
 
+#include "app/ScreenlessPlatform.h"
 #include "app/UserMessages.h"
 #include "app/window/FileTabs.h"
 #include "app/window/LogHealth.h"
@@ -64,6 +65,10 @@ MainWindow::MainWindow(QWidget* parent)
 {
     setWindowTitle(Property("caption"));
     setAcceptDrops(true);
+    // Size limits are for the window manager. A platform without one says in the log that it cannot
+    // pass them on.
+    if (IsScreenlessPlatform())
+        layout()->setSizeConstraint(QLayout::SetNoConstraint);
     makeFirstContent();
     restoreFirstState();
 }

@@ -1,0 +1,8 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+/// Whether Qt runs on a platform that shows nothing and has no window manager: "offscreen" or
+/// "minimal". Needs the application object; GUI thread.
+bool IsScreenlessPlatform();
