@@ -63,6 +63,7 @@ private slots:
     void printsTheFileThatIsWritten();
     void troubleWithOutputKeepsNoEntryFromTheLog_data();
     void troubleWithOutputKeepsNoEntryFromTheLog();
+    void noFileTakesThePlaceOfAClosedStream();
 };
 
 void tst_StartWithoutScreen::theFirstLogHoldsTheStartAndNothingElse_data()
@@ -86,7 +87,7 @@ void tst_StartWithoutScreen::theFirstLogHoldsTheStartAndNothingElse()
         installation.environment.insert("QT_QPA_PLATFORM", platform);
         const QString logFile = installation.LogFolder() + "velocor.log";
         RunningProgram program(installation);
-        QVERIFY2(program.WaitForLog(logFile, StartEntry), TestFiles::read(logFile));
+        QVERIFY2(program.WaitForLog(logFile, "[^\\0]*" + StartEntry), TestFiles::read(logFile));
         QTest::qWait(wait);
         program.Send(SIGTERM);
         QCOMPARE(program.ExitCode(), 0);
@@ -192,6 +193,18 @@ void tst_StartWithoutScreen::troubleWithOutputKeepsNoEntryFromTheLog()
     program.Send(SIGTERM);
     QCOMPARE(program.ExitCode(), 0);
     QVERIFY2(Matches(TestFiles::read(logFile), StartEntry), TestFiles::read(logFile));
+}
+
+void tst_StartWithoutScreen::noFileTakesThePlaceOfAClosedStream()
+{
+    Installation installation;
+    QVERIFY(installation.installed);
+    installation.environment.insert("QT_QPA_PLATFORM", "offscreen");
+    RunningProgram program(installation, {}, CloseStreams);
+    QVERIFY(program.WaitForLog(installation.LogFolder() + "velocor.log", StartEntry));
+    for (int stream : {STDIN_FILENO, STDOUT_FILENO, STDERR_FILENO})
+        QCOMPARE(QFile::symLinkTarget(QString("/proc/%1/fd/%2").arg(program.Id()).arg(stream)),
+                 QString("/dev/null"));
 }
 
 QTEST_GUILESS_MAIN(tst_StartWithoutScreen)
