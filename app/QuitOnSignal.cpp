@@ -28,7 +28,7 @@ pid_t s_process = 0;
 struct sigaction s_before[SignalCount];
 
 std::atomic<long long> s_firstSignal{None}; // when it came
-static_assert(std::atomic<long long>::is_always_lock_free, "used by a signal handler");
+static_assert(ATOMIC_LLONG_LOCK_FREE == 2, "used by a signal handler");
 
 long long Milliseconds()
 {
@@ -68,11 +68,10 @@ extern "C" void QuitOnSignalHandler(int signalNumber)
     const long long now = Milliseconds();
     long long first = None;
     // A forked child shares the pipe, but its signals are not meant for its parent.
-    if (getpid() != s_process)
-        DieOf(signalNumber);
-    else if (s_firstSignal.compare_exchange_strong(first, now))
+    const bool isForked = getpid() != s_process;
+    if (!isForked && s_firstSignal.compare_exchange_strong(first, now))
         WakeEventLoop();
-    else if (now - first >= OneRequest)
+    else if (isForked || now - first >= OneRequest)
         DieOf(signalNumber);
     errno = savedErrno;
 }
