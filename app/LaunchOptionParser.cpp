@@ -8,6 +8,7 @@
 
 #include <QByteArray>
 #include <QFile>
+#include <QFileInfo>
 #include <QTextStream>
 
 // A program that links this may have a rapidxml of its own, of another version or set up otherwise.
@@ -19,6 +20,9 @@
 #include <memory>
 
 namespace {
+
+// Far above any real file and far below what would exhaust the memory at the start of a program.
+constexpr int MaximumLength = 64 * 1024 * 1024;
 
 using XmlAttribute = rapidxml::xml_attribute<char>;
 using XmlNode = rapidxml::xml_node<char>;
@@ -98,14 +102,17 @@ LaunchOption* LaunchOptionParser::FindOption(QString const& key) const
 
 bool LaunchOptionParser::ReadDataFile(QString const& path)
 {
-    if (!QFile::exists(path))
+    // Opening a pipe would wait for somebody to write, and a device may never end.
+    if (!QFileInfo(path).isFile())
         return false;
 
     QFile file(path);
     if (!file.open(QIODevice::ReadOnly | QIODevice::Text))
         return false;
 
-    QString content = QTextStream(&file).readAll();
+    QString content = QTextStream(&file).read(MaximumLength + 1);
+    if (content.length() > MaximumLength)
+        return false;
     return content.isEmpty() || ParseOptions(content);
 }
 

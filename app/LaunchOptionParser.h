@@ -36,8 +36,11 @@ public:
 
     /// Reads a launch data file, in the locale's encoding, and sets the options it names.
     ///
-    /// @return false if the file is missing, cannot be opened, or ParseOptions() fails; an empty
-    ///         file sets nothing and succeeds
+    /// Only regular files and links to them are read: a pipe or a device could block, or never end.
+    ///
+    /// @return false if the file is missing, is not a regular file, cannot be opened, has more than
+    ///         67108864 characters (64 Mi), or if ParseOptions() fails; an empty file sets nothing
+    ///         and succeeds
     bool ReadDataFile(QString const& path);
 
     /// Sets the options that an XML text names.

@@ -5,38 +5,85 @@
 
 #include <QApplication>
 #include <QSocketNotifier>
+#include <QTimer>
 #include <QWidget>
 
+#include <atomic>
 #include <cerrno>
 #include <csignal>
+#include <ctime>
 #include <fcntl.h>
 #include <unistd.h>
 
 namespace {
 
+constexpr int Signals[] = {SIGINT, SIGTERM, SIGHUP};
+constexpr int SignalCount = sizeof(Signals) / sizeof(Signals[0]);
+constexpr long long None = -1;
+constexpr long long OneRequest = 100; // milliseconds
+constexpr int BoxInterval = 50;       // milliseconds
+
 int s_pipe[2] = {-1, -1};
+pid_t s_process = 0;
+struct sigaction s_before[SignalCount];
 
-extern "C" {
+std::atomic<long long> s_firstSignal{None}; // when it came
+static_assert(ATOMIC_LLONG_LOCK_FREE == 2, "used by a signal handler");
 
-// Static, for a namespace does not keep the name of a C function from other files.
-static void WakeEventLoop(int)
+long long Milliseconds()
 {
-    const int savedErrno = errno;
-    const char byte = 0;
-    const ssize_t written = write(s_pipe[1], &byte, 1);
-    static_cast<void>(written); // a full pipe has woken the loop already
-    errno = savedErrno;
+    timespec now = {};
+    clock_gettime(CLOCK_MONOTONIC, &now);
+    return now.tv_sec * 1000LL + now.tv_nsec / 1000000;
 }
-
-} // extern "C"
 
 void Handle(int signalNumber, void (*handler)(int))
 {
     struct sigaction action = {};
     action.sa_handler = handler;
     sigemptyset(&action.sa_mask);
+    for (int other : Signals)
+        sigaddset(&action.sa_mask, other);
     action.sa_flags = SA_RESTART;
     sigaction(signalNumber, &action, nullptr);
+}
+
+void WakeEventLoop()
+{
+    const char byte = 0;
+    const ssize_t written = write(s_pipe[1], &byte, 1);
+    static_cast<void>(written); // a full pipe wakes the loop too
+}
+
+// Takes effect when the handler returns: until then the signal is blocked.
+void DieOf(int signalNumber)
+{
+    Handle(signalNumber, SIG_DFL);
+    raise(signalNumber);
+}
+
+extern "C" {
+
+// Static, because a namespace does not keep the name of a C function from other files.
+static void QuitOnSignalHandler(int signalNumber)
+{
+    const int savedErrno = errno;
+    const long long now = Milliseconds();
+    long long first = None;
+    // A forked child shares the pipe, but its signals are not meant for its parent.
+    const bool isForked = getpid() != s_process;
+    if (!isForked && s_firstSignal.compare_exchange_strong(first, now))
+        WakeEventLoop();
+    else if (isForked || now - first >= OneRequest)
+        DieOf(signalNumber);
+    errno = savedErrno;
+}
+
+} // extern "C"
+
+bool IsIgnored(struct sigaction const& action)
+{
+    return action.sa_handler == SIG_IGN;
 }
 
 void DoNotBlockOrInherit(int file)
@@ -45,14 +92,28 @@ void DoNotBlockOrInherit(int file)
     fcntl(file, F_SETFD, FD_CLOEXEC);
 }
 
-bool AnyWindowVisible()
+bool HasWidgets()
 {
+    return qobject_cast<QApplication*>(QCoreApplication::instance()) != nullptr;
+}
+
+bool IsBoxOpen()
+{
+    return HasWidgets() && QApplication::activeModalWidget();
+}
+
+// False if a window refused.
+bool CloseWindows()
+{
+    if (!HasWidgets())
+        return true;
+    QApplication::closeAllWindows();
     const QWidgetList windows = QApplication::topLevelWidgets();
-    for (QWidget* window : windows) {
+    for (QWidget const* window : windows) {
         if (window->isVisible())
-            return true;
+            return false;
     }
-    return false;
+    return true;
 }
 
 } // namespace
@@ -65,9 +126,15 @@ QuitOnSignal::QuitOnSignal(QObject* parent) : QObject(parent)
     DoNotBlockOrInherit(s_pipe[0]);
     DoNotBlockOrInherit(s_pipe[1]);
     m_notifier = new QSocketNotifier(s_pipe[0], QSocketNotifier::Read, this);
-    connect(m_notifier, &QSocketNotifier::activated, this, [this] { closeWindows(); });
-    Handle(SIGINT, WakeEventLoop);
-    Handle(SIGTERM, WakeEventLoop);
+    connect(m_notifier, &QSocketNotifier::activated, this, [this] { takeSignal(); });
+
+    s_process = getpid();
+    s_firstSignal = None;
+    for (int i = 0; i < SignalCount; ++i) {
+        sigaction(Signals[i], nullptr, &s_before[i]);
+        if (!IsIgnored(s_before[i]))
+            Handle(Signals[i], QuitOnSignalHandler);
+    }
 }
 
 QuitOnSignal::~QuitOnSignal()
@@ -75,19 +142,36 @@ QuitOnSignal::~QuitOnSignal()
     if (!m_notifier)
         return;
 
-    Handle(SIGINT, SIG_DFL);
-    Handle(SIGTERM, SIG_DFL);
+    for (int i = 0; i < SignalCount; ++i)
+        sigaction(Signals[i], &s_before[i], nullptr);
     close(s_pipe[0]);
     close(s_pipe[1]);
 }
 
-void QuitOnSignal::closeWindows()
+void QuitOnSignal::takeSignal()
 {
     char byte = 0;
     while (read(s_pipe[0], &byte, 1) == 1) {}
+    endProgram();
+}
 
-    // A window may refuse, as it may towards its user; without any there is nobody to ask.
-    QApplication::closeAllWindows();
-    if (!AnyWindowVisible())
+void QuitOnSignal::endProgram()
+{
+    const bool boxWasOpen = IsBoxOpen();
+    if (CloseWindows()) {
         QCoreApplication::quit();
+        // Before exec() that ended the loop of a box only. Once exec() ends, this is never called.
+        QTimer::singleShot(0, this, &QuitOnSignal::endProgram);
+    } else if (boxWasOpen) {
+        // It was in the way of the others, or belongs to a window that is about to close.
+        QTimer::singleShot(BoxInterval, this, &QuitOnSignal::endProgramAfterBox);
+    }
+}
+
+void QuitOnSignal::endProgramAfterBox()
+{
+    if (IsBoxOpen())
+        QTimer::singleShot(BoxInterval, this, &QuitOnSignal::endProgramAfterBox);
+    else
+        endProgram();
 }

@@ -3,9 +3,10 @@
 
 #include "app/WithoutOpenGl.h"
 
-#include <QByteArray>
 #include <QGuiApplication>
 #include <QOpenGLContext>
+
+#include <stdlib.h> // setenv() is not in <cstdlib>
 
 namespace Velocor {
 
@@ -15,10 +16,11 @@ constexpr char const* Variable = "QT_XCB_GL_INTEGRATION";
 
 } // namespace
 
-WithoutOpenGl::WithoutOpenGl() : m_isSet(!qEnvironmentVariableIsSet(Variable))
+// Runs before the application object exists, so it uses the C library only.
+WithoutOpenGl::WithoutOpenGl() : m_isSet(!getenv(Variable))
 {
     if (m_isSet)
-        qputenv(Variable, "none");
+        setenv(Variable, "none", 1);
 }
 
 WithoutOpenGl::~WithoutOpenGl()
@@ -35,7 +37,7 @@ void WithoutOpenGl::End()
     if (QGuiApplication::platformName() == QLatin1String("xcb"))
         QOpenGLContext::supportsThreadedOpenGL();
 #endif
-    qunsetenv(Variable);
+    unsetenv(Variable);
     m_isSet = false;
 }
 

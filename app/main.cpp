@@ -2,16 +2,18 @@
 // SPDX-License-Identifier: MIT
 
 #include "app/AppPaths.h"
+#include "app/FailedWrites.h"
 #include "app/QuitOnSignal.h"
+#include "app/ScreenlessPlatform.h"
+#include "app/StandardStreams.h"
 #include "app/WithoutOpenGl.h"
 #include "app/window/MainWindow.h"
 #include "common/log/TorkLog.h"
 
 #include <QApplication>
 #include <QDebug>
+#include <QFile>
 #include <QMessageLogger>
-
-#include <cstdio>
 
 namespace {
 
@@ -21,24 +23,24 @@ QString Caption()
     return product.isEmpty() ? QStringLiteral("Velocor") : product;
 }
 
-// Started without a screen, the program can tell where its log is only on the terminal.
-void TellLogFileWithoutScreen()
+// Without a screen, the terminal is the only place to say where the log is.
+void PrintLogFileIfScreenless()
 {
-    const QString platform = QGuiApplication::platformName();
-    if (platform != QLatin1String("offscreen") && platform != QLatin1String("minimal"))
+    if (!Velocor::IsScreenlessPlatform())
         return;
-
-    const QByteArray logFile = TorkLog::logger()->newLogFileName().toLocal8Bit();
-    std::printf("Log file: %s\n", logFile.constData());
-    std::fflush(stdout);
+    const QString logFile = TorkLog::logger()->currentLogFile();
+    Velocor::PrintWithoutWaiting("Log file: " + QFile::encodeName(logFile) + '\n');
 }
 
 } // namespace
 
-// The order matters: the log's directory follows from the names, and message boxes from the
-// caption.
+// The order matters: nothing of Qt may run before the application object exists, the log directory
+// follows from the names, and message boxes take their title from the caption. Printing comes after
+// the log entry, so that no trouble with standard output can keep the entry from being written.
 int main(int argc, char** argv)
 {
+    Velocor::OpenMissingStandardStreams();
+    SurviveFailedWrites();
     Velocor::WithoutOpenGl withoutOpenGl;
     QApplication application(argc, argv);
     withoutOpenGl.End();
@@ -49,8 +51,8 @@ int main(int argc, char** argv)
     QuitOnSignal quitOnSignal;
     Velocor::MainWindow window;
     window.show();
-    TellLogFileWithoutScreen();
 
     QMessageLogger(nullptr, 0, nullptr).debug() << "app.exec() starting";
+    PrintLogFileIfScreenless();
     return QApplication::exec();
 }

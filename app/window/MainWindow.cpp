@@ -3,6 +3,7 @@
 
 #include "app/window/MainWindow.h"
 
+#include "app/ScreenlessPlatform.h"
 #include "app/UserMessages.h"
 #include "app/runninglog/LogHealth.h"
 #include "app/runninglog/RunningLog.h"
@@ -68,6 +69,10 @@ MainWindow::MainWindow(QWidget* parent)
 {
     setWindowTitle(Property("caption"));
     setAcceptDrops(true);
+    // Size limits are for the window manager. A platform without one says in the log that it cannot
+    // pass them on.
+    if (IsScreenlessPlatform())
+        layout()->setSizeConstraint(QLayout::SetNoConstraint);
     makeFirstContent();
     restoreFirstState();
 }

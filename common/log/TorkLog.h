@@ -116,6 +116,10 @@ public:
     /// overwrites.
     QString& newLogFileName();
 
+    /// The full name of the file that entries go to: of the open file, whatever the settings say by
+    /// now, or, if none is open, the name that the next entry opens. Any thread.
+    QString currentLogFile() const;
+
     /// Opens a log file for writing from its start on, without truncating it, after closing the
     /// one that is open. On failure the reason is left in errorString().
     bool open(QString const& fileName);

@@ -132,6 +132,12 @@ QString& TorkLog::newLogFileName()
     return m_logFileName;
 }
 
+QString TorkLog::currentLogFile() const
+{
+    TorkLogLock lock(m_mutex);
+    return m_file.isOpen() ? m_file.fileName() : currentFilePath();
+}
+
 bool TorkLog::open(QString const& fileName)
 {
     TorkLogLock lock(m_mutex);

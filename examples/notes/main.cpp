@@ -6,6 +6,7 @@
 #include "NotesWindow.h"
 
 #include "app/AppPaths.h"
+#include "app/FailedWrites.h"
 #include "app/QuitOnSignal.h"
 #include "common/log/TorkLog.h"
 
@@ -15,6 +16,7 @@
 // message boxes take their title from the caption.
 int main(int argc, char** argv)
 {
+    SurviveFailedWrites();
     QApplication application(argc, argv);
     AppPaths::SetOrganizationAndProduct("Tork", "Notes");
     TorkLog::initialize("notes"); // makes the data directory too

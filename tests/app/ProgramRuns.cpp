@@ -53,3 +53,10 @@ ProgramResult RunProgram(QString const& program, QStringList const& arguments,
     result.errors = process.readAllStandardError();
     return result;
 }
+
+QByteArray NextLine(QProcess& process)
+{
+    process.setReadChannel(QProcess::StandardOutput);
+    while (!process.canReadLine() && process.waitForReadyRead(30000)) {}
+    return process.readLine();
+}

@@ -4,9 +4,12 @@
 #pragma once
 
 #include <QByteArray>
+#include <QProcess>
 #include <QProcessEnvironment>
 #include <QString>
 #include <QStringList>
+
+#include <functional>
 
 /// Copies a program as @p folder / @p name, so that it runs from there. False if that fails.
 bool CopyProgram(QString const& program, QString const& folder, QString const& name);
@@ -27,3 +30,28 @@ struct ProgramResult
 /// Runs a program to its end.
 ProgramResult RunProgram(QString const& program, QStringList const& arguments,
                          QProcessEnvironment const& environment);
+
+/// A process that does something in the child before the program starts there. Killed with it if it
+/// still runs.
+class PreparedProcess : public QProcess
+{
+public:
+    ~PreparedProcess() override
+    {
+        kill();
+        waitForFinished();
+    }
+
+    std::function<void()> inChild; ///< async-signal-safe calls only
+
+protected:
+    void setupChildProcess() override
+    {
+        if (inChild)
+            inChild();
+    }
+};
+
+/// The next line of a process's standard output, with its line end. What there is of it if the
+/// process ends or falls silent before.
+QByteArray NextLine(QProcess& process);

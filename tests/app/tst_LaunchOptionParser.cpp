@@ -9,6 +9,9 @@
 #include <QTest>
 #include <QTextCodec>
 
+#include <sys/stat.h>
+#include <unistd.h>
+
 namespace {
 
 constexpr int TenMegabytes = 10 * 1000 * 1000;
@@ -67,6 +70,11 @@ private slots:
     void readDataFile();
     void missingFile();
     void folderInItsPlace();
+    void noRegularFile_data();
+    void noRegularFile();
+    void linkToARegularFile();
+    void longestFile_data();
+    void longestFile();
     void emptyPath();
     void pathWithBlanksAndLetters();
     void hugeFile_data();
@@ -546,6 +554,73 @@ void tst_LaunchOptionParser::folderInItsPlace()
     QCOMPARE(parser.ReadDataFile(folder.path()), false);
     QCOMPARE(Shown(parser, "product"), QString("unset"));
     QCOMPARE(parser.errorText, QString());
+}
+
+void tst_LaunchOptionParser::noRegularFile_data()
+{
+    QTest::addColumn<QString>("target");
+
+    QTest::newRow("pipe") << QString();
+    QTest::newRow("link to a pipe") << QString("pipe");
+    QTest::newRow("link to an endless device") << QString("/dev/zero");
+    QTest::newRow("link to an empty device") << QString("/dev/null");
+    QTest::newRow("link to nothing") << QString("/nowhere");
+    QTest::newRow("link to itself") << QString("appdata.cfg");
+}
+
+void tst_LaunchOptionParser::noRegularFile()
+{
+    QFETCH(QString, target);
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("appdata.cfg");
+    const QString pipe = folder.filePath("pipe");
+    QCOMPARE(mkfifo(qPrintable(target.isEmpty() ? path : pipe), 0600), 0);
+    if (!target.isEmpty())
+        QCOMPARE(symlink(qPrintable(target), qPrintable(path)), 0);
+    LaunchOptionParser parser;
+    AddBothOptions(parser);
+
+    QCOMPARE(parser.ReadDataFile(path), false);
+    QCOMPARE(Shown(parser, "product"), QString("unset"));
+    QCOMPARE(parser.errorText, QString());
+}
+
+void tst_LaunchOptionParser::linkToARegularFile()
+{
+    const QTemporaryDir folder;
+    QVERIFY(TestFiles::write(folder.filePath("real.cfg"), "<arg key=\"product\">P</arg>"));
+    QCOMPARE(symlink("real.cfg", qPrintable(folder.filePath("appdata.cfg"))), 0);
+    LaunchOptionParser parser;
+    AddBothOptions(parser);
+
+    QCOMPARE(parser.ReadDataFile(folder.filePath("appdata.cfg")), true);
+    QCOMPARE(Shown(parser, "product"), QString("[P]"));
+}
+
+void tst_LaunchOptionParser::longestFile_data()
+{
+    QTest::addColumn<int>("length");
+    QTest::addColumn<bool>("expected");
+    QTest::addColumn<QString>("product");
+
+    QTest::newRow("64 MiB") << 64 * 1024 * 1024 << true << "[P]";
+    QTest::newRow("one more") << 64 * 1024 * 1024 + 1 << false << "unset";
+}
+
+// The rest of the file is zeros that take no room on the disk.
+void tst_LaunchOptionParser::longestFile()
+{
+    QFETCH(int, length);
+    QFETCH(bool, expected);
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("appdata.cfg");
+    QVERIFY(TestFiles::write(path, "<arg key=\"product\">P</arg>"));
+    QVERIFY(QFile::resize(path, length));
+    LaunchOptionParser parser;
+    AddBothOptions(parser);
+
+    QCOMPARE(parser.ReadDataFile(path), expected);
+    QTEST(Shown(parser, "product"), "product");
 }
 
 void tst_LaunchOptionParser::emptyPath()

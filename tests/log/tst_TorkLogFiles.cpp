@@ -27,6 +27,7 @@ private slots:
     void namesWithoutPrefix();
     void namesWithoutExtension();
     void nameBuffersAreOverwritten();
+    void currentLogFileIsTheOpenOne();
 
     void openCreatesTheFile();
     void openWritesOverTheStart();
@@ -240,6 +241,25 @@ void tst_TorkLogFiles::nameBuffersAreOverwritten()
     QCOMPARE(&log.newLogFileName(), &name);
     QCOMPARE(name, QString("/y/app.log"));
     QCOMPARE(folder.listing(), QStringList());
+}
+
+void tst_TorkLogFiles::currentLogFileIsTheOpenOne()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    const QString first = log.newLogFileName();
+    QCOMPARE(log.currentLogFile(), first);
+    QCOMPARE(folder.listing(), QStringList());
+
+    log.write("a\n");
+    log.setOutputPath(log.path() + "later/");
+    QCOMPARE(log.currentLogFile(), first);
+    QVERIFY(TestFiles::read(first).startsWith("a\n"));
+
+    log.close();
+    QCOMPARE(log.currentLogFile(), log.newLogFileName());
+    QVERIFY(log.currentLogFile() != first);
 }
 
 void tst_TorkLogFiles::openCreatesTheFile()

@@ -8,6 +8,7 @@ set(expected
     appdata.cfg
     include/tork/app/AppPaths.h
     include/tork/app/AppUtils.h
+    include/tork/app/FailedWrites.h
     include/tork/app/LaunchOption.h
     include/tork/app/LaunchOptionParser.h
     include/tork/app/QuitOnSignal.h

@@ -60,6 +60,8 @@ inline bool limitFileSize(unsigned long bytes)
 {
 #ifdef Q_OS_UNIX
     std::atexit([] { unlimitFileSize(); });
+    // By default the system would kill this process, as it would any program that does not ask for
+    // failed writes.
     std::signal(SIGXFSZ, SIG_IGN);
     rlimit limit = {};
     if (getrlimit(RLIMIT_FSIZE, &limit) != 0)

@@ -1,0 +1,16 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/ScreenlessPlatform.h"
+
+#include <QGuiApplication>
+
+namespace Velocor {
+
+bool IsScreenlessPlatform()
+{
+    const QString platform = QGuiApplication::platformName();
+    return platform == QLatin1String("offscreen") || platform == QLatin1String("minimal");
+}
+
+} // namespace Velocor

@@ -1,0 +1,12 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+namespace Velocor {
+
+/// Whether Qt runs on a platform that shows nothing and has no window manager: "offscreen" or
+/// "minimal". Needs the application object; GUI thread.
+bool IsScreenlessPlatform();
+
+} // namespace Velocor

@@ -1,0 +1,33 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/StandardStreams.h"
+
+#include <QByteArray>
+
+#include <fcntl.h>
+#include <poll.h>
+#include <unistd.h>
+
+namespace Velocor {
+
+void OpenMissingStandardStreams()
+{
+    // The system gives out the lowest free number, so in this order each stream gets its own.
+    for (int stream : {STDIN_FILENO, STDOUT_FILENO, STDERR_FILENO}) {
+        if (fcntl(stream, F_GETFD) == -1)
+            open("/dev/null", O_RDWR);
+    }
+}
+
+void PrintWithoutWaiting(QByteArray const& text)
+{
+    pollfd output = {STDOUT_FILENO, POLLOUT, 0};
+    if (poll(&output, 1, 0) != 1 || !(output.revents & POLLOUT))
+        return;
+    const ssize_t written =
+        write(STDOUT_FILENO, text.constData(), static_cast<size_t>(text.size()));
+    static_cast<void>(written); // nobody can be told
+}
+
+} // namespace Velocor
