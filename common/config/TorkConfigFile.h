@@ -29,6 +29,14 @@ class TorkConfigFileDocHandler;
 /// case-sensitive. No reader ever stores a default: a missing key stays missing until it is
 /// written. A successful section lookup makes that section the current one.
 ///
+/// @warning Not every text comes back, and a wrong one takes others along. A value `disk 90%1`,
+/// `http://h/a%20b%2Fc` or `%L1`, and a key or section name such as `1st`, `C++`, `a/b`, `naïve` or
+/// an empty one, make a file that the next Load() refuses: all that follows in it is lost. So pass
+/// text of users and other programs through TorkConfigText, which brings every text back. Without
+/// it these are safe: for values, a space and printable ASCII without "%" and "]]>", at least one
+/// character; for names, ASCII letters, digits, "_", "-" and ".", a letter or "_" first, and not
+/// the root element's name. What else does not come back: docs/config-file.md.
+///
 /// One thread at a time. No operation throws.
 ///
 ///     TorkConfigFile settings(dataPath + "viewer.cfg");
