@@ -460,6 +460,8 @@ void tst_Faults::configurationSaved()
 // stays.
 void tst_Faults::configurationReplaced()
 {
+    QFETCH(int, error);
+    QStringList failedSyncs;
     for (int step = 1;; ++step, ++s_steps) {
         Scene scene;
         TestFiles::write(scene.configuration(), oldConfiguration);
@@ -477,6 +479,15 @@ void tst_Faults::configurationReplaced()
         const QByteArray left = TestFiles::read(scene.configuration());
         CHECK(left == (saved ? newConfiguration : oldConfiguration));
         CHECK(saved || configuration.m_lastError.startsWith("Unable to save " + link + ": "));
+        const bool isAgain =
+            error == EINTR && QStringList({"open", "write", "fsync"}).contains(scene.files.call());
+        CHECK(saved || !isAgain);
+        if (scene.files.call() == "fsync")
+            failedSyncs.append(QFileInfo(scene.files.path()).fileName());
+        const bool isNotOnDisk = (error == EIO || error == ENOSPC) &&
+                                 scene.files.call() == "fsync" &&
+                                 scene.files.path().endsWith(".saving");
+        CHECK(!saved || !isNotOnDisk);
         CHECK(QFile::permissions(scene.configuration()).testFlag(QFile::ReadGroup));
         CHECK(QFileInfo(link).isSymLink());
         CHECK(configuration.SaveAtomically());
@@ -490,6 +501,9 @@ void tst_Faults::configurationReplaced()
             break;
         }
     }
+    // It waits for the file, and for its folder.
+    QVERIFY(error == 0 || failedSyncs.contains("viewer.cfg.saving"));
+    QVERIFY(error == 0 || failedSyncs.size() >= 2);
 }
 
 void tst_Faults::configurationLoaded()
