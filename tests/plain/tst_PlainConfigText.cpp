@@ -159,7 +159,7 @@ void tst_PlainConfigText::randomTexts()
     const QString dangerous = "%123L]>&'<\"\\_u0041-.:/ \t\r\nVe";
     const QStringList pieces = {"%1",  "%L2", "]]>", "\\u0041",  "_u0041", "VelocorSettings",
                                 "xml", "\\",  "_",   "<![CDATA["};
-    const int files = Rounds::count(40, 10000);
+    const int files = Rounds::count(40, 2000);
     for (int file = 0; file < files; ++file) {
         QSet<QString> texts = {QString("")};
         while (texts.size() < 100) {
@@ -188,7 +188,7 @@ void tst_PlainConfigText::randomTexts()
 void tst_PlainConfigText::randomEncodings()
 {
     const QString alphabet = "\\_u0041ef%a ";
-    const int count = Rounds::count(100000, 10000000);
+    const int count = Rounds::count(100000, 3000000);
     for (int i = 0; i < count; ++i) {
         QString text;
         for (unsigned left = m_random() % 14; left > 0; --left)
