@@ -22,7 +22,7 @@
 namespace {
 
 // Far above any real file and far below what would exhaust the memory at the start of a program.
-constexpr int MaximumLength = 64 * 1024 * 1024;
+constexpr int MaximumLength = 256 * 1024 * 1024;
 
 using XmlAttribute = rapidxml::xml_attribute<char>;
 using XmlNode = rapidxml::xml_node<char>;

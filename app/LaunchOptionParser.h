@@ -39,7 +39,7 @@ public:
     /// Only regular files and links to them are read: a pipe or a device could block, or never end.
     ///
     /// @return false if the file is missing, is not a regular file, cannot be opened, has more than
-    ///         67108864 characters (64 Mi), or if ParseOptions() fails; an empty file sets nothing
+    ///         268435456 characters (256 Mi), or if ParseOptions() fails; an empty file sets nothing
     ///         and succeeds
     bool ReadDataFile(QString const& path);
 

@@ -31,7 +31,7 @@ fi
 
 dictionary() {
     case "$1" in
-    config_values) echo values.dict ;;
+    config_text | config_values) echo values.dict ;;
     log_line) echo log.dict ;;
     *) echo xml.dict ;;
     esac

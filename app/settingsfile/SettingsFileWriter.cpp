@@ -108,8 +108,7 @@ QString SettingsFileWriter::SaveUnchecked(QString const& path, SettingsDocument 
             store.WriteItem(section.name, item.key,
                             item.value.isNull() ? QString(QLatin1String("")) : item.value);
     }
-    store.Save();
-    return store.m_lastError;
+    return store.SaveAtomically() ? QString() : store.m_lastError;
 }
 
 bool SettingsFileWriter::Save(QString const& path, SettingsDocument const& document, QString* error)

@@ -4,6 +4,7 @@
 #include "app/window/WindowSettings.h"
 
 #include "app/settingsfile/SettingsFileReader.h"
+#include "common/config/TorkConfigText.h"
 
 #include <QDir>
 #include <QFile>
@@ -53,21 +54,7 @@ QRect NormalGeometry(QWidget const* window)
     return normal.isValid() ? normal : window->geometry();
 }
 
-// The store keeps ASCII only, and neither "%1" nor "]]>"; paths may hold anything.
-QString Escaped(QString const& text)
-{
-    QString escaped;
-    for (QChar c : text) {
-        const bool plain = c.unicode() >= 0x20 && c.unicode() < 0x7f && c != QLatin1Char('\\') &&
-                           c != QLatin1Char('%') && c != QLatin1Char(']');
-        if (plain)
-            escaped += c;
-        else
-            escaped += QStringLiteral("\\u%1").arg(c.unicode(), 4, 16, QLatin1Char('0'));
-    }
-    return escaped;
-}
-
+// Values of earlier versions, which left more signs as they are.
 QString Unescaped(QString const& text)
 {
     QString plain;
@@ -135,9 +122,7 @@ QString WindowSettings::Save()
     if (QFileInfo::exists(m_fileName) && !QFileInfo(m_fileName).isFile())
         return QObject::tr("The settings file %1 is not a regular file").arg(m_fileName);
     QDir().mkpath(QFileInfo(m_fileName).path());
-    m_file.m_lastError.clear();
-    m_file.Save();
-    return m_file.m_lastError;
+    return m_file.SaveAtomically() ? QString() : m_file.m_lastError;
 }
 
 void WindowSettings::RestoreGeometry(QWidget* window)
@@ -207,12 +192,14 @@ QString WindowSettings::Text(QString const& key)
     QString none;
     QString value;
     m_file.ReadItem(Section(), key, none, value);
-    return Unescaped(value);
+    bool isEncoded = false;
+    const QString text = TorkConfigText::DecodeValue(value, &isEncoded);
+    return isEncoded ? text : Unescaped(value);
 }
 
 void WindowSettings::SetText(QString const& key, QString const& value)
 {
-    m_file.WriteItem(Section(), key, QLatin1String("") + Escaped(value));
+    m_file.WriteItem(Section(), key, TorkConfigText::EncodeValue(value));
 }
 
 } // namespace Velocor

@@ -20,14 +20,22 @@ class TorkConfigFileDocHandler;
 
 /// The settings of one component: named sections of key/value texts in one small XML file.
 ///
-/// Only Load() and Save() touch the disk; everything else works on the sections in memory.
-/// The file has three levels: a root element, one element per section, one element per key with
-/// the value as its text. File format: docs/config-file.md.
+/// Only Load(), Save() and SaveAtomically() touch the disk; everything else works on the sections
+/// in memory. The file has three levels: a root element, one element per section, one element per
+/// key with the value as its text. File format: docs/config-file.md.
 ///
 /// In every operation that takes a section and a key, all space characters are removed from both
 /// before use ("Main Window" and "MainWindow" are the same section); lookups are then exact and
 /// case-sensitive. No reader ever stores a default: a missing key stays missing until it is
 /// written. A successful section lookup makes that section the current one.
+///
+/// @warning Not every text comes back, and a wrong one takes others along. A value `disk 90%1`,
+/// `http://h/a%20b%2Fc` or `%L1`, and a key or section name such as `1st`, `C++`, `a/b`, `naïve` or
+/// an empty one, make a file that the next Load() refuses: all that follows in it is lost. So pass
+/// text of users and other programs through TorkConfigText, which brings every text back. Without
+/// it these are safe: for values, a space and printable ASCII without "%" and "]]>", at least one
+/// character; for names, ASCII letters, digits, "_", "-" and ".", a letter or "_" first, and not
+/// the root element's name. What else does not come back: docs/config-file.md.
 ///
 /// One thread at a time. No operation throws.
 ///
@@ -36,9 +44,7 @@ class TorkConfigFileDocHandler;
 ///     int columns = 0;
 ///     settings.ReadInt("Main Window", "columns", 3, columns);
 ///     settings.WriteItem("Main Window", "columns", columns + 1);
-///     settings.m_lastError.clear(); // of a missing file, which Save() makes
-///     settings.Save();
-///     if (!settings.m_lastError.isEmpty())
+///     if (!settings.SaveAtomically())
 ///         WarningMessage(window, settings.m_lastError, true);
 class TorkConfigFile
 {
@@ -72,7 +78,8 @@ public:
     ///         the file does not parse (what preceded the error is kept, earlier sections are gone)
     bool Load();
 
-    /// Writes all sections, replacing the file.
+    /// Writes all sections over the file, which is emptied first: a program killed in between
+    /// leaves a part of it or nothing. SaveAtomically() does not.
     ///
     /// Each line is converted to Latin-1, with "?" for what Latin-1 lacks. Nothing is written for a
     /// file name shorter than two characters.
@@ -80,6 +87,27 @@ public:
     /// @return always true, for historical callers; whether the file could be opened shows only in
     ///         m_lastError, which a successful Save() leaves as it was
     bool Save();
+
+    /// Replaces the file by the bytes that Save() would write, in one step: whatever happens, the
+    /// file is the old one or the new one, never a part.
+    ///
+    /// The bytes are written to a file beside it, of the same name with ".saving" at its end, which
+    /// takes the old one's place when it is on the disk. Permissions are kept, and so are owner and
+    /// group where this user may give files to them; access lists are not. Symbolic links are
+    /// followed and stay. A further hard link keeps the old contents. Processes and threads that
+    /// save the same file at once wait for each other, for a second at most.
+    ///
+    /// A program that is killed may leave the ".saving" file behind, which the next call removes.
+    ///
+    /// Where the folder does not let files be replaced, and for a device, the file is written in
+    /// place as Save() does it: only then can a part be left.
+    ///
+    /// @return whether the file holds all sections now. If false, m_lastError has the reason and,
+    ///         unless it was written in place, the file is untouched; a file that may not be
+    ///         written, a folder and a FIFO always are. If true, m_lastError is empty, or tells
+    ///         that and why the file was written in place. For a file name shorter than two
+    ///         characters true, with nothing written and m_lastError untouched.
+    bool SaveAtomically();
 
     /// Whether a section of exactly that name exists; `name` is used as it stands, blanks included.
     bool HasSection(QString const& name);
@@ -230,8 +258,8 @@ private:
     QString m_currentElement;
 
 public:
-    /// What the last Load() or Save() had to complain about; emptied by a Load() that finds its
-    /// file. Read it directly.
+    /// What the last Load(), Save() or SaveAtomically() had to complain about; emptied by a Load()
+    /// that finds its file, and by SaveAtomically(). Read it directly.
     QString m_lastError;
 
 private:

@@ -1,13 +1,17 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Prints the bookmarks of an XBEL 1.0 file as a tree, and writes them back if asked to.
+// Prints the bookmarks of an XBEL 1.0 file as a tree, and writes them back if asked to. Remembers
+// which files it has read.
 
 #include "BookmarkErrors.h"
 #include "BookmarkReader.h"
 #include "BookmarkWriter.h"
+#include "ReadFiles.h"
 
 #include <QCoreApplication>
+#include <QFileInfo>
+#include <QStandardPaths>
 #include <QStringList>
 #include <QTextStream>
 
@@ -42,15 +46,29 @@ int CannotWrite(QString const& path, QString const& reason)
     return 1;
 }
 
+QString SettingsFile()
+{
+    return QStandardPaths::writableLocation(QStandardPaths::AppDataLocation) + "/bookmarks.cfg";
+}
+
 } // namespace
 
 int main(int argc, char** argv)
 {
     QCoreApplication application(argc, argv);
+    QCoreApplication::setOrganizationName("Tork");
+    QCoreApplication::setApplicationName("Bookmarks");
     const QStringList arguments = application.arguments();
+    QTextStream out(stdout);
+    ReadFiles files(SettingsFile());
+    if (arguments.size() == 2 && arguments[1] == "--files") {
+        files.Print(out);
+        return 0;
+    }
     const bool writes = arguments.size() == 4 && arguments[2] == "--write";
     if (arguments.size() != 2 && !writes) {
-        QTextStream(stderr) << "usage: bookmarks FILE [--write OUT]\n";
+        QTextStream(stderr) << "usage: bookmarks FILE [--write OUT]\n"
+                               "       bookmarks --files\n";
         return 2;
     }
 
@@ -58,7 +76,11 @@ int main(int argc, char** argv)
     if (!reader.Read(arguments[1]))
         return CannotRead(reader);
 
-    QTextStream out(stdout);
+    const QString unkept =
+        files.Note(QFileInfo(arguments[1]).absoluteFilePath(), reader.root().title);
+    if (!unkept.isEmpty())
+        QTextStream(stderr) << unkept << '\n';
+
     out << reader.root().title << "/\n";
     PrintTree(out, reader.root(), 1);
 

@@ -14,6 +14,7 @@ class tst_Bookmarks : public QObject
     Q_OBJECT
 
 private slots:
+    void init();
     void sample();
     void writtenBytes();
     void roundTrip_data();
@@ -23,6 +24,8 @@ private slots:
     void missingInput();
     void outputThatCannotBeWritten_data();
     void outputThatCannotBeWritten();
+    void filesReadSoFar();
+    void brokenSettingsAreLeft();
     void usage_data();
     void usage();
 
@@ -34,16 +37,28 @@ private:
         QString errors;
     };
 
+    QString settingsFile() const { return m_data->filePath("Tork/Bookmarks/bookmarks.cfg"); }
     Result run(QStringList const& arguments) const;
     QString written(QByteArray const& content) const;
     QByteArray read(QString const& path) const;
 
     QTemporaryDir m_folder;
+    QScopedPointer<QTemporaryDir> m_data; // what the program remembers
 };
+
+void tst_Bookmarks::init()
+{
+    m_data.reset(new QTemporaryDir);
+    QVERIFY2(m_data->isValid(), qPrintable(m_data->errorString()));
+}
 
 tst_Bookmarks::Result tst_Bookmarks::run(QStringList const& arguments) const
 {
+    QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
+    environment.insert("HOME", m_data->path()); // for systems that do not know the other one
+    environment.insert("XDG_DATA_HOME", m_data->path());
     QProcess process;
+    process.setProcessEnvironment(environment);
     process.start(BOOKMARKS_PROGRAM, arguments);
     if (!process.waitForFinished(60000) || process.exitStatus() != QProcess::NormalExit)
         return {-1, QString(), process.errorString()};
@@ -227,6 +242,42 @@ void tst_Bookmarks::outputThatCannotBeWritten()
     QCOMPARE(result.exitCode, 1);
 }
 
+// Whatever they and their titles are called.
+void tst_Bookmarks::filesReadSoFar()
+{
+    QCOMPARE(run({"--files"}).output, QString());
+    QCOMPARE(run({BOOKMARKS_SAMPLE}).exitCode, 0);
+
+    const QString title = QString::fromUtf8("90%1 ]]> R&D größe");
+    const QString path = m_folder.filePath("plan%2Ffinal <1>.xbel");
+    QVERIFY(QFile::rename(
+        written("<xbel><title>" + title.toHtmlEscaped().toUtf8() + "</title></xbel>"), path));
+    QCOMPARE(run({path}).errors, QString());
+    QVERIFY(QFile::exists(settingsFile()));
+
+    const Result result = run({"--files"});
+    QCOMPARE(result.errors, QString());
+    QCOMPARE(result.exitCode, 0);
+    QStringList expected = {QFileInfo(BOOKMARKS_SAMPLE).absoluteFilePath() + ": Reading list\n",
+                            path + ": " + title + '\n'};
+    expected.sort();
+    QCOMPARE(result.output, expected.join(QString()));
+}
+
+void tst_Bookmarks::brokenSettingsAreLeft()
+{
+    QVERIFY(QDir().mkpath(QFileInfo(settingsFile()).path()));
+    QFile settings(settingsFile());
+    QVERIFY(settings.open(QIODevice::WriteOnly) && settings.write("<broken>") == 8);
+    settings.close();
+    const Result result = run({BOOKMARKS_SAMPLE});
+    QCOMPARE(result.exitCode, 0);
+    QVERIFY2(
+        result.errors.endsWith("bookmarks.cfg: ConfigFile - Could not parse the input file.\n"),
+        qPrintable(result.errors));
+    QCOMPARE(read(settingsFile()), QByteArray("<broken>"));
+}
+
 void tst_Bookmarks::usage_data()
 {
     QTest::addColumn<QStringList>("arguments");
@@ -240,7 +291,8 @@ void tst_Bookmarks::usage()
 {
     QFETCH(QStringList, arguments);
     const Result result = run(arguments);
-    QCOMPARE(result.errors, QString("usage: bookmarks FILE [--write OUT]\n"));
+    QCOMPARE(result.errors, QString("usage: bookmarks FILE [--write OUT]\n"
+                                    "       bookmarks --files\n"));
     QCOMPARE(result.exitCode, 2);
 }
 

@@ -5,6 +5,7 @@
 
 #include "app/AppUtils.h"
 #include "app/UserMessages.h"
+#include "common/config/TorkConfigText.h"
 
 #include <QAction>
 #include <QCloseEvent>
@@ -23,13 +24,6 @@
 namespace {
 
 const int RecentCount = 8;
-
-// The settings file is written in Latin-1 and read as UTF-8, so that only ASCII comes back as it
-// was. Handing over the bytes of UTF-8, one to a character, brings every name back.
-QString ForSettings(QString const& text)
-{
-    return QString::fromLatin1(text.toUtf8());
-}
 
 } // namespace
 
@@ -95,6 +89,7 @@ void NotesWindow::LoadSettings(bool firstStart)
 
     QString none;
     m_settings.ReadItem("Notes", "recent", none, m_recent);
+    m_recent = TorkConfigText::DecodeValue(m_recent);
 }
 
 void NotesWindow::SaveSettings()
@@ -106,11 +101,10 @@ void NotesWindow::SaveSettings()
     m_settings.WriteFont("Notes", "font", font);
     QColor colour = m_text->palette().color(QPalette::Text);
     m_settings.WriteColor("Notes", "colour", colour);
-    m_settings.WriteItem("Notes", "recent", ForSettings(m_recent));
+    // Files are called anything; the store brings back only some of it as it is.
+    m_settings.WriteItem("Notes", "recent", TorkConfigText::EncodeValue(m_recent));
 
-    m_settings.m_lastError.clear(); // whatever Load() left there: Save() only ever adds
-    m_settings.Save();
-    if (!m_settings.m_lastError.isEmpty())
+    if (!m_settings.SaveAtomically())
         CriticalMessage(this, m_settings.m_lastError, true);
 }
 

@@ -32,6 +32,10 @@ private slots:
     void firstStart();
     void placeFontAndColour();
     void recentFiles();
+    void recentFileOfAnyName_data();
+    void recentFileOfAnyName();
+    void settingsOfEarlierVersions_data();
+    void settingsOfEarlierVersions();
     void recentFileFromMenu();
     void missingRecentFile();
     void savesText();
@@ -181,6 +185,56 @@ void tst_Notes::recentFiles()
     QCOMPARE(recent(window).size(), 8);
 }
 
+void tst_Notes::recentFileOfAnyName_data()
+{
+    QTest::addColumn<QString>("name");
+
+    QTest::newRow("placeholder") << "plan%2Ffinal.txt";
+    QTest::newRow("more placeholders") << "%L1 90%1 %20";
+    QTest::newRow("end of a CDATA section") << "a]]>b";
+    QTest::newRow("markup") << "<R&D> \"'";
+    QTest::newRow("beyond ASCII") << QString::fromUtf8("größe ☃");
+    QTest::newRow("backslashes") << "\\u0041\\";
+    QTest::newRow("spaces around and a line break") << " a\nb ";
+}
+
+void tst_Notes::recentFileOfAnyName()
+{
+    QFETCH(QString, name);
+    const QString path = note(name);
+    {
+        NotesWindow window(m_settings);
+        window.resize(500, 400);
+        QVERIFY(window.OpenNote(path));
+        window.close();
+    }
+    NotesWindow window(m_settings);
+    QCOMPARE(m_boxes, QStringList());
+    QCOMPARE(window.size(), QSize(500, 400));
+    QCOMPARE(recent(window), QStringList(path));
+}
+
+void tst_Notes::settingsOfEarlierVersions_data()
+{
+    QTest::addColumn<QByteArray>("stored");
+    QTest::addColumn<QString>("path");
+
+    QTest::newRow("plain") << QByteArray("/a/b c.txt|") << "/a/b c.txt";
+    QTest::newRow("markup") << QByteArray("<![CDATA[/a/R&D]]>") << "/a/R&D";
+    QTest::newRow("beyond ASCII") << QByteArray("/a/gr\xc3\xb6\xc3\x9f")
+                                  << QString::fromUtf8("/a/größ");
+}
+
+void tst_Notes::settingsOfEarlierVersions()
+{
+    QFETCH(QByteArray, stored);
+    QFETCH(QString, path);
+    note("notes.cfg", "<VelocorSettings>\n<Notes>\n<recent>" + stored +
+                          "</recent>\n</Notes>\n</VelocorSettings>\n");
+    NotesWindow window(m_settings);
+    QCOMPARE(recent(window), QStringList(path));
+}
+
 void tst_Notes::recentFileFromMenu()
 {
     NotesWindow window(m_settings);
@@ -282,7 +336,7 @@ void tst_Notes::settingsThatCannotBeSaved()
     NotesWindow window(path);
     answer(QMessageBox::Ok);
     QVERIFY(window.close());
-    QCOMPARE(m_boxes, QStringList("Unable to open file: " + path));
+    QCOMPARE(m_boxes, QStringList("Unable to save " + path + ": No such file or directory"));
 }
 
 void tst_Notes::program()

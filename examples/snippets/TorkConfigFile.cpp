@@ -14,8 +14,6 @@ void AddColumn(QString const& dataPath, QWidget* window)
     int columns = 0;
     settings.ReadInt("Main Window", "columns", 3, columns);
     settings.WriteItem("Main Window", "columns", columns + 1);
-    settings.m_lastError.clear(); // of a missing file, which Save() makes
-    settings.Save();
-    if (!settings.m_lastError.isEmpty())
+    if (!settings.SaveAtomically())
         WarningMessage(window, settings.m_lastError, true);
 }

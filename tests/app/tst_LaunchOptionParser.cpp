@@ -603,8 +603,8 @@ void tst_LaunchOptionParser::longestFile_data()
     QTest::addColumn<bool>("expected");
     QTest::addColumn<QString>("product");
 
-    QTest::newRow("64 MiB") << 64 * 1024 * 1024 << true << "[P]";
-    QTest::newRow("one more") << 64 * 1024 * 1024 + 1 << false << "unset";
+    QTest::newRow("256 MiB") << 256 * 1024 * 1024 << true << "[P]";
+    QTest::newRow("one more") << 256 * 1024 * 1024 + 1 << false << "unset";
 }
 
 // The rest of the file is zeros that take no room on the disk.

@@ -372,6 +372,18 @@ int chmod(char const* path, mode_t mode) noexcept
     return Fails("chmod", path) ? -1 : original(path, mode);
 }
 
+int fchmod(int descriptor, mode_t mode) noexcept
+{
+    ORIGINAL(fchmod);
+    return Fails("fchmod", descriptor) ? -1 : original(descriptor, mode);
+}
+
+ssize_t readlink(char const* path, char* target, size_t size) noexcept
+{
+    ORIGINAL(readlink);
+    return Fails("readlink", path) ? -1 : original(path, target, size);
+}
+
 int access(char const* path, int mode) noexcept
 {
     ORIGINAL(access);

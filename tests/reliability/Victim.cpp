@@ -4,9 +4,11 @@
 // Logs and saves until it is killed, and tells after each call that it has returned.
 //
 //     reliability_victim ROOT RUN ENTRIES
+//     reliability_victim ROOT RUN atomically
 //
-// ROOT holds the folder logs/, settings.cfg and report, the shared memory. The log file is closed
-// after every ENTRIES entries, so that the next one opens it again; 0: it stays open.
+// The second only saves, each time by replacing the file in one step. ROOT holds the folder logs/,
+// settings.cfg and report, the shared memory. The log file is closed after every ENTRIES entries,
+// so that the next one opens it again; 0: it stays open.
 
 #include "reliability/Victim.h"
 
@@ -29,11 +31,23 @@ Victim::Report* shared(QString const& path)
     return reinterpret_cast<Victim::Report*>(file.map(0, sizeof(Victim::Report)));
 }
 
-void save(TorkConfigFile& configuration, quint64 run, quint64 number)
+void fill(TorkConfigFile& configuration, quint64 run, quint64 number)
 {
     configuration.WriteItem("state", "version", QString("%1.%2").arg(run).arg(number));
     configuration.WriteItem("state", "filler", QString::fromLatin1(Victim::filler(number)));
-    configuration.Save();
+}
+
+// False if a save fails.
+bool saveAtomically(TorkConfigFile& configuration, quint64 run, Victim::Report& report)
+{
+    report.running = 1;
+    for (quint64 number = 1;; ++number) {
+        fill(configuration, run, number);
+        report.saveBegun = number;
+        if (!configuration.SaveAtomically() || !configuration.m_lastError.isEmpty())
+            return false;
+        report.saveReturned = number;
+    }
 }
 
 } // namespace
@@ -49,9 +63,12 @@ int main(int argc, char** argv)
     if (!report)
         return 1;
 
+    TorkConfigFile configuration(root + "app.cfg");
+    if (QByteArray(argv[3]) == "atomically")
+        return saveAtomically(configuration, run, *report) ? 0 : 1;
+
     // Off until the settings are loaded, lest loading them is traced into the file.
     TorkLog* const log = TorkLog::initialize(root + "logs/", "app", root + "settings.cfg", false);
-    TorkConfigFile configuration(root + "app.cfg");
     report->running = 1;
 
     for (quint64 entry = 1;; ++entry) {
@@ -67,7 +84,8 @@ int main(int argc, char** argv)
             log->close();
         if (entry % entriesPerSave == 0) {
             report->saveBegun = entry / entriesPerSave;
-            save(configuration, run, entry / entriesPerSave);
+            fill(configuration, run, entry / entriesPerSave);
+            configuration.Save();
             report->saveReturned = entry / entriesPerSave;
         }
     }

@@ -42,10 +42,13 @@ private slots:
     void settingsLoaded();
     void configurationSaved_data() { faults(); }
     void configurationSaved();
+    void configurationReplaced_data() { faults(); }
+    void configurationReplaced();
     void configurationLoaded_data() { faults(); }
     void configurationLoaded();
 
     void diskFullAtEveryByteOfASave();
+    void diskFullAtEveryByteOfAReplacement();
     void diskFullAtEveryByteOfARotation();
     void diskFullAtEveryByteOfAnEntry();
     void diskFullForLong();
@@ -453,6 +456,56 @@ void tst_Faults::configurationSaved()
     }
 }
 
+// The file is the old one or the new one whatever fails, and the result tells which. A link to it
+// stays.
+void tst_Faults::configurationReplaced()
+{
+    QFETCH(int, error);
+    QStringList failedSyncs;
+    for (int step = 1;; ++step, ++s_steps) {
+        Scene scene;
+        TestFiles::write(scene.configuration(), oldConfiguration);
+        QFile::setPermissions(scene.configuration(),
+                              QFile::ReadOwner | QFile::WriteOwner | QFile::ReadGroup);
+        const QString link = scene.folder.root() + "link.cfg";
+        CHECK(QFile::link(scene.configuration(), link));
+        TorkConfigFile configuration(link);
+        fill(configuration);
+
+        scene.failAt(step);
+        const bool saved = configuration.SaveAtomically();
+        scene.files.mend();
+
+        const QByteArray left = TestFiles::read(scene.configuration());
+        CHECK(left == (saved ? newConfiguration : oldConfiguration));
+        CHECK(saved || configuration.m_lastError.startsWith("Unable to save " + link + ": "));
+        const bool isAgain =
+            error == EINTR && QStringList({"open", "write", "fsync"}).contains(scene.files.call());
+        CHECK(saved || !isAgain);
+        if (scene.files.call() == "fsync")
+            failedSyncs.append(QFileInfo(scene.files.path()).fileName());
+        const bool isNotOnDisk = (error == EIO || error == ENOSPC) &&
+                                 scene.files.call() == "fsync" &&
+                                 scene.files.path().endsWith(".saving");
+        CHECK(!saved || !isNotOnDisk);
+        CHECK(QFile::permissions(scene.configuration()).testFlag(QFile::ReadGroup));
+        CHECK(QFileInfo(link).isSymLink());
+        CHECK(configuration.SaveAtomically());
+        CHECK(configuration.m_lastError.isEmpty());
+        CHECK(TestFiles::read(scene.configuration()) == newConfiguration);
+        CHECK(!QFile::exists(scene.configuration() + ".saving"));
+        CHECK(QFileInfo(link).isSymLink());
+        CHECK(scene.othersAreUntouched());
+        if (!scene.files.reached()) {
+            CHECK(saved);
+            break;
+        }
+    }
+    // It waits for the file, and for its folder.
+    QVERIFY(error == 0 || failedSyncs.contains("viewer.cfg.saving"));
+    QVERIFY(error == 0 || failedSyncs.size() >= 2);
+}
+
 void tst_Faults::configurationLoaded()
 {
     const QString notFound = "ConfigFile - File not found.";
@@ -506,6 +559,29 @@ void tst_Faults::diskFullAtEveryByteOfASave()
         CHECK(configuration.Save());
         CHECK(loaded.Load());
         CHECK(value(loaded, "c") == "x & y");
+        CHECK(scene.othersAreUntouched());
+    }
+}
+
+// Beside the file there is no room for another, so it stays the old one.
+void tst_Faults::diskFullAtEveryByteOfAReplacement()
+{
+    for (int step = 0; step <= newConfiguration.size(); ++step, ++s_bytes) {
+        Scene scene;
+        TestFiles::write(scene.configuration(), oldConfiguration);
+        TorkConfigFile configuration(scene.configuration());
+        fill(configuration);
+
+        scene.files.limitBytes(step);
+        const bool saved = configuration.SaveAtomically();
+        scene.files.mend();
+
+        CHECK(saved == (step == newConfiguration.size()));
+        CHECK(scene.files.reached() != saved);
+        CHECK(configuration.m_lastError.isEmpty() == saved);
+        CHECK(TestFiles::read(scene.configuration()) ==
+              (saved ? newConfiguration : oldConfiguration));
+        CHECK(!QFile::exists(scene.configuration() + ".saving"));
         CHECK(scene.othersAreUntouched());
     }
 }

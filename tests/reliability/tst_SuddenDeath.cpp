@@ -32,6 +32,7 @@ private slots:
     void cleanup();
     void killed_data();
     void killed();
+    void killedWhileReplacing();
     void cleanupTestCase();
 
 private:
@@ -132,15 +133,16 @@ public:
     }
 
     // False if it did not come to life or ended by itself.
-    bool runAndKill(quint64 run, int entriesBetween)
+    //
+    // @param task  the victim's last argument
+    bool runAndKill(quint64 run, QByteArray const& task)
     {
         new (report) Victim::Report{};
         const QByteArray program = VICTIM;
         const QByteArray root = QFile::encodeName(m_root);
         const QByteArray number = QByteArray::number(run);
-        const QByteArray entries = QByteArray::number(entriesBetween);
         char* arguments[] = {const_cast<char*>(program.data()), const_cast<char*>(root.data()),
-                             const_cast<char*>(number.data()), const_cast<char*>(entries.data()),
+                             const_cast<char*>(number.data()), const_cast<char*>(task.data()),
                              nullptr};
         pid_t process = 0;
         if (posix_spawn(&process, program.constData(), nullptr, nullptr, arguments, environ) != 0)
@@ -253,6 +255,9 @@ quint64 s_entries = 0;
 quint64 s_saves = 0;
 quint64 s_halfEntries = 0;
 quint64 s_cutSaves = 0;
+quint64 s_replacingKills = 0;
+quint64 s_replacements = 0;
+quint64 s_leftovers = 0;
 
 } // namespace
 
@@ -306,7 +311,7 @@ void tst_SuddenDeath::killed()
     for (quint64 run = 1; run <= kills; ++run) {
         const Files before = filesIn(folder.logs());
         const QByteArray configuration = TestFiles::read(configurationFile);
-        QVERIFY(victims.runAndKill(run, entriesBetween));
+        QVERIFY(victims.runAndKill(run, QByteArray::number(entriesBetween)));
         const Files after = filesIn(folder.logs());
         const QByteArray left = TestFiles::read(configurationFile);
         QVERIFY(holdsOnlyTheLog(folder.logs()));
@@ -330,19 +335,74 @@ void tst_SuddenDeath::killed()
     }
 }
 
+// The file is a whole one each time: that of the last save that returned, or of the one under way.
+// Beside it is at most the new file of that one.
+void tst_SuddenDeath::killedWhileReplacing()
+{
+    const LogFolder folder;
+    const QString configurationFile = folder.root() + "app.cfg";
+    const QString newFile = configurationFile + ".saving";
+    QByteArray saved = Victim::configuration(0, 1);
+    QVERIFY(TestFiles::write(configurationFile, saved));
+    Victims victims(folder);
+    QVERIFY(victims.report);
+    const QStringList others = QDir(folder.root()).entryList(QDir::AllEntries | QDir::Hidden);
+
+    const quint64 kills = static_cast<quint64>(Figures::wanted("VELOCOR_KILLS", 60));
+    for (quint64 run = 1; run <= kills; ++run) {
+        QVERIFY(victims.runAndKill(run, "atomically"));
+        Victim::Report const& report = *victims.report;
+        const QByteArray left = TestFiles::read(configurationFile);
+        if (report.saveReturned)
+            saved = Victim::configuration(run, report.saveReturned);
+        const bool isUnderWay = report.saveBegun > report.saveReturned;
+        const bool isNew = isUnderWay && left == Victim::configuration(run, report.saveBegun);
+        QVERIFY2(left == saved || isNew,
+                 qPrintable(QString("run %1: %2 bytes after save %3 returned and %4 began")
+                                .arg(run)
+                                .arg(left.size())
+                                .arg(report.saveReturned)
+                                .arg(report.saveBegun)));
+        saved = left;
+
+        QStringList beside = QDir(folder.root()).entryList(QDir::AllEntries | QDir::Hidden);
+        s_leftovers += static_cast<quint64>(beside.removeAll("app.cfg.saving"));
+        QCOMPARE(beside, others);
+        ++s_replacingKills;
+        s_replacements += report.saveReturned;
+    }
+
+    TorkConfigFile last(configurationFile);
+    QVERIFY(last.Load());
+    QVERIFY(last.SaveAtomically());
+    QVERIFY(!QFile::exists(newFile));
+}
+
 void tst_SuddenDeath::cleanupTestCase()
 {
     if (m_failed)
         return;
-    QVERIFY(s_entries > 0 && s_saves > 0);
-    Figures::print(
-        QString("sudden death: %1 kills, %2 entries and %3 saves acknowledged, none "
-                "lost, none torn; the entry under way was cut %4 times, the save %5 times")
-            .arg(s_kills)
-            .arg(s_entries)
-            .arg(s_saves)
-            .arg(s_halfEntries)
-            .arg(s_cutSaves));
+    // Either may have been asked for alone.
+    if (s_kills) {
+        QVERIFY(s_entries > 0 && s_saves > 0);
+        Figures::print(
+            QString("sudden death: %1 kills, %2 entries and %3 saves acknowledged, none "
+                    "lost, none torn; the entry under way was cut %4 times, the save %5 times")
+                .arg(s_kills)
+                .arg(s_entries)
+                .arg(s_saves)
+                .arg(s_halfEntries)
+                .arg(s_cutSaves));
+    }
+    if (s_replacingKills) {
+        QVERIFY(s_replacements > 0);
+        Figures::print(
+            QString("sudden death in an atomic save: %1 kills, %2 saves acknowledged, none lost, "
+                    "no file cut; %3 kills left a new file beside it, and never more than one")
+                .arg(s_replacingKills)
+                .arg(s_replacements)
+                .arg(s_leftovers));
+    }
 }
 
 QTEST_GUILESS_MAIN(tst_SuddenDeath)

@@ -92,6 +92,11 @@ void tst_SystemLimits::fullDisk()
     const QByteArray whole = TestFiles::read(viewer);
 
     QVERIFY(disk.fill());
+    QVERIFY(!configuration.SaveAtomically());
+    QCOMPARE(configuration.m_lastError, "Unable to save " + viewer + ": No space left on device");
+    QCOMPARE(TestFiles::read(viewer), whole);
+    QVERIFY(!QFile::exists(viewer + ".saving"));
+    configuration.m_lastError.clear();
     write(log, "entry\n");
     QVERIFY(configuration.Save());
     QVERIFY(whole.startsWith(TestFiles::read(viewer)));
@@ -100,7 +105,8 @@ void tst_SystemLimits::fullDisk()
 
     QVERIFY(disk.makeRoom());
     write(log, "after\n");
-    QVERIFY(configuration.Save());
+    QVERIFY(configuration.SaveAtomically());
+    QCOMPARE(configuration.m_lastError, QString());
     QCOMPARE(TestFiles::read(viewer), whole);
     QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("entry\nafter\n"));
     QCOMPARE(TestFiles::read(folder.logs() + "app.log.2"), QByteArray("older\n"));
@@ -197,6 +203,9 @@ int writesWithoutDescriptors(QStringList const& arguments)
     std::printf("%s\n", qPrintable(isNot.errorString()));
     configuration.Save();
     std::printf("%s\n", qPrintable(configuration.m_lastError.section(':', 0, 0)));
+    const bool replaced = configuration.SaveAtomically();
+    std::printf("%s%s\n", replaced ? "replaced" : "not replaced",
+                qPrintable(configuration.m_lastError.section(':', -1)));
     configuration.Load();
     std::printf("%s\n", qPrintable(configuration.m_lastError));
 
@@ -219,6 +228,7 @@ void tst_SystemLimits::tooManyOpenFiles()
         QSKIP("The number of open files cannot be limited here.");
     QVERIFY2(child.ended(), child.report());
     QCOMPARE(child.output, QByteArray("Too many open files\nUnable to open file\n"
+                                      "not replaced Too many open files\n"
                                       "ConfigFile - Could not parse the input file.\nloaded\n"));
     QCOMPARE(TestFiles::read(folder.root() + "open/.log"),
              QByteArray("before\nmeanwhile\nafter\n"));

@@ -343,20 +343,23 @@ void tst_SettingsFile::saveFails()
     const QTemporaryDir folder;
     QString error;
     QVERIFY(!SettingsFileWriter::Save(folder.filePath("no/x.cfg"), OneValue("v"), &error));
-    QCOMPARE(error, "Unable to open file: " + folder.filePath("no/x.cfg"));
+    QCOMPARE(error,
+             "Unable to save " + folder.filePath("no/x.cfg") + ": No such file or directory");
 }
 
 void tst_SettingsFile::fullDisk()
 {
     const QTemporaryDir folder;
+    const QString path = folder.filePath("x.cfg");
+    QVERIFY(TestFiles::write(path, "old\n"));
     if (!ProcessLimits::limitFileSize(100))
         QSKIP("the size of files cannot be limited here");
     QString error;
-    const bool saved =
-        SettingsFileWriter::Save(folder.filePath("x.cfg"), OneValue(QString(1000, 'v')), &error);
+    const bool saved = SettingsFileWriter::Save(path, OneValue(QString(1000, 'v')), &error);
     ProcessLimits::unlimitFileSize();
     QVERIFY(!saved);
     QVERIFY(!error.isEmpty());
+    QCOMPARE(TestFiles::listing(folder.path()), QStringList("x.cfg: old\n"));
 }
 
 void tst_SettingsFile::backup()

@@ -871,7 +871,7 @@ void tst_MainWindow::saveFails()
         QTest::keyClick(box, Qt::Key_Return);
     });
     QVERIFY(!editor.Save());
-    QVERIFY2(text.contains("Unable to open file: " + file), qPrintable(text));
+    QVERIFY2(text.contains("Unable to save " + file), qPrintable(text));
     QVERIFY(editor.isModified());
 }
 

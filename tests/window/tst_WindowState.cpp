@@ -12,6 +12,7 @@
 #include "app/window/WindowSettings.h"
 #include "app/window/widgets/FileSizeText.h"
 #include "app/window/widgets/SeverityIcons.h"
+#include "support/ProcessLimits.h"
 
 #include <QMenu>
 #include <QScreen>
@@ -25,6 +26,9 @@ class tst_WindowState : public QObject
 private slots:
     void texts_data();
     void texts();
+    void textsOfEarlierVersions_data();
+    void textsOfEarlierVersions();
+    void fullDiskLeavesTheFile();
     void numbers_data();
     void numbers();
     void loadLogsNothing();
@@ -51,6 +55,7 @@ void tst_WindowState::texts_data()
     QTest::newRow("markup") << "<a> & \"b\" 'c'";
     QTest::newRow("end of CDATA") << "<x]]>";
     QTest::newRow("placeholder") << "%1 %L2 %%";
+    QTest::newRow("placeholder in a file name") << "/a/plan%2Ffinal.txt";
     QTest::newRow("beyond ASCII") << QString::fromUtf8("/K\xC3\xB6ln/\xE2\x82\xAC");
     QTest::newRow("backslashes") << "\\u0041 \\ \\\\u";
     QTest::newRow("control characters") << "a\tb\nc";
@@ -70,6 +75,46 @@ void tst_WindowState::texts()
     WindowSettings settings(test.folder() + "data/");
     QCOMPARE(settings.Load(), QString());
     QCOMPARE(settings.Text("key"), text);
+}
+
+void tst_WindowState::textsOfEarlierVersions_data()
+{
+    QTest::addColumn<QByteArray>("stored");
+    QTest::addColumn<QString>("text");
+    QTest::newRow("plain") << QByteArray("/a/b_20c.log|/d e.log") << "/a/b_20c.log|/d e.log";
+    QTest::newRow("markup") << QByteArray("<![CDATA[/a/R&D]]>") << "/a/R&D";
+    QTest::newRow("beyond ASCII") << QByteArray("/K\\u00f6ln") << QString::fromUtf8("/Köln");
+    QTest::newRow("both") << QByteArray("<![CDATA[R&D/\\u20ac\\u0025]]>")
+                          << QString::fromUtf8("R&D/€%");
+    QTest::newRow("empty") << QByteArray() << "";
+}
+
+void tst_WindowState::textsOfEarlierVersions()
+{
+    QFETCH(QByteArray, stored);
+    const WindowTest test;
+    QVERIFY(TestFiles::write(test.settingsFile(), "<VelocorSettings><MainWindow><key>" + stored +
+                                                      "</key></MainWindow></VelocorSettings>"));
+    WindowSettings settings(test.folder() + "data/");
+    QCOMPARE(settings.Load(), QString());
+    QTEST(settings.Text("key"), "text");
+}
+
+void tst_WindowState::fullDiskLeavesTheFile()
+{
+    const WindowTest test;
+    WindowSettings settings(test.folder() + "data/");
+    settings.SetText("key", "old");
+    QCOMPARE(settings.Save(), QString());
+    const QByteArray old = TestFiles::read(test.settingsFile());
+
+    settings.SetText("key", QString(1000, 'v'));
+    if (!ProcessLimits::limitFileSize(100))
+        QSKIP("the size of files cannot be limited here");
+    const QString error = settings.Save();
+    ProcessLimits::unlimitFileSize();
+    QVERIFY(!error.isEmpty());
+    QCOMPARE(TestFiles::read(test.settingsFile()), old);
 }
 
 void tst_WindowState::numbers_data()

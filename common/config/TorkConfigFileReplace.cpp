@@ -1,0 +1,336 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// How a configuration file is replaced in one step.
+//
+//     viewer.cfg          the old file
+//     viewer.cfg.saving   the new one, while it is written; renamed over the old one when it is
+//                         whole and on the disk
+//
+// QSaveFile would do most of it, but gives the file to another owner, does not wait for the folder,
+// and its random names would pile up where a program is killed over and over. One fixed name
+// cannot, and a lock on it tells a leftover from a save that is under way.
+
+#include "common/config/TorkConfigFile.h"
+
+#include <QFile>
+#include <QObject>
+#include <QSaveFile>
+#include <QThread>
+
+#ifdef Q_OS_UNIX
+#include <cerrno>
+#include <cstdio>
+#include <fcntl.h>
+#include <sys/file.h>
+#include <sys/stat.h>
+#include <unistd.h>
+#endif
+
+namespace {
+
+struct Outcome
+{
+    QString failure;        // empty if all is well
+    QString inPlaceBecause; // empty if the file was replaced
+};
+
+#ifdef Q_OS_UNIX
+
+// Why a step failed: the system's error number, or 0 where it did not.
+using Failure = int;
+
+constexpr Failure Done = 0;
+
+// Calls again while a signal interrupts.
+template <class Call>
+auto Uninterrupted(Call call)
+{
+    auto result = call();
+    while (result == -1 && errno == EINTR)
+        result = call();
+    return result;
+}
+
+Failure FailureOf(int result)
+{
+    return result == -1 ? errno : Done;
+}
+
+class Descriptor
+{
+public:
+    Descriptor() = default;
+    ~Descriptor() { Close(); }
+    Descriptor(Descriptor const&) = delete;
+    Descriptor& operator=(Descriptor const&) = delete;
+
+    Failure Open(QByteArray const& path, int flags, mode_t mode = 0)
+    {
+        Close();
+        m_descriptor = Uninterrupted([&] { return ::open(path, flags | O_CLOEXEC, mode); });
+        return FailureOf(m_descriptor);
+    }
+
+    // Gives the lock up too, even if a child process has inherited it.
+    void Close()
+    {
+        if (m_descriptor == -1)
+            return;
+        ::flock(m_descriptor, LOCK_UN);
+        ::close(m_descriptor);
+        m_descriptor = -1;
+    }
+
+    // False if another process, or another thread, holds the lock. A file system that knows no
+    // locks grants any.
+    bool Lock() const
+    {
+        const int result = Uninterrupted([&] { return ::flock(m_descriptor, LOCK_EX | LOCK_NB); });
+        return result == 0 || errno != EWOULDBLOCK;
+    }
+
+    int Number() const { return m_descriptor; }
+
+private:
+    int m_descriptor = -1;
+};
+
+// Makes it the path at the end of all links. The links themselves stay; one without a target gets
+// one.
+Failure Follow(QByteArray& path)
+{
+    const int most = 40; // as the system counts
+    for (int links = 0; links <= most; ++links) {
+        char target[4096];
+        const ssize_t length = ::readlink(path, target, sizeof target);
+        if (length == -1) // no link, or not there
+            return errno == EINVAL || errno == ENOENT ? Done : errno;
+        if (length == sizeof target)
+            return ENAMETOOLONG;
+        const QByteArray next(target, static_cast<int>(length));
+        path = next.startsWith('/') ? next : path.left(path.lastIndexOf('/') + 1) + next;
+    }
+    return ELOOP;
+}
+
+// Whether it is still this file that has the name.
+bool HasName(int descriptor, QByteArray const& path)
+{
+    struct stat file = {};
+    struct stat named = {};
+    return ::fstat(descriptor, &file) == 0 && ::lstat(path, &named) == 0 &&
+           file.st_dev == named.st_dev && file.st_ino == named.st_ino;
+}
+
+// Waits for the disk. What is no file on a disk has nothing to wait for.
+Failure Sync(int descriptor)
+{
+#ifdef F_FULLFSYNC
+    if (::fcntl(descriptor, F_FULLFSYNC) == 0)
+        return Done;
+#endif
+    const Failure failure = FailureOf(Uninterrupted([descriptor] { return ::fsync(descriptor); }));
+    return failure == EINVAL || failure == ENOTSUP ? Done : failure;
+}
+
+Failure Write(int descriptor, QByteArray const& bytes)
+{
+    int written = 0;
+    while (written < bytes.size()) {
+        const ssize_t more = Uninterrupted([&] {
+            return ::write(descriptor, bytes.constData() + written,
+                           static_cast<size_t>(bytes.size() - written));
+        });
+        if (more == -1)
+            return errno;
+        written += static_cast<int>(more);
+    }
+    return Sync(descriptor);
+}
+
+// Owner and group stay if this user may give files to them. Where the group cannot, what it was
+// allowed is not allowed to the group that the file has instead.
+Failure KeepRights(int descriptor, struct stat const& old)
+{
+    struct stat file = {};
+    if (::fstat(descriptor, &file) == -1)
+        return errno;
+
+    mode_t mode = old.st_mode & 0777U;
+    const gid_t anyGroup = static_cast<gid_t>(-1);
+    const uid_t anyUser = static_cast<uid_t>(-1);
+    if (file.st_gid != old.st_gid && ::fchown(descriptor, anyUser, old.st_gid) == -1)
+        mode &= ~static_cast<mode_t>(S_IRWXG) | ((mode & S_IRWXO) << 3U);
+    const bool keepsOwner =
+        file.st_uid == old.st_uid || ::fchown(descriptor, old.st_uid, anyGroup) == 0;
+    Q_UNUSED(keepsOwner) // else it is this user's from now on
+    return FailureOf(::fchmod(descriptor, mode));
+}
+
+// Removes what a killed save has left.
+//
+// @return EEXIST if another save is still writing it
+Failure RemoveLeftover(QByteArray const& path)
+{
+    struct stat status = {};
+    if (::lstat(path, &status) == -1)
+        return errno == ENOENT ? Done : errno;
+
+    Descriptor leftover; // locked until it is gone
+    if (S_ISREG(status.st_mode)) {
+        const Failure failure = leftover.Open(path, O_RDONLY | O_NOFOLLOW | O_NONBLOCK);
+        if (failure == ENOENT)
+            return Done;
+        if (failure)
+            return failure;
+        if (!leftover.Lock() || !HasName(leftover.Number(), path))
+            return EEXIST;
+    }
+    const Failure failure = FailureOf(::unlink(path));
+    return failure == ENOENT ? Done : failure;
+}
+
+// Makes a new file of this name and locks it. Another save of the same file has a second to end.
+Failure Create(Descriptor& file, QByteArray const& path, mode_t mode)
+{
+    for (int attempt = 0; attempt < 100; ++attempt) {
+        Failure failure = file.Open(path, O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW, mode);
+        if (!failure) {
+            if (file.Lock() && HasName(file.Number(), path))
+                return Done;
+            failure = EEXIST; // the other one took it for a leftover before it was locked
+        } else if (failure == EEXIST) {
+            failure = RemoveLeftover(path);
+        }
+        if (failure && failure != EEXIST)
+            return failure;
+        if (failure)
+            QThread::msleep(10);
+    }
+    return EAGAIN;
+}
+
+// What a power cut leaves is the old file or the new one in any case, so a folder that cannot be
+// waited for is no failure.
+void SyncFolderOf(QByteArray const& path)
+{
+    const int slash = path.lastIndexOf('/');
+    Descriptor folder;
+    if (!folder.Open(slash < 0 ? QByteArray(".") : path.left(slash + 1), O_RDONLY | O_DIRECTORY))
+        Sync(folder.Number());
+}
+
+// @param old  what the file is now; null if there is none
+Failure Replace(QByteArray const& path, QByteArray const& bytes, struct stat const* old)
+{
+    const QByteArray newPath = path + ".saving";
+    Descriptor file;
+    Failure failure = Create(file, newPath, old ? 0600 : 0666);
+    if (failure)
+        return failure;
+
+    failure = Write(file.Number(), bytes);
+    if (!failure && old)
+        failure = KeepRights(file.Number(), *old);
+    if (!failure)
+        failure = FailureOf(::rename(newPath, path));
+    if (failure)
+        ::unlink(newPath);
+    else
+        SyncFolderOf(path);
+    return failure;
+}
+
+// Whether it is the place that lets no file be replaced: a folder without the right to write, with
+// the sticky bit, or with a directory in the new file's place; a file that is mounted by itself; a
+// name that leaves no room for the new one's.
+bool IsAboutPlace(Failure failure)
+{
+    switch (failure) {
+    case EACCES:
+    case EPERM:
+    case EROFS:
+    case EBUSY:
+    case EXDEV:
+    case EISDIR:
+    case ENAMETOOLONG:
+        return true;
+    default:
+        return false;
+    }
+}
+
+Failure WriteOver(int descriptor, QByteArray const& bytes)
+{
+    const Failure failure = FailureOf(Uninterrupted([&] { return ::ftruncate(descriptor, 0); }));
+    return failure && failure != EINVAL ? failure : Write(descriptor, bytes);
+}
+
+// The end of a save that failed, or that had to write over the file.
+Outcome Told(Failure failure, Failure inPlaceBecause = Done)
+{
+    return {failure ? qt_error_string(failure) : QString(),
+            inPlaceBecause ? qt_error_string(inPlaceBecause) : QString()};
+}
+
+Outcome Save(QString const& fileName, QByteArray const& bytes)
+{
+    if (fileName.contains(QChar::Null))
+        return Told(EINVAL);
+    QByteArray path = QFile::encodeName(fileName);
+    Failure failure = Follow(path);
+    if (failure)
+        return Told(failure);
+
+    struct stat old = {};
+    if (::stat(path, &old) == -1)
+        return Told(errno == ENOENT ? Replace(path, bytes, nullptr) : errno);
+
+    // Opening a FIFO would wait for its reader.
+    if (!S_ISREG(old.st_mode) && !S_ISCHR(old.st_mode))
+        return Told(S_ISDIR(old.st_mode) ? EISDIR : EINVAL);
+
+    // A file that may not be written stays as it is, even where its folder would let it be
+    // replaced.
+    Descriptor file;
+    failure = file.Open(path, O_WRONLY | O_NONBLOCK);
+    if (failure)
+        return Told(failure);
+
+    const bool isDevice = S_ISCHR(old.st_mode);
+    failure = isDevice ? ENODEV : Replace(path, bytes, &old);
+    if (isDevice || IsAboutPlace(failure))
+        return Told(WriteOver(file.Number(), bytes), failure);
+    return Told(failure);
+}
+
+#else
+
+Outcome Save(QString const& fileName, QByteArray const& bytes)
+{
+    QSaveFile file(fileName);
+    const bool saved =
+        file.open(QIODevice::WriteOnly) && file.write(bytes) == bytes.size() && file.commit();
+    return {saved ? QString() : file.errorString(), QString()};
+}
+
+#endif
+
+} // namespace
+
+bool TorkConfigFile::SaveAtomically()
+{
+    if (m_fileName.length() < 2) // as in Save()
+        return true;
+
+    const Outcome outcome = ::Save(m_fileName, toXml());
+    if (!outcome.failure.isEmpty())
+        m_lastError = QObject::tr("Unable to save %1: %2").arg(m_fileName, outcome.failure);
+    else if (!outcome.inPlaceBecause.isEmpty())
+        m_lastError = QObject::tr("%1 was written in place, as it cannot be replaced: %2")
+                          .arg(m_fileName, outcome.inPlaceBecause);
+    else
+        m_lastError = QLatin1String("");
+    return outcome.failure.isEmpty();
+}

@@ -1,0 +1,113 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "common/config/TorkConfigText.h"
+
+namespace {
+
+constexpr QLatin1Char ValueEscape('\\');
+constexpr QLatin1Char NameEscape('_');
+constexpr int HexDigits = 4;
+
+bool IsLetter(QChar character)
+{
+    return (character >= QLatin1Char('a') && character <= QLatin1Char('z')) ||
+           (character >= QLatin1Char('A') && character <= QLatin1Char('Z'));
+}
+
+// "]" could end a CDATA section, "%" could be a placeholder, and the others are markup.
+bool StaysInValue(QChar character)
+{
+    return character >= QLatin1Char(' ') && character <= QLatin1Char('~') &&
+           !QStringLiteral("%&'<>\"]\\").contains(character);
+}
+
+// A colon would be taken for the end of a namespace prefix.
+bool StaysInName(QChar character, bool isFirst)
+{
+    if (isFirst || IsLetter(character))
+        return IsLetter(character);
+
+    return (character >= QLatin1Char('0') && character <= QLatin1Char('9')) ||
+           character == QLatin1Char('.') || character == QLatin1Char('-');
+}
+
+QString Escaped(QLatin1Char escape, QChar character)
+{
+    return escape + QStringLiteral("u%1").arg(character.unicode(), HexDigits, 16, QLatin1Char('0'));
+}
+
+// Leaves alone what does not look like an escape.
+QString Unescaped(QLatin1Char escape, QString const& encoded)
+{
+    if (encoded == escape)
+        return QStringLiteral("");
+
+    QString text;
+    for (int i = 0; i < encoded.length(); ++i) {
+        bool isHex = false;
+        ushort unit = 0;
+        if (encoded.at(i) == escape && encoded.midRef(i + 1, 1) == QLatin1String("u"))
+            unit = encoded.midRef(i + 2, HexDigits).toUShort(&isHex, 16);
+        text += isHex ? QChar(unit) : encoded.at(i);
+        if (isHex)
+            i += 1 + HexDigits;
+    }
+    return text;
+}
+
+using Encoder = QString (*)(QString const&);
+
+// Each text has one encoding, so whatever else looks like one was not made here.
+QString Decoded(Encoder encode, QLatin1Char escape, QString const& encoded, bool* ok)
+{
+    const QString text = Unescaped(escape, encoded);
+    const bool isEncoding = encode(text) == encoded;
+    if (ok)
+        *ok = isEncoding;
+    return isEncoding ? text : encoded;
+}
+
+} // namespace
+
+QString TorkConfigText::EncodeValue(QString const& text)
+{
+    if (text.isEmpty())
+        return QString(ValueEscape);
+
+    QString encoded;
+    for (QChar character : text) {
+        if (StaysInValue(character))
+            encoded += character;
+        else
+            encoded += Escaped(ValueEscape, character);
+    }
+    return encoded;
+}
+
+QString TorkConfigText::DecodeValue(QString const& encoded, bool* ok)
+{
+    return Decoded(EncodeValue, ValueEscape, encoded, ok);
+}
+
+QString TorkConfigText::EncodeName(QString const& text)
+{
+    if (text.isEmpty())
+        return QString(NameEscape);
+
+    const bool isRoot = text == QLatin1String("VelocorSettings");
+    QString encoded;
+    for (QChar character : text) {
+        const bool isFirst = encoded.isEmpty();
+        if (StaysInName(character, isFirst) && !(isFirst && isRoot))
+            encoded += character;
+        else
+            encoded += Escaped(NameEscape, character);
+    }
+    return encoded;
+}
+
+QString TorkConfigText::DecodeName(QString const& encoded, bool* ok)
+{
+    return Decoded(EncodeName, NameEscape, encoded, ok);
+}

@@ -1,0 +1,75 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// Any UTF-16 text comes back from both encodings, and from a file that is saved and loaded; any
+// text at all can be decoded.
+
+#include "FuzzInput.h"
+
+#include "common/config/TorkConfigFile.h"
+#include "common/config/TorkConfigText.h"
+
+#include <QCoreApplication>
+#include <QTemporaryDir>
+
+namespace {
+
+using Encoder = QString (*)(QString const&);
+using Decoder = QString (*)(QString const&, bool*);
+
+void ComeBack(QString const& text, Encoder encode, Decoder decode)
+{
+    bool ok = false;
+    Require(decode(encode(text), &ok) == text && ok);
+
+    const QString decoded = decode(text, &ok);
+    Require(ok ? encode(decoded) == text : decoded == text);
+}
+
+// In all three places of a file.
+void ComeBackFromFile(QString const& path, QString const& text)
+{
+    const QString value = TorkConfigText::EncodeValue(text);
+    const QString name = TorkConfigText::EncodeName(text);
+    TorkConfigFile saved(path);
+    Require(saved.WriteItem(name, name, value));
+    Require(saved.WriteItem("Later", "key", name));
+    saved.Save();
+    Require(saved.m_lastError.isEmpty());
+
+    TorkConfigFile loaded(path);
+    Require(loaded.Load());
+    QString none, found;
+    Require(loaded.ReadItem(name, name, none, found));
+    Require(TorkConfigText::DecodeValue(found) == text);
+    Require(loaded.keyList(name).contains(name));
+    Require(loaded.ReadItem("Later", "key", none, found));
+    Require(TorkConfigText::DecodeName(found) == text);
+}
+
+} // namespace
+
+extern "C" int LLVMFuzzerInitialize(int* argc, char*** argv)
+{
+    SilenceMessages();
+    static QCoreApplication application(*argc, *argv);
+    return 0;
+}
+
+extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
+{
+    static const QTemporaryDir folder;
+
+    // Two bytes a unit reach every text, and UTF-8 the readable ones.
+    QString units;
+    for (size_t i = 0; i + 1 < size; i += 2)
+        units += QChar(static_cast<ushort>(data[i] << 8 | data[i + 1]));
+    const QString words = QString::fromUtf8(reinterpret_cast<char const*>(data), int(size));
+
+    for (QString const& text : {units, words}) {
+        ComeBack(text, TorkConfigText::EncodeValue, TorkConfigText::DecodeValue);
+        ComeBack(text, TorkConfigText::EncodeName, TorkConfigText::DecodeName);
+        ComeBackFromFile(folder.filePath("text.cfg"), text);
+    }
+    return 0;
+}
