@@ -179,29 +179,29 @@ private:
     QString currentFileName() const;
     QString currentFilePath() const;
     QFileInfo currentFile() const;
-    void makeLogDirectory() const;
+    static void makeLogDirectory(QString const& path);
     bool openFile(QString const& fileName);
     bool closeFile();
-    QFile* locate(int length);
-    bool mayWriteDirectly() const;
-    void useFileObject();
-    qint64 openFileSize();
-    bool fits(qint64 size, int length) const;
+    bool locate(int length);
+    bool placeEntry(int length);
+    void leavePlace();
+    void setAppending(bool appends);
     void trimOpenFile(int length);
+    bool fits(qint64 size, int length) const;
     void shiftOldFiles(QString const& directory) const;
     void pruneOldFiles(QString const& directory, qint64 highest) const;
 
     static qint64 wallClock();
     void writeEntry(qint64 now, int severity, QString const& message);
     void writeLine(ushort const* line, int length);
-    void writeToFile(char const* bytes, int length);
     void appendStamp(QVarLengthArray<ushort, 512>& line, qint64 now) const;
     QString elapsedTime(qint64 now) const;
     void echo(QString const& line) const;
 
     bool load();
     bool save();
-    void makeDirectoryOfPreferences() const;
+    QString preferencesFileName() const;
+    void makeDirectoryOfPreferences(QString const& fileName) const;
     void setFilePrefix(QString const& prefix);
     void setDateTimeFormat(QString const& format);
 
@@ -237,11 +237,11 @@ private:
     int m_writing = 0;
     mutable QMutex m_mutex; // the files, and the texts that writing an entry reads
 
-    // Whether entries go straight to the system, at m_position, where the file object then is not:
-    // not after somebody else was given it, nor while a failed write left text in its buffer.
-    bool m_direct = false;
-    bool m_handedOut = false;
-    qint64 m_position = 0;
+    // How the open file is shared with other programs; see TorkLogPlace.h.
+    bool m_handedOut = false;  // for good: whoever has the file object may seek and write
+    bool m_followsEnd = false; // entries that go to the end are appended
+    bool m_appends = false;
+    bool m_keepsOthersOut = false;
 
     // Changes with every change of the date format, so that stamps kept for reuse can be told
     // stale.
