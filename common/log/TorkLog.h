@@ -185,6 +185,7 @@ private:
     bool locate(int length);
     bool placeEntry(int length);
     void leavePlace();
+    bool isAtEnd() const;
     void setAppending(bool appends);
     void trimOpenFile(int length);
     bool fits(qint64 size, int length) const;

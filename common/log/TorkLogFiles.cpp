@@ -258,24 +258,33 @@ bool TorkLog::placeEntry(int length)
     if (!m_followsEnd || !m_file.flush())
         return !wasOpen || locate(length);
 
-    qint64 size = TorkLogPlace::size(m_file);
-    if (m_file.pos() < size) {
-        m_keepsOthersOut = TorkLogPlace::keepOthersOut(m_file);
-        size = TorkLogPlace::size(m_file);
-    }
-    if (m_file.pos() >= size) {
+    if (m_file.pos() == TorkLogPlace::size(m_file)) {
         setAppending(true);
-        if (m_file.pos() > size) // cut down by another program
+        return true;
+    }
+
+    // Old content follows, another program has cut the file down or added to it, or, after fork(),
+    // another process has moved on; only the system knows the position then.
+    m_keepsOthersOut = TorkLogPlace::keepOthersOut(m_file);
+    const qint64 size = TorkLogPlace::size(m_file);
+    const qint64 position = TorkLogPlace::position(m_file);
+    if (position >= size || !m_keepsOthersOut) {
+        setAppending(true);
+        if (position > size)
             m_file.seek(size);
-    } else if (!m_keepsOthersOut) {
-        setAppending(true); // another program is trimming the old content, or writing over it
-    } else if (wasOpen && !fits(size, length)) {
+        return true;
+    }
+    if (wasOpen && !fits(size, length)) {
         setAppending(true);
         trimOpenFile(length);
-    } else {
-        setAppending(false);
     }
+    setAppending(isAtEnd());
     return true;
+}
+
+bool TorkLog::isAtEnd() const
+{
+    return TorkLogPlace::position(m_file) >= TorkLogPlace::size(m_file);
 }
 
 void TorkLog::leavePlace()
@@ -290,9 +299,7 @@ void TorkLog::leavePlace()
 bool TorkLog::locate(int length)
 {
     if (m_file.isOpen()) {
-        const qint64 size = m_file.size();
-        // After the last entry there is usually nothing to trim.
-        if (!fits(size, length) && m_file.pos() < size)
+        if (!fits(m_file.size(), length))
             trimOpenFile(length);
         return true;
     }

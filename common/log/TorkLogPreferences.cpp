@@ -13,6 +13,7 @@
 
 #include <mutex>
 #include <shared_mutex>
+#include <utility>
 
 namespace {
 
@@ -128,7 +129,7 @@ bool TorkLog::setPreferencesFileName(QString const& name)
         chosen = directory + separator + chosen;
     }
     TorkLogLock lock(m_mutex);
-    m_preferencesFileName = chosen;
+    m_preferencesFileName = std::move(chosen);
     return true;
 }
 
