@@ -242,8 +242,7 @@ QFile* TorkLog::locateLogFile(QString const& text)
 
 void TorkLog::setAppending(bool appends)
 {
-    if (m_appends != appends)
-        TorkLogPlace::setAppending(m_file, appends);
+    TorkLogPlace::setAppending(m_file, appends);
     m_appends = appends;
 }
 
@@ -259,7 +258,8 @@ bool TorkLog::placeEntry(int length)
         return !wasOpen || locate(length);
 
     if (m_file.pos() == TorkLogPlace::size(m_file)) {
-        setAppending(true);
+        if (!m_appends)
+            setAppending(true);
         return true;
     }
 

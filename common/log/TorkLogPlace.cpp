@@ -52,8 +52,9 @@ bool TorkLogPlace::isRegular(QFileDevice const& file)
 void TorkLogPlace::setAppending(QFileDevice const& file, bool appends)
 {
     const int flags = ::fcntl(file.handle(), F_GETFL);
-    if (flags != -1)
-        ::fcntl(file.handle(), F_SETFL, appends ? flags | O_APPEND : flags & ~O_APPEND);
+    const int wanted = appends ? flags | O_APPEND : flags & ~O_APPEND;
+    if (flags != -1 && wanted != flags)
+        ::fcntl(file.handle(), F_SETFL, wanted);
 }
 
 qint64 TorkLogPlace::size(QFileDevice const& file)

@@ -26,7 +26,8 @@ bool mayBeLog(QFileDevice const& file);
 /// Whether an open file has an end to append to.
 bool isRegular(QFileDevice const& file);
 
-/// From now on writes of this open file go to its end, or to its position.
+/// From now on writes of this open file go to its end, or to its position; after fork() also those
+/// of the other process.
 void setAppending(QFileDevice const& file, bool appends);
 
 /// Where the system will write next; -1 if it cannot tell. After fork() the other process moves it.

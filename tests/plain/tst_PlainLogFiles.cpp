@@ -365,7 +365,7 @@ private:
 
     void changeSettings()
     {
-        m_plain.prefix = pick({"app", "app", "app", ".app", "my app", "a[p]p", "logdata"});
+        m_plain.prefix = pick({"app", "app", "app", ".app", ".app", "my app", "a[p]p", "logdata"});
         m_plain.maxFiles = pick({"0", "1", "2", "3", "10"}).toInt();
         m_plain.maxSize = pick({"1", "20", "100", "500", "100000"}).toUInt();
         note(QString("settings %1 %2 %3")
