@@ -105,7 +105,8 @@ public:
     void setMaxLogFileSize(unsigned int size);
     unsigned int maxLogFileSize() const { return m_maxLogFileSize; }
 
-    /// The toolkit's text for the last log file that could not be opened; empty if none.
+    /// Qt's text for the last log file that could not be opened, or "Not a regular file" for a
+    /// pipe, a socket or a block device; empty if none.
     QString errorString() const;
 
     /// The bare name of the current log file, or with `all` the wildcard of the older files.
@@ -129,11 +130,15 @@ public:
     /// calls it with the file lock held; on its own only while no other thread writes.
     ///
     /// @param text  the entry that will be written; its length in characters counts
+    /// Whoever has the file may seek, read and write: entries follow from there on, also after the
+    /// file has been closed and opened again.
+    ///
     /// @return the open file, owned by the log; null if none could be opened
     QFile* locateLogFile(QString const& text);
 
     /// Moves the numbered older files up by one, removes those above the limit, and makes the
-    /// current file number 1. Part of locateLogFile(), with the same thread rule.
+    /// current file number 1. Removes what a rotation that was killed has left of its copy. Part
+    /// of locateLogFile(), with the same thread rule.
     void deleteOldFiles();
 
     /// Writes a one-line entry: time stamp, severity name, elapsed time if wanted, message.

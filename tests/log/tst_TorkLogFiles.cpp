@@ -13,6 +13,7 @@
 #include <QtTest>
 
 #include <cstdio>
+#include <fcntl.h>
 #include <sys/socket.h>
 #include <sys/stat.h>
 #include <sys/un.h>
@@ -82,6 +83,7 @@ private slots:
     void forkedProcesses();
     void cutDownByAnotherLog();
     void twoProcesses();
+    void anotherProgramAtWork();
     void notAFile_data();
     void notAFile();
     void pipesInPlaceOfFiles_data();
@@ -1122,8 +1124,17 @@ int writesAlone(QStringList const& arguments)
     TorkLog log(arguments.at(0));
     log.setEnable(true);
     log.setMaxLogFileSize(0);
-    for (int i = 0; i < 20 * linesEach; ++i)
-        log.write(lineOf(arguments.at(1).at(0).toLatin1(), i % linesEach));
+    const char writer = arguments.at(1).at(0).toLatin1();
+    for (int i = 0; i < 40 * linesEach; ++i)
+        log.write(lineOf(writer, i % linesEach));
+    return 0;
+}
+
+int writesOnce(QStringList const& arguments)
+{
+    TorkLog log(arguments.at(0));
+    log.setEnable(true);
+    log.write(QStringLiteral("x\n"));
     return 0;
 }
 
@@ -1187,6 +1198,30 @@ void tst_TorkLogFiles::twoProcesses()
     QByteArray content = TestFiles::read(folder.logs() + ".log");
     QVERIFY(content.size() > 2048);
     QCOMPARE(content.count('\0'), 0);
+}
+
+// Nobody waits for the one that writes over the old content, or trims it, and nobody takes the file
+// away under it.
+void tst_TorkLogFiles::anotherProgramAtWork()
+{
+    LogFolder folder;
+    const QString name = folder.logs() + ".log";
+    populate(folder.logs(), {".log: old\nold\n"});
+    QFile file(name);
+    QVERIFY(file.open(QIODevice::ReadWrite));
+    struct flock whole = {};
+    whole.l_type = F_WRLCK;
+    QCOMPARE(fcntl(file.handle(), F_SETLK, &whole), 0);
+
+    const ChildProcess::Result during =
+        ChildProcess::run("once", {folder.logs()}, QString(), 10000);
+    QVERIFY2(during.ended(), during.report());
+    QCOMPARE(file.readAll(), QByteArray("old\nold\nx\n"));
+
+    file.close();
+    const ChildProcess::Result after = ChildProcess::run("once", {folder.logs()}, QString(), 10000);
+    QVERIFY2(after.ended(), after.report());
+    QCOMPARE(TestFiles::read(name), QByteArray("x\nd\nold\nx\n"));
 }
 
 namespace {
@@ -1529,6 +1564,7 @@ int main(int argc, char** argv)
                                                  {"disk full", writesToFullDisk},
                                                  {"parent and child", writesInParentAndChild},
                                                  {"alone", writesAlone},
+                                                 {"once", writesOnce},
                                                  {"no file", writesToNoFile},
                                                  {"rotates", rotates}});
 }
