@@ -63,7 +63,7 @@ void TorkLog::clear()
 void TorkLog::setOutputPath(QString const& path)
 {
     TorkLogLock lock(m_mutex);
-    m_path = path;
+    m_path = QString(path); // moved, so that ThreadSanitizer sees the old text freed
 }
 
 QString TorkLog::path() const

@@ -105,7 +105,8 @@ public:
     void setMaxLogFileSize(unsigned int size);
     unsigned int maxLogFileSize() const { return m_maxLogFileSize; }
 
-    /// The toolkit's text for the last log file that could not be opened; empty if none.
+    /// Qt's text for the last log file that could not be opened, or "Not a regular file" for a
+    /// pipe, a socket or a block device; empty if none.
     QString errorString() const;
 
     /// The bare name of the current log file, or with `all` the wildcard of the older files.
@@ -133,11 +134,15 @@ public:
     /// calls it with the file lock held; on its own only while no other thread writes.
     ///
     /// @param text  the entry that will be written; its length in characters counts
+    /// Whoever has the file may seek, read and write: entries follow from there on, also after the
+    /// file has been closed and opened again.
+    ///
     /// @return the open file, owned by the log; null if none could be opened
     QFile* locateLogFile(QString const& text);
 
     /// Moves the numbered older files up by one, removes those above the limit, and makes the
-    /// current file number 1. Part of locateLogFile(), with the same thread rule.
+    /// current file number 1. Removes what a rotation that was killed has left of its copy. Part
+    /// of locateLogFile(), with the same thread rule.
     void deleteOldFiles();
 
     /// Writes a one-line entry: time stamp, severity name, elapsed time if wanted, message.
@@ -183,28 +188,29 @@ private:
     QString currentFileName() const;
     QString currentFilePath() const;
     QFileInfo currentFile() const;
-    void makeLogDirectory() const;
+    static void makeLogDirectory(QString const& path);
     bool openFile(QString const& fileName);
     bool closeFile();
-    QFile* locate(int length);
-    bool mayWriteDirectly() const;
-    void useFileObject();
-    qint64 openFileSize();
-    bool fits(qint64 size, int length) const;
+    bool locate(int length);
+    bool placeEntry(int length);
+    void leavePlace();
+    bool isAtEnd() const;
+    void setAppending(bool appends);
     void trimOpenFile(int length);
+    bool fits(qint64 size, int length) const;
     void shiftOldFiles(QString const& directory) const;
     void pruneOldFiles(QString const& directory, qint64 highest) const;
 
     int writeEntry(qint64 now, int severity, QString const& message);
     void writeLine(ushort const* line, int length);
-    void writeToFile(char const* bytes, int length);
     int appendStamp(QVarLengthArray<ushort, 512>& line, qint64 now) const;
     QString elapsedTime(int timeOfDay) const;
     void echo(QString const& line) const;
 
     bool load();
     bool save();
-    void makeDirectoryOfPreferences() const;
+    QString preferencesFileName() const;
+    void makeDirectoryOfPreferences(QString const& fileName) const;
     void setFilePrefix(QString const& prefix);
     void setDateTimeFormat(QString const& format);
 
@@ -240,11 +246,11 @@ private:
     int m_writing = 0;
     mutable QMutex m_mutex; // the files, and the texts that writing an entry reads
 
-    // Whether entries go straight to the system, at m_position, where the file object then is not:
-    // not after somebody else was given it, nor while a failed write left text in its buffer.
-    bool m_direct = false;
-    bool m_handedOut = false;
-    qint64 m_position = 0;
+    // How the open file is shared with other programs; see TorkLogPlace.h.
+    bool m_handedOut = false;  // for good: whoever has the file object may seek and write
+    bool m_followsEnd = false; // entries that go to the end are appended
+    bool m_appends = false;
+    bool m_keepsOthersOut = false;
 
     // Changes with every change of the date format, so that no stamp kept for the old one is
     // reused.

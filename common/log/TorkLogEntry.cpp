@@ -13,10 +13,6 @@
 
 #include <algorithm>
 
-#ifdef Q_OS_UNIX
-#include <unistd.h>
-#endif
-
 TorkLog* TorkLog::m_gLog = nullptr;
 
 namespace {
@@ -55,20 +51,6 @@ void ToLatin1(char* bytes, ushort const* text, int length)
     std::transform(text, text + length, bytes, [](ushort character) {
         return character > 0xff ? '?' : static_cast<char>(character);
     });
-}
-
-// Hands bytes to the system past the file object, which would copy them into its buffer and out
-// again. Returns how many the system took.
-qint64 WriteDirectly(int file, char const* bytes, int length)
-{
-#ifdef Q_OS_UNIX
-    return std::max<qint64>(0, ::write(file, bytes, static_cast<size_t>(length)));
-#else
-    Q_UNUSED(file);
-    Q_UNUSED(bytes);
-    Q_UNUSED(length);
-    return 0;
-#endif
 }
 
 } // namespace
@@ -117,28 +99,14 @@ void TorkLog::writeLine(ushort const* line, int length)
 
     TorkLogLock lock(m_mutex);
     m_writing = 1;
-    if (locate(length)) {
-        writeToFile(bytes.constData(), length);
+    if (placeEntry(length)) {
+        m_file.write(bytes.constData(), length);
+        m_file.flush();
+        leavePlace();
         if (m_logPipeToConsole)
             echo(QString(reinterpret_cast<QChar const*>(line), length));
     }
     m_writing = 0;
-}
-
-void TorkLog::writeToFile(char const* bytes, int length)
-{
-    qint64 written = 0;
-    if (m_direct) {
-        written = WriteDirectly(m_file.handle(), bytes, length);
-        m_position += written;
-        if (written == length)
-            return;
-        m_file.seek(m_position);
-    }
-    m_file.write(bytes + written, length - written);
-    const bool flushed = m_file.flush();
-    m_direct = flushed && mayWriteDirectly();
-    m_position = m_file.pos();
 }
 
 // The lock is held, so that the handler passes the line on to the toolkit's default output.

@@ -15,11 +15,14 @@
 #include "common/log/TorkLog.h"
 
 #include "common/log/TorkLogLock.h"
+#include "common/log/TorkLogPlace.h"
 
 #include <QDir>
 #include <QMap>
 #include <QTemporaryFile>
 #include <QTextStream>
+
+#include <algorithm>
 
 #ifdef Q_OS_UNIX
 #include <unistd.h>
@@ -50,21 +53,20 @@ int logFileNumber(QString const& fileName)
     return converted ? number : -1;
 }
 
-// The files in `directory` that are named `name` and a further extension, in name order.
+// What lies in `directory` and is named `name` and a further extension, in name order.
 //
-// Compared by hand: the toolkit's name filters are wildcards that split at blanks and semicolons,
-// read brackets as character sets and ignore letter case, and would take in files of others.
-QStringList NumberedFiles(QString const& directory, QString const& name)
+// Compared by hand: Qt's name filters are wildcards that split at blanks and semicolons, read
+// brackets as character sets and ignore letter case, and would take in files of others.
+QStringList NamedLike(QString const& directory, QString const& name, QDir::Filters filters)
 {
     const QString start = name + QLatin1Char('.');
-    const QDir::Filters filters = QDir::Files | QDir::Hidden;
-    QStringList numbered;
+    QStringList found;
     const QStringList files = QDir(directory).entryList(filters, QDir::Name);
     for (QString const& file : files) {
         if (file.startsWith(start))
-            numbered.append(file);
+            found.append(file);
     }
-    return numbered;
+    return found;
 }
 
 bool HasReachedTheDisk(QFileDevice& file)
@@ -77,13 +79,21 @@ bool HasReachedTheDisk(QFileDevice& file)
     return true;
 }
 
+// A copy has no name before it is whole, or, where the file system knows no such files, one that
+// tells whose it is: app.log.1.aBcDeF.part, which no number can be mistaken for.
+QString PartName(QString const& to)
+{
+    return to + QLatin1String(".XXXXXX.part");
+}
+
 // Makes `to`, which must not exist, whole or not at all. Where the directory takes no new file,
 // QFile::copy() would put the text into the system's temporary folder on the way.
 void Copy(QString const& from, QString const& to)
 {
     QFile source(from);
-    QTemporaryFile copy(QFileInfo(to).path() + QLatin1String("/qt_temp.XXXXXX"));
-    if (QFile::exists(to) || !source.open(QIODevice::ReadOnly) || !copy.open())
+    QTemporaryFile copy(PartName(to));
+    const bool isFile = QFileInfo(from).isFile(); // opening a pipe would wait for a writer
+    if (!isFile || QFile::exists(to) || !source.open(QIODevice::ReadOnly) || !copy.open())
         return;
 
     constexpr qint64 blockSize = 1 << 16;
@@ -96,6 +106,24 @@ void Copy(QString const& from, QString const& to)
     copy.setPermissions(source.permissions());
     if (isWhole && copy.rename(to))
         copy.setAutoRemove(false);
+}
+
+// Removes what Copy() to number 1 of the log `name` leaves behind when the program is killed.
+void RemoveUnfinishedCopies(QString const& directory, QString const& name)
+{
+    const QString start = name + QLatin1String(".1");
+    const int length = PartName(start).length();
+    const QStringList files =
+        NamedLike(directory, start, QDir::Files | QDir::Hidden | QDir::NoSymLinks);
+    for (QString const& file : files) {
+        const QStringRef random = file.midRef(start.length() + 1, 6);
+        const bool isRandom = std::all_of(random.begin(), random.end(), [](QChar letter) {
+            return (letter >= QLatin1Char('a') && letter <= QLatin1Char('z')) ||
+                   (letter >= QLatin1Char('A') && letter <= QLatin1Char('Z'));
+        });
+        if (file.length() == length && file.endsWith(QLatin1String(".part")) && isRandom)
+            QFile::remove(QDir(directory).filePath(file));
+    }
 }
 
 } // namespace
@@ -154,14 +182,24 @@ bool TorkLog::openFile(QString const& fileName)
 {
     closeFile();
     m_file.setFileName(fileName);
+    m_appends = false;
+    m_followsEnd = false;
+    // Looked at before, so that nobody who waits for a pipe is disturbed, and after, as its name
+    // may have come to mean another file.
     // Neither appending nor truncating: entries go over the old content from its start on.
-    const bool opened = m_file.open(QIODevice::ReadWrite | QIODevice::Text);
-    if (!opened)
+    const bool mayBeLog = TorkLogPlace::mayBeLog(fileName);
+    const bool opened = mayBeLog && m_file.open(QIODevice::ReadWrite | QIODevice::Text);
+    if (mayBeLog && !opened) {
         m_errorString = m_file.errorString();
-    m_handedOut = false;
-    m_direct = opened && mayWriteDirectly();
-    m_position = 0;
-    return opened;
+        return false;
+    }
+    if (!mayBeLog || !TorkLogPlace::mayBeLog(m_file)) {
+        m_file.close();
+        m_errorString = QStringLiteral("Not a regular file");
+        return false;
+    }
+    m_followsEnd = !m_handedOut && TorkLogPlace::isRegular(m_file);
+    return true;
 }
 
 bool TorkLog::closeFile()
@@ -179,73 +217,102 @@ bool TorkLog::fits(qint64 size, int length) const
     return size < 1 || size + length <= qint64(m_maxLogFileSize);
 }
 
+// Empty for a hidden file: QDir::Files does not list one, so the log never looks at its size.
 QFileInfo TorkLog::currentFile() const
 {
     const QString name = currentFileName();
-    const bool isBareName = !name.isEmpty() && !name.contains(QLatin1Char('/'));
-    return isBareName ? QFileInfo(QDir(m_path).filePath(name)) : QFileInfo();
+    const bool isListed =
+        !name.isEmpty() && !name.startsWith(QLatin1Char('.')) && !name.contains(QLatin1Char('/'));
+    return isListed ? QFileInfo(QDir(m_path).filePath(name)) : QFileInfo();
 }
 
-void TorkLog::makeLogDirectory() const
+void TorkLog::makeLogDirectory(QString const& path)
 {
-    // The last character goes, whatever it is: as a rule the final slash.
-    const QString directory = m_path.length() == 1 ? m_path : m_path.left(m_path.length() - 1);
+    // The last character goes, whatever it is: usually the final slash.
+    const QString directory = path.length() == 1 ? path : path.left(path.length() - 1);
     QDir().mkpath(directory);
 }
 
 QFile* TorkLog::locateLogFile(QString const& text)
 {
-    QFile* file = locate(text.length());
-    m_handedOut = true;
-    useFileObject();
-    return file;
-}
-
-bool TorkLog::mayWriteDirectly() const
-{
-#ifdef Q_OS_UNIX
-    // A file whose status could not be told has no position for the toolkit to go back to.
-    return !m_handedOut && !m_file.isSequential();
-#else
-    return false; // there the toolkit's text mode makes other line ends
-#endif
-}
-
-// From here on the file object writes, from where the last entry ended.
-void TorkLog::useFileObject()
-{
-    if (m_direct)
-        m_file.seek(m_position);
-    m_direct = false;
-}
-
-// The size of the open file. The position of its end tells as much as its status and is found ten
-// times as fast, but must be left where writing goes on.
-qint64 TorkLog::openFileSize()
-{
-#ifdef Q_OS_UNIX
-    if (m_direct) {
-        const qint64 end = ::lseek(m_file.handle(), 0, SEEK_END);
-        if (end == m_position || (end >= 0 && ::lseek(m_file.handle(), m_position, SEEK_SET) >= 0))
-            return end;
+    if (m_file.isOpen() && m_followsEnd) {
+        setAppending(false);
+        const qint64 position = TorkLogPlace::position(m_file);
+        if (position >= 0 && position != m_file.pos())
+            m_file.seek(position);
     }
-#endif
-    return m_file.size();
+    m_handedOut = true;
+    m_followsEnd = false;
+    return locate(text.length()) ? &m_file : nullptr;
 }
 
-QFile* TorkLog::locate(int length)
+void TorkLog::setAppending(bool appends)
+{
+    TorkLogPlace::setAppending(m_file, appends);
+    m_appends = appends;
+}
+
+// Finds or opens the file for an entry of this length and the place in it where the entry goes:
+// over old content, or to the end. leavePlace() follows when it has been written.
+bool TorkLog::placeEntry(int length)
+{
+    const bool wasOpen = m_file.isOpen();
+    if (!wasOpen && !locate(length))
+        return false;
+    // Text that still waits for room on the disk has its place, and this entry follows it.
+    if (!m_followsEnd || !m_file.flush())
+        return !wasOpen || locate(length);
+
+    if (m_file.pos() == TorkLogPlace::size(m_file)) {
+        if (!m_appends)
+            setAppending(true);
+        return true;
+    }
+
+    // Old content follows, another program has cut the file down or added to it, or, after fork(),
+    // another process has moved on; only the system knows the position then.
+    m_keepsOthersOut = TorkLogPlace::keepOthersOut(m_file);
+    const qint64 size = TorkLogPlace::size(m_file);
+    const qint64 position = TorkLogPlace::position(m_file);
+    if (position >= size || !m_keepsOthersOut) {
+        setAppending(true);
+        if (position > size)
+            m_file.seek(size);
+        return true;
+    }
+    if (wasOpen && !fits(size, length)) {
+        setAppending(true);
+        trimOpenFile(length);
+    }
+    setAppending(isAtEnd());
+    return true;
+}
+
+bool TorkLog::isAtEnd() const
+{
+    return TorkLogPlace::position(m_file) >= TorkLogPlace::size(m_file);
+}
+
+void TorkLog::leavePlace()
+{
+    if (m_keepsOthersOut)
+        TorkLogPlace::letOthersIn(m_file);
+    m_keepsOthersOut = false;
+}
+
+// Whether the file that `length` more characters go to is open. It may have been trimmed for them,
+// or have been opened for them.
+bool TorkLog::locate(int length)
 {
     if (m_file.isOpen()) {
-        const qint64 size = openFileSize();
-        // Behind the last entry there is as a rule nothing to trim.
-        if (!fits(size, length) && (m_direct ? m_position : m_file.pos()) != size)
+        if (!fits(m_file.size(), length))
             trimOpenFile(length);
-        return &m_file;
+        return true;
     }
 
     QFileInfo current = currentFile();
     if (!current.isFile()) {
-        makeLogDirectory();
+        makeLogDirectory(m_path);
         current.refresh();
     }
 
@@ -259,15 +326,14 @@ QFile* TorkLog::locate(int length)
         deleteOldFiles();
         openFile(currentFilePath());
     }
-    return m_file.isOpen() ? &m_file : nullptr;
+    return m_file.isOpen();
 }
 
-// Looks for old content behind the last entry and, if there is any, cuts it down: without the
-// lines that the new text needs room for, and without their line ends. As a rule nothing follows
+// Looks for old content after the last entry and, if there is any, cuts it down: without the
+// lines that the new text needs room for, and without their line ends. Usually nothing follows
 // and the file grows beyond its limit; it is rotated when it is next opened.
 void TorkLog::trimOpenFile(int length)
 {
-    useFileObject();
     QTextStream stream(&m_file);
     stream.setCodec("ISO 8859-1"); // byte for byte, in any locale
     stream.setAutoDetectUnicode(false);
@@ -277,7 +343,9 @@ void TorkLog::trimOpenFile(int length)
     bool keep = false;
     while (!stream.atEnd()) {
         const QString line = stream.readLine();
-        if (line.isNull()) // a file that cannot be read never comes to its end
+        // A file that cannot be read never comes to its end, nor does one whose end this process
+        // has reached without knowing it, because another one wrote there after fork().
+        if (line.isNull())
             break;
         count += line.length();
         keep = keep || count >= length;
@@ -296,6 +364,7 @@ void TorkLog::deleteOldFiles()
     shiftOldFiles(directory);
 
     const QString current = currentFilePath();
+    RemoveUnfinishedCopies(directory, currentFileName());
     Copy(current, current + QLatin1String(".1"));
     QFile::remove(current);
 }
@@ -303,7 +372,7 @@ void TorkLog::deleteOldFiles()
 void TorkLog::shiftOldFiles(QString const& directory) const
 {
     QMap<int, QString> numbered;
-    const QStringList files = NumberedFiles(directory, currentFileName());
+    const QStringList files = NamedLike(directory, currentFileName(), QDir::Files);
     for (QString const& file : files) {
         const int number = logFileNumber(file);
         if (number != -1)
@@ -325,15 +394,17 @@ void TorkLog::shiftOldFiles(QString const& directory) const
         pruneOldFiles(directory, qint64(numbered.lastKey()) + 1);
 }
 
-// Removes the older files from `highest` down to the first above the limit, going by the names
-// that are there: a stray file with a huge number must not cost a billion attempts.
+// Removes everything that has the name of an older file, from `highest` down to the first above the
+// limit, be it a pipe or a link to nothing. Goes by the names that are there: a stray file with a
+// huge number must not cost a billion attempts.
 void TorkLog::pruneOldFiles(QString const& directory, qint64 highest) const
 {
     const qint64 lowest = qint64(static_cast<int>(m_maxLogFiles.load())) + 1;
     const QString name = currentFileName();
     const QString path = currentFilePath();
 
-    const QStringList files = NumberedFiles(directory, name);
+    const QDir::Filters all = QDir::AllEntries | QDir::System | QDir::NoDotAndDotDot;
+    const QStringList files = NamedLike(directory, name, all);
     for (QString const& file : files) {
         const QString number = file.mid(name.length() + 1);
         const qint64 value = number.toLongLong();

@@ -13,6 +13,7 @@
 
 #include <mutex>
 #include <shared_mutex>
+#include <utility>
 
 namespace {
 
@@ -127,13 +128,20 @@ bool TorkLog::setPreferencesFileName(QString const& name)
         const QString separator = endsInSlash ? QString() : QStringLiteral("/");
         chosen = directory + separator + chosen;
     }
-    m_preferencesFileName = chosen;
+    TorkLogLock lock(m_mutex);
+    m_preferencesFileName = std::move(chosen);
     return true;
+}
+
+QString TorkLog::preferencesFileName() const
+{
+    TorkLogLock lock(m_mutex);
+    return m_preferencesFileName;
 }
 
 bool TorkLog::havePreferencesFile() const
 {
-    return QFile::exists(m_preferencesFileName);
+    return QFile::exists(preferencesFileName());
 }
 
 bool TorkLog::loadPreferences()
@@ -159,11 +167,12 @@ bool TorkLog::processPreferences(PreferencesOperation operation)
 
 bool TorkLog::load()
 {
-    if (!havePreferencesFile())
+    const QString fileName = preferencesFileName();
+    if (!QFile::exists(fileName))
         return false;
 
     // The values are read whether or not the file parsed: what is missing takes its default.
-    TorkConfigFile settings(m_preferencesFileName, QStringLiteral("LogSettings"));
+    TorkConfigFile settings(fileName, QStringLiteral("LogSettings"));
     const bool loaded = settings.Load();
 
     m_maxLogFiles = ReadNumber(settings, m_maxLogFilesKey, 10, m_maxLogFiles);
@@ -182,25 +191,38 @@ bool TorkLog::load()
 
 bool TorkLog::save()
 {
-    makeDirectoryOfPreferences();
+    // Only copied under the lock: the store traces what it does into this log.
+    QString fileName;
+    QString dateTimeFormat;
+    QString elapsedTimePrefix;
+    QString filePrefix;
+    {
+        TorkLogLock lock(m_mutex);
+        fileName = m_preferencesFileName;
+        dateTimeFormat = m_dateTimeFormat;
+        elapsedTimePrefix = m_elapsedTimePrefix;
+        filePrefix = m_filePrefix;
+    }
+    makeDirectoryOfPreferences(fileName);
 
-    TorkConfigFile settings(m_preferencesFileName, QStringLiteral("LogSettings"));
+    TorkConfigFile settings(fileName, QStringLiteral("LogSettings"));
     settings.WriteItem(Section(), m_maxLogFilesKey, m_maxLogFiles.load());
     settings.WriteItem(Section(), m_maxLogFileSizeKey, m_maxLogFileSize.load());
     settings.WriteBool(Section(), m_enabledKey, m_enabled);
     settings.WriteBool(Section(), m_logElapsedTimeKey, m_logElapsedTime);
-    settings.WriteItem(Section(), m_dateTimeFormatKey, m_dateTimeFormat);
-    settings.WriteItem(Section(), m_elapsedTimePrefixKey, m_elapsedTimePrefix);
-    settings.WriteItem(Section(), m_filePrefixKey, m_filePrefix);
+    settings.WriteItem(Section(), m_dateTimeFormatKey, dateTimeFormat);
+    settings.WriteItem(Section(), m_elapsedTimePrefixKey, elapsedTimePrefix);
+    settings.WriteItem(Section(), m_filePrefixKey, filePrefix);
     settings.WriteBool(Section(), m_logPipeToConsoleKey, m_logPipeToConsole);
     return settings.Save();
 }
 
 // On the first start the settings are saved before the first entry makes the log directory.
-void TorkLog::makeDirectoryOfPreferences() const
+void TorkLog::makeDirectoryOfPreferences(QString const& fileName) const
 {
-    const QString directory = QDir::cleanPath(QFileInfo(m_preferencesFileName).absolutePath());
-    const bool liesInLogDirectory = directory == QDir::cleanPath(QDir(path()).absolutePath());
+    const QString directory = QDir::cleanPath(QFileInfo(fileName).absolutePath());
+    const QString logs = path();
+    const bool liesInLogDirectory = directory == QDir::cleanPath(QDir(logs).absolutePath());
     if (liesInLogDirectory && !QDir(directory).exists())
-        makeLogDirectory();
+        makeLogDirectory(logs);
 }

@@ -13,6 +13,13 @@
 #include <QtTest>
 
 #include <cstdio>
+#include <fcntl.h>
+#include <sys/socket.h>
+#include <sys/stat.h>
+#include <sys/un.h>
+#include <sys/wait.h>
+#include <thread>
+#include <unistd.h>
 
 class tst_TorkLogFiles : public QObject
 {
@@ -63,6 +70,26 @@ private slots:
     void onlyOwnFiles();
     void neighboursAloneAreNotTheLog_data();
     void neighboursAloneAreNotTheLog();
+
+    void hiddenNames_data();
+    void hiddenNames();
+    void pruningGoesByName_data();
+    void pruningGoesByName();
+    void unfinishedCopies_data();
+    void unfinishedCopies();
+
+    void handedOutFileIsKept_data();
+    void handedOutFileIsKept();
+    void forkedProcesses_data();
+    void forkedProcesses();
+    void cutDownByAnotherLog();
+    void twoProcesses();
+    void anotherProgramAtWork();
+    void notAFile_data();
+    void notAFile();
+    void pipesInPlaceOfFiles_data();
+    void pipesInPlaceOfFiles();
+    void nullDevice();
 
     void fileInPlaceOfDirectory();
     void directoryInPlaceOfFile();
@@ -547,10 +574,10 @@ void tst_TorkLogFiles::openEmptyFileTakesAnything()
     log.write(QStringLiteral("beyond the limit\n"));
     QCOMPARE(folder.listing(), QStringList("app.log: beyond the limit\n"));
 
-    // Emptied by somebody else: the entry goes where the next one would have gone.
+    // Emptied by somebody else: the entry goes to the end, without a gap of NULs before it.
     QVERIFY(QFile::resize(folder.logs() + "app.log", 0));
     log.write(QStringLiteral("and once more\n"));
-    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray(17, '\0') + "and once more\n");
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("and once more\n"));
 }
 
 void tst_TorkLogFiles::growsWhileOpen()
@@ -827,16 +854,12 @@ void tst_TorkLogFiles::onlyOwnFiles_data()
     QTest::newRow("star") << "a*" << QStringList({"a.log", "ab.log", "ab.log.1", "abc.log.12"});
     QTest::newRow("question mark")
         << "a?" << QStringList({"a.log", "ab.log", "ab.log.1", "ab.log.12"});
-    QTest::newRow("hidden") << ".hidden"
-                            << QStringList({"hidden.log", "hidden.log.1", "hidden.log.12",
-                                            ".hidden2.log.12"});
     QTest::newRow("backslash") << "a\\b" << QStringList({"ab.log", "ab.log.1", "ab.log.12"});
     QTest::newRow("marker") << "100%1" << QStringList({"1001.log.12", "100.log.12", "100%2.log"});
     QTest::newRow("two markers") << "%2%1" << QStringList({"1.log", "12.log.12"});
     QTest::newRow("dots") << "app.log" << QStringList({"app.log", "app.log.1", "app.log.12"});
     QTest::newRow("letters beyond ASCII")
         << QString::fromUtf8("Büro") << QStringList({"Buro.log", "Buro.log.12"});
-    QTest::newRow("none") << "" << QStringList({"app.log", "app.log.1", "app.log.12", "log"});
 }
 
 void tst_TorkLogFiles::onlyOwnFiles()
@@ -852,10 +875,7 @@ void tst_TorkLogFiles::onlyOwnFiles()
     populate(folder.logs(), untouched);
     populate(folder.logs(), {name + ": " + full, name + ".1: a", name + ".10: j"});
     TorkLog log(folder.logs());
-    if (prefix.isEmpty())
-        log.setEnable(true); // the prefix of a log without a settings file
-    else
-        folder.prepare(log, prefix);
+    folder.prepare(log, prefix);
     log.setMaxLogFileSize(0);
 
     if (log.maxLogFileSize() != 2048)
@@ -880,14 +900,461 @@ void tst_TorkLogFiles::neighboursAloneAreNotTheLog()
         untouched.append(neighbour + ": n");
     populate(folder.logs(), untouched);
     TorkLog log(folder.logs());
-    if (prefix.isEmpty())
-        log.setEnable(true);
-    else
-        folder.prepare(log, prefix);
+    folder.prepare(log, prefix);
 
     log.write(QStringLiteral("new\n"));
     const QStringList own(prefix + ".log: new\n");
     QCOMPARE(folder.listing(), TestFiles::sorted(own + untouched));
+}
+
+// A listing without hidden files never shows such a log: nobody looks at its size, and what is
+// numbered is none of its own.
+void tst_TorkLogFiles::hiddenNames_data()
+{
+    QTest::addColumn<QString>("prefix");
+    QTest::addColumn<bool>("rotates"); // asked for directly
+    QTest::addColumn<QStringList>("after");
+
+    QTest::newRow("full, begins with a dot")
+        << ".app" << false << QStringList({".app.log: new\n%1", ".app.log.1: a", ".app.log.12: l"});
+    QTest::newRow("full, empty prefix")
+        << "" << false << QStringList({".log: new\n%1", ".log.1: a", ".log.12: l"});
+    QTest::newRow("rotated, begins with a dot")
+        << ".app" << true << QStringList({".app.log.1: a", ".app.log.12: l"});
+    QTest::newRow("rotated, empty prefix")
+        << "" << true << QStringList({".log.1: a", ".log.12: l"});
+}
+
+void tst_TorkLogFiles::hiddenNames()
+{
+    QFETCH(QString, prefix);
+    QFETCH(bool, rotates);
+    QFETCH(QStringList, after);
+    LogFolder folder;
+    const QString name = prefix + ".log";
+    const QString full(3000, 'f');
+    populate(folder.logs(), {name + ": " + full, name + ".1: a", name + ".12: l"});
+    TorkLog log(folder.logs());
+    log.setEnable(true);
+    if (!prefix.isEmpty()) // a log without a settings file has none
+        folder.prepare(log, prefix);
+    log.setMaxLogFileSize(0);
+
+    if (rotates)
+        log.deleteOldFiles();
+    else
+        log.write(QStringLiteral("new\n"));
+    QCOMPARE(folder.listing(), after.replaceInStrings("%1", full.mid(4)));
+}
+
+namespace {
+
+// Makes what an entry of the form "name |" (a pipe), "name -> target" or populate()'s says.
+void make(QString const& folder, QString const& entry)
+{
+    const QString path = folder + entry.section(' ', 0, 0);
+    if (entry.endsWith(" |"))
+        QVERIFY2(mkfifo(QFile::encodeName(path).constData(), 0600) == 0, qPrintable(entry));
+    else if (entry.contains(" -> "))
+        QVERIFY2(QFile::link(entry.section(" -> ", 1), path), qPrintable(entry));
+    else
+        populate(folder, {entry});
+}
+
+QStringList namesIn(QString const& folder)
+{
+    return QDir(folder).entryList(
+        QDir::AllEntries | QDir::Hidden | QDir::System | QDir::NoDotAndDotDot, QDir::Name);
+}
+
+} // namespace
+
+// Whatever lies under a number above the limit goes; only listed files move up, though.
+void tst_TorkLogFiles::pruningGoesByName_data()
+{
+    QTest::addColumn<QStringList>("before");
+    QTest::addColumn<QStringList>("after");
+
+    const QStringList common({"app.log: c", "app.log.5: e"});
+    const QStringList usual({"app.log.1", "app.log.6"});
+    QTest::newRow("pipe above the highest stays")
+        << common + QStringList("app.log.12 |")
+        << QStringList({"app.log.1", "app.log.12", "app.log.6"});
+    QTest::newRow("pipe") << common + QStringList({"app.log.15: o", "app.log.12 |"}) << usual;
+    QTest::newRow("pipe just above the highest")
+        << common + QStringList({"app.log.15: o", "app.log.16 |"}) << usual;
+    QTest::newRow("dangling link")
+        << common + QStringList({"app.log.15: o", "app.log.13 -> nowhere"}) << usual;
+    QTest::newRow("link to a pipe")
+        << common + QStringList({"pipe |", "app.log.15: o", "app.log.13 -> pipe"})
+        << usual + QStringList("pipe");
+    QTest::newRow("directory stays") << common + QStringList({"app.log.15: o", "app.log.14/"})
+                                     << QStringList({"app.log.1", "app.log.14", "app.log.6"});
+    QTest::newRow("pipe within the limit is neither moved nor removed")
+        << common + QStringList({"app.log.15: o", "app.log.3 |"})
+        << QStringList({"app.log.1", "app.log.3", "app.log.6"});
+    QTest::newRow("pipe below a huge number")
+        << common + QStringList({"app.log.2147483646: h", "app.log.2147483000 |"}) << usual;
+    QTest::newRow("pipes without a number of their own stay")
+        << common +
+               QStringList({"app.log.15: o", "app.log.012 |", "app.log.old.12 |", "app.log.x |"})
+        << QStringList({"app.log.012", "app.log.1", "app.log.6", "app.log.old.12", "app.log.x"});
+}
+
+void tst_TorkLogFiles::pruningGoesByName()
+{
+    QFETCH(QStringList, before);
+    LogFolder folder;
+    for (QString const& entry : before)
+        make(folder.logs(), entry);
+    TorkLog log;
+    folder.prepare(log, "app");
+
+    log.deleteOldFiles();
+    QTEST(namesIn(folder.logs()), "after");
+}
+
+void tst_TorkLogFiles::unfinishedCopies_data()
+{
+    QTest::addColumn<QString>("entry");
+    QTest::addColumn<bool>("stays");
+
+    QTest::newRow("copy to number 1") << "app.log.1.aBcXyZ.part: half" << false;
+    QTest::newRow("name of another kind") << "app.log.1.part: x" << true;
+    QTest::newRow("digits") << "app.log.1.aBc1yZ.part: x" << true;
+    QTest::newRow("five letters") << "app.log.1.aBcXy.part: x" << true;
+    QTest::newRow("seven letters") << "app.log.1.aBcXyZz.part: x" << true;
+    QTest::newRow("of another number") << "app.log.2.aBcXyZ.part: x" << true;
+    QTest::newRow("of another log") << "app2.log.1.aBcXyZ.part: x" << true;
+    QTest::newRow("goes on") << "app.log.1.aBcXyZ.part.gz: x" << true;
+    QTest::newRow("other letter case") << "app.log.1.aBcXyZ.PART: x" << true;
+    QTest::newRow("link") << "app.log.1.aBcXyZ.part -> app.log" << true;
+    QTest::newRow("dangling link") << "app.log.1.aBcXyZ.part -> nowhere" << true;
+    QTest::newRow("directory") << "app.log.1.aBcXyZ.part/" << true;
+    QTest::newRow("pipe") << "app.log.1.aBcXyZ.part |" << true;
+}
+
+void tst_TorkLogFiles::unfinishedCopies()
+{
+    QFETCH(QString, entry);
+    QFETCH(bool, stays);
+    LogFolder folder;
+    populate(folder.logs(), {"app.log: full"});
+    make(folder.logs(), entry);
+    TorkLog log;
+    folder.prepare(log, "app", tight);
+
+    log.write(QStringLiteral("new\n"));
+    QString name = entry.section(QRegularExpression("[: ]"), 0, 0);
+    name.remove('/');
+    QCOMPARE(namesIn(folder.logs()).contains(name), stays);
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("new\n"));
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log.1"), QByteArray("full"));
+}
+
+// Whoever was given the file object seeks and writes with it, whenever that was.
+void tst_TorkLogFiles::handedOutFileIsKept_data()
+{
+    QTest::addColumn<bool>("reopens");
+
+    QTest::newRow("while it stays open") << false;
+    QTest::newRow("over close() and the next opening") << true;
+}
+
+void tst_TorkLogFiles::handedOutFileIsKept()
+{
+    QFETCH(bool, reopens);
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    log.write(QStringLiteral("0123456789\n"));
+    QFile* const file = log.locateLogFile("x");
+    if (reopens) {
+        QVERIFY(log.close());
+        log.write(QStringLiteral("0123456789\n"));
+    }
+
+    QCOMPARE(file->pos(), 11);
+    QVERIFY(file->seek(3));
+    log.write(QStringLiteral("abc"));
+    QCOMPARE(file->pos(), 6);
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("012abc6789\n"));
+
+    QCOMPARE(file->read(2), QByteArray("67"));
+    log.write(QStringLiteral("X"));
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("012abc67X9\n"));
+
+    // A gap that its holder asks for is his.
+    QVERIFY(file->seek(13));
+    log.write(QStringLiteral("z\n"));
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("012abc67X9\n\0\0z\n", 15));
+}
+
+namespace {
+
+const int linesEach = 1000;
+
+QString lineOf(char writer, int number)
+{
+    return QString("%1 %2 %3\n").arg(QChar(writer)).arg(number).arg(QString(number % 90, writer));
+}
+
+// The lines of a file that are no line of these writers, and those of theirs that are missing.
+QStringList wrongLines(QByteArray const& content, QByteArray const& writers)
+{
+    QStringList wrong;
+    QStringList lines = QString::fromLatin1(content).split('\n');
+    if (!lines.takeLast().isEmpty())
+        wrong.append("(the last line has no end)");
+    QMap<QString, int> counts;
+    for (QString const& line : lines)
+        ++counts[line + '\n'];
+    for (char writer : writers) {
+        for (int i = 0; i < linesEach; ++i) {
+            if (counts.take(lineOf(writer, i)) != 1)
+                wrong.append("(missing or twice) " + lineOf(writer, i));
+        }
+    }
+    return wrong + QStringList(counts.keys());
+}
+
+// Parent and child write to the file that the parent has opened.
+int writesInParentAndChild(QStringList const& arguments)
+{
+    TorkLog log(arguments.at(0));
+    log.setEnable(true);
+    if (arguments.at(1) == "small limit")
+        log.setMaxLogFileSize(0);
+    if (arguments.at(2) == "handed out")
+        log.locateLogFile(QString());
+    log.write(QString());
+
+    const pid_t child = fork();
+    const char writer = child == 0 ? 'c' : 'p';
+    for (int i = 0; i < linesEach; ++i)
+        log.write(lineOf(writer, i));
+    if (child == 0)
+        _exit(0);
+    int status = 0;
+    return child > 0 && waitpid(child, &status, 0) == child && status == 0 ? 0 : 1;
+}
+
+int writesAlone(QStringList const& arguments)
+{
+    TorkLog log(arguments.at(0));
+    log.setEnable(true);
+    log.setMaxLogFileSize(0);
+    const char writer = arguments.at(1).at(0).toLatin1();
+    for (int i = 0; i < 40 * linesEach; ++i)
+        log.write(lineOf(writer, i % linesEach));
+    return 0;
+}
+
+int writesOnce(QStringList const& arguments)
+{
+    TorkLog log(arguments.at(0));
+    log.setEnable(true);
+    log.write(QStringLiteral("x\n"));
+    return 0;
+}
+
+} // namespace
+
+void tst_TorkLogFiles::forkedProcesses_data()
+{
+    QTest::addColumn<QString>("limit");
+    QTest::addColumn<QString>("handedOut");
+
+    QTest::newRow("usual limit") << "usual limit"
+                                 << "kept";
+    QTest::newRow("small limit") << "small limit"
+                                 << "kept";
+    QTest::newRow("usual limit, file handed out") << "usual limit"
+                                                  << "handed out";
+    QTest::newRow("small limit, file handed out") << "small limit"
+                                                  << "handed out";
+}
+
+void tst_TorkLogFiles::forkedProcesses()
+{
+    QFETCH(QString, limit);
+    QFETCH(QString, handedOut);
+    LogFolder folder;
+    const ChildProcess::Result child =
+        ChildProcess::run("parent and child", {folder.logs(), limit, handedOut});
+    QVERIFY2(child.ended(), child.report());
+    QCOMPARE(wrongLines(TestFiles::read(folder.logs() + ".log"), "pc"), QStringList());
+}
+
+// Two logs on one file are no good, but the one that finds the file shorter leaves no gap.
+void tst_TorkLogFiles::cutDownByAnotherLog()
+{
+    LogFolder folder;
+    TorkLog one;
+    TorkLog two;
+    folder.prepare(one, "app", 40);
+    folder.prepare(two, "app", 40);
+    one.write(QStringLiteral("1\n"));
+    for (int i = 0; i < 10; ++i)
+        two.write(QStringLiteral("22222222\n"));
+    one.write(QString(84, '1') + '\n'); // trims what the other one wrote
+    two.write(QStringLiteral("2\n"));
+
+    const QByteArray content = TestFiles::read(folder.logs() + "app.log");
+    QCOMPARE(content.count('\0'), 0);
+    QCOMPARE(content, QByteArray(84, '1') + "\n2\n");
+}
+
+void tst_TorkLogFiles::twoProcesses()
+{
+    LogFolder folder;
+    ChildProcess::Result results[2];
+    std::thread other([&] { results[0] = ChildProcess::run("alone", {folder.logs(), "a"}); });
+    results[1] = ChildProcess::run("alone", {folder.logs(), "b"});
+    other.join();
+    for (ChildProcess::Result const& result : results)
+        QVERIFY2(result.ended(), result.report());
+
+    QByteArray content = TestFiles::read(folder.logs() + ".log");
+    QVERIFY(content.size() > 2048);
+    QCOMPARE(content.count('\0'), 0);
+}
+
+// Nobody waits for the one that writes over the old content, or trims it, and nobody takes the file
+// away under it.
+void tst_TorkLogFiles::anotherProgramAtWork()
+{
+    LogFolder folder;
+    const QString name = folder.logs() + ".log";
+    populate(folder.logs(), {".log: old\nold\n"});
+    QFile file(name);
+    QVERIFY(file.open(QIODevice::ReadWrite));
+    struct flock whole = {};
+    whole.l_type = F_WRLCK;
+    QCOMPARE(fcntl(file.handle(), F_SETLK, &whole), 0);
+
+    const ChildProcess::Result during =
+        ChildProcess::run("once", {folder.logs()}, QString(), 10000);
+    QVERIFY2(during.ended(), during.report());
+    QCOMPARE(file.readAll(), QByteArray("old\nold\nx\n"));
+
+    file.close();
+    const ChildProcess::Result after = ChildProcess::run("once", {folder.logs()}, QString(), 10000);
+    QVERIFY2(after.ended(), after.report());
+    QCOMPARE(TestFiles::read(name), QByteArray("x\nd\nold\nx\n"));
+}
+
+namespace {
+
+// More than a pipe holds; then something that is a file takes its place.
+int writesToNoFile(QStringList const& arguments)
+{
+    TorkLog log(arguments.at(0));
+    log.setEnable(true);
+    for (int i = 0; i < linesEach; ++i)
+        log.write(lineOf('x', 89));
+    std::printf("%s\n", qPrintable(log.errorString()));
+    QFile::remove(arguments.at(0) + ".log");
+    log.write(QStringLiteral("kept\n"));
+    return 0;
+}
+
+} // namespace
+
+// None of these may block an entry, and the next entry tries again.
+void tst_TorkLogFiles::notAFile_data()
+{
+    QTest::addColumn<QStringList>("entries");
+
+    QTest::newRow("pipe") << QStringList(".log |");
+    QTest::newRow("link to a pipe") << QStringList({"pipe |", ".log -> pipe"});
+    QTest::newRow("socket") << QStringList(".log =");
+}
+
+void tst_TorkLogFiles::notAFile()
+{
+    QFETCH(QStringList, entries);
+    LogFolder folder;
+    for (QString const& entry : entries) {
+        if (entry.endsWith(" =")) {
+            sockaddr_un address = {};
+            address.sun_family = AF_UNIX;
+            std::snprintf(address.sun_path, sizeof address.sun_path, "%s",
+                          qPrintable(folder.logs() + ".log"));
+            const int socket = ::socket(AF_UNIX, SOCK_STREAM, 0);
+            QCOMPARE(::bind(socket, reinterpret_cast<sockaddr*>(&address), sizeof address), 0);
+            ::close(socket);
+        } else {
+            make(folder.logs(), entry);
+        }
+    }
+
+    const ChildProcess::Result child =
+        ChildProcess::run("no file", {folder.logs()}, QString(), 10000);
+    QVERIFY2(child.ended(), child.report());
+    QCOMPARE(child.output, QByteArray("Not a regular file\n"));
+    QCOMPARE(TestFiles::read(folder.logs() + ".log"), QByteArray("kept\n"));
+}
+
+namespace {
+
+int rotates(QStringList const& arguments)
+{
+    LogFolder settings;
+    TorkLog log;
+    settings.prepare(log, "app", tight);
+    log.setOutputPath(arguments.at(0));
+    if (arguments.at(1) == "directly")
+        log.deleteOldFiles();
+    log.write(QStringLiteral("new\n"));
+    return 0;
+}
+
+} // namespace
+
+void tst_TorkLogFiles::pipesInPlaceOfFiles_data()
+{
+    QTest::addColumn<QStringList>("before");
+    QTest::addColumn<QString>("how");
+    QTest::addColumn<QStringList>("after");
+
+    QTest::newRow("number 1") << QStringList({"app.log: c", "app.log.1 |"}) << "by an entry"
+                              << QStringList({"app.log", "app.log.1"});
+    QTest::newRow("number 2") << QStringList({"app.log: c", "app.log.1: a", "app.log.2 |"})
+                              << "by an entry"
+                              << QStringList({"app.log", "app.log.1", "app.log.2"});
+    QTest::newRow("the current file") << QStringList({"app.log |", "app.log.1: a"}) << "directly"
+                                      << QStringList({"app.log", "app.log.2"});
+}
+
+void tst_TorkLogFiles::pipesInPlaceOfFiles()
+{
+    QFETCH(QStringList, before);
+    QFETCH(QString, how);
+    LogFolder folder;
+    for (QString const& entry : before)
+        make(folder.logs(), entry);
+
+    const ChildProcess::Result child =
+        ChildProcess::run("rotates", {folder.logs(), how}, QString(), 10000);
+    QVERIFY2(child.ended(), child.report());
+    QTEST(namesIn(folder.logs()), "after");
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("new\n"));
+}
+
+void tst_TorkLogFiles::nullDevice()
+{
+    LogFolder folder;
+    make(folder.logs(), "app.log -> /dev/null");
+    TorkLog log;
+    folder.prepare(log, "app", 10);
+    for (int i = 0; i < 3; ++i) {
+        log.write(QStringLiteral("beyond the limit\n"));
+        QVERIFY(i == 1 || log.close());
+    }
+    QCOMPARE(log.errorString(), QString());
+    QCOMPARE(QFileInfo(folder.logs() + "app.log").symLinkTarget(), QString("/dev/null"));
+    QCOMPARE(namesIn(folder.logs()), QStringList("app.log"));
 }
 
 void tst_TorkLogFiles::fileInPlaceOfDirectory()
@@ -1112,9 +1579,14 @@ void tst_TorkLogFiles::fullFileSystem()
 
 int main(int argc, char** argv)
 {
-    return ChildProcess::main<tst_TorkLogFiles>(
-        argc, argv,
-        {{"without permission", writesWithoutPermission}, {"disk full", writesToFullDisk}});
+    return ChildProcess::main<tst_TorkLogFiles>(argc, argv,
+                                                {{"without permission", writesWithoutPermission},
+                                                 {"disk full", writesToFullDisk},
+                                                 {"parent and child", writesInParentAndChild},
+                                                 {"alone", writesAlone},
+                                                 {"once", writesOnce},
+                                                 {"no file", writesToNoFile},
+                                                 {"rotates", rotates}});
 }
 
 #include "tst_TorkLogFiles.moc"

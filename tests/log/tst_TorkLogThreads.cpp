@@ -30,6 +30,7 @@ private slots:
     void entries();
     void rotationUnderWay();
     void settingsChangedMeanwhile();
+    void everythingElseMeanwhile();
     void severitiesAreNotExchanged();
     void echo();
     void shutdownMeanwhile();
@@ -186,6 +187,58 @@ void tst_TorkLogThreads::settingsChangedMeanwhile()
     QCOMPARE(messages(TestFiles::read(folder.logs() + "app.log"),
                       "[-0-9]+ [:.0-9]+ Error(?: dT:\\[-?\\d+\\])?"),
              allTexts());
+}
+
+// Half of the threads write; each of the others keeps calling one part of the rest.
+void tst_TorkLogThreads::everythingElseMeanwhile()
+{
+    LogFolder folder;
+    TorkLog* const log = TorkLog::initialize(folder.logs(), "app", QString(), true);
+    QVERIFY(log->savePreferences());
+
+    QStringList expected;
+    for (int thread = 4; thread < threadCount; ++thread) {
+        for (int entry = 0; entry < entriesEach; ++entry)
+            expected.append(text(thread, entry));
+    }
+    std::atomic<int> writers{threadCount - 4};
+    inThreads([&](int thread) {
+        for (int entry = 0; thread >= 4 && entry < entriesEach; ++entry)
+            log->error(text(thread, entry));
+        if (thread >= 4)
+            --writers;
+        while (thread < 4 && writers > 0) {
+            if (thread == 0) {
+                log->setPreferencesFileName(folder.logs() + "logsettings.cfg");
+                log->havePreferencesFile();
+                log->setOutputPath(folder.logs());
+            } else if (thread == 1) {
+                log->errorString();
+                log->path();
+                log->maxLogFiles();
+                log->maxLogFileSize();
+            } else if (thread == 2) {
+                log->setLogPipeToConsole(false);
+                log->setLogElapsedTime(false);
+                log->setEnable(true);
+                log->enabled();
+            } else {
+                log->savePreferences();
+                log->loadPreferences();
+            }
+        }
+    });
+
+    QStringList found;
+    const QStringList lines =
+        QString::fromLatin1(TestFiles::read(folder.logs() + "app.log")).split('\n');
+    for (QString const& line : lines) {
+        if (line.contains(" Error <"))
+            found.append(line.mid(line.indexOf('<')));
+    }
+    found.sort();
+    expected.sort();
+    QCOMPARE(found, expected);
 }
 
 void tst_TorkLogThreads::severitiesAreNotExchanged()

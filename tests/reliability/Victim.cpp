@@ -3,12 +3,13 @@
 
 // Logs and saves until it is killed, and tells after each call that it has returned.
 //
-//     reliability_victim ROOT RUN ENTRIES
+//     reliability_victim ROOT RUN ENTRIES [NAMED]
 //     reliability_victim ROOT RUN atomically
 //
 // The second only saves, each time by replacing the file in one step. ROOT holds the folder logs/,
 // settings.cfg and report, the shared memory. The log file is closed after every ENTRIES entries,
-// so that the next one opens it again; 0: it stays open.
+// so that the next one opens it again; 0: it stays open. With NAMED the file system knows no files
+// without a name.
 
 #include "reliability/Victim.h"
 
@@ -17,9 +18,16 @@
 
 #include <QFile>
 
+#include <cerrno>
+#include <cstdarg>
 #include <cstdlib>
+#include <fcntl.h>
+#include <sys/syscall.h>
+#include <unistd.h>
 
 namespace {
+
+bool s_areFilesNamed = false;
 
 const quint64 entriesPerSave = 100;
 
@@ -52,10 +60,28 @@ bool saveAtomically(TorkConfigFile& configuration, quint64 run, Victim::Report& 
 
 } // namespace
 
+// In front of the C library's, for Qt.
+#ifdef O_TMPFILE
+extern "C" int open64(char const* path, int flags, ...)
+{
+    va_list arguments;
+    va_start(arguments, flags);
+    const bool isUnnamed = (flags & O_TMPFILE) == O_TMPFILE;
+    const mode_t mode = isUnnamed || (flags & O_CREAT) ? va_arg(arguments, mode_t) : 0;
+    va_end(arguments);
+    if (isUnnamed && s_areFilesNamed) {
+        errno = EOPNOTSUPP;
+        return -1;
+    }
+    return static_cast<int>(syscall(SYS_openat, AT_FDCWD, path, flags, mode));
+}
+#endif
+
 int main(int argc, char** argv)
 {
-    if (argc != 4)
+    if (argc != 4 && argc != 5)
         return 2;
+    s_areFilesNamed = argc == 5;
     const QString root = QFile::decodeName(argv[1]);
     const quint64 run = std::strtoull(argv[2], nullptr, 10);
     const quint64 entriesBetween = std::strtoull(argv[3], nullptr, 10);

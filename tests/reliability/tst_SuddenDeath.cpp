@@ -6,6 +6,7 @@
 //
 //     VELOCOR_KILLS  how often, all in all
 
+#include "common/log/TorkLog.h"
 #include "log/LogFolder.h"
 #include "reliability/Figures.h"
 #include "reliability/Victim.h"
@@ -106,19 +107,29 @@ Files filesIn(QString const& logs)
 {
     Files files;
     const QStringList names = QDir(logs).entryList({"app.log", "app.log.*"}, QDir::Files);
-    for (QString const& name : names)
-        files[name == "app.log" ? 0 : name.section('.', -1).toInt()] = TestFiles::read(logs + name);
+    for (QString const& name : names) {
+        if (!name.endsWith(".part"))
+            files[name == "app.log" ? 0 : name.section('.', -1).toInt()] =
+                TestFiles::read(logs + name);
+    }
     return files;
 }
 
-// Whether no other file is left in the log directory. A copy that was cut short has no name yet;
-// only where the file system knows no such files is it called qt_temp.
-bool holdsOnlyTheLog(QString const& logs)
+// How many copies were cut short that have a name.
+int unfinishedCopies(QString const& logs)
+{
+    return QDir(logs).entryList({"app.log.1.*.part"}, QDir::Files | QDir::Hidden).size();
+}
+
+// Whether no other file is left in the log directory. A copy that was cut short has no name; only
+// where the file system knows no such files it has one, until the next rotation.
+bool holdsOnlyTheLog(QString const& logs, bool isNamed)
 {
     const QStringList names = QDir(logs).entryList(QDir::Files | QDir::Hidden);
-    return std::all_of(names.begin(), names.end(), [](QString const& name) {
-        return name == "app.log" || name.startsWith("app.log.") || name.startsWith("qt_temp.");
-    });
+    return unfinishedCopies(logs) <= (isNamed ? 1 : 0) &&
+           std::all_of(names.begin(), names.end(), [](QString const& name) {
+               return name == "app.log" || name.startsWith("app.log.");
+           });
 }
 
 // Runs one victim and kills it.
@@ -134,15 +145,18 @@ public:
 
     // False if it did not come to life or ended by itself.
     //
-    // @param task  the victim's last argument
-    bool runAndKill(quint64 run, QByteArray const& task)
+    // @param task  the victim's last argument but for "named"
+    bool runAndKill(quint64 run, QByteArray const& task, bool isNamed = false)
     {
         new (report) Victim::Report{};
         const QByteArray program = VICTIM;
         const QByteArray root = QFile::encodeName(m_root);
         const QByteArray number = QByteArray::number(run);
-        char* arguments[] = {const_cast<char*>(program.data()), const_cast<char*>(root.data()),
-                             const_cast<char*>(number.data()), const_cast<char*>(task.data()),
+        char* arguments[] = {const_cast<char*>(program.data()),
+                             const_cast<char*>(root.data()),
+                             const_cast<char*>(number.data()),
+                             const_cast<char*>(task.data()),
+                             isNamed ? const_cast<char*>("named") : nullptr,
                              nullptr};
         pid_t process = 0;
         if (posix_spawn(&process, program.constData(), nullptr, nullptr, arguments, environ) != 0)
@@ -284,10 +298,12 @@ void tst_SuddenDeath::killed_data()
     QTest::addColumn<int>("maxLogFiles");
     QTest::addColumn<int>("entriesBetween");
     QTest::addColumn<bool>("rotates");
+    QTest::addColumn<bool>("isNamed"); // the file system knows no files without a name
 
-    QTest::newRow("each run writes over the one before") << 10 << 0 << false;
-    QTest::newRow("each start rotates") << 6 << 0 << true;
-    QTest::newRow("rotates while it runs") << 6 << 25 << true;
+    QTest::newRow("each run writes over the one before") << 10 << 0 << false << false;
+    QTest::newRow("each start rotates") << 6 << 0 << true << false;
+    QTest::newRow("rotates while it runs") << 6 << 25 << true << false;
+    QTest::newRow("rotates while it runs, no unnamed files") << 6 << 25 << true << true;
 }
 
 void tst_SuddenDeath::killed()
@@ -295,6 +311,7 @@ void tst_SuddenDeath::killed()
     QFETCH(int, maxLogFiles);
     QFETCH(int, entriesBetween);
     QFETCH(bool, rotates);
+    QFETCH(bool, isNamed);
     const Rotation rotation{maxLogFiles, entriesBetween, rotates};
     LogFolder folder;
     const LogFolder::Settings settings = {{"filePrefix", "app"},
@@ -307,14 +324,14 @@ void tst_SuddenDeath::killed()
     Victims victims(folder);
     QVERIFY(victims.report);
 
-    const quint64 kills = static_cast<quint64>(Figures::wanted("VELOCOR_KILLS", 60) + 2) / 3;
+    const quint64 kills = static_cast<quint64>(Figures::wanted("VELOCOR_KILLS", 60) + 3) / 4;
     for (quint64 run = 1; run <= kills; ++run) {
         const Files before = filesIn(folder.logs());
         const QByteArray configuration = TestFiles::read(configurationFile);
-        QVERIFY(victims.runAndKill(run, QByteArray::number(entriesBetween)));
+        QVERIFY(victims.runAndKill(run, QByteArray::number(entriesBetween), isNamed));
         const Files after = filesIn(folder.logs());
         const QByteArray left = TestFiles::read(configurationFile);
-        QVERIFY(holdsOnlyTheLog(folder.logs()));
+        QVERIFY(holdsOnlyTheLog(folder.logs(), isNamed));
         Victim::Report const& report = *victims.report;
 
         const QString wrong =
@@ -332,6 +349,13 @@ void tst_SuddenDeath::killed()
         const bool isWhole = left.endsWith("</VelocorSettings>\n");
         QCOMPARE(loaded.Load(), isWhole);
         s_cutSaves += !isWhole;
+    }
+
+    if (isNamed) {
+        TorkLog log;
+        folder.prepare(log, "app", 1);
+        log.deleteOldFiles();
+        QCOMPARE(unfinishedCopies(folder.logs()), 0);
     }
 }
 

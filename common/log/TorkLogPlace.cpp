@@ -1,0 +1,117 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "common/log/TorkLogPlace.h"
+
+#ifdef Q_OS_UNIX
+
+#include <QFile>
+
+#include <cerrno>
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace {
+
+bool MayBeLog(struct stat const& status)
+{
+    // A directory is left to QFile, which knows what to say about it.
+    return S_ISREG(status.st_mode) || S_ISCHR(status.st_mode) || S_ISDIR(status.st_mode);
+}
+
+// Locks of this kind belong to the process, so that they also work between parent and child.
+bool SetLock(QFileDevice const& file, short type)
+{
+    struct flock whole = {};
+    whole.l_type = type;
+    whole.l_whence = SEEK_SET;
+    return ::fcntl(file.handle(), F_SETLK, &whole) == 0 || (errno != EAGAIN && errno != EACCES);
+}
+
+} // namespace
+
+bool TorkLogPlace::mayBeLog(QString const& fileName)
+{
+    struct stat status = {};
+    return ::stat(QFile::encodeName(fileName).constData(), &status) != 0 || MayBeLog(status);
+}
+
+bool TorkLogPlace::mayBeLog(QFileDevice const& file)
+{
+    struct stat status = {};
+    return ::fstat(file.handle(), &status) != 0 || MayBeLog(status);
+}
+
+bool TorkLogPlace::isRegular(QFileDevice const& file)
+{
+    struct stat status = {};
+    return ::fstat(file.handle(), &status) == 0 && S_ISREG(status.st_mode);
+}
+
+void TorkLogPlace::setAppending(QFileDevice const& file, bool appends)
+{
+    const int flags = ::fcntl(file.handle(), F_GETFL);
+    const int wanted = appends ? flags | O_APPEND : flags & ~O_APPEND;
+    if (flags != -1 && wanted != flags)
+        ::fcntl(file.handle(), F_SETFL, wanted);
+}
+
+qint64 TorkLogPlace::size(QFileDevice const& file)
+{
+#ifdef STATX_SIZE
+    struct statx some = {};
+    if (::statx(file.handle(), "", AT_EMPTY_PATH, STATX_SIZE, &some) == 0)
+        return static_cast<qint64>(some.stx_size);
+#endif
+    struct stat status = {};
+    return ::fstat(file.handle(), &status) == 0 ? qint64(status.st_size) : 0;
+}
+
+qint64 TorkLogPlace::position(QFileDevice const& file)
+{
+    return ::lseek(file.handle(), 0, SEEK_CUR);
+}
+
+bool TorkLogPlace::keepOthersOut(QFileDevice const& file)
+{
+    return SetLock(file, F_WRLCK);
+}
+
+void TorkLogPlace::letOthersIn(QFileDevice const& file)
+{
+    SetLock(file, F_UNLCK);
+}
+
+#else
+
+bool TorkLogPlace::mayBeLog(QString const&)
+{
+    return true;
+}
+
+bool TorkLogPlace::mayBeLog(QFileDevice const&)
+{
+    return true;
+}
+
+bool TorkLogPlace::isRegular(QFileDevice const&)
+{
+    return false; // there entries are not placed among those of other programs
+}
+
+void TorkLogPlace::setAppending(QFileDevice const&, bool) {}
+
+qint64 TorkLogPlace::position(QFileDevice const&)
+{
+    return -1;
+}
+
+bool TorkLogPlace::keepOthersOut(QFileDevice const&)
+{
+    return true;
+}
+
+void TorkLogPlace::letOthersIn(QFileDevice const&) {}
+
+#endif

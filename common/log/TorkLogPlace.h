@@ -1,0 +1,45 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include <QFileDevice>
+#include <QString>
+
+/// What the log asks of the system about the file it writes. For the log's own sources; nothing
+/// here does anything on systems other than Unix.
+///
+/// Two programs that write one log file each keep a position of their own. Text that is written at
+/// a position beyond the end leaves a gap of NULs, and another program may cut the file down at any
+/// moment. So an entry that goes to the end is appended, wherever the end is by then; only writing
+/// over old text needs a position, and whoever does that or trims keeps the others from cutting the
+/// file down meanwhile. Alone in the file, both come to the same bytes.
+namespace TorkLogPlace {
+
+/// Whether `fileName` may be opened as a log: not a pipe, socket or block device, where opening or
+/// writing can block for good. True for what is not there.
+bool mayBeLog(QString const& fileName);
+
+/// The same for an open file, which nobody can exchange any more.
+bool mayBeLog(QFileDevice const& file);
+
+/// Whether an open file has an end to append to.
+bool isRegular(QFileDevice const& file);
+
+/// From now on writes of this open file go to its end, or to its position; after fork() also those
+/// of the other process.
+void setAppending(QFileDevice const& file, bool appends);
+
+/// Where the system will write next; -1 if it cannot tell. After fork() the other process moves it.
+qint64 position(QFileDevice const& file);
+
+/// The size of this open file, 0 if the system cannot tell. Asks for nothing else, because asking
+/// for the times as well, as QFile::size() does, makes the next write more expensive.
+qint64 size(QFileDevice const& file);
+
+/// Makes other programs' calls of this function on the same file fail until letOthersIn(). Never
+/// waits. Returns false if another program is inside; true on file systems without locks.
+bool keepOthersOut(QFileDevice const& file);
+void letOthersIn(QFileDevice const& file);
+
+} // namespace TorkLogPlace
