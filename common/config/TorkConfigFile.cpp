@@ -243,18 +243,17 @@ bool TorkConfigFile::WriteItem(QString const& section, QString const& key, QStri
 }
 
 // cppcheck-suppress constParameter ; the interface stands
-void TorkConfigFile::StartElement(QString& name)
+bool TorkConfigFile::StartElement(QString& name)
 {
     m_currentElement = name;
+    m_atRoot = name == m_rootElementName;
+    if (m_atRoot)
+        return true;
 
     // White space inside a new section is no value, even where the item before had no text.
     const int depth = m_activeHandler ? m_activeHandler->depth() : 0;
     if (depth == 1 || depth == 2)
         m_expectingValue = false;
-
-    m_atRoot = name == m_rootElementName;
-    if (m_atRoot)
-        return;
 
     if (depth == 2 && !lookUp(name))
         createSection(name);
@@ -262,12 +261,14 @@ void TorkConfigFile::StartElement(QString& name)
         m_expectingValue = true;
     // Deeper elements leave the flag: one inside an item without text is stored as if it were the
     // item.
+    return true;
 }
 
-void TorkConfigFile::EndElement(QString&)
+bool TorkConfigFile::EndElement(QString&)
 {
-    // Not made anew for each element, as it would be from Latin-1.
+    // Not made again for each element, as it would be from Latin-1.
     m_currentElement = QStringLiteral(""); // clazy:exclude=empty-qstringliteral
+    return true;
 }
 
 // cppcheck-suppress constParameter ; the interface stands
@@ -277,14 +278,7 @@ bool TorkConfigFile::ProcessContent(QString& content)
         return true;
 
     m_expectingValue = false;
-    if (!m_currentSection)
-        return true;
-
-    // The current section stands in the table under its own name; only names with spaces in them
-    // would lead elsewhere.
-    if (m_sections.holdsSpaces() || Contains(m_currentElement, ' '))
+    if (m_currentSection)
         WriteItem(m_currentSection->name(), m_currentElement, content);
-    else if (!content.isNull())
-        m_currentSection->AddValue(m_currentElement, content);
     return true;
 }

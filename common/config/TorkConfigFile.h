@@ -194,14 +194,19 @@ public:
     bool ReadScreenMetrics(char const* name, QPoint& position, QSize& size);
 
     /// Load step: an element opened. Called by the document handler.
-    void StartElement(QString& name);
-
-    /// Load step: an element ended. Called by the document handler.
-    void EndElement(QString& name);
-
-    /// Load step: stores `content` as the value of the item that opened last, if it has none yet.
     ///
     /// @return always true
+    bool StartElement(QString& name);
+
+    /// Load step: an element ended. Called by the document handler.
+    ///
+    /// @return always true
+    bool EndElement(QString& name);
+
+    /// Load step: stores `content` as WriteItem() does, as the value of the item that opened last,
+    /// if it has none yet.
+    ///
+    /// @return always true, also where WriteItem() refuses a null text
     bool ProcessContent(QString& content);
 
     /// Prepares a value for writing: wrapped in a CDATA section if it holds one of & ' < > ".
