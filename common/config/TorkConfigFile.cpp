@@ -21,32 +21,10 @@ void TraceToLog(QString const& message)
         log->trace(message);
 }
 
-// Looks at all characters without stopping, several at once: names and values are short, and nearly
-// none holds what is looked for.
-bool Contains(QString const& text, char character)
-{
-    bool found = false;
-    for (QChar present : text)
-        found |= present.unicode() == static_cast<uchar>(character);
-    return found;
-}
-
 QString WithoutSpaces(QString const& name)
 {
-    if (!Contains(name, ' '))
-        return name;
-
     QString cleaned = name;
     return cleaned.remove(QLatin1Char(' '));
-}
-
-// What stands under `name` without its spaces. The name is looked for as it is first: where no key
-// of the table holds a space, one that is found has none either, and is not searched for spaces.
-template <class Table>
-auto FindWithoutSpaces(Table& table, QString const& name)
-{
-    auto* const found = table.holdsSpaces() ? nullptr : table.find(name);
-    return found ? found : table.find(WithoutSpaces(name));
 }
 
 // Ends the parse of a document that is nested too deep for the reader's stack.
@@ -210,12 +188,12 @@ QStringList TorkConfigFile::keyList(QString const& section)
 
 QString const* TorkConfigFile::findValue(QString const& section, QString const& key)
 {
-    TorkConfigFileSection** found = FindWithoutSpaces(m_sections, section);
+    TorkConfigFileSection** found = m_sections.find(WithoutSpaces(section));
     if (!found)
         return nullptr;
 
     m_currentSection = *found;
-    return FindWithoutSpaces(m_currentSection->values(), key);
+    return m_currentSection->values().find(WithoutSpaces(key));
 }
 
 // cppcheck-suppress constParameter ; the interface stands

@@ -57,17 +57,12 @@ public:
             m_entries[slot.number - 1].value = value;
             return;
         }
-        m_holdsSpaces = m_holdsSpaces || holdsSpace(key);
         m_entries.push_back({key, value});
         slot = {hash, static_cast<quint32>(m_entries.size())};
     }
 
-    /// Whether a key in the table holds a space.
-    bool holdsSpaces() const { return m_holdsSpaces; }
-
     void clear()
     {
-        m_holdsSpaces = false;
         m_slots.clear();
         m_entries.clear();
     }
@@ -85,14 +80,6 @@ private:
     };
 
     uint hashOf(QString const& key) const { return qHash(key, m_seed); }
-
-    static bool holdsSpace(QString const& key)
-    {
-        bool found = false;
-        for (QChar character : key)
-            found |= character.unicode() == ' ';
-        return found;
-    }
 
     // Half the time of the toolkit's comparison, which is a third of a lookup.
     static bool isSame(QString const& a, QString const& b)
@@ -131,6 +118,5 @@ private:
 
     std::vector<Entry> m_entries;
     std::vector<Slot> m_slots; // as many as a power of two
-    bool m_holdsSpaces = false;
     uint m_seed = static_cast<uint>(qGlobalQHashSeed());
 };
