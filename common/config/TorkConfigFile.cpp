@@ -13,6 +13,8 @@
 #include <QObject>
 #include <QXmlSimpleReader>
 
+#include <algorithm>
+
 namespace {
 
 void TraceToLog(QString const& message)
@@ -23,6 +25,10 @@ void TraceToLog(QString const& message)
 
 QString WithoutSpaces(QString const& name)
 {
+    // Asked first, as nearly no name holds one and removing none costs more than finding a value.
+    if (std::find(name.begin(), name.end(), QLatin1Char(' ')) == name.end())
+        return name;
+
     QString cleaned = name;
     return cleaned.remove(QLatin1Char(' '));
 }
