@@ -4,6 +4,7 @@
 #include "common/config/TorkConfigFile.h"
 
 #include "common/config/TorkConfigFileDocHandler.h"
+#include "common/config/TorkOrderedHash.h"
 #include "common/log/TorkLog.h"
 #include "common/xml/TorkErrorHandler.h"
 #include "common/xml/TorkXmlDepth.h"
@@ -54,7 +55,8 @@ TorkConfigFile::TorkConfigFile(QString const& fileName)
 {}
 
 TorkConfigFile::TorkConfigFile(QString const& fileName, QString const& rootElementName)
-    : m_fileName(fileName), m_rootElementName(rootElementName), m_currentElement(QLatin1String("")),
+    : m_fileName(fileName), m_rootElementName(rootElementName),
+      m_sections(new TorkOrderedHash<TorkConfigFileSection*>), m_currentElement(QLatin1String("")),
       m_lastError(QLatin1String("")), m_screensSectionName(QStringLiteral("ApplicationScreens"))
 {}
 
@@ -70,10 +72,10 @@ void TorkConfigFile::SetFileName(QString const& fileName)
 
 void TorkConfigFile::Clear()
 {
-    for (auto const& entry : m_sections)
+    for (auto const& entry : *m_sections)
         delete entry.value;
-    m_sections.clear();
-    m_replacedSections.clear();
+    m_sections->clear();
+    m_knownOutside.clear();
     m_currentSection = nullptr;
 }
 
@@ -138,18 +140,18 @@ bool TorkConfigFile::HasSection(QString& name)
 
 TorkConfigFileSection* TorkConfigFile::FindSection(QString const& name)
 {
-    return lookUp(name);
+    return handOut(name);
 }
 
 // cppcheck-suppress constParameter ; the interface stands
 TorkConfigFileSection* TorkConfigFile::FindSection(QString& name)
 {
-    return lookUp(name);
+    return handOut(name);
 }
 
 TorkConfigFileSection* TorkConfigFile::lookUp(QString const& name)
 {
-    TorkConfigFileSection** found = m_sections.find(name);
+    TorkConfigFileSection** found = m_sections->find(name);
     if (!found)
         return nullptr;
 
@@ -157,25 +159,43 @@ TorkConfigFileSection* TorkConfigFile::lookUp(QString const& name)
     return *found;
 }
 
+TorkConfigFileSection* TorkConfigFile::handOut(QString const& name)
+{
+    TorkConfigFileSection* section = lookUp(name);
+    if (section)
+        m_knownOutside.insert(section);
+    return section;
+}
+
 bool TorkConfigFile::AppendSection(TorkConfigFileSection* section)
 {
-    if (!section)
-        return true;
-
-    TorkConfigFileSection** replaced = m_sections.find(section->name());
-    if (replaced && *replaced == m_currentSection)
-        m_currentSection = section; // the replaced one may be deleted by whoever holds it
-    m_sections.insert(section->name(), section);
+    if (section) {
+        put(section);
+        m_knownOutside.insert(section);
+    }
     return true;
+}
+
+// The section that has the name so far is left to whoever holds it; nobody else can delete one that
+// was never given out.
+void TorkConfigFile::put(TorkConfigFileSection* section)
+{
+    TorkConfigFileSection** found = m_sections->find(section->name());
+    TorkConfigFileSection* const before = found ? *found : nullptr;
+    m_sections->insert(section->name(), section);
+    if (!before || before == section)
+        return;
+
+    if (before == m_currentSection)
+        m_currentSection = section;
+    if (!m_knownOutside.remove(before))
+        delete before;
 }
 
 TorkConfigFileSection* TorkConfigFile::createSection(QString const& name)
 {
     auto* section = new TorkConfigFileSection(name.toLatin1().constData());
-    TorkConfigFileSection** replaced = m_sections.find(section->name());
-    if (replaced)
-        m_replacedSections.emplace_back(*replaced);
-    AppendSection(section);
+    put(section);
     m_currentSection = section;
     return section;
 }
@@ -194,12 +214,8 @@ QStringList TorkConfigFile::keyList(QString const& section)
 
 QString const* TorkConfigFile::findValue(QString const& section, QString const& key)
 {
-    TorkConfigFileSection** found = m_sections.find(WithoutSpaces(section));
-    if (!found)
-        return nullptr;
-
-    m_currentSection = *found;
-    return m_currentSection->values().find(WithoutSpaces(key));
+    TorkConfigFileSection* found = lookUp(WithoutSpaces(section));
+    return found ? found->m_values->find(WithoutSpaces(key)) : nullptr;
 }
 
 // cppcheck-suppress constParameter ; the interface stands

@@ -5,6 +5,9 @@
 
 #include "common/config/TorkConfigFile.h"
 
+#include "common/config/TorkConfigFileSection.h"
+#include "common/config/TorkOrderedHash.h"
+
 #include <QFile>
 
 #include <algorithm>
@@ -144,9 +147,9 @@ QByteArray TorkConfigFile::toXml()
 {
     QByteArray xml;
     AppendTag(xml, "<", m_rootElementName);
-    for (auto const& section : m_sections) {
+    for (auto const& section : *m_sections) {
         AppendTag(xml, "<", section.value->name());
-        for (auto const& item : section.value->values())
+        for (auto const& item : *section.value->m_values)
             AppendItem(xml, item.key, item.value);
         AppendTag(xml, "</", section.value->name());
     }

@@ -11,16 +11,12 @@
 
 /// A hash table with text keys that is enumerated in the order in which its keys first came in.
 ///
-/// The entries stand in an array, and a second array finds them: walking through all, adding one
-/// and deleting all ask for no memory an entry, which took a third of the time of a load. A saved
-/// file thus keeps the order in which it was read, so that two saved files differ only where values
-/// differ. Keys match exactly and are unique. One thread at a time.
+/// The plain wording is a QHash beside a list. It makes loading a large file slower than what Qt's
+/// own settings take: each key costs a piece of memory of its own. Here the entries lie in an
+/// array, and a second array finds them. tests/plain/tst_PlainTable.cpp holds it to the plain
+/// wording.
 ///
-///     TorkOrderedHash<int> wheels;
-///     wheels.insert("car", 4);
-///     wheels.insert("bicycle", 2);
-///     for (auto const& entry : wheels)
-///         qDebug() << entry.key << entry.value; // the car first
+/// Keys match exactly and are unique. One thread at a time. Not installed: nothing public shows it.
 template <class Value>
 class TorkOrderedHash
 {
@@ -44,19 +40,21 @@ public:
         return const_cast<Value*>(static_cast<TorkOrderedHash const*>(this)->find(key));
     }
 
-    /// Stores `value` under `key`. An earlier value of that key is replaced at its old place.
+    /// Stores `value` under `key`. An earlier value of that key is replaced at its old place. Both
+    /// may be references into the table itself.
     void insert(QString const& key, Value const& value)
     {
+        Entry entry{key, value}; // before the table grows, and they may move
         if (m_slots.size() < 2 * (m_entries.size() + 1))
             grow();
 
-        const uint hash = hashOf(key);
-        Slot& slot = const_cast<Slot&>(slotOf(key, hash));
+        const uint hash = hashOf(entry.key);
+        Slot& slot = const_cast<Slot&>(slotOf(entry.key, hash));
         if (slot.number) {
-            m_entries[slot.number - 1].value = value;
+            m_entries[slot.number - 1].value = std::move(entry.value);
             return;
         }
-        m_entries.push_back({key, value});
+        m_entries.push_back(std::move(entry));
         slot = {hash, static_cast<quint32>(m_entries.size())};
     }
 

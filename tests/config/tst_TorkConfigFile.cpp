@@ -159,6 +159,9 @@ private slots:
     void appendSectionTakesOwnership_data();
     void appendSectionTakesOwnership();
     void appendSectionReplacesWithoutDeleting();
+    void appendSectionTwice();
+    void appendSectionThatWasPushedOut_data();
+    void appendSectionThatWasPushedOut();
     void appendNoSection();
     void appendSectionKeepsBlanksInTheName();
     void clearForgetsAllSections();
@@ -173,6 +176,9 @@ private slots:
     void writeItemRefusesNull();
     void writeItemReplaces();
     void newSectionPushesOutItsNamesake();
+    void pushedOutSectionIsItsHolders_data();
+    void pushedOutSectionIsItsHolders();
+    void pushedOutSectionNobodyHolds();
 
     void readItem_data();
     void readItem();
@@ -413,6 +419,54 @@ void tst_TorkConfigFile::appendSectionReplacesWithoutDeleting()
     QCOMPARE(old->keyList(), QStringList{"old"});
 }
 
+void tst_TorkConfigFile::appendSectionTwice()
+{
+    int deleted = 0;
+    {
+        TorkConfigFile file{QString()};
+        auto* section = new WatchedSection("One", deleted);
+        QVERIFY(file.AppendSection(section));
+        file.WriteItem("One", "k", "v");
+        QVERIFY(file.AppendSection(section));
+        QVERIFY(file.AppendSection(file.FindSection(QStringLiteral("One"))));
+        QCOMPARE(ConfigContents::of(file, {"One"}), QString("One{k=[v]}"));
+        QCOMPARE(deleted, 0);
+    }
+    QCOMPARE(deleted, 1);
+}
+
+void tst_TorkConfigFile::appendSectionThatWasPushedOut_data()
+{
+    QTest::addColumn<bool>("toAnotherFile");
+    QTest::newRow("to the same file") << false;
+    QTest::newRow("to another file") << true;
+}
+
+// The two go on changing places; each is deleted once, by whom it belongs to in the end.
+void tst_TorkConfigFile::appendSectionThatWasPushedOut()
+{
+    QFETCH(bool, toAnotherFile);
+    int firstDeleted = 0;
+    int secondDeleted = 0;
+    auto* first = new WatchedSection("One", firstDeleted);
+    auto second = std::make_unique<WatchedSection>("One", secondDeleted);
+    {
+        TorkConfigFile other{QString()};
+        TorkConfigFile file{QString()};
+        file.AppendSection(first);
+        file.AppendSection(second.get());
+        (toAnotherFile ? other : file).AppendSection(first);
+        if (toAnotherFile)
+            file.AppendSection(new TorkConfigFileSection("One"));
+        QVERIFY(file.WriteItem("One", "k", "v"));
+        QCOMPARE(second->keyList(), QStringList());
+        file.Clear();
+        QCOMPARE(firstDeleted, toAnotherFile ? 0 : 1);
+    }
+    QCOMPARE(firstDeleted, 1);
+    QCOMPARE(secondDeleted, 0);
+}
+
 void tst_TorkConfigFile::appendNoSection()
 {
     TorkConfigFile file{QString()};
@@ -641,7 +695,7 @@ void tst_TorkConfigFile::writeItemReplaces()
              QString("MainWindow{Key=[third];key=[second]}"));
 }
 
-// The name that was asked for is never found, so each write makes its section anew.
+// The name that was asked for is never found, so each write makes its section again.
 void tst_TorkConfigFile::newSectionPushesOutItsNamesake()
 {
     const QString written("\u00E9");
@@ -649,10 +703,81 @@ void tst_TorkConfigFile::newSectionPushesOutItsNamesake()
     TorkConfigFile file{QString()};
 
     QVERIFY(file.WriteItem(written, "first", "1"));
-    QCOMPARE(ConfigContents::of(file, {written, stored}), stored + "{first=[1]}");
+    QCOMPARE(file.keyList(stored), QStringList{"first"});
     QVERIFY(file.WriteItem(written, "second", "2"));
-    QCOMPARE(ConfigContents::of(file, {written, stored}), stored + "{second=[2]}");
+    QCOMPARE(file.keyList(stored), QStringList{"second"});
+    QVERIFY(!file.HasSection(written));
     QVERIFY(file.WriteItem(stored, "third", "3"));
+}
+
+void tst_TorkConfigFile::pushedOutSectionIsItsHolders_data()
+{
+    QTest::addColumn<QString>("made");
+    QTest::addColumn<QString>("then");
+
+    for (char const* made : {"appended", "written", "loaded"}) {
+        for (char const* then : {"deleted", "deleted after the file", "appended again"})
+            QTest::addRow("%s, then %s", made, then) << QString(made) << QString(then);
+    }
+}
+
+// Run under the address sanitizer, which sees what is deleted twice, too late or never.
+void tst_TorkConfigFile::pushedOutSectionIsItsHolders()
+{
+    QFETCH(QString, made);
+    QFETCH(QString, then);
+    const QString written("\u00E9");
+    const QString stored = QChar(QChar::ReplacementCharacter);
+    auto file = std::make_unique<TorkConfigFile>(path("x.cfg"));
+
+    TorkConfigFileSection* held = nullptr;
+    if (made == "appended") {
+        held = new TorkConfigFileSection("\xE9");
+        file->AppendSection(held);
+    } else if (made == "written") {
+        file->WriteItem(written, "old", "1");
+        held = file->FindSection(stored);
+    } else {
+        QVERIFY(TestFiles::write(path("x.cfg"), "<r><\xC3\xA9><k>v</k></\xC3\xA9></r>"));
+        QVERIFY(file->Load());
+        held = file->FindSection(stored);
+    }
+    QVERIFY(held != nullptr);
+    const QStringList heldKeys = held->keyList();
+    QVERIFY(file->WriteItem(written, "new", "2"));
+    QCOMPARE(held->keyList(), heldKeys);
+    QVERIFY(file->FindSection(stored) != held);
+
+    if (then == "deleted") {
+        delete held;
+        QCOMPARE(file->keyList(stored), QStringList{"new"});
+    } else if (then == "deleted after the file") {
+        file.reset();
+        QCOMPARE(held->keyList(), heldKeys);
+        delete held;
+    } else {
+        std::unique_ptr<TorkConfigFileSection> pushedOut(file->FindSection(stored));
+        file->AppendSection(held);
+        QCOMPARE(file->keyList(stored), heldKeys);
+        QCOMPARE(pushedOut->keyList(), QStringList{"new"});
+    }
+}
+
+// The leak checker sees one that stays behind.
+void tst_TorkConfigFile::pushedOutSectionNobodyHolds()
+{
+    const QString stored = QChar(QChar::ReplacementCharacter);
+    TorkConfigFile file(path("x.cfg"));
+    for (int i = 0; i < 10; ++i)
+        QVERIFY(file.WriteItem(QString("\u00E9"), QString::number(i), "v"));
+    QCOMPARE(file.keyList(stored), QStringList{"9"});
+    file.AppendSection(new TorkConfigFileSection("\xE9"));
+    QCOMPARE(file.keyList(stored), QStringList());
+
+    QVERIFY(TestFiles::write(path("x.cfg"), "<r><\xC3\xA9><k>v</k></\xC3\xA9>"
+                                            "<\xC3\xA9><l>w</l></\xC3\xA9></r>"));
+    QVERIFY(file.Load());
+    QCOMPARE(file.keyList(stored), QStringList{"l"});
 }
 
 void tst_TorkConfigFile::readItem_data()
