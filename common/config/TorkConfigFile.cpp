@@ -10,7 +10,9 @@
 #include "common/xml/TorkXmlDepth.h"
 #include "common/xml/TorkXmlGuard.h"
 
+#include <QBuffer>
 #include <QFile>
+#include <QFileInfo>
 #include <QObject>
 #include <QXmlSimpleReader>
 
@@ -109,7 +111,10 @@ bool TorkConfigFile::parse()
     DepthLimitedDocHandler contentHandler(this);
     TorkErrorHandler errorHandler(TorkLog::m_gLog);
     QFile file(m_fileName);
-    TorkXmlGuard source(&file);
+    QBuffer nothing;
+    // Anything but a file, like a pipe or a device, could keep the load waiting or never end.
+    const bool isFile = QFileInfo(m_fileName).isFile();
+    TorkXmlGuard source(isFile ? static_cast<QIODevice*>(&file) : &nothing);
     QXmlSimpleReader reader;
     source.Watch(reader);
     reader.setContentHandler(&contentHandler);

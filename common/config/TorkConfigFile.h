@@ -68,6 +68,8 @@ public:
     ///
     /// Progress and failures are traced to the log when there is one. The text of a failure is
     /// left in m_lastError, and the XML reader's own message goes to the log as a critical entry.
+    /// Only regular files and links to them are read: a pipe, a socket or a device is taken for a
+    /// file that cannot be read, and so does not parse.
     ///
     /// @return false if the file name is empty or no such file exists (sections untouched), or if
     ///         the file does not parse (what preceded the error is kept, earlier sections are gone)
@@ -76,7 +78,8 @@ public:
     /// Writes all sections, replacing the file.
     ///
     /// Each line is converted to Latin-1, with "?" for what Latin-1 lacks. Nothing is written for a
-    /// file name shorter than two characters.
+    /// file name shorter than two characters, nor into a pipe, which counts as one that does not
+    /// open.
     ///
     /// @return always true, for historical callers; whether the file could be opened shows only in
     ///         m_lastError, which a successful Save() leaves as it was

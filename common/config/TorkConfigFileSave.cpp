@@ -12,6 +12,10 @@
 
 #include <algorithm>
 
+#ifdef Q_OS_UNIX
+#include <sys/stat.h>
+#endif
+
 namespace {
 
 // What a character asks of the line it is saved in.
@@ -123,6 +127,18 @@ void AppendItem(QByteArray& xml, QString const& key, QString const& value)
     }
 }
 
+// Opening one waits until somebody reads from it, which may be never.
+bool IsPipe(QString const& fileName)
+{
+#ifdef Q_OS_UNIX
+    struct stat status = {};
+    return stat(QFile::encodeName(fileName).constData(), &status) == 0 && S_ISFIFO(status.st_mode);
+#else
+    Q_UNUSED(fileName)
+    return false;
+#endif
+}
+
 } // namespace
 
 bool TorkConfigFile::Save()
@@ -131,10 +147,10 @@ bool TorkConfigFile::Save()
     if (m_fileName.length() < 2)
         return true;
 
-    // Worded before the file is emptied, so that as little as possible can come between.
+    // Made before the file is emptied, so that as little as possible can come between.
     const QByteArray xml = toXml();
     QFile file(m_fileName);
-    if (!file.open(QIODevice::WriteOnly)) {
+    if (IsPipe(m_fileName) || !file.open(QIODevice::WriteOnly)) {
         m_lastError = QStringLiteral("Unable to open file: %1").arg(m_fileName);
         return true;
     }

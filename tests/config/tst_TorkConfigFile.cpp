@@ -20,6 +20,9 @@
 #include <type_traits>
 
 #ifdef Q_OS_UNIX
+#include <sys/socket.h>
+#include <sys/stat.h>
+#include <sys/un.h>
 #include <unistd.h>
 #endif
 #ifdef Q_OS_LINUX
@@ -211,6 +214,9 @@ private slots:
 
     void loadFailure_data();
     void loadFailure();
+    void specialFile_data();
+    void specialFile();
+    void linkToAFile();
     void loadSuccessEmptiesTheLastError();
     void loadUnreadableAsOtherUser();
     void fillAfterFailedLoadAndSave();
@@ -1343,6 +1349,83 @@ void tst_TorkConfigFile::loadFailure()
     QVERIFY(!file.Load());
     QTEST(file.m_lastError, "lastError");
     QTEST(ConfigContents::of(file, {"old", "new"}), "contents");
+}
+
+void tst_TorkConfigFile::specialFile_data()
+{
+    QTest::addColumn<QString>("kind");
+    QTest::addColumn<QString>("saveError");
+
+    QTest::newRow("pipe") << "pipe"
+                          << "Unable to open file: %1";
+    QTest::newRow("link to a pipe") << "link to a pipe"
+                                    << "Unable to open file: %1";
+    QTest::newRow("socket") << "socket"
+                            << "Unable to open file: %1";
+    QTest::newRow("endless device") << "/dev/zero"
+                                    << "";
+    QTest::newRow("empty device") << "/dev/null"
+                                  << "";
+    QTest::newRow("full device") << "/dev/full"
+                                 << "";
+}
+
+// The alarm ends a test that waits for the other end of a pipe, or for the end of a device.
+void tst_TorkConfigFile::specialFile()
+{
+#ifdef Q_OS_UNIX
+    QFETCH(QString, kind);
+    QFETCH(QString, saveError);
+    QString name = path("x.cfg");
+    sockaddr_un address = {};
+    address.sun_family = AF_UNIX;
+    qstrncpy(address.sun_path, QFile::encodeName(name).constData(), sizeof address.sun_path);
+    if (kind == "socket") {
+        const int listening = socket(AF_UNIX, SOCK_STREAM, 0);
+        QCOMPARE(bind(listening, reinterpret_cast<sockaddr*>(&address), sizeof address), 0);
+        close(listening); // its name stays
+    } else if (kind.endsWith("pipe")) {
+        QCOMPARE(mkfifo(QFile::encodeName(name).constData(), 0600), 0);
+        if (kind.startsWith("link")) {
+            QVERIFY(QFile::link(name, path("link.cfg")));
+            name = path("link.cfg");
+        }
+    } else {
+        name = kind;
+        if (!QFile::exists(name))
+            QSKIP("this system has no such device");
+    }
+
+    alarm(60);
+    TorkConfigFile file(name);
+    file.WriteItem("old", "k", "v");
+    const MessageCapture messages;
+    QVERIFY(!file.Load());
+    QCOMPARE(file.m_lastError, NotParsedText);
+    QCOMPARE(messages.texts().size(), 1);
+    QVERIFY(!file.HasSection(QStringLiteral("old")));
+
+    file.m_lastError.clear();
+    file.WriteItem("new", "k", "v");
+    QVERIFY(file.Save());
+    QCOMPARE(file.m_lastError, saveError.isEmpty() ? QString() : saveError.arg(name));
+    alarm(0);
+#else
+    QSKIP("no such files here");
+#endif
+}
+
+void tst_TorkConfigFile::linkToAFile()
+{
+    QVERIFY(TestFiles::write(path("x.cfg"), "<r><s><k>v</k></s></r>"));
+    if (!QFile::link(path("x.cfg"), path("link.cfg")))
+        QSKIP("no links here");
+    TorkConfigFile file(path("link.cfg"));
+    QVERIFY(file.Load());
+    QCOMPARE(ConfigContents::of(file, {"s"}), QString("s{k=[v]}"));
+    QVERIFY(file.Save());
+    QCOMPARE(TestFiles::read(path("x.cfg")),
+             QByteArray("<VelocorSettings>\n<s>\n<k>v</k>\n</s>\n</VelocorSettings>\n"));
 }
 
 void tst_TorkConfigFile::loadSuccessEmptiesTheLastError()
