@@ -7,6 +7,8 @@
 #include "FuzzInput.h"
 
 #include "common/config/TorkConfigFile.h"
+#include "common/config/TorkConfigFileSection.h"
+#include "common/config/TorkOrderedHash.h"
 #include "support/PrivateField.h"
 
 #include <QFile>
@@ -16,7 +18,7 @@
 // The store tells nobody the names of its sections.
 struct SectionTable
 {
-    using Field = TorkOrderedHash<TorkConfigFileSection*> TorkConfigFile::*;
+    using Field = QScopedPointer<TorkOrderedHash<TorkConfigFileSection*>> TorkConfigFile::*;
     friend Field privateField(SectionTable);
 };
 template struct PrivateField<SectionTable, &TorkConfigFile::m_sections>;
@@ -60,10 +62,11 @@ void Write(QString const& path, QByteArray const& bytes)
 Sections Contents(TorkConfigFile const& settings)
 {
     Sections contents;
-    for (auto const& section : settings.*privateField(SectionTable())) {
+    for (auto const& section : *(settings.*privateField(SectionTable()))) {
         Require(section.key == section.value->name());
         auto& items = contents[section.key];
-        for (auto const& item : section.value->values())
+        const auto stored = section.value->values();
+        for (auto const& item : stored)
             items[item.key] = item.value;
     }
     return contents;

@@ -4,14 +4,19 @@
 #include "common/config/TorkConfigFile.h"
 
 #include "common/config/TorkConfigFileDocHandler.h"
+#include "common/config/TorkOrderedHash.h"
 #include "common/log/TorkLog.h"
 #include "common/xml/TorkErrorHandler.h"
 #include "common/xml/TorkXmlDepth.h"
 #include "common/xml/TorkXmlGuard.h"
 
+#include <QBuffer>
 #include <QFile>
+#include <QFileInfo>
 #include <QObject>
 #include <QXmlSimpleReader>
+
+#include <algorithm>
 
 namespace {
 
@@ -21,32 +26,14 @@ void TraceToLog(QString const& message)
         log->trace(message);
 }
 
-// Looks at all characters without stopping, several at once: names and values are short, and nearly
-// none holds what is looked for.
-bool Contains(QString const& text, char character)
-{
-    bool found = false;
-    for (QChar present : text)
-        found |= present.unicode() == static_cast<uchar>(character);
-    return found;
-}
-
 QString WithoutSpaces(QString const& name)
 {
-    if (!Contains(name, ' '))
+    // Asked first, as nearly no name holds one and removing none costs more than finding a value.
+    if (std::find(name.begin(), name.end(), QLatin1Char(' ')) == name.end())
         return name;
 
     QString cleaned = name;
     return cleaned.remove(QLatin1Char(' '));
-}
-
-// What stands under `name` without its spaces. The name is looked for as it is first: where no key
-// of the table holds a space, one that is found has none either, and is not searched for spaces.
-template <class Table>
-auto FindWithoutSpaces(Table& table, QString const& name)
-{
-    auto* const found = table.holdsSpaces() ? nullptr : table.find(name);
-    return found ? found : table.find(WithoutSpaces(name));
 }
 
 // Ends the parse of a document that is nested too deep for the reader's stack.
@@ -70,7 +57,8 @@ TorkConfigFile::TorkConfigFile(QString const& fileName)
 {}
 
 TorkConfigFile::TorkConfigFile(QString const& fileName, QString const& rootElementName)
-    : m_fileName(fileName), m_rootElementName(rootElementName), m_currentElement(QLatin1String("")),
+    : m_fileName(fileName), m_rootElementName(rootElementName),
+      m_sections(new TorkOrderedHash<TorkConfigFileSection*>), m_currentElement(QLatin1String("")),
       m_lastError(QLatin1String("")), m_screensSectionName(QStringLiteral("ApplicationScreens"))
 {}
 
@@ -86,10 +74,10 @@ void TorkConfigFile::SetFileName(QString const& fileName)
 
 void TorkConfigFile::Clear()
 {
-    for (auto const& entry : m_sections)
+    for (auto const& entry : *m_sections)
         delete entry.value;
-    m_sections.clear();
-    m_replacedSections.clear();
+    m_sections->clear();
+    m_knownOutside.clear();
     m_currentSection = nullptr;
 }
 
@@ -123,7 +111,10 @@ bool TorkConfigFile::parse()
     DepthLimitedDocHandler contentHandler(this);
     TorkErrorHandler errorHandler(TorkLog::m_gLog);
     QFile file(m_fileName);
-    TorkXmlGuard source(&file);
+    QBuffer nothing;
+    // Anything but a file, like a pipe or a device, could keep the load waiting or never end.
+    const bool isFile = QFileInfo(m_fileName).isFile();
+    TorkXmlGuard source(isFile ? static_cast<QIODevice*>(&file) : &nothing);
     QXmlSimpleReader reader;
     source.Watch(reader);
     reader.setContentHandler(&contentHandler);
@@ -154,18 +145,18 @@ bool TorkConfigFile::HasSection(QString& name)
 
 TorkConfigFileSection* TorkConfigFile::FindSection(QString const& name)
 {
-    return lookUp(name);
+    return handOut(name);
 }
 
 // cppcheck-suppress constParameter ; the interface stands
 TorkConfigFileSection* TorkConfigFile::FindSection(QString& name)
 {
-    return lookUp(name);
+    return handOut(name);
 }
 
 TorkConfigFileSection* TorkConfigFile::lookUp(QString const& name)
 {
-    TorkConfigFileSection** found = m_sections.find(name);
+    TorkConfigFileSection** found = m_sections->find(name);
     if (!found)
         return nullptr;
 
@@ -173,25 +164,43 @@ TorkConfigFileSection* TorkConfigFile::lookUp(QString const& name)
     return *found;
 }
 
+TorkConfigFileSection* TorkConfigFile::handOut(QString const& name)
+{
+    TorkConfigFileSection* section = lookUp(name);
+    if (section)
+        m_knownOutside.insert(section);
+    return section;
+}
+
 bool TorkConfigFile::AppendSection(TorkConfigFileSection* section)
 {
-    if (!section)
-        return true;
-
-    TorkConfigFileSection** replaced = m_sections.find(section->name());
-    if (replaced && *replaced == m_currentSection)
-        m_currentSection = section; // the replaced one may be deleted by whoever holds it
-    m_sections.insert(section->name(), section);
+    if (section) {
+        put(section);
+        m_knownOutside.insert(section);
+    }
     return true;
+}
+
+// The section that has the name so far is left to whoever holds it; nobody else can delete one that
+// was never given out.
+void TorkConfigFile::put(TorkConfigFileSection* section)
+{
+    TorkConfigFileSection** found = m_sections->find(section->name());
+    TorkConfigFileSection* const before = found ? *found : nullptr;
+    m_sections->insert(section->name(), section);
+    if (!before || before == section)
+        return;
+
+    if (before == m_currentSection)
+        m_currentSection = section;
+    if (!m_knownOutside.remove(before))
+        delete before;
 }
 
 TorkConfigFileSection* TorkConfigFile::createSection(QString const& name)
 {
     auto* section = new TorkConfigFileSection(name.toLatin1().constData());
-    TorkConfigFileSection** replaced = m_sections.find(section->name());
-    if (replaced)
-        m_replacedSections.emplace_back(*replaced);
-    AppendSection(section);
+    put(section);
     m_currentSection = section;
     return section;
 }
@@ -210,12 +219,8 @@ QStringList TorkConfigFile::keyList(QString const& section)
 
 QString const* TorkConfigFile::findValue(QString const& section, QString const& key)
 {
-    TorkConfigFileSection** found = FindWithoutSpaces(m_sections, section);
-    if (!found)
-        return nullptr;
-
-    m_currentSection = *found;
-    return FindWithoutSpaces(m_currentSection->values(), key);
+    TorkConfigFileSection* found = lookUp(WithoutSpaces(section));
+    return found ? found->m_values->find(WithoutSpaces(key)) : nullptr;
 }
 
 // cppcheck-suppress constParameter ; the interface stands
@@ -243,18 +248,17 @@ bool TorkConfigFile::WriteItem(QString const& section, QString const& key, QStri
 }
 
 // cppcheck-suppress constParameter ; the interface stands
-void TorkConfigFile::StartElement(QString& name)
+bool TorkConfigFile::StartElement(QString& name)
 {
     m_currentElement = name;
+    m_atRoot = name == m_rootElementName;
+    if (m_atRoot)
+        return true;
 
     // White space inside a new section is no value, even where the item before had no text.
     const int depth = m_activeHandler ? m_activeHandler->depth() : 0;
     if (depth == 1 || depth == 2)
         m_expectingValue = false;
-
-    m_atRoot = name == m_rootElementName;
-    if (m_atRoot)
-        return;
 
     if (depth == 2 && !lookUp(name))
         createSection(name);
@@ -262,12 +266,14 @@ void TorkConfigFile::StartElement(QString& name)
         m_expectingValue = true;
     // Deeper elements leave the flag: one inside an item without text is stored as if it were the
     // item.
+    return true;
 }
 
-void TorkConfigFile::EndElement(QString&)
+bool TorkConfigFile::EndElement(QString&)
 {
-    // Not made anew for each element, as it would be from Latin-1.
+    // Not made again for each element, as it would be from Latin-1.
     m_currentElement = QStringLiteral(""); // clazy:exclude=empty-qstringliteral
+    return true;
 }
 
 // cppcheck-suppress constParameter ; the interface stands
@@ -277,14 +283,7 @@ bool TorkConfigFile::ProcessContent(QString& content)
         return true;
 
     m_expectingValue = false;
-    if (!m_currentSection)
-        return true;
-
-    // The current section stands in the table under its own name; only names with spaces in them
-    // would lead elsewhere.
-    if (m_sections.holdsSpaces() || Contains(m_currentElement, ' '))
+    if (m_currentSection)
         WriteItem(m_currentSection->name(), m_currentElement, content);
-    else if (!content.isNull())
-        m_currentSection->AddValue(m_currentElement, content);
     return true;
 }

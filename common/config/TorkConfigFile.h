@@ -4,19 +4,19 @@
 #pragma once
 
 #include "common/config/TorkConfigFileSection.h"
-#include "common/config/TorkOrderedHash.h"
 
+#include <QScopedPointer>
+#include <QSet>
 #include <QString>
 #include <QStringList>
-
-#include <memory>
-#include <vector>
 
 class QColor;
 class QFont;
 class QPoint;
 class QSize;
 class TorkConfigFileDocHandler;
+template <class Value>
+class TorkOrderedHash;
 
 /// The settings of one component: named sections of key/value texts in one small XML file.
 ///
@@ -66,13 +66,16 @@ public:
     /// Replaces the path of the file; sections and everything else stay.
     void SetFileName(QString const& fileName);
 
-    /// Deletes every section. Pointers to sections that were handed out are invalid afterwards.
+    /// Deletes every section in the file. Pointers to them that were handed out are invalid
+    /// afterwards; sections that were pushed out (see AppendSection()) stay their holders'.
     void Clear();
 
     /// Reads the file, replacing all sections.
     ///
     /// Progress and failures are traced to the log when there is one. The text of a failure is
     /// left in m_lastError, and the XML reader's own message goes to the log as a critical entry.
+    /// Only regular files and links to them are read: a pipe, a socket or a device is taken for a
+    /// file that cannot be read, and so does not parse.
     ///
     /// @return false if the file name is empty or no such file exists (sections untouched), or if
     ///         the file does not parse (what preceded the error is kept, earlier sections are gone)
@@ -82,7 +85,8 @@ public:
     /// leaves a part of it or nothing. SaveAtomically() does not.
     ///
     /// Each line is converted to Latin-1, with "?" for what Latin-1 lacks. Nothing is written for a
-    /// file name shorter than two characters.
+    /// file name shorter than two characters, nor into a pipe, which counts as one that does not
+    /// open.
     ///
     /// @return always true, for historical callers; whether the file could be opened shows only in
     ///         m_lastError, which a successful Save() leaves as it was
@@ -113,15 +117,21 @@ public:
     bool HasSection(QString const& name);
     bool HasSection(QString& name);
 
-    /// The section of exactly that name, still owned by the file; null if there is none.
+    /// The section of exactly that name, or null. It stays the file's, until another of that name
+    /// pushes it out: see AppendSection().
     TorkConfigFileSection* FindSection(QString const& name);
     TorkConfigFileSection* FindSection(QString& name);
 
     /// Adds a section under its own name and takes ownership of it.
     ///
-    /// A section that already had the name leaves the file without being deleted: it belongs to
-    /// whoever holds it from then on.
+    /// It pushes out a section that already has the name. If FindSection() ever gave that one out,
+    /// or AppendSection() took it, it leaves the file without being deleted: it belongs to whoever
+    /// holds it, who may delete it or append it again, here or to another file. The same holds when
+    /// WriteItem() or Load() make a section whose decoded name is taken. What nobody ever got a
+    /// pointer to is deleted.
     ///
+    /// @param section  made by `new`, in no other file; null and one that is already in the file
+    ///                 change nothing
     /// @return always true
     bool AppendSection(TorkConfigFileSection* section);
 
@@ -222,14 +232,19 @@ public:
     bool ReadScreenMetrics(char const* name, QPoint& position, QSize& size);
 
     /// Load step: an element opened. Called by the document handler.
-    void StartElement(QString& name);
-
-    /// Load step: an element ended. Called by the document handler.
-    void EndElement(QString& name);
-
-    /// Load step: stores `content` as the value of the item that opened last, if it has none yet.
     ///
     /// @return always true
+    bool StartElement(QString& name);
+
+    /// Load step: an element ended. Called by the document handler.
+    ///
+    /// @return always true
+    bool EndElement(QString& name);
+
+    /// Load step: stores `content` as WriteItem() does, as the value of the item that opened last,
+    /// if it has none yet.
+    ///
+    /// @return always true, also where WriteItem() refuses a null text
     bool ProcessContent(QString& content);
 
     /// Prepares a value for writing: wrapped in a CDATA section if it holds one of & ' < > ".
@@ -243,6 +258,8 @@ public:
 private:
     TorkConfigFileSection* lookUp(QString const& name);
     TorkConfigFileSection* createSection(QString const& name);
+    TorkConfigFileSection* handOut(QString const& name);
+    void put(TorkConfigFileSection* section);
     QString const* findValue(QString const& section, QString const& key);
     bool parse();
     void fail(QString const& message);
@@ -252,7 +269,8 @@ private:
     QString m_rootElementName;
     bool m_atRoot = false;
     bool m_expectingValue = false;
-    TorkOrderedHash<TorkConfigFileSection*> m_sections;
+    QScopedPointer<TorkOrderedHash<TorkConfigFileSection*>> m_sections; // never null, owning
+    QSet<TorkConfigFileSection*> m_knownOutside; // those of them that somebody may hold
     TorkConfigFileSection* m_currentSection = nullptr;
     TorkConfigFileDocHandler* m_activeHandler = nullptr;
     QString m_currentElement;
@@ -264,8 +282,4 @@ public:
 
 private:
     QString m_screensSectionName;
-
-    // Sections that a section of the same name pushed out of the table while loading or writing:
-    // nobody else knows them, and somebody may still hold a pointer from FindSection().
-    std::vector<std::unique_ptr<TorkConfigFileSection>> m_replacedSections;
 };

@@ -5,27 +5,6 @@
 
 #include "common/config/TorkConfigFile.h"
 
-#include <algorithm>
-
-namespace {
-
-// Takes a text of the reader's over without sharing its memory. The reader fills the same few texts
-// again and again, and where somebody shares one of them it makes a new one, with room to grow.
-void TakeOver(QString& text, QString const& read)
-{
-    const int length = read.length();
-    if (read.isNull()) {
-        text = read;
-    } else if (text.isDetached() && text.capacity() >= length) {
-        text.resize(length);
-        std::copy_n(read.constData(), length, text.data());
-    } else {
-        text = QString(read.constData(), length);
-    }
-}
-
-} // namespace
-
 TorkConfigFileDocHandler::TorkConfigFileDocHandler() : TorkConfigFileDocHandler(nullptr) {}
 
 TorkConfigFileDocHandler::TorkConfigFileDocHandler(TorkConfigFile* file)
@@ -58,7 +37,7 @@ bool TorkConfigFileDocHandler::endPrefixMapping(QString const&)
 bool TorkConfigFileDocHandler::startElement(QString const&, QString const& localName,
                                             QString const&, QXmlAttributes const&)
 {
-    TakeOver(m_lastOpenedElement, localName);
+    m_lastOpenedElement = localName;
     m_state = Opened;
     ++m_depth;
     if (m_file)
@@ -68,7 +47,7 @@ bool TorkConfigFileDocHandler::startElement(QString const&, QString const& local
 
 bool TorkConfigFileDocHandler::endElement(QString const&, QString const& localName, QString const&)
 {
-    TakeOver(m_lastClosedElement, localName);
+    m_lastClosedElement = localName;
     m_state = Closed;
     --m_depth;
     if (m_file)
@@ -81,7 +60,7 @@ bool TorkConfigFileDocHandler::characters(QString const& text)
     if (m_state != Opened)
         return true;
 
-    TakeOver(m_content, text);
+    m_content = text;
     m_state = ContentTaken;
     if (m_file)
         m_file->ProcessContent(m_content);

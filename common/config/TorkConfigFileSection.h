@@ -3,16 +3,19 @@
 
 #pragma once
 
-#include "common/config/TorkOrderedHash.h"
-
+#include <QScopedPointer>
 #include <QString>
 #include <QStringList>
+#include <QVector>
+
+template <class Value>
+class TorkOrderedHash;
 
 /// One named section of a configuration file: text values under unique text keys.
 ///
 /// A plain container that knows nothing of files. Names and keys match exactly and
 /// case-sensitively. The order in which keys are enumerated is not promised.
-/// One thread at a time.
+/// One thread at a time. It owns its texts and knows nothing of the file that holds it.
 ///
 ///     TorkConfigFileSection section("Window");
 ///     section.AddValue("title", "Bookmarks");
@@ -21,6 +24,13 @@
 class TorkConfigFileSection
 {
 public:
+    /// A value and the key that it is stored under.
+    struct Item
+    {
+        QString key;
+        QString value;
+    };
+
     /// Makes an empty section.
     ///
     /// @param name  zero-terminated, decoded as UTF-8 and copied; null names the section
@@ -39,7 +49,7 @@ public:
     /// The section's name.
     QString const& name() const { return m_name; }
 
-    /// Stores `value` under `key`, replacing any earlier value of that key.
+    /// Stores copies of `key` and `value`, replacing any earlier value of that key.
     ///
     /// @return always true
     bool AddValue(QString const& key, QString const& value);
@@ -53,13 +63,16 @@ public:
     /// The keys of the section, each once, in no promised order; empty for an empty section.
     QStringList keyList() const;
 
-    /// The entries, for walking through all of them; valid until the next AddValue() or Clear().
-    TorkOrderedHash<QString> const& values() const { return m_values; }
+    /// All keys with their values, in the order of keyList(): a copy, which no later change of the
+    /// section touches.
+    QVector<Item> values() const;
 
     /// Removes all keys and values. The name stays.
     void Clear();
 
 private:
+    friend class TorkConfigFile;
+
     QString m_name;
-    TorkOrderedHash<QString> m_values;
+    QScopedPointer<TorkOrderedHash<QString>> m_values; // never null
 };

@@ -44,8 +44,9 @@ QDesktopWidget* Desktop()
     return haveApplication ? QApplication::desktop() : nullptr;
 }
 
-// What QString::toInt() gives. Plain short numbers, which nearly all are, are read here: the
-// toolkit's conversion costs twice as much as finding the value does.
+// What QString::toInt() gives. Plain short numbers, which nearly all are, are read here: with Qt's
+// conversion alone a typed read takes twice its floor. tests/plain/tst_PlainNumbers.cpp compares
+// the two.
 int ToInt(QString const& text, bool* converted)
 {
     QChar const* const characters = text.constData();

@@ -6,22 +6,17 @@
 #include <QHash>
 #include <QString>
 
-#include <cstring>
 #include <utility>
 #include <vector>
 
 /// A hash table with text keys that is enumerated in the order in which its keys first came in.
 ///
-/// The entries stand in an array, and a second array finds them: walking through all, adding one
-/// and deleting all ask for no memory an entry, which took a third of the time of a load. A saved
-/// file thus keeps the order in which it was read, so that two saved files differ only where values
-/// differ. Keys match exactly and are unique. One thread at a time.
+/// The plain wording is a QHash beside a list. It makes loading a large file slower than what Qt's
+/// own settings take: each key costs a piece of memory of its own. Here the entries lie in an
+/// array, and a second array finds them. tests/plain/tst_PlainTable.cpp holds it to the plain
+/// wording.
 ///
-///     TorkOrderedHash<int> wheels;
-///     wheels.insert("car", 4);
-///     wheels.insert("bicycle", 2);
-///     for (auto const& entry : wheels)
-///         qDebug() << entry.key << entry.value; // the car first
+/// Keys match exactly and are unique. One thread at a time. Not installed: nothing public shows it.
 template <class Value>
 class TorkOrderedHash
 {
@@ -45,29 +40,26 @@ public:
         return const_cast<Value*>(static_cast<TorkOrderedHash const*>(this)->find(key));
     }
 
-    /// Stores `value` under `key`. An earlier value of that key is replaced at its old place.
+    /// Stores `value` under `key`. An earlier value of that key is replaced at its old place. Both
+    /// may be references into the table itself.
     void insert(QString const& key, Value const& value)
     {
+        Entry entry{key, value}; // before the table grows, and they may move
         if (m_slots.size() < 2 * (m_entries.size() + 1))
             grow();
 
-        const uint hash = hashOf(key);
-        Slot& slot = const_cast<Slot&>(slotOf(key, hash));
+        const uint hash = hashOf(entry.key);
+        Slot& slot = const_cast<Slot&>(slotOf(entry.key, hash));
         if (slot.number) {
-            m_entries[slot.number - 1].value = value;
+            m_entries[slot.number - 1].value = std::move(entry.value);
             return;
         }
-        m_holdsSpaces = m_holdsSpaces || holdsSpace(key);
-        m_entries.push_back({key, value});
+        m_entries.push_back(std::move(entry));
         slot = {hash, static_cast<quint32>(m_entries.size())};
     }
 
-    /// Whether a key in the table holds a space.
-    bool holdsSpaces() const { return m_holdsSpaces; }
-
     void clear()
     {
-        m_holdsSpaces = false;
         m_slots.clear();
         m_entries.clear();
     }
@@ -86,21 +78,6 @@ private:
 
     uint hashOf(QString const& key) const { return qHash(key, m_seed); }
 
-    static bool holdsSpace(QString const& key)
-    {
-        bool found = false;
-        for (QChar character : key)
-            found |= character.unicode() == ' ';
-        return found;
-    }
-
-    // Half the time of the toolkit's comparison, which is a third of a lookup.
-    static bool isSame(QString const& a, QString const& b)
-    {
-        const size_t bytes = size_t(a.length()) * sizeof(QChar);
-        return a.length() == b.length() && !std::memcmp(a.constData(), b.constData(), bytes);
-    }
-
     // The slot of the entry with this key, or the free one where its search ends: at least half of
     // the slots are free, so it does.
     Slot const& slotOf(QString const& key, uint hash) const
@@ -108,7 +85,7 @@ private:
         const size_t mask = m_slots.size() - 1;
         size_t i = hash & mask;
         while (m_slots[i].number &&
-               (m_slots[i].hash != hash || !isSame(m_entries[m_slots[i].number - 1].key, key)))
+               (m_slots[i].hash != hash || m_entries[m_slots[i].number - 1].key != key))
             i = (i + 1) & mask;
         return m_slots[i];
     }
@@ -131,6 +108,5 @@ private:
 
     std::vector<Entry> m_entries;
     std::vector<Slot> m_slots; // as many as a power of two
-    bool m_holdsSpaces = false;
     uint m_seed = static_cast<uint>(qGlobalQHashSeed());
 };

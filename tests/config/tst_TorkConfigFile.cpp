@@ -20,6 +20,9 @@
 #include <type_traits>
 
 #ifdef Q_OS_UNIX
+#include <sys/socket.h>
+#include <sys/stat.h>
+#include <sys/un.h>
 #include <unistd.h>
 #endif
 #ifdef Q_OS_LINUX
@@ -159,6 +162,9 @@ private slots:
     void appendSectionTakesOwnership_data();
     void appendSectionTakesOwnership();
     void appendSectionReplacesWithoutDeleting();
+    void appendSectionTwice();
+    void appendSectionThatWasPushedOut_data();
+    void appendSectionThatWasPushedOut();
     void appendNoSection();
     void appendSectionKeepsBlanksInTheName();
     void clearForgetsAllSections();
@@ -173,6 +179,9 @@ private slots:
     void writeItemRefusesNull();
     void writeItemReplaces();
     void newSectionPushesOutItsNamesake();
+    void pushedOutSectionIsItsHolders_data();
+    void pushedOutSectionIsItsHolders();
+    void pushedOutSectionNobodyHolds();
 
     void readItem_data();
     void readItem();
@@ -205,6 +214,9 @@ private slots:
 
     void loadFailure_data();
     void loadFailure();
+    void specialFile_data();
+    void specialFile();
+    void linkToAFile();
     void loadSuccessEmptiesTheLastError();
     void loadUnreadableAsOtherUser();
     void fillAfterFailedLoadAndSave();
@@ -411,6 +423,54 @@ void tst_TorkConfigFile::appendSectionReplacesWithoutDeleting()
     QCOMPARE(newDeleted, 1);
     QCOMPARE(oldDeleted, 0);
     QCOMPARE(old->keyList(), QStringList{"old"});
+}
+
+void tst_TorkConfigFile::appendSectionTwice()
+{
+    int deleted = 0;
+    {
+        TorkConfigFile file{QString()};
+        auto* section = new WatchedSection("One", deleted);
+        QVERIFY(file.AppendSection(section));
+        file.WriteItem("One", "k", "v");
+        QVERIFY(file.AppendSection(section));
+        QVERIFY(file.AppendSection(file.FindSection(QStringLiteral("One"))));
+        QCOMPARE(ConfigContents::of(file, {"One"}), QString("One{k=[v]}"));
+        QCOMPARE(deleted, 0);
+    }
+    QCOMPARE(deleted, 1);
+}
+
+void tst_TorkConfigFile::appendSectionThatWasPushedOut_data()
+{
+    QTest::addColumn<bool>("toAnotherFile");
+    QTest::newRow("to the same file") << false;
+    QTest::newRow("to another file") << true;
+}
+
+// The two go on changing places; each is deleted once, by whom it belongs to in the end.
+void tst_TorkConfigFile::appendSectionThatWasPushedOut()
+{
+    QFETCH(bool, toAnotherFile);
+    int firstDeleted = 0;
+    int secondDeleted = 0;
+    auto* first = new WatchedSection("One", firstDeleted);
+    auto second = std::make_unique<WatchedSection>("One", secondDeleted);
+    {
+        TorkConfigFile other{QString()};
+        TorkConfigFile file{QString()};
+        file.AppendSection(first);
+        file.AppendSection(second.get());
+        (toAnotherFile ? other : file).AppendSection(first);
+        if (toAnotherFile)
+            file.AppendSection(new TorkConfigFileSection("One"));
+        QVERIFY(file.WriteItem("One", "k", "v"));
+        QCOMPARE(second->keyList(), QStringList());
+        file.Clear();
+        QCOMPARE(firstDeleted, toAnotherFile ? 0 : 1);
+    }
+    QCOMPARE(firstDeleted, 1);
+    QCOMPARE(secondDeleted, 0);
 }
 
 void tst_TorkConfigFile::appendNoSection()
@@ -641,7 +701,7 @@ void tst_TorkConfigFile::writeItemReplaces()
              QString("MainWindow{Key=[third];key=[second]}"));
 }
 
-// The name that was asked for is never found, so each write makes its section anew.
+// The name that was asked for is never found, so each write makes its section again.
 void tst_TorkConfigFile::newSectionPushesOutItsNamesake()
 {
     const QString written("\u00E9");
@@ -649,10 +709,81 @@ void tst_TorkConfigFile::newSectionPushesOutItsNamesake()
     TorkConfigFile file{QString()};
 
     QVERIFY(file.WriteItem(written, "first", "1"));
-    QCOMPARE(ConfigContents::of(file, {written, stored}), stored + "{first=[1]}");
+    QCOMPARE(file.keyList(stored), QStringList{"first"});
     QVERIFY(file.WriteItem(written, "second", "2"));
-    QCOMPARE(ConfigContents::of(file, {written, stored}), stored + "{second=[2]}");
+    QCOMPARE(file.keyList(stored), QStringList{"second"});
+    QVERIFY(!file.HasSection(written));
     QVERIFY(file.WriteItem(stored, "third", "3"));
+}
+
+void tst_TorkConfigFile::pushedOutSectionIsItsHolders_data()
+{
+    QTest::addColumn<QString>("made");
+    QTest::addColumn<QString>("then");
+
+    for (char const* made : {"appended", "written", "loaded"}) {
+        for (char const* then : {"deleted", "deleted after the file", "appended again"})
+            QTest::addRow("%s, then %s", made, then) << QString(made) << QString(then);
+    }
+}
+
+// Run under the address sanitizer, which sees what is deleted twice, too late or never.
+void tst_TorkConfigFile::pushedOutSectionIsItsHolders()
+{
+    QFETCH(QString, made);
+    QFETCH(QString, then);
+    const QString written("\u00E9");
+    const QString stored = QChar(QChar::ReplacementCharacter);
+    auto file = std::make_unique<TorkConfigFile>(path("x.cfg"));
+
+    TorkConfigFileSection* held = nullptr;
+    if (made == "appended") {
+        held = new TorkConfigFileSection("\xE9");
+        file->AppendSection(held);
+    } else if (made == "written") {
+        file->WriteItem(written, "old", "1");
+        held = file->FindSection(stored);
+    } else {
+        QVERIFY(TestFiles::write(path("x.cfg"), "<r><\xC3\xA9><k>v</k></\xC3\xA9></r>"));
+        QVERIFY(file->Load());
+        held = file->FindSection(stored);
+    }
+    QVERIFY(held != nullptr);
+    const QStringList heldKeys = held->keyList();
+    QVERIFY(file->WriteItem(written, "new", "2"));
+    QCOMPARE(held->keyList(), heldKeys);
+    QVERIFY(file->FindSection(stored) != held);
+
+    if (then == "deleted") {
+        delete held;
+        QCOMPARE(file->keyList(stored), QStringList{"new"});
+    } else if (then == "deleted after the file") {
+        file.reset();
+        QCOMPARE(held->keyList(), heldKeys);
+        delete held;
+    } else {
+        std::unique_ptr<TorkConfigFileSection> pushedOut(file->FindSection(stored));
+        file->AppendSection(held);
+        QCOMPARE(file->keyList(stored), heldKeys);
+        QCOMPARE(pushedOut->keyList(), QStringList{"new"});
+    }
+}
+
+// The leak checker sees one that stays behind.
+void tst_TorkConfigFile::pushedOutSectionNobodyHolds()
+{
+    const QString stored = QChar(QChar::ReplacementCharacter);
+    TorkConfigFile file(path("x.cfg"));
+    for (int i = 0; i < 10; ++i)
+        QVERIFY(file.WriteItem(QString("\u00E9"), QString::number(i), "v"));
+    QCOMPARE(file.keyList(stored), QStringList{"9"});
+    file.AppendSection(new TorkConfigFileSection("\xE9"));
+    QCOMPARE(file.keyList(stored), QStringList());
+
+    QVERIFY(TestFiles::write(path("x.cfg"), "<r><\xC3\xA9><k>v</k></\xC3\xA9>"
+                                            "<\xC3\xA9><l>w</l></\xC3\xA9></r>"));
+    QVERIFY(file.Load());
+    QCOMPARE(file.keyList(stored), QStringList{"l"});
 }
 
 void tst_TorkConfigFile::readItem_data()
@@ -1218,6 +1349,83 @@ void tst_TorkConfigFile::loadFailure()
     QVERIFY(!file.Load());
     QTEST(file.m_lastError, "lastError");
     QTEST(ConfigContents::of(file, {"old", "new"}), "contents");
+}
+
+void tst_TorkConfigFile::specialFile_data()
+{
+    QTest::addColumn<QString>("kind");
+    QTest::addColumn<QString>("saveError");
+
+    QTest::newRow("pipe") << "pipe"
+                          << "Unable to open file: %1";
+    QTest::newRow("link to a pipe") << "link to a pipe"
+                                    << "Unable to open file: %1";
+    QTest::newRow("socket") << "socket"
+                            << "Unable to open file: %1";
+    QTest::newRow("endless device") << "/dev/zero"
+                                    << "";
+    QTest::newRow("empty device") << "/dev/null"
+                                  << "";
+    QTest::newRow("full device") << "/dev/full"
+                                 << "";
+}
+
+// The alarm ends a test that waits for the other end of a pipe, or for the end of a device.
+void tst_TorkConfigFile::specialFile()
+{
+#ifdef Q_OS_UNIX
+    QFETCH(QString, kind);
+    QFETCH(QString, saveError);
+    QString name = path("x.cfg");
+    sockaddr_un address = {};
+    address.sun_family = AF_UNIX;
+    qstrncpy(address.sun_path, QFile::encodeName(name).constData(), sizeof address.sun_path);
+    if (kind == "socket") {
+        const int listening = socket(AF_UNIX, SOCK_STREAM, 0);
+        QCOMPARE(bind(listening, reinterpret_cast<sockaddr*>(&address), sizeof address), 0);
+        close(listening); // its name stays
+    } else if (kind.endsWith("pipe")) {
+        QCOMPARE(mkfifo(QFile::encodeName(name).constData(), 0600), 0);
+        if (kind.startsWith("link")) {
+            QVERIFY(QFile::link(name, path("link.cfg")));
+            name = path("link.cfg");
+        }
+    } else {
+        name = kind;
+        if (!QFile::exists(name))
+            QSKIP("this system has no such device");
+    }
+
+    alarm(60);
+    TorkConfigFile file(name);
+    file.WriteItem("old", "k", "v");
+    const MessageCapture messages;
+    QVERIFY(!file.Load());
+    QCOMPARE(file.m_lastError, NotParsedText);
+    QCOMPARE(messages.texts().size(), 1);
+    QVERIFY(!file.HasSection(QStringLiteral("old")));
+
+    file.m_lastError.clear();
+    file.WriteItem("new", "k", "v");
+    QVERIFY(file.Save());
+    QCOMPARE(file.m_lastError, saveError.isEmpty() ? QString() : saveError.arg(name));
+    alarm(0);
+#else
+    QSKIP("no such files here");
+#endif
+}
+
+void tst_TorkConfigFile::linkToAFile()
+{
+    QVERIFY(TestFiles::write(path("x.cfg"), "<r><s><k>v</k></s></r>"));
+    if (!QFile::link(path("x.cfg"), path("link.cfg")))
+        QSKIP("no links here");
+    TorkConfigFile file(path("link.cfg"));
+    QVERIFY(file.Load());
+    QCOMPARE(ConfigContents::of(file, {"s"}), QString("s{k=[v]}"));
+    QVERIFY(file.Save());
+    QCOMPARE(TestFiles::read(path("x.cfg")),
+             QByteArray("<VelocorSettings>\n<s>\n<k>v</k>\n</s>\n</VelocorSettings>\n"));
 }
 
 void tst_TorkConfigFile::loadSuccessEmptiesTheLastError()

@@ -274,6 +274,16 @@ void tst_TorkConfigFileLoad::rootElementName_data()
                                 << "s{k=[w]}";
     QTest::newRow("as an item without text")
         << QByteArray("<r><s><VelocorSettings/><k>w</k></s></r>") << "s{k=[w]}";
+    // The item before it goes on waiting for its text.
+    QTest::newRow("as a section after an item without text")
+        << QByteArray("<r><s><k/></s><VelocorSettings><VelocorSettings><d>x</d></VelocorSettings>"
+                      "</VelocorSettings></r>")
+        << "s{d=[x]}";
+    QTest::newRow("as an item with an element inside")
+        << QByteArray("<r><s><VelocorSettings><d>x</d></VelocorSettings></s></r>") << "s{}";
+    QTest::newRow("as an item with an element inside, after an item without text")
+        << QByteArray("<r><s><k/><VelocorSettings><d>x</d></VelocorSettings></s></r>")
+        << "s{d=[x]}";
     QTest::newRow("within an item")
         << QByteArray("<r><s><k><VelocorSettings>v</VelocorSettings></k><l>w</l></s></r>")
         << "s{l=[w]}";
@@ -786,12 +796,12 @@ void tst_TorkConfigFileLoad::steps_data()
 
     const auto start = [](TorkConfigFile& file, char const* element) {
         QString name(element);
-        file.StartElement(name);
+        QVERIFY(file.StartElement(name));
         QCOMPARE(name, QString(element));
     };
     const auto end = [](TorkConfigFile& file, char const* element) {
         QString name(element);
-        file.EndElement(name);
+        QVERIFY(file.EndElement(name));
         QCOMPARE(name, QString(element));
     };
     const auto content = [](TorkConfigFile& file, char const* text) {
@@ -822,6 +832,22 @@ void tst_TorkConfigFileLoad::steps_data()
         start(file, "l");
         content(file, "w");
     }) << "s{k=[v];l=[w]}";
+    QTest::newRow("a null text is refused, and counts")
+        << atItem << Step([=](TorkConfigFile& file) {
+               QString null;
+               QVERIFY(file.ProcessContent(null));
+               content(file, "w");
+           })
+        << "s{}";
+    QTest::newRow("a null key is refused") << atItem << Step([=](TorkConfigFile& file) {
+        QString null;
+        QVERIFY(file.StartElement(null));
+        content(file, "w");
+    }) << "s{}";
+    QTest::newRow("blanks in a key are removed") << atItem << Step([=](TorkConfigFile& file) {
+        start(file, " l l ");
+        content(file, "w");
+    }) << "s{ll=[w]}";
     QTest::newRow("an ended element has the empty name") << atItem << Step([=](TorkConfigFile& f) {
         end(f, "k");
         content(f, "v");
@@ -943,9 +969,9 @@ void tst_TorkConfigFileLoad::stepsOutsideALoad()
     TorkConfigFile file(path());
     QString name("s");
     QString content("v");
-    file.StartElement(name);
+    QVERIFY(file.StartElement(name));
     QVERIFY(file.ProcessContent(content));
-    file.EndElement(name);
+    QVERIFY(file.EndElement(name));
     QVERIFY(!file.HasSection("s"));
 
     file.WriteItem("t", "k", "v");

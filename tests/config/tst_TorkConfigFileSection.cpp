@@ -26,6 +26,10 @@ private slots:
     void findValue();
     void keyListHoldsEachKeyOnce();
     void manyKeys();
+    void valuesInTheOrderOfTheKeyList();
+    void valuesAreACopy();
+    void addValueOfItsOwn_data();
+    void addValueOfItsOwn();
     void clear_data();
     void clear();
     void canBeFilledAgainAfterClear();
@@ -181,6 +185,68 @@ void tst_TorkConfigFileSection::manyKeys()
         QVERIFY2(section.FindValue(keys[i], value), qPrintable(keys[i]));
         QCOMPARE(value, QString::number(i));
     }
+}
+
+void tst_TorkConfigFileSection::valuesInTheOrderOfTheKeyList()
+{
+    TorkConfigFileSection section("Config");
+    QVERIFY(section.values().isEmpty());
+    section.AddValue("b", "1");
+    section.AddValue("a", "2");
+    section.AddValue("b", "3");
+
+    QStringList keys;
+    QStringList values;
+    const auto items = section.values();
+    for (TorkConfigFileSection::Item const& item : items) {
+        keys.append(item.key);
+        values.append(item.value);
+    }
+    QCOMPARE(keys, section.keyList());
+    QCOMPARE(keys, (QStringList{"b", "a"}));
+    QCOMPARE(values, (QStringList{"3", "2"}));
+}
+
+void tst_TorkConfigFileSection::valuesAreACopy()
+{
+    TorkConfigFileSection section("Config");
+    section.AddValue("a", "1");
+    const auto items = section.values();
+    section.AddValue("a", "2");
+    section.AddValue("b", "3");
+    QCOMPARE(items.size(), 1);
+    QCOMPARE(items.first().value, QString("1"));
+    section.Clear();
+    QCOMPARE(items.first().key, QString("a"));
+}
+
+void tst_TorkConfigFileSection::addValueOfItsOwn_data()
+{
+    QTest::addColumn<int>("present");
+    for (int present : {1, 2, 3, 4, 7, 8, 9, 16, 100})
+        QTest::addRow("%d keys", present) << present;
+}
+
+// Names and texts from the section itself, while it grows.
+void tst_TorkConfigFileSection::addValueOfItsOwn()
+{
+    QFETCH(int, present);
+    TorkConfigFileSection section("Config");
+    for (int i = 0; i < present; ++i)
+        section.AddValue(QStringLiteral("key%1").arg(i), QStringLiteral("value%1").arg(i));
+
+    section.AddValue("new", section.values().begin()->value);
+    section.AddValue(section.values().begin()->value, section.values().begin()->key);
+    section.AddValue(section.values().begin()->key, section.values().last().value);
+
+    QString value;
+    QVERIFY(section.FindValue("new", value));
+    QCOMPARE(value, QString("value0"));
+    QVERIFY(section.FindValue("value0", value));
+    QCOMPARE(value, QString("key0"));
+    QVERIFY(section.FindValue("key0", value));
+    QCOMPARE(value, QString("key0"));
+    QCOMPARE(section.keyList().size(), present + 2);
 }
 
 void tst_TorkConfigFileSection::clear_data()

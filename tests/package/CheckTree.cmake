@@ -17,7 +17,6 @@ set(expected
     include/tork/common/config/TorkConfigFileDocHandler.h
     include/tork/common/config/TorkConfigFileSection.h
     include/tork/common/config/TorkConfigText.h
-    include/tork/common/config/TorkOrderedHash.h
     include/tork/common/log/TorkLog.h
     include/tork/common/xml/TorkErrorDictionary.h
     include/tork/common/xml/TorkErrorHandler.h

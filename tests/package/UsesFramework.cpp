@@ -49,6 +49,28 @@ void Settings(QString const& path)
           "settings come back");
 }
 
+// What reaches into the classes' fields, or makes them grow.
+void Sections()
+{
+    TorkConfigFile settings{QString()};
+    for (int i = 0; i < 100; ++i)
+        settings.WriteItem("Main", "key" + QString::number(i), i);
+    TorkConfigFileSection* found = settings.FindSection(QStringLiteral("Main"));
+    Check(found && found->values().size() == 100 && found->values().last().value == "99",
+          "a section shows its values");
+    Check(found && found->name() == "Main", "a section shows its name");
+    Check(!settings.Load() && settings.m_lastError.startsWith("ConfigFile - Load failed"),
+          "the last error shows");
+
+    auto* section = new TorkConfigFileSection("Main");
+    section->AddValue("key", "value");
+    settings.AppendSection(section);
+    delete found; // pushed out
+    Check(settings.keyList("Main") == QStringList("key"), "a section pushes out its namesake");
+    settings.Clear();
+    Check(!settings.HasSection(QStringLiteral("Main")), "sections are cleared");
+}
+
 void Log(QString const& folder)
 {
     TorkLog* log = TorkLog::initialize(folder, "outside", QString(), true);
@@ -87,6 +109,7 @@ int main(int argc, char** argv)
     QTemporaryDir folder;
     Check(folder.isValid(), "there is a folder to write into");
     Settings(folder.filePath("settings.cfg"));
+    Sections();
     Log(folder.path() + '/');
     Xml();
     return s_failures == 0 ? 0 : 1;
