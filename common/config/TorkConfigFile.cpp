@@ -6,7 +6,6 @@
 #include "common/config/TorkConfigFileDocHandler.h"
 #include "common/log/TorkLog.h"
 #include "common/xml/TorkErrorHandler.h"
-#include "common/xml/TorkXmlDepth.h"
 #include "common/xml/TorkXmlGuard.h"
 
 #include <QFile>
@@ -48,20 +47,6 @@ auto FindWithoutSpaces(Table& table, QString const& name)
     auto* const found = table.holdsSpaces() ? nullptr : table.find(name);
     return found ? found : table.find(WithoutSpaces(name));
 }
-
-// Ends the parse of a document that is nested too deep for the reader's stack.
-class DepthLimitedDocHandler : public TorkConfigFileDocHandler
-{
-public:
-    using TorkConfigFileDocHandler::TorkConfigFileDocHandler;
-
-    bool startElement(QString const& namespaceURI, QString const& localName, QString const& qName,
-                      QXmlAttributes const& attributes) override
-    {
-        return depth() < TorkXmlMaximumDepth &&
-               TorkConfigFileDocHandler::startElement(namespaceURI, localName, qName, attributes);
-    }
-};
 
 } // namespace
 
@@ -120,7 +105,7 @@ bool TorkConfigFile::parse()
     m_expectingValue = false;
     m_currentElement = QLatin1String("");
 
-    DepthLimitedDocHandler contentHandler(this);
+    TorkConfigFileDocHandler contentHandler(this);
     TorkErrorHandler errorHandler(TorkLog::m_gLog);
     QFile file(m_fileName);
     TorkXmlGuard source(&file);

@@ -104,6 +104,21 @@ bool ReadWithManager(QString const& path)
     return reader.parse(source);
 }
 
+bool ReadWithManagerAlone(QString const& path)
+{
+    QFile file(path);
+    QXmlInputSource source(&file);
+    QXmlSimpleReader reader;
+    SkippingManager manager;
+    reader.setContentHandler(&manager);
+    const bool read = reader.parse(source);
+    QString report;
+    manager.FormatErrors(report);
+    if (read == report.contains("More than"))
+        qFatal("the report is \"%s\"", qPrintable(report));
+    return read;
+}
+
 bool ReadInEditor(QString const& path)
 {
     const SettingsDocument document = SettingsFileReader::Read(path);
@@ -117,6 +132,7 @@ using Reader = bool (*)(QString const& path);
 const QMap<QString, Reader> Readers = {{"launch data", ReadLaunchData},
                                        {"configuration", ReadConfiguration},
                                        {"parse manager", ReadWithManager},
+                                       {"parse manager by itself", ReadWithManagerAlone},
                                        {"settings editor", ReadInEditor}};
 
 // Prints the result, the milliseconds and the peak of the memory in bytes.
@@ -148,6 +164,7 @@ private:
     void add(char const* reader, char const* what, HostileDocuments::Writer writer, int size,
              bool isRead);
     void addStructures(char const* reader, bool readsTypes);
+    void addNamespaces(char const* reader, bool skipsThem);
     void addSize(char const* what, HostileDocuments::Writer writer, int size);
     void write(HostileDocuments::Writer writer, int size);
 
@@ -188,6 +205,29 @@ void tst_HostileInput::addStructures(char const* reader, bool readsTypes)
     add(reader, "an entity that stands for itself", endlessEntity, 0, skipsTypes);
     add(reader, "200 entities behind one another", entityChain, 200, true);
     add(reader, "100,000 entities behind one another", entityChain, 100000, skipsTypes);
+    addNamespaces(reader, skipsTypes);
+}
+
+// The reader of launch data knows nothing of namespaces.
+void tst_HostileInput::addNamespaces(char const* reader, bool skipsThem)
+{
+    using namespace HostileDocuments;
+    add(reader, "an office document of 40 prefixes", officeDocument, 20000, true);
+    add(reader, "256 declarations in one tag", declarationsInOneTag, 256, true);
+    add(reader, "100,000 declarations in one tag", declarationsInOneTag, 100000, skipsThem);
+    add(reader, "2000 declarations and 4000 children", declarationsAndChildren, 2000, skipsThem);
+    add(reader, "60,000 declarations and 120,000 children", declarationsAndChildren, 60000,
+        skipsThem);
+    add(reader, "5000 declarations and 5000 children that declare one",
+        declarationsAndDeclaringChildren, 5000, skipsThem);
+    add(reader, "20,000 declarations and 900 levels that declare one", declarationsAndDepth, 20000,
+        skipsThem);
+    add(reader, "no declarations and 900 levels that declare one", declarationsAndDepth, 0,
+        skipsThem);
+    add(reader, "2000 prefixes that nothing declares", usedPrefixes, 2000, skipsThem);
+    add(reader, "999 elements below 256 declarations", mostPrefixes, 999, true);
+    add(reader, "1000 elements below 256 declarations", mostPrefixes, 1000, skipsThem);
+    add(reader, "250,000 elements below 256 declarations", mostPrefixes, 250000, skipsThem);
 }
 
 // All readers one after another, so that a large document is written once.
@@ -207,6 +247,7 @@ void tst_HostileInput::read_data()
     for (char const* reader : {"configuration", "parse manager", "settings editor"})
         addStructures(reader, true);
     addStructures("launch data", false);
+    addNamespaces("parse manager by itself", false);
     using namespace HostileDocuments;
     addSize("names of 1 MB", longNames, 1000000);
     addSize("100,000 attributes", manyAttributes, 100000);

@@ -27,9 +27,9 @@ namespace {
 const char* const headerFolders[] = {"app", "common/config", "common/log", "common/xml"};
 
 // Nothing that an application would call.
-const char* const internalHeaders[] = {"TorkLogLock.h",  "TorkLogStamp.h",  "TorkScreenFit.h",
-                                       "TorkXmlDepth.h", "TorkXmlFormat.h", "TorkXmlLayout.h",
-                                       "XmlNesting.h"};
+const char* const internalHeaders[] = {"TorkLogLock.h",   "TorkLogStamp.h",    "TorkScreenFit.h",
+                                       "TorkXmlFormat.h", "TorkXmlLayout.h",   "TorkXmlLexer.h",
+                                       "TorkXmlLimits.h", "TorkXmlPrefixes.h", "XmlNesting.h"};
 
 QString Source(QString const& path)
 {
