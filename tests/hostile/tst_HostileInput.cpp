@@ -15,6 +15,7 @@
 #include "common/xml/TorkXml_ParseManager_Base.h"
 #include "reliability/Figures.h"
 #include "support/ChildProcess.h"
+#include "support/MessageCapture.h"
 #include "support/Sanitizers.h"
 
 #include <QElapsedTimer>
@@ -156,6 +157,8 @@ class tst_HostileInput : public QObject
     Q_OBJECT
 
 private slots:
+    void tellsTheLimit_data();
+    void tellsTheLimit();
     void read_data();
     void read();
     void cleanupTestCase();
@@ -235,6 +238,44 @@ void tst_HostileInput::addSize(char const* what, HostileDocuments::Writer writer
 {
     for (char const* reader : {"configuration", "parse manager", "launch data"})
         add(reader, what, writer, size, true);
+}
+
+void tst_HostileInput::tellsTheLimit_data()
+{
+    QTest::addColumn<HostileDocuments::Writer>("writer");
+    QTest::addColumn<int>("size");
+    QTest::addColumn<QString>("reason");
+
+    using namespace HostileDocuments;
+    QTest::newRow("elements") << &nestedElements << 1001
+                              << "More than 1000 elements are inside each other.";
+    QTest::newRow("groups") << &nestedGroups << 1001
+                            << "More than 1000 groups are inside each other in a document type.";
+    QTest::newRow("entities") << &entityChain << 1000 << "More than 1000 entities are declared.";
+    QTest::newRow("characters of entities")
+        << &longEntity << 5000 << "References to entities stand for more than 16777216 characters.";
+    QTest::newRow("prefixes") << &declarationsInOneTag << 257
+                              << "More than 256 namespace prefixes are in force.";
+    QTest::newRow("elements below prefixes")
+        << &mostPrefixes << 1000
+        << "More than 1000 elements have more than 64 namespace prefixes in force.";
+}
+
+// The store in the log, the settings editor in its document.
+void tst_HostileInput::tellsTheLimit()
+{
+    QFETCH(HostileDocuments::Writer, writer);
+    QFETCH(int, size);
+    QFETCH(QString, reason);
+    write(writer, size);
+    const QString path = m_folder.filePath("document");
+
+    QCOMPARE(SettingsFileReader::Read(path).error, reason);
+
+    MessageCapture captured;
+    QVERIFY(!ReadConfiguration(path));
+    QCOMPARE(captured.messages().size(), 1);
+    QVERIFY(captured.messages().first().text.contains(reason));
 }
 
 void tst_HostileInput::read_data()

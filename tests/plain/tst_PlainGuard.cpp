@@ -96,7 +96,7 @@ private:
     {
         QByteArray type = "<!DOCTYPE r ";
         if (chance(10))
-            type += "SYSTEM 'a>[\"' ";
+            type += chance(50) ? "SYSTEM 'a>[\"' " : "SYSTEM \"'><![CDATA[\" ";
         type += '[';
         m_parameters.clear();
         for (int left = below(8); left > 0; --left)

@@ -127,6 +127,9 @@ void tst_TorkXmlGuard::parse_data()
         << false;
     QTest::newRow("entity with brackets") << Document(Entity("e", "(a"), "&e;") << true;
 
+    QTest::newRow("groups enough to exhaust a stack behind the address of the document type")
+        << "<!DOCTYPE r SYSTEM 'a><![CDATA[' [" + Groups(1000000) + "]><r/>" << false;
+
     const QByteArray brackets = QByteArray("(").repeated(5000);
     QTest::newRow("brackets in a comment")
         << Document("<!--" + brackets + "-->" + Groups(1), "") << true;
