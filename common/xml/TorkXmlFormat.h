@@ -147,7 +147,7 @@ int ElementValue(Writer& writer, QString const& value)
 }
 
 // Filled one after another: a name that holds a placeholder takes the value in its place. For any
-// other the result is the same without the search for placeholders, which took half of the time.
+// other the result is the same without the search for placeholders.
 inline QString FilledAttribute(QString const& name, QString const& value)
 {
     if (name.contains(QLatin1Char('%')))

@@ -14,17 +14,21 @@
 class TorkXmlGuard::Watcher : public QXmlErrorHandler
 {
 public:
+    bool passes(QChar character) const
+    {
+        return m_lexer.passes(character) && character < QChar(EndOfData);
+    }
+
     bool read(QChar character)
     {
-        m_isOver = !m_lexer.read(character);
-        if (m_isOver && m_reader) {
+        const bool isWithin = m_lexer.read(character);
+        if (!isWithin && m_reader) {
             m_errorHandler = m_reader->errorHandler();
             m_reader->setErrorHandler(this);
         }
-        return !m_isOver;
+        return isWithin;
     }
 
-    bool isOver() const { return m_isOver; }
     void watch(QXmlSimpleReader& reader) { m_reader = &reader; }
 
     bool warning(QXmlParseException const&) override { return true; }
@@ -45,7 +49,6 @@ private:
     TorkXmlLexer m_lexer;
     QXmlSimpleReader* m_reader = nullptr;
     QXmlErrorHandler* m_errorHandler = nullptr;
-    bool m_isOver = false;
 };
 
 TorkXmlGuard::TorkXmlGuard(QIODevice* device) : QXmlInputSource(device), m_watcher(new Watcher) {}
@@ -59,16 +62,41 @@ void TorkXmlGuard::Watch(QXmlSimpleReader& reader)
 
 QChar TorkXmlGuard::next()
 {
-    if (m_watcher->isOver())
+    return m_next != m_end && m_watcher->passes(*m_next) ? *m_next++ : takeNext();
+}
+
+// The few characters of a document that mean something to the guard.
+Q_NEVER_INLINE QChar TorkXmlGuard::takeNext()
+{
+    if (m_next == m_end)
+        return fetchNext();
+
+    const QChar character = *m_next++;
+    // As a character of the text it would be taken for a sign of the source's.
+    if (character == QChar(EndOfData))
+        return QChar(EndOfDocument);
+    if (character == QChar(EndOfDocument) || m_watcher->read(character))
+        return character;
+
+    m_next = m_end;
+    m_isOver = true;
+    return QChar(EndOfDocument);
+}
+
+// Tells once that what was fetched is used up, for a reader that wants to come back later, and
+// fetches more when it is asked again.
+QChar TorkXmlGuard::fetchNext()
+{
+    if (m_isOver)
         return QChar(EndOfDocument);
 
-    // Where Qt's next() fetches more, it calls this one again.
-    if (m_isInside)
-        return QXmlInputSource::next();
-    m_isInside = true;
-    const QChar character = QXmlInputSource::next();
-    m_isInside = false;
+    m_toldEndOfData = !m_toldEndOfData;
+    if (m_toldEndOfData)
+        return QChar(EndOfData);
 
-    const bool isText = character != QChar(EndOfData) && character != QChar(EndOfDocument);
-    return !isText || m_watcher->read(character) ? character : QChar(EndOfDocument);
+    fetchData();
+    m_fetched = data();
+    m_next = m_fetched.constData();
+    m_end = m_next + m_fetched.length();
+    return m_next == m_end ? QChar(EndOfDocument) : next();
 }

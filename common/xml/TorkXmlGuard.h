@@ -45,6 +45,16 @@ public:
 
 private:
     class Watcher;
+    QChar takeNext();
+    QChar fetchNext();
+
     QScopedPointer<Watcher> m_watcher;
-    bool m_isInside = false; ///< whether next() runs
+    bool m_isOver = false; ///< whether a limit was passed
+
+    // What the device gave last, walked through here instead of by Qt's own next(): loading
+    // settings would fall behind its peers without it.
+    QString m_fetched;
+    QChar const* m_next = nullptr;
+    QChar const* m_end = nullptr;
+    bool m_toldEndOfData = true;
 };

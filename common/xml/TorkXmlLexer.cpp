@@ -168,7 +168,8 @@ void TorkXmlLexer::afterLess(QChar character)
     } else if (character == QLatin1Char('?')) {
         m_state = State::Instruction;
     } else {
-        m_tag = character;
+        m_tag.clear();
+        m_tag.append(character);
         m_beforeTag = {m_prefixes.size(), m_prefixWeight};
         m_state = State::TagName;
     }
@@ -209,13 +210,14 @@ void TorkXmlLexer::takeTag(QChar character)
         else if (character == QLatin1Char('>') || character == QLatin1Char('/'))
             openTag(character);
         else
-            m_tag += character;
+            m_tag.append(character);
         break;
     case State::InTag:
         if (character == QLatin1Char('>') || character == QLatin1Char('/')) {
             openTag(character);
         } else if (!IsSpace(character)) {
-            m_name = character;
+            m_name.clear();
+            m_name.append(character);
             m_state = State::AttributeName;
         }
         break;
@@ -223,7 +225,7 @@ void TorkXmlLexer::takeTag(QChar character)
         if (character == QLatin1Char('=') || IsSpace(character))
             m_state = State::BeforeValue;
         else
-            m_name += character;
+            m_name.append(character);
         break;
     case State::BeforeValue:
         if (IsQuote(character))
@@ -232,7 +234,7 @@ void TorkXmlLexer::takeTag(QChar character)
     case State::AttributeValue:
         if (character == m_quote) {
             m_state = State::InTag;
-            addPrefix(TorkXmlPrefixes::ofName(m_name, true));
+            addPrefix(m_name, true);
         } else if (character == QLatin1Char('&')) {
             openReference(character, m_state);
         }
@@ -246,7 +248,7 @@ void TorkXmlLexer::takeTag(QChar character)
 void TorkXmlLexer::openTag(QChar character)
 {
     const bool isEmpty = character == QLatin1Char('/');
-    addPrefix(TorkXmlPrefixes::ofName(m_tag, false));
+    addPrefix(m_tag, false);
     startElement();
     m_state = State::Content;
     if (isEmpty) {
@@ -255,8 +257,13 @@ void TorkXmlLexer::openTag(QChar character)
     }
 }
 
-void TorkXmlLexer::addPrefix(QString const& prefix)
+void TorkXmlLexer::addPrefix(Name const& name, bool isAttribute)
 {
+    if (!name.contains(QLatin1Char(':')))
+        return;
+
+    const QString prefix =
+        TorkXmlPrefixes::ofName(QString(name.constData(), name.size()), isAttribute);
     if (prefix.isEmpty() || m_prefixSet.contains(prefix))
         return;
     m_prefixSet.insert(prefix);
@@ -365,7 +372,8 @@ void TorkXmlLexer::takeEntity(QChar character)
         if (character == QLatin1Char('%')) {
             m_isParameter = true;
         } else if (!IsSpace(character)) {
-            m_name = character;
+            m_name.clear();
+            m_name.append(character);
             m_state = State::EntityName;
         }
         break;
@@ -373,7 +381,7 @@ void TorkXmlLexer::takeEntity(QChar character)
         if (IsSpace(character))
             m_state = State::BeforeEntityValue;
         else
-            m_name += character;
+            m_name.append(character);
         break;
     case State::BeforeEntityValue:
         if (IsQuote(character)) {
@@ -406,9 +414,10 @@ void TorkXmlLexer::takeEntity(QChar character)
 // The first declaration of a name holds, whatever it declares.
 void TorkXmlLexer::declare(Kind kind)
 {
-    if (m_entities.contains(m_name))
+    const QString name(m_name.constData(), m_name.size());
+    if (m_entities.contains(name))
         return;
-    m_entities.insert(m_name, {kind, kind == Kind::External ? QString() : m_value});
+    m_entities.insert(name, {kind, kind == Kind::External ? QString() : m_value});
     m_generalCount += kind == Kind::General ? 1 : 0;
     m_parameterCount += kind == Kind::Parameter ? 1 : 0;
     if (m_generalCount + m_parameterCount > m_limits.entities)

@@ -8,6 +8,7 @@
 #include <QHash>
 #include <QSet>
 #include <QString>
+#include <QVarLengthArray>
 #include <QVector>
 
 /// Follows a document character by character and tells as soon as it goes beyond a limit. For
@@ -33,6 +34,15 @@ public:
 
     TorkXmlLexer() = default;
     explicit TorkXmlLexer(Limits const& limits) : m_limits(limits) {}
+
+    /// Whether this character, as the next one, changes nothing: most of a document does not, and
+    /// need not be read.
+    bool passes(QChar character) const
+    {
+        const ushort unit = character.unicode();
+        return m_state == State::Content ? unit != '<' && unit != '&'
+                                         : m_state == State::EndTag && unit != '>';
+    }
 
     /// Takes the next character of the document.
     ///
@@ -85,6 +95,9 @@ private:
         QString value;
     };
 
+    // Of a tag it is made for each element, so it asks for no memory.
+    using Name = QVarLengthArray<QChar, 64>;
+
     struct Text
     {
         QString text;
@@ -108,7 +121,7 @@ private:
     State outside() const { return m_inSubset ? State::Subset : State::Content; }
 
     void openTag(QChar character);
-    void addPrefix(QString const& prefix);
+    void addPrefix(Name const& name, bool isAttribute);
     void startElement();
     void endElement();
 
@@ -133,7 +146,7 @@ private:
     int m_run = 0; // of the characters that come before the ">" which ends a comment or the like
     bool m_inSubset = false;
 
-    QString m_name; // of the tag, attribute or entity
+    Name m_name; // of the attribute or entity
     QString m_reference;
     bool m_isParameterReference = false;
     bool m_isParameter = false; // whether the entity that is being declared is one
@@ -148,7 +161,7 @@ private:
     qint64 m_expansion = 0;
     qint64 m_replacement = 0;
 
-    QString m_tag;
+    Name m_tag;
     QVector<Element> m_elements;
     QVector<QString> m_prefixes; // in force, in the order in which they came
     QSet<QString> m_prefixSet;
