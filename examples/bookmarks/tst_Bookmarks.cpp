@@ -183,7 +183,7 @@ void tst_Bookmarks::broken_data()
         << heading +
                notUnderstood.arg(
                    "More than 1000 groups are inside each other in a document type.") +
-               "Line: 1, Column: 1033\n";
+               "Line: 1, Column: 1032\n";
     QTest::newRow("empty") << QByteArray()
                            << heading + notUnderstood.arg("unexpected end of file") +
                                   "Line: 1, Column: 1\n";

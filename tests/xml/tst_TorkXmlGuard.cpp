@@ -160,22 +160,6 @@ void tst_TorkXmlGuard::parse_data()
         << Document(half, QByteArray("&e;").repeated(1025)) << false;
     QTest::newRow("references without an entity")
         << QByteArray("<r>" + QByteArray("&amp;").repeated(100000) + "</r>") << true;
-    QTest::newRow("references in an entity do not count themselves")
-        << Document(half + Entity("f", "&e;"), QByteArray("&f;").repeated(1024)) << true;
-    QTest::newRow("one reference to another entity more")
-        << Document(half + Entity("f", "&e;"), QByteArray("&f;").repeated(1025)) << false;
-    QTest::newRow("one reference more in an attribute")
-        << QByteArray("<!DOCTYPE r [" + half + "]><r a='" + QByteArray("&e;").repeated(1025) +
-                      "'/>")
-        << false;
-    QTest::newRow("one reference more in a default value")
-        << Document(half + "<!ATTLIST r a CDATA '" + QByteArray("&e;").repeated(1025) + "'>", "")
-        << false;
-    QTest::newRow("one parameter reference more")
-        << Document("<!ENTITY % p '" + QByteArray(TorkXmlMaximumExpansion / 1024, 'x') +
-                        "'><!ENTITY f '" + QByteArray("%p;").repeated(1025) + "'>",
-                    "")
-        << false;
     const QByteArray names = Entity("e", "x") + Entity("f", "&e;");
     const QByteArray many = QByteArray("100% of R&D ").repeated(10000);
     QTest::newRow("percent signs beside an entity that names another")
@@ -191,10 +175,6 @@ void tst_TorkXmlGuard::parse_data()
         << Document(names, QByteArray("&amp;&#37;").repeated(10000) + "&f;") << true;
     QTest::newRow("references to what is not declared")
         << Document(names, QByteArray("&g;").repeated(10000) + "&f;") << true;
-    QTest::newRow("entities that stand for nothing, without measure")
-        << Document(Entity("n", "") + Entity("e", QByteArray("&n;").repeated(10000)),
-                    QByteArray("&e;").repeated(10000))
-        << false;
 
     QTest::newRow("as many elements inside each other as allowed")
         << Nested(TorkXmlMaximumDepth) << true;
