@@ -4,7 +4,7 @@
 #include "app/LaunchOptionParser.h"
 
 #include "app/XmlNesting.h"
-#include "common/xml/TorkXmlDepth.h"
+#include "common/xml/TorkXmlLimits.h"
 
 #include <QByteArray>
 #include <QFile>

@@ -9,6 +9,7 @@
 #include "common/xml/TorkXml_FlushUnknownElement.h"
 #include "common/xml/TorkXml_ParseManager_Base.h"
 
+#include <QVector>
 #include <QXmlInputSource>
 #include <QXmlSimpleReader>
 
@@ -54,11 +55,24 @@ public:
         return !s_refused;
     }
 
-    bool EndElement(QString const&) override { return m_moods.byte() % 2; }
+    // Now and then it changes the stack, as it may: who takes a state off owns it.
+    bool EndElement(QString const&) override
+    {
+        const uint8_t mood = m_moods.byte();
+        if (mood % 16 == 3)
+            ParseManager()->PushState(new MoodyState("pushed", ParseManager(), m_moods));
+        else if (mood % 16 == 5)
+            taken.append(ParseManager()->PopState());
+        return mood % 2;
+    }
+
+    static QVector<TorkXml_ParseState_Base*> taken;
 
 private:
     FuzzInput& m_moods;
 };
+
+QVector<TorkXml_ParseState_Base*> MoodyState::taken;
 
 class MoodyManager : public TorkXml_ParseManager_Base
 {
@@ -126,6 +140,10 @@ extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
         manager.FormatErrors(report);
         Require(report.startsWith("Failed to parse the XML content:\n"));
     }
+    for (TorkXml_ParseState_Base* state : MoodyState::taken)
+        Require(MoodyState::taken.count(state) == 1);
+    qDeleteAll(MoodyState::taken);
+    MoodyState::taken.clear();
     Require(s_states == 0);
     return 0;
 }

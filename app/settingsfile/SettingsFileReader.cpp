@@ -3,7 +3,6 @@
 
 #include "app/settingsfile/SettingsFileReader.h"
 
-#include "common/xml/TorkXmlDepth.h"
 #include "common/xml/TorkXmlGuard.h"
 
 #include <QBuffer>
@@ -48,14 +47,12 @@ void SettingsFileReader::read(QIODevice& device)
     m_document.lossCount = m_document.losses.size();
 
     TorkXmlGuard source(&device);
-    m_guard = &source;
     QXmlSimpleReader reader;
     source.Watch(reader);
     reader.setContentHandler(this);
     reader.setErrorHandler(this);
     reader.setLexicalHandler(this);
     m_document.isParsed = reader.parse(source);
-    m_guard = nullptr;
     if (!m_document.isParsed && m_document.error.isEmpty())
         m_document.error = QObject::tr("The file is no configuration file");
 }
@@ -104,8 +101,7 @@ void SettingsFileReader::store(QString const& key, QString const& value)
 bool SettingsFileReader::startElement(QString const&, QString const& localName, QString const&,
                                       QXmlAttributes const& attributes)
 {
-    if (++m_depth > TorkXmlMaximumDepth)
-        return false;
+    ++m_depth;
     m_element = localName;
     m_justOpened = true;
     if (m_depth == 1)
@@ -172,16 +168,10 @@ bool SettingsFileReader::comment(QString const& text)
     return true;
 }
 
-bool SettingsFileReader::startDTD(QString const& name, QString const& publicId,
-                                  QString const& systemId)
+bool SettingsFileReader::startDTD(QString const& name, QString const&, QString const&)
 {
     lose(QObject::tr("the document type \"%1\"").arg(name));
-    return m_guard->startDTD(name, publicId, systemId);
-}
-
-bool SettingsFileReader::endDTD()
-{
-    return m_guard->endDTD();
+    return true;
 }
 
 bool SettingsFileReader::fatalError(QXmlParseException const& exception)
@@ -190,11 +180,6 @@ bool SettingsFileReader::fatalError(QXmlParseException const& exception)
     m_document.line = exception.lineNumber();
     m_document.column = exception.columnNumber();
     return false;
-}
-
-QString SettingsFileReader::errorString() const
-{
-    return QObject::tr("elements are nested too deep");
 }
 
 } // namespace Velocor

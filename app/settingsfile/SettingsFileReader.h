@@ -10,7 +10,6 @@
 #include <QXmlDefaultHandler>
 
 class QIODevice;
-class TorkXmlGuard;
 
 namespace Velocor {
 
@@ -49,13 +48,10 @@ private:
     bool processingInstruction(QString const& target, QString const& data) override;
     bool comment(QString const& text) override;
     bool startDTD(QString const& name, QString const& publicId, QString const& systemId) override;
-    bool endDTD() override;
     bool fatalError(QXmlParseException const& exception) override;
-    QString errorString() const override;
 
     SettingsDocument m_document;
     QXmlLocator* m_locator = nullptr;
-    TorkXmlGuard* m_guard = nullptr; ///< it has to hear of document types as well
     int m_depth = 0;
     int m_section = -1;
     QHash<QString, int> m_sectionPlaces;

@@ -7,7 +7,6 @@
 #include "common/config/TorkOrderedHash.h"
 #include "common/log/TorkLog.h"
 #include "common/xml/TorkErrorHandler.h"
-#include "common/xml/TorkXmlDepth.h"
 #include "common/xml/TorkXmlGuard.h"
 
 #include <QBuffer>
@@ -35,20 +34,6 @@ QString WithoutSpaces(QString const& name)
     QString cleaned = name;
     return cleaned.remove(QLatin1Char(' '));
 }
-
-// Ends the parse of a document that is nested too deep for the reader's stack.
-class DepthLimitedDocHandler : public TorkConfigFileDocHandler
-{
-public:
-    using TorkConfigFileDocHandler::TorkConfigFileDocHandler;
-
-    bool startElement(QString const& namespaceURI, QString const& localName, QString const& qName,
-                      QXmlAttributes const& attributes) override
-    {
-        return depth() < TorkXmlMaximumDepth &&
-               TorkConfigFileDocHandler::startElement(namespaceURI, localName, qName, attributes);
-    }
-};
 
 } // namespace
 
@@ -108,7 +93,7 @@ bool TorkConfigFile::parse()
     m_expectingValue = false;
     m_currentElement = QLatin1String("");
 
-    DepthLimitedDocHandler contentHandler(this);
+    TorkConfigFileDocHandler contentHandler(this);
     TorkErrorHandler errorHandler(TorkLog::m_gLog);
     QFile file(m_fileName);
     QBuffer nothing;

@@ -55,7 +55,7 @@ QString TorkXmlFile::name() const
 
 int TorkXmlFile::WriteElementValue(QString const& value)
 {
-    return TorkXmlFormat::ElementValue(*this, m_layout, value);
+    return TorkXmlFormat::ElementValue(*this, value);
 }
 
 int TorkXmlFile::WriteElementOpen(QString const& name, int indent)
@@ -85,7 +85,7 @@ int TorkXmlFile::WriteElementEnd(QString const& name, int indent)
 
 int TorkXmlFile::WriteElement(QString const& name, QString const& value)
 {
-    return TorkXmlFormat::Element(*this, m_layout, name, value);
+    return TorkXmlFormat::Element(*this, name, value);
 }
 
 int TorkXmlFile::WriteAttribute(QString const& name, QString const& value)

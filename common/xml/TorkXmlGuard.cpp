@@ -3,45 +3,93 @@
 
 #include "common/xml/TorkXmlGuard.h"
 
-#include "common/xml/TorkXmlDepth.h"
+#include "common/xml/TorkXmlLexer.h"
 
+#include <QXmlErrorHandler>
+#include <QXmlParseException>
 #include <QXmlSimpleReader>
 
-#include <algorithm>
+// Stands in for the reader's error handler from the end that the guard made until the reader tells
+// of it, to name the limit instead.
+class TorkXmlGuard::Watcher : public QXmlErrorHandler
+{
+public:
+    bool passes(QChar character) const
+    {
+        return m_lexer.passes(character) && character < QChar(EndOfData);
+    }
 
-namespace {
+    bool read(QChar character)
+    {
+        const bool isWithin = m_lexer.read(character);
+        if (!isWithin && m_reader) {
+            m_errorHandler = m_reader->errorHandler();
+            m_reader->setErrorHandler(this);
+        }
+        return isWithin;
+    }
 
-// What the reader lets an entity grow to that is made of others.
-constexpr int NestedEntity = 65536;
+    void watch(QXmlSimpleReader& reader) { m_reader = &reader; }
 
-} // namespace
+    bool warning(QXmlParseException const&) override { return true; }
+    bool error(QXmlParseException const&) override { return true; }
 
-TorkXmlGuard::TorkXmlGuard(QIODevice* device) : QXmlInputSource(device) {}
+    bool fatalError(QXmlParseException const& exception) override
+    {
+        m_reader->setErrorHandler(m_errorHandler);
+        return m_errorHandler &&
+               m_errorHandler->fatalError(QXmlParseException(
+                   m_lexer.reason(), exception.columnNumber(), exception.lineNumber(),
+                   exception.publicId(), exception.systemId()));
+    }
+
+    QString errorString() const override { return m_lexer.reason(); }
+
+private:
+    TorkXmlLexer m_lexer;
+    QXmlSimpleReader* m_reader = nullptr;
+    QXmlErrorHandler* m_errorHandler = nullptr;
+};
+
+TorkXmlGuard::TorkXmlGuard(QIODevice* device) : QXmlInputSource(device), m_watcher(new Watcher) {}
 
 TorkXmlGuard::~TorkXmlGuard() = default;
 
 void TorkXmlGuard::Watch(QXmlSimpleReader& reader)
 {
-    reader.setLexicalHandler(this);
-    reader.setDeclHandler(this);
+    m_watcher->watch(reader);
 }
 
 QChar TorkXmlGuard::next()
+{
+    return m_next != m_end && m_watcher->passes(*m_next) ? *m_next++ : takeNext();
+}
+
+// The few characters of a document that mean something to the guard.
+Q_NEVER_INLINE QChar TorkXmlGuard::takeNext()
 {
     if (m_next == m_end)
         return fetchNext();
 
     const QChar character = *m_next++;
-    if (m_inDocumentType || m_longestEntity > 0)
-        return checked(character);
     // As a character of the text it would be taken for a sign of the source's.
-    return character == QChar(EndOfData) ? QChar(EndOfDocument) : character;
+    if (character == QChar(EndOfData))
+        return QChar(EndOfDocument);
+    if (character == QChar(EndOfDocument) || m_watcher->read(character))
+        return character;
+
+    m_next = m_end;
+    m_isOver = true;
+    return QChar(EndOfDocument);
 }
 
 // Tells once that what was fetched is used up, for a reader that wants to come back later, and
 // fetches more when it is asked again.
 QChar TorkXmlGuard::fetchNext()
 {
+    if (m_isOver)
+        return QChar(EndOfDocument);
+
     m_toldEndOfData = !m_toldEndOfData;
     if (m_toldEndOfData)
         return QChar(EndOfData);
@@ -51,57 +99,4 @@ QChar TorkXmlGuard::fetchNext()
     m_next = m_fetched.constData();
     m_end = m_next + m_fetched.length();
     return m_next == m_end ? QChar(EndOfDocument) : next();
-}
-
-QChar TorkXmlGuard::checked(QChar character)
-{
-    m_refused = m_refused || nestsTooDeep(character) || expandsTooFar(character);
-    return m_refused || character == QChar(EndOfData) ? QChar(EndOfDocument) : character;
-}
-
-// Groups do not reach from one declaration into another, and text is full of harmless brackets.
-bool TorkXmlGuard::nestsTooDeep(QChar character)
-{
-    if (!m_inDocumentType)
-        return false;
-    if (character == QLatin1Char('('))
-        ++m_openGroups;
-    else if (character == QLatin1Char(')'))
-        --m_openGroups;
-    else if (character == QLatin1Char('<') || character == QLatin1Char('>'))
-        m_openGroups = 0;
-    return m_openGroups > TorkXmlMaximumDepth;
-}
-
-// Counts each reference as if it were one to the longest entity: far from exact, but no real file
-// comes near.
-bool TorkXmlGuard::expandsTooFar(QChar character)
-{
-    if (character == QLatin1Char('&') || character == QLatin1Char('%'))
-        m_expansion += m_longestEntity;
-    return m_expansion > TorkXmlMaximumExpansion;
-}
-
-bool TorkXmlGuard::startDTD(QString const&, QString const&, QString const&)
-{
-    m_inDocumentType = true;
-    return true;
-}
-
-bool TorkXmlGuard::endDTD()
-{
-    m_inDocumentType = false;
-    return true;
-}
-
-bool TorkXmlGuard::internalEntityDecl(QString const& name, QString const& value)
-{
-    // One that names others stands for as much as the reader lets it grow to.
-    const bool namesOthers = value.contains(QLatin1Char('&'));
-    m_longestEntity =
-        std::max<qint64>({m_longestEntity, value.length(), namesOthers ? NestedEntity : 0});
-
-    // What a parameter entity stands for reaches the reader past next(), as often as it is named.
-    const bool mayNest = name.startsWith(QLatin1Char('%')) && value.contains(QLatin1Char('('));
-    return !mayNest && ++m_entities <= TorkXmlMaximumEntities;
 }

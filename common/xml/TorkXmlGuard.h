@@ -3,19 +3,25 @@
 
 #pragma once
 
-#include <QXmlDefaultHandler>
+#include <QScopedPointer>
 #include <QXmlInputSource>
 
 class QXmlSimpleReader;
 
-/// An input source that keeps hostile document types away from the XML reader.
+/// An input source that keeps hostile documents away from Qt's XML reader.
 ///
-/// The reader calls itself once per open group of a content model, compares each entity that is
-/// declared with all others, and puts each in as often as it is named: a hundred kilobytes of any
-/// of these could exhaust the stack, take minutes or fill the memory. No content handler is told of
-/// document types, so one that limits the nesting of elements does not see them. The limits are
-/// those of TorkXmlDepth.h; besides, no parameter entity may hold a group. What is beyond them ends
-/// the parse as malformed input ends. One parse, one thread.
+/// The reader calls itself once per open element and per open group of a content model, compares
+/// each entity that is declared with all others, puts each in as often as it is named, and copies
+/// and compares namespace prefixes: a hundred kilobytes of any of these could exhaust the stack,
+/// take minutes or fill the memory, before a content handler hears of it. The guard follows what
+/// the reader reads and ends the document where it goes beyond a limit of TorkXmlLimits.h; within
+/// them the reader gets exactly what a plain QXmlInputSource would give it.
+///
+/// The parse then fails as that of a malformed document does. The reader's error handler is told of
+/// one fatal error whose message names the limit; there is no other sign.
+///
+/// What an entity resolver puts in place of external entities is not watched. One parse, one
+/// thread.
 ///
 ///     QFile file(path);
 ///     TorkXmlGuard source(&file);
@@ -23,43 +29,32 @@ class QXmlSimpleReader;
 ///     source.Watch(reader);
 ///     reader.setContentHandler(&manager);
 ///     reader.parse(source);
-class TorkXmlGuard : public QXmlInputSource, public QXmlDefaultHandler
+class TorkXmlGuard : public QXmlInputSource
 {
 public:
-    /// Reads from a device, which stays the caller's.
+    /// Reads from a device, which is not owned and must outlive the guard.
     explicit TorkXmlGuard(QIODevice* device);
     ~TorkXmlGuard() override;
 
-    /// Makes the guard the reader's lexical and declaration handler.
+    /// Has the reader's error handler, also one that is set later, told which limit was passed.
+    /// Without this it is told of an unexpected end of the file. The reader must outlive the parse.
     void Watch(QXmlSimpleReader& reader);
 
-    /// The next character; where it is one too many of its kind, the end of the document.
+    /// The next character; from the one that goes beyond a limit on, the end of the document.
     QChar next() override;
 
-    bool startDTD(QString const& name, QString const& publicId, QString const& systemId) override;
-    bool endDTD() override;
-
-    /// @return false, which stops the reader, for an entity that is one too many or might nest
-    bool internalEntityDecl(QString const& name, QString const& value) override;
-
 private:
-    bool nestsTooDeep(QChar character);
-    bool expandsTooFar(QChar character);
-
+    class Watcher;
+    QChar takeNext();
     QChar fetchNext();
-    QChar checked(QChar character);
 
-    // What the device gave last, walked through here instead of by the toolkit's own next(), which
-    // takes twice as long.
+    QScopedPointer<Watcher> m_watcher;
+    bool m_isOver = false; ///< whether a limit was passed
+
+    // What the device gave last, walked through here instead of by Qt's own next(): loading
+    // settings would fall behind its peers without it.
     QString m_fetched;
     QChar const* m_next = nullptr;
     QChar const* m_end = nullptr;
     bool m_toldEndOfData = true;
-
-    bool m_inDocumentType = false;
-    bool m_refused = false;
-    int m_openGroups = 0;
-    int m_entities = 0;
-    qint64 m_longestEntity = 0; ///< the most characters that one reference can stand for
-    qint64 m_expansion = 0;     ///< the most that all references so far can stand for
 };

@@ -26,7 +26,4 @@ struct TorkXmlLayout
     /// The attributes of the start tag that is open, and its closing characters, until they are
     /// written.
     QString pending = QLatin1String("");
-
-    /// Memory for the next tag, kept from the last one.
-    QString piece;
 };

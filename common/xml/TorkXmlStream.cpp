@@ -21,7 +21,7 @@ TorkXmlStream::~TorkXmlStream() = default;
 
 int TorkXmlStream::WriteElementValue(QString const& value)
 {
-    return TorkXmlFormat::ElementValue(*this, m_layout, value);
+    return TorkXmlFormat::ElementValue(*this, value);
 }
 
 int TorkXmlStream::WriteElementOpen(QString const& name, int indent)
@@ -51,7 +51,7 @@ int TorkXmlStream::WriteElementEnd(QString const& name, int indent)
 
 int TorkXmlStream::WriteElement(QString const& name, QString const& value)
 {
-    return TorkXmlFormat::Element(*this, m_layout, name, value);
+    return TorkXmlFormat::Element(*this, name, value);
 }
 
 int TorkXmlStream::WriteAttribute(QString const& name, QString const& value)

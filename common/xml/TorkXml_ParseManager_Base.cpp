@@ -4,7 +4,8 @@
 #include "common/xml/TorkXml_ParseManager_Base.h"
 
 #include "common/log/TorkLog.h"
-#include "common/xml/TorkXmlDepth.h"
+#include "common/xml/TorkXmlLimits.h"
+#include "common/xml/TorkXmlPrefixes.h"
 #include "common/xml/TorkXml_ParseState_Base.h"
 
 #include <QDebug>
@@ -34,21 +35,56 @@ bool TorkXml_ParseManager_Base::endDocument()
     return true;
 }
 
-bool TorkXml_ParseManager_Base::startPrefixMapping(QString const&, QString const&)
+bool TorkXml_ParseManager_Base::startPrefixMapping(QString const& prefix, QString const&)
 {
+    addPrefix(prefix);
     return true;
 }
 
-bool TorkXml_ParseManager_Base::endPrefixMapping(QString const&)
+// The reader tells of each prefix that is no longer in force, declared or not, but not of one that
+// an outer element still declares.
+bool TorkXml_ParseManager_Base::endPrefixMapping(QString const& prefix)
 {
+    if (m_prefixes.remove(prefix))
+        m_prefixWeight -= TorkXmlPrefixes::weight(prefix);
     return true;
+}
+
+void TorkXml_ParseManager_Base::addPrefix(QString const& prefix)
+{
+    if (prefix.isEmpty() || m_prefixes.contains(prefix))
+        return;
+    m_prefixes.insert(prefix);
+    m_prefixWeight += TorkXmlPrefixes::weight(prefix);
+}
+
+// A parse through a TorkXmlGuard ends before it comes to this.
+bool TorkXml_ParseManager_Base::isWithinLimits(QString const& qName,
+                                               QXmlAttributes const& attributes)
+{
+    addPrefix(TorkXmlPrefixes::ofName(qName, false));
+    for (int i = 0; i < attributes.count(); ++i)
+        addPrefix(TorkXmlPrefixes::ofName(attributes.qName(i), true));
+
+    const bool hasMany = m_prefixWeight > TorkXmlManyPrefixes;
+    m_elementsOfManyPrefixes += hasMany ? 1 : 0;
+    if (m_elements.size() > TorkXmlMaximumDepth)
+        AppendError(TorkXmlPrefixes::tooDeep(TorkXmlMaximumDepth));
+    else if (m_prefixWeight > TorkXmlMaximumPrefixes)
+        AppendError(TorkXmlPrefixes::tooMany(TorkXmlMaximumPrefixes));
+    else if (m_elementsOfManyPrefixes > TorkXmlMaximumElementsOfManyPrefixes)
+        AppendError(
+            TorkXmlPrefixes::tooOften(TorkXmlMaximumElementsOfManyPrefixes, TorkXmlManyPrefixes));
+    else
+        return true;
+    return false;
 }
 
 bool TorkXml_ParseManager_Base::startElement(QString const&, QString const& localName,
-                                             QString const&, QXmlAttributes const& attributes)
+                                             QString const& qName, QXmlAttributes const& attributes)
 {
     PushElement(localName);
-    if (m_elements.size() > TorkXmlMaximumDepth)
+    if (!isWithinLimits(qName, attributes))
         return false;
 
     if (m_states.isEmpty()) {
@@ -90,9 +126,10 @@ bool TorkXml_ParseManager_Base::endElement(QString const&, QString const& localN
     TorkXml_ParseState_Base* state = LastState();
     if (state && state->IsElement(localName)) {
         state->EndElement(localName);
-        // cppcheck-suppress knownConditionTrueFalse ; EndElement() may have changed the stack
-        if (state == LastState()) // else it took itself off the stack and has another owner
-            delete PopState();
+        // It may have pushed others above itself. If it took itself off, it has another owner.
+        const int place = m_states.lastIndexOf(state);
+        if (place >= 0)
+            delete m_states.takeAt(place);
     }
     PopElement();
     return true;

@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include <QSet>
 #include <QString>
 #include <QStringList>
 #include <QVector>
@@ -14,7 +15,9 @@ class TorkXml_ParseState_Base;
 ///
 /// A reader derives from it and supplies the first state. The manager owns every state on its
 /// stack. It serves one document: nothing resets the stacks or the errors in between. Elements
-/// nested deeper than TorkXmlMaximumDepth stop the parse. One thread. See docs/xml.md.
+/// nested deeper than TorkXmlMaximumDepth stop the parse with an error, and so do more namespace
+/// prefixes than TorkXmlLimits.h allows; it cannot see document types, so read files of strangers
+/// through a TorkXmlGuard. One thread. See docs/xml.md.
 ///
 ///     class BookmarkReader : public TorkXml_ParseManager_Base
 ///     {
@@ -41,17 +44,23 @@ public:
 
     bool startDocument() override;
     bool endDocument() override;
+
+    /// Notes the prefix for the limits. Returns true; past a limit, the next element fails.
     bool startPrefixMapping(QString const& prefix, QString const& uri) override;
+
     bool endPrefixMapping(QString const& prefix) override;
 
     /// Finds or makes the state of an element and gives it the attributes, "href" of any prefix
     /// under the name "xlink:href".
     ///
-    /// @return false, with an error of code 1016, if no state knows the element
+    /// @return false, with an error of code 1016, if no state knows the element; false, with an
+    ///         error that names it, beyond a limit
     bool startElement(QString const& namespaceURI, QString const& localName, QString const& qName,
                       QXmlAttributes const& attributes) override;
 
-    /// Ends and deletes the state on top if the element is its own. Returns true.
+    /// Ends the state on top if the element is its own, then removes and deletes it, even if its
+    /// EndElement() pushed others above it; those stay. A state that took itself off the stack is
+    /// not deleted. Returns true.
     bool endElement(QString const& namespaceURI, QString const& localName,
                     QString const& qName) override;
 
@@ -106,9 +115,15 @@ public:
 
 private:
     bool enter(TorkXml_ParseState_Base* state, QXmlAttributes const& attributes);
+    bool isWithinLimits(QString const& qName, QXmlAttributes const& attributes);
+    void addPrefix(QString const& prefix);
 
     QVector<QString> m_elements;
     QVector<TorkXml_ParseState_Base*> m_states;
     QString m_currentElement;
     QStringList m_errors;
+
+    QSet<QString> m_prefixes; // of namespaces, in force
+    int m_prefixWeight = 0;
+    int m_elementsOfManyPrefixes = 0;
 };

@@ -6,11 +6,11 @@
 #include "BookmarkErrors.h"
 
 #include "common/xml/TorkErrorHandler.h"
+#include "common/xml/TorkXmlGuard.h"
 #include "common/xml/TorkXml_FlushUnknownElement.h"
 #include "common/xml/TorkXml_ParseState_Base.h"
 
 #include <QFile>
-#include <QXmlInputSource>
 #include <QXmlLocator>
 #include <QXmlSimpleReader>
 
@@ -127,8 +127,10 @@ bool BookmarkReader::Read(QString const& path)
         return false;
     }
 
-    QXmlInputSource source(&file);
+    // A file of somebody else's: the guard ends the parse where it would take all memory, or hours.
+    TorkXmlGuard source(&file);
     QXmlSimpleReader reader;
+    source.Watch(reader);
     reader.setContentHandler(this);
     reader.setErrorHandler(this);
     return reader.parse(source) && !m_failed;

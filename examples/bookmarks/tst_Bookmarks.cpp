@@ -191,6 +191,14 @@ void tst_Bookmarks::broken_data()
         << QByteArray("<xbel>\n  <bookmark/>\n  <bookmark href=''/>\n</xbel>")
         << heading + "Error: 2003 A bookmark has no address.\nLine: 2, Column: 12\n"
                      "Error: 2003 A bookmark has no address.\nLine: 3, Column: 20\n";
+    const QByteArray groups = QByteArray("(").repeated(100000);
+    QTest::newRow("groups inside each other that would exhaust the stack")
+        << "<!DOCTYPE xbel [<!ELEMENT xbel " + groups + "a" + QByteArray(")").repeated(100000) +
+               ">]>\n<xbel/>"
+        << heading +
+               notUnderstood.arg(
+                   "More than 1000 groups are inside each other in a document type.") +
+               "Line: 1, Column: 1032\n";
     QTest::newRow("empty") << QByteArray()
                            << heading + notUnderstood.arg("unexpected end of file") +
                                   "Line: 1, Column: 1\n";

@@ -146,4 +146,87 @@ inline void manyAttributes(QIODevice& file, int count)
     file.write("><k>v</k></s></r>");
 }
 
+/// An attribute that declares the prefix pN.
+inline QByteArray declaration(int number)
+{
+    return " xmlns:p" + QByteArray::number(number) + "=\"u\"";
+}
+
+/// A start tag with so many declarations, not yet closed.
+inline void declarations(QIODevice& file, int count)
+{
+    file.write("<r");
+    for (int i = 0; i < count; ++i)
+        file.write(declaration(i));
+}
+
+/// Many declarations in the only element.
+inline void declarationsInOneTag(QIODevice& file, int count)
+{
+    declarations(file, count);
+    file.write("/>");
+}
+
+/// Many declarations on the root and twice as many empty children.
+inline void declarationsAndChildren(QIODevice& file, int count)
+{
+    declarations(file, count);
+    file.write(">");
+    repeat(file, "<a/>", 2 * count);
+    file.write("</r>");
+}
+
+/// Many declarations on the root and as many children that declare one each.
+inline void declarationsAndDeclaringChildren(QIODevice& file, int count)
+{
+    declarations(file, count);
+    file.write(">");
+    for (int i = 0; i < count; ++i)
+        file.write("<a" + declaration(count + i) + "/>");
+    file.write("</r>");
+}
+
+/// Many declarations on the root and 900 elements inside each other that declare one each.
+inline void declarationsAndDepth(QIODevice& file, int count)
+{
+    declarations(file, count);
+    file.write(">");
+    for (int i = 0; i < 900; ++i)
+        file.write("<a" + declaration(count + i) + ">");
+    repeat(file, "</a>", 900);
+    file.write("</r>");
+}
+
+/// The same with prefixes that are used and never declared, which the reader keeps as well.
+inline void usedPrefixes(QIODevice& file, int count)
+{
+    file.write("<r");
+    for (int i = 0; i < count; ++i)
+        file.write(" p" + QByteArray::number(i) + ":a=\"\"");
+    file.write(">");
+    repeat(file, "<a/>", 2 * count);
+    file.write("</r>");
+}
+
+/// Elements with as many prefixes in force as there may be, many of them.
+inline void mostPrefixes(QIODevice& file, int count)
+{
+    declarations(file, 256);
+    file.write(">");
+    repeat(file, "<a/>", count);
+    file.write("</r>");
+}
+
+/// A document as office programs write it: forty declarations, and many elements that use them.
+inline void officeDocument(QIODevice& file, int count)
+{
+    declarations(file, 40);
+    file.write(">");
+    for (int i = 0; i < count; ++i) {
+        const QByteArray name = 'p' + QByteArray::number(i % 40) + ":a";
+        file.write('<' + name + " p1:b=\"c\">1</" + name + '>');
+    }
+    file.write("</r>");
+}
+
 } // namespace HostileDocuments

@@ -15,6 +15,7 @@
 #include "common/xml/TorkXml_ParseManager_Base.h"
 #include "reliability/Figures.h"
 #include "support/ChildProcess.h"
+#include "support/MessageCapture.h"
 #include "support/Sanitizers.h"
 
 #include <QElapsedTimer>
@@ -106,6 +107,21 @@ bool ReadWithManager(QString const& path)
     return reader.parse(source);
 }
 
+bool ReadWithManagerAlone(QString const& path)
+{
+    QFile file(path);
+    QXmlInputSource source(&file);
+    QXmlSimpleReader reader;
+    SkippingManager manager;
+    reader.setContentHandler(&manager);
+    const bool read = reader.parse(source);
+    QString report;
+    manager.FormatErrors(report);
+    if (read == report.contains("More than"))
+        qFatal("the report is \"%s\"", qPrintable(report));
+    return read;
+}
+
 bool ReadInEditor(QString const& path)
 {
     const SettingsDocument document = SettingsFileReader::Read(path);
@@ -119,6 +135,7 @@ using Reader = bool (*)(QString const& path);
 const QMap<QString, Reader> Readers = {{"launch data", ReadLaunchData},
                                        {"configuration", ReadConfiguration},
                                        {"parse manager", ReadWithManager},
+                                       {"parse manager by itself", ReadWithManagerAlone},
                                        {"settings editor", ReadInEditor}};
 
 // Prints the result, the milliseconds and the peak of the memory in bytes.
@@ -142,6 +159,8 @@ class tst_HostileInput : public QObject
     Q_OBJECT
 
 private slots:
+    void tellsTheLimit_data();
+    void tellsTheLimit();
     void read_data();
     void read();
     void cleanupTestCase();
@@ -150,6 +169,7 @@ private:
     void add(char const* reader, char const* what, HostileDocuments::Writer writer, int size,
              bool isRead);
     void addStructures(char const* reader, bool readsTypes);
+    void addNamespaces(char const* reader, bool skipsThem);
     void addSize(char const* what, HostileDocuments::Writer writer, int size);
     void write(HostileDocuments::Writer writer, int size);
 
@@ -190,6 +210,29 @@ void tst_HostileInput::addStructures(char const* reader, bool readsTypes)
     add(reader, "an entity that stands for itself", endlessEntity, 0, skipsTypes);
     add(reader, "200 entities behind one another", entityChain, 200, true);
     add(reader, "100,000 entities behind one another", entityChain, 100000, skipsTypes);
+    addNamespaces(reader, skipsTypes);
+}
+
+// The reader of launch data knows nothing of namespaces.
+void tst_HostileInput::addNamespaces(char const* reader, bool skipsThem)
+{
+    using namespace HostileDocuments;
+    add(reader, "an office document of 40 prefixes", officeDocument, 20000, true);
+    add(reader, "256 declarations in one tag", declarationsInOneTag, 256, true);
+    add(reader, "100,000 declarations in one tag", declarationsInOneTag, 100000, skipsThem);
+    add(reader, "2000 declarations and 4000 children", declarationsAndChildren, 2000, skipsThem);
+    add(reader, "60,000 declarations and 120,000 children", declarationsAndChildren, 60000,
+        skipsThem);
+    add(reader, "5000 declarations and 5000 children that declare one",
+        declarationsAndDeclaringChildren, 5000, skipsThem);
+    add(reader, "20,000 declarations and 900 levels that declare one", declarationsAndDepth, 20000,
+        skipsThem);
+    add(reader, "no declarations and 900 levels that declare one", declarationsAndDepth, 0,
+        skipsThem);
+    add(reader, "2000 prefixes that nothing declares", usedPrefixes, 2000, skipsThem);
+    add(reader, "999 elements below 256 declarations", mostPrefixes, 999, true);
+    add(reader, "1000 elements below 256 declarations", mostPrefixes, 1000, skipsThem);
+    add(reader, "250,000 elements below 256 declarations", mostPrefixes, 250000, skipsThem);
 }
 
 // All readers one after another, so that a large document is written once.
@@ -197,6 +240,44 @@ void tst_HostileInput::addSize(char const* what, HostileDocuments::Writer writer
 {
     for (char const* reader : {"configuration", "parse manager", "launch data"})
         add(reader, what, writer, size, true);
+}
+
+void tst_HostileInput::tellsTheLimit_data()
+{
+    QTest::addColumn<HostileDocuments::Writer>("writer");
+    QTest::addColumn<int>("size");
+    QTest::addColumn<QString>("reason");
+
+    using namespace HostileDocuments;
+    QTest::newRow("elements") << &nestedElements << 1001
+                              << "More than 1000 elements are inside each other.";
+    QTest::newRow("groups") << &nestedGroups << 1001
+                            << "More than 1000 groups are inside each other in a document type.";
+    QTest::newRow("entities") << &entityChain << 1000 << "More than 1000 entities are declared.";
+    QTest::newRow("characters of entities")
+        << &longEntity << 5000 << "References to entities stand for more than 16777216 characters.";
+    QTest::newRow("prefixes") << &declarationsInOneTag << 257
+                              << "More than 256 namespace prefixes are in force.";
+    QTest::newRow("elements below prefixes")
+        << &mostPrefixes << 1000
+        << "More than 1000 elements have more than 64 namespace prefixes in force.";
+}
+
+// The store in the log, the settings editor in its document.
+void tst_HostileInput::tellsTheLimit()
+{
+    QFETCH(HostileDocuments::Writer, writer);
+    QFETCH(int, size);
+    QFETCH(QString, reason);
+    write(writer, size);
+    const QString path = m_folder.filePath("document");
+
+    QCOMPARE(SettingsFileReader::Read(path).error, reason);
+
+    MessageCapture captured;
+    QVERIFY(!ReadConfiguration(path));
+    QCOMPARE(captured.messages().size(), 1);
+    QVERIFY(captured.messages().first().text.contains(reason));
 }
 
 void tst_HostileInput::read_data()
@@ -209,6 +290,7 @@ void tst_HostileInput::read_data()
     for (char const* reader : {"configuration", "parse manager", "settings editor"})
         addStructures(reader, true);
     addStructures("launch data", false);
+    addNamespaces("parse manager by itself", false);
     using namespace HostileDocuments;
     addSize("names of 1 MB", longNames, 1000000);
     addSize("100,000 attributes", manyAttributes, 100000);

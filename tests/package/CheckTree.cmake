@@ -20,7 +20,7 @@ set(expected
     include/tork/common/log/TorkLog.h
     include/tork/common/xml/TorkErrorDictionary.h
     include/tork/common/xml/TorkErrorHandler.h
-    include/tork/common/xml/TorkXmlDepth.h
+    include/tork/common/xml/TorkXmlLimits.h
     include/tork/common/xml/TorkXmlFile.h
     include/tork/common/xml/TorkXmlGuard.h
     include/tork/common/xml/TorkXmlLayout.h

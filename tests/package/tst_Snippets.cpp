@@ -28,9 +28,10 @@ const char* const headerFolders[] = {"app", "common/config", "common/log", "comm
 
 // Nothing that an application would call.
 const char* const internalHeaders[] = {
-    "ScreenlessPlatform.h", "StandardStreams.h", "TorkLogLock.h",  "TorkLogStamp.h",
-    "TorkOrderedHash.h",    "TorkScreenFit.h",   "TorkXmlDepth.h", "TorkXmlFormat.h",
-    "TorkXmlLayout.h",      "XmlNesting.h"};
+    "ScreenlessPlatform.h", "StandardStreams.h", "TorkLogLock.h",   "TorkLogPlace.h",
+    "TorkLogStamp.h",       "TorkOrderedHash.h", "TorkScreenFit.h", "TorkXmlFormat.h",
+    "TorkXmlLayout.h",      "TorkXmlLexer.h",    "TorkXmlLimits.h", "TorkXmlPrefixes.h",
+    "XmlNesting.h"};
 
 QString Source(QString const& path)
 {

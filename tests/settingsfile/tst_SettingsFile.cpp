@@ -192,7 +192,7 @@ void tst_SettingsFile::deepNesting()
         text += "<a>";
     const SettingsDocument document = SettingsFileReader::ReadBytes(text);
     QVERIFY(!document.isParsed);
-    QCOMPARE(document.error, QString("elements are nested too deep"));
+    QCOMPARE(document.error, QString("More than 1000 elements are inside each other."));
 }
 
 void tst_SettingsFile::deepDocumentType()

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-#include "common/xml/TorkXmlDepth.h"
 #include "common/xml/TorkXmlGuard.h"
+#include "common/xml/TorkXmlLimits.h"
 
 #include <QBuffer>
 #include <QTextCodec>
@@ -12,7 +12,7 @@
 
 namespace {
 
-// Collects the text of a document.
+// Collects the text of a document, and its errors.
 class Text : public QXmlDefaultHandler
 {
 public:
@@ -22,7 +22,14 @@ public:
         return true;
     }
 
+    bool fatalError(QXmlParseException const& exception) override
+    {
+        errors += exception.message();
+        return false;
+    }
+
     QString all;
+    QStringList errors;
 };
 
 // A document with this internal subset and this text.
@@ -42,6 +49,19 @@ QByteArray Entity(QByteArray const& name, QByteArray const& value)
     return "<!ENTITY " + name + " \"" + value + "\">";
 }
 
+QByteArray Nested(int levels)
+{
+    return QByteArray("<a>").repeated(levels) + QByteArray("</a>").repeated(levels);
+}
+
+QByteArray Declarations(int count)
+{
+    QByteArray all;
+    for (int i = 0; i < count; ++i)
+        all += " xmlns:p" + QByteArray::number(i) + "='u'";
+    return all;
+}
+
 QByteArray Entities(int count)
 {
     QByteArray all;
@@ -59,6 +79,9 @@ class tst_TorkXmlGuard : public QObject
 private slots:
     void parse_data();
     void parse();
+    void namesTheLimit_data();
+    void namesTheLimit();
+    void tellsWithoutBeingWatched();
     void textIsUntouched();
     void readsWhatAPlainSourceReads_data();
     void readsWhatAPlainSourceReads();
@@ -84,10 +107,46 @@ void tst_TorkXmlGuard::parse_data()
         << QByteArray("<r>" + QByteArray("(").repeated(5000) + "</r>") << true;
 
     QTest::newRow("parameter entity") << Document(Entity("% p", "x"), "") << true;
-    QTest::newRow("parameter entity with a group") << Document(Entity("% p", "(a"), "") << false;
-    QTest::newRow("parameter entity with a group as a reference")
-        << Document(Entity("% p", "&#40;a"), "") << false;
+    QTest::newRow("parameter entity with a bracket, unused")
+        << Document(Entity("% p", "(a"), "") << true;
+    QTest::newRow("parameter entity with a bracket, named in a comment")
+        << Document(Entity("% p", "(a") + "<!--%p;-->", "") << true;
+    QTest::newRow("as many groups as allowed from a parameter entity")
+        << Document("<!ENTITY % p '" + Groups(TorkXmlMaximumDepth) + "'>%p;", "") << true;
+    QTest::newRow("one group more from a parameter entity")
+        << Document("<!ENTITY % p '" + Groups(TorkXmlMaximumDepth + 1) + "'>%p;", "") << false;
+    QTest::newRow("one group more from brackets as references")
+        << Document("<!ENTITY % p '<!ELEMENT r " +
+                        QByteArray("&#40;").repeated(TorkXmlMaximumDepth + 1) + "'>%p;",
+                    "")
+        << false;
+    QTest::newRow("groups begun in a parameter entity and continued in another")
+        << Document("<!ENTITY % p '<!ELEMENT r " + QByteArray("(").repeated(600) +
+                        "'><!ENTITY % q '" + QByteArray("(").repeated(600) + "'>%p;%q;",
+                    "")
+        << false;
     QTest::newRow("entity with brackets") << Document(Entity("e", "(a"), "&e;") << true;
+
+    QTest::newRow("groups enough to exhaust a stack behind the address of the document type")
+        << "<!DOCTYPE r SYSTEM 'a><![CDATA[' [" + Groups(1000000) + "]><r/>" << false;
+
+    const QByteArray brackets = QByteArray("(").repeated(5000);
+    QTest::newRow("brackets in a comment")
+        << Document("<!--" + brackets + "-->" + Groups(1), "") << true;
+    QTest::newRow("brackets in an instruction")
+        << Document("<?a " + brackets + "?>" + Groups(1), "") << true;
+    QTest::newRow("brackets in the value of an entity")
+        << Document(Entity("e", brackets), "&e;") << true;
+    QTest::newRow("brackets in a default value")
+        << Document("<!ATTLIST r a CDATA '" + brackets + "'>", "") << true;
+    QTest::newRow("brackets in an address")
+        << Document("<!ENTITY e SYSTEM '" + brackets + "'>", "") << true;
+    for (char const* hiding :
+         {"<!-- ] > ' -->", "<?a ] > ' ?>", "<!ENTITY e \"]>'\">", "<!ATTLIST r a CDATA ']>\"'>",
+          "<!ENTITY e SYSTEM \"]>'\">", "<!NOTATION n PUBLIC ']>'>"}) {
+        QTest::addRow("groups enough to exhaust a stack behind %s", hiding)
+            << Document(hiding + Groups(1000000), "") << false;
+    }
 
     QTest::newRow("as many entities as allowed")
         << Document(Entities(TorkXmlMaximumEntities), "&e0;") << true;
@@ -101,6 +160,62 @@ void tst_TorkXmlGuard::parse_data()
         << Document(half, QByteArray("&e;").repeated(1025)) << false;
     QTest::newRow("references without an entity")
         << QByteArray("<r>" + QByteArray("&amp;").repeated(100000) + "</r>") << true;
+    const QByteArray names = Entity("e", "x") + Entity("f", "&e;");
+    const QByteArray many = QByteArray("100% of R&D ").repeated(10000);
+    QTest::newRow("percent signs beside an entity that names another")
+        << Document(names, QByteArray("100% ").repeated(10000) + "&f;") << true;
+    QTest::newRow("ampersands in CDATA") << Document(names, "<![CDATA[" + many + "]]>&f;") << true;
+    QTest::newRow("references in CDATA")
+        << Document(half, "<![CDATA[" + QByteArray("&e;").repeated(1025) + "]]>") << true;
+    QTest::newRow("references in a comment")
+        << Document(half, "<!--" + QByteArray("&e;").repeated(1025) + "-->") << true;
+    QTest::newRow("references in an instruction")
+        << Document(half, "<?a " + QByteArray("&e;").repeated(1025) + "?>") << true;
+    QTest::newRow("predefined references beside an entity that names another")
+        << Document(names, QByteArray("&amp;&#37;").repeated(10000) + "&f;") << true;
+    QTest::newRow("references to what is not declared")
+        << Document(names, QByteArray("&g;").repeated(10000) + "&f;") << true;
+
+    QTest::newRow("as many elements inside each other as allowed")
+        << Nested(TorkXmlMaximumDepth) << true;
+    QTest::newRow("one element more") << Nested(TorkXmlMaximumDepth + 1) << false;
+    QTest::newRow("one element more from entities")
+        << Document(Entity("e", "<a>") + Entity("f", "</a>"),
+                    QByteArray("&e;").repeated(TorkXmlMaximumDepth) +
+                        QByteArray("&f;").repeated(TorkXmlMaximumDepth))
+        << false;
+    QTest::newRow("as many prefixes as allowed")
+        << "<r" + Declarations(TorkXmlMaximumPrefixes) + "/>" << true;
+    QTest::newRow("one prefix more")
+        << "<r" + Declarations(TorkXmlMaximumPrefixes + 1) + "/>" << false;
+    QTest::newRow("one prefix more that nothing declares")
+        << "<r" + Declarations(TorkXmlMaximumPrefixes) + "><q:a/></r>" << false;
+    QTest::newRow("one prefix more in an attribute")
+        << "<r" + Declarations(TorkXmlMaximumPrefixes) + "><a q:b=''/></r>" << false;
+    QTest::newRow("the same prefixes again")
+        << "<r" + Declarations(TorkXmlMaximumPrefixes) + "><a" +
+               Declarations(TorkXmlMaximumPrefixes) + "/></r>"
+        << true;
+    QTest::newRow("as many prefixes as allowed, in each of two elements")
+        << "<r><a" + Declarations(TorkXmlMaximumPrefixes) + "/><b" +
+               Declarations(2 * TorkXmlMaximumPrefixes)
+                   .mid(Declarations(TorkXmlMaximumPrefixes).size()) +
+               "/></r>"
+        << true;
+    QTest::newRow("long prefixes")
+        << "<r xmlns:" + QByteArray(16 * TorkXmlMaximumPrefixes, 'p') + "='u'/>" << false;
+    QTest::newRow("as many elements below many prefixes as allowed")
+        << "<r" + Declarations(TorkXmlManyPrefixes + 1) + ">" +
+               QByteArray("<a/>").repeated(TorkXmlMaximumElementsOfManyPrefixes - 1) + "</r>"
+        << true;
+    QTest::newRow("one element below many prefixes more")
+        << "<r" + Declarations(TorkXmlManyPrefixes + 1) + ">" +
+               QByteArray("<a/>").repeated(TorkXmlMaximumElementsOfManyPrefixes) + "</r>"
+        << false;
+    QTest::newRow("any number of elements below fewer")
+        << "<r" + Declarations(TorkXmlManyPrefixes) + ">" + QByteArray("<a/>").repeated(10000) +
+               "</r>"
+        << true;
 }
 
 void tst_TorkXmlGuard::parse()
@@ -112,6 +227,61 @@ void tst_TorkXmlGuard::parse()
     QXmlSimpleReader reader;
     source.Watch(reader);
     QTEST(reader.parse(source), "parses");
+}
+
+void tst_TorkXmlGuard::namesTheLimit_data()
+{
+    QTest::addColumn<QByteArray>("document");
+    QTest::addColumn<QString>("reason");
+
+    QTest::newRow("elements") << Nested(1001) << "More than 1000 elements are inside each other.";
+    QTest::newRow("groups") << Document(Groups(1001), "")
+                            << "More than 1000 groups are inside each other in a document type.";
+    QTest::newRow("entities") << Document(Entities(1001), "")
+                              << "More than 1000 entities are declared.";
+    QTest::newRow("characters of entities")
+        << Document(Entity("e", QByteArray(16384, 'x')), QByteArray("&e;").repeated(1025))
+        << "References to entities stand for more than 16777216 characters.";
+    QTest::newRow("entities without characters")
+        << Document(Entity("n", "") + Entity("e", QByteArray("&n;").repeated(10000)),
+                    QByteArray("&e;").repeated(10000))
+        << "References make more than 33554432 characters of entities be read again.";
+    QTest::newRow("prefixes") << "<r" + Declarations(257) + "/>"
+                              << "More than 256 namespace prefixes are in force.";
+    QTest::newRow("elements below prefixes")
+        << "<r" + Declarations(65) + ">" + QByteArray("<a/>").repeated(1000) + "</r>"
+        << "More than 1000 elements have more than 64 namespace prefixes in force.";
+    QTest::newRow("malformed within the limits") << QByteArray("<r>") << "unexpected end of file";
+    QTest::newRow("an entity that names itself")
+        << Document(Entity("e", "<a>&e;</a>"), "&e;") << "recursive entities";
+}
+
+// The error handler is told once, and is the reader's again behind.
+void tst_TorkXmlGuard::namesTheLimit()
+{
+    QFETCH(QByteArray, document);
+    QBuffer buffer(&document);
+    TorkXmlGuard source(&buffer);
+    QXmlSimpleReader reader;
+    source.Watch(reader);
+    Text handler;
+    reader.setErrorHandler(&handler);
+    QVERIFY(!reader.parse(source));
+    QCOMPARE(handler.errors.size(), 1);
+    QTEST(handler.errors.first(), "reason");
+    QVERIFY(reader.errorHandler() == static_cast<QXmlErrorHandler*>(&handler));
+}
+
+void tst_TorkXmlGuard::tellsWithoutBeingWatched()
+{
+    QByteArray document = Nested(1001);
+    QBuffer buffer(&document);
+    TorkXmlGuard source(&buffer);
+    QXmlSimpleReader reader;
+    Text handler;
+    reader.setErrorHandler(&handler);
+    QVERIFY(!reader.parse(source));
+    QCOMPARE(handler.errors, QStringList("unexpected end of file"));
 }
 
 // The reader asks for more in portions of a kilobyte, so what lies across their ends counts too.

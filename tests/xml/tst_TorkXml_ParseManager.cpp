@@ -4,6 +4,7 @@
 #include "common/xml/TorkXml_ParseManager_Base.h"
 
 #include "common/log/TorkLog.h"
+#include "common/xml/TorkXmlLimits.h"
 #include "common/xml/TorkXml_FlushUnknownElement.h"
 #include "common/xml/TorkXml_ParseState_Base.h"
 
@@ -99,6 +100,39 @@ private:
 };
 
 int ScriptedState::alive = 0;
+
+// Changes the stack of states when its element ends.
+class MeddlingState : public ScriptedState
+{
+public:
+    MeddlingState(QString const& element, TorkXml_ParseManager_Base* manager, Script& script,
+                  QString const& deed)
+        : ScriptedState(element, manager, script), m_deed(deed), m_script(script)
+    {}
+
+    bool EndElement(QString const& name) override
+    {
+        TorkXml_ParseManager_Base* manager = ParseManager();
+        ScriptedState::EndElement(name);
+        for (QChar what : m_deed) {
+            if (what == '+')
+                manager->PushState(new ScriptedState("pushed", manager, m_script));
+            else if (what == '-')
+                popped.append(manager->PopState());
+            else if (what == '=')
+                manager->PushState(popped.takeFirst());
+        }
+        return true;
+    }
+
+    static QVector<TorkXml_ParseState_Base*> popped;
+
+private:
+    QString m_deed;
+    Script& m_script;
+};
+
+QVector<TorkXml_ParseState_Base*> MeddlingState::popped;
 
 class ScriptedManager : public TorkXml_ParseManager_Base
 {
@@ -327,6 +361,11 @@ private slots:
     void warningReachesTheLogFile();
     void refusedContentWarnsOfNothing();
 
+    void endedStateGoes_data();
+    void endedStateGoes();
+    void tooManyPrefixes_data();
+    void tooManyPrefixes();
+    void prefixesThatAreOverDoNotCount();
     void deepDocuments_data();
     void deepDocuments();
     void largeDocument_data();
@@ -1333,6 +1372,131 @@ void tst_TorkXml_ParseManager::refusedContentWarnsOfNothing()
 
     QVERIFY(!Parse(manager, "<a>x</a>"));
     QCOMPARE(captured.messages().size(), 0);
+}
+
+void tst_TorkXml_ParseManager::endedStateGoes_data()
+{
+    QTest::addColumn<QString>("deed"); // "+" pushes a state, "-" takes one off, "=" puts it back
+    QTest::addColumn<QString>("left"); // on the stack, from the bottom
+    QTest::addColumn<int>("owned");    // by who took them off
+    QTest::addColumn<bool>("isDeleted");
+
+    QTest::newRow("does nothing") << ""
+                                  << "r" << 0 << true;
+    QTest::newRow("pushes one") << "+"
+                                << "r pushed" << 0 << true;
+    QTest::newRow("pushes three") << "+++"
+                                  << "r pushed pushed pushed" << 0 << true;
+    QTest::newRow("pushes one and takes it off") << "+-"
+                                                 << "r" << 1 << true;
+    QTest::newRow("takes itself off") << "-"
+                                      << "r" << 1 << false;
+    QTest::newRow("takes itself off and pushes one") << "-+"
+                                                     << "r pushed" << 1 << false;
+    QTest::newRow("takes itself off and back") << "-="
+                                               << "r" << 0 << true;
+    QTest::newRow("takes itself and its parent off") << "--"
+                                                     << "" << 2 << false;
+    QTest::newRow("puts itself below its parent") << "--=="
+                                                  << "r" << 0 << true;
+    QTest::newRow("takes more off than there is") << "---"
+                                                  << "" << 3 << false;
+}
+
+// It is removed and deleted whatever it pushed, and not if it took itself off the stack.
+void tst_TorkXml_ParseManager::endedStateGoes()
+{
+    QFETCH(QString, deed);
+    QFETCH(bool, isDeleted);
+    MeddlingState::popped.clear();
+    Script script;
+    {
+        ScriptedManager manager(script);
+        manager.PushElement("r");
+        manager.PushElement("a");
+        manager.PushState(new ScriptedState("r", &manager, script));
+        TorkXml_ParseState_Base* state = new MeddlingState("a", &manager, script, deed);
+        manager.PushState(state);
+
+        QVERIFY(manager.endElement(QString(), "a", "a"));
+        QCOMPARE(manager.CurrentElement(), QString("r"));
+        QCOMPARE(script.events.count("~a"), isDeleted ? 1 : 0);
+        QTEST(MeddlingState::popped.size(), "owned");
+        QVERIFY(isDeleted || MeddlingState::popped.contains(state));
+
+        QStringList left;
+        QVector<TorkXml_ParseState_Base*> states;
+        while (TorkXml_ParseState_Base* top = manager.PopState()) {
+            left.prepend(top->ElementName());
+            states.append(top);
+        }
+        qDeleteAll(states);
+        QTEST(left.join(' '), "left");
+    }
+    qDeleteAll(MeddlingState::popped);
+    MeddlingState::popped.clear();
+    QCOMPARE(ScriptedState::alive, 0);
+}
+
+void tst_TorkXml_ParseManager::tooManyPrefixes_data()
+{
+    QTest::addColumn<QString>("document");
+    QTest::addColumn<QString>("error");
+
+    const auto declarations = [](int first, int count) {
+        QString all;
+        for (int i = first; i < first + count; ++i)
+            all += QString(" xmlns:p%1='u'").arg(i);
+        return all;
+    };
+    const QString most = "<r" + declarations(0, TorkXmlMaximumPrefixes) + ">";
+    const QString many = "<r" + declarations(0, TorkXmlManyPrefixes + 1) + ">";
+    const QString tooMany = "More than 256 namespace prefixes are in force.\n";
+    const QString tooOften =
+        "More than 1000 elements have more than 64 namespace prefixes in force.\n";
+
+    QTest::newRow("as many as allowed") << most + "</r>"
+                                        << "";
+    QTest::newRow("one more") << most + "<a xmlns:q='u'/></r>" << tooMany;
+    QTest::newRow("one more that nothing declares") << most + "<q:a/></r>" << tooMany;
+    QTest::newRow("one more in an attribute") << most + "<a q:b=''/></r>" << tooMany;
+    QTest::newRow("a default namespace more") << most + "<a xmlns='u'/></r>"
+                                              << "";
+    QTest::newRow("one again") << most + "<a xmlns:p0='v'><p0:b/></a><a xmlns:p0='w'/></r>"
+                               << "";
+    QTest::newRow("one of 16 characters more")
+        << "<r" + declarations(0, TorkXmlMaximumPrefixes - 1) + " xmlns:q123456789012345='u'/>"
+        << tooMany;
+    QTest::newRow("as many elements below many as allowed")
+        << many + QString("<a/>").repeated(TorkXmlMaximumElementsOfManyPrefixes - 1) + "</r>"
+        << "";
+    QTest::newRow("one element more")
+        << many + QString("<a/>").repeated(TorkXmlMaximumElementsOfManyPrefixes) + "</r>"
+        << tooOften;
+    QTest::newRow("one level too many")
+        << Nested(1001) << "More than 1000 elements are inside each other.\n";
+}
+
+void tst_TorkXml_ParseManager::tooManyPrefixes()
+{
+    QFETCH(QString, document);
+    QFETCH(QString, error);
+
+    FlushingManager manager;
+    QCOMPARE(Parse(manager, document), error.isEmpty());
+    QString report;
+    manager.FormatErrors(report);
+    QCOMPARE(report, ReportHeader + error);
+}
+
+// What an element declares or uses is over with it.
+void tst_TorkXml_ParseManager::prefixesThatAreOverDoNotCount()
+{
+    QString document = "<r>";
+    for (int i = 0; i < 10 * TorkXmlMaximumPrefixes; ++i)
+        document += QString("<a xmlns:p%1='u'/><q%1:a/><a r%1:b=''>t</a>").arg(i);
+    FlushingManager manager;
+    QVERIFY(Parse(manager, document + "</r>"));
 }
 
 void tst_TorkXml_ParseManager::deepDocuments_data()

@@ -1,0 +1,45 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+/// The limits of the family's XML readers. No real file comes near any of them; what is beyond one
+/// fails like any malformed document, and the reason names the limit.
+
+/// The deepest nesting of elements that any reader accepts; the root has depth 1.
+///
+/// The XML readers underneath call themselves once per open element, so a damaged or hostile file
+/// of some ten kilobytes could exhaust the stack (on a 512 KiB thread from about 1,500 levels on).
+/// TorkXmlGuard holds the groups in a document type to the same limit.
+constexpr int TorkXmlMaximumDepth = 1000;
+
+/// The most entities that a document type may declare where TorkXmlGuard watches.
+///
+/// Qt's reader compares each with all others, so some ten thousand would take it minutes.
+constexpr int TorkXmlMaximumEntities = 1000;
+
+/// The most characters that all references to declared entities may stand for, where TorkXmlGuard
+/// watches.
+///
+/// Otherwise a file of 100 KB, half of it one entity and half of it references to that, would take
+/// gigabytes of memory.
+constexpr int TorkXmlMaximumExpansion = 16 * 1024 * 1024;
+
+/// The most characters of entities that may be read again for their references, where TorkXmlGuard
+/// watches: the references in an entity and what each of them stands for both count.
+///
+/// Entities that name each other and stand for nothing would take hours without it.
+constexpr int TorkXmlMaximumReplacement = 2 * TorkXmlMaximumExpansion;
+
+/// The most namespace prefixes in force at one place: those that open elements declare, or use
+/// without declaring them. One of 16 characters or more counts once more for each 16.
+///
+/// Qt's reader keeps a table of them for each open element, and at the end of each empty element it
+/// compares each of them with all others.
+constexpr int TorkXmlMaximumPrefixes = 256;
+
+/// How many namespace prefixes in force are many, counted in the same way.
+constexpr int TorkXmlManyPrefixes = 64;
+
+/// The most elements of a document that may have more than TorkXmlManyPrefixes in force.
+constexpr int TorkXmlMaximumElementsOfManyPrefixes = 1000;
