@@ -45,6 +45,8 @@
 #include <sys/un.h>
 #include <unistd.h>
 
+using namespace Velocor;
+
 namespace {
 
 constexpr int Patience = 20000; // milliseconds

@@ -38,6 +38,8 @@
 
 #include <random>
 
+using namespace Velocor;
+
 using Velocor::PlainToolTip;
 
 namespace {
