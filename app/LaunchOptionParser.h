@@ -39,8 +39,8 @@ public:
     /// Only regular files and links to them are read: a pipe or a device could block, or never end.
     ///
     /// @return false if the file is missing, is not a regular file, cannot be opened, has more than
-    ///         268435456 characters (256 Mi), or if ParseOptions() fails; an empty file sets nothing
-    ///         and succeeds
+    ///         268435456 characters (256 Mi), or if ParseOptions() fails; an empty file sets
+    ///         nothing and succeeds
     bool ReadDataFile(QString const& path);
 
     /// Sets the options that an XML text names.
