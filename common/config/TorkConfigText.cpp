@@ -41,7 +41,7 @@ QString Escaped(QLatin1Char escape, QChar character)
 QString Unescaped(QLatin1Char escape, QString const& encoded)
 {
     if (encoded == escape)
-        return QStringLiteral("");
+        return QString(QLatin1String(""));
 
     QString text;
     for (int i = 0; i < encoded.length(); ++i) {
