@@ -6,7 +6,7 @@
 #include <QGuiApplication>
 #include <QOpenGLContext>
 
-#include <stdlib.h> // setenv() is not in <cstdlib>
+#include <cstdlib>
 
 namespace Velocor {
 
@@ -15,6 +15,8 @@ namespace {
 constexpr char const* Variable = "QT_XCB_GL_INTEGRATION";
 
 } // namespace
+
+// NOLINTBEGIN(concurrency-mt-unsafe): no other thread runs yet.
 
 // Runs before the application object exists, so it uses the C library only.
 WithoutOpenGl::WithoutOpenGl() : m_isSet(!getenv(Variable))
@@ -40,5 +42,7 @@ void WithoutOpenGl::End()
     unsetenv(Variable);
     m_isSet = false;
 }
+
+// NOLINTEND(concurrency-mt-unsafe)
 
 } // namespace Velocor

@@ -65,6 +65,7 @@ const char* const formats[] = {
     "'no moment at all'",
     "",
     "[ %1 %2 %d ]",
+    "dddd '\xe2\x82\xac' hh:mm:ss.zzz", // no locale can put this into Latin-1
     "'a long one, beyond what is kept from entry to entry: ' yyyy-MM-dd hh:mm:ss.zzz",
 };
 
