@@ -25,14 +25,15 @@ void TraceToLog(QString const& message)
         log->trace(message);
 }
 
-QString WithoutSpaces(QString const& name)
+// Asked first, as nearly no name holds one and removing none costs more than finding a value.
+bool HoldsSpace(QString const& name)
 {
-    // Asked first, as nearly no name holds one and removing none costs more than finding a value.
-    if (std::find(name.begin(), name.end(), QLatin1Char(' ')) == name.end())
-        return name;
+    return std::find(name.begin(), name.end(), QLatin1Char(' ')) != name.end();
+}
 
-    QString cleaned = name;
-    return cleaned.remove(QLatin1Char(' '));
+QString WithoutSpaces(QString name)
+{
+    return HoldsSpace(name) ? name.remove(QLatin1Char(' ')) : name;
 }
 
 } // namespace
@@ -204,8 +205,16 @@ QStringList TorkConfigFile::keyList(QString const& section)
 
 QString const* TorkConfigFile::findValue(QString const& section, QString const& key)
 {
-    TorkConfigFileSection* found = lookUp(WithoutSpaces(section));
-    return found ? found->m_values->find(WithoutSpaces(key)) : nullptr;
+    // No copy of a name without spaces: two of them take a typed read beyond its goal.
+    if (HoldsSpace(section) || HoldsSpace(key))
+        return findCleaned(WithoutSpaces(section), WithoutSpaces(key));
+    return findCleaned(section, key);
+}
+
+QString const* TorkConfigFile::findCleaned(QString const& section, QString const& key)
+{
+    TorkConfigFileSection* found = lookUp(section);
+    return found ? found->m_values->find(key) : nullptr;
 }
 
 // cppcheck-suppress constParameter ; the interface stands

@@ -261,6 +261,7 @@ private:
     TorkConfigFileSection* handOut(QString const& name);
     void put(TorkConfigFileSection* section);
     QString const* findValue(QString const& section, QString const& key);
+    QString const* findCleaned(QString const& section, QString const& key);
     bool parse();
     void fail(QString const& message);
     QByteArray toXml();

@@ -6,6 +6,7 @@
 #include <QHash>
 #include <QString>
 
+#include <cstring>
 #include <utility>
 #include <vector>
 
@@ -78,6 +79,14 @@ private:
 
     uint hashOf(QString const& key) const { return qHash(key, m_seed); }
 
+    // Qt's comparison, which asks for more than whether they are the same, takes a typed read to
+    // its goal.
+    static bool isSame(QString const& a, QString const& b)
+    {
+        const size_t bytes = static_cast<size_t>(a.length()) * sizeof(QChar);
+        return a.length() == b.length() && !std::memcmp(a.constData(), b.constData(), bytes);
+    }
+
     // The slot of the entry with this key, or the free one where its search ends: at least half of
     // the slots are free, so it does.
     Slot const& slotOf(QString const& key, uint hash) const
@@ -85,7 +94,7 @@ private:
         const size_t mask = m_slots.size() - 1;
         size_t i = hash & mask;
         while (m_slots[i].number &&
-               (m_slots[i].hash != hash || m_entries[m_slots[i].number - 1].key != key))
+               (m_slots[i].hash != hash || !isSame(m_entries[m_slots[i].number - 1].key, key)))
             i = (i + 1) & mask;
         return m_slots[i];
     }

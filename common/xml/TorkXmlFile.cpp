@@ -85,7 +85,7 @@ int TorkXmlFile::WriteElementEnd(QString const& name, int indent)
 
 int TorkXmlFile::WriteElement(QString const& name, QString const& value)
 {
-    return TorkXmlFormat::Element(*this, name, value);
+    return TorkXmlFormat::Element(*this, m_layout, name, value);
 }
 
 int TorkXmlFile::WriteAttribute(QString const& name, QString const& value)

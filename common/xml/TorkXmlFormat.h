@@ -6,6 +6,8 @@
 #include "common/xml/TorkXmlLayout.h"
 
 #include <algorithm>
+#include <cstddef>
+#include <utility>
 
 /// The formatting of both XML writers. For the writers' own sources.
 ///
@@ -27,13 +29,74 @@ inline qint32 Lowered(qint32 level, int indent)
     return static_cast<qint32>(static_cast<quint32>(level) - static_cast<quint32>(indent));
 }
 
-// The backslash is one of them, so that paths stand out; the apostrophe is not.
+// The backslash is one of them, so that paths stand out; the apostrophe is not. One pass without a
+// stop, which compilers make for several characters at once.
 inline bool NeedsCData(QString const& value)
 {
-    return std::any_of(value.begin(), value.end(), [](QChar character) {
+    ushort found = 0;
+    for (QChar character : value) {
         const ushort unit = character.unicode();
-        return unit == '&' || unit == '\\' || unit == '>' || unit == '<' || unit == '"';
-    });
+        const int matches =
+            (unit == '&') + (unit == '\\') + (unit == '>') + (unit == '<') + (unit == '"');
+        found |= static_cast<ushort>(matches);
+    }
+    return found != 0;
+}
+
+template <std::size_t Size>
+int Length(char const (&)[Size])
+{
+    return static_cast<int>(Size) - 1;
+}
+
+inline int Length(QString const& text)
+{
+    return text.length();
+}
+
+template <std::size_t Size>
+QChar* Copy(char const (&text)[Size], QChar* to)
+{
+    for (std::size_t i = 0; i + 1 < Size; ++i)
+        *to++ = QLatin1Char(text[i]);
+    return to;
+}
+
+inline QChar* Copy(QString const& text, QChar* to)
+{
+    return std::copy_n(text.constData(), text.length(), to);
+}
+
+// Appends literals and texts after making room for all of them once. None of them is `text`.
+template <class... Pieces>
+void AppendAll(QString& text, Pieces const&... pieces)
+{
+    const int end = text.length();
+    text.resize((end + ... + Length(pieces)));
+    QChar* to = text.data() + end;
+    ((to = Copy(pieces, to)), ...);
+}
+
+// Joined in memory that is kept from tag to tag, as a new text for each makes a document take more
+// than its goal. It is taken away meanwhile, as an overridden Write() may come back here.
+template <class Writer, std::size_t StartSize, std::size_t EndSize>
+int WriteTag(Writer& writer, TorkXmlLayout& layout, char const (&start)[StartSize],
+             QString const& name, char const (&end)[EndSize])
+{
+    QString tag = std::move(layout.tag);
+    tag.resize(0);
+    AppendAll(tag, start, name, end);
+    const int written = writer.Write(tag);
+    layout.tag = std::move(tag);
+    return written;
+}
+
+// Writes a copy, as an overridden Write() may come back here and change what is pending.
+template <class Writer>
+int WritePending(Writer& writer, TorkXmlLayout const& layout)
+{
+    const QString text = layout.pending;
+    return writer.Write(text);
 }
 
 template <class Writer>
@@ -45,15 +108,15 @@ int CurrentIndent(Writer& writer, TorkXmlLayout const& layout)
 }
 
 // A tag that raises the level after it: the start of an element.
-template <class Writer>
-int RaisingTag(Writer& writer, TorkXmlLayout& layout, QString const& name, QLatin1String end,
-               int indent)
+template <class Writer, std::size_t EndSize>
+int RaisingTag(Writer& writer, TorkXmlLayout& layout, QString const& name,
+               char const (&end)[EndSize], int indent)
 {
     if (name.isEmpty())
         return TorkXmlResult::EmptyName;
 
     writer.WriteCurrentIndent();
-    if (writer.Write(QLatin1Char('<') + name + end) < 0)
+    if (WriteTag(writer, layout, "<", name, end) < 0)
         return TorkXmlResult::WriteFailed;
     layout.level = Raised(layout.level, indent);
     return TorkXmlResult::Success;
@@ -62,13 +125,13 @@ int RaisingTag(Writer& writer, TorkXmlLayout& layout, QString const& name, QLati
 template <class Writer>
 int ElementOpen(Writer& writer, TorkXmlLayout& layout, QString const& name, int indent)
 {
-    return RaisingTag(writer, layout, name, QLatin1String(" "), indent);
+    return RaisingTag(writer, layout, name, " ", indent);
 }
 
 template <class Writer>
 int ElementStart(Writer& writer, TorkXmlLayout& layout, QString const& name, int indent)
 {
-    return RaisingTag(writer, layout, name, QLatin1String(">\n"), indent);
+    return RaisingTag(writer, layout, name, ">\n", indent);
 }
 
 // The end of a start tag, with the attributes collected so far before it.
@@ -83,7 +146,7 @@ int EndOfTag(Writer& writer, TorkXmlLayout& layout, QString const& name, QLatin1
 
     layout.level = Lowered(layout.level, indent);
     layout.pending += end;
-    if (writer.Write(layout.pending) < 0)
+    if (WritePending(writer, layout) < 0)
         return TorkXmlResult::WriteFailed;
     layout.pending = QLatin1String("");
     return TorkXmlResult::Success;
@@ -109,13 +172,13 @@ int ElementEnd(Writer& writer, TorkXmlLayout& layout, QString const& name, int i
 
     layout.level = Lowered(layout.level, indent);
     writer.WriteCurrentIndent();
-    if (writer.Write(QLatin1String("</") + name + QLatin1String(">\n")) < 0)
+    if (WriteTag(writer, layout, "</", name, ">\n") < 0)
         return TorkXmlResult::WriteFailed;
     return TorkXmlResult::Success;
 }
 
 template <class Writer>
-int Element(Writer& writer, QString const& name, QString const& value)
+int Element(Writer& writer, TorkXmlLayout& layout, QString const& name, QString const& value)
 {
     if (name.isEmpty())
         return TorkXmlResult::EmptyName;
@@ -124,11 +187,11 @@ int Element(Writer& writer, QString const& name, QString const& value)
 
     if (const int result = writer.WriteCurrentIndent())
         return result;
-    if (writer.Write(QLatin1Char('<') + name + QLatin1Char('>')) < 0)
+    if (WriteTag(writer, layout, "<", name, ">") < 0)
         return TorkXmlResult::WriteFailed;
     if (const int result = writer.WriteElementValue(value))
         return result;
-    if (writer.Write(QLatin1String("</") + name + QLatin1String(">\n")) < 0)
+    if (WriteTag(writer, layout, "</", name, ">\n") < 0)
         return TorkXmlResult::WriteFailed;
     return TorkXmlResult::Success;
 }
@@ -146,15 +209,24 @@ int ElementValue(Writer& writer, QString const& value)
     return TorkXmlResult::Success;
 }
 
-// Filled one after another: a name that holds a placeholder takes the value in its place. For any
-// other the result is the same without the search for placeholders.
-inline QString FilledAttribute(QString const& name, QString const& value)
+// Joins an attribute to those that are pending, or begins a new line with it.
+template <class Writer, class... Pieces>
+void Collect(Writer& writer, TorkXmlLayout& layout, Pieces const&... pieces)
 {
-    if (name.contains(QLatin1Char('%')))
-        return QStringLiteral("%1=\"%2\"").arg(name).arg(value); // clazy:exclude=qstring-arg
-    return name + QLatin1String("=\"") + value + QLatin1Char('"');
+    if ((layout.pending.length() + ... + Length(pieces)) < PendingLimit) {
+        AppendAll(layout.pending, " ", pieces...);
+        return;
+    }
+
+    // The attribute is then at column 0, without a blank before it.
+    layout.pending += QLatin1Char('\n');
+    WritePending(writer, layout);
+    layout.pending.resize(0);
+    AppendAll(layout.pending, pieces...);
 }
 
+// Filled one after another: a name that holds a placeholder takes the value in its place. For any
+// other the result is the same without the search for placeholders.
 template <class Writer>
 int CollectAttribute(Writer& writer, TorkXmlLayout& layout, QString const& name,
                      QString const& value)
@@ -162,16 +234,11 @@ int CollectAttribute(Writer& writer, TorkXmlLayout& layout, QString const& name,
     if (name.isEmpty())
         return TorkXmlResult::EmptyName;
 
-    const QString attribute = FilledAttribute(name, value);
-    if (attribute.length() + layout.pending.length() < PendingLimit) {
-        layout.pending += QLatin1Char(' ') + attribute;
-        return TorkXmlResult::Success;
-    }
-
-    // The attribute is then at column 0, without a blank before it.
-    layout.pending += QLatin1Char('\n');
-    writer.Write(layout.pending);
-    layout.pending = attribute;
+    if (std::find(name.begin(), name.end(), QLatin1Char('%')) == name.end())
+        Collect(writer, layout, name, "=\"", value, "\"");
+    else
+        Collect(writer, layout,
+                QStringLiteral("%1=\"%2\"").arg(name).arg(value)); // clazy:exclude=qstring-arg
     return TorkXmlResult::Success;
 }
 

@@ -26,4 +26,7 @@ struct TorkXmlLayout
     /// The attributes of the start tag that is open, and its closing characters, until they are
     /// written.
     QString pending = QLatin1String("");
+
+    /// Memory for the next tag, kept from the last one.
+    QString tag;
 };

@@ -51,7 +51,7 @@ int TorkXmlStream::WriteElementEnd(QString const& name, int indent)
 
 int TorkXmlStream::WriteElement(QString const& name, QString const& value)
 {
-    return TorkXmlFormat::Element(*this, name, value);
+    return TorkXmlFormat::Element(*this, m_layout, name, value);
 }
 
 int TorkXmlStream::WriteAttribute(QString const& name, QString const& value)

@@ -1,12 +1,14 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The numbers that ReadInt() and ReadUint() give beside their plain wording, QString::toInt().
+// The numbers that ReadInt() and ReadUint() give beside their plain wording, QString::toInt(), and
+// the names under which they find them beside QString::remove().
 
 #include "common/config/TorkConfigFile.h"
 
 #include "Rounds.h"
 
+#include <QHash>
 #include <QtTest>
 
 #include <random>
@@ -18,6 +20,7 @@ class tst_PlainNumbers : public QObject
 private slots:
     void everyShortText();
     void randomTexts();
+    void namesWithSpaces();
     void cleanupTestCase();
 
 private:
@@ -85,6 +88,36 @@ void tst_PlainNumbers::randomTexts()
             text.insert(static_cast<int>(random() % static_cast<unsigned>(text.size() + 1)),
                         QChar(static_cast<ushort>(random() % 0x80 + 1)));
         compare(text);
+    }
+}
+
+// Sections and keys with spaces anywhere, of which some are then the same.
+void tst_PlainNumbers::namesWithSpaces()
+{
+    std::mt19937 random(Rounds::seed());
+    const auto randomName = [&random]() {
+        const QString characters = QStringLiteral("ab  \t_");
+        QString name = QStringLiteral("n");
+        for (unsigned length = random() % 5; length > 0; --length)
+            name.insert(static_cast<int>(random() % static_cast<unsigned>(name.size() + 1)),
+                        characters[static_cast<int>(random() % 6)]);
+        return name;
+    };
+    TorkConfigFile file{QString()};
+    QHash<QString, int> plain;
+    const int count = Rounds::count(100000, 1000000);
+    for (int i = 0; i < count; ++i) {
+        const QString section = randomName();
+        const QString key = randomName();
+        const QString place = QString(section).remove(' ') + '/' + QString(key).remove(' ');
+        int number = -1;
+        QCOMPARE(file.ReadInt(section, key, -2, number), plain.contains(place));
+        QCOMPARE(number, plain.value(place, -2));
+        if (random() % 4 == 0) {
+            file.WriteItem(section, key, i);
+            plain.insert(place, i);
+        }
+        ++m_texts;
     }
 }
 

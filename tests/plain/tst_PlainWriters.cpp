@@ -2,8 +2,9 @@
 // SPDX-License-Identifier: MIT
 
 // Both XML writers beside a plain one, which makes each piece by its virtual call, over random
-// calls: the same bytes, result codes and calls that reach a subclass, whatever it overrides, on
-// every kind of device, with and without run-time type information.
+// calls: the same bytes, result codes and calls that reach a subclass, whatever it overrides, also
+// where its Write() comes back to the writer, on every kind of device, with and without run-time
+// type information.
 
 #include "common/xml/TorkXmlFile.h"
 #include "common/xml/TorkXmlStream.h"
@@ -40,6 +41,7 @@ struct Kind
 
     int overridden = 0;
     int failEvery = 0;   // each so many-th Write() reports -1; 0 for none
+    int returnEvery = 0; // at each so many-th Write() the writer is used again; 0 for none
     int indentCode = 0;  // what an overridden WriteCurrentIndent() returns
     int valueCode = 0;   // what an overridden WriteElementValue() returns
     bool isFile = false; // whose Write() returns 0
@@ -51,11 +53,31 @@ struct Record
 {
     QStringList calls;
     int writes = 0;
+    int outerWrites = 0;
+    bool isInside = false;
 };
 
 QString Call(char const* operation, QString const& first, QString const& second = QString())
 {
     return QLatin1String(operation) + '(' + first + '|' + second + ')';
+}
+
+// What an overridden Write() does that comes back to the writer with the text it was given.
+template <class Writer>
+void ComeBack(Writer& writer, Kind const& kind, QString const& text)
+{
+    Record& record = writer.record;
+    const bool may = kind.overridden & Kind::Write && kind.returnEvery > 0 && !record.isInside;
+    if (!may || ++record.outerWrites % kind.returnEvery != 0)
+        return;
+    record.isInside = true;
+    writer.WriteAttribute("again", text);
+    writer.WriteElement("inside", text);
+    writer.WriteElementStart("between", 1);
+    writer.WriteElementEnd("between", 1);
+    writer.WriteAttribute("a", text);
+    record.calls << Call("still", text);
+    record.isInside = false;
 }
 
 // The plain writer. A virtual call is a call of an operation that records it if the kind overrides
@@ -163,11 +185,12 @@ public:
         return m_kind.overridden & Kind::Indent ? m_kind.indentCode : 0;
     }
 
-    int Write(QString const& text)
+    int Write(QString text)
     {
         note(Kind::Write, "write", text);
         if (m_stream)
             *m_stream << text;
+        ComeBack(*this, m_kind, text);
         const bool fails = m_kind.overridden & Kind::Write && m_kind.failEvery > 0 &&
                            ++record.writes % m_kind.failEvery == 0;
         if (fails)
@@ -274,6 +297,7 @@ public:
     {
         note(Kind::Write, "write", text);
         const int written = Writer::Write(text);
+        ComeBack(*this, m_kind, text);
         const bool fails = m_kind.overridden & Kind::Write && m_kind.failEvery > 0 &&
                            ++record.writes % m_kind.failEvery == 0;
         return fails ? -1 : written;
@@ -343,6 +367,8 @@ public:
             kind.overridden = chance(50) ? 1 << below(10) : below(Kind::All + 1);
         if (kind.overridden & Kind::Write && chance(50))
             kind.failEvery = 1 + below(6);
+        if (kind.overridden & Kind::Write && chance(30))
+            kind.returnEvery = 1 + below(6);
         kind.indentCode = oneOf(codes);
         kind.valueCode = oneOf(codes);
         if (chance(10))
