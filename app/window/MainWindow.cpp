@@ -3,7 +3,7 @@
 
 #include "app/window/MainWindow.h"
 
-#include "app/ScreenlessPlatform.h"
+#include "app/ScreenlessPlatform_p.h"
 #include "app/UserMessages.h"
 #include "app/runninglog/LogHealth.h"
 #include "app/runninglog/RunningLog.h"

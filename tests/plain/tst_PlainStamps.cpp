@@ -2,7 +2,7 @@
 // SPDX-License-Identifier: MIT
 
 #include "common/log/TorkLog.h"
-#include "common/log/TorkLogStamp.h"
+#include "common/log/TorkLogStamp_p.h"
 #include "log/LogFolder.h"
 #include "log/PlainStamp.h"
 #include "plain/Rounds.h"
