@@ -130,13 +130,14 @@ bool PlacesPanel::OpenPlace(QString const& path)
 void PlacesPanel::openPlace(QString const& path)
 {
     if (!OpenPlace(path))
-        emit Said(tr("%1 cannot be shown: it is not there, or there is no file manager").arg(path));
+        Q_EMIT Said(
+            tr("%1 cannot be shown: it is not there, or there is no file manager").arg(path));
 }
 
 void PlacesPanel::copy(QString const& caption, QString const& text)
 {
     QGuiApplication::clipboard()->setText(text);
-    emit Said(tr("Copied: %1").arg(caption));
+    Q_EMIT Said(tr("Copied: %1").arg(caption));
 }
 
 } // namespace Velocor
