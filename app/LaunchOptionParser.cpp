@@ -3,7 +3,7 @@
 
 #include "app/LaunchOptionParser.h"
 
-#include "app/XmlNesting.h"
+#include "app/XmlNesting_p.h"
 #include "common/xml/TorkXmlLimits.h"
 
 #include <QByteArray>

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-#include "app/ScreenlessPlatform.h"
+#include "app/ScreenlessPlatform_p.h"
 
 #include <QGuiApplication>
 

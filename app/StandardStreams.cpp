@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-#include "app/StandardStreams.h"
+#include "app/StandardStreams_p.h"
 
 #include <QByteArray>
 

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-#include "app/WithoutOpenGl.h"
+#include "app/WithoutOpenGl_p.h"
 
 #include <QGuiApplication>
 #include <QOpenGLContext>

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-#include "app/XmlNesting.h"
+#include "app/XmlNesting_p.h"
 
 #include <cstring>
 

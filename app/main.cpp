@@ -4,9 +4,9 @@
 #include "app/AppPaths.h"
 #include "app/FailedWrites.h"
 #include "app/QuitOnSignal.h"
-#include "app/ScreenlessPlatform.h"
-#include "app/StandardStreams.h"
-#include "app/WithoutOpenGl.h"
+#include "app/ScreenlessPlatform_p.h"
+#include "app/StandardStreams_p.h"
+#include "app/WithoutOpenGl_p.h"
 #include "app/window/MainWindow.h"
 #include "common/log/TorkLog.h"
 

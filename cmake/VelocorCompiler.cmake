@@ -23,6 +23,17 @@ target_compile_definitions(velocor_build INTERFACE
     QT_NO_CAST_TO_ASCII
     QT_NO_FOREACH)
 
+# velocor_product: what the sources of app/ and common/ are held to besides. Nothing guesses the
+# encoding of a text, "signals" and "emit" stay free for the applications that include the headers,
+# and texts joined with + are made in one piece.
+add_library(velocor_product INTERFACE)
+target_link_libraries(velocor_product INTERFACE velocor_build)
+target_compile_definitions(velocor_product INTERFACE
+    QT_NO_CAST_FROM_ASCII
+    QT_NO_KEYWORDS
+    QT_NO_URL_CAST_FROM_STRING
+    QT_USE_QSTRINGBUILDER)
+
 # Sanitizers concern every object of a program, so they are the one setting that is not a target's.
 if(VELOCOR_SANITIZE)
     add_compile_options(-fsanitize=${VELOCOR_SANITIZE} -fno-omit-frame-pointer)

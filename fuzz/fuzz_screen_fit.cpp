@@ -5,7 +5,7 @@
 
 #include "FuzzInput.h"
 
-#include "common/config/TorkScreenFit.h"
+#include "common/config/TorkScreenFit_p.h"
 
 extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
 {

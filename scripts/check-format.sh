@@ -2,15 +2,23 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 #
-# Fails where a source file is not formatted as .clang-format says.
-# To put it right: clang-format-14 -i FILE
+# Fails where a source file is not formatted as .clang-format says; with --fix, formats it.
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")/.."
+
+case "$*" in
+"") action=(--dry-run -Werror) ;;
+--fix) action=(-i) ;;
+*)
+    echo "usage: check-format.sh [--fix]" >&2
+    exit 2
+    ;;
+esac
 
 files=()
 while IFS= read -r -d '' file; do
     files+=("$file")
 done < <(git ls-files -z --cached --others --exclude-standard '*.cpp' '*.h')
 
-clang-format-14 --dry-run -Werror "${files[@]}"
+clang-format-14 "${action[@]}" "${files[@]}"
 echo "format: ${#files[@]} files are as .clang-format says"

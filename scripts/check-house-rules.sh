@@ -54,46 +54,6 @@ machine_paths() {
         "$start/((home|Users)/(?!ada/)$name/$name|(root|wo""rk|workspace)/$name)|/tmp/[a-z]*_jo""bs"
 }
 
-# Of the includes of a folder's own files that name a folder of this tree, those of any folder but
-# this one and the given ones; of a relative path it cannot be told. The entry point is above all.
-includes_beyond() {
-    local allowed
-    allowed=$(printf '|%s' "$@")
-    tracked ":(glob)$1/*.cpp" ":(glob)$1/*.h" | grep -zvxF app/main.cpp |
-        search -nHP "^\s*#\s*include\s*[<\"](?!(${allowed#|})/[^/]+[>\"])(\.\.?/|(app|common)/)"
-}
-
-# What a folder's files may include of this tree besides each other: the arrows between the rooms.
-may_include() {
-    local folder=$1
-    shift
-    rule "$folder may include ${*:-nothing else}, no more" includes_beyond "$folder" "$@"
-}
-
-rooms() {
-    may_include common/config common/log common/xml
-    may_include common/log common/config
-    may_include common/xml common/log
-    may_include app common/config common/log common/xml
-    may_include app/logfile
-    may_include app/settingsfile common/config common/xml
-    may_include app/runninglog app/settingsfile common/log
-    may_include app/window/widgets app/logfile
-    may_include app/window/log app/logfile app/runninglog app/window/widgets
-    may_include app/window/settings app/settingsfile app/window/widgets
-    may_include app/window app app/logfile app/runninglog app/settingsfile \
-        app/window/log app/window/settings app/window/widgets common/config common/log
-}
-
-# A folder that the rooms do not name would have no rule.
-folders_without_rule() {
-    local folder
-    while IFS= read -r folder; do
-        declare -f rooms | grep -qE "may_include $folder( |;|\$)" || echo "$folder"
-    done < <(git ls-files --cached --others --exclude-standard 'app/*.h' 'common/*.h' |
-        sed 's,/[^/]*$,,' | sort -u)
-}
-
 # The rooms below the window could include the headers of widgets through the framework.
 widgets_below_the_window() {
     tracked 'app/logfile/*' 'app/settingsfile/*' 'app/runninglog/*' |
@@ -119,8 +79,7 @@ rule "no SPDX lines at the top" without_spdx
 rule "a header without #pragma once" without_pragma_once
 rule "a tab, or blanks at a line's end" stray_blanks
 rule "a path of one machine" machine_paths
-rooms
-rule "a folder that no rule says what it may include" folders_without_rule
+rule "not as drawn in docs/architecture.md" scripts/check-rooms.py
 rule "a widget below the window" widgets_below_the_window
 rule "a tool tip that does not come from PlainToolTip()" bare_tool_tips
 rule "a widget that guesses whether its text is rich; see app/window/PlainText.h" guessing_widgets

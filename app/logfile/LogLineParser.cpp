@@ -3,6 +3,7 @@
 
 #include "app/logfile/LogLineParser.h"
 
+#include "app/logfile/AsciiDigit.h"
 #include "app/logfile/LogSeverities.h"
 
 #include <algorithm>
@@ -23,14 +24,9 @@ QStringList WithDefault(QStringList texts, QString const& byDefault)
     return texts;
 }
 
-bool IsDigit(char c)
-{
-    return c >= '0' && c <= '9';
-}
-
 bool HoldsDigit(char const* text, int length)
 {
-    return std::any_of(text, text + length, IsDigit);
+    return std::any_of(text, text + length, IsAsciiDigit);
 }
 
 // The number of bytes that "[-12] " takes up to its "]"; 0 if there is no such number.
@@ -40,7 +36,7 @@ int NumberInBrackets(char const* text, int length)
     if (at < length && text[at] == '-')
         ++at;
     const int firstDigit = at;
-    while (at < length && IsDigit(text[at]))
+    while (at < length && IsAsciiDigit(text[at]))
         ++at;
     const bool complete = at > firstDigit && at < length && text[at] == ']';
     return length > 0 && text[0] == '[' && complete ? at + 1 : 0;

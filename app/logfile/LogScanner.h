@@ -34,7 +34,7 @@ public:
     /// Announces the request that counts from now on.
     void Want(int request) { m_wanted = request; }
 
-public slots:
+public Q_SLOTS:
     /// Reads a file from its start.
     void Open(int request, QString const& path, Velocor::LogLineParser const& parser,
               Velocor::LogFilter const& filter);
@@ -45,7 +45,7 @@ public slots:
     /// Shows other rows of the same file.
     void SetFilter(int request, Velocor::LogFilter const& filter);
 
-signals:
+Q_SIGNALS:
     void Updated(Velocor::LogUpdate const& update);
     void Progressed(int request, int percent);
     void Polled();

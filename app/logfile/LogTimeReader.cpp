@@ -3,6 +3,8 @@
 
 #include "app/logfile/LogTimeReader.h"
 
+#include "app/logfile/AsciiDigit.h"
+
 #include <QLocale>
 #include <QTime>
 
@@ -12,11 +14,6 @@
 namespace Velocor {
 
 namespace {
-
-bool IsDigit(char c)
-{
-    return c >= '0' && c <= '9';
-}
 
 // Letters of any language: what is not a letter of ASCII but above it may be one.
 bool IsWordCharacter(char c)
@@ -265,7 +262,7 @@ bool LogTimeReader::readNumber(Token const& token, char const*& at, char const* 
 {
     int value = 0;
     int digits = 0;
-    while (at != end && digits < token.maximum && IsDigit(*at)) {
+    while (at != end && digits < token.maximum && IsAsciiDigit(*at)) {
         value = value * 10 + (*at - '0');
         ++at;
         ++digits;

@@ -81,7 +81,7 @@ SettingsEditor* FileTabs::addEditor(QString const& title, QString const& path)
     connect(editor, &SettingsEditor::Said, this, &FileTabs::Said);
     connect(editor, &SettingsEditor::ModifiedChanged, this, [this, editor, title](bool modified) {
         setTabText(indexOf(editor), modified ? title + QLatin1String(" *") : title);
-        emit StateChanged();
+        Q_EMIT StateChanged();
     });
     setTabToolTip(addTab(editor, title), PlainToolTip(path));
     addCloseButton(editor, name);
@@ -121,7 +121,7 @@ void FileTabs::OpenFile(QString const& path)
     }
     setCurrentIndex(position);
     widget(position)->setFocus();
-    emit StateChanged();
+    Q_EMIT StateChanged();
 }
 
 void FileTabs::CloseCurrent()
@@ -139,7 +139,7 @@ void FileTabs::closeTab(int position)
         return;
     removeTab(position);
     page->deleteLater();
-    emit StateChanged();
+    Q_EMIT StateChanged();
 }
 
 bool FileTabs::MayCloseAll()

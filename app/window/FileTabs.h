@@ -43,7 +43,7 @@ public:
     /// Whether a file looks like a settings file.
     static bool IsSettingsFile(QString const& path);
 
-signals:
+Q_SIGNALS:
     /// Another tab is current, or what the current one shows has changed.
     void StateChanged();
     void Said(QString const& text);

@@ -3,10 +3,11 @@
 
 #include "app/window/MainWindow.h"
 
-#include "app/ScreenlessPlatform.h"
+#include "app/ScreenlessPlatform_p.h"
 #include "app/UserMessages.h"
 #include "app/runninglog/LogHealth.h"
 #include "app/runninglog/RunningLog.h"
+#include "app/window/ApplicationProperty.h"
 #include "app/window/FileTabs.h"
 #include "app/window/PlacesPanel.h"
 #include "app/window/RecentFiles.h"
@@ -48,11 +49,6 @@ constexpr int MessageTime = 6000;    // milliseconds
 constexpr int MostDropped = 20;
 constexpr int LongestMessage = 1000; // characters
 
-QString Property(char const* name)
-{
-    return QCoreApplication::instance()->property(name).toString();
-}
-
 QIcon WindowIcon()
 {
     QIcon icon;
@@ -64,10 +60,10 @@ QIcon WindowIcon()
 } // namespace
 
 MainWindow::MainWindow(QWidget* parent)
-    : QMainWindow(parent), m_settings(Property("DataPath")), m_splitter(new QSplitter),
+    : QMainWindow(parent), m_settings(ApplicationProperty("DataPath")), m_splitter(new QSplitter),
       m_places(new PlacesPanel(m_settings.fileName()))
 {
-    setWindowTitle(Property("caption"));
+    setWindowTitle(ApplicationProperty("caption"));
     setAcceptDrops(true);
     // Size limits are for the window manager. A platform without one says in the log that it cannot
     // pass them on.
@@ -358,7 +354,7 @@ void MainWindow::say(QString const& text)
 void MainWindow::chooseFile()
 {
     const QString path = QFileDialog::getOpenFileName(
-        this, tr("Open"), Property("DataPath"),
+        this, tr("Open"), ApplicationProperty("DataPath"),
         tr("Logs and settings (*.log *.log.* *.cfg *.xml);;All files (*)"));
     if (!path.isEmpty())
         OpenFile(path);

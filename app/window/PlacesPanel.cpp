@@ -4,6 +4,7 @@
 #include "app/window/PlacesPanel.h"
 
 #include "app/runninglog/RunningLog.h"
+#include "app/window/ApplicationProperty.h"
 #include "app/window/widgets/PlainText.h"
 
 #include <QClipboard>
@@ -22,11 +23,6 @@
 namespace Velocor {
 
 namespace {
-
-QString Property(char const* name)
-{
-    return QCoreApplication::instance()->property(name).toString();
-}
 
 QToolButton* MakeButton(QString const& text, QString const& name, QString const& toolTip)
 {
@@ -49,9 +45,9 @@ PlacesPanel::PlacesPanel(QString const& settingsFile, QWidget* parent) : QWidget
     m_layout->setSpacing(2);
     addValue(tr("Organization"), QCoreApplication::organizationName(), false);
     addValue(tr("Product"), QCoreApplication::applicationName(), false);
-    addValue(tr("Installation"), Property("RootPath"), true);
-    addValue(tr("Data"), Property("DataPath"), true);
-    addValue(tr("Documents"), Property("DocPath"), true);
+    addValue(tr("Installation"), ApplicationProperty("RootPath"), true);
+    addValue(tr("Data"), ApplicationProperty("DataPath"), true);
+    addValue(tr("Documents"), ApplicationProperty("DocPath"), true);
     addValue(tr("Log file"), RunningLog::FileName(), true);
     addValue(tr("Settings file"), settingsFile, true);
     m_layout->addStretch(1);
@@ -130,13 +126,14 @@ bool PlacesPanel::OpenPlace(QString const& path)
 void PlacesPanel::openPlace(QString const& path)
 {
     if (!OpenPlace(path))
-        emit Said(tr("%1 cannot be shown: it is not there, or there is no file manager").arg(path));
+        Q_EMIT Said(
+            tr("%1 cannot be shown: it is not there, or there is no file manager").arg(path));
 }
 
 void PlacesPanel::copy(QString const& caption, QString const& text)
 {
     QGuiApplication::clipboard()->setText(text);
-    emit Said(tr("Copied: %1").arg(caption));
+    Q_EMIT Said(tr("Copied: %1").arg(caption));
 }
 
 } // namespace Velocor

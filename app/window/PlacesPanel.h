@@ -29,7 +29,7 @@ public:
     /// @return false if there is no such folder or nothing to show it
     static bool OpenPlace(QString const& path);
 
-signals:
+Q_SIGNALS:
     /// A button could not do its work, or has done it.
     void Said(QString const& text);
 

@@ -40,7 +40,7 @@ public:
     /// The longest path that is remembered, in characters.
     static constexpr int LongestPath = 4096;
 
-signals:
+Q_SIGNALS:
     /// A file was chosen in the menu.
     void Chosen(QString const& path);
 

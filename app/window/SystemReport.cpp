@@ -7,6 +7,7 @@
 #include "app/logfile/LogIndex.h"
 #include "app/runninglog/LogPreferences.h"
 #include "app/runninglog/RunningLog.h"
+#include "app/window/ApplicationProperty.h"
 #include "app/window/log/RunningLogParser.h"
 #include "app/window/widgets/FileSizeText.h"
 #include "common/log/TorkLog.h"
@@ -87,11 +88,6 @@ QString File(QString const& caption, QString const& path)
     return Line(caption, QStringLiteral("%1 (%2)").arg(path, state));
 }
 
-QString Property(char const* name)
-{
-    return QCoreApplication::instance()->property(name).toString();
-}
-
 QString LogState()
 {
     TorkLog const* log = TorkLog::logger();
@@ -141,7 +137,7 @@ QString LineAt(QFile& file, qint64 start)
 
 QString Memory()
 {
-    const QStorageInfo storage(Property("DataPath"));
+    const QStorageInfo storage(ApplicationProperty("DataPath"));
     return storage.isValid() ? FileSizeText(storage.bytesAvailable()) : QObject::tr("unknown");
 }
 
@@ -167,9 +163,9 @@ QString SystemReport::Facts(QString const& settingsFile)
     text += Line(QObject::tr("Style"), QApplication::style()->objectName());
     text += Line(QObject::tr("Font"), QApplication::font().toString());
     text += Screens();
-    text += Directory(QObject::tr("Installation"), Property("RootPath"));
-    text += Directory(QObject::tr("Data"), Property("DataPath"));
-    text += Directory(QObject::tr("Documents"), Property("DocPath"));
+    text += Directory(QObject::tr("Installation"), ApplicationProperty("RootPath"));
+    text += Directory(QObject::tr("Data"), ApplicationProperty("DataPath"));
+    text += Directory(QObject::tr("Documents"), ApplicationProperty("DocPath"));
     text += File(QObject::tr("Settings file"), settingsFile);
     text += File(QObject::tr("Log settings"), LogPreferences::FileName());
     text += File(QObject::tr("Log file"), RunningLog::FileName());

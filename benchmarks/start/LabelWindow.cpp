@@ -6,7 +6,7 @@
 // own content.
 
 #include "app/AppPaths.h"
-#include "app/WithoutOpenGl.h"
+#include "app/WithoutOpenGl_p.h"
 #include "common/log/TorkLog.h"
 
 #include <QApplication>

@@ -4,7 +4,7 @@
 #include "common/config/TorkConfigFile.h"
 
 #include "common/config/TorkConfigFileDocHandler.h"
-#include "common/config/TorkOrderedHash.h"
+#include "common/config/TorkOrderedHash_p.h"
 #include "common/log/TorkLog.h"
 #include "common/xml/TorkErrorHandler.h"
 #include "common/xml/TorkXmlGuard.h"

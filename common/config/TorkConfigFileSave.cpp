@@ -6,7 +6,7 @@
 #include "common/config/TorkConfigFile.h"
 
 #include "common/config/TorkConfigFileSection.h"
-#include "common/config/TorkOrderedHash.h"
+#include "common/config/TorkOrderedHash_p.h"
 
 #include <QFile>
 

@@ -3,7 +3,7 @@
 
 #include "common/config/TorkConfigFileSection.h"
 
-#include "common/config/TorkOrderedHash.h"
+#include "common/config/TorkOrderedHash_p.h"
 
 TorkConfigFileSection::TorkConfigFileSection(char const* name)
     : m_name(QString::fromUtf8(name ? name : "UnknownSection")),

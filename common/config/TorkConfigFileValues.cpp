@@ -5,7 +5,7 @@
 
 #include "common/config/TorkConfigFile.h"
 
-#include "common/config/TorkScreenFit.h"
+#include "common/config/TorkScreenFit_p.h"
 
 #include <QApplication>
 #include <QColor>

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-#include "common/config/TorkScreenFit.h"
+#include "common/config/TorkScreenFit_p.h"
 
 #include <algorithm>
 

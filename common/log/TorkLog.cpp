@@ -5,8 +5,8 @@
 
 #include "common/log/TorkLog.h"
 
-#include "common/log/TorkLogLock.h"
-#include "common/log/TorkLogStamp.h"
+#include "common/log/TorkLogLock_p.h"
+#include "common/log/TorkLogStamp_p.h"
 
 TorkLog::TorkLog() : TorkLog(QString(QLatin1String(""))) {}
 

@@ -246,7 +246,7 @@ private:
     int m_writing = 0;
     mutable QMutex m_mutex; // the files, and the texts that writing an entry reads
 
-    // How the open file is shared with other programs; see TorkLogPlace.h.
+    // How the open file is shared with other programs; see TorkLogPlace_p.h.
     bool m_handedOut = false;  // for good: whoever has the file object may seek and write
     bool m_followsEnd = false; // entries that go to the end are appended
     bool m_appends = false;

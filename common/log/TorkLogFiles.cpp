@@ -14,8 +14,8 @@
 
 #include "common/log/TorkLog.h"
 
-#include "common/log/TorkLogLock.h"
-#include "common/log/TorkLogPlace.h"
+#include "common/log/TorkLogLock_p.h"
+#include "common/log/TorkLogPlace_p.h"
 
 #include <QDir>
 #include <QMap>

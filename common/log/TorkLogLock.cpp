@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-#include "common/log/TorkLogLock.h"
+#include "common/log/TorkLogLock_p.h"
 
 #include <chrono>
 

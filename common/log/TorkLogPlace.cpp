@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-#include "common/log/TorkLogPlace.h"
+#include "common/log/TorkLogPlace_p.h"
 
 #ifdef Q_OS_UNIX
 

@@ -6,7 +6,7 @@
 #include "common/log/TorkLog.h"
 
 #include "common/config/TorkConfigFile.h"
-#include "common/log/TorkLogLock.h"
+#include "common/log/TorkLogLock_p.h"
 
 #include <QDir>
 #include <QStandardPaths>

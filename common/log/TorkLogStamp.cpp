@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-#include "common/log/TorkLogStamp.h"
+#include "common/log/TorkLogStamp_p.h"
 
 #include <QDateTime>
 #include <QLocale>

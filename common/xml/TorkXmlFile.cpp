@@ -3,7 +3,7 @@
 
 #include "common/xml/TorkXmlFile.h"
 
-#include "common/xml/TorkXmlFormat.h"
+#include "common/xml/TorkXmlFormat_p.h"
 
 TorkXmlFile::TorkXmlFile() = default;
 

@@ -3,7 +3,7 @@
 
 #include "common/xml/TorkXmlGuard.h"
 
-#include "common/xml/TorkXmlLexer.h"
+#include "common/xml/TorkXmlLexer_p.h"
 
 #include <QXmlErrorHandler>
 #include <QXmlParseException>

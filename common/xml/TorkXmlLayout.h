@@ -5,7 +5,13 @@
 
 #include <QString>
 
-/// The result codes of the XML writers' operations.
+/// The result codes of the XML writers' operations. 0 is success.
+///
+/// Write() of both writers reports no failure, so WriteFailed only comes from a class that
+/// overrides it; to learn of a full disk, ask the device, or TorkXmlFile::errorString().
+///
+///     if (writer.WriteAttribute(name, value) == TorkXmlResult::EmptyName)
+///         qWarning("An attribute without a name was left out.");
 namespace TorkXmlResult {
 enum Code : int {
     Success = 0,

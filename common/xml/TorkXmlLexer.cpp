@@ -1,9 +1,9 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-#include "common/xml/TorkXmlLexer.h"
+#include "common/xml/TorkXmlLexer_p.h"
 
-#include "common/xml/TorkXmlPrefixes.h"
+#include "common/xml/TorkXmlPrefixes_p.h"
 
 #include <algorithm>
 

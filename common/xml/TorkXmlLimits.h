@@ -5,6 +5,11 @@
 
 /// The limits of the family's XML readers. No real file comes near any of them; what is beyond one
 /// fails like any malformed document, and the reason names the limit.
+///
+/// A program that writes documents of its own can keep to them:
+///
+///     if (depth >= TorkXmlMaximumDepth)
+///         qWarning("Deeper than anything here could read again.");
 
 /// The deepest nesting of elements that any reader accepts; the root has depth 1.
 ///

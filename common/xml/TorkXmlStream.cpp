@@ -3,7 +3,7 @@
 
 #include "common/xml/TorkXmlStream.h"
 
-#include "common/xml/TorkXmlFormat.h"
+#include "common/xml/TorkXmlFormat_p.h"
 
 TorkXmlStream::TorkXmlStream() = default;
 

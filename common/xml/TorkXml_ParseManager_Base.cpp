@@ -5,7 +5,7 @@
 
 #include "common/log/TorkLog.h"
 #include "common/xml/TorkXmlLimits.h"
-#include "common/xml/TorkXmlPrefixes.h"
+#include "common/xml/TorkXmlPrefixes_p.h"
 #include "common/xml/TorkXml_ParseState_Base.h"
 
 #include <QDebug>

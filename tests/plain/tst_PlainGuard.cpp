@@ -5,7 +5,7 @@
 // of the same events, errors included, and each limit holds at exactly what the document comes to.
 
 #include "common/xml/TorkXmlGuard.h"
-#include "common/xml/TorkXmlLexer.h"
+#include "common/xml/TorkXmlLexer_p.h"
 #include "plain/Rounds.h"
 #include "xml/XmlEvents.h"
 

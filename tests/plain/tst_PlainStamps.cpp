@@ -2,7 +2,7 @@
 // SPDX-License-Identifier: MIT
 
 #include "common/log/TorkLog.h"
-#include "common/log/TorkLogStamp.h"
+#include "common/log/TorkLogStamp_p.h"
 #include "log/LogFolder.h"
 #include "log/PlainStamp.h"
 #include "plain/Rounds.h"
@@ -65,7 +65,6 @@ const char* const formats[] = {
     "'no moment at all'",
     "",
     "[ %1 %2 %d ]",
-    "dddd '\xe2\x82\xac' hh:mm:ss.zzz", // no locale can put this into Latin-1
     "'a long one, beyond what is kept from entry to entry: ' yyyy-MM-dd hh:mm:ss.zzz",
 };
 

@@ -3,7 +3,7 @@
 
 // The ordered table of sections and values beside its plain wording: a QHash and a list.
 
-#include "common/config/TorkOrderedHash.h"
+#include "common/config/TorkOrderedHash_p.h"
 
 #include "Rounds.h"
 

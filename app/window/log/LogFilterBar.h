@@ -34,7 +34,7 @@ public:
 
     void SetEarlierRuns(bool shown);
 
-signals:
+Q_SIGNALS:
     void Changed();
 
 protected:

@@ -60,7 +60,7 @@ void LogModel::startScanner()
     connect(m_scanner, &LogScanner::Polled, this, [this] { m_polling = false; });
     connect(m_scanner, &LogScanner::Progressed, this, [this](int request, int percent) {
         if (request == m_request && m_reading)
-            emit Progressed(percent);
+            Q_EMIT Progressed(percent);
     });
     m_thread.start();
 }
@@ -80,7 +80,7 @@ void LogModel::Reload()
     startScanner();
     m_reading = true;
     m_scanner->Want(++m_request);
-    emit openWanted(m_request, m_path, m_parser, m_filter);
+    Q_EMIT openWanted(m_request, m_path, m_parser, m_filter);
     if (!m_paused)
         m_pollTimer.start();
 }
@@ -92,7 +92,7 @@ void LogModel::SetFilter(LogFilter const& filter)
         return;
     m_reading = true;
     m_scanner->Want(++m_request);
-    emit filterWanted(m_request, m_filter);
+    Q_EMIT filterWanted(m_request, m_filter);
 }
 
 void LogModel::SetPaused(bool paused)
@@ -111,7 +111,7 @@ void LogModel::poll()
     if (m_polling || m_reading)
         return;
     m_polling = true;
-    emit pollWanted();
+    Q_EMIT pollWanted();
 }
 
 void LogModel::take(LogUpdate const& update)
@@ -126,8 +126,8 @@ void LogModel::take(LogUpdate const& update)
     else if (!m_paused)
         applyChange(update);
     if (wasReading)
-        emit Progressed(100);
-    emit Refreshed();
+        Q_EMIT Progressed(100);
+    Q_EMIT Refreshed();
 }
 
 void LogModel::reset(LogUpdate const& update)
@@ -158,12 +158,12 @@ void LogModel::applyChange(LogUpdate const& update)
         endInsertRows();
     if (changed > 0) {
         const int first = at + std::max(difference, 0);
-        emit dataChanged(index(first, 0), index(first + changed - 1, ColumnCount - 1));
+        Q_EMIT dataChanged(index(first, 0), index(first + changed - 1, ColumnCount - 1));
     }
 
     const int tail = static_cast<int>(update.changedTail);
     if (tail > 0)
-        emit dataChanged(index(m_rowCount - tail, 0), index(m_rowCount - 1, ColumnCount - 1));
+        Q_EMIT dataChanged(index(m_rowCount - tail, 0), index(m_rowCount - 1, ColumnCount - 1));
     const int total = static_cast<int>(update.rows->size());
     if (total > m_rowCount) {
         beginInsertRows(QModelIndex(), m_rowCount, total - 1);

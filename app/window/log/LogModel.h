@@ -84,7 +84,7 @@ public:
     /// The most of a line that is shown, in bytes.
     static constexpr int ShownLimit = 4096;
 
-signals:
+Q_SIGNALS:
     /// The rows have been brought up to date.
     void Refreshed();
 

@@ -126,7 +126,7 @@ void LogPanel::connectAll()
     });
     connect(m_view, &LogView::FollowingChanged, this, [this](bool following) {
         m_follow->setChecked(following);
-        emit StateChanged();
+        Q_EMIT StateChanged();
     });
     connect(m_view->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
             &LogPanel::showCurrentLine);
@@ -134,12 +134,12 @@ void LogPanel::connectAll()
         updatePlaceholder();
         if (!m_view->currentIndex().isValid())
             showCurrentLine();
-        emit StateChanged();
+        Q_EMIT StateChanged();
     });
     connect(m_model, &LogModel::Progressed, this, [this](int percent) {
         m_percent = percent;
         updatePlaceholder();
-        emit StateChanged();
+        Q_EMIT StateChanged();
     });
 }
 
@@ -192,7 +192,7 @@ void LogPanel::SetPaused(bool paused)
 {
     m_model->SetPaused(paused);
     m_pause->setChecked(paused);
-    emit StateChanged();
+    Q_EMIT StateChanged();
 }
 
 bool LogPanel::isPaused() const
@@ -235,11 +235,11 @@ void LogPanel::CopySelected()
 {
     const int count = m_view->CopySelected();
     if (count == 0)
-        emit Said(tr("No line is selected"));
+        Q_EMIT Said(tr("No line is selected"));
     else if (count >= LogView::MostCopied)
-        emit Said(tr("The first %L1 of the selected lines have been copied").arg(count));
+        Q_EMIT Said(tr("The first %L1 of the selected lines have been copied").arg(count));
     else
-        emit Said(tr("%Ln line(s) copied", nullptr, count));
+        Q_EMIT Said(tr("%Ln line(s) copied", nullptr, count));
 }
 
 void LogPanel::SelectAll()
@@ -253,8 +253,8 @@ void LogPanel::GoToProblem(int step)
         m_view->setFocus();
         return;
     }
-    emit Said(step > 0 ? tr("No further warning or error below")
-                       : tr("No further warning or error above"));
+    Q_EMIT Said(step > 0 ? tr("No further warning or error below")
+                         : tr("No further warning or error above"));
 }
 
 QString LogPanel::path() const

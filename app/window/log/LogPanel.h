@@ -69,7 +69,7 @@ public:
     LogModel* model() const { return m_model; }
     LogView* view() const { return m_view; }
 
-signals:
+Q_SIGNALS:
     /// Something that the window's actions or its status line show has changed.
     void StateChanged();
 

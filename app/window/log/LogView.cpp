@@ -92,7 +92,7 @@ void LogView::SetFollowing(bool following)
     if (following == m_following)
         return;
     m_following = following;
-    emit FollowingChanged(following);
+    Q_EMIT FollowingChanged(following);
 }
 
 void LogView::noteScrolled(int value)

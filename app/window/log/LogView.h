@@ -47,7 +47,7 @@ public:
     /// The most lines that are copied.
     static constexpr int MostCopied = 100000;
 
-signals:
+Q_SIGNALS:
     void FollowingChanged(bool following);
 
 protected:

@@ -53,7 +53,7 @@ public:
     /// What the tree holds at the moment.
     SettingsDocument document() const;
 
-signals:
+Q_SIGNALS:
     void ModifiedChanged(bool modified);
     void Said(QString const& text);
 
