@@ -16,29 +16,71 @@
 #include <sys/prctl.h>
 #endif
 
-/// Takes rights away from the running process. There is no way back: for child processes only.
+/// Takes rights away from the running process. Except for OrdinaryUser there is no way back: for
+/// child processes only.
 namespace ProcessLimits {
 
-/// Makes the permissions of files hold: the administrator, to whom they mean nothing, becomes the
+/// The user who owns nothing. To the administrator the permissions of files mean nothing.
+constexpr unsigned NobodyId = 65534;
+
+/// A process that changed its user is closed to tracing, which leak checkers depend on.
+inline void allowTracing()
+{
+#ifdef Q_OS_LINUX
+    prctl(PR_SET_DUMPABLE, 1);
+#endif
+}
+
+/// Makes the permissions of files hold for the rest of the process: the administrator becomes a
 /// user without rights. Returns false where that is not possible.
 inline bool becomeOrdinaryUser()
 {
 #ifdef Q_OS_UNIX
     if (geteuid() != 0)
         return true;
-
-    const unsigned nobody = 65534;
-    if (setgroups(0, nullptr) != 0 || setgid(nobody) != 0 || setuid(nobody) != 0)
+    if (setgroups(0, nullptr) != 0 || setgid(NobodyId) != 0 || setuid(NobodyId) != 0)
         return false;
-#ifdef Q_OS_LINUX
-    // A process that changed its user is closed to tracing, which leak checkers depend on.
-    prctl(PR_SET_DUMPABLE, 1);
-#endif
+    allowTracing();
     return true;
 #else
     return false;
 #endif
 }
+
+/// Makes the permissions of files hold while this object lives.
+class OrdinaryUser
+{
+    Q_DISABLE_COPY(OrdinaryUser)
+
+public:
+    OrdinaryUser()
+    {
+#ifdef Q_OS_UNIX
+        m_wasAdministrator = geteuid() == 0;
+        m_changed = m_wasAdministrator && seteuid(NobodyId) == 0;
+        m_isInForce = m_changed || !m_wasAdministrator;
+#endif
+    }
+    ~OrdinaryUser()
+    {
+#ifdef Q_OS_UNIX
+        if (m_changed && seteuid(0) != 0)
+            qFatal("cannot become the administrator again");
+        allowTracing();
+#endif
+    }
+
+    /// Whether permissions hold; if not, the test cannot run here.
+    bool isInForce() const
+    {
+        return m_isInForce;
+    }
+
+private:
+    bool m_wasAdministrator = false;
+    bool m_changed = false;
+    bool m_isInForce = false;
+};
 
 /// Lifts the limit of limitFileSize() again.
 inline bool unlimitFileSize()

@@ -4,8 +4,8 @@
 #include "common/xml/TorkXmlFile.h"
 #include "common/xml/TorkXmlStream.h"
 
-#include "support/MessageCapture.h"
 #include "support/TestFiles.h"
+#include "xml/BothWriters.h"
 #include "xml/VirtualSlot.h"
 #include "xml/WriterSteps.h"
 
@@ -15,11 +15,10 @@
 #include <QXmlSimpleReader>
 #include <QtTest>
 
-#include <cstdio>
-#include <functional>
 #include <limits>
-#include <memory>
 #include <type_traits>
+
+using namespace BothWriters;
 
 // Most rows run on both writers, for they share their operations but no class: what holds for one
 // and not the other is a fault.
@@ -27,11 +26,6 @@
 namespace {
 
 enum class WriterKind { Stream, File };
-
-QString Repeated(QChar character, int count)
-{
-    return QString(count, character);
-}
 
 // The attribute text name="value" is four characters longer than its value when the name has one.
 QString ValueForAttributeOf(int length)
@@ -153,38 +147,6 @@ public:
     }
 };
 
-// Takes whole blocks until one of them, counted from 1, and everything after it is refused.
-class BrokenDevice : public QIODevice
-{
-public:
-    explicit BrokenDevice(int failAt) : m_failAt(failAt) { open(QIODevice::WriteOnly); }
-
-    QByteArray const& Taken() const { return m_taken; }
-
-protected:
-    qint64 readData(char*, qint64) override { return -1; }
-
-    qint64 writeData(char const* data, qint64 size) override
-    {
-        if (++m_count >= m_failAt)
-            return -1;
-
-        m_taken.append(data, static_cast<int>(size));
-        return size;
-    }
-
-private:
-    QByteArray m_taken;
-    int m_failAt;
-    int m_count = 0;
-};
-
-struct Outcome
-{
-    QVector<int> codes;
-    QByteArray text;
-};
-
 Outcome WrittenByStream(Steps const& steps)
 {
     Outcome outcome;
@@ -194,24 +156,6 @@ Outcome WrittenByStream(Steps const& steps)
     writer.setCodec("UTF-8");
     outcome.codes = Perform(writer, steps);
     writer.flush();
-    return outcome;
-}
-
-Outcome WrittenByFile(Steps const& steps)
-{
-    Outcome outcome;
-    const QTemporaryDir dir;
-    const QString name = dir.filePath("out.xml");
-    {
-        TorkXmlFile writer(name);
-        if (!writer.open(QIODevice::WriteOnly))
-            qFatal("%s: %s", qPrintable(name), qPrintable(writer.errorString()));
-        writer.setCodec("UTF-8"); // a new device, as at open, has the locale's codec again
-        outcome.codes = Perform(writer, steps);
-        writer.flush();
-        writer.close();
-    }
-    outcome.text = TestFiles::read(name);
     return outcome;
 }
 
@@ -255,7 +199,6 @@ QString NestedText(int levels)
         text += Repeated(' ', 2 * level) + "</e>\n";
     return text;
 }
-
 // Compile-time: the operations every application of the family overrides or calls.
 template <class Writer>
 constexpr bool HasWriterBases()
@@ -300,17 +243,8 @@ private slots:
     void writeResult_data();
     void writeResult();
 
-    void constructors_data();
-    void constructors();
     void paddingOfPieces_data();
     void paddingOfPieces();
-    void streamWithoutDevice();
-    void streamTakesADeviceLater();
-    void destroyedStreamLeavesItsTextOnTheDevice();
-    void failingDevice_data();
-    void failingDevice();
-    void failingDeviceDuringWrite();
-    void readOnlyDevice();
 
     void basesStandInOrder();
     void isAnInputSource();
@@ -860,115 +794,6 @@ void tst_TorkXmlWriters::writeResult()
     QCOMPARE(TestFiles::read(file.name()), text.toUtf8());
 }
 
-using TextOfConstructor = std::function<QByteArray(Steps const&)>;
-Q_DECLARE_METATYPE(TextOfConstructor)
-
-void tst_TorkXmlWriters::constructors_data()
-{
-    QTest::addColumn<TextOfConstructor>("written");
-    QTest::addColumn<QByteArray>("before");
-
-    QTest::newRow("stream on a device") << TextOfConstructor([](Steps const& steps) {
-        QBuffer device;
-        device.open(QIODevice::WriteOnly);
-        TorkXmlStream writer(&device);
-        if (writer.device() != &device)
-            return QByteArray("another device");
-        Perform(writer, steps);
-        writer.flush();
-        return device.data();
-    }) << QByteArray();
-    QTest::newRow("stream without a device, set later")
-        << TextOfConstructor([](Steps const& steps) {
-               QBuffer device;
-               device.open(QIODevice::WriteOnly);
-               TorkXmlStream writer;
-               if (writer.device() || writer.string())
-                   return QByteArray("a device from nowhere");
-               writer.setDevice(&device);
-               Perform(writer, steps);
-               writer.flush();
-               return device.data();
-           })
-        << QByteArray();
-    QTest::newRow("stream on a string") << TextOfConstructor([](Steps const& steps) {
-        QString text;
-        TorkXmlStream writer(&text, QIODevice::WriteOnly);
-        if (writer.string() != &text)
-            return QByteArray("another string");
-        Perform(writer, steps);
-        return text.toUtf8();
-    }) << QByteArray();
-    QTest::newRow("stream on a string in both directions")
-        << TextOfConstructor([](Steps const& steps) {
-               QString text;
-               TorkXmlStream writer(&text, QIODevice::ReadWrite);
-               Perform(writer, steps);
-               return text.toUtf8();
-           })
-        << QByteArray();
-    QTest::newRow("stream on a byte array") << TextOfConstructor([](Steps const& steps) {
-        QByteArray text;
-        TorkXmlStream writer(&text, QIODevice::WriteOnly);
-        Perform(writer, steps);
-        writer.flush();
-        return text;
-    }) << QByteArray();
-    QTest::newRow("stream on a byte array, appending") << TextOfConstructor([](Steps const& steps) {
-        QByteArray text("before\n");
-        TorkXmlStream writer(&text, QIODevice::Append);
-        Perform(writer, steps);
-        writer.flush();
-        return text;
-    }) << QByteArray("before\n");
-    QTest::newRow("stream on a byte array, truncating")
-        << TextOfConstructor([](Steps const& steps) {
-               QByteArray text("before\n");
-               TorkXmlStream writer(&text, QIODevice::WriteOnly | QIODevice::Truncate);
-               Perform(writer, steps);
-               writer.flush();
-               return text;
-           })
-        << QByteArray();
-    QTest::newRow("stream on a C file") << TextOfConstructor([](Steps const& steps) {
-        std::FILE* const file = std::tmpfile();
-        if (!file)
-            return QByteArray("no temporary file");
-        {
-            TorkXmlStream writer(file, QIODevice::WriteOnly);
-            Perform(writer, steps);
-        }
-        std::rewind(file);
-        QByteArray text(4096, '\0');
-        text.resize(static_cast<int>(std::fread(text.data(), 1, 4096, file)));
-        std::fclose(file);
-        return text;
-    }) << QByteArray();
-    QTest::newRow("file with a name")
-        << TextOfConstructor([](Steps const& steps) { return WrittenByFile(steps).text; })
-        << QByteArray();
-    QTest::newRow("file without a name, named later") << TextOfConstructor([](Steps const& steps) {
-        const QTemporaryDir dir;
-        TorkXmlFile writer;
-        writer.setName(dir.filePath("out.xml"));
-        if (!writer.open(QIODevice::WriteOnly))
-            return writer.errorString().toUtf8();
-        Perform(writer, steps);
-        writer.flush();
-        return TestFiles::read(writer.name());
-    }) << QByteArray();
-}
-
-void tst_TorkXmlWriters::constructors()
-{
-    QFETCH(TextOfConstructor, written);
-    QFETCH(QByteArray, before);
-
-    // Nothing pending, level 0 and a unit of two blanks, whatever the constructor.
-    const Steps steps{Close("none", 0), Indent(), Start("a"), Element("b", "1"), End("a")};
-    QCOMPARE(written(steps), before + ">\n<a>\n  <b>1</b>\n</a>\n");
-}
-
 void tst_TorkXmlWriters::paddingOfPieces_data()
 {
     QTest::addColumn<int>("width");
@@ -991,120 +816,6 @@ void tst_TorkXmlWriters::paddingOfPieces()
         Perform(writer, Steps{Start("a"), Element("b", "1"), End("a")});
     }
     QTEST(bytes, "expected");
-}
-
-void tst_TorkXmlWriters::streamWithoutDevice()
-{
-    const Steps steps{Start("a"), Element("b", "1"), Open("c"), Attribute("x", "1"), Close("c", 0),
-                      End("c"),   End("a"),          Open("d"), CloseAndEnd("d")};
-    QVector<int> codes;
-    int length = -1;
-    {
-        // The toolkit tells of every piece that finds no device; how often is its business.
-        MessageCapture quiet;
-        TorkXmlStream writer;
-        codes = Perform(writer, steps);
-        length = writer.Write("text");
-    }
-    QCOMPARE(codes, ExpectedCodes(steps));
-    QCOMPARE(length, 4);
-}
-
-void tst_TorkXmlWriters::streamTakesADeviceLater()
-{
-    QBuffer device;
-    device.open(QIODevice::WriteOnly);
-    {
-        MessageCapture quiet;
-        TorkXmlStream writer;
-        QCOMPARE(writer.WriteElementStart("lost", 1), 0);
-        QCOMPARE(writer.WriteElementOpen("lost", 1), 0);
-        QCOMPARE(writer.WriteAttribute("a", "1"), 0);
-        writer.setDevice(&device);
-        QCOMPARE(writer.WriteElementClose("lost", 1), 0);
-        QCOMPARE(writer.WriteElement("kept", "1"), 0);
-    }
-    // The level and the attributes belong to the writer, not to its device.
-    QCOMPARE(device.data(), QByteArray(" a=\"1\">\n  <kept>1</kept>\n"));
-}
-
-void tst_TorkXmlWriters::destroyedStreamLeavesItsTextOnTheDevice()
-{
-    QBuffer device;
-    device.open(QIODevice::WriteOnly);
-    QTextStream* const writer = new TorkXmlStream(&device);
-    static_cast<TorkXmlStream*>(writer)->WriteElement("a", "1");
-
-    delete writer;
-
-    QCOMPARE(device.data(), QByteArray("<a>1</a>\n"));
-}
-
-void tst_TorkXmlWriters::failingDevice_data()
-{
-    QTest::addColumn<int>("failAt");
-    QTest::addColumn<QByteArray>("taken");
-
-    QTest::newRow("first write") << 1 << QByteArray();
-    QTest::newRow("second write") << 2 << QByteArray("<a>\n");
-    QTest::newRow("third write") << 3 << QByteArray("<a>\n  <b  x=\"1\">\n");
-}
-
-void tst_TorkXmlWriters::failingDevice()
-{
-    QFETCH(int, failAt);
-    QFETCH(QByteArray, taken);
-
-    BrokenDevice device(failAt);
-    TorkXmlStream writer(&device);
-    // A write to the device at each flush. The codes tell of Write() alone, and Write() tells how
-    // much it was given: a caller learns of the device from the text stream's status.
-    QCOMPARE(writer.WriteElementStart("a", 1), 0);
-    writer.flush();
-    QCOMPARE(writer.status() == QTextStream::WriteFailed, failAt <= 1);
-    QCOMPARE(writer.WriteElementOpen("b", 1), 0);
-    QCOMPARE(writer.WriteAttribute("x", "1"), 0);
-    QCOMPARE(writer.WriteElementClose("b", 0), 0);
-    writer.flush();
-    QCOMPARE(writer.status() == QTextStream::WriteFailed, failAt <= 2);
-    QCOMPARE(writer.WriteElement("c", "1"), 0);
-    QCOMPARE(writer.WriteElementEnd("b", 1), 0);
-    writer.flush();
-    QCOMPARE(writer.status(), QTextStream::WriteFailed);
-    QCOMPARE(writer.WriteElementEnd("a", 1), 0);
-    QCOMPARE(writer.Write("text"), 4);
-
-    QCOMPARE(device.Taken(), taken);
-}
-
-void tst_TorkXmlWriters::failingDeviceDuringWrite()
-{
-    BrokenDevice device(1);
-    TorkXmlStream writer(&device);
-
-    // More than the text stream holds back, so the device is asked, and refuses, at once.
-    const QString text = Repeated('x', 100000);
-    QCOMPARE(writer.WriteElement("a", text), 0);
-    QCOMPARE(writer.Write(text), text.size());
-
-    QCOMPARE(writer.status(), QTextStream::WriteFailed);
-    QCOMPARE(device.Taken(), QByteArray());
-}
-
-void tst_TorkXmlWriters::readOnlyDevice()
-{
-    QByteArray content("before");
-    QVector<int> codes;
-    const Steps steps{Start("a"), Element("b", "1"), End("a")};
-    {
-        MessageCapture quiet; // the toolkit's, of a device that is only to be read
-        QBuffer device(&content);
-        device.open(QIODevice::ReadOnly);
-        TorkXmlStream writer(&device);
-        codes = Perform(writer, steps);
-    }
-    QCOMPARE(codes, ExpectedCodes(steps));
-    QCOMPARE(content, QByteArray("before"));
 }
 
 template <class Writer>
@@ -1167,4 +878,5 @@ void tst_TorkXmlWriters::slotsStandInOrder()
 }
 
 QTEST_GUILESS_MAIN(tst_TorkXmlWriters)
+
 #include "tst_TorkXmlWriters.moc"

@@ -1,0 +1,437 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// The window on a real screen, driven with keys and mouse.
+
+#include "WindowParts.h"
+
+#include "app/window/log/LogModel.h"
+#include "app/window/log/LogSettingsDialog.h"
+#include "app/window/log/LogView.h"
+
+#include <QAbstractButton>
+#include <QCheckBox>
+#include <QClipboard>
+#include <QComboBox>
+#include <QDialogButtonBox>
+#include <QLabel>
+#include <QLineEdit>
+#include <QLoggingCategory>
+#include <QMenuBar>
+#include <QPlainTextEdit>
+#include <QPushButton>
+#include <QScrollBar>
+#include <QSpinBox>
+#include <QStatusBar>
+#include <QToolButton>
+
+using namespace Velocor;
+using namespace WindowParts;
+
+using DemoLog::entry;
+using DemoLog::run;
+using DemoLog::writtenOver;
+
+namespace {
+
+QPoint RowCentre(LogView* view, int row)
+{
+    return view->visualRect(view->model()->index(row, LogModel::MessageColumn)).center();
+}
+
+// Choice boxes react to the box, not to all of the widget's area.
+void ClickBox(QCheckBox* box)
+{
+    QTest::mouseClick(box, Qt::LeftButton, Qt::NoModifier, QPoint(8, box->height() / 2));
+}
+
+} // namespace
+
+class tst_LogInWindow : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void initTestCase();
+    void cleanup();
+
+    void showsTheLog();
+    void followsTheLog();
+    void followsUntilScrolled();
+    void filterByText();
+    void filterByExpression();
+    void filterBySeverity();
+    void pauses();
+    void copiesLines();
+    void copiesFromTheMenu();
+    void problems();
+    void currentLine();
+    void olderFiles();
+    void earlierRuns();
+    void keepsItsPlace();
+
+    void logSettings();
+    void logSettingsRefused();
+
+    void logSwitchedOff();
+};
+
+void tst_LogInWindow::initTestCase()
+{
+    // Where a window goes while the X11 plugin asks about it, that warns, over a test's log. The
+    // environment would come too late for it: it was read with the application object.
+    QLoggingCategory::setFilterRules("qt.qpa.*=false");
+}
+
+void tst_LogInWindow::cleanup()
+{
+    const QWidgetList windows = QApplication::topLevelWidgets();
+    for (QWidget* window : windows)
+        window->hide();
+    QGuiApplication::clipboard()->clear();
+}
+
+void tst_LogInWindow::showsTheLog()
+{
+    const WindowTest test(
+        writtenOver(run(9, QTime(17, 0), "older", true), run(4, QTime(9, 0), "newer")));
+    const auto window = WindowTest::show();
+    QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) > 4, Patience);
+    LogModel* model = Panel(*window)->model();
+    QCOMPARE(model->index(0, 0).data().toString(), QString("Earlier"));
+    QCOMPARE(model->index(model->rowCount() - 5, 0).data().toString(), QString("This run"));
+    QCOMPARE(model->index(model->rowCount() - 1, 3).data().toString(), QString("newer 3"));
+    QCOMPARE(View(*window)->columnSpan(0, 0), int(LogModel::ColumnCount));
+    QVERIFY(View(*window)->isColumnHidden(LogModel::ElapsedColumn));
+}
+
+void tst_LogInWindow::followsTheLog()
+{
+    const WindowTest test(run(200, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 200, Patience);
+    LogView* view = View(*window);
+    QTRY_COMPARE(view->verticalScrollBar()->value(), view->verticalScrollBar()->maximum());
+    QVERIFY(TestFiles::write(test.logFile(), run(300, QTime(9, 0), "x")));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 300, Patience);
+    QCOMPARE(view->verticalScrollBar()->value(), view->verticalScrollBar()->maximum());
+    QVERIFY(view->visualRect(view->model()->index(299, 0)).isValid());
+}
+
+void tst_LogInWindow::followsUntilScrolled()
+{
+    const WindowTest test(run(200, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 200, Patience);
+    LogView* view = View(*window);
+    view->setFocus();
+    QTest::keyClick(view, Qt::Key_Home, Qt::ControlModifier);
+    QVERIFY(!Panel(*window)->isFollowing());
+    QVERIFY(!Action(*window, "Follow Newest")->isChecked());
+    const int place = view->verticalScrollBar()->value();
+    QVERIFY(TestFiles::write(test.logFile(), run(300, QTime(9, 0), "x")));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 300, Patience);
+    QCOMPARE(view->verticalScrollBar()->value(), place);
+
+    QTest::keyClick(view, Qt::Key_End, Qt::ControlModifier);
+    QVERIFY(Panel(*window)->isFollowing());
+    QTest::keyClick(view, Qt::Key_Home, Qt::ControlModifier);
+    QTest::keyClick(window.get(), Qt::Key_N, Qt::ControlModifier | Qt::ShiftModifier);
+    QVERIFY(Panel(*window)->isFollowing());
+    QCOMPARE(view->verticalScrollBar()->value(), view->verticalScrollBar()->maximum());
+}
+
+void tst_LogInWindow::filterByText()
+{
+    const WindowTest test(run(30, QTime(9, 0), "Entry"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 30, Patience);
+    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
+    QVERIFY(Child<QLineEdit>(window.get(), "Filter by text")->hasFocus());
+    QTest::keyClicks(QApplication::focusWidget(), "entry 2");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 11, Patience);
+    auto const* summary = Child<QLabel>(window.get(), "Lines shown");
+    QTRY_VERIFY2(summary->text().startsWith("11 of 30 lines"), qPrintable(summary->text()));
+
+    ClickBox(Child<QCheckBox>(window.get(), "Match case"));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 0, Patience);
+    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier | Qt::ShiftModifier);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 30, Patience);
+
+    // Marks are drawn in a colour that is nowhere else.
+    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
+    QTest::keyClicks(QApplication::focusWidget(), "Entry 7");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+    LogView* view = View(*window);
+    const auto yellowPixels = [&] {
+        const QImage image = view->viewport()->grab().toImage();
+        int count = 0;
+        for (int y = 0; y < image.height(); ++y) {
+            for (int x = 0; x < image.width(); ++x)
+                count += image.pixelColor(x, y) == QColor(0xff, 0xe0, 0x66) ? 1 : 0;
+        }
+        return count;
+    };
+    QTRY_VERIFY_WITH_TIMEOUT(yellowPixels() > 50, Patience);
+    Panel(*window)->ClearFilter();
+    QTRY_COMPARE_WITH_TIMEOUT(yellowPixels(), 0, Patience);
+}
+
+void tst_LogInWindow::filterByExpression()
+{
+    const WindowTest test(run(30, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 30, Patience);
+    ClickBox(Child<QCheckBox>(window.get(), "Regular expression"));
+    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
+    QTest::keyClicks(QApplication::focusWidget(), "x (3|4)$");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+
+    auto const* error = Child<QLabel>(window.get(), "Error in the filter");
+    QVERIFY(!error->isVisible());
+    QTest::keyClicks(QApplication::focusWidget(), "(");
+    QTRY_VERIFY(error->isVisible());
+    QVERIFY2(error->text().contains("at character"), qPrintable(error->text()));
+    QCOMPARE(Rows(*window), 2);
+    QTest::keyClick(QApplication::focusWidget(), Qt::Key_Backspace);
+    QTRY_VERIFY(!error->isVisible());
+}
+
+void tst_LogInWindow::filterBySeverity()
+{
+    const WindowTest test(entry("09:00:00.000", "Trace", "a") +
+                          entry("09:00:01.000", "Error", "b"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    Click(Child<QToolButton>(window.get(), "Show Trace"));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+    QTest::keyClick(window.get(), Qt::Key_4, Qt::ControlModifier);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 0, Patience);
+    QTest::keyClick(window.get(), Qt::Key_1, Qt::ControlModifier);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+}
+
+void tst_LogInWindow::pauses()
+{
+    const WindowTest test(run(2, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    QTest::keyClick(window.get(), Qt::Key_P, Qt::ControlModifier | Qt::ShiftModifier);
+    QVERIFY(Child<QLabel>(window.get(), "Lines shown")->text().endsWith("paused"));
+    QVERIFY(TestFiles::write(test.logFile(), run(5, QTime(9, 0), "x")));
+    QTest::qWait(4 * LogModel::PollInterval);
+    QCOMPARE(Rows(*window), 2);
+    QTest::keyClick(window.get(), Qt::Key_P, Qt::ControlModifier | Qt::ShiftModifier);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+}
+
+void tst_LogInWindow::copiesLines()
+{
+    const QByteArray log = run(20, QTime(9, 0), "x");
+    const WindowTest test(log);
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 20, Patience);
+    LogView* view = View(*window);
+    view->setFocus();
+    QTest::keyClick(view, Qt::Key_Home, Qt::ControlModifier);
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::NoModifier, RowCentre(view, 1));
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::ShiftModifier, RowCentre(view, 3));
+    QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
+    const QStringList lines = QString(log).split('\n');
+    QCOMPARE(QGuiApplication::clipboard()->text(),
+             QStringList({lines[1], lines[2], lines[3], ""}).join('\n'));
+
+    QTest::keyClick(view, Qt::Key_A, Qt::ControlModifier);
+    QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
+    QCOMPARE(QGuiApplication::clipboard()->text(), QString(log));
+    QCOMPARE(window->statusBar()->currentMessage(), QString("20 line(s) copied"));
+}
+
+// From the menu too, a text field in focus is meant before the log is.
+void tst_LogInWindow::copiesFromTheMenu()
+{
+    const QByteArray log = run(3, QTime(9, 0), "x");
+    const WindowTest test(log);
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
+    View(*window)->clearSelection();
+    window->setFocus();
+    Action(*window, "Copy")->trigger();
+    QCOMPARE(window->statusBar()->currentMessage(), QString("No line is selected"));
+    Action(*window, "Select All")->trigger();
+    Action(*window, "Copy")->trigger();
+    QCOMPARE(QGuiApplication::clipboard()->text(), QString(log));
+
+    QLineEdit field("text", window.get());
+    field.show();
+    field.setFocus();
+    Action(*window, "Select All")->trigger();
+    Action(*window, "Copy")->trigger();
+    QCOMPARE(QGuiApplication::clipboard()->text(), QString("text"));
+}
+
+void tst_LogInWindow::problems()
+{
+    const WindowTest test(
+        entry("09:00:00.000", "Trace", "a") + entry("09:00:01.000", "Error", "b") +
+        entry("09:00:02.000", "Trace", "c") + entry("09:00:03.000", "Warning", "d"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 4, Patience);
+    QTest::keyClick(window.get(), Qt::Key_F8);
+    QCOMPARE(View(*window)->currentIndex().row(), 1);
+    QTest::keyClick(window.get(), Qt::Key_F8);
+    QCOMPARE(View(*window)->currentIndex().row(), 3);
+    QTest::keyClick(window.get(), Qt::Key_F8);
+    QCOMPARE(View(*window)->currentIndex().row(), 3);
+    QCOMPARE(window->statusBar()->currentMessage(), QString("No further warning or error below"));
+    QTest::keyClick(window.get(), Qt::Key_F8, Qt::ShiftModifier);
+    QCOMPARE(View(*window)->currentIndex().row(), 1);
+    QTest::keyClick(window.get(), Qt::Key_F8, Qt::ShiftModifier);
+    QCOMPARE(window->statusBar()->currentMessage(), QString("No further warning or error above"));
+}
+
+void tst_LogInWindow::currentLine()
+{
+    const QString text(3000, 'y');
+    const WindowTest test(entry("09:00:00.000", "Trace", text + " end"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+    QTest::mouseClick(View(*window)->viewport(), Qt::LeftButton, Qt::NoModifier,
+                      RowCentre(View(*window), 0));
+    auto const* line = Child<QPlainTextEdit>(window.get(), "The current line in full");
+    QVERIFY(line->toPlainText().endsWith("yyy end"));
+}
+
+void tst_LogInWindow::olderFiles()
+{
+    const WindowTest test(run(2, QTime(9, 0), "x"));
+    QVERIFY(TestFiles::write(test.logFile() + ".1", run(7, QTime(8, 0), "one")));
+    QVERIFY(TestFiles::write(test.logFile() + ".2", run(9, QTime(7, 0), "two")));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    auto* files = Child<QComboBox>(window.get(), "Log file");
+    QVERIFY(files);
+    files->showPopup();
+    QCOMPARE(files->count(), 3);
+    QVERIFY2(files->itemText(1).startsWith("app.log.1 ("), qPrintable(files->itemText(1)));
+    QWidget* list = files->view();
+    QTest::keyClick(list, Qt::Key_Down);
+    QTest::keyClick(list, Qt::Key_Down);
+    QTest::keyClick(list, Qt::Key_Return);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 9, Patience);
+    QCOMPARE(Panel(*window)->path(), test.logFile() + ".2");
+    files->showPopup();
+    QTest::keyClick(list, Qt::Key_Home);
+    QTest::keyClick(list, Qt::Key_Return);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+}
+
+void tst_LogInWindow::earlierRuns()
+{
+    const WindowTest test(
+        writtenOver(run(9, QTime(17, 0), "older", true), run(4, QTime(9, 0), "newer")));
+    const auto window = WindowTest::show();
+    QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) > 4, Patience);
+    QTest::keyClick(window.get(), Qt::Key_E, Qt::ControlModifier | Qt::ShiftModifier);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 4, Patience);
+    QTest::keyClick(window.get(), Qt::Key_E, Qt::ControlModifier | Qt::ShiftModifier);
+    QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) > 4, Patience);
+}
+
+// The newest run writes over the first rows of the earlier part; the rows in view and the selection
+// stay what they are.
+void tst_LogInWindow::keepsItsPlace()
+{
+    const QByteArray older = run(400, QTime(17, 0), "older", true);
+    const QByteArray newer = run(100, QTime(9, 0), "newer");
+    const int half = newer.indexOf("newer 50") + 9;
+    const WindowTest test(writtenOver(older, newer.left(half)));
+    const auto window = WindowTest::show();
+    QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) > 300, Patience);
+    LogView* view = View(*window);
+    view->verticalScrollBar()->setValue(200);
+    QVERIFY(!Panel(*window)->isFollowing());
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::NoModifier,
+                      RowCentre(view, view->rowAt(0) + 2));
+    const auto texts = [&] {
+        return QStringList({view->model()->index(view->rowAt(0), 3).data().toString(),
+                            view->model()->index(view->currentIndex().row(), 3).data().toString(),
+                            view->model()
+                                ->index(view->selectionModel()->selectedRows().value(0).row(), 3)
+                                .data()
+                                .toString()});
+    };
+    const QStringList before = texts();
+    QCOMPARE(before[1], before[2]);
+
+    QFile file(test.logFile());
+    QVERIFY(file.open(QIODevice::ReadWrite));
+    QVERIFY(file.seek(half));
+    file.write(newer.mid(half));
+    file.close();
+    QTRY_COMPARE_WITH_TIMEOUT(view->model()->index(Rows(*window) - 1, 3).data().toString(),
+                              QString("newer 99"), Patience);
+    QCOMPARE(texts(), before);
+}
+
+void tst_LogInWindow::logSettings()
+{
+    const WindowTest test(run(1, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    WindowTest::whenShown<LogSettingsDialog>([&](LogSettingsDialog* dialog) {
+        Child<QSpinBox>(dialog, "Older files kept")->setValue(5);
+        const QList<QCheckBox*> boxes = dialog->findChildren<QCheckBox*>();
+        for (QCheckBox* box : boxes) {
+            if (box->text().contains("time since"))
+                ClickBox(box);
+        }
+        auto* format = Child<QLineEdit>(dialog, "Date format");
+        format->selectAll();
+        QTest::keyClicks(format, "'at' hh:mm");
+        QVERIFY(Child<QLabel>(dialog, "Sample of an entry")->text().startsWith("at "));
+        QVERIFY(Child<QLabel>(dialog, "Sample of an entry")->text().contains("dT:[250]"));
+        QTest::keyClick(format, Qt::Key_Return);
+    });
+    QTest::keyClick(window.get(), Qt::Key_Comma, Qt::ControlModifier);
+    QCOMPARE(TorkLog::logger()->maxLogFiles(), 5U);
+    QVERIFY(TorkLog::logger()->logElapsedTime());
+    const QByteArray file = TestFiles::read(test.folder() + "data/logs/logsettings.cfg");
+    QVERIFY2(file.contains("<dateTimeFormat><![CDATA['at' hh:mm]]></dateTimeFormat>"), file);
+    QVERIFY2(file.contains("<maxLogFiles>5</maxLogFiles>"), file);
+    QVERIFY2(file.contains("<logElapsedTime>yes</logElapsedTime>"), file);
+    QVERIFY2(file.contains("<maxLogFileSize>1000000</maxLogFileSize>"), file);
+}
+
+void tst_LogInWindow::logSettingsRefused()
+{
+    const WindowTest test;
+    const QByteArray before = TestFiles::read(test.folder() + "data/logs/logsettings.cfg");
+    LogSettingsDialog dialog;
+    dialog.show();
+    QAbstractButton* ok = dialog.findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Ok);
+    QVERIFY(ok->isEnabled());
+    for (char const* bad : {"", "a/b", "..", "\xC3\xA4"}) {
+        Child<QLineEdit>(&dialog, "Name of the log files")->setText(QString::fromUtf8(bad));
+        QVERIFY2(!ok->isEnabled(), bad);
+        dialog.accept();
+        QVERIFY(dialog.isVisible());
+    }
+    QVERIFY(!Child<QLabel>(&dialog, "Problem with the settings")->text().isEmpty());
+    dialog.reject();
+    QCOMPARE(TestFiles::read(test.folder() + "data/logs/logsettings.cfg"), before);
+}
+
+void tst_LogInWindow::logSwitchedOff()
+{
+    const WindowTest test;
+    TorkLog::logger()->setEnable(false);
+    const auto window = WindowTest::show();
+    auto const* state = Child<QLabel>(window.get(), "State of the log");
+    QTRY_COMPARE_WITH_TIMEOUT(state->text(), QString("The log is switched off"), Patience);
+    TorkLog::logger()->setEnable(true);
+    QTRY_COMPARE_WITH_TIMEOUT(state->text(), QString(), Patience);
+}
+
+QTEST_MAIN(tst_LogInWindow)
+
+#include "tst_LogInWindow.moc"
