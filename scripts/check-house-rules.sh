@@ -54,6 +54,21 @@ machine_paths() {
         "$start/((home|Users)/(?!ada/)$name/$name|(root|wo""rk|workspace)/$name)|/tmp/[a-z]*_jo""bs"
 }
 
+# Between "Q_SIGNALS:" and the next access specifier or the end of the class.
+capital_signals() {
+    local file
+    while IFS= read -r -d '' file; do
+        awk -v file="$file" '/^ *(Q_SIGNALS:|signals:)/ { inside = 1; next }
+            /^ *(public|protected|private)( Q_SLOTS| slots)?:|^};/ { inside = 0 }
+            inside && /^ *void [A-Z]/ { print file ":" FNR ":" $0 }' "$file"
+    done < <(tracked 'app/*.h' 'common/*.h')
+}
+
+qt_keywords() {
+    tracked 'app/*.cpp' 'app/*.h' 'common/*.cpp' 'common/*.h' |
+        search -nHE '^\s*(signals|(public|protected|private) slots):|\bemit [A-Za-z]'
+}
+
 # The rooms below the window could include the headers of widgets through the framework.
 widgets_below_the_window() {
     tracked 'app/logfile/*' 'app/settingsfile/*' 'app/runninglog/*' |
@@ -101,6 +116,8 @@ rule "a header without #pragma once" without_pragma_once
 rule "a tab, or blanks at a line's end" stray_blanks
 rule "a path of one machine" machine_paths
 rule "not as drawn in docs/architecture.md" scripts/check-rooms.py
+rule "a signal that begins with a capital letter" capital_signals
+rule "a keyword of Qt where Q_SIGNALS, Q_SLOTS or Q_EMIT belongs" qt_keywords
 rule "a widget below the window" widgets_below_the_window
 rule "a tool tip that does not come from PlainToolTip()" bare_tool_tips
 rule "a widget that guesses whether its text is rich; see app/window/PlainText.h" guessing_widgets

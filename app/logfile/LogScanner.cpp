@@ -118,7 +118,7 @@ bool LogScanner::readFrom(QFile& file, qint64 offset)
         const int percent = size > 0 ? static_cast<int>(file.pos() * 100 / size) : 100;
         if (percent >= told + 10) {
             told = percent;
-            Q_EMIT Progressed(m_request, percent);
+            Q_EMIT progressed(m_request, percent);
         }
     }
     m_index.End();
@@ -156,7 +156,7 @@ bool LogScanner::looksUnchanged() const
 void LogScanner::Poll()
 {
     if (m_path.isEmpty() || !isWanted() || (m_complete && looksUnchanged())) {
-        Q_EMIT Polled();
+        Q_EMIT polled();
         return;
     }
 
@@ -172,7 +172,7 @@ void LogScanner::Poll()
         if (readFrom(file, m_index.Begin()))
             tell(false);
     }
-    Q_EMIT Polled();
+    Q_EMIT polled();
 }
 
 void LogScanner::tell(bool isReset)
@@ -191,7 +191,7 @@ void LogScanner::tell(bool isReset)
     update.lines = m_index.size();
     update.hasElapsed = m_index.hasElapsed();
     if (!nothingNew)
-        Q_EMIT Updated(update);
+        Q_EMIT updated(update);
 }
 
 } // namespace Velocor

@@ -39,16 +39,16 @@ public Q_SLOTS:
     void Open(int request, QString const& path, Velocor::LogLineParser const& parser,
               Velocor::LogFilter const& filter);
 
-    /// Looks for changes and reads them. Always answers with Polled().
+    /// Looks for changes and reads them. Always answers with polled().
     void Poll();
 
     /// Shows other rows of the same file.
     void SetFilter(int request, Velocor::LogFilter const& filter);
 
 Q_SIGNALS:
-    void Updated(Velocor::LogUpdate const& update);
-    void Progressed(int request, int percent);
-    void Polled();
+    void updated(Velocor::LogUpdate const& update);
+    void progressed(int request, int percent);
+    void polled();
 
 private:
     bool isWanted() const { return m_wanted == m_request; }

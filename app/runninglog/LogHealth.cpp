@@ -22,11 +22,11 @@ LogHealth::~LogHealth() = default;
 
 QString LogHealth::Check()
 {
-    const QString problem = WritingProblem();
+    const QString problem = writingProblem();
     return problem.isEmpty() ? sharingProblem() : problem;
 }
 
-QString LogHealth::WritingProblem()
+QString LogHealth::writingProblem()
 {
     TorkLog* log = TorkLog::logger();
     if (!log)

@@ -25,7 +25,7 @@ public:
     QString Check();
 
 private:
-    static QString WritingProblem();
+    static QString writingProblem();
     QString sharingProblem();
 
     std::unique_ptr<InstanceList> m_instances;

@@ -41,7 +41,7 @@ FileTabs::FileTabs(QWidget* parent) : QTabWidget(parent)
     setAccessibleName(tr("Open files"));
     tabBar()->setAccessibleName(tr("Open files"));
     m_ownLog = addLog(tr("Log"), QString());
-    connect(this, &QTabWidget::currentChanged, this, &FileTabs::StateChanged);
+    connect(this, &QTabWidget::currentChanged, this, &FileTabs::stateChanged);
 }
 
 // The style's own close button is an image that dark palettes swallow.
@@ -62,8 +62,8 @@ LogPanel* FileTabs::addLog(QString const& title, QString const& path)
     auto* panel = new LogPanel;
     const QString name = path.isEmpty() ? title : QFileInfo(path).fileName();
     panel->setAccessibleName(name);
-    connect(panel, &LogPanel::StateChanged, this, &FileTabs::StateChanged);
-    connect(panel, &LogPanel::Said, this, &FileTabs::Said);
+    connect(panel, &LogPanel::stateChanged, this, &FileTabs::stateChanged);
+    connect(panel, &LogPanel::messageReported, this, &FileTabs::messageReported);
     if (!path.isEmpty())
         panel->Open(path, false);
     setTabToolTip(addTab(panel, title), PlainToolTip(path));
@@ -78,10 +78,10 @@ SettingsEditor* FileTabs::addEditor(QString const& title, QString const& path)
     const QString name = QFileInfo(path).fileName();
     editor->setAccessibleName(name);
     editor->Open(path);
-    connect(editor, &SettingsEditor::Said, this, &FileTabs::Said);
-    connect(editor, &SettingsEditor::ModifiedChanged, this, [this, editor, title](bool modified) {
+    connect(editor, &SettingsEditor::messageReported, this, &FileTabs::messageReported);
+    connect(editor, &SettingsEditor::modifiedChanged, this, [this, editor, title](bool modified) {
         setTabText(indexOf(editor), modified ? title + QLatin1String(" *") : title);
-        Q_EMIT StateChanged();
+        Q_EMIT stateChanged();
     });
     setTabToolTip(addTab(editor, title), PlainToolTip(path));
     addCloseButton(editor, name);
@@ -121,7 +121,7 @@ void FileTabs::OpenFile(QString const& path)
     }
     setCurrentIndex(position);
     widget(position)->setFocus();
-    Q_EMIT StateChanged();
+    Q_EMIT stateChanged();
 }
 
 void FileTabs::CloseCurrent()
@@ -139,7 +139,7 @@ void FileTabs::closeTab(int position)
         return;
     removeTab(position);
     page->deleteLater();
-    Q_EMIT StateChanged();
+    Q_EMIT stateChanged();
 }
 
 bool FileTabs::MayCloseAll()

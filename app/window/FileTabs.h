@@ -45,8 +45,8 @@ public:
 
 Q_SIGNALS:
     /// Another tab is current, or what the current one shows has changed.
-    void StateChanged();
-    void Said(QString const& text);
+    void stateChanged();
+    void messageReported(QString const& text);
 
 private:
     LogPanel* addLog(QString const& title, QString const& path);

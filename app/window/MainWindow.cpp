@@ -129,9 +129,9 @@ void MainWindow::makeTabs()
     m_tabs->show();
     m_splitter->setStretchFactor(1, 1);
     m_splitter->setSizes(sizes);
-    connect(m_places, &PlacesPanel::Said, this, &MainWindow::say);
-    connect(m_tabs, &FileTabs::Said, this, &MainWindow::say);
-    connect(m_tabs, &FileTabs::StateChanged, this, &MainWindow::updateState);
+    connect(m_places, &PlacesPanel::messageReported, this, &MainWindow::say);
+    connect(m_tabs, &FileTabs::messageReported, this, &MainWindow::say);
+    connect(m_tabs, &FileTabs::stateChanged, this, &MainWindow::updateState);
     m_tabs->ownLog()->setFocus();
 }
 
@@ -184,7 +184,7 @@ void MainWindow::makeFileMenu()
               [this] { chooseFile(); });
     m_recentMenu = menu->addMenu(tr("Open &Recent"));
     m_recent = new RecentFiles(m_recentMenu, this);
-    connect(m_recent, &RecentFiles::Chosen, this, &MainWindow::OpenFile);
+    connect(m_recent, &RecentFiles::fileChosen, this, &MainWindow::OpenFile);
     m_save = addAction(menu, tr("&Save"), QKeySequence::Save, tr("Save the settings file in front"),
                        [this] { m_tabs->currentEditor()->Save(); });
     m_close = addAction(menu, tr("&Close Tab"), QKeySequence::Close, tr("Close the file in front"),

@@ -126,14 +126,14 @@ bool PlacesPanel::OpenPlace(QString const& path)
 void PlacesPanel::openPlace(QString const& path)
 {
     if (!OpenPlace(path))
-        Q_EMIT Said(
+        Q_EMIT messageReported(
             tr("%1 cannot be shown: it is not there, or there is no file manager").arg(path));
 }
 
 void PlacesPanel::copy(QString const& caption, QString const& text)
 {
     QGuiApplication::clipboard()->setText(text);
-    Q_EMIT Said(tr("Copied: %1").arg(caption));
+    Q_EMIT messageReported(tr("Copied: %1").arg(caption));
 }
 
 } // namespace Velocor

@@ -31,7 +31,7 @@ public:
 
 Q_SIGNALS:
     /// A button could not do its work, or has done it.
-    void Said(QString const& text);
+    void messageReported(QString const& text);
 
 private:
     void addValue(QString const& caption, QString const& text, bool isPlace);

@@ -51,7 +51,7 @@ RecentFiles::RecentFiles(QMenu* menu, QObject* parent) : QObject(parent), m_menu
     connect(m_menu, &QMenu::triggered, this, [this](QAction* action) {
         const QString path = action->data().toString();
         if (!path.isEmpty())
-            Q_EMIT Chosen(path);
+            Q_EMIT fileChosen(path);
     });
     fillMenu();
 }

@@ -14,7 +14,7 @@ namespace Velocor {
 ///
 ///     RecentFiles recent(menu);
 ///     recent.SetList(settings.Text("recentFiles"));
-///     connect(&recent, &RecentFiles::Chosen, this, &MainWindow::openFile);
+///     connect(&recent, &RecentFiles::fileChosen, this, &MainWindow::openFile);
 class RecentFiles : public QObject
 {
     Q_OBJECT
@@ -42,7 +42,7 @@ public:
 
 Q_SIGNALS:
     /// A file was chosen in the menu.
-    void Chosen(QString const& path);
+    void fileChosen(QString const& path);
 
 private:
     void fillMenu();

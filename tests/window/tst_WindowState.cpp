@@ -269,7 +269,7 @@ void tst_WindowState::recentMenu()
     QVERIFY(actions[2]->isSeparator());
     QCOMPARE(actions[3]->text(), QString("&Clear"));
 
-    QSignalSpy chosen(&recent, &RecentFiles::Chosen);
+    QSignalSpy chosen(&recent, &RecentFiles::fileChosen);
     actions[0]->trigger();
     QCOMPARE(chosen.count(), 1);
     QCOMPARE(chosen[0][0].toString(), QString("/one/a&b.log"));

@@ -64,7 +64,7 @@ void LogDelegate::paint(QPainter* painter, QStyleOptionViewItem const& option,
     QStyleOptionViewItem cell = option;
     initStyleOption(&cell, index);
     if (index.data(LogModel::HeadingRole).toBool()) {
-        PaintHeading(painter, cell);
+        paintHeading(painter, cell);
         return;
     }
 
@@ -78,7 +78,7 @@ void LogDelegate::paint(QPainter* painter, QStyleOptionViewItem const& option,
         paintMarked(painter, cell, ranges);
 }
 
-void LogDelegate::PaintHeading(QPainter* painter, QStyleOptionViewItem const& option)
+void LogDelegate::paintHeading(QPainter* painter, QStyleOptionViewItem const& option)
 {
     const QColor text = option.palette.color(QPalette::Text);
     const QColor background = Mixed(option.palette.color(QPalette::Base), text, 0.14);

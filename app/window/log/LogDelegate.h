@@ -30,7 +30,7 @@ protected:
 private:
     void paintMarked(QPainter* painter, QStyleOptionViewItem const& option,
                      QVector<QPair<int, int>> const& ranges) const;
-    static void PaintHeading(QPainter* painter, QStyleOptionViewItem const& option);
+    static void paintHeading(QPainter* painter, QStyleOptionViewItem const& option);
 
     LogFilter m_filter;
 };

@@ -123,7 +123,7 @@ void LogFilterBar::Clear()
 void LogFilterBar::SetEarlierRuns(bool shown)
 {
     m_filter.SetEarlierRuns(shown);
-    Q_EMIT Changed();
+    Q_EMIT filterChanged();
 }
 
 void LogFilterBar::apply()
@@ -139,7 +139,7 @@ void LogFilterBar::apply()
     m_error->setText(tr("Not a valid expression: %1").arg(error));
     m_error->setVisible(!error.isEmpty());
     m_filter.SetText(m_text->text(), isExpression, m_case->isChecked());
-    Q_EMIT Changed();
+    Q_EMIT filterChanged();
 }
 
 } // namespace Velocor

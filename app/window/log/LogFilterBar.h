@@ -35,7 +35,7 @@ public:
     void SetEarlierRuns(bool shown);
 
 Q_SIGNALS:
-    void Changed();
+    void filterChanged();
 
 protected:
     void changeEvent(QEvent* event) override;

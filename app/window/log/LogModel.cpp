@@ -56,11 +56,11 @@ void LogModel::startScanner()
     connect(this, &LogModel::openWanted, m_scanner, &LogScanner::Open);
     connect(this, &LogModel::filterWanted, m_scanner, &LogScanner::SetFilter);
     connect(this, &LogModel::pollWanted, m_scanner, &LogScanner::Poll);
-    connect(m_scanner, &LogScanner::Updated, this, &LogModel::take);
-    connect(m_scanner, &LogScanner::Polled, this, [this] { m_polling = false; });
-    connect(m_scanner, &LogScanner::Progressed, this, [this](int request, int percent) {
+    connect(m_scanner, &LogScanner::updated, this, &LogModel::take);
+    connect(m_scanner, &LogScanner::polled, this, [this] { m_polling = false; });
+    connect(m_scanner, &LogScanner::progressed, this, [this](int request, int percent) {
         if (request == m_request && m_reading)
-            Q_EMIT Progressed(percent);
+            Q_EMIT progressed(percent);
     });
     m_thread.start();
 }
@@ -126,8 +126,8 @@ void LogModel::take(LogUpdate const& update)
     else if (!m_paused)
         applyChange(update);
     if (wasReading)
-        Q_EMIT Progressed(100);
-    Q_EMIT Refreshed();
+        Q_EMIT progressed(100);
+    Q_EMIT refreshed();
 }
 
 void LogModel::reset(LogUpdate const& update)

@@ -86,10 +86,10 @@ public:
 
 Q_SIGNALS:
     /// The rows have been brought up to date.
-    void Refreshed();
+    void refreshed();
 
     /// Reading goes on; 100 when it is done.
-    void Progressed(int percent);
+    void progressed(int percent);
 
     // To the scanner's thread. A queued call finds its types by the names given here.
     void openWanted(int request, QString const& path, Velocor::LogLineParser const& parser,

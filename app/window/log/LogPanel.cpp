@@ -120,26 +120,26 @@ void LogPanel::connectAll()
     connect(m_files, QOverload<int>::of(&QComboBox::activated), this, &LogPanel::chooseFile);
     connect(m_pause, &QCheckBox::toggled, this, &LogPanel::SetPaused);
     connect(m_follow, &QCheckBox::toggled, this, &LogPanel::SetFollowing);
-    connect(m_filterBar, &LogFilterBar::Changed, this, [this] {
+    connect(m_filterBar, &LogFilterBar::filterChanged, this, [this] {
         m_model->SetFilter(m_filterBar->filter());
         m_view->UpdateMarks();
     });
-    connect(m_view, &LogView::FollowingChanged, this, [this](bool following) {
+    connect(m_view, &LogView::followingChanged, this, [this](bool following) {
         m_follow->setChecked(following);
-        Q_EMIT StateChanged();
+        Q_EMIT stateChanged();
     });
     connect(m_view->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
             &LogPanel::showCurrentLine);
-    connect(m_model, &LogModel::Refreshed, this, [this] {
+    connect(m_model, &LogModel::refreshed, this, [this] {
         updatePlaceholder();
         if (!m_view->currentIndex().isValid())
             showCurrentLine();
-        Q_EMIT StateChanged();
+        Q_EMIT stateChanged();
     });
-    connect(m_model, &LogModel::Progressed, this, [this](int percent) {
+    connect(m_model, &LogModel::progressed, this, [this](int percent) {
         m_percent = percent;
         updatePlaceholder();
-        Q_EMIT StateChanged();
+        Q_EMIT stateChanged();
     });
 }
 
@@ -192,7 +192,7 @@ void LogPanel::SetPaused(bool paused)
 {
     m_model->SetPaused(paused);
     m_pause->setChecked(paused);
-    Q_EMIT StateChanged();
+    Q_EMIT stateChanged();
 }
 
 bool LogPanel::isPaused() const
@@ -235,11 +235,12 @@ void LogPanel::CopySelected()
 {
     const int count = m_view->CopySelected();
     if (count == 0)
-        Q_EMIT Said(tr("No line is selected"));
+        Q_EMIT messageReported(tr("No line is selected"));
     else if (count >= LogView::MostCopied)
-        Q_EMIT Said(tr("The first %L1 of the selected lines have been copied").arg(count));
+        Q_EMIT messageReported(
+            tr("The first %L1 of the selected lines have been copied").arg(count));
     else
-        Q_EMIT Said(tr("%Ln line(s) copied", nullptr, count));
+        Q_EMIT messageReported(tr("%Ln line(s) copied", nullptr, count));
 }
 
 void LogPanel::SelectAll()
@@ -253,8 +254,8 @@ void LogPanel::GoToProblem(int step)
         m_view->setFocus();
         return;
     }
-    Q_EMIT Said(step > 0 ? tr("No further warning or error below")
-                         : tr("No further warning or error above"));
+    Q_EMIT messageReported(step > 0 ? tr("No further warning or error below")
+                                    : tr("No further warning or error above"));
 }
 
 QString LogPanel::path() const

@@ -71,10 +71,10 @@ public:
 
 Q_SIGNALS:
     /// Something that the window's actions or its status line show has changed.
-    void StateChanged();
+    void stateChanged();
 
     /// Something to be told in passing.
-    void Said(QString const& text);
+    void messageReported(QString const& text);
 
 private:
     void makeControls();

@@ -28,7 +28,7 @@ LogView::LogView(LogModel* model, QWidget* parent)
     setModel(model);
     SetDefaultWidths();
     connect(verticalScrollBar(), &QScrollBar::valueChanged, this, &LogView::noteScrolled);
-    connect(model, &LogModel::Refreshed, this, &LogView::afterRefresh);
+    connect(model, &LogModel::refreshed, this, &LogView::afterRefresh);
 }
 
 void LogView::setUp()
@@ -92,7 +92,7 @@ void LogView::SetFollowing(bool following)
     if (following == m_following)
         return;
     m_following = following;
-    Q_EMIT FollowingChanged(following);
+    Q_EMIT followingChanged(following);
 }
 
 void LogView::noteScrolled(int value)

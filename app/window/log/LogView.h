@@ -48,7 +48,7 @@ public:
     static constexpr int MostCopied = 100000;
 
 Q_SIGNALS:
-    void FollowingChanged(bool following);
+    void followingChanged(bool following);
 
 protected:
     void paintEvent(QPaintEvent* event) override;

@@ -316,8 +316,8 @@ void SettingsEditor::checkNames(QTreeWidgetItem* item)
     QString name = FullText(item, 0);
     name.remove(QLatin1Char(' '));
     if (!SettingsFileWriter::IsName(name)) {
-        Q_EMIT Said(tr("\"%1\" is no name for a section or key: %2")
-                        .arg(Shortened(name, ShownOfLong), NameRole()));
+        Q_EMIT messageReported(tr("\"%1\" is no name for a section or key: %2")
+                                   .arg(Shortened(name, ShownOfLong), NameRole()));
         name = section ? QStringLiteral("key") : QStringLiteral("Section");
     }
     SetFullText(item, 0, QString());
@@ -361,7 +361,7 @@ void SettingsEditor::setModified(bool modified)
     if (modified == m_modified)
         return;
     m_modified = modified;
-    Q_EMIT ModifiedChanged(modified);
+    Q_EMIT modifiedChanged(modified);
 }
 
 SettingsDocument SettingsEditor::document() const
@@ -445,7 +445,7 @@ bool SettingsEditor::Save()
     m_fileLossCount = 0;
     m_notice->Dismiss();
     setModified(false);
-    Q_EMIT Said(tr("Saved %1").arg(QFileInfo(m_path).fileName()));
+    Q_EMIT messageReported(tr("Saved %1").arg(QFileInfo(m_path).fileName()));
     return true;
 }
 

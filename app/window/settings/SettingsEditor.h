@@ -54,8 +54,8 @@ public:
     SettingsDocument document() const;
 
 Q_SIGNALS:
-    void ModifiedChanged(bool modified);
-    void Said(QString const& text);
+    void modifiedChanged(bool modified);
+    void messageReported(QString const& text);
 
 private:
     QWidget* makeTreePage();

@@ -121,7 +121,7 @@ void tst_LogModel::init()
 void tst_LogModel::open(LogModel& model, QByteArray const& content)
 {
     QVERIFY(TestFiles::write(m_file, content));
-    QSignalSpy refreshed(&model, &LogModel::Refreshed);
+    QSignalSpy refreshed(&model, &LogModel::refreshed);
     model.Open(m_file, LogLineParser(), true);
     QTRY_VERIFY_WITH_TIMEOUT(refreshed.count() > 0, Patience);
 }
@@ -295,7 +295,7 @@ void tst_LogModel::changes()
 void tst_LogModel::missingFile()
 {
     LogModel model;
-    QSignalSpy refreshed(&model, &LogModel::Refreshed);
+    QSignalSpy refreshed(&model, &LogModel::refreshed);
     model.Open(m_file, LogLineParser(), true);
     QTRY_VERIFY_WITH_TIMEOUT(refreshed.count() > 0, Patience);
     QVERIFY(!model.state().exists);
@@ -327,7 +327,7 @@ void tst_LogModel::unreadableFile()
 void tst_LogModel::directory()
 {
     LogModel model;
-    QSignalSpy refreshed(&model, &LogModel::Refreshed);
+    QSignalSpy refreshed(&model, &LogModel::refreshed);
     model.Open(m_folder->path(), LogLineParser(), false);
     QTRY_VERIFY_WITH_TIMEOUT(refreshed.count() > 0, Patience);
     QCOMPARE(model.rowCount(), 0);
