@@ -3,16 +3,9 @@
 
 #pragma once
 
-#include <QString>
+#include "common/xml/TorkXmlResult.h"
 
-/// The result codes of the XML writers' operations.
-namespace TorkXmlResult {
-enum Code : int {
-    Success = 0,
-    EmptyName = 1005,   ///< the element or attribute name is empty
-    WriteFailed = 1006, ///< Write() reported a negative count
-};
-}
+#include <QString>
 
 /// Where an XML writer stands: what each of the two writers keeps between calls.
 struct TorkXmlLayout

@@ -24,6 +24,7 @@ set(expected
     include/tork/common/xml/TorkXmlFile.h
     include/tork/common/xml/TorkXmlGuard.h
     include/tork/common/xml/TorkXmlLayout.h
+    include/tork/common/xml/TorkXmlResult.h
     include/tork/common/xml/TorkXmlStream.h
     include/tork/common/xml/TorkXml_FlushUnknownElement.h
     include/tork/common/xml/TorkXml_ParseManager_Base.h

@@ -31,7 +31,7 @@ const char* const internalHeaders[] = {
     "ScreenlessPlatform.h", "StandardStreams.h", "TorkLogLock.h",   "TorkLogPlace.h",
     "TorkLogStamp.h",       "TorkOrderedHash.h", "TorkScreenFit.h", "TorkXmlFormat.h",
     "TorkXmlLayout.h",      "TorkXmlLexer.h",    "TorkXmlLimits.h", "TorkXmlPrefixes.h",
-    "XmlNesting.h"};
+    "TorkXmlResult.h",      "XmlNesting.h"};
 
 QString Source(QString const& path)
 {
