@@ -9,6 +9,7 @@
 #include "app/runninglog/RunningLog.h"
 #include "app/window/FileTabs.h"
 #include "app/window/PlacesPanel.h"
+#include "app/window/ProgramProperty.h"
 #include "app/window/RecentFiles.h"
 #include "app/window/ReportDialog.h"
 #include "app/window/SelectableMessageBoxes.h"
@@ -31,7 +32,6 @@
 #include <QStatusBar>
 #include <QUrl>
 #include <QVBoxLayout>
-#include <QVariant>
 
 // Resources of a static library have to be asked for, from outside of any namespace.
 static void InitResources()
@@ -48,11 +48,6 @@ constexpr int MessageTime = 6000;    // milliseconds
 constexpr int MostDropped = 20;
 constexpr int LongestMessage = 1000; // characters
 
-QString Property(char const* name)
-{
-    return QCoreApplication::instance()->property(name).toString();
-}
-
 QIcon WindowIcon()
 {
     QIcon icon;
@@ -64,10 +59,10 @@ QIcon WindowIcon()
 } // namespace
 
 MainWindow::MainWindow(QWidget* parent)
-    : QMainWindow(parent), m_settings(Property("DataPath")), m_splitter(new QSplitter),
+    : QMainWindow(parent), m_settings(ProgramProperty("DataPath")), m_splitter(new QSplitter),
       m_places(new PlacesPanel(m_settings.fileName()))
 {
-    setWindowTitle(Property("caption"));
+    setWindowTitle(ProgramProperty("caption"));
     setAcceptDrops(true);
     // Size limits are for the window manager. A platform without one says in the log that it cannot
     // pass them on.
@@ -358,7 +353,7 @@ void MainWindow::say(QString const& text)
 void MainWindow::chooseFile()
 {
     const QString path = QFileDialog::getOpenFileName(
-        this, tr("Open"), Property("DataPath"),
+        this, tr("Open"), ProgramProperty("DataPath"),
         tr("Logs and settings (*.log *.log.* *.cfg *.xml);;All files (*)"));
     if (!path.isEmpty())
         OpenFile(path);
@@ -386,8 +381,7 @@ void MainWindow::OpenFile(QString const& path)
 
 bool MainWindow::offerToForget(QString const& path)
 {
-    const QString list = QLatin1Char('|') + m_recent->list() + QLatin1Char('|');
-    if (!list.contains(QLatin1Char('|') + path + QLatin1Char('|'))) {
+    if (!m_recent->Contains(path)) {
         say(tr("There is no file %1").arg(path));
         return false;
     }

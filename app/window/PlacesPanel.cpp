@@ -4,6 +4,7 @@
 #include "app/window/PlacesPanel.h"
 
 #include "app/runninglog/RunningLog.h"
+#include "app/window/ProgramProperty.h"
 #include "app/window/widgets/PlainText.h"
 
 #include <QClipboard>
@@ -17,16 +18,10 @@
 #include <QToolButton>
 #include <QUrl>
 #include <QVBoxLayout>
-#include <QVariant>
 
 namespace Velocor {
 
 namespace {
-
-QString Property(char const* name)
-{
-    return QCoreApplication::instance()->property(name).toString();
-}
 
 QToolButton* MakeButton(QString const& text, QString const& name, QString const& toolTip)
 {
@@ -49,9 +44,9 @@ PlacesPanel::PlacesPanel(QString const& settingsFile, QWidget* parent) : QWidget
     m_layout->setSpacing(2);
     addValue(tr("Organization"), QCoreApplication::organizationName(), false);
     addValue(tr("Product"), QCoreApplication::applicationName(), false);
-    addValue(tr("Installation"), Property("RootPath"), true);
-    addValue(tr("Data"), Property("DataPath"), true);
-    addValue(tr("Documents"), Property("DocPath"), true);
+    addValue(tr("Installation"), ProgramProperty("RootPath"), true);
+    addValue(tr("Data"), ProgramProperty("DataPath"), true);
+    addValue(tr("Documents"), ProgramProperty("DocPath"), true);
     addValue(tr("Log file"), RunningLog::FileName(), true);
     addValue(tr("Settings file"), settingsFile, true);
     m_layout->addStretch(1);

@@ -7,6 +7,7 @@
 #include "app/logfile/LogIndex.h"
 #include "app/runninglog/LogPreferences.h"
 #include "app/runninglog/RunningLog.h"
+#include "app/window/ProgramProperty.h"
 #include "app/window/log/RunningLogParser.h"
 #include "app/window/widgets/FileSizeText.h"
 #include "common/log/TorkLog.h"
@@ -21,7 +22,6 @@
 #include <QStorageInfo>
 #include <QStyle>
 #include <QSysInfo>
-#include <QVariant>
 
 namespace Velocor {
 
@@ -87,11 +87,6 @@ QString File(QString const& caption, QString const& path)
     return Line(caption, QStringLiteral("%1 (%2)").arg(path, state));
 }
 
-QString Property(char const* name)
-{
-    return QCoreApplication::instance()->property(name).toString();
-}
-
 QString LogState()
 {
     TorkLog const* log = TorkLog::logger();
@@ -141,7 +136,7 @@ QString LineAt(QFile& file, qint64 start)
 
 QString Memory()
 {
-    const QStorageInfo storage(Property("DataPath"));
+    const QStorageInfo storage(ProgramProperty("DataPath"));
     return storage.isValid() ? FileSizeText(storage.bytesAvailable()) : QObject::tr("unknown");
 }
 
@@ -167,9 +162,9 @@ QString SystemReport::Facts(QString const& settingsFile)
     text += Line(QObject::tr("Style"), QApplication::style()->objectName());
     text += Line(QObject::tr("Font"), QApplication::font().toString());
     text += Screens();
-    text += Directory(QObject::tr("Installation"), Property("RootPath"));
-    text += Directory(QObject::tr("Data"), Property("DataPath"));
-    text += Directory(QObject::tr("Documents"), Property("DocPath"));
+    text += Directory(QObject::tr("Installation"), ProgramProperty("RootPath"));
+    text += Directory(QObject::tr("Data"), ProgramProperty("DataPath"));
+    text += Directory(QObject::tr("Documents"), ProgramProperty("DocPath"));
     text += File(QObject::tr("Settings file"), settingsFile);
     text += File(QObject::tr("Log settings"), LogPreferences::FileName());
     text += File(QObject::tr("Log file"), RunningLog::FileName());
