@@ -187,7 +187,6 @@ void LogScanner::tell(bool isReset)
     m_rows = update.rows;
     update.exists = m_exists;
     update.error = m_error;
-    update.fileSize = m_size;
     update.lines = m_index.size();
     update.hasElapsed = m_index.hasElapsed();
     if (!nothingNew)

@@ -28,7 +28,6 @@ struct LogUpdate
     std::shared_ptr<LogRows const> rows;
     bool exists = true;
     QString error; ///< why the file could not be read; empty if it could
-    qint64 fileSize = 0;
     size_t lines = 0;
     bool hasElapsed = false;
 

@@ -32,7 +32,6 @@
 #include <QStatusBar>
 #include <QUrl>
 #include <QVBoxLayout>
-#include <QVariant>
 
 // Resources of a static library have to be asked for, from outside of any namespace.
 static void InitResources()
@@ -382,8 +381,7 @@ void MainWindow::OpenFile(QString const& path)
 
 bool MainWindow::offerToForget(QString const& path)
 {
-    const QString list = QLatin1Char('|') + m_recent->list() + QLatin1Char('|');
-    if (!list.contains(QLatin1Char('|') + path + QLatin1Char('|'))) {
+    if (!m_recent->Contains(path)) {
         say(tr("There is no file %1").arg(path));
         return false;
     }

@@ -18,7 +18,6 @@
 #include <QToolButton>
 #include <QUrl>
 #include <QVBoxLayout>
-#include <QVariant>
 
 namespace Velocor {
 

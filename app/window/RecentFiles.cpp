@@ -70,6 +70,11 @@ void RecentFiles::Add(QString const& path)
     SetList(m_list);
 }
 
+bool RecentFiles::Contains(QString const& path) const
+{
+    return m_list.split(Separator).contains(path);
+}
+
 void RecentFiles::Remove(QString const& path)
 {
     AppUtils::RemoveFromMRUList(path, m_list);

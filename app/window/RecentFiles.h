@@ -31,6 +31,9 @@ public:
     /// Puts a file at the front. A path with "|" in it, or one longer than
     /// `LongestPath`, cannot be kept and is passed over.
     void Add(QString const& path);
+
+    /// Whether the path is one of the files.
+    bool Contains(QString const& path) const;
     void Remove(QString const& path);
     void Clear();
 

@@ -22,7 +22,6 @@
 #include <QStorageInfo>
 #include <QStyle>
 #include <QSysInfo>
-#include <QVariant>
 
 namespace Velocor {
 

@@ -3,22 +3,9 @@
 
 #pragma once
 
-#include <QString>
+#include "common/xml/TorkXmlResult.h"
 
-/// The result codes of the XML writers' operations. 0 is success.
-///
-/// Write() of both writers reports no failure, so WriteFailed only comes from a class that
-/// overrides it; to learn of a full disk, ask the device, or TorkXmlFile::errorString().
-///
-///     if (writer.WriteAttribute(name, value) == TorkXmlResult::EmptyName)
-///         qWarning("An attribute without a name was left out.");
-namespace TorkXmlResult {
-enum Code : int {
-    Success = 0,
-    EmptyName = 1005,   ///< the element or attribute name is empty
-    WriteFailed = 1006, ///< Write() reported a negative count
-};
-}
+#include <QString>
 
 /// Where an XML writer stands: what each of the two writers keeps between calls.
 struct TorkXmlLayout

@@ -6,16 +6,11 @@
 #include "common/log/TorkLog.h"
 #include "common/xml/TorkXmlLimits.h"
 #include "common/xml/TorkXmlPrefixes_p.h"
+#include "common/xml/TorkXmlResult.h"
 #include "common/xml/TorkXml_ParseState_Base.h"
 
 #include <QDebug>
 #include <QMessageLogger>
-
-namespace {
-
-constexpr int NoParseState = 1016;
-
-} // namespace
 
 TorkXml_ParseManager_Base::TorkXml_ParseManager_Base() : m_currentElement(QLatin1String("")) {}
 
@@ -92,7 +87,7 @@ bool TorkXml_ParseManager_Base::startElement(QString const&, QString const& loca
         if (first)
             return enter(first, attributes);
         AppendError(QStringLiteral("No initial parse state for element \"%1\".").arg(localName),
-                    NoParseState);
+                    TorkXmlResult::NoParseState);
         return false;
     }
 
@@ -105,7 +100,7 @@ bool TorkXml_ParseManager_Base::startElement(QString const&, QString const& loca
         return enter(next, attributes);
     AppendError(QStringLiteral("Unknown element \"%1\". Parse state element \"%2\".")
                     .arg(localName, parent ? parent->ElementName() : QString()),
-                NoParseState);
+                TorkXmlResult::NoParseState);
     return false;
 }
 

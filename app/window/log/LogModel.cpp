@@ -303,8 +303,6 @@ QVariant LogModel::data(QModelIndex const& index, int role) const
         return isHeading(row);
     case EarlierRole:
         return static_cast<size_t>(row) < m_state.rows->earlier;
-    case LineRole:
-        return LineText(row, LogIndex::LineLimit);
     default:
         return QVariant();
     }

@@ -36,8 +36,7 @@ public:
     enum Role {
         SeverityRole = Qt::UserRole, ///< a LogEntry::Severity
         HeadingRole,                 ///< whether the row is a heading
-        EarlierRole,                 ///< whether the row is of an earlier run
-        LineRole                     ///< the line as it stands in the file
+        EarlierRole                  ///< whether the row is of an earlier run
     };
 
     explicit LogModel(QObject* parent = nullptr);

@@ -4,6 +4,8 @@
 // The model over real files that change under it.
 
 #include "app/window/log/LogModel.h"
+
+#include "app/logfile/LogIndex.h"
 #include "common/log/TorkLog.h"
 #include "support/DemoLog.h"
 #include "support/TestFiles.h"
@@ -136,7 +138,7 @@ void tst_LogModel::columns()
     QCOMPARE(model.index(0, 1).data().toString(), QString("Warning"));
     QCOMPARE(model.index(0, 2).data().toString(), QString("250 ms"));
     QCOMPARE(model.index(0, 3).data().toString(), QString("hello"));
-    QCOMPARE(model.index(0, 0).data(LogModel::LineRole).toString(),
+    QCOMPARE(model.LineText(0, LogIndex::LineLimit),
              QString("2025-03-03 09:02:11.031 Warning dT:[250] hello"));
     QCOMPARE(model.index(1, 0).data().toString(), QString());
     QCOMPARE(model.index(1, 3).data().toString(), QString("more"));
