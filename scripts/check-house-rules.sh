@@ -76,11 +76,11 @@ rooms() {
     may_include common/xml common/log
     may_include app common/config common/log common/xml
     may_include app/logfile
-    may_include app/settingsfile common/config common/xml
+    may_include app/settingsfile common/config
     may_include app/runninglog app/settingsfile common/log
     may_include app/window/widgets app/logfile
     may_include app/window/log app/logfile app/runninglog app/window/widgets
-    may_include app/window/settings app/settingsfile app/window/widgets
+    may_include app/window/settings app/settingsfile app/window/widgets common/config
     may_include app/window app app/logfile app/runninglog app/settingsfile \
         app/window/log app/window/settings app/window/widgets common/config common/log
 }
