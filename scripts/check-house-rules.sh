@@ -77,7 +77,7 @@ rooms() {
     may_include app common/config common/log common/xml
     may_include app/logfile
     may_include app/settingsfile common/config
-    may_include app/runninglog app/settingsfile common/log
+    may_include app/runninglog common/config common/log
     may_include app/window/widgets app/logfile
     may_include app/window/log app/logfile app/runninglog app/window/widgets
     may_include app/window/settings app/settingsfile app/window/widgets common/config
