@@ -3,12 +3,13 @@
 
 #include "app/runninglog/LogPreferences.h"
 
-#include "app/settingsfile/SettingsFileReader.h"
-#include "app/settingsfile/SettingsFileWriter.h"
+#include "common/config/TorkConfigFile.h"
+#include "common/config/TorkConfigText.h"
 #include "common/log/TorkLog.h"
 
+#include <QFile>
+#include <QFileInfo>
 #include <QObject>
-#include <QRegularExpression>
 
 #include <algorithm>
 
@@ -20,6 +21,38 @@ QString Section()
 {
     return QStringLiteral("config");
 }
+
+// The settings file as the log reads it, but without the entries that this would make. Opening a
+// pipe would wait, and a device may have no end.
+class SettingsFile : public TorkConfigFile
+{
+public:
+    explicit SettingsFile(QString const& path) : TorkConfigFile(path, QStringLiteral("LogSettings"))
+    {
+        QFile file(path);
+        m_isLoaded = QFileInfo(path).isFile() && file.open(QIODevice::ReadOnly) && LoadFrom(&file);
+    }
+
+    bool isLoaded() const { return m_isLoaded; }
+
+    QString Value(char const* key, char const* byDefault)
+    {
+        QString none = QString::fromLatin1(byDefault);
+        QString value;
+        ReadItem(Section(), QString::fromLatin1(key), none, value);
+        return value;
+    }
+
+    void SetValue(char const* key, QString const& value)
+    {
+        // The store refuses a null text; an empty one shows in the comparison after saving.
+        WriteItem(Section(), QString::fromLatin1(key),
+                  value.isNull() ? QString(QLatin1String("")) : value);
+    }
+
+private:
+    bool m_isLoaded = false;
+};
 
 } // namespace
 
@@ -36,14 +69,11 @@ QString LogPreferences::FileName()
 
 LogPreferences LogPreferences::Read()
 {
-    const SettingsDocument document = SettingsFileReader::Read(FileName());
+    SettingsFile file(FileName());
     LogPreferences preferences;
-    preferences.elapsedPrefix =
-        document.Value(Section(), QStringLiteral("elapsedTimePrefix"), QStringLiteral("dT:"));
-    preferences.dateFormat = document.Value(Section(), QStringLiteral("dateTimeFormat"),
-                                            QStringLiteral("yyyy-MM-dd hh:mm:ss.z"));
-    preferences.filePrefix =
-        document.Value(Section(), QStringLiteral("filePrefix"), QStringLiteral("logdata"));
+    preferences.elapsedPrefix = file.Value("elapsedTimePrefix", "dT:");
+    preferences.dateFormat = file.Value("dateTimeFormat", "yyyy-MM-dd hh:mm:ss.z");
+    preferences.filePrefix = file.Value("filePrefix", "logdata");
     if (TorkLog const* log = TorkLog::logger()) {
         preferences.enabled = log->enabled();
         preferences.elapsedTime = log->logElapsedTime();
@@ -67,31 +97,30 @@ QString LogPreferences::Apply() const
     log->setMaxLogFiles(files);
 
     log->savePreferences();
-    SettingsDocument document = SettingsFileReader::Read(FileName());
-    if (!document.isParsed)
+    SettingsFile file(FileName());
+    if (!file.isLoaded())
         return QObject::tr("The settings file %1 could not be saved.").arg(FileName());
-    document.SetValue(Section(), QStringLiteral("elapsedTimePrefix"), elapsedPrefix);
-    document.SetValue(Section(), QStringLiteral("dateTimeFormat"), dateFormat);
-    document.SetValue(Section(), QStringLiteral("filePrefix"), filePrefix);
+    file.SetValue("elapsedTimePrefix", elapsedPrefix);
+    file.SetValue("dateTimeFormat", dateFormat);
+    file.SetValue("filePrefix", filePrefix);
+    if (!file.SaveAtomically())
+        return file.m_lastError;
 
-    QString error;
-    if (!SettingsFileWriter::Save(FileName(), document, &error))
-        return error;
-    const bool arrived = SettingsFileReader::Read(FileName()).HasSameValues(document);
+    const SettingsFile readBack(FileName());
+    const bool arrived = readBack.isLoaded() && readBack.ToXml() == file.ToXml();
     return arrived ? QString()
                    : QObject::tr("The settings file %1 does not hold all of the "
                                  "settings now.")
                          .arg(FileName());
 }
 
+// A control character would break the lines of the log.
 bool LogPreferences::IsKept(QString const& text)
 {
-    static const QRegularExpression placeholder(QStringLiteral("%L?[0-9]"));
     const bool printable = std::all_of(text.begin(), text.end(), [](QChar c) {
-        return c.unicode() >= 0x20 && c.unicode() < 0x7f;
+        return c.unicode() >= 0x20 && c.unicode() != 0x7f;
     });
-    return !text.isEmpty() && printable && !text.contains(QLatin1String("]]>")) &&
-           !text.contains(placeholder);
+    return printable && TorkConfigText::IsPlainValue(text);
 }
 
 bool LogPreferences::IsFilePrefix(QString const& text)

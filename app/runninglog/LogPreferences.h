@@ -39,8 +39,8 @@ struct LogPreferences
     /// The log's settings file.
     static QString FileName();
 
-    /// Whether a settings file keeps this text as a value: not empty, printable ASCII, neither
-    /// "]]>" nor a "%" with a digit in it.
+    /// Whether the log's settings file keeps this text as a value, and it fits in a line of the
+    /// log: a plain value (see TorkConfigText::IsPlainValue()) without control characters.
     static bool IsKept(QString const& text);
 
     /// Whether log files can be called so: kept, no "/", and not "." or "..".

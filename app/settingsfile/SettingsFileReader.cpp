@@ -3,61 +3,70 @@
 
 #include "app/settingsfile/SettingsFileReader.h"
 
-#include "common/xml/TorkXmlGuard.h"
+#include "common/config/TorkConfigFile.h"
 
 #include <QBuffer>
 #include <QFile>
 #include <QFileInfo>
 #include <QObject>
-#include <QXmlSimpleReader>
 
 namespace Velocor {
 
+SettingsFileReader::SettingsFileReader(TorkConfigFile& store, SettingsDocument& document)
+    : TorkConfigFileDocHandler(&store), m_store(store), m_document(document)
+{}
+
 SettingsDocument SettingsFileReader::Read(QString const& path)
 {
-    SettingsFileReader reader;
+    SettingsDocument document;
     QFile file(path);
     const QFileInfo info(path);
     if (info.isDir())
-        reader.m_document.error = QObject::tr("Is a folder");
+        document.error = QObject::tr("Is a folder");
     else if (info.exists() && !info.isFile()) // opening a pipe waits, and a device may have no end
-        reader.m_document.error = QObject::tr("Not a regular file");
+        document.error = QObject::tr("Not a regular file");
     else if (!file.open(QIODevice::ReadOnly))
-        reader.m_document.error = file.errorString();
+        document.error = file.errorString();
     else
-        reader.read(file);
-    return reader.m_document;
+        read(file, document);
+    return document;
 }
 
 SettingsDocument SettingsFileReader::ReadBytes(QByteArray const& bytes)
 {
-    SettingsFileReader reader;
+    SettingsDocument document;
     QBuffer buffer;
     buffer.setData(bytes);
     buffer.open(QIODevice::ReadOnly);
-    reader.read(buffer);
-    return reader.m_document;
+    read(buffer, document);
+    return document;
 }
 
-void SettingsFileReader::read(QIODevice& device)
+void SettingsFileReader::read(QIODevice& device, SettingsDocument& document)
 {
-    m_document.isReadable = true;
+    document.isReadable = true;
     if (device.peek(5) == "<?xml")
-        m_document.losses.append(QObject::tr("Line 1: the XML declaration"));
-    m_document.lossCount = m_document.losses.size();
+        document.losses.append(QObject::tr("Line 1: the XML declaration"));
+    document.lossCount = document.losses.size();
 
-    TorkXmlGuard source(&device);
-    QXmlSimpleReader reader;
-    source.Watch(reader);
-    reader.setContentHandler(this);
-    reader.setErrorHandler(this);
-    reader.setLexicalHandler(this);
-    m_document.isParsed = reader.parse(source);
-    if (!m_document.isParsed && m_document.error.isEmpty())
-        m_document.error = QObject::tr("The file is no configuration file");
+    TorkConfigFile store((QString()));
+    SettingsFileReader reader(store, document);
+    document.isParsed = store.LoadFrom(&device, reader);
+    if (!document.isParsed && document.error.isEmpty())
+        document.error = QObject::tr("The file is no configuration file");
+
+    const QStringList names = store.sectionList();
+    for (QString const& name : names) {
+        SettingsDocument::Section section{name, {}};
+        const auto items = store.FindSection(name)->values();
+        section.items.reserve(items.size());
+        for (auto const& item : items)
+            section.items.append({item.key, item.value});
+        document.sections.append(section);
+    }
 }
 
-void SettingsFileReader::lose(QString const& what)
+void SettingsFileReader::noteLoss(QString const& what)
 {
     ++m_document.lossCount;
     if (m_document.losses.size() >= MostLosses)
@@ -66,111 +75,85 @@ void SettingsFileReader::lose(QString const& what)
     m_document.losses.append(QObject::tr("Line %1: %2").arg(line).arg(what));
 }
 
-void SettingsFileReader::openSection(QString const& name)
+bool SettingsFileReader::startElement(QString const& namespaceURI, QString const& localName,
+                                      QString const& qName, QXmlAttributes const& attributes)
 {
-    const auto found = m_sectionPlaces.constFind(name);
-    if (found != m_sectionPlaces.constEnd()) {
-        m_section = *found;
-        lose(QObject::tr("a second section \"%1\", merged with the first").arg(name));
-        return;
-    }
-    m_section = m_document.sections.size();
-    m_sectionPlaces.insert(name, m_section);
-    m_itemPlaces.append(QHash<QString, int>());
-    m_document.sections.append({name, {}});
-}
-
-void SettingsFileReader::store(QString const& key, QString const& value)
-{
-    if (m_section < 0) {
-        lose(QObject::tr("\"%1\", which is in no section").arg(key));
-        return;
-    }
-    QVector<SettingsDocument::Item>& items = m_document.sections[m_section].items;
-    QHash<QString, int>& places = m_itemPlaces[m_section];
-    const auto found = places.constFind(key);
-    if (found != places.constEnd()) {
-        lose(QObject::tr("a second value of \"%1\", in the place of the first").arg(key));
-        items[*found].value = value;
-        return;
-    }
-    places.insert(key, items.size());
-    items.append({key, value});
-}
-
-bool SettingsFileReader::startElement(QString const&, QString const& localName, QString const&,
-                                      QXmlAttributes const& attributes)
-{
-    ++m_depth;
-    m_element = localName;
-    m_justOpened = true;
-    if (m_depth == 1)
+    m_isAfterValue = false;
+    const int newDepth = depth() + 1;
+    if (newDepth == 1) {
         m_document.rootName = localName;
+        m_store.SetRootElementName(localName);
+    }
     for (int i = 0; i < attributes.count(); ++i)
-        lose(QObject::tr("the attribute \"%1\" of \"%2\"").arg(attributes.qName(i), localName));
+        noteLoss(QObject::tr("the attribute \"%1\" of \"%2\"").arg(attributes.qName(i), localName));
 
-    if (m_depth <= 2)
-        m_expectingValue = false;
-    m_atRoot = localName == m_document.rootName;
-    if (m_atRoot && m_depth > 1)
-        lose(QObject::tr("the element \"%1\", which is called like the root").arg(localName));
-    if (m_atRoot)
-        return true;
-    if (m_depth == 2)
-        openSection(localName);
-    else if (m_depth == 3)
-        m_expectingValue = true;
-    else if (m_depth > 3)
-        lose(QObject::tr("the nesting of the element \"%1\"").arg(localName));
-    m_hasValue = false;
+    const bool isCalledLikeRoot = newDepth > 1 && localName == m_document.rootName;
+    const bool isSection = newDepth == 2 && !isCalledLikeRoot;
+    if (isCalledLikeRoot)
+        noteLoss(QObject::tr("the element \"%1\", which is called like the root").arg(localName));
+    else if (isSection && m_store.HasSection(localName))
+        noteLoss(QObject::tr("a second section \"%1\", merged with the first").arg(localName));
+    else if (newDepth > 3)
+        noteLoss(QObject::tr("the nesting of the element \"%1\"").arg(localName));
+
+    TorkConfigFileDocHandler::startElement(namespaceURI, localName, qName, attributes);
+    if (isSection && !m_store.HasSection(localName))
+        noteLoss(QObject::tr("the name of the section \"%1\"").arg(localName));
     return true;
 }
 
-bool SettingsFileReader::endElement(QString const&, QString const& localName, QString const&)
+bool SettingsFileReader::endElement(QString const& namespaceURI, QString const& localName,
+                                    QString const& qName)
 {
-    if (m_depth == 3 && m_expectingValue && localName == m_element)
-        lose(QObject::tr("\"%1\", which has no text").arg(localName));
-    --m_depth;
-    m_element.clear();
-    m_justOpened = false;
-    return true;
+    m_isAfterValue = false;
+    if (depth() == 3 && isAtStartTag() && m_store.IsExpectingValue())
+        noteLoss(QObject::tr("\"%1\", which has no text").arg(localName));
+    return TorkConfigFileDocHandler::endElement(namespaceURI, localName, qName);
 }
 
-// Only the first piece of text after a start tag is a value.
+// Before the store takes a value: whether it has a place for it, and one that is free.
+void SettingsFileReader::noteLossOfValue()
+{
+    TorkConfigFileSection const* section = m_store.CurrentSection();
+    const QString key = lastOpenedElement();
+    QString none;
+    QString earlier;
+    if (!section)
+        noteLoss(QObject::tr("\"%1\", which is in no section").arg(key));
+    else if (m_store.ReadItem(section->name(), key, none, earlier))
+        noteLoss(QObject::tr("a second value of \"%1\", in the place of the first").arg(key));
+}
+
 bool SettingsFileReader::characters(QString const& text)
 {
-    const bool isFirst = m_justOpened;
-    m_justOpened = false;
-    if (isFirst && !m_atRoot && m_expectingValue) {
-        m_expectingValue = false;
-        m_hasValue = true;
-        store(m_element, text);
-        return true;
+    if (isAtStartTag() && m_store.IsExpectingValue()) {
+        noteLossOfValue();
+        m_isAfterValue = depth() == 3;
+    } else if (m_isAfterValue) {
+        noteLoss(QObject::tr("the value of \"%1\" from \"%2\" on")
+                     .arg(lastOpenedElement(), text.left(20)));
+    } else if (!text.trimmed().isEmpty()) {
+        noteLoss(QObject::tr("the text \"%1\" outside of values").arg(text.trimmed().left(20)));
     }
-    const bool isRestOfValue = !isFirst && m_hasValue && m_depth == 3 && !m_element.isEmpty();
-    if (isRestOfValue)
-        lose(QObject::tr("the value of \"%1\" from \"%2\" on").arg(m_element, text.left(20)));
-    else if (!text.trimmed().isEmpty())
-        lose(QObject::tr("the text \"%1\" outside of values").arg(text.trimmed().left(20)));
-    return true;
+    return TorkConfigFileDocHandler::characters(text);
 }
 
 bool SettingsFileReader::processingInstruction(QString const& target, QString const&)
 {
     if (target != QLatin1String("xml"))
-        lose(QObject::tr("the instruction \"%1\"").arg(target));
+        noteLoss(QObject::tr("the instruction \"%1\"").arg(target));
     return true;
 }
 
 bool SettingsFileReader::comment(QString const& text)
 {
-    lose(QObject::tr("the comment \"%1\"").arg(text.simplified().left(40)));
+    noteLoss(QObject::tr("the comment \"%1\"").arg(text.simplified().left(40)));
     return true;
 }
 
 bool SettingsFileReader::startDTD(QString const& name, QString const&, QString const&)
 {
-    lose(QObject::tr("the document type \"%1\"").arg(name));
+    noteLoss(QObject::tr("the document type \"%1\"").arg(name));
     return true;
 }
 

@@ -4,40 +4,40 @@
 #pragma once
 
 #include "app/settingsfile/SettingsDocument.h"
-
-#include <QHash>
-#include <QVector>
-#include <QXmlDefaultHandler>
+#include "common/config/TorkConfigFileDocHandler.h"
 
 class QIODevice;
+class TorkConfigFile;
 
 namespace Velocor {
 
-/// Reads a configuration-store file as the store does, and notes what the store passes over.
+/// Reads a configuration-store file through the store, and notes what the store passes over.
 ///
-/// Unlike TorkConfigFile::Load() it enumerates sections, tells where a file is broken, and writes
-/// nothing to the log. File format: docs/config-file.md.
+/// What is a section, a key or a value is the store's decision; this class follows the parse to
+/// tell what saving would lose and where a file is broken. Nothing is written to the log. File
+/// format: docs/config-file.md.
 ///
 ///     SettingsDocument document = SettingsFileReader::Read(path);
 ///     if (!document.isParsed)
 ///         tell(document.error, document.line, document.column);
-class SettingsFileReader : private QXmlDefaultHandler
+class SettingsFileReader : private TorkConfigFileDocHandler
 {
 public:
-    /// Reads a file.
+    /// Reads a file. Only regular files and links to them are read.
     static SettingsDocument Read(QString const& path);
 
     /// Reads a text as if it were the content of a file.
     static SettingsDocument ReadBytes(QByteArray const& bytes);
 
-    /// The most losses that are worded.
+    /// The most losses that are formatted; the others are only counted.
     static constexpr int MostLosses = 50;
 
 private:
-    void read(QIODevice& device);
-    void lose(QString const& what);
-    void store(QString const& key, QString const& value);
-    void openSection(QString const& name);
+    SettingsFileReader(TorkConfigFile& store, SettingsDocument& document);
+
+    static void read(QIODevice& device, SettingsDocument& document);
+    void noteLoss(QString const& what);
+    void noteLossOfValue();
 
     void setDocumentLocator(QXmlLocator* locator) override { m_locator = locator; }
     bool startElement(QString const& namespaceURI, QString const& localName, QString const& qName,
@@ -50,17 +50,10 @@ private:
     bool startDTD(QString const& name, QString const& publicId, QString const& systemId) override;
     bool fatalError(QXmlParseException const& exception) override;
 
-    SettingsDocument m_document;
+    TorkConfigFile& m_store;
+    SettingsDocument& m_document;
     QXmlLocator* m_locator = nullptr;
-    int m_depth = 0;
-    int m_section = -1;
-    QHash<QString, int> m_sectionPlaces;
-    QVector<QHash<QString, int>> m_itemPlaces; // of each section
-    bool m_atRoot = false;
-    bool m_expectingValue = false;
-    bool m_justOpened = false;
-    bool m_hasValue = false;
-    QString m_element;
+    bool m_isAfterValue = false; // in the same item
 };
 
 } // namespace Velocor

@@ -5,15 +5,11 @@
 
 #include "app/settingsfile/SettingsFileReader.h"
 #include "common/config/TorkConfigFile.h"
+#include "common/config/TorkConfigText.h"
 
-#include <QCoreApplication>
-#include <QDir>
 #include <QFile>
 #include <QFileInfo>
 #include <QObject>
-#include <QRegularExpression>
-#include <QTemporaryDir>
-#include <QVariant>
 
 #include <algorithm>
 
@@ -26,99 +22,95 @@ bool IsLatin1(QString const& text)
     return std::all_of(text.begin(), text.end(), [](QChar c) { return c.unicode() < 256; });
 }
 
-QString Quoted(SettingsDocument::Item const& item, QString const& section)
+// Why a value does not come back.
+QString ReasonOf(QString const& value)
 {
-    return QStringLiteral("%1 / %2").arg(section, item.key);
+    if (value.contains(QLatin1String("]]>")))
+        return QObject::tr("a value with \"]]>\" makes the file unreadable");
+    if (!IsLatin1(value))
+        return QObject::tr("characters outside Latin-1 become \"?\"");
+    if (value.isEmpty())
+        return QObject::tr("an empty value is not kept");
+    return QObject::tr("the value would read differently afterwards");
 }
 
-// Where a file is saved to see what the store makes of it: settings are nobody else's business, so
-// not in a folder that all users share, unless the program has no other.
-QString TrialFolder()
+QString Message(SettingsDocument::Section const& section, SettingsDocument::Item const& item,
+                QString const& reason)
 {
-    const QString data = QCoreApplication::instance()->property("DataPath").toString();
-    const bool isThere = !data.isEmpty() && QDir().mkpath(data);
-    return (isThere ? data : QDir::tempPath() + QLatin1Char('/')) + QLatin1String("trial-XXXXXX");
+    return QStringLiteral("%1 / %2: %3").arg(section.name, item.key, reason);
 }
 
-} // namespace
-
-bool SettingsFileWriter::IsName(QString const& name)
+// Moves the items that the store can write from the section to the result.
+SettingsDocument::Section WithoutLosses(SettingsDocument::Section const& section,
+                                        QStringList& losses)
 {
-    static const QRegularExpression pattern(QStringLiteral("\\A[A-Za-z_][A-Za-z0-9_.-]*\\z"));
-    return pattern.match(name).hasMatch();
-}
-
-// The losses whose reason can be named. Others show only when a saved file is read back.
-bool SettingsFileWriter::StartsLoss(SettingsDocument::Item const& item, QString const& section,
-                                    QStringList& losses)
-{
-    const QString where = Quoted(item, section);
-    const int before = losses.size();
-    if (!IsName(item.key))
-        losses.append(QObject::tr("%1: the key is no name that the store can write").arg(where));
-    if (item.value.contains(QLatin1String("]]>")))
-        losses.append(QObject::tr("%1: a value with \"]]>\" makes the file unreadable").arg(where));
-    else if (!IsLatin1(item.value))
-        losses.append(QObject::tr("%1: characters outside Latin-1 become \"?\"").arg(where));
-    else if (item.value.isEmpty())
-        losses.append(QObject::tr("%1: an empty value is not kept").arg(where));
-    return losses.size() > before;
-}
-
-QStringList SettingsFileWriter::Losses(SettingsDocument const& document)
-{
-    QStringList losses;
-    SettingsDocument harmless = document;
-    for (SettingsDocument::Section& section : harmless.sections) {
-        if (!IsName(section.name))
-            losses.append(QObject::tr("%1: the section has no name that the store can write")
-                              .arg(section.name));
-        for (SettingsDocument::Item& item : section.items) {
-            if (StartsLoss(item, section.name, losses))
-                item.value = QStringLiteral("x");
-            if (!IsName(item.key))
-                return losses;
-        }
-        if (!IsName(section.name) || section.name == document.rootName)
-            return losses;
+    SettingsDocument::Section writable{section.name, {}};
+    for (SettingsDocument::Item const& item : section.items) {
+        if (!TorkConfigText::IsPlainName(item.key))
+            losses.append(
+                Message(section, item, QObject::tr("the key is no name that the store can write")));
+        if (!TorkConfigText::IsPlainValue(item.value))
+            losses.append(Message(section, item, ReasonOf(item.value)));
+        else if (TorkConfigText::IsPlainName(item.key))
+            writable.items.append(item);
     }
-
-    const QTemporaryDir folder(TrialFolder());
-    const QString path = folder.filePath(QStringLiteral("trial.cfg"));
-    if (!folder.isValid() || !SaveUnchecked(path, harmless).isEmpty())
-        return losses;
-    const SettingsValues readBack = SettingsFileReader::Read(path).AllValues();
-    for (SettingsDocument::Section const& section : qAsConst(harmless.sections)) {
-        for (SettingsDocument::Item const& item : section.items) {
-            if (readBack.value({section.name, item.key}) != item.value)
-                losses.append(QObject::tr("%1: the value would read differently afterwards")
-                                  .arg(Quoted(item, section.name)));
-        }
-    }
-    return losses;
+    return writable;
 }
 
-// The reason of a failure that the store knows of.
-QString SettingsFileWriter::SaveUnchecked(QString const& path, SettingsDocument const& document)
+void Fill(TorkConfigFile& store, SettingsDocument const& document)
 {
-    TorkConfigFile store(path, document.rootName);
     for (SettingsDocument::Section const& section : document.sections) {
         store.AppendSection(new TorkConfigFileSection(section.name.toUtf8().constData()));
         for (SettingsDocument::Item const& item : section.items)
             store.WriteItem(section.name, item.key,
                             item.value.isNull() ? QString(QLatin1String("")) : item.value);
     }
-    return store.SaveAtomically() ? QString() : store.m_lastError;
+}
+
+} // namespace
+
+QStringList SettingsFileWriter::Losses(SettingsDocument const& document)
+{
+    QStringList losses;
+    SettingsDocument writable;
+    writable.rootName = document.rootName;
+    for (SettingsDocument::Section const& section : document.sections) {
+        const SettingsDocument::Section kept = WithoutLosses(section, losses);
+        if (!TorkConfigText::IsPlainName(section.name))
+            losses.append(QObject::tr("%1: the section has no name that the store can write")
+                              .arg(section.name));
+        else if (section.name == document.rootName)
+            losses.append(QObject::tr("%1: the section has the same name as the root element")
+                              .arg(section.name));
+        else
+            writable.sections.append(kept);
+    }
+
+    // Whatever else gets lost, the store itself tells.
+    TorkConfigFile store(QString(), document.rootName);
+    Fill(store, writable);
+    const SettingsValues readBack = SettingsFileReader::ReadBytes(store.ToXml()).AllValues();
+    for (SettingsDocument::Section const& section : qAsConst(writable.sections)) {
+        for (SettingsDocument::Item const& item : section.items) {
+            if (readBack.value({section.name, item.key}) != item.value)
+                losses.append(Message(section, item, ReasonOf(item.value)));
+        }
+    }
+    return losses;
 }
 
 bool SettingsFileWriter::Save(QString const& path, SettingsDocument const& document, QString* error)
 {
-    if (QFileInfo::exists(path) && !QFileInfo(path).isFile())
+    if (QFileInfo::exists(path) && !QFileInfo(path).isFile()) {
         *error = QObject::tr("Not a regular file");
-    else
-        *error = SaveUnchecked(path, document);
-    if (!error->isEmpty())
         return false;
+    }
+    TorkConfigFile store(path, document.rootName);
+    Fill(store, document);
+    if (!store.SaveAtomically()) {
+        *error = store.m_lastError;
+        return false;
+    }
 
     // The store does not look at what the disk makes of its bytes.
     const SettingsDocument readBack = SettingsFileReader::Read(path);

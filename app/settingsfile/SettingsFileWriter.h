@@ -16,12 +16,8 @@ class SettingsFileWriter
 {
 public:
     /// What the store cannot write so that it reads back the same: one text for each value or name.
-    /// Tried out in a temporary folder.
+    /// Tried in memory; no file is written.
     static QStringList Losses(SettingsDocument const& document);
-
-    /// Whether the store keeps a section or a key of this name: ASCII letters, digits, "_", "-"
-    /// and ".", a letter or "_" first.
-    static bool IsName(QString const& name);
 
     /// Replaces the file by the document, and reads it back to see whether all of it arrived.
     ///
@@ -31,11 +27,6 @@ public:
 
     /// Copies a file to the same name with ".bak" behind it, in the place of an earlier copy.
     static bool KeepBackup(QString const& path, QString* error);
-
-private:
-    static QString SaveUnchecked(QString const& path, SettingsDocument const& document);
-    static bool StartsLoss(SettingsDocument::Item const& item, QString const& section,
-                           QStringList& losses);
 };
 
 } // namespace Velocor

@@ -15,8 +15,8 @@ namespace Velocor {
 /// The state of the window between two runs, in the settings file "velocor.cfg" of the data
 /// directory.
 ///
-/// The file is read by SettingsFileReader rather than by the store itself, whose traces would
-/// stand before the first entry of the log. A file that does not parse is put aside under another
+/// The file is read by SettingsFileReader rather than by TorkConfigFile::Load(), whose traces would
+/// come before the first entry of the log. A file that does not parse is put aside under another
 /// name, and is never written over. Keys and values: docs/window.md.
 ///
 ///     WindowSettings settings(dataPath);

@@ -58,6 +58,11 @@ void TorkConfigFile::SetFileName(QString const& fileName)
     m_fileName = fileName;
 }
 
+void TorkConfigFile::SetRootElementName(QString const& rootElementName)
+{
+    m_rootElementName = rootElementName;
+}
+
 void TorkConfigFile::Clear()
 {
     for (auto const& entry : *m_sections)
@@ -82,31 +87,51 @@ bool TorkConfigFile::Load()
 
     m_lastError = QLatin1String("");
     Clear();
-    const bool parsed = parse();
+    const bool parsed = parseFile();
     if (!parsed)
         fail(QObject::tr("ConfigFile - Could not parse the input file."));
     return parsed;
 }
 
-bool TorkConfigFile::parse()
+bool TorkConfigFile::LoadFrom(QIODevice* device)
 {
-    m_atRoot = false;
-    m_expectingValue = false;
-    m_currentElement = QLatin1String("");
+    TorkConfigFileDocHandler handler(this);
+    return LoadFrom(device, handler);
+}
 
+bool TorkConfigFile::LoadFrom(QIODevice* device, TorkConfigFileDocHandler& handler)
+{
+    Clear();
+    return parse(device, handler, handler, &handler);
+}
+
+bool TorkConfigFile::parseFile()
+{
     TorkConfigFileDocHandler contentHandler(this);
     TorkErrorHandler errorHandler(TorkLog::m_gLog);
     QFile file(m_fileName);
     QBuffer nothing;
     // Anything but a file, like a pipe or a device, could keep the load waiting or never end.
     const bool isFile = QFileInfo(m_fileName).isFile();
-    TorkXmlGuard source(isFile ? static_cast<QIODevice*>(&file) : &nothing);
+    return parse(isFile ? static_cast<QIODevice*>(&file) : &nothing, contentHandler, errorHandler,
+                 nullptr);
+}
+
+bool TorkConfigFile::parse(QIODevice* device, TorkConfigFileDocHandler& handler,
+                           QXmlErrorHandler& errorHandler, QXmlLexicalHandler* lexicalHandler)
+{
+    m_atRoot = false;
+    m_expectingValue = false;
+    m_currentElement = QLatin1String("");
+
+    TorkXmlGuard source(device);
     QXmlSimpleReader reader;
     source.Watch(reader);
-    reader.setContentHandler(&contentHandler);
+    reader.setContentHandler(&handler);
     reader.setErrorHandler(&errorHandler);
+    reader.setLexicalHandler(lexicalHandler);
 
-    m_activeHandler = &contentHandler;
+    m_activeHandler = &handler;
     const bool parsed = reader.parse(source);
     m_activeHandler = nullptr;
     return parsed;
@@ -116,6 +141,15 @@ void TorkConfigFile::fail(QString const& message)
 {
     m_lastError = message;
     TraceToLog(message);
+}
+
+QStringList TorkConfigFile::sectionList() const
+{
+    QStringList names;
+    names.reserve(static_cast<int>(m_sections->size()));
+    for (auto const& entry : *m_sections)
+        names.append(entry.key);
+    return names;
 }
 
 bool TorkConfigFile::HasSection(QString const& name)

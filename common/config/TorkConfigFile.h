@@ -12,8 +12,11 @@
 
 class QColor;
 class QFont;
+class QIODevice;
 class QPoint;
 class QSize;
+class QXmlErrorHandler;
+class QXmlLexicalHandler;
 class TorkConfigFileDocHandler;
 template <class Value>
 class TorkOrderedHash;
@@ -35,7 +38,8 @@ class TorkOrderedHash;
 /// text of users and other programs through TorkConfigText, which brings every text back. Without
 /// it these are safe: for values, a space and printable ASCII without "%" and "]]>", at least one
 /// character; for names, ASCII letters, digits, "_", "-" and ".", a letter or "_" first, and not
-/// the root element's name. What else does not come back: docs/config-file.md.
+/// the root element's name. TorkConfigText::IsPlainValue() and TorkConfigText::IsPlainName() tell
+/// exactly. What else does not come back: docs/config-file.md.
 ///
 /// One thread at a time. No operation throws.
 ///
@@ -66,6 +70,10 @@ public:
     /// Replaces the path of the file; sections and everything else stay.
     void SetFileName(QString const& fileName);
 
+    /// Replaces the name of the root element that Save() writes and that Load() takes for no
+    /// section or key; sections and everything else stay.
+    void SetRootElementName(QString const& rootElementName);
+
     /// Deletes every section in the file. Pointers to them that were handed out are invalid
     /// afterwards; sections that were pushed out (see AppendSection()) stay their holders'.
     void Clear();
@@ -80,6 +88,27 @@ public:
     /// @return false if the file name is empty or no such file exists (sections untouched), or if
     ///         the file does not parse (what preceded the error is kept, earlier sections are gone)
     bool Load();
+
+    /// Reads the content of a device, replacing all sections, as Load() reads its file. For text
+    /// that is in memory, and for callers that keep the reading out of the log: nothing is traced,
+    /// and m_lastError stays as it was.
+    ///
+    ///     QBuffer buffer(&bytes);
+    ///     TorkConfigFile settings(QString(), "LogSettings");
+    ///     if (settings.LoadFrom(&buffer))
+    ///         sections = settings.sectionList();
+    ///
+    /// @param device  not owned; opened for reading if it is not open yet. The caller sees to it
+    ///                that reading it neither waits nor goes on forever.
+    /// @return false if the content does not parse; what preceded the error is kept
+    bool LoadFrom(QIODevice* device);
+
+    /// The same with a handler of the caller's own, which follows the parse: it gets the events of
+    /// the content, the lexical events and the errors. It hands the events of the content on to its
+    /// base class, which fills this file.
+    ///
+    /// @param handler  made for this file; used for one load only
+    bool LoadFrom(QIODevice* device, TorkConfigFileDocHandler& handler);
 
     /// Writes all sections over the file, which is emptied first: a program killed in between
     /// leaves a part of it or nothing. SaveAtomically() does not.
@@ -112,6 +141,17 @@ public:
     ///         that and why the file was written in place. For a file name shorter than two
     ///         characters true, with nothing written and m_lastError untouched.
     bool SaveAtomically();
+
+    /// The bytes that Save() and SaveAtomically() write, in Latin-1. Nothing touches the disk.
+    QByteArray ToXml() const;
+
+    /// The names of all sections, in the order in which they are written. The current section stays
+    /// the current one.
+    QStringList sectionList() const;
+
+    /// The section that the last successful lookup found or WriteItem() or Load() made; null if
+    /// there is none. It is valid until sections are added or deleted.
+    TorkConfigFileSection const* CurrentSection() const { return m_currentSection; }
 
     /// Whether a section of exactly that name exists; `name` is used as it stands, blanks included.
     bool HasSection(QString const& name);
@@ -247,6 +287,10 @@ public:
     /// @return always true, also where WriteItem() refuses a null text
     bool ProcessContent(QString& content);
 
+    /// Whether ProcessContent() would take its text for a value: the element that opened last is an
+    /// item, or inside one, and has no value yet.
+    bool IsExpectingValue() const { return !m_atRoot && m_expectingValue; }
+
     /// Prepares a value for writing: wrapped in a CDATA section if it holds one of & ' < > ".
     ///
     /// Nothing else is escaped, so a value that holds "]]>" gives a file that does not parse.
@@ -262,9 +306,10 @@ private:
     void put(TorkConfigFileSection* section);
     QString const* findValue(QString const& section, QString const& key);
     QString const* findCleaned(QString const& section, QString const& key);
-    bool parse();
+    bool parseFile();
+    bool parse(QIODevice* device, TorkConfigFileDocHandler& handler, QXmlErrorHandler& errorHandler,
+               QXmlLexicalHandler* lexicalHandler);
     void fail(QString const& message);
-    QByteArray toXml();
 
     QString m_fileName;
     QString m_rootElementName;

@@ -11,10 +11,11 @@ class TorkConfigFile;
 
 /// Turns the toolkit's SAX events into the load steps of a TorkConfigFile.
 ///
-/// TorkConfigFile::Load() makes one for each load. It tracks the nesting depth and hands on only
-/// the first text after a start tag: that text is an item's value. Attributes are ignored, element
-/// names are the local names. Every event returns true: this handler never stops a parse.
-/// One parse on one thread.
+/// TorkConfigFile::Load() makes one for each load, and TorkConfigFile::LoadFrom() takes one of a
+/// class that derives from this one to see more of the document. It tracks the nesting depth and
+/// hands on only the first text after a start tag: that text is an item's value. Attributes are
+/// ignored, element names are the local names. Every event returns true: this handler never stops a
+/// parse. One parse on one thread.
 ///
 ///     TorkConfigFileDocHandler handler; // no file to fill: it only keeps track
 ///     QXmlSimpleReader reader;
@@ -52,6 +53,9 @@ public:
 
     /// How many elements are open; the root element has depth 1.
     int depth() const { return m_depth; }
+
+    /// Whether the next text would be the first one after a start tag.
+    bool isAtStartTag() const { return m_state == Opened; }
 
 private:
     enum State : int { Initial = 0, Opened = 1, ContentTaken = 2, Closed = 3 };

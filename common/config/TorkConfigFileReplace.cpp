@@ -324,7 +324,7 @@ bool TorkConfigFile::SaveAtomically()
     if (m_fileName.length() < 2) // as in Save()
         return true;
 
-    const Outcome outcome = ::Save(m_fileName, toXml());
+    const Outcome outcome = ::Save(m_fileName, ToXml());
     if (!outcome.failure.isEmpty())
         m_lastError = QObject::tr("Unable to save %1: %2").arg(m_fileName, outcome.failure);
     else if (!outcome.inPlaceBecause.isEmpty())

@@ -149,7 +149,7 @@ bool TorkConfigFile::Save()
         return true;
 
     // Made before the file is emptied, so that as little as possible can come between.
-    const QByteArray xml = toXml();
+    const QByteArray xml = ToXml();
     QFile file(m_fileName);
     if (IsPipe(m_fileName) || !file.open(QIODevice::WriteOnly)) {
         m_lastError = QStringLiteral("Unable to open file: %1").arg(m_fileName);
@@ -160,7 +160,7 @@ bool TorkConfigFile::Save()
     return true;
 }
 
-QByteArray TorkConfigFile::toXml()
+QByteArray TorkConfigFile::ToXml() const
 {
     QByteArray xml;
     AppendTag(xml, "<", m_rootElementName);

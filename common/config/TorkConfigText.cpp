@@ -9,6 +9,11 @@ constexpr QLatin1Char ValueEscape('\\');
 constexpr QLatin1Char NameEscape('_');
 constexpr int HexDigits = 4;
 
+bool IsDigit(QChar character)
+{
+    return character >= QLatin1Char('0') && character <= QLatin1Char('9');
+}
+
 bool IsLetter(QChar character)
 {
     return (character >= QLatin1Char('a') && character <= QLatin1Char('z')) ||
@@ -28,8 +33,21 @@ bool StaysInName(QChar character, bool isFirst)
     if (isFirst || IsLetter(character))
         return IsLetter(character);
 
-    return (character >= QLatin1Char('0') && character <= QLatin1Char('9')) ||
-           character == QLatin1Char('.') || character == QLatin1Char('-');
+    return IsDigit(character) || character == QLatin1Char('.') || character == QLatin1Char('-');
+}
+
+// Whether saving would fill in something at this "%": a line has the placeholders %1 to %3, and the
+// numbers of placeholders have up to two digits.
+bool IsPlaceholder(QString const& text, int percent)
+{
+    int i = percent + 1;
+    if (i < text.length() && text.at(i) == QLatin1Char('L'))
+        ++i;
+    int number = 0;
+    const int first = i;
+    for (; i < text.length() && i < first + 2 && IsDigit(text.at(i)); ++i)
+        number = 10 * number + text.at(i).digitValue();
+    return i > first && number <= 3;
 }
 
 QString Escaped(QLatin1Char escape, QChar character)
@@ -69,6 +87,25 @@ QString Decoded(Encoder encode, QLatin1Char escape, QString const& encoded, bool
 }
 
 } // namespace
+
+bool TorkConfigText::IsPlainValue(QString const& text)
+{
+    for (int i = 0; i < text.length(); ++i) {
+        const QChar character = text.at(i);
+        if (character > QChar(0x7f) || (character == QLatin1Char('%') && IsPlaceholder(text, i)))
+            return false;
+    }
+    return !text.isEmpty() && !text.contains(QLatin1String("]]>"));
+}
+
+bool TorkConfigText::IsPlainName(QString const& text)
+{
+    for (int i = 0; i < text.length(); ++i) {
+        if (text.at(i) != NameEscape && !StaysInName(text.at(i), i == 0))
+            return false;
+    }
+    return !text.isEmpty();
+}
 
 QString TorkConfigText::EncodeValue(QString const& text)
 {

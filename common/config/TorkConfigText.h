@@ -33,6 +33,15 @@
 class TorkConfigText
 {
 public:
+    /// Whether a file gives a value back as it is, without encoding: at least one character, ASCII
+    /// only, no "]]>", and no "%" or "%L" with a number from 0 to 3 after it.
+    static bool IsPlainValue(QString const& text);
+
+    /// Whether a file gives a section name or key back as it is, without encoding: ASCII letters,
+    /// digits, "_", "-" and ".", with a letter or "_" first. The name of the file's root element
+    /// does not come back although it is plain.
+    static bool IsPlainName(QString const& text);
+
     /// Encodes a text for the place of a value.
     static QString EncodeValue(QString const& text);
 

@@ -7,6 +7,7 @@
 #include "support/MessageCapture.h"
 #include "support/TestFiles.h"
 
+#include <QBuffer>
 #include <QTemporaryDir>
 #include <QtTest>
 
@@ -110,6 +111,9 @@ private slots:
     void stepsOutsideALoad();
     void stepsAfterALoad_data();
     void stepsAfterALoad();
+    void fromADevice();
+    void fromADeviceBroken();
+    void bytesThatSaveWrites();
 
 private:
     void checkLoad(QByteArray const& document, QString const& expected);
@@ -999,6 +1003,42 @@ void tst_TorkConfigFileLoad::stepsAfterALoad()
     QString name("s");
     file.StartElement(name);
     QCOMPARE(ConfigContents::of(file, {"s", "t"}), QString("t{}"));
+}
+
+void tst_TorkConfigFileLoad::fromADevice()
+{
+    QByteArray sample = Sample;
+    QBuffer buffer(&sample);
+    TorkConfigFile file(path(), "R");
+    file.m_lastError = "as before";
+    file.WriteItem("Earlier", "k", "v");
+    QVERIFY(file.LoadFrom(&buffer));
+    QCOMPARE(file.sectionList(), QStringList({"Main", "Empty", "Other"}));
+    QVERIFY(file.CurrentSection()->IsCalled("Other"));
+    QCOMPARE(file.m_lastError, QString("as before"));
+    QVERIFY(!QFile::exists(path()));
+}
+
+void tst_TorkConfigFileLoad::fromADeviceBroken()
+{
+    QByteArray broken = "<r><s><k>v</k></s><t>";
+    QBuffer buffer(&broken);
+    TorkConfigFile file(path());
+    const MessageCapture messages;
+    QVERIFY(!file.LoadFrom(&buffer));
+    QCOMPARE(messages.texts(), QStringList());
+    QCOMPARE(file.m_lastError, QString(""));
+    QCOMPARE(ConfigContents::of(file, {"s", "t"}), QString("s{k=[v]}t{}"));
+}
+
+void tst_TorkConfigFileLoad::bytesThatSaveWrites()
+{
+    TorkConfigFile file(path());
+    file.WriteItem("S", "k", "<\xE9");
+    file.SetRootElementName("R");
+    QVERIFY(file.Save());
+    QCOMPARE(file.ToXml(), TestFiles::read(path()));
+    QVERIFY(file.ToXml().startsWith("<R>\n<S>\n"));
 }
 
 QTEST_GUILESS_MAIN(tst_TorkConfigFileLoad)

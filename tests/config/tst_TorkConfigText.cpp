@@ -21,6 +21,10 @@ private slots:
     void otherTextStaysAsItIs_data();
     void otherTextStaysAsItIs();
     void okMayBeNull();
+    void isPlainName_data();
+    void isPlainName();
+    void isPlainValue_data();
+    void isPlainValue();
     void anyLocale_data();
     void anyLocale();
 };
@@ -163,6 +167,52 @@ void tst_TorkConfigText::okMayBeNull()
 {
     QCOMPARE(TorkConfigText::DecodeValue("\\u00ef", nullptr), QString(QChar(0xef)));
     QCOMPARE(TorkConfigText::DecodeName("a_u00EF"), QString("a_u00EF"));
+}
+
+void tst_TorkConfigText::isPlainName_data()
+{
+    QTest::addColumn<QString>("name");
+    QTest::addColumn<bool>("expected");
+    QTest::newRow("letters") << "abc" << true;
+    QTest::newRow("underscore first") << "_a" << true;
+    QTest::newRow("digits behind") << "a1.b-c" << true;
+    QTest::newRow("digit first") << "1a" << false;
+    QTest::newRow("blank") << "a b" << false;
+    QTest::newRow("markup") << "a<" << false;
+    QTest::newRow("empty") << "" << false;
+    QTest::newRow("umlaut") << QString::fromUtf8("\xC3\xA4") << false;
+    QTest::newRow("line feed behind") << "a\n" << false;
+}
+
+void tst_TorkConfigText::isPlainName()
+{
+    QFETCH(QString, name);
+    QTEST(TorkConfigText::IsPlainName(name), "expected");
+}
+
+void tst_TorkConfigText::isPlainValue_data()
+{
+    QTest::addColumn<QString>("value");
+    QTest::addColumn<bool>("expected");
+    QTest::newRow("letters") << "abc" << true;
+    QTest::newRow("blank") << " " << true;
+    QTest::newRow("markup") << "<&>" << true;
+    QTest::newRow("line feed") << "a\nb" << true;
+    QTest::newRow("percent sign") << "50 %" << true;
+    QTest::newRow("number above 3") << "%4" << true;
+    QTest::newRow("number of two digits") << "%10" << true;
+    QTest::newRow("placeholder") << "%1" << false;
+    QTest::newRow("placeholder of two digits") << "%03" << false;
+    QTest::newRow("localized placeholder") << "%L2" << false;
+    QTest::newRow("end of a CDATA section") << "a]]>" << false;
+    QTest::newRow("umlaut") << QString::fromUtf8("\xC3\xA4") << false;
+    QTest::newRow("empty") << "" << false;
+}
+
+void tst_TorkConfigText::isPlainValue()
+{
+    QFETCH(QString, value);
+    QTEST(TorkConfigText::IsPlainValue(value), "expected");
 }
 
 void tst_TorkConfigText::anyLocale_data()

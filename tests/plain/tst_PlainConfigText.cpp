@@ -9,6 +9,7 @@
 #include "common/config/TorkConfigFile.h"
 #include "common/config/TorkConfigText.h"
 
+#include <QBuffer>
 #include <QLocale>
 #include <QSet>
 #include <QTemporaryDir>
@@ -24,6 +25,8 @@ private slots:
     void everyUnit();
     void randomTexts();
     void randomEncodings();
+    void plainValues();
+    void plainNames();
     void cleanupTestCase();
 
 private:
@@ -32,6 +35,7 @@ private:
     int m_units = 0;
     int m_texts = 0;
     int m_encodings = 0;
+    int m_plain = 0;
 };
 
 namespace {
@@ -110,6 +114,51 @@ bool AllComeBack(QString const& path, QStringList const& texts)
         const QString text = TorkConfigText::DecodeName(key, &ok);
         return ok && (texts.size() > 100 || texts.contains(text));
     });
+}
+
+// What a file with one value gives back after saving.
+TorkConfigFile& Reloaded(TorkConfigFile& file, QString const& section, QString const& key,
+                         QString const& value)
+{
+    file.Clear();
+    file.WriteItem(section, key, value);
+    QByteArray xml = file.ToXml();
+    QBuffer buffer(&xml);
+    file.LoadFrom(&buffer);
+    return file;
+}
+
+bool IsKeptAsValue(QString const& text)
+{
+    TorkConfigFile file("x.cfg");
+    QString none;
+    QString value;
+    return Reloaded(file, "S", "k", text).ReadItem("S", "k", none, value) && value == text;
+}
+
+bool IsKeptAsName(QString const& text)
+{
+    TorkConfigFile file("x.cfg");
+    const bool asKey = Reloaded(file, "S", text, "v").keyList("S") == QStringList(text);
+    const bool asSection = Reloaded(file, text, "k", "v").sectionList() == QStringList(text);
+    return asKey && asSection;
+}
+
+// All texts of up to so many of the pieces, but the empty one.
+QStringList Combinations(QStringList const& pieces, int most)
+{
+    QStringList all;
+    QStringList last = {""};
+    for (int length = 1; length <= most; ++length) {
+        QStringList next;
+        for (QString const& start : qAsConst(last)) {
+            for (QString const& piece : pieces)
+                next.append(start + piece);
+        }
+        all += next;
+        last = next;
+    }
+    return all;
 }
 
 } // namespace
@@ -204,12 +253,42 @@ void tst_PlainConfigText::randomEncodings()
     }
 }
 
+// What is called a plain value comes back from a file without encoding, and nothing else does.
+void tst_PlainConfigText::plainValues()
+{
+    QStringList texts =
+        Combinations({"%", "L", "0", "1", "3", "4", "]]>", "<", "x"}, 4) + QStringList("");
+    for (int unit = 0; unit <= 0xffff; unit += unit < 0x200 ? 1 : Rounds::count(31, 1))
+        texts += {QChar(static_cast<ushort>(unit)), "a" + QString(QChar(static_cast<ushort>(unit))),
+                  "%" + QString(QChar(static_cast<ushort>(unit)))};
+    for (QString const& text : qAsConst(texts)) {
+        QVERIFY2(TorkConfigText::IsPlainValue(text) == IsKeptAsValue(text),
+                 qPrintable(Value(text)));
+        QVERIFY(TorkConfigText::IsPlainValue(Value(text)));
+    }
+    m_plain += texts.size();
+}
+
+void tst_PlainConfigText::plainNames()
+{
+    QStringList texts =
+        Combinations({"a", "Z", "_", "-", ".", "0", "9", ":", " ", ">", "/"}, 3) + QStringList("");
+    for (int unit = 0; unit <= 0xffff; unit += unit < 0x200 ? 1 : Rounds::count(31, 1))
+        texts +=
+            {QChar(static_cast<ushort>(unit)), "a" + QString(QChar(static_cast<ushort>(unit)))};
+    for (QString const& text : qAsConst(texts)) {
+        QVERIFY2(TorkConfigText::IsPlainName(text) == IsKeptAsName(text), qPrintable(Name(text)));
+        QVERIFY(TorkConfigText::IsPlainName(Name(text)));
+    }
+    m_plain += texts.size();
+}
+
 void tst_PlainConfigText::cleanupTestCase()
 {
     std::printf(
         "plain config text: %d single units and %d random texts came back as value, key and "
-        "section; %d random encodings decoded as they should\n",
-        m_units, m_texts, m_encodings);
+        "section; %d random encodings decoded as they should; %d texts told plain or not\n",
+        m_units, m_texts, m_encodings, m_plain);
     std::fflush(stdout);
 }
 

@@ -9,6 +9,8 @@
 #include "support/ProcessLimits.h"
 #include "support/TestFiles.h"
 
+#include <QFileSystemWatcher>
+#include <QSignalSpy>
 #include <QTemporaryDir>
 #include <QtTest>
 
@@ -55,11 +57,10 @@ private slots:
     void losses();
     void lossesOfNames_data();
     void lossesOfNames();
+    void lossesWriteNoFile();
     void sameValues_data();
     void sameValues();
     void valueByName();
-    void isName_data();
-    void isName();
     void save();
     void saveFails();
     void fullDisk();
@@ -95,6 +96,8 @@ void tst_SettingsFile::read_data()
     row("text in a section", "<S>text<a>1</a></S>", "[S] a=1", 1,
         "Line 2: the text \"text\" outside of values");
     row("instruction", "<?do it?><S><a>1</a></S>", "[S] a=1", 1, "Line 2: the instruction \"do\"");
+    row("section name beyond ASCII", "<\xC3\xA9><a>1</a></\xC3\xA9>", "[\xEF\xBF\xBD] a=1", 1,
+        "Line 2: the name of the section \"\xC3\xA9\"");
     row("section called like the root", "<R><a>1</a></R>", "", 2,
         "Line 2: the element \"R\", which is called like the root");
     QTest::newRow("declaration") << QByteArray("<?xml version=\"1.0\"?><R><S><a>1</a></S></R>")
@@ -252,8 +255,12 @@ void tst_SettingsFile::lossesOfNames_data()
     QTest::newRow("section without a name")
         << ""
         << "k" << QStringList(": the section has no name that the store can write");
-    QTest::newRow("section called as the root") << "Root"
-                                                << "k" << QStringList();
+    QTest::newRow("section called as the root")
+        << "Root"
+        << "k" << QStringList("Root: the section has the same name as the root element");
+    QTest::newRow("key called as the root")
+        << "S"
+        << "Root" << QStringList("S / Root: the value would read differently afterwards");
 }
 
 void tst_SettingsFile::lossesOfNames()
@@ -264,6 +271,27 @@ void tst_SettingsFile::lossesOfNames()
     document.rootName = "Root";
     document.SetValue(section, key, "v");
     QTEST(SettingsFileWriter::Losses(document), "expected");
+}
+
+// Neither where settings are kept nor where temporary files are.
+void tst_SettingsFile::lossesWriteNoFile()
+{
+    const QTemporaryDir folder;
+    const QByteArray temporary = qgetenv("TMPDIR");
+    qApp->setProperty("DataPath", QString(folder.path() + "/data/"));
+    qputenv("TMPDIR", QFile::encodeName(folder.path()));
+    QFileSystemWatcher watcher({folder.path()});
+    const QSignalSpy changes(&watcher, &QFileSystemWatcher::directoryChanged);
+    const QStringList losses = SettingsFileWriter::Losses(OneValue("%1"));
+    QTest::qWait(50);
+    if (temporary.isNull())
+        qunsetenv("TMPDIR");
+    else
+        qputenv("TMPDIR", temporary);
+    qApp->setProperty("DataPath", QVariant());
+    QCOMPARE(losses.size(), 1);
+    QCOMPARE(changes.size(), 0);
+    QCOMPARE(QDir(folder.path()).entryList(QDir::AllEntries | QDir::NoDotAndDotDot), QStringList());
 }
 
 void tst_SettingsFile::sameValues_data()
@@ -299,27 +327,6 @@ void tst_SettingsFile::valueByName()
     document.SetValue("T", "b", "4");
     document.SetValue("U", "a", "5");
     QCOMPARE(Joined(document), QString("[S] a=1 [T] a=3 b=4 [U] a=5"));
-}
-
-void tst_SettingsFile::isName_data()
-{
-    QTest::addColumn<QString>("name");
-    QTest::addColumn<bool>("expected");
-    QTest::newRow("letters") << "abc" << true;
-    QTest::newRow("underscore first") << "_a" << true;
-    QTest::newRow("digits behind") << "a1.b-c" << true;
-    QTest::newRow("digit first") << "1a" << false;
-    QTest::newRow("blank") << "a b" << false;
-    QTest::newRow("markup") << "a<" << false;
-    QTest::newRow("empty") << "" << false;
-    QTest::newRow("umlaut") << QString::fromUtf8("\xC3\xA4") << false;
-    QTest::newRow("line feed behind") << "a\n" << false;
-}
-
-void tst_SettingsFile::isName()
-{
-    QFETCH(QString, name);
-    QTEST(SettingsFileWriter::IsName(name), "expected");
 }
 
 void tst_SettingsFile::save()

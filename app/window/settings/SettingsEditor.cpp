@@ -8,6 +8,7 @@
 #include "app/window/settings/ValueDialog.h"
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
+#include "common/config/TorkConfigText.h"
 
 #include <QFile>
 #include <QFileInfo>
@@ -315,7 +316,7 @@ void SettingsEditor::checkNames(QTreeWidgetItem* item)
     QTreeWidgetItem* section = item->parent();
     QString name = FullText(item, 0);
     name.remove(QLatin1Char(' '));
-    if (!SettingsFileWriter::IsName(name)) {
+    if (!TorkConfigText::IsPlainName(name)) {
         Q_EMIT messageReported(tr("\"%1\" is no name for a section or key: %2")
                                    .arg(Shortened(name, ShownOfLong), NameRole()));
         name = section ? QStringLiteral("key") : QStringLiteral("Section");
