@@ -7,6 +7,8 @@
 #include "app/settingsfile/SettingsFileWriter.h"
 #include "common/log/TorkLog.h"
 
+#include <QDir>
+#include <QFileInfo>
 #include <QObject>
 #include <QRegularExpression>
 
@@ -21,35 +23,38 @@ QString Section()
     return QStringLiteral("config");
 }
 
+QString Switch(bool on)
+{
+    return on ? QStringLiteral("yes") : QStringLiteral("no");
+}
+
 } // namespace
 
 QString LogPreferences::FileName()
 {
     TorkLog const* log = TorkLog::logger();
-    if (!log)
-        return QString();
-    QString folder = log->path();
-    if (!folder.isEmpty() && !folder.endsWith(QLatin1Char('/')))
-        folder += QLatin1Char('/');
-    return folder + QLatin1String("logsettings.cfg");
+    return log ? log->preferencesFileName() : QString();
 }
 
 LogPreferences LogPreferences::Read()
 {
-    const SettingsDocument document = SettingsFileReader::Read(FileName());
     LogPreferences preferences;
+    TorkLog const* log = TorkLog::logger();
+    if (!log)
+        return preferences;
+
+    preferences.enabled = log->enabled();
+    preferences.elapsedTime = log->logElapsedTime();
+    preferences.echo = log->logPipeToConsole();
+    preferences.maxFiles = static_cast<int>(std::min(log->maxLogFiles(), 1000000U));
+
+    const SettingsDocument document = SettingsFileReader::Read(FileName());
     preferences.elapsedPrefix =
-        document.Value(Section(), QStringLiteral("elapsedTimePrefix"), QStringLiteral("dT:"));
-    preferences.dateFormat = document.Value(Section(), QStringLiteral("dateTimeFormat"),
-                                            QStringLiteral("yyyy-MM-dd hh:mm:ss.z"));
+        document.Value(Section(), QStringLiteral("elapsedTimePrefix"), log->elapsedTimePrefix());
+    preferences.dateFormat =
+        document.Value(Section(), QStringLiteral("dateTimeFormat"), log->dateTimeFormat());
     preferences.filePrefix =
-        document.Value(Section(), QStringLiteral("filePrefix"), QStringLiteral("logdata"));
-    if (TorkLog const* log = TorkLog::logger()) {
-        preferences.enabled = log->enabled();
-        preferences.elapsedTime = log->logElapsedTime();
-        preferences.echo = log->logPipeToConsole();
-        preferences.maxFiles = static_cast<int>(std::min(log->maxLogFiles(), 1000000U));
-    }
+        document.Value(Section(), QStringLiteral("filePrefix"), log->filePrefix());
     return preferences;
 }
 
@@ -58,30 +63,48 @@ QString LogPreferences::Apply() const
     TorkLog* log = TorkLog::logger();
     if (!log)
         return QObject::tr("There is no log.");
+
+    const auto files = static_cast<unsigned>(std::max(1, maxFiles));
+    const QString error = save(log->maxLogFileSize(), files);
+    if (!error.isEmpty())
+        return error;
+
     log->setEnable(enabled);
     log->setLogElapsedTime(elapsedTime);
     log->setLogPipeToConsole(echo);
-    const auto files = static_cast<unsigned>(std::max(1, maxFiles));
     if (log->maxLogFiles() > 100)
         log->setMaxLogFiles(files); // the setter goes down to 100 first
     log->setMaxLogFiles(files);
+    return QString();
+}
 
-    log->savePreferences();
-    SettingsDocument document = SettingsFileReader::Read(FileName());
-    if (!document.isParsed)
-        return QObject::tr("The settings file %1 could not be saved.").arg(FileName());
-    document.SetValue(Section(), QStringLiteral("elapsedTimePrefix"), elapsedPrefix);
-    document.SetValue(Section(), QStringLiteral("dateTimeFormat"), dateFormat);
-    document.SetValue(Section(), QStringLiteral("filePrefix"), filePrefix);
+// All of the log's settings, also the one that is not changed here: the file may be missing or may
+// not parse.
+QString LogPreferences::save(unsigned maxFileSize, unsigned files) const
+{
+    SettingsDocument document;
+    document.rootName = QStringLiteral("LogSettings");
+    const auto set = [&document](char const* key, QString const& value) {
+        document.SetValue(Section(), QLatin1String(key), value);
+    };
+    set("maxLogFiles", QString::number(files));
+    set("maxLogFileSize", QString::number(maxFileSize));
+    set("loggingEnabled", Switch(enabled));
+    set("logElapsedTime", Switch(elapsedTime));
+    set("dateTimeFormat", dateFormat);
+    set("elapsedTimePrefix", elapsedPrefix);
+    set("filePrefix", filePrefix);
+    set("logPipeToConsole", Switch(echo));
 
+    const QString fileName = FileName();
     QString error;
-    if (!SettingsFileWriter::Save(FileName(), document, &error))
-        return error;
-    const bool arrived = SettingsFileReader::Read(FileName()).HasSameValues(document);
+    QDir().mkpath(QFileInfo(fileName).path());
+    if (!SettingsFileWriter::Save(fileName, document, &error))
+        return QObject::tr("The settings file %1 could not be saved: %2").arg(fileName, error);
+    const bool arrived = SettingsFileReader::Read(fileName).HasSameValues(document);
     return arrived ? QString()
-                   : QObject::tr("The settings file %1 does not hold all of the "
-                                 "settings now.")
-                         .arg(FileName());
+                   : QObject::tr("The settings file %1 does not hold all of the settings now.")
+                         .arg(fileName);
 }
 
 bool LogPreferences::IsKept(QString const& text)
