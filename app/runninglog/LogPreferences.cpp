@@ -3,6 +3,7 @@
 
 #include "app/runninglog/LogPreferences.h"
 
+#include "app/runninglog/RunningLog.h"
 #include "app/settingsfile/SettingsFileReader.h"
 #include "app/settingsfile/SettingsFileWriter.h"
 #include "common/log/TorkLog.h"
@@ -39,22 +40,21 @@ QString LogPreferences::FileName()
 LogPreferences LogPreferences::Read()
 {
     LogPreferences preferences;
-    TorkLog const* log = TorkLog::logger();
-    if (!log)
-        return preferences;
-
-    preferences.enabled = log->enabled();
-    preferences.elapsedTime = log->logElapsedTime();
-    preferences.echo = log->logPipeToConsole();
-    preferences.maxFiles = static_cast<int>(std::min(log->maxLogFiles(), 1000000U));
+    if (TorkLog const* log = TorkLog::logger()) {
+        preferences.enabled = log->enabled();
+        preferences.elapsedTime = log->logElapsedTime();
+        preferences.echo = log->logPipeToConsole();
+        preferences.maxFiles = static_cast<int>(std::min(log->maxLogFiles(), 1000000U));
+        preferences.filePrefix = log->filePrefix();
+    }
 
     const SettingsDocument document = SettingsFileReader::Read(FileName());
     preferences.elapsedPrefix =
-        document.Value(Section(), QStringLiteral("elapsedTimePrefix"), log->elapsedTimePrefix());
+        document.Value(Section(), QStringLiteral("elapsedTimePrefix"), RunningLog::ElapsedPrefix());
     preferences.dateFormat =
-        document.Value(Section(), QStringLiteral("dateTimeFormat"), log->dateTimeFormat());
+        document.Value(Section(), QStringLiteral("dateTimeFormat"), RunningLog::DateFormat());
     preferences.filePrefix =
-        document.Value(Section(), QStringLiteral("filePrefix"), log->filePrefix());
+        document.Value(Section(), QStringLiteral("filePrefix"), preferences.filePrefix);
     return preferences;
 }
 
