@@ -3,10 +3,12 @@
 
 #include "app/runninglog/LogPreferences.h"
 
+#include "app/runninglog/RunningLog.h"
 #include "common/config/TorkConfigFile.h"
 #include "common/config/TorkConfigText.h"
 #include "common/log/TorkLog.h"
 
+#include <QDir>
 #include <QFile>
 #include <QFileInfo>
 #include <QObject>
@@ -22,12 +24,23 @@ QString Section()
     return QStringLiteral("config");
 }
 
+QString RootName()
+{
+    return QStringLiteral("LogSettings");
+}
+
+// The store refuses a null text; an empty one shows in the comparison after saving.
+QString NotNull(QString const& text)
+{
+    return text.isNull() ? QString(QLatin1String("")) : text;
+}
+
 // The settings file as the log reads it, but without the entries that this would make. Opening a
 // pipe would wait, and a device may have no end.
 class SettingsFile : public TorkConfigFile
 {
 public:
-    explicit SettingsFile(QString const& path) : TorkConfigFile(path, QStringLiteral("LogSettings"))
+    explicit SettingsFile(QString const& path) : TorkConfigFile(path, RootName())
     {
         QFile file(path);
         m_isLoaded = QFileInfo(path).isFile() && file.open(QIODevice::ReadOnly) && LoadFrom(&file);
@@ -35,19 +48,11 @@ public:
 
     bool isLoaded() const { return m_isLoaded; }
 
-    QString Value(char const* key, char const* byDefault)
+    QString Value(char const* key, QString defaultValue)
     {
-        QString none = QString::fromLatin1(byDefault);
         QString value;
-        ReadItem(Section(), QString::fromLatin1(key), none, value);
+        ReadItem(Section(), QString::fromLatin1(key), defaultValue, value);
         return value;
-    }
-
-    void SetValue(char const* key, QString const& value)
-    {
-        // The store refuses a null text; an empty one shows in the comparison after saving.
-        WriteItem(Section(), QString::fromLatin1(key),
-                  value.isNull() ? QString(QLatin1String("")) : value);
     }
 
 private:
@@ -59,27 +64,24 @@ private:
 QString LogPreferences::FileName()
 {
     TorkLog const* log = TorkLog::logger();
-    if (!log)
-        return QString();
-    QString folder = log->path();
-    if (!folder.isEmpty() && !folder.endsWith(QLatin1Char('/')))
-        folder += QLatin1Char('/');
-    return folder + QLatin1String("logsettings.cfg");
+    return log ? log->preferencesFileName() : QString();
 }
 
 LogPreferences LogPreferences::Read()
 {
-    SettingsFile file(FileName());
     LogPreferences preferences;
-    preferences.elapsedPrefix = file.Value("elapsedTimePrefix", "dT:");
-    preferences.dateFormat = file.Value("dateTimeFormat", "yyyy-MM-dd hh:mm:ss.z");
-    preferences.filePrefix = file.Value("filePrefix", "logdata");
     if (TorkLog const* log = TorkLog::logger()) {
         preferences.enabled = log->enabled();
         preferences.elapsedTime = log->logElapsedTime();
         preferences.echo = log->logPipeToConsole();
         preferences.maxFiles = static_cast<int>(std::min(log->maxLogFiles(), 1000000U));
+        preferences.filePrefix = log->filePrefix();
     }
+
+    SettingsFile file(FileName());
+    preferences.elapsedPrefix = file.Value("elapsedTimePrefix", RunningLog::ElapsedPrefix());
+    preferences.dateFormat = file.Value("dateTimeFormat", RunningLog::DateFormat());
+    preferences.filePrefix = file.Value("filePrefix", preferences.filePrefix);
     return preferences;
 }
 
@@ -88,30 +90,45 @@ QString LogPreferences::Apply() const
     TorkLog* log = TorkLog::logger();
     if (!log)
         return QObject::tr("There is no log.");
+
+    const auto files = static_cast<unsigned>(std::max(1, maxFiles));
+    const QString error = save(log->maxLogFileSize(), files);
+    if (!error.isEmpty())
+        return error;
+
     log->setEnable(enabled);
     log->setLogElapsedTime(elapsedTime);
     log->setLogPipeToConsole(echo);
-    const auto files = static_cast<unsigned>(std::max(1, maxFiles));
     if (log->maxLogFiles() > 100)
         log->setMaxLogFiles(files); // the setter goes down to 100 first
     log->setMaxLogFiles(files);
+    return QString();
+}
 
-    log->savePreferences();
-    SettingsFile file(FileName());
-    if (!file.isLoaded())
-        return QObject::tr("The settings file %1 could not be saved.").arg(FileName());
-    file.SetValue("elapsedTimePrefix", elapsedPrefix);
-    file.SetValue("dateTimeFormat", dateFormat);
-    file.SetValue("filePrefix", filePrefix);
+// All of the log's settings, also those that are not changed here: the file may be missing or may
+// not parse.
+QString LogPreferences::save(unsigned maxFileSize, unsigned files) const
+{
+    const QString fileName = FileName();
+    QDir().mkpath(QFileInfo(fileName).path());
+    TorkConfigFile file(fileName, RootName());
+    file.WriteItem(Section(), QStringLiteral("maxLogFiles"), files);
+    file.WriteItem(Section(), QStringLiteral("maxLogFileSize"), maxFileSize);
+    file.WriteBool(Section(), QStringLiteral("loggingEnabled"), enabled);
+    file.WriteBool(Section(), QStringLiteral("logElapsedTime"), elapsedTime);
+    file.WriteItem(Section(), QStringLiteral("dateTimeFormat"), NotNull(dateFormat));
+    file.WriteItem(Section(), QStringLiteral("elapsedTimePrefix"), NotNull(elapsedPrefix));
+    file.WriteItem(Section(), QStringLiteral("filePrefix"), NotNull(filePrefix));
+    file.WriteBool(Section(), QStringLiteral("logPipeToConsole"), echo);
     if (!file.SaveAtomically())
-        return file.m_lastError;
+        return QObject::tr("The settings file %1 could not be saved: %2")
+            .arg(fileName, file.m_lastError);
 
-    const SettingsFile readBack(FileName());
+    const SettingsFile readBack(fileName);
     const bool arrived = readBack.isLoaded() && readBack.ToXml() == file.ToXml();
     return arrived ? QString()
-                   : QObject::tr("The settings file %1 does not hold all of the "
-                                 "settings now.")
-                         .arg(FileName());
+                   : QObject::tr("The settings file %1 does not hold all of the settings now.")
+                         .arg(fileName);
 }
 
 // A control character would break the lines of the log.

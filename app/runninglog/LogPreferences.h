@@ -28,15 +28,17 @@ struct LogPreferences
     QString dateFormat;
     QString filePrefix;
 
-    /// What the log has in force, and for the rest what its settings file says.
+    /// What the log has in force; for the settings from the next start on what its settings file
+    /// says, if it says anything.
     static LogPreferences Read();
 
-    /// Puts them in force as far as that is possible, and saves all of them.
+    /// Saves all of them, then puts those that can be set at once in force.
     ///
-    /// @return the reason of a failure; empty if all is well
+    /// @return the reason of a failure, which leaves the running log as it was; empty if all is
+    ///     well
     QString Apply() const;
 
-    /// The log's settings file.
+    /// The log's settings file; empty if there is no log.
     static QString FileName();
 
     /// Whether the log's settings file keeps this text as a value, and it fits in a line of the
@@ -45,6 +47,9 @@ struct LogPreferences
 
     /// Whether log files can be called so: kept, no "/", and not "." or "..".
     static bool IsFilePrefix(QString const& text);
+
+private:
+    QString save(unsigned maxFileSize, unsigned files) const;
 };
 
 } // namespace Velocor

@@ -5,24 +5,24 @@
 
 #include "common/log/TorkLog.h"
 
-#include <QDir>
-#include <QFileInfo>
-
 namespace Velocor {
 
 QString RunningLog::FileName()
 {
-    TorkLog* log = TorkLog::logger();
-    if (!log)
-        return QString();
-    const QString name = log->newLogFileName();
-    if (QFileInfo::exists(name))
-        return name;
+    TorkLog const* log = TorkLog::logger();
+    return log ? log->currentLogFile() : QString();
+}
 
-    const QDir folder = QFileInfo(name).dir();
-    const QFileInfoList others =
-        folder.entryInfoList({QStringLiteral("*.log")}, QDir::Files, QDir::Time);
-    return others.isEmpty() ? name : folder.path() + QLatin1Char('/') + others.first().fileName();
+QString RunningLog::DateFormat()
+{
+    TorkLog const* log = TorkLog::logger();
+    return log ? log->dateTimeFormat() : TorkLog().dateTimeFormat();
+}
+
+QString RunningLog::ElapsedPrefix()
+{
+    TorkLog const* log = TorkLog::logger();
+    return log ? log->elapsedTimePrefix() : TorkLog().elapsedTimePrefix();
 }
 
 } // namespace Velocor

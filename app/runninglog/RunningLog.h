@@ -7,17 +7,18 @@
 
 namespace Velocor {
 
-/// The file that the running program's log writes to.
+/// What the running program's log writes, and where.
 class RunningLog
 {
 public:
-    /// Its path; empty if there is no log.
-    ///
-    /// The log opens its file when it makes its first entry, which tells of the loading of its
-    /// settings, and keeps it open. A name that those settings change is therefore not the open
-    /// file's: as long as nothing of that name is there, the log file that was written last is
-    /// meant.
+    /// Its path: of the open file, whatever the settings say by now, or of the one that the next
+    /// entry opens. Empty if there is no log.
     static QString FileName();
+
+    /// The format of its time stamps, as QDateTime::toString() takes it, and the text before its
+    /// elapsed times, both as they are in force; without a log the log's defaults.
+    static QString DateFormat();
+    static QString ElapsedPrefix();
 };
 
 } // namespace Velocor

@@ -7,11 +7,12 @@
 
 #include "common/log/TorkLogLock_p.h"
 #include "common/log/TorkLogStamp_p.h"
+#include "common/log/TorkLogWriter_p.h"
 
 TorkLog::TorkLog() : TorkLog(QString(QLatin1String(""))) {}
 
 TorkLog::TorkLog(QString const& path)
-    : QObject(nullptr),
+    : QObject(nullptr), m_writer(std::make_unique<TorkLogWriter>()),
       m_lastEntryTime(TorkLogStamp::timeOfDay(QDateTime::currentMSecsSinceEpoch()))
 {
     clear();
@@ -23,7 +24,7 @@ TorkLog::TorkLog(QString const& path)
 
 TorkLog::~TorkLog()
 {
-    closeFile();
+    m_writer->close();
 }
 
 void TorkLog::clear()

@@ -13,6 +13,9 @@
 #include <QtGlobal>
 
 #include <atomic>
+#include <memory>
+
+class TorkLogWriter;
 
 /// The process-wide log: one current file of one-line entries, and numbered older files.
 ///
@@ -169,6 +172,19 @@ public:
     /// @return always true
     bool setPreferencesFileName(QString const& name);
 
+    /// The full path of the settings file; empty before it is set. Any thread.
+    QString preferencesFileName() const;
+
+    /// The format in force for time stamps, as QDateTime::toString() takes it. Any thread.
+    QString dateTimeFormat() const;
+
+    /// The text in force before the elapsed time of an entry. Any thread.
+    QString elapsedTimePrefix() const;
+
+    /// The base name of the log files that are opened from now on; currentLogFile() tells the one
+    /// that is open. Any thread.
+    QString filePrefix() const;
+
     /// Whether the settings file exists.
     bool havePreferencesFile() const;
 
@@ -190,14 +206,7 @@ private:
     QFileInfo currentFile() const;
     static void makeLogDirectory(QString const& path);
     bool openFile(QString const& fileName);
-    bool closeFile();
     bool locate(int length);
-    bool placeEntry(int length);
-    void leavePlace();
-    bool isAtEnd() const;
-    void setAppending(bool appends);
-    void trimOpenFile(int length);
-    bool fits(qint64 size, int length) const;
     void shiftOldFiles(QString const& directory) const;
     void pruneOldFiles(QString const& directory, qint64 highest) const;
 
@@ -209,7 +218,6 @@ private:
 
     bool load();
     bool save();
-    QString preferencesFileName() const;
     void makeDirectoryOfPreferences(QString const& fileName) const;
     void setFilePrefix(QString const& prefix);
     void setDateTimeFormat(QString const& format);
@@ -223,7 +231,7 @@ private:
     QString m_filePrefix;
     QString m_filePrefixKey;
     QString m_fileExtension;
-    QFile m_file;
+    std::unique_ptr<TorkLogWriter> m_writer;
     QString m_errorString;
     QString m_fileSpec;
     QString m_logFileName;
@@ -245,12 +253,6 @@ private:
     QString m_logPipeToConsoleKey;
     int m_writing = 0;
     mutable QMutex m_mutex; // the files, and the texts that writing an entry reads
-
-    // How the open file is shared with other programs; see TorkLogPlace_p.h.
-    bool m_handedOut = false;  // for good: whoever has the file object may seek and write
-    bool m_followsEnd = false; // entries that go to the end are appended
-    bool m_appends = false;
-    bool m_keepsOthersOut = false;
 
     // Changes with every change of the date format, so that no stamp kept for the old one is
     // reused.

@@ -7,13 +7,12 @@
 
 #include "common/log/TorkLogLock_p.h"
 #include "common/log/TorkLogStamp_p.h"
+#include "common/log/TorkLogWriter_p.h"
 
 #include <QDebug>
 #include <QMessageLogger>
 
 #include <algorithm>
-
-TorkLog* TorkLog::m_gLog = nullptr;
 
 namespace {
 
@@ -99,10 +98,11 @@ void TorkLog::writeLine(ushort const* line, int length)
 
     TorkLogLock lock(m_mutex);
     m_writing = 1;
-    if (placeEntry(length)) {
-        m_file.write(bytes.constData(), length);
-        m_file.flush();
-        leavePlace();
+    // A file that is opened for this entry has its room already.
+    const bool wasOpen = m_writer->isOpen();
+    const qint64 limit = wasOpen ? qint64(m_maxLogFileSize) : TorkLogWriter::NoLimit;
+    if (wasOpen || locate(length)) {
+        m_writer->write(bytes.constData(), length, limit);
         if (m_logPipeToConsole)
             echo(QString(reinterpret_cast<QChar const*>(line), length));
     }

@@ -15,12 +15,11 @@
 #include "common/log/TorkLog.h"
 
 #include "common/log/TorkLogLock_p.h"
-#include "common/log/TorkLogPlace_p.h"
+#include "common/log/TorkLogWriter_p.h"
 
 #include <QDir>
 #include <QMap>
 #include <QTemporaryFile>
-#include <QTextStream>
 
 #include <algorithm>
 
@@ -163,7 +162,7 @@ QString& TorkLog::newLogFileName()
 QString TorkLog::currentLogFile() const
 {
     TorkLogLock lock(m_mutex);
-    return m_file.isOpen() ? m_file.fileName() : currentFilePath();
+    return m_writer->isOpen() ? m_writer->fileName() : currentFilePath();
 }
 
 bool TorkLog::open(QString const& fileName)
@@ -175,46 +174,15 @@ bool TorkLog::open(QString const& fileName)
 bool TorkLog::close()
 {
     TorkLogLock lock(m_mutex);
-    return closeFile();
+    return m_writer->close();
 }
 
 bool TorkLog::openFile(QString const& fileName)
 {
-    closeFile();
-    m_file.setFileName(fileName);
-    m_appends = false;
-    m_followsEnd = false;
-    // Looked at before, so that nobody who waits for a pipe is disturbed, and after, as its name
-    // may have come to mean another file.
-    // Neither appending nor truncating: entries go over the old content from its start on.
-    const bool mayBeLog = TorkLogPlace::mayBeLog(fileName);
-    const bool opened = mayBeLog && m_file.open(QIODevice::ReadWrite | QIODevice::Text);
-    if (mayBeLog && !opened) {
-        m_errorString = m_file.errorString();
-        return false;
-    }
-    if (!mayBeLog || !TorkLogPlace::mayBeLog(m_file)) {
-        m_file.close();
-        m_errorString = QStringLiteral("Not a regular file");
-        return false;
-    }
-    m_followsEnd = !m_handedOut && TorkLogPlace::isRegular(m_file);
-    return true;
-}
-
-bool TorkLog::closeFile()
-{
-    if (!m_file.isOpen())
-        return false;
-
-    m_file.flush();
-    m_file.close();
-    return true;
-}
-
-bool TorkLog::fits(qint64 size, int length) const
-{
-    return size < 1 || size + length <= qint64(m_maxLogFileSize);
+    const QString reason = m_writer->open(fileName);
+    if (!reason.isNull())
+        m_errorString = reason;
+    return reason.isNull();
 }
 
 // Empty for a hidden file: QDir::Files does not list one, so the log never looks at its size.
@@ -235,78 +203,16 @@ void TorkLog::makeLogDirectory(QString const& path)
 
 QFile* TorkLog::locateLogFile(QString const& text)
 {
-    if (m_file.isOpen() && m_followsEnd) {
-        setAppending(false);
-        const qint64 position = TorkLogPlace::position(m_file);
-        if (position >= 0 && position != m_file.pos())
-            m_file.seek(position);
-    }
-    m_handedOut = true;
-    m_followsEnd = false;
-    return locate(text.length()) ? &m_file : nullptr;
-}
-
-void TorkLog::setAppending(bool appends)
-{
-    TorkLogPlace::setAppending(m_file, appends);
-    m_appends = appends;
-}
-
-// Finds or opens the file for an entry of this length and the place in it where the entry goes:
-// over old content, or to the end. leavePlace() follows when it has been written.
-bool TorkLog::placeEntry(int length)
-{
-    const bool wasOpen = m_file.isOpen();
-    if (!wasOpen && !locate(length))
-        return false;
-    // Text that still waits for room on the disk has its place, and this entry follows it.
-    if (!m_followsEnd || !m_file.flush())
-        return !wasOpen || locate(length);
-
-    if (m_file.pos() == TorkLogPlace::size(m_file)) {
-        if (!m_appends)
-            setAppending(true);
-        return true;
-    }
-
-    // Old content follows, another program has cut the file down or added to it, or, after fork(),
-    // another process has moved on; only the system knows the position then.
-    m_keepsOthersOut = TorkLogPlace::keepOthersOut(m_file);
-    const qint64 size = TorkLogPlace::size(m_file);
-    const qint64 position = TorkLogPlace::position(m_file);
-    if (position >= size || !m_keepsOthersOut) {
-        setAppending(true);
-        if (position > size)
-            m_file.seek(size);
-        return true;
-    }
-    if (wasOpen && !fits(size, length)) {
-        setAppending(true);
-        trimOpenFile(length);
-    }
-    setAppending(isAtEnd());
-    return true;
-}
-
-bool TorkLog::isAtEnd() const
-{
-    return TorkLogPlace::position(m_file) >= TorkLogPlace::size(m_file);
-}
-
-void TorkLog::leavePlace()
-{
-    if (m_keepsOthersOut)
-        TorkLogPlace::letOthersIn(m_file);
-    m_keepsOthersOut = false;
+    QFile* file = m_writer->handOut();
+    return locate(text.length()) ? file : nullptr;
 }
 
 // Whether the file that `length` more characters go to is open. It may have been trimmed for them,
 // or have been opened for them.
 bool TorkLog::locate(int length)
 {
-    if (m_file.isOpen()) {
-        if (!fits(m_file.size(), length))
-            trimOpenFile(length);
+    if (m_writer->isOpen()) {
+        m_writer->trim(length, m_maxLogFileSize);
         return true;
     }
 
@@ -318,7 +224,7 @@ bool TorkLog::locate(int length)
 
     if (!current.isFile()) {
         openFile(currentFilePath());
-    } else if (fits(current.size(), length)) {
+    } else if (TorkLogWriter::fits(current.size(), length, m_maxLogFileSize)) {
         if (m_logFileName != current.filePath())
             m_logFileName = current.filePath();
         openFile(current.filePath());
@@ -326,34 +232,7 @@ bool TorkLog::locate(int length)
         deleteOldFiles();
         openFile(currentFilePath());
     }
-    return m_file.isOpen();
-}
-
-// Looks for old content after the last entry and, if there is any, cuts it down: without the
-// lines that the new text needs room for, and without their line ends. Usually nothing follows
-// and the file grows beyond its limit; it is rotated when it is next opened.
-void TorkLog::trimOpenFile(int length)
-{
-    QTextStream stream(&m_file);
-    stream.setCodec("ISO 8859-1"); // byte for byte, in any locale
-    stream.setAutoDetectUnicode(false);
-
-    QString kept;
-    qint64 count = 0;
-    bool keep = false;
-    while (!stream.atEnd()) {
-        const QString line = stream.readLine();
-        // A file that cannot be read never comes to its end, nor does one whose end this process
-        // has reached without knowing it, because another one wrote there after fork().
-        if (line.isNull())
-            break;
-        count += line.length();
-        keep = keep || count >= length;
-        if (keep)
-            kept += line;
-        m_file.resize(0);
-        stream << kept;
-    }
+    return m_writer->isOpen();
 }
 
 void TorkLog::deleteOldFiles()

@@ -68,6 +68,12 @@ qint64 TorkLogPlace::size(QFileDevice const& file)
     return ::fstat(file.handle(), &status) == 0 ? qint64(status.st_size) : 0;
 }
 
+int TorkLogPlace::write(QFileDevice const& file, char const* bytes, int length)
+{
+    const auto written = ::write(file.handle(), bytes, static_cast<size_t>(length));
+    return written < 0 ? 0 : static_cast<int>(written);
+}
+
 qint64 TorkLogPlace::position(QFileDevice const& file)
 {
     return ::lseek(file.handle(), 0, SEEK_CUR);
@@ -101,6 +107,16 @@ bool TorkLogPlace::isRegular(QFileDevice const&)
 }
 
 void TorkLogPlace::setAppending(QFileDevice const&, bool) {}
+
+int TorkLogPlace::write(QFileDevice const&, char const*, int)
+{
+    return 0;
+}
+
+qint64 TorkLogPlace::size(QFileDevice const& file)
+{
+    return file.size();
+}
 
 qint64 TorkLogPlace::position(QFileDevice const&)
 {

@@ -6,14 +6,8 @@
 #include <QFileDevice>
 #include <QString>
 
-/// What the log asks of the system about the file it writes. For the log's own sources; nothing
-/// here does anything on systems other than Unix.
-///
-/// Two programs that write one log file each keep a position of their own. Text that is written at
-/// a position beyond the end leaves a gap of NULs, and another program may cut the file down at any
-/// moment. So an entry that goes to the end is appended, wherever the end is by then; only writing
-/// over old text needs a position, and whoever does that or trims keeps the others from cutting the
-/// file down meanwhile. Alone in the file, both come to the same bytes.
+/// What TorkLogWriter asks of the system about the file it writes. For the log's own sources;
+/// nothing here does anything on systems other than Unix.
 namespace TorkLogPlace {
 
 /// Whether `fileName` may be opened as a log: not a pipe, socket or block device, where opening or
@@ -29,6 +23,11 @@ bool isRegular(QFileDevice const& file);
 /// From now on writes of this open file go to its end, or to its position; after fork() also those
 /// of the other process.
 void setAppending(QFileDevice const& file, bool appends);
+
+/// Hands bytes to the system past the file object, whose buffer must be empty.
+///
+/// @return how many the system took, from 0 to `length`
+int write(QFileDevice const& file, char const* bytes, int length);
 
 /// Where the system will write next; -1 if it cannot tell. After fork() the other process moves it.
 qint64 position(QFileDevice const& file);

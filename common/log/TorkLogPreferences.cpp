@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The settings file of the log, the life of the one log, and the toolkit's messages.
+// The settings file of the log.
 
 #include "common/log/TorkLog.h"
 
@@ -9,35 +9,14 @@
 #include "common/log/TorkLogLock_p.h"
 
 #include <QDir>
-#include <QStandardPaths>
 
-#include <mutex>
-#include <shared_mutex>
 #include <utility>
 
 namespace {
 
-// Held for reading while the message handler uses the log, so that shutdown() cannot delete the
-// log under a message of another thread.
-std::shared_mutex s_lifetime;
-
 QString Section()
 {
     return QStringLiteral("config");
-}
-
-int SeverityOf(QtMsgType type)
-{
-    switch (type) {
-    case QtWarningMsg:
-        return TorkLog::Warning;
-    case QtCriticalMsg:
-        return TorkLog::Error;
-    case QtFatalMsg:
-        return TorkLog::Fatal;
-    default:
-        return TorkLog::Trace;
-    }
 }
 
 bool ReadSwitch(TorkConfigFile& settings, QString const& key, bool defaultValue)
@@ -65,60 +44,6 @@ QString ReadText(TorkConfigFile& settings, QString const& key, QString defaultVa
 
 } // namespace
 
-void TorkLog_MessageHandler(QtMsgType type, QMessageLogContext const& context,
-                            QString const& message)
-{
-    if (TorkLogLock::isHeldHere()) {
-        TorkLog_DefaultMessageHandler()(type, context, message);
-        return;
-    }
-
-    std::shared_lock<std::shared_mutex> lock(s_lifetime);
-    if (TorkLog* log = TorkLog::m_gLog)
-        log->write(SeverityOf(type), message);
-}
-
-TorkLog* TorkLog::initialize(QString const& path, QString const& prefix,
-                             QString const& preferencesFileName, bool enable)
-{
-    {
-        std::unique_lock<std::shared_mutex> lock(s_lifetime);
-        if (m_gLog)
-            return m_gLog;
-        m_gLog = new TorkLog(path);
-    }
-
-    const QString dataLocation = QStandardPaths::writableLocation(QStandardPaths::DataLocation);
-    m_gLog->setOutputPath(path.isEmpty() ? dataLocation + QLatin1String("/logs/") : path);
-
-    qInstallMessageHandler(TorkLog_MessageHandler);
-
-    m_gLog->setFilePrefix(prefix); // before other threads' messages open the file
-    m_gLog->setEnable(enable);
-    m_gLog->setPreferencesFileName(preferencesFileName);
-    if (m_gLog->havePreferencesFile())
-        m_gLog->loadPreferences();
-    else
-        m_gLog->savePreferences();
-    return m_gLog;
-}
-
-TorkLog* TorkLog::initialize(QString const& prefix)
-{
-    const QString byDefault = QLatin1String("");
-    return initialize(byDefault, prefix, byDefault, true);
-}
-
-void TorkLog::shutdown()
-{
-    TorkLog* log = nullptr;
-    {
-        std::unique_lock<std::shared_mutex> lock(s_lifetime);
-        std::swap(log, m_gLog);
-    }
-    delete log;
-}
-
 bool TorkLog::setPreferencesFileName(QString const& name)
 {
     QString chosen = name.isEmpty() ? QStringLiteral("logsettings.cfg") : name;
@@ -137,6 +62,24 @@ QString TorkLog::preferencesFileName() const
 {
     TorkLogLock lock(m_mutex);
     return m_preferencesFileName;
+}
+
+QString TorkLog::dateTimeFormat() const
+{
+    TorkLogLock lock(m_mutex);
+    return m_dateTimeFormat;
+}
+
+QString TorkLog::elapsedTimePrefix() const
+{
+    TorkLogLock lock(m_mutex);
+    return m_elapsedTimePrefix;
+}
+
+QString TorkLog::filePrefix() const
+{
+    TorkLogLock lock(m_mutex);
+    return m_filePrefix;
 }
 
 bool TorkLog::havePreferencesFile() const

@@ -32,6 +32,7 @@ private slots:
     void saveFails();
     void load_data();
     void load();
+    void textsInForce();
     void loadedTexts();
     void loadOfMissingFile();
     void loadOfMalformedFile_data();
@@ -133,6 +134,7 @@ void tst_TorkLogPreferences::preferencesFileName()
     TorkLog log(path);
     QCOMPARE(log.setPreferencesFileName(name), true);
     QTEST(log.*privateField(PreferencesFileName()), "expected");
+    QTEST(log.preferencesFileName(), "expected");
 }
 
 void tst_TorkLogPreferences::preferencesFileNameTouchesNothing()
@@ -334,7 +336,27 @@ void tst_TorkLogPreferences::load()
     QCOMPARE(folder.listing(), QStringList());
 }
 
-// The two that only entries show.
+void tst_TorkLogPreferences::textsInForce()
+{
+    LogFolder folder;
+    TorkLog log(folder.logs());
+    QCOMPARE(log.preferencesFileName(), QString());
+    QCOMPARE(log.dateTimeFormat(), QString("yyyy-MM-dd hh:mm:ss.z"));
+    QCOMPARE(log.elapsedTimePrefix(), QString("dT:"));
+    QCOMPARE(log.filePrefix(), QString());
+
+    log.setPreferencesFileName(folder.settingsFile());
+    QVERIFY(TestFiles::write(folder.settingsFile(),
+                             config("<dateTimeFormat>yy</dateTimeFormat>"
+                                    "<elapsedTimePrefix>since</elapsedTimePrefix>"
+                                    "<filePrefix>my</filePrefix>")));
+    QVERIFY(log.loadPreferences());
+    QCOMPARE(log.dateTimeFormat(), QString("yy"));
+    QCOMPARE(log.elapsedTimePrefix(), QString("since"));
+    QCOMPARE(log.filePrefix(), QString("my"));
+}
+
+// Entries show what is in force.
 void tst_TorkLogPreferences::loadedTexts()
 {
     LogFolder folder;

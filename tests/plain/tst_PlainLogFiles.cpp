@@ -62,6 +62,7 @@ public:
         const bool opened = m_file.open(QIODevice::ReadWrite | QIODevice::Text);
         if (!opened)
             errorString = m_file.errorString();
+        m_file.seek(0); // else the first write seeks, if there was a file before
         return opened;
     }
 
@@ -76,17 +77,18 @@ public:
 
     void write(QString const& line)
     {
+        if (m_file.isOpen() && !m_isHandedOut)
+            m_file.seek(qMin(position(), m_file.size())); // cut down by somebody else
         if (!locate(line))
             return;
-        const qint64 position = lseek(m_file.handle(), 0, SEEK_CUR); // fork() may have moved it
-        if (!m_isHandedOut && position > m_file.size())
-            m_file.seek(m_file.size()); // cut down by somebody else
         m_file.write(line.toLatin1());
         m_file.flush();
     }
 
     QFile* locateLogFile(QString const& text)
     {
+        if (m_file.isOpen() && !m_isHandedOut)
+            m_file.seek(position());
         m_isHandedOut = true;
         return locate(text);
     }
@@ -123,6 +125,9 @@ public:
     }
 
 private:
+    // The file object does not know where another process has moved it after fork().
+    qint64 position() const { return lseek(m_file.handle(), 0, SEEK_CUR); }
+
     QFile* locate(QString const& text)
     {
         if (m_file.isOpen()) {

@@ -24,6 +24,8 @@ private slots:
     void preferences();
     void preferencesManyFiles();
     void preferencesCannotBeSaved();
+    void preferencesInAnotherFile();
+    void fileNameIsTheOpenOne();
     void isKept_data();
     void isKept();
     void instances();
@@ -55,6 +57,8 @@ void tst_RunningLog::preferences()
     QCOMPARE(preferences.Apply(), QString());
 
     // The first two hold at once, the others from the next start on.
+    QCOMPARE(RunningLog::DateFormat(), QString("yyyy-MM-dd hh:mm:ss.z"));
+    QCOMPARE(RunningLog::ElapsedPrefix(), QString("dT:"));
     TorkLog::logger()->trace("x");
     const QByteArray line = TestFiles::read(test.logFile());
     QVERIFY2(line.contains("Trace dT:[") && line.startsWith("20"), line);
@@ -70,6 +74,8 @@ void tst_RunningLog::preferences()
     QVERIFY2(QRegularExpression("\\A\\d\\d:\\d\\d Trace t=\\[").match(QString(next)).hasMatch(),
              next);
     QCOMPARE(RunningLog::FileName(), test.logFile());
+    QCOMPARE(RunningLog::DateFormat(), QString("hh:mm"));
+    QCOMPARE(RunningLog::ElapsedPrefix(), QString("t="));
 }
 
 // The log's setter takes a number above 100 down to 100 first.
@@ -87,11 +93,52 @@ void tst_RunningLog::preferencesManyFiles()
 void tst_RunningLog::preferencesCannotBeSaved()
 {
     const TestRun test;
-    const LogPreferences preferences = LogPreferences::Read();
+    LogPreferences preferences = LogPreferences::Read();
     const QString file = LogPreferences::FileName();
     QFile::remove(file);
     QVERIFY(QDir().mkpath(file + "/in the way"));
-    QCOMPARE(preferences.Apply(), "The settings file " + file + " could not be saved.");
+    preferences.enabled = false;
+    preferences.elapsedTime = true;
+    preferences.echo = true;
+    preferences.maxFiles = 7;
+    QCOMPARE(preferences.Apply(),
+             "The settings file " + file + " could not be saved: Not a regular file");
+
+    // The running log is as it was.
+    TorkLog const* log = TorkLog::logger();
+    QCOMPARE(log->enabled(), true);
+    QCOMPARE(log->logElapsedTime(), false);
+    QCOMPARE(log->logPipeToConsole(), false);
+    QCOMPARE(log->maxLogFiles(), 10U);
+}
+
+void tst_RunningLog::preferencesInAnotherFile()
+{
+    const TestRun test;
+    const QString file = test.folder() + "elsewhere/my.cfg";
+    TorkLog::logger()->setPreferencesFileName(file);
+    QCOMPARE(LogPreferences::FileName(), file);
+    QCOMPARE(LogPreferences::Read().filePrefix, QString("app")); // in force, as the file is missing
+
+    LogPreferences preferences = LogPreferences::Read();
+    preferences.maxFiles = 7;
+    QCOMPARE(preferences.Apply(), QString());
+    TorkLog::logger()->setMaxLogFiles(3);
+    QVERIFY(TorkLog::logger()->loadPreferences());
+    QCOMPARE(TorkLog::logger()->maxLogFiles(), 7U);
+    QCOMPARE(TorkLog::logger()->filePrefix(), QString("app"));
+}
+
+// Another log in the folder, newer than the open one, is not taken for it.
+void tst_RunningLog::fileNameIsTheOpenOne()
+{
+    const TestRun test;
+    TorkLog::logger()->trace("x");
+    QVERIFY(QFile::remove(test.logFile()));
+    QVERIFY(TestFiles::write(test.folder() + "data/logs/newer.log", "x"));
+    QCOMPARE(RunningLog::FileName(), test.logFile());
+    TorkLog::shutdown();
+    QCOMPARE(RunningLog::FileName(), QString());
 }
 
 void tst_RunningLog::isKept_data()

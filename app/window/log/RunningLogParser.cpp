@@ -3,14 +3,13 @@
 
 #include "app/window/log/RunningLogParser.h"
 
-#include "app/runninglog/LogPreferences.h"
+#include "app/runninglog/RunningLog.h"
 
 namespace Velocor {
 
 LogLineParser RunningLogParser()
 {
-    const LogPreferences preferences = LogPreferences::Read();
-    return LogLineParser({preferences.dateFormat}, {preferences.elapsedPrefix});
+    return LogLineParser({RunningLog::DateFormat()}, {RunningLog::ElapsedPrefix()});
 }
 
 } // namespace Velocor

@@ -7,7 +7,7 @@
 
 namespace Velocor {
 
-/// A parser for what the log of this run writes, by its settings file. GUI thread.
+/// A parser for what the log of this run writes, in the format that is in force. GUI thread.
 LogLineParser RunningLogParser();
 
 } // namespace Velocor

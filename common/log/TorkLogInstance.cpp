@@ -1,0 +1,92 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// The one log of a program, from its making to its end, and Qt's messages, which go to it.
+
+#include "common/log/TorkLog.h"
+
+#include "common/log/TorkLogLock_p.h"
+
+#include <QStandardPaths>
+
+#include <mutex>
+#include <shared_mutex>
+#include <utility>
+
+TorkLog* TorkLog::m_gLog = nullptr;
+
+namespace {
+
+// Held for reading while the message handler uses the log, so that shutdown() cannot delete the
+// log under a message of another thread.
+std::shared_mutex s_lifetime;
+
+int SeverityOf(QtMsgType type)
+{
+    switch (type) {
+    case QtWarningMsg:
+        return TorkLog::Warning;
+    case QtCriticalMsg:
+        return TorkLog::Error;
+    case QtFatalMsg:
+        return TorkLog::Fatal;
+    default:
+        return TorkLog::Trace;
+    }
+}
+
+} // namespace
+
+void TorkLog_MessageHandler(QtMsgType type, QMessageLogContext const& context,
+                            QString const& message)
+{
+    if (TorkLogLock::isHeldHere()) {
+        TorkLog_DefaultMessageHandler()(type, context, message);
+        return;
+    }
+
+    std::shared_lock<std::shared_mutex> lock(s_lifetime);
+    if (TorkLog* log = TorkLog::m_gLog)
+        log->write(SeverityOf(type), message);
+}
+
+TorkLog* TorkLog::initialize(QString const& path, QString const& prefix,
+                             QString const& preferencesFileName, bool enable)
+{
+    {
+        std::unique_lock<std::shared_mutex> lock(s_lifetime);
+        if (m_gLog)
+            return m_gLog;
+        m_gLog = new TorkLog(path);
+    }
+
+    const QString dataLocation = QStandardPaths::writableLocation(QStandardPaths::DataLocation);
+    m_gLog->setOutputPath(path.isEmpty() ? dataLocation + QLatin1String("/logs/") : path);
+
+    qInstallMessageHandler(TorkLog_MessageHandler);
+
+    m_gLog->setFilePrefix(prefix); // before other threads' messages open the file
+    m_gLog->setEnable(enable);
+    m_gLog->setPreferencesFileName(preferencesFileName);
+    if (m_gLog->havePreferencesFile())
+        m_gLog->loadPreferences();
+    else
+        m_gLog->savePreferences();
+    return m_gLog;
+}
+
+TorkLog* TorkLog::initialize(QString const& prefix)
+{
+    const QString byDefault = QLatin1String("");
+    return initialize(byDefault, prefix, byDefault, true);
+}
+
+void TorkLog::shutdown()
+{
+    TorkLog* log = nullptr;
+    {
+        std::unique_lock<std::shared_mutex> lock(s_lifetime);
+        std::swap(log, m_gLog);
+    }
+    delete log;
+}

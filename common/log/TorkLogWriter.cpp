@@ -1,0 +1,156 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "common/log/TorkLogWriter_p.h"
+
+#include "common/log/TorkLogPlace_p.h"
+
+#include <QTextStream>
+
+QString TorkLogWriter::open(QString const& fileName)
+{
+    close();
+    m_file.setFileName(fileName);
+    m_followsEnd = false;
+    m_end = -1;
+    // Checked before, so that nobody who waits for a pipe is disturbed, and after, as the name may
+    // have come to mean another file.
+    // Neither appending nor truncating: entries go over the old content from its start on.
+    const bool mayBeLog = TorkLogPlace::mayBeLog(fileName);
+    const bool opened = mayBeLog && m_file.open(QIODevice::ReadWrite | QIODevice::Text);
+    if (mayBeLog && !opened)
+        return m_file.errorString();
+    if (!mayBeLog || !TorkLogPlace::mayBeLog(m_file)) {
+        m_file.close();
+        return QStringLiteral("Not a regular file");
+    }
+    // Qt compares with the position in the file before, and would seek with the first write, which
+    // after fork() would take the other process back to the start, too.
+    m_file.seek(0);
+    m_followsEnd = !m_handedOut && TorkLogPlace::isRegular(m_file);
+    return QString();
+}
+
+bool TorkLogWriter::close()
+{
+    if (!m_file.isOpen())
+        return false;
+
+    m_file.flush();
+    m_file.close();
+    return true;
+}
+
+QFile* TorkLogWriter::handOut()
+{
+    if (m_file.isOpen() && m_followsEnd) {
+        TorkLogPlace::setAppending(m_file, false);
+        takePosition();
+    }
+    m_handedOut = true;
+    m_followsEnd = false;
+    return &m_file;
+}
+
+void TorkLogWriter::write(char const* bytes, int length, qint64 limit)
+{
+    // Past the file object, which would copy the entry into its buffer and out again at twice the
+    // cost. The file object gets what the system does not take.
+    const bool isPlaced = place(length, limit);
+    const int written = isPlaced ? TorkLogPlace::write(m_file, bytes, length) : 0;
+    if (isPlaced && written < length)
+        takePosition();
+    if (!isPlaced || written < length) {
+        m_file.write(bytes + written, length - written);
+        m_file.flush();
+    }
+    if (m_keepsOthersOut)
+        TorkLogPlace::letOthersIn(m_file);
+    m_keepsOthersOut = false;
+}
+
+// Makes the system's position that of an entry. Returns false if the entry must go through the file
+// object, because the file was handed out or earlier text still waits there.
+bool TorkLogWriter::place(int length, qint64 limit)
+{
+    // Text that waits for room on the disk has its place, and this entry follows it.
+    if (!m_followsEnd || !m_file.flush()) {
+        m_end = -1;
+        trim(length, limit);
+        return false;
+    }
+
+    const qint64 size = TorkLogPlace::size(m_file);
+    if (m_end == size) {
+        m_end += length;
+        return true;
+    }
+
+    // The first entry, or old content follows, another program has cut the file down or added to
+    // it, or, after fork(), another process has moved on; only the system knows the position then.
+    m_keepsOthersOut = TorkLogPlace::keepOthersOut(m_file);
+    return findPlace(length, limit);
+}
+
+// The same for an entry that may not belong to where the last one ended.
+bool TorkLogWriter::findPlace(int length, qint64 limit)
+{
+    qint64 size = TorkLogPlace::size(m_file);
+    qint64 position = TorkLogPlace::position(m_file);
+    if (position < size && m_keepsOthersOut && !fits(size, length, limit)) {
+        TorkLogPlace::setAppending(m_file, true);
+        takePosition();
+        cut(length);
+        size = TorkLogPlace::size(m_file);
+        position = TorkLogPlace::position(m_file);
+    }
+
+    const bool appends = position >= size || !m_keepsOthersOut;
+    TorkLogPlace::setAppending(m_file, appends);
+    if (position > size)
+        m_file.seek(size);
+    m_end = appends ? size + length : -1;
+    return m_file.flush();
+}
+
+// Tells the file object where the system will write next, which it does not learn from what is
+// written past it or by another process after fork().
+void TorkLogWriter::takePosition()
+{
+    const qint64 position = TorkLogPlace::position(m_file);
+    if (position >= 0 && position != m_file.pos())
+        m_file.seek(position);
+}
+
+void TorkLogWriter::trim(int length, qint64 limit)
+{
+    if (limit != NoLimit && !fits(m_file.size(), length, limit))
+        cut(length);
+}
+
+// Looks for old content after the last entry and, if there is any, cuts it down: without the
+// lines that the new text needs room for, and without their line ends. Usually nothing follows
+// and the file grows beyond its limit; it is rotated when it is next opened.
+void TorkLogWriter::cut(int length)
+{
+    QTextStream stream(&m_file);
+    stream.setCodec("ISO 8859-1"); // byte for byte, in any locale
+    stream.setAutoDetectUnicode(false);
+
+    QString kept;
+    qint64 count = 0;
+    bool keep = false;
+    while (!stream.atEnd()) {
+        const QString line = stream.readLine();
+        // A file that cannot be read never comes to its end, nor does one whose end is not where
+        // the file object takes it to be.
+        if (line.isNull())
+            break;
+        count += line.length();
+        keep = keep || count >= length;
+        if (keep)
+            kept += line;
+        m_file.resize(0);
+        stream << kept;
+    }
+}
