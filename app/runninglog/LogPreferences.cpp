@@ -121,8 +121,7 @@ QString LogPreferences::save(unsigned maxFileSize, unsigned files) const
     file.WriteItem(Section(), QStringLiteral("filePrefix"), NotNull(filePrefix));
     file.WriteBool(Section(), QStringLiteral("logPipeToConsole"), echo);
     if (!file.SaveAtomically())
-        return QObject::tr("The settings file %1 could not be saved: %2")
-            .arg(fileName, file.m_lastError);
+        return file.m_lastError;
 
     const SettingsFile readBack(fileName);
     const bool arrived = readBack.isLoaded() && readBack.ToXml() == file.ToXml();

@@ -64,7 +64,8 @@ void tst_Snippets::headerShowsCompiledExample_data()
             QDir(QStringLiteral(PROJECT_FOLDER "/") + folder).entryList({"*.h"}, QDir::Files);
         QVERIFY2(!headers.isEmpty(), qPrintable(folder));
         for (QString const& header : headers) {
-            if (!header.endsWith("_p.h"))
+            // A member of both writers, which no application names.
+            if (!header.endsWith("_p.h") && header != "TorkXmlLayout.h")
                 QTest::newRow(qPrintable(header)) << folder + '/' + header;
         }
     }

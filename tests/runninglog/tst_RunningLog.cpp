@@ -101,8 +101,7 @@ void tst_RunningLog::preferencesCannotBeSaved()
     preferences.elapsedTime = true;
     preferences.echo = true;
     preferences.maxFiles = 7;
-    QCOMPARE(preferences.Apply(),
-             "The settings file " + file + " could not be saved: Not a regular file");
+    QCOMPARE(preferences.Apply(), "Unable to save " + file + ": Is a directory");
 
     // The running log is as it was.
     TorkLog const* log = TorkLog::logger();

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-#include "common/xml/TorkXmlLayout.h"
+#include "common/xml/TorkXmlResult.h"
 #include "common/xml/TorkXmlStream.h"
 
 #include <QtDebug>
