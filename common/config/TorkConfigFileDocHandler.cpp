@@ -5,6 +5,17 @@
 
 #include "common/config/TorkConfigFile.h"
 
+namespace {
+
+// The reader fills the same text again for the next element. Sharing it would make the reader
+// allocate a new one each time, with room to grow, which a load pays for with every key and value.
+QString Unshared(QString const& text)
+{
+    return text.isNull() ? text : QString(text.constData(), text.length());
+}
+
+} // namespace
+
 TorkConfigFileDocHandler::TorkConfigFileDocHandler() : TorkConfigFileDocHandler(nullptr) {}
 
 TorkConfigFileDocHandler::TorkConfigFileDocHandler(TorkConfigFile* file)
@@ -37,7 +48,7 @@ bool TorkConfigFileDocHandler::endPrefixMapping(QString const&)
 bool TorkConfigFileDocHandler::startElement(QString const&, QString const& localName,
                                             QString const&, QXmlAttributes const&)
 {
-    m_lastOpenedElement = localName;
+    m_lastOpenedElement = Unshared(localName);
     m_state = Opened;
     ++m_depth;
     if (m_file)
@@ -47,7 +58,7 @@ bool TorkConfigFileDocHandler::startElement(QString const&, QString const& local
 
 bool TorkConfigFileDocHandler::endElement(QString const&, QString const& localName, QString const&)
 {
-    m_lastClosedElement = localName;
+    m_lastClosedElement = Unshared(localName);
     m_state = Closed;
     --m_depth;
     if (m_file)
@@ -60,7 +71,7 @@ bool TorkConfigFileDocHandler::characters(QString const& text)
     if (m_state != Opened)
         return true;
 
-    m_content = text;
+    m_content = Unshared(text);
     m_state = ContentTaken;
     if (m_file)
         m_file->ProcessContent(m_content);
