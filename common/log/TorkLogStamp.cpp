@@ -89,7 +89,7 @@ QString Stamp(QDateTime const& time, QString const& format)
 
 } // namespace
 
-int TorkLogStamp::timeOfDay(qint64 now)
+int TorkLogStamp::TimeOfDay(qint64 now)
 {
     if (!IsKept(now)) {
         const QByteArray zone = Zone();
@@ -98,7 +98,7 @@ int TorkLogStamp::timeOfDay(qint64 now)
     return t_kept.timeOfDay;
 }
 
-int TorkLogStamp::append(TorkLogLine& line, qint64 now, quint64 generation)
+int TorkLogStamp::Append(TorkLogLine& line, qint64 now, quint64 generation)
 {
     Kept const& kept = t_kept;
     if (kept.generation != generation || !IsKept(now))
@@ -107,7 +107,7 @@ int TorkLogStamp::append(TorkLogLine& line, qint64 now, quint64 generation)
     return kept.timeOfDay;
 }
 
-int TorkLogStamp::make(TorkLogLine& line, qint64 now, QString const& format, quint64 generation)
+int TorkLogStamp::Make(TorkLogLine& line, qint64 now, QString const& format, quint64 generation)
 {
     const QByteArray zone = Zone();
     const QDateTime time = QDateTime::fromMSecsSinceEpoch(now);
