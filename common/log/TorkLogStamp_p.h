@@ -7,6 +7,8 @@
 #include <QVarLengthArray>
 #include <QtGlobal>
 
+#include <mutex>
+
 /// The text of an entry while it is built: on the stack, as allocating memory costs as much as
 /// filling it.
 using TorkLogLine = QVarLengthArray<ushort, 512>;
@@ -35,5 +37,9 @@ int Append(TorkLogLine& line, qint64 now, quint64 generation);
 ///
 /// @param generation  unique to this format among all logs, and never 0
 int Make(TorkLogLine& line, qint64 now, QString const& format, quint64 generation);
+
+/// Held by each of these functions. Qt's environment and the C library's time zone have locks of
+/// their own; while the caller holds this one, no entry of any log holds those.
+std::mutex& Mutex();
 
 } // namespace TorkLogStamp
