@@ -13,7 +13,7 @@ TorkLog::TorkLog() : TorkLog(QString(QLatin1String(""))) {}
 
 TorkLog::TorkLog(QString const& path)
     : QObject(nullptr), m_writer(std::make_unique<TorkLogWriter>()),
-      m_lastEntryTime(TorkLogStamp::timeOfDay(QDateTime::currentMSecsSinceEpoch()))
+      m_lastEntryTime(TorkLogStamp::TimeOfDay(QDateTime::currentMSecsSinceEpoch()))
 {
     clear();
     m_path = path;

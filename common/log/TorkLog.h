@@ -222,6 +222,8 @@ private:
     void setFilePrefix(QString const& prefix);
     void setDateTimeFormat(QString const& format);
 
+    static void registerForkHandlers();
+
     // Each setting that the settings file keeps stands beside its key.
     QString m_path;
     std::atomic<quint32> m_maxLogFiles{0};

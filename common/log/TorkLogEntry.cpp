@@ -63,7 +63,7 @@ QString& TorkLog::severityName(EventSeverity severity)
 void TorkLog::write(int severity, QString const& message)
 {
     const qint64 now = QDateTime::currentMSecsSinceEpoch();
-    m_lastEntryTime = m_enabled ? writeEntry(now, severity, message) : TorkLogStamp::timeOfDay(now);
+    m_lastEntryTime = m_enabled ? writeEntry(now, severity, message) : TorkLogStamp::TimeOfDay(now);
 }
 
 // Returns the time of day of `now`.
@@ -121,7 +121,7 @@ void TorkLog::echo(QString const& line) const
 // Returns the time of day of `now`.
 int TorkLog::appendStamp(TorkLogLine& line, qint64 now) const
 {
-    const int timeOfDay = TorkLogStamp::append(line, now, m_formatGeneration);
+    const int timeOfDay = TorkLogStamp::Append(line, now, m_formatGeneration);
     if (timeOfDay >= 0)
         return timeOfDay;
 
@@ -132,7 +132,7 @@ int TorkLog::appendStamp(TorkLogLine& line, qint64 now) const
         format = m_dateTimeFormat;
         generation = m_formatGeneration;
     }
-    return TorkLogStamp::make(line, now, format, generation);
+    return TorkLogStamp::Make(line, now, format, generation);
 }
 
 // Between times of day only: an interval across midnight comes out negative.

@@ -6,12 +6,19 @@
 #include "common/log/TorkLog.h"
 
 #include "common/log/TorkLogLock_p.h"
+#include "common/log/TorkLogStamp_p.h"
 
 #include <QStandardPaths>
 
 #include <mutex>
+#include <new>
+#include <optional>
 #include <shared_mutex>
 #include <utility>
+
+#ifdef Q_OS_UNIX
+#include <pthread.h>
+#endif
 
 TorkLog* TorkLog::m_gLog = nullptr;
 
@@ -20,6 +27,18 @@ namespace {
 // Held for reading while the message handler uses the log, so that shutdown() cannot delete the
 // log under a message of another thread.
 std::shared_mutex s_lifetime;
+
+#ifdef Q_OS_UNIX
+// What a thread holds while it forks, in the order in which everybody takes these locks. It holds
+// none of them before, because nothing that runs under one forks.
+struct ForkLocks
+{
+    std::shared_lock<std::shared_mutex> lifetime;
+    std::optional<TorkLogLock> log;
+    std::unique_lock<std::mutex> stamps;
+};
+thread_local ForkLocks t_forkLocks;
+#endif
 
 int SeverityOf(QtMsgType type)
 {
@@ -50,9 +69,38 @@ void TorkLog_MessageHandler(QtMsgType type, QMessageLogContext const& context,
         log->write(SeverityOf(type), message);
 }
 
+// A child has only the thread that forked it. Without these handlers it would inherit the locks
+// that other threads hold just then, and nobody there would release them.
+void TorkLog::registerForkHandlers()
+{
+#ifdef Q_OS_UNIX
+    const auto prepare = [] {
+        t_forkLocks.lifetime = std::shared_lock<std::shared_mutex>(s_lifetime);
+        if (m_gLog)
+            t_forkLocks.log.emplace(m_gLog->m_mutex);
+        t_forkLocks.stamps = std::unique_lock<std::mutex>(TorkLogStamp::Mutex());
+    };
+    const auto inParent = [] {
+        t_forkLocks.stamps.unlock();
+        t_forkLocks.log.reset();
+        t_forkLocks.lifetime.unlock();
+    };
+    const auto inChild = [] {
+        t_forkLocks.stamps.unlock();
+        t_forkLocks.log.reset();
+        // Counts readers that are not in the child, so it cannot be unlocked, only replaced.
+        t_forkLocks.lifetime.release();
+        new (&s_lifetime) std::shared_mutex;
+    };
+    static const int registered = ::pthread_atfork(prepare, inParent, inChild);
+    Q_UNUSED(registered)
+#endif
+}
+
 TorkLog* TorkLog::initialize(QString const& path, QString const& prefix,
                              QString const& preferencesFileName, bool enable)
 {
+    registerForkHandlers();
     {
         std::unique_lock<std::shared_mutex> lock(s_lifetime);
         if (m_gLog)

@@ -14,7 +14,7 @@
 
 namespace {
 
-bool MayBeLog(struct stat const& status)
+bool IsLogType(struct stat const& status)
 {
     // A directory is left to QFile, which knows what to say about it.
     return S_ISREG(status.st_mode) || S_ISCHR(status.st_mode) || S_ISDIR(status.st_mode);
@@ -31,25 +31,25 @@ bool SetLock(QFileDevice const& file, short type)
 
 } // namespace
 
-bool TorkLogPlace::mayBeLog(QString const& fileName)
+bool TorkLogPlace::MayBeLog(QString const& fileName)
 {
     struct stat status = {};
-    return ::stat(QFile::encodeName(fileName).constData(), &status) != 0 || MayBeLog(status);
+    return ::stat(QFile::encodeName(fileName).constData(), &status) != 0 || IsLogType(status);
 }
 
-bool TorkLogPlace::mayBeLog(QFileDevice const& file)
+bool TorkLogPlace::MayBeLog(QFileDevice const& file)
 {
     struct stat status = {};
-    return ::fstat(file.handle(), &status) != 0 || MayBeLog(status);
+    return ::fstat(file.handle(), &status) != 0 || IsLogType(status);
 }
 
-bool TorkLogPlace::isRegular(QFileDevice const& file)
+bool TorkLogPlace::IsRegular(QFileDevice const& file)
 {
     struct stat status = {};
     return ::fstat(file.handle(), &status) == 0 && S_ISREG(status.st_mode);
 }
 
-void TorkLogPlace::setAppending(QFileDevice const& file, bool appends)
+void TorkLogPlace::SetAppending(QFileDevice const& file, bool appends)
 {
     const int flags = ::fcntl(file.handle(), F_GETFL);
     const int wanted = appends ? flags | O_APPEND : flags & ~O_APPEND;
@@ -57,7 +57,7 @@ void TorkLogPlace::setAppending(QFileDevice const& file, bool appends)
         ::fcntl(file.handle(), F_SETFL, wanted);
 }
 
-qint64 TorkLogPlace::size(QFileDevice const& file)
+qint64 TorkLogPlace::Size(QFileDevice const& file)
 {
 #ifdef STATX_SIZE
     struct statx some = {};
@@ -68,66 +68,66 @@ qint64 TorkLogPlace::size(QFileDevice const& file)
     return ::fstat(file.handle(), &status) == 0 ? qint64(status.st_size) : 0;
 }
 
-int TorkLogPlace::write(QFileDevice const& file, char const* bytes, int length)
+int TorkLogPlace::Write(QFileDevice const& file, char const* bytes, int length)
 {
     const auto written = ::write(file.handle(), bytes, static_cast<size_t>(length));
     return written < 0 ? 0 : static_cast<int>(written);
 }
 
-qint64 TorkLogPlace::position(QFileDevice const& file)
+qint64 TorkLogPlace::Position(QFileDevice const& file)
 {
     return ::lseek(file.handle(), 0, SEEK_CUR);
 }
 
-bool TorkLogPlace::keepOthersOut(QFileDevice const& file)
+bool TorkLogPlace::KeepOthersOut(QFileDevice const& file)
 {
     return SetLock(file, F_WRLCK);
 }
 
-void TorkLogPlace::letOthersIn(QFileDevice const& file)
+void TorkLogPlace::LetOthersIn(QFileDevice const& file)
 {
     SetLock(file, F_UNLCK);
 }
 
 #else
 
-bool TorkLogPlace::mayBeLog(QString const&)
+bool TorkLogPlace::MayBeLog(QString const&)
 {
     return true;
 }
 
-bool TorkLogPlace::mayBeLog(QFileDevice const&)
+bool TorkLogPlace::MayBeLog(QFileDevice const&)
 {
     return true;
 }
 
-bool TorkLogPlace::isRegular(QFileDevice const&)
+bool TorkLogPlace::IsRegular(QFileDevice const&)
 {
     return false; // there entries are not placed among those of other programs
 }
 
-void TorkLogPlace::setAppending(QFileDevice const&, bool) {}
+void TorkLogPlace::SetAppending(QFileDevice const&, bool) {}
 
-int TorkLogPlace::write(QFileDevice const&, char const*, int)
+int TorkLogPlace::Write(QFileDevice const&, char const*, int)
 {
     return 0;
 }
 
-qint64 TorkLogPlace::size(QFileDevice const& file)
+qint64 TorkLogPlace::Size(QFileDevice const& file)
 {
     return file.size();
 }
 
-qint64 TorkLogPlace::position(QFileDevice const&)
+qint64 TorkLogPlace::Position(QFileDevice const&)
 {
     return -1;
 }
 
-bool TorkLogPlace::keepOthersOut(QFileDevice const&)
+bool TorkLogPlace::KeepOthersOut(QFileDevice const&)
 {
     return true;
 }
 
-void TorkLogPlace::letOthersIn(QFileDevice const&) {}
+void TorkLogPlace::LetOthersIn(QFileDevice const&) {}
 
 #endif

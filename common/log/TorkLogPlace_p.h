@@ -12,33 +12,33 @@ namespace TorkLogPlace {
 
 /// Whether `fileName` may be opened as a log: not a pipe, socket or block device, where opening or
 /// writing can block for good. True for what is not there.
-bool mayBeLog(QString const& fileName);
+bool MayBeLog(QString const& fileName);
 
 /// The same for an open file, which nobody can exchange any more.
-bool mayBeLog(QFileDevice const& file);
+bool MayBeLog(QFileDevice const& file);
 
 /// Whether an open file has an end to append to.
-bool isRegular(QFileDevice const& file);
+bool IsRegular(QFileDevice const& file);
 
 /// From now on writes of this open file go to its end, or to its position; after fork() also those
 /// of the other process.
-void setAppending(QFileDevice const& file, bool appends);
+void SetAppending(QFileDevice const& file, bool appends);
 
 /// Hands bytes to the system past the file object, whose buffer must be empty.
 ///
 /// @return how many the system took, from 0 to `length`
-int write(QFileDevice const& file, char const* bytes, int length);
+int Write(QFileDevice const& file, char const* bytes, int length);
 
 /// Where the system will write next; -1 if it cannot tell. After fork() the other process moves it.
-qint64 position(QFileDevice const& file);
+qint64 Position(QFileDevice const& file);
 
 /// The size of this open file, 0 if the system cannot tell. Asks for nothing else, because asking
 /// for the times as well, as QFile::size() does, makes the next write more expensive.
-qint64 size(QFileDevice const& file);
+qint64 Size(QFileDevice const& file);
 
-/// Makes other programs' calls of this function on the same file fail until letOthersIn(). Never
+/// Makes other programs' calls of this function on the same file fail until LetOthersIn(). Never
 /// waits. Returns false if another program is inside; true on file systems without locks.
-bool keepOthersOut(QFileDevice const& file);
-void letOthersIn(QFileDevice const& file);
+bool KeepOthersOut(QFileDevice const& file);
+void LetOthersIn(QFileDevice const& file);
 
 } // namespace TorkLogPlace

@@ -30,6 +30,8 @@ struct Kept
 static_assert(std::is_trivial<Kept>::value, "outlives all destructors");
 thread_local Kept t_kept;
 
+std::mutex s_mutex;
+
 // Not getenv(): other threads may be setting variables with qputenv().
 QByteArray Zone()
 {
@@ -89,8 +91,9 @@ QString Stamp(QDateTime const& time, QString const& format)
 
 } // namespace
 
-int TorkLogStamp::timeOfDay(qint64 now)
+int TorkLogStamp::TimeOfDay(qint64 now)
 {
+    std::lock_guard<std::mutex> lock(s_mutex);
     if (!IsKept(now)) {
         const QByteArray zone = Zone();
         Keep(QDateTime::fromMSecsSinceEpoch(now), now, zone);
@@ -98,8 +101,9 @@ int TorkLogStamp::timeOfDay(qint64 now)
     return t_kept.timeOfDay;
 }
 
-int TorkLogStamp::append(TorkLogLine& line, qint64 now, quint64 generation)
+int TorkLogStamp::Append(TorkLogLine& line, qint64 now, quint64 generation)
 {
+    std::lock_guard<std::mutex> lock(s_mutex);
     Kept const& kept = t_kept;
     if (kept.generation != generation || !IsKept(now))
         return -1;
@@ -107,8 +111,9 @@ int TorkLogStamp::append(TorkLogLine& line, qint64 now, quint64 generation)
     return kept.timeOfDay;
 }
 
-int TorkLogStamp::make(TorkLogLine& line, qint64 now, QString const& format, quint64 generation)
+int TorkLogStamp::Make(TorkLogLine& line, qint64 now, QString const& format, quint64 generation)
 {
+    std::lock_guard<std::mutex> lock(s_mutex);
     const QByteArray zone = Zone();
     const QDateTime time = QDateTime::fromMSecsSinceEpoch(now);
     const QString stamp = Stamp(time, format);
@@ -116,4 +121,9 @@ int TorkLogStamp::make(TorkLogLine& line, qint64 now, QString const& format, qui
     Keep(time, now, zone);
     KeepStamp(stamp, generation);
     return t_kept.timeOfDay;
+}
+
+std::mutex& TorkLogStamp::Mutex()
+{
+    return s_mutex;
 }

@@ -7,6 +7,8 @@
 #include <QVarLengthArray>
 #include <QtGlobal>
 
+#include <mutex>
+
 /// The text of an entry while it is built: on the stack, as allocating memory costs as much as
 /// filling it.
 using TorkLogLine = QVarLengthArray<ushort, 512>;
@@ -21,19 +23,23 @@ using TorkLogLine = QVarLengthArray<ushort, 512>;
 namespace TorkLogStamp {
 
 /// The time of day without a stamp, for an entry that is not written.
-int timeOfDay(qint64 now);
+int TimeOfDay(qint64 now);
 
 /// Appends the stamp that this thread made last, if it is still the right one.
 ///
-/// @param generation  of the format, see make()
-/// @return -1, with nothing appended, if it is not: then make() is to be called
-int append(TorkLogLine& line, qint64 now, quint64 generation);
+/// @param generation  of the format, see Make()
+/// @return -1, with nothing appended, if it is not: then Make() is to be called
+int Append(TorkLogLine& line, qint64 now, quint64 generation);
 
-/// Appends `now` as QDateTime::toString() formats it, and keeps that for append().
+/// Appends `now` as QDateTime::toString() formats it, and keeps that for Append().
 ///
 /// A stamp that Latin-1 cannot hold, such as one in Arabic digits, is formatted in the C locale.
 ///
 /// @param generation  unique to this format among all logs, and never 0
-int make(TorkLogLine& line, qint64 now, QString const& format, quint64 generation);
+int Make(TorkLogLine& line, qint64 now, QString const& format, quint64 generation);
+
+/// Held by each of these functions. Qt's environment and the C library's time zone have locks of
+/// their own; while the caller holds this one, no entry of any log holds those.
+std::mutex& Mutex();
 
 } // namespace TorkLogStamp

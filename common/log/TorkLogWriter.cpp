@@ -16,18 +16,18 @@ QString TorkLogWriter::open(QString const& fileName)
     // Checked before, so that nobody who waits for a pipe is disturbed, and after, as the name may
     // have come to mean another file.
     // Neither appending nor truncating: entries go over the old content from its start on.
-    const bool mayBeLog = TorkLogPlace::mayBeLog(fileName);
+    const bool mayBeLog = TorkLogPlace::MayBeLog(fileName);
     const bool opened = mayBeLog && m_file.open(QIODevice::ReadWrite | QIODevice::Text);
     if (mayBeLog && !opened)
         return m_file.errorString();
-    if (!mayBeLog || !TorkLogPlace::mayBeLog(m_file)) {
+    if (!mayBeLog || !TorkLogPlace::MayBeLog(m_file)) {
         m_file.close();
         return QStringLiteral("Not a regular file");
     }
     // Qt compares with the position in the file before, and would seek with the first write, which
     // after fork() would take the other process back to the start, too.
     m_file.seek(0);
-    m_followsEnd = !m_handedOut && TorkLogPlace::isRegular(m_file);
+    m_followsEnd = !m_handedOut && TorkLogPlace::IsRegular(m_file);
     return QString();
 }
 
@@ -44,7 +44,7 @@ bool TorkLogWriter::close()
 QFile* TorkLogWriter::handOut()
 {
     if (m_file.isOpen() && m_followsEnd) {
-        TorkLogPlace::setAppending(m_file, false);
+        TorkLogPlace::SetAppending(m_file, false);
         takePosition();
     }
     m_handedOut = true;
@@ -54,10 +54,10 @@ QFile* TorkLogWriter::handOut()
 
 void TorkLogWriter::write(char const* bytes, int length, qint64 limit)
 {
-    // Past the file object, which would copy the entry into its buffer and out again at twice the
-    // cost. The file object gets what the system does not take.
+    // Past the file object, which would copy the entry into its buffer and out again. The file
+    // object gets only what the system does not take.
     const bool isPlaced = place(length, limit);
-    const int written = isPlaced ? TorkLogPlace::write(m_file, bytes, length) : 0;
+    const int written = isPlaced ? TorkLogPlace::Write(m_file, bytes, length) : 0;
     if (isPlaced && written < length)
         takePosition();
     if (!isPlaced || written < length) {
@@ -65,7 +65,7 @@ void TorkLogWriter::write(char const* bytes, int length, qint64 limit)
         m_file.flush();
     }
     if (m_keepsOthersOut)
-        TorkLogPlace::letOthersIn(m_file);
+        TorkLogPlace::LetOthersIn(m_file);
     m_keepsOthersOut = false;
 }
 
@@ -80,7 +80,7 @@ bool TorkLogWriter::place(int length, qint64 limit)
         return false;
     }
 
-    const qint64 size = TorkLogPlace::size(m_file);
+    const qint64 size = TorkLogPlace::Size(m_file);
     if (m_end == size) {
         m_end += length;
         return true;
@@ -88,25 +88,25 @@ bool TorkLogWriter::place(int length, qint64 limit)
 
     // The first entry, or old content follows, another program has cut the file down or added to
     // it, or, after fork(), another process has moved on; only the system knows the position then.
-    m_keepsOthersOut = TorkLogPlace::keepOthersOut(m_file);
+    m_keepsOthersOut = TorkLogPlace::KeepOthersOut(m_file);
     return findPlace(length, limit);
 }
 
 // The same for an entry that may not belong to where the last one ended.
 bool TorkLogWriter::findPlace(int length, qint64 limit)
 {
-    qint64 size = TorkLogPlace::size(m_file);
-    qint64 position = TorkLogPlace::position(m_file);
+    qint64 size = TorkLogPlace::Size(m_file);
+    qint64 position = TorkLogPlace::Position(m_file);
     if (position < size && m_keepsOthersOut && !fits(size, length, limit)) {
-        TorkLogPlace::setAppending(m_file, true);
+        TorkLogPlace::SetAppending(m_file, true);
         takePosition();
         cut(length);
-        size = TorkLogPlace::size(m_file);
-        position = TorkLogPlace::position(m_file);
+        size = TorkLogPlace::Size(m_file);
+        position = TorkLogPlace::Position(m_file);
     }
 
     const bool appends = position >= size || !m_keepsOthersOut;
-    TorkLogPlace::setAppending(m_file, appends);
+    TorkLogPlace::SetAppending(m_file, appends);
     if (position > size)
         m_file.seek(size);
     m_end = appends ? size + length : -1;
@@ -117,7 +117,7 @@ bool TorkLogWriter::findPlace(int length, qint64 limit)
 // written past it or by another process after fork().
 void TorkLogWriter::takePosition()
 {
-    const qint64 position = TorkLogPlace::position(m_file);
+    const qint64 position = TorkLogPlace::Position(m_file);
     if (position >= 0 && position != m_file.pos())
         m_file.seek(position);
 }

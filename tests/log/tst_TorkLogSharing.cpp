@@ -7,8 +7,10 @@
 #include "support/ChildProcess.h"
 #include "support/TestFiles.h"
 
+#include <QRegularExpression>
 #include <QtTest>
 
+#include <atomic>
 #include <fcntl.h>
 #include <sys/wait.h>
 #include <thread>
@@ -28,6 +30,7 @@ private slots:
     void handedOutFileIsKept();
     void forkedProcesses_data();
     void forkedProcesses();
+    void forkWhileOtherThreadsLog();
     void cutDownByAnotherLog();
     void twoProcesses();
     void anotherProgramAtWork();
@@ -126,6 +129,50 @@ int writesInParentAndChild(QStringList const& arguments)
     return child > 0 && waitpid(child, &status, 0) == child && status == 0 ? 0 : 1;
 }
 
+constexpr int forkCount = 200;
+
+// The alarm kills a child that waits for a lock which nobody releases.
+void logInChild(int number)
+{
+    alarm(10);
+    TorkLog::m_gLog->trace(QString("<child %1 entry>").arg(number));
+    qDebug("<child %d message>", number);
+    TorkLog::shutdown();
+    _exit(0);
+}
+
+int forksWhileOtherThreadsLog(QStringList const& arguments)
+{
+    TorkLog::initialize(arguments.at(0), "app", QString(), true);
+    // Opens the file, which children can share only then, and lets Qt set its messages up.
+    qDebug("<parent>");
+    std::atomic<bool> isOver{false};
+    std::thread one([&] {
+        while (!isOver)
+            TorkLog::m_gLog->trace(QStringLiteral("<parent>"));
+    });
+    std::thread two([&] {
+        while (!isOver)
+            qDebug("<parent>");
+    });
+
+    int failed = 0;
+    for (int number = 0; number < forkCount && failed == 0; ++number) {
+        const pid_t child = fork();
+        if (child == 0)
+            logInChild(number);
+        int status = 0;
+        if (child < 0 || waitpid(child, &status, 0) != child || status != 0)
+            ++failed;
+    }
+
+    isOver = true;
+    one.join();
+    two.join();
+    TorkLog::shutdown();
+    return failed;
+}
+
 int writesAlone(QStringList const& arguments)
 {
     TorkLog log(arguments.at(0));
@@ -171,6 +218,32 @@ void tst_TorkLogSharing::forkedProcesses()
         ChildProcess::run("parent and child", {folder.logs(), limit, handedOut});
     QVERIFY2(child.ended(), child.report());
     QCOMPARE(wrongLines(TestFiles::read(folder.logs() + ".log"), "pc"), QStringList());
+}
+
+// A child has only the thread that forked it: nobody there would release what others had locked.
+void tst_TorkLogSharing::forkWhileOtherThreadsLog()
+{
+    LogFolder folder;
+    const ChildProcess::Result child = ChildProcess::run("forks", {folder.logs()});
+    QVERIFY2(child.ended(), child.report());
+
+    const QRegularExpression whole("^[-0-9]{10} [:0-9]{8}\\.[0-9]+ Trace (<[^<>]*>)$");
+    QMap<QString, int> counts;
+    QStringList wrong;
+    QFile file(folder.logs() + "app.log");
+    QVERIFY(file.open(QIODevice::ReadOnly));
+    while (!file.atEnd()) {
+        const QString line = QString::fromLatin1(file.readLine());
+        const QRegularExpressionMatch match = whole.match(line);
+        if (!match.hasMatch() || !line.endsWith('\n'))
+            wrong.append(line);
+        ++counts[match.captured(1)];
+    }
+    QCOMPARE(wrong, QStringList());
+    for (int number = 0; number < forkCount; ++number) {
+        QCOMPARE(counts.value(QString("<child %1 entry>").arg(number)), 1);
+        QCOMPARE(counts.value(QString("<child %1 message>").arg(number)), 1);
+    }
 }
 
 // Two logs on one file are no good, but the one that finds the file shorter leaves no gap.
@@ -235,6 +308,7 @@ int main(int argc, char** argv)
 {
     return ChildProcess::main<tst_TorkLogSharing>(argc, argv,
                                                   {{"parent and child", writesInParentAndChild},
+                                                   {"forks", forksWhileOtherThreadsLog},
                                                    {"alone", writesAlone},
                                                    {"once", writesOnce}});
 }

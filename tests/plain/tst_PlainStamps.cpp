@@ -117,9 +117,9 @@ QByteArray asked(qint64 moment, QString const& format, quint64 generation)
 {
     ++g_stamps;
     TorkLogLine line;
-    int timeOfDay = TorkLogStamp::append(line, moment, generation);
+    int timeOfDay = TorkLogStamp::Append(line, moment, generation);
     if (timeOfDay < 0)
-        timeOfDay = TorkLogStamp::make(line, moment, format, generation);
+        timeOfDay = TorkLogStamp::Make(line, moment, format, generation);
     return latin1(line) + " | " + QByteArray::number(timeOfDay);
 }
 
@@ -368,7 +368,7 @@ void tst_PlainStamps::changesOfAllZones()
             for (int offset : {-7200000, -3600000, -1, 0, 1799999, 1800000, 3599999, 3600000}) {
                 const qint64 moment = change.atUtc.toMSecsSinceEpoch() + offset;
                 TorkLogLine line;
-                const int timeOfDay = TorkLogStamp::make(line, moment, format, generation);
+                const int timeOfDay = TorkLogStamp::Make(line, moment, format, generation);
                 if (latin1(line) != libraryStamp(moment) || timeOfDay != libraryTimeOfDay(moment))
                     QCOMPARE(zone + ' ' + latin1(line), zone + ' ' + libraryStamp(moment));
                 ++g_stamps;
@@ -427,7 +427,7 @@ void tst_PlainStamps::formatZoneAndMomentAtRandom()
         }
         if (oneOf(8) == 0) { // an entry of a log that is switched off
             const QTime time = QDateTime::fromMSecsSinceEpoch(moment).time();
-            QCOMPARE(TorkLogStamp::timeOfDay(moment), time.msecsSinceStartOfDay());
+            QCOMPARE(TorkLogStamp::TimeOfDay(moment), time.msecsSinceStartOfDay());
         }
         QCOMPARE(differenceInStamp(moment, QString::fromUtf8(formats[format]),
                                    static_cast<quint64>(format) + 1),
