@@ -8,6 +8,7 @@
 #include "common/log/TorkLogLock_p.h"
 #include "common/log/TorkLogStamp_p.h"
 
+#include <QLoggingCategory>
 #include <QStandardPaths>
 
 #include <mutex>
@@ -35,7 +36,7 @@ struct ForkLocks
 {
     std::shared_lock<std::shared_mutex> lifetime;
     std::optional<TorkLogLock> log;
-    std::unique_lock<std::mutex> stamps;
+    std::optional<TorkLogLock> stamps;
 };
 thread_local ForkLocks t_forkLocks;
 #endif
@@ -78,15 +79,15 @@ void TorkLog::registerForkHandlers()
         t_forkLocks.lifetime = std::shared_lock<std::shared_mutex>(s_lifetime);
         if (m_gLog)
             t_forkLocks.log.emplace(m_gLog->m_mutex);
-        t_forkLocks.stamps = std::unique_lock<std::mutex>(TorkLogStamp::Mutex());
+        t_forkLocks.stamps.emplace(TorkLogStamp::Mutex());
     };
     const auto inParent = [] {
-        t_forkLocks.stamps.unlock();
+        t_forkLocks.stamps.reset();
         t_forkLocks.log.reset();
         t_forkLocks.lifetime.unlock();
     };
     const auto inChild = [] {
-        t_forkLocks.stamps.unlock();
+        t_forkLocks.stamps.reset();
         t_forkLocks.log.reset();
         // Counts readers that are not in the child, so it cannot be unlocked, only replaced.
         t_forkLocks.lifetime.release();
@@ -101,6 +102,7 @@ TorkLog* TorkLog::initialize(QString const& path, QString const& prefix,
                              QString const& preferencesFileName, bool enable)
 {
     registerForkHandlers();
+    QLoggingCategory::defaultCategory(); // made under a lock of Qt's, which a child would inherit
     {
         std::unique_lock<std::shared_mutex> lock(s_lifetime);
         if (m_gLog)

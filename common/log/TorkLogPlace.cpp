@@ -9,6 +9,7 @@
 
 #include <cerrno>
 #include <fcntl.h>
+#include <sys/ioctl.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -74,6 +75,17 @@ int TorkLogPlace::Write(QFileDevice const& file, char const* bytes, int length)
     return written < 0 ? 0 : static_cast<int>(written);
 }
 
+bool TorkLogPlace::IsAtEnd(QFileDevice const& file)
+{
+#ifdef Q_OS_LINUX
+    // How many bytes follow the position, in one call that moves nothing.
+    int following = 0;
+    if (::ioctl(file.handle(), FIONREAD, &following) == 0)
+        return following == 0;
+#endif
+    return Position(file) == Size(file);
+}
+
 qint64 TorkLogPlace::Position(QFileDevice const& file)
 {
     return ::lseek(file.handle(), 0, SEEK_CUR);
@@ -116,6 +128,11 @@ int TorkLogPlace::Write(QFileDevice const&, char const*, int)
 qint64 TorkLogPlace::Size(QFileDevice const& file)
 {
     return file.size();
+}
+
+bool TorkLogPlace::IsAtEnd(QFileDevice const&)
+{
+    return false;
 }
 
 qint64 TorkLogPlace::Position(QFileDevice const&)

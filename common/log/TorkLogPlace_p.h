@@ -32,6 +32,9 @@ int Write(QFileDevice const& file, char const* bytes, int length);
 /// Where the system will write next; -1 if it cannot tell. After fork() the other process moves it.
 qint64 Position(QFileDevice const& file);
 
+/// Whether the system will write next at the end of this open regular file.
+bool IsAtEnd(QFileDevice const& file);
+
 /// The size of this open file, 0 if the system cannot tell. Asks for nothing else, because asking
 /// for the times as well, as QFile::size() does, makes the next write more expensive.
 qint64 Size(QFileDevice const& file);

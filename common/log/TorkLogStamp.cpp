@@ -3,6 +3,8 @@
 
 #include "common/log/TorkLogStamp_p.h"
 
+#include "common/log/TorkLogLock_p.h"
+
 #include <QDateTime>
 #include <QLocale>
 
@@ -29,8 +31,6 @@ struct Kept
 };
 static_assert(std::is_trivial<Kept>::value, "outlives all destructors");
 thread_local Kept t_kept;
-
-std::mutex s_mutex;
 
 // Not getenv(): other threads may be setting variables with qputenv().
 QByteArray Zone()
@@ -93,7 +93,7 @@ QString Stamp(QDateTime const& time, QString const& format)
 
 int TorkLogStamp::TimeOfDay(qint64 now)
 {
-    std::lock_guard<std::mutex> lock(s_mutex);
+    TorkLogLock lock(Mutex());
     if (!IsKept(now)) {
         const QByteArray zone = Zone();
         Keep(QDateTime::fromMSecsSinceEpoch(now), now, zone);
@@ -103,7 +103,7 @@ int TorkLogStamp::TimeOfDay(qint64 now)
 
 int TorkLogStamp::Append(TorkLogLine& line, qint64 now, quint64 generation)
 {
-    std::lock_guard<std::mutex> lock(s_mutex);
+    TorkLogLock lock(Mutex());
     Kept const& kept = t_kept;
     if (kept.generation != generation || !IsKept(now))
         return -1;
@@ -113,7 +113,7 @@ int TorkLogStamp::Append(TorkLogLine& line, qint64 now, quint64 generation)
 
 int TorkLogStamp::Make(TorkLogLine& line, qint64 now, QString const& format, quint64 generation)
 {
-    std::lock_guard<std::mutex> lock(s_mutex);
+    TorkLogLock lock(Mutex());
     const QByteArray zone = Zone();
     const QDateTime time = QDateTime::fromMSecsSinceEpoch(now);
     const QString stamp = Stamp(time, format);
@@ -123,7 +123,9 @@ int TorkLogStamp::Make(TorkLogLine& line, qint64 now, QString const& format, qui
     return t_kept.timeOfDay;
 }
 
-std::mutex& TorkLogStamp::Mutex()
+QMutex& TorkLogStamp::Mutex()
 {
-    return s_mutex;
+    // Never deleted: static objects may still write entries while they are destroyed.
+    static QMutex& mutex = *new QMutex;
+    return mutex;
 }

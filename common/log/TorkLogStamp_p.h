@@ -3,11 +3,10 @@
 
 #pragma once
 
+#include <QMutex>
 #include <QString>
 #include <QVarLengthArray>
 #include <QtGlobal>
-
-#include <mutex>
 
 /// The text of an entry while it is built: on the stack, as allocating memory costs as much as
 /// filling it.
@@ -38,8 +37,11 @@ int Append(TorkLogLine& line, qint64 now, quint64 generation);
 /// @param generation  unique to this format among all logs, and never 0
 int Make(TorkLogLine& line, qint64 now, QString const& format, quint64 generation);
 
-/// Held by each of these functions. Qt's environment and the C library's time zone have locks of
-/// their own; while the caller holds this one, no entry of any log holds those.
-std::mutex& Mutex();
+/// Held by each of these functions, as a TorkLogLock: nothing that Qt warns about meanwhile is
+/// logged.
+///
+/// Qt's environment and the C library's time zone have locks of their own; while the caller holds
+/// this one, no entry of any log holds those.
+QMutex& Mutex();
 
 } // namespace TorkLogStamp

@@ -12,7 +12,7 @@ QString TorkLogWriter::open(QString const& fileName)
     close();
     m_file.setFileName(fileName);
     m_followsEnd = false;
-    m_end = -1;
+    m_appends = false;
     // Checked before, so that nobody who waits for a pipe is disturbed, and after, as the name may
     // have come to mean another file.
     // Neither appending nor truncating: entries go over the old content from its start on.
@@ -75,19 +75,16 @@ bool TorkLogWriter::place(int length, qint64 limit)
 {
     // Text that waits for room on the disk has its place, and this entry follows it.
     if (!m_followsEnd || !m_file.flush()) {
-        m_end = -1;
+        m_appends = false;
         trim(length, limit);
         return false;
     }
 
-    const qint64 size = TorkLogPlace::Size(m_file);
-    if (m_end == size) {
-        m_end += length;
+    if (m_appends && TorkLogPlace::IsAtEnd(m_file))
         return true;
-    }
 
-    // The first entry, or old content follows, another program has cut the file down or added to
-    // it, or, after fork(), another process has moved on; only the system knows the position then.
+    // The first entry, or old content follows, or another program has cut the file down or added to
+    // it. After fork() another process may have moved on, so only the system knows the position.
     m_keepsOthersOut = TorkLogPlace::KeepOthersOut(m_file);
     return findPlace(length, limit);
 }
@@ -105,11 +102,8 @@ bool TorkLogWriter::findPlace(int length, qint64 limit)
         position = TorkLogPlace::Position(m_file);
     }
 
-    const bool appends = position >= size || !m_keepsOthersOut;
-    TorkLogPlace::SetAppending(m_file, appends);
-    if (position > size)
-        m_file.seek(size);
-    m_end = appends ? size + length : -1;
+    m_appends = position >= size || !m_keepsOthersOut;
+    TorkLogPlace::SetAppending(m_file, m_appends);
     return m_file.flush();
 }
 

@@ -68,6 +68,6 @@ private:
     QFile m_file;
     bool m_handedOut = false;
     bool m_followsEnd = false; // entries that go to the end are appended
+    bool m_appends = false;    // the last one was
     bool m_keepsOthersOut = false;
-    qint64 m_end = -1; // where the last entry ended if it was appended; else -1
 };
