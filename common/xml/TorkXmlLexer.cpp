@@ -279,9 +279,9 @@ void TorkXmlLexer::startElement()
     m_elements.append(m_beforeTag);
     if (m_elements.size() > m_limits.depth)
         refuse(TorkXmlPrefixes::tooDeep(m_limits.depth));
-    if (m_prefixWeight > m_limits.manyPrefixes &&
-        ++m_elementsOfManyPrefixes > m_limits.elementsOfManyPrefixes)
-        refuse(TorkXmlPrefixes::tooOften(m_limits.elementsOfManyPrefixes, m_limits.manyPrefixes));
+    m_prefixComparisons += TorkXmlPrefixes::comparisons(m_prefixWeight);
+    if (m_prefixComparisons > m_limits.prefixComparisons)
+        refuse(TorkXmlPrefixes::tooManyComparisons(m_limits.prefixComparisons));
 }
 
 void TorkXmlLexer::endElement()
@@ -423,6 +423,11 @@ void TorkXmlLexer::declare(Kind kind)
     m_parameterCount += kind == Kind::Parameter ? 1 : 0;
     if (m_generalCount + m_parameterCount > m_limits.entities)
         refuse(QStringLiteral("More than %1 entities are declared.").arg(m_limits.entities));
+
+    m_entityCharacters += kind == Kind::External ? 0 : name.length() + m_value.length();
+    if (m_entityCharacters > m_limits.entityCharacters)
+        refuse(QStringLiteral("More than %1 characters of entities are declared.")
+                   .arg(m_limits.entityCharacters));
 }
 
 void TorkXmlLexer::openReference(QChar character, State after)

@@ -25,11 +25,11 @@ public:
         int depth = TorkXmlMaximumDepth;
         int groups = TorkXmlMaximumDepth;
         int entities = TorkXmlMaximumEntities;
+        qint64 entityCharacters = TorkXmlMaximumEntityCharacters;
         qint64 expansion = TorkXmlMaximumExpansion;
         qint64 replacement = TorkXmlMaximumReplacement;
         int prefixes = TorkXmlMaximumPrefixes;
-        int manyPrefixes = TorkXmlManyPrefixes;
-        int elementsOfManyPrefixes = TorkXmlMaximumElementsOfManyPrefixes;
+        qint64 prefixComparisons = TorkXmlMaximumPrefixComparisons;
     };
 
     TorkXmlLexer() = default;
@@ -156,6 +156,7 @@ private:
     QHash<QString, Entity> m_entities;
     int m_generalCount = 0;
     int m_parameterCount = 0;
+    qint64 m_entityCharacters = 0;
 
     QVector<Text> m_texts; // of the entities that are being read
     qint64 m_expansion = 0;
@@ -167,5 +168,5 @@ private:
     QSet<QString> m_prefixSet;
     int m_prefixWeight = 0;
     Element m_beforeTag = {0, 0};
-    int m_elementsOfManyPrefixes = 0;
+    qint64 m_prefixComparisons = 0;
 };

@@ -23,6 +23,13 @@ constexpr int TorkXmlMaximumDepth = 1000;
 /// Qt's reader compares each with all others, so some ten thousand would take it minutes.
 constexpr int TorkXmlMaximumEntities = 1000;
 
+/// The most characters in the names and texts of all entities that a document type declares, where
+/// TorkXmlGuard watches. A parameter entity that is named in a text counts as what it stands for.
+///
+/// Qt's reader searches each text for each name, so a thousand long ones would take it many
+/// seconds.
+constexpr int TorkXmlMaximumEntityCharacters = 1024 * 1024;
+
 /// The most characters that all references to declared entities may stand for, where TorkXmlGuard
 /// watches.
 ///
@@ -39,12 +46,14 @@ constexpr int TorkXmlMaximumReplacement = 2 * TorkXmlMaximumExpansion;
 /// The most namespace prefixes in force at one place: those that open elements declare, or use
 /// without declaring them. One of 16 characters or more counts once more for each 16.
 ///
-/// Qt's reader keeps a table of them for each open element, and at the end of each empty element it
-/// compares each of them with all others.
+/// Qt's reader keeps a table of them for each open element.
 constexpr int TorkXmlMaximumPrefixes = 256;
 
-/// How many namespace prefixes in force are many, counted in the same way.
-constexpr int TorkXmlManyPrefixes = 64;
-
-/// The most elements of a document that may have more than TorkXmlManyPrefixes in force.
-constexpr int TorkXmlMaximumElementsOfManyPrefixes = 1000;
+/// The most comparisons of namespace prefixes that all elements of a document may need: each
+/// element, those from entities included, needs the square of the prefixes in force at it, counted
+/// in the same way.
+///
+/// Qt's reader compares each of them with all others at the end of each empty element, so ten
+/// kilobytes that declare some dozens and have millions of elements in entities would take it
+/// minutes. It is enough for 65,536 elements below 64 prefixes, or 2.6 million below 10.
+constexpr int TorkXmlMaximumPrefixComparisons = 256 * 1024 * 1024;

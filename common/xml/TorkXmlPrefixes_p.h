@@ -14,6 +14,12 @@ inline int weight(QString const& prefix)
     return 1 + prefix.length() / 16;
 }
 
+/// What an element with this weight in force counts: the reader compares each with all others.
+inline qint64 comparisons(int weight)
+{
+    return qint64(weight) * weight;
+}
+
 /// The prefix that an element or attribute of this name puts in force; empty if it does not. An
 /// attribute "xmlns:p" declares p, and a prefix that nothing declares is kept by the reader as
 /// well.
@@ -31,11 +37,9 @@ inline QString tooMany(int limit)
     return QStringLiteral("More than %1 namespace prefixes are in force.").arg(limit);
 }
 
-inline QString tooOften(int elements, int prefixes)
+inline QString tooManyComparisons(qint64 limit)
 {
-    return QStringLiteral("More than %1 elements have more than %2 namespace prefixes in force.")
-        .arg(elements)
-        .arg(prefixes);
+    return QStringLiteral("More than %1 comparisons of namespace prefixes are needed.").arg(limit);
 }
 
 inline QString tooDeep(int limit)

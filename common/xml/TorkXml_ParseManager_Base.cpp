@@ -40,36 +40,47 @@ bool TorkXml_ParseManager_Base::startPrefixMapping(QString const& prefix, QStrin
 // an outer element still declares.
 bool TorkXml_ParseManager_Base::endPrefixMapping(QString const& prefix)
 {
-    if (m_prefixes.remove(prefix))
-        m_prefixWeight -= TorkXmlPrefixes::weight(prefix);
+    removePrefix(prefix);
     return true;
 }
 
-void TorkXml_ParseManager_Base::addPrefix(QString const& prefix)
+bool TorkXml_ParseManager_Base::addPrefix(QString const& prefix)
 {
     if (prefix.isEmpty() || m_prefixes.contains(prefix))
-        return;
+        return false;
     m_prefixes.insert(prefix);
     m_prefixWeight += TorkXmlPrefixes::weight(prefix);
+    return true;
+}
+
+void TorkXml_ParseManager_Base::removePrefix(QString const& prefix)
+{
+    if (m_prefixes.remove(prefix))
+        m_prefixWeight -= TorkXmlPrefixes::weight(prefix);
+}
+
+// Nobody else need ever tell the end of a prefix that was not declared.
+void TorkXml_ParseManager_Base::usePrefix(QString const& prefix)
+{
+    if (addPrefix(prefix))
+        m_usedPrefixes.append({prefix, m_elements.size()});
 }
 
 // A parse through a TorkXmlGuard ends before it comes to this.
 bool TorkXml_ParseManager_Base::isWithinLimits(QString const& qName,
                                                QXmlAttributes const& attributes)
 {
-    addPrefix(TorkXmlPrefixes::ofName(qName, false));
+    usePrefix(TorkXmlPrefixes::ofName(qName, false));
     for (int i = 0; i < attributes.count(); ++i)
-        addPrefix(TorkXmlPrefixes::ofName(attributes.qName(i), true));
+        usePrefix(TorkXmlPrefixes::ofName(attributes.qName(i), true));
 
-    const bool hasMany = m_prefixWeight > TorkXmlManyPrefixes;
-    m_elementsOfManyPrefixes += hasMany ? 1 : 0;
+    m_prefixComparisons += TorkXmlPrefixes::comparisons(m_prefixWeight);
     if (m_elements.size() > TorkXmlMaximumDepth)
         AppendError(TorkXmlPrefixes::tooDeep(TorkXmlMaximumDepth));
     else if (m_prefixWeight > TorkXmlMaximumPrefixes)
         AppendError(TorkXmlPrefixes::tooMany(TorkXmlMaximumPrefixes));
-    else if (m_elementsOfManyPrefixes > TorkXmlMaximumElementsOfManyPrefixes)
-        AppendError(
-            TorkXmlPrefixes::tooOften(TorkXmlMaximumElementsOfManyPrefixes, TorkXmlManyPrefixes));
+    else if (m_prefixComparisons > TorkXmlMaximumPrefixComparisons)
+        AppendError(TorkXmlPrefixes::tooManyComparisons(TorkXmlMaximumPrefixComparisons));
     else
         return true;
     return false;
@@ -126,6 +137,8 @@ bool TorkXml_ParseManager_Base::endElement(QString const&, QString const& localN
         if (place >= 0)
             delete m_states.takeAt(place);
     }
+    while (!m_usedPrefixes.isEmpty() && m_usedPrefixes.last().depth >= m_elements.size())
+        removePrefix(m_usedPrefixes.takeLast().prefix);
     PopElement();
     return true;
 }

@@ -116,14 +116,23 @@ public:
 private:
     bool enter(TorkXml_ParseState_Base* state, QXmlAttributes const& attributes);
     bool isWithinLimits(QString const& qName, QXmlAttributes const& attributes);
-    void addPrefix(QString const& prefix);
+    bool addPrefix(QString const& prefix);
+    void removePrefix(QString const& prefix);
+    void usePrefix(QString const& prefix);
+
+    struct UsedPrefix
+    {
+        QString prefix;
+        int depth; // of the element that uses it
+    };
 
     QVector<QString> m_elements;
     QVector<TorkXml_ParseState_Base*> m_states;
     QString m_currentElement;
     QStringList m_errors;
 
-    QSet<QString> m_prefixes; // of namespaces, in force
+    QSet<QString> m_prefixes;           // of namespaces, in force
+    QVector<UsedPrefix> m_usedPrefixes; // those of them that nothing declares
     int m_prefixWeight = 0;
-    int m_elementsOfManyPrefixes = 0;
+    qint64 m_prefixComparisons = 0;
 };

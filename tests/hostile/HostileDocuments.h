@@ -217,6 +217,45 @@ inline void mostPrefixes(QIODevice& file, int count)
     file.write("</r>");
 }
 
+/// Elements below so many declarations, in numbers that only a large file has.
+inline void elementsBelowPrefixes(QIODevice& file, int count)
+{
+    declarations(file, count);
+    file.write(">");
+    repeat(file, "<a/>", 250000);
+    file.write("</r>");
+}
+
+/// The same in numbers that only entities make in a small file.
+inline void entitiesBelowPrefixes(QIODevice& file, int count)
+{
+    file.write("<!DOCTYPE r [<!ENTITY e \"" + QByteArray("<a/>").repeated(1000) + "\">]>");
+    declarations(file, count);
+    file.write(">");
+    repeat(file, "&e;", 4000);
+    file.write("</r>");
+}
+
+/// As many entities as allowed, with names of so many characters.
+inline void longEntityNames(QIODevice& file, int length)
+{
+    file.write("<!DOCTYPE r [");
+    for (int i = 0; i < 999; ++i) {
+        const QByteArray name = QByteArray(length - 4, 'e') + QByteArray::number(1000 + i);
+        file.write("<!ENTITY " + name + " \"x\">");
+    }
+    writeValue(file, "]>", "v");
+}
+
+/// As many entities as allowed, with texts of so many characters.
+inline void longEntityTexts(QIODevice& file, int length)
+{
+    file.write("<!DOCTYPE r [");
+    for (int i = 0; i < 999; ++i)
+        file.write("<!ENTITY e" + QByteArray::number(i) + " \"" + QByteArray(length, 'x') + "\">");
+    writeValue(file, "]>", "v");
+}
+
 /// A document as office programs write it: forty declarations, and many elements that use them.
 inline void officeDocument(QIODevice& file, int count)
 {

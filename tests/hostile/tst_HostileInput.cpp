@@ -210,6 +210,10 @@ void tst_HostileInput::addStructures(char const* reader, bool readsTypes)
     add(reader, "an entity that stands for itself", endlessEntity, 0, skipsTypes);
     add(reader, "200 entities behind one another", entityChain, 200, true);
     add(reader, "100,000 entities behind one another", entityChain, 100000, skipsTypes);
+    add(reader, "999 entities with names of 1000 characters", longEntityNames, 1000, true);
+    add(reader, "999 entities with names of 10,000 characters", longEntityNames, 10000, skipsTypes);
+    add(reader, "999 entities of 1000 characters", longEntityTexts, 1000, true);
+    add(reader, "999 entities of 4000 characters", longEntityTexts, 4000, skipsTypes);
     addNamespaces(reader, skipsTypes);
 }
 
@@ -230,9 +234,12 @@ void tst_HostileInput::addNamespaces(char const* reader, bool skipsThem)
     add(reader, "no declarations and 900 levels that declare one", declarationsAndDepth, 0,
         skipsThem);
     add(reader, "2000 prefixes that nothing declares", usedPrefixes, 2000, skipsThem);
-    add(reader, "999 elements below 256 declarations", mostPrefixes, 999, true);
-    add(reader, "1000 elements below 256 declarations", mostPrefixes, 1000, skipsThem);
+    add(reader, "4095 elements below 256 declarations", mostPrefixes, 4095, true);
+    add(reader, "4096 elements below 256 declarations", mostPrefixes, 4096, skipsThem);
     add(reader, "250,000 elements below 256 declarations", mostPrefixes, 250000, skipsThem);
+    add(reader, "250,000 elements below 64 declarations", elementsBelowPrefixes, 64, skipsThem);
+    add(reader, "four million elements from entities below 64 declarations", entitiesBelowPrefixes,
+        64, skipsThem);
 }
 
 // All readers one after another, so that a large document is written once.
@@ -259,8 +266,13 @@ void tst_HostileInput::tellsTheLimit_data()
     QTest::newRow("prefixes") << &declarationsInOneTag << 257
                               << "More than 256 namespace prefixes are in force.";
     QTest::newRow("elements below prefixes")
-        << &mostPrefixes << 1000
-        << "More than 1000 elements have more than 64 namespace prefixes in force.";
+        << &mostPrefixes << 4096
+        << "More than 268435456 comparisons of namespace prefixes are needed.";
+    QTest::newRow("elements from entities below prefixes")
+        << &entitiesBelowPrefixes << 64
+        << "More than 268435456 comparisons of namespace prefixes are needed.";
+    QTest::newRow("long entities")
+        << &longEntityTexts << 4000 << "More than 1048576 characters of entities are declared.";
 }
 
 // The store in the log, the settings editor in its document.

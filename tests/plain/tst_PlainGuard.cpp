@@ -25,7 +25,12 @@ struct Piece
     qint64 inContent = 0; // those that its references stand for
     int depth = 0;        // of the elements in it
     bool hasMarkup = false;
+    int elements = 0;
+    int prefixed = 0; // those of them with the prefix in force
 };
+
+// Counts two, so that its square differs from its sum.
+const QByteArray Prefix = "pppppppppppppppp";
 
 Piece Literal(QByteArray const& text, bool hasMarkup = false)
 {
@@ -34,9 +39,13 @@ Piece Literal(QByteArray const& text, bool hasMarkup = false)
 
 Piece operator+(Piece const& left, Piece const& right)
 {
-    return {left.text + right.text, left.inEntity + right.inEntity,
-            left.inContent + right.inContent, std::max(left.depth, right.depth),
-            left.hasMarkup || right.hasMarkup};
+    return {left.text + right.text,
+            left.inEntity + right.inEntity,
+            left.inContent + right.inContent,
+            std::max(left.depth, right.depth),
+            left.hasMarkup || right.hasMarkup,
+            left.elements + right.elements,
+            left.prefixed + right.prefixed};
 }
 
 class Author
@@ -54,12 +63,14 @@ public:
         expansion = 0;
         groups = 0;
         entityCount = 0;
+        entityCharacters = 0;
         QByteArray type;
         if (chance(80))
             type = documentType();
         const Piece root = element(4, false);
         expansion += root.inContent;
         depth = root.depth;
+        prefixComparisons = 4 * root.prefixed;
         const QByteArray before = chance(30) ? "<?xml version='1.0'?>\n" : "";
         return before + aside() + type + aside() + root.text + aside();
     }
@@ -89,6 +100,8 @@ public:
     qint64 expansion = 0;
     int groups = 0;
     int entityCount = 0;
+    qint64 entityCharacters = 0;
+    qint64 prefixComparisons = 0;
     int depth = 0;
 
 private:
@@ -152,6 +165,7 @@ private:
         const bool isNamed = isDeclaration && chance(60);
         if (!isNamed)
             groups = groupsBefore;
+        entityCharacters += name.size() + value.size();
         m_parameters.append(isDeclaration ? QByteArray() : value);
         if (isNamed)
             expansion += value.size();
@@ -177,8 +191,19 @@ private:
         if (!isAgain) {
             m_entities.append(value);
             ++entityCount;
+            entityCharacters += 1 + QByteArray::number(number).size() + stored(value.text);
         }
         return "<!ENTITY e" + QByteArray::number(number) + " \"" + value.text + "\">";
+    }
+
+    // The length of the text that an entity is declared with: only references to characters and
+    // parameter entities are put in at once.
+    int stored(QByteArray text) const
+    {
+        text.replace("&#65;", "A").replace("&#x42;", "B");
+        for (int i = 0; i < m_parameters.size(); ++i)
+            text.replace("%p" + QByteArray::number(i) + ";", m_parameters[i]);
+        return QString::fromUtf8(text).length();
     }
 
     // What looks like a reference, an end or a group and is none.
@@ -232,8 +257,13 @@ private:
         Piece const& entity = m_entities[number];
         if (inAttribute && entity.hasMarkup)
             return Literal("b");
-        return {"&e" + QByteArray::number(number) + ";", entity.inEntity, entity.inEntity,
-                entity.depth, entity.hasMarkup};
+        return {"&e" + QByteArray::number(number) + ";",
+                entity.inEntity,
+                entity.inEntity,
+                entity.depth,
+                entity.hasMarkup,
+                entity.elements,
+                entity.prefixed};
     }
 
     Piece valueOfAttribute(bool inEntity = false)
@@ -247,18 +277,23 @@ private:
     Piece element(int levels, bool inEntity)
     {
         Piece all = Literal("<a", true);
-        if (chance(30))
-            all = all + Literal(" xmlns:p='u'") + Literal(" p:c='d'");
+        const bool isPrefixed = chance(30);
+        if (isPrefixed)
+            all = all + Literal(" xmlns:" + Prefix + "='u'") + Literal(' ' + Prefix + ":c='d'");
         if (chance(40))
             all = all + Literal(" b = '") + valueOfAttribute(inEntity) + Literal("'");
         if (levels == 0 || chance(20)) {
             all = all + Literal("/>");
             all.depth = 1;
+            all.elements = 1;
+            all.prefixed = isPrefixed ? 1 : 0;
             return all;
         }
         const Piece children = content(levels - 1, inEntity);
         all = all + Literal(chance(20) ? " >" : ">") + children + Literal("</a>");
         all.depth = children.depth + 1;
+        all.elements = children.elements + 1;
+        all.prefixed = isPrefixed ? all.elements : children.prefixed;
         return all;
     }
 
@@ -370,6 +405,8 @@ void tst_PlainGuard::exactLimits()
         limits.expansion = author.expansion;
         limits.groups = author.groups;
         limits.entities = author.entityCount;
+        limits.entityCharacters = author.entityCharacters;
+        limits.prefixComparisons = author.prefixComparisons;
         limits.depth = author.depth;
         QVERIFY2(IsWithin(document, limits), document);
 
@@ -382,6 +419,8 @@ void tst_PlainGuard::exactLimits()
         QVERIFY2(failsWith(&TorkXmlLexer::Limits::expansion), document);
         QVERIFY2(failsWith(&TorkXmlLexer::Limits::groups), document);
         QVERIFY2(failsWith(&TorkXmlLexer::Limits::entities), document);
+        QVERIFY2(failsWith(&TorkXmlLexer::Limits::entityCharacters), document);
+        QVERIFY2(failsWith(&TorkXmlLexer::Limits::prefixComparisons), document);
         QVERIFY2(failsWith(&TorkXmlLexer::Limits::depth), document);
     }
 }

@@ -62,6 +62,15 @@ QByteArray Declarations(int count)
     return all;
 }
 
+constexpr int ElementsBelow256Prefixes = TorkXmlMaximumPrefixComparisons / (256 * 256);
+
+// A document of so many elements, which all have so many prefixes in force.
+QByteArray Below(int prefixes, int elements)
+{
+    return "<r" + Declarations(prefixes) + ">" + QByteArray("<a></a>").repeated(elements - 1) +
+           "</r>";
+}
+
 QByteArray Entities(int count)
 {
     QByteArray all;
@@ -153,6 +162,25 @@ void tst_TorkXmlGuard::parse_data()
     QTest::newRow("one entity more")
         << Document(Entities(TorkXmlMaximumEntities + 1), "&e0;") << false;
 
+    const int mostCharacters = TorkXmlMaximumEntityCharacters;
+    const QByteArray halfText(mostCharacters / 2 - 1, 'x');
+    const QByteArray halfName(mostCharacters / 2 - 1, 'n');
+    QTest::newRow("as many characters in entities as allowed")
+        << Document(Entity("e", halfText) + Entity("f", halfText), "&f;") << true;
+    QTest::newRow("one character more in a text")
+        << Document(Entity("e", halfText) + Entity("f", halfText + "x"), "&f;") << false;
+    QTest::newRow("one character more in a name")
+        << Document(Entity("e", halfText) + Entity("ff", halfText), "&ff;") << false;
+    QTest::newRow("as many characters in a name and a text as allowed")
+        << Document(Entity(halfName, halfText + "xx"), "") << true;
+    QTest::newRow("one character more than in a name and a text")
+        << Document(Entity(halfName, halfText + "xxx"), "") << false;
+    QTest::newRow("one character more in a parameter entity")
+        << Document("<!ENTITY % p '" + halfText + "'>" + Entity("ff", halfText), "") << false;
+    QTest::newRow("the text of an entity that was declared before")
+        << Document(Entity("e", halfText) + Entity("e", halfText) + Entity("f", halfText), "&f;")
+        << true;
+
     const QByteArray half = Entity("e", QByteArray(TorkXmlMaximumExpansion / 1024, 'x'));
     QTest::newRow("as much text from entities as allowed")
         << Document(half, QByteArray("&e;").repeated(1024)) << true;
@@ -204,17 +232,24 @@ void tst_TorkXmlGuard::parse_data()
         << true;
     QTest::newRow("long prefixes")
         << "<r xmlns:" + QByteArray(16 * TorkXmlMaximumPrefixes, 'p') + "='u'/>" << false;
-    QTest::newRow("as many elements below many prefixes as allowed")
-        << "<r" + Declarations(TorkXmlManyPrefixes + 1) + ">" +
-               QByteArray("<a/>").repeated(TorkXmlMaximumElementsOfManyPrefixes - 1) + "</r>"
-        << true;
-    QTest::newRow("one element below many prefixes more")
-        << "<r" + Declarations(TorkXmlManyPrefixes + 1) + ">" +
-               QByteArray("<a/>").repeated(TorkXmlMaximumElementsOfManyPrefixes) + "</r>"
+    QTest::newRow("as many elements below 256 prefixes as allowed")
+        << Below(256, ElementsBelow256Prefixes) << true;
+    QTest::newRow("one element below 256 prefixes more")
+        << Below(256, ElementsBelow256Prefixes + 1) << false;
+    QTest::newRow("sixteen times as many elements below a quarter of the prefixes")
+        << Below(64, 16 * ElementsBelow256Prefixes) << true;
+    QTest::newRow("one element below a quarter of the prefixes more")
+        << Below(64, 16 * ElementsBelow256Prefixes + 1) << false;
+    QTest::newRow("one element below 256 prefixes more, from an entity")
+        << Document(Entity("e", "<a></a>"),
+                    Below(256, ElementsBelow256Prefixes).replace("</r>", "&e;</r>"))
         << false;
-    QTest::newRow("any number of elements below fewer")
-        << "<r" + Declarations(TorkXmlManyPrefixes) + ">" + QByteArray("<a/>").repeated(10000) +
-               "</r>"
+    QTest::newRow("one element below long prefixes more")
+        << Below(128, ElementsBelow256Prefixes + 1).replace("xmlns:p", "xmlns:ppppppppppppppp")
+        << false;
+    QTest::newRow("any number of elements beside prefixes")
+        << "<r><a" + Declarations(256) + "></a>" +
+               QByteArray("<a></a>").repeated(ElementsBelow256Prefixes) + "</r>"
         << true;
 }
 
@@ -239,6 +274,9 @@ void tst_TorkXmlGuard::namesTheLimit_data()
                             << "More than 1000 groups are inside each other in a document type.";
     QTest::newRow("entities") << Document(Entities(1001), "")
                               << "More than 1000 entities are declared.";
+    QTest::newRow("long entities")
+        << Document(Entity("e", QByteArray(TorkXmlMaximumEntityCharacters, 'x')), "")
+        << "More than 1048576 characters of entities are declared.";
     QTest::newRow("characters of entities")
         << Document(Entity("e", QByteArray(16384, 'x')), QByteArray("&e;").repeated(1025))
         << "References to entities stand for more than 16777216 characters.";
@@ -249,8 +287,8 @@ void tst_TorkXmlGuard::namesTheLimit_data()
     QTest::newRow("prefixes") << "<r" + Declarations(257) + "/>"
                               << "More than 256 namespace prefixes are in force.";
     QTest::newRow("elements below prefixes")
-        << "<r" + Declarations(65) + ">" + QByteArray("<a/>").repeated(1000) + "</r>"
-        << "More than 1000 elements have more than 64 namespace prefixes in force.";
+        << Below(256, ElementsBelow256Prefixes + 1)
+        << "More than 268435456 comparisons of namespace prefixes are needed.";
     QTest::newRow("malformed within the limits") << QByteArray("<r>") << "unexpected end of file";
     QTest::newRow("an entity that names itself")
         << Document(Entity("e", "<a>&e;</a>"), "&e;") << "recursive entities";

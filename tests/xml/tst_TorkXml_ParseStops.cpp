@@ -65,6 +65,8 @@ private slots:
     void tooManyPrefixes_data();
     void tooManyPrefixes();
     void prefixesThatAreOverDoNotCount();
+    void usedPrefixesEndWithTheirElement();
+    void usedPrefixesCountInTheirElement();
     void deepDocuments_data();
     void deepDocuments();
     void largeDocument_data();
@@ -395,10 +397,12 @@ void tst_TorkXml_ParseStops::tooManyPrefixes_data()
         return all;
     };
     const QString most = "<r" + declarations(0, TorkXmlMaximumPrefixes) + ">";
-    const QString many = "<r" + declarations(0, TorkXmlManyPrefixes + 1) + ">";
+    const int elementsBelowMost =
+        TorkXmlMaximumPrefixComparisons / (TorkXmlMaximumPrefixes * TorkXmlMaximumPrefixes);
+    const QString quarter = "<r" + declarations(0, TorkXmlMaximumPrefixes / 4) + ">";
     const QString tooMany = "More than 256 namespace prefixes are in force.\n";
-    const QString tooOften =
-        "More than 1000 elements have more than 64 namespace prefixes in force.\n";
+    const QString tooManyComparisons =
+        "More than 268435456 comparisons of namespace prefixes are needed.\n";
 
     QTest::newRow("as many as allowed") << most + "</r>"
                                         << "";
@@ -412,12 +416,17 @@ void tst_TorkXml_ParseStops::tooManyPrefixes_data()
     QTest::newRow("one of 16 characters more")
         << "<r" + declarations(0, TorkXmlMaximumPrefixes - 1) + " xmlns:q123456789012345='u'/>"
         << tooMany;
-    QTest::newRow("as many elements below many as allowed")
-        << many + QString("<a/>").repeated(TorkXmlMaximumElementsOfManyPrefixes - 1) + "</r>"
+    const QString element = "<a></a>";
+    QTest::newRow("as many elements below 256 as allowed")
+        << most + element.repeated(elementsBelowMost - 1) + "</r>"
         << "";
     QTest::newRow("one element more")
-        << many + QString("<a/>").repeated(TorkXmlMaximumElementsOfManyPrefixes) + "</r>"
-        << tooOften;
+        << most + element.repeated(elementsBelowMost) + "</r>" << tooManyComparisons;
+    QTest::newRow("sixteen times as many elements below a quarter of them")
+        << quarter + element.repeated(16 * elementsBelowMost - 1) + "</r>"
+        << "";
+    QTest::newRow("one element below a quarter of them more")
+        << quarter + element.repeated(16 * elementsBelowMost) + "</r>" << tooManyComparisons;
     QTest::newRow("one level too many")
         << Nested(1001) << "More than 1000 elements are inside each other.\n";
 }
@@ -442,6 +451,30 @@ void tst_TorkXml_ParseStops::prefixesThatAreOverDoNotCount()
         document += QString("<a xmlns:p%1='u'/><q%1:a/><a r%1:b=''>t</a>").arg(i);
     FlushingManager manager;
     QVERIFY(Parse(manager, document + "</r>"));
+}
+
+// Who drives a manager by hand need not tell the end of what was never declared.
+void tst_TorkXml_ParseStops::usedPrefixesEndWithTheirElement()
+{
+    FlushingManager manager;
+    QVERIFY(manager.startElement("", "r", "r", QXmlAttributes()));
+    for (int i = 0; i < 2 * TorkXmlMaximumPrefixes; ++i) {
+        QXmlAttributes attributes;
+        attributes.append(QString("q%1:b").arg(i), "", "b", "");
+        QVERIFY(manager.startElement("", "a", QString("p%1:a").arg(i), attributes));
+        QVERIFY(manager.endElement("", "a", QString("p%1:a").arg(i)));
+    }
+}
+
+void tst_TorkXml_ParseStops::usedPrefixesCountInTheirElement()
+{
+    FlushingManager manager;
+    for (int i = 0; i < TorkXmlMaximumPrefixes; ++i) {
+        QVERIFY(manager.startElement("", "a", QString("p%1:a").arg(i), QXmlAttributes()));
+        QVERIFY(manager.startElement("", "b", QString("p%1:b").arg(i), QXmlAttributes()));
+        QVERIFY(manager.endElement("", "b", QString("p%1:b").arg(i)));
+    }
+    QVERIFY(!manager.startElement("", "a", "q:a", QXmlAttributes()));
 }
 
 void tst_TorkXml_ParseStops::deepDocuments_data()
