@@ -1,9 +1,9 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 
-# Finds the header-only parser rapidxml, which ships no package file of its own.
-# Some distributions put its headers into a folder, others beside all the rest.
-# Gives the target RapidXml::RapidXml.
+# Finds the header-only parser rapidxml, which ships no CMake package.
+# Some distributions put its headers into a folder of their own, others do not.
+# Defines the target RapidXml::RapidXml.
 
 find_path(RapidXml_INCLUDE_DIR NAMES rapidxml.hpp PATH_SUFFIXES rapidxml)
 

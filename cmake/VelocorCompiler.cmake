@@ -1,7 +1,7 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 
-# velocor_build: the flags of this project's own targets, never passed on to who links them.
+# velocor_build: the flags of this project's own targets, never passed on to targets that link them.
 
 add_library(velocor_build INTERFACE)
 
@@ -9,7 +9,7 @@ if(CMAKE_CXX_COMPILER_ID MATCHES "GNU|Clang")
     target_compile_options(velocor_build INTERFACE
         -Wall -Wextra -Wpedantic -Wshadow -Wnon-virtual-dtor -Woverloaded-virtual)
     if(CMAKE_CXX_COMPILER_ID MATCHES "Clang")
-        # What the toolkit's test macros lead to when they are given a text alone.
+        # Qt's test macros cause this warning when called with a single string.
         target_compile_options(velocor_build INTERFACE -Wno-gnu-zero-variadic-macro-arguments)
     endif()
     if(VELOCOR_WERROR)
@@ -17,15 +17,15 @@ if(CMAKE_CXX_COMPILER_ID MATCHES "GNU|Clang")
     endif()
 endif()
 
-# Only what Qt 5.9 already offered is used, so what later versions deprecate stays quiet.
+# Only API of Qt 5.9 is used, so no warnings about what later versions deprecate.
 target_compile_definitions(velocor_build INTERFACE
     QT_DEPRECATED_WARNINGS_SINCE=0x050900
     QT_NO_CAST_TO_ASCII
     QT_NO_FOREACH)
 
-# velocor_product: what the sources of app/ and common/ are held to besides. Nothing guesses the
-# encoding of a text, "signals" and "emit" stay free for the applications that include the headers,
-# and texts joined with + are made in one piece.
+# velocor_product: additional rules for the sources of app/ and common/. No implicit conversion
+# guesses the encoding of a string, "signals" and "emit" stay free for the applications that include
+# the headers, and a chain of + allocates once.
 add_library(velocor_product INTERFACE)
 target_link_libraries(velocor_product INTERFACE velocor_build)
 target_compile_definitions(velocor_product INTERFACE
@@ -34,7 +34,7 @@ target_compile_definitions(velocor_product INTERFACE
     QT_NO_URL_CAST_FROM_STRING
     QT_USE_QSTRINGBUILDER)
 
-# Sanitizers concern every object of a program, so they are the one setting that is not a target's.
+# Sanitizers affect every object file of a program, so they are the only setting not per target.
 if(VELOCOR_SANITIZE)
     add_compile_options(-fsanitize=${VELOCOR_SANITIZE} -fno-omit-frame-pointer)
     add_link_options(-fsanitize=${VELOCOR_SANITIZE})
@@ -43,10 +43,10 @@ if(VELOCOR_SANITIZE)
     endif()
 endif()
 
-# The product throws nothing, and what catches the XML parser's exceptions is named here. Where
-# coverage is measured, everything else is built without the branches that would clean up after an
-# exception behind almost every call: nothing can reach them. Each process adds its counts to those
-# before it, and several may end at the same time. The tests themselves are not counted.
+# The product throws nothing, and the one source that catches the XML parser's exceptions is listed
+# here. For coverage everything else is built without exceptions, whose clean-up branches after almost
+# every call are unreachable. Processes that end at the same time add to the same counters, hence the
+# atomic updates. The tests themselves are not counted.
 if(VELOCOR_COVERAGE)
     add_link_options(--coverage)
 endif()
@@ -58,9 +58,9 @@ function(velocor_measure_coverage target)
     endif()
 endfunction()
 
-# For builds that are made from nothing each time: faster, but a missing #include stays unseen, and
-# tools that read the compiler's commands cannot read its precompiled headers.
-# velocor_precompile(target [headers ...]), those of all modules if none are named.
+# For builds from scratch: faster, but hides a missing #include, and tools that read the compile
+# commands cannot read GCC's precompiled headers.
+# velocor_precompile(target [headers ...]); the default is the headers of all Qt modules.
 function(velocor_precompile target)
     set(headers ${ARGN})
     if(NOT headers)

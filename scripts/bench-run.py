@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
-"""Runs the benchmark programs and prints a table a group. Called by ./bench.
+"""Runs the benchmark programs and prints one table per group. Called by ./bench.
 
     scripts/bench-run.py FOLDER-OF-THE-PROGRAMS [--quick] [--cpu] [--write-doc] [SECTION ...]
 """
@@ -33,7 +33,7 @@ class Goal:
 
 
 class Limit:
-    """`what` costs at most so many nanoseconds in each of `groups`."""
+    """`what` takes at most `nanoseconds` in each of `groups`."""
 
     def __init__(self, groups, what, nanoseconds):
         self.groups, self.what, self.nanoseconds = groups, what, nanoseconds
@@ -42,8 +42,8 @@ class Limit:
 class Section:
     def __init__(self, title, runs, repetitions, unit=None, goals=()):
         self.title = title
-        self.runs = runs  # (program, how it is run)
-        self.repetitions = repetitions  # of a whole run, of a quick one
+        self.runs = runs  # (program, kind of run)
+        self.repetitions = repetitions  # in a full run, in a quick run
         self.unit = unit  # what the counter "units" of a measurement counts
         self.goals = goals
 
@@ -122,7 +122,7 @@ SECTIONS = {
 }
 
 
-# What a run gives: for each group and contestant, in the order in which they came, the samples.
+# The results of a run: the samples of each contestant in each group, in order of registration.
 
 
 class Samples:
@@ -140,7 +140,7 @@ class Samples:
         return statistics.median(self.groups[group][name]["values"])
 
     def find(self, group, start):
-        """The full name of the first contestant of a group whose name starts so."""
+        """The full name of the first contestant of a group whose name begins with `start`."""
         names = sorted(self.groups.get(group, {}), key=lambda name: (name != start, name))
         return next((name for name in names if name.startswith(start)), None)
 
@@ -156,7 +156,7 @@ def collect(samples, results, use_cpu):
     threaded = {
         entry["name"].split("/")[0] for entry in results["benchmarks"] if entry["threads"] > 1
     }
-    # The order in which they were registered; they come in the order in which they happened to run.
+    # In order of registration, not in the random order in which they ran.
     for entry in sorted(results["benchmarks"], key=lambda entry: entry.get("family_index", 0)):
         if entry.get("error_occurred"):
             sys.exit(f"bench: {entry['name']}: {entry['error_message']}")
@@ -176,7 +176,7 @@ def collect(samples, results, use_cpu):
 
 
 def environment(home):
-    """No zone, no toolkit settings of the user's, and a home that nothing is kept in."""
+    """No time zone, no Qt settings of the user, and an empty home directory."""
     kept = {
         name: value
         for name, value in os.environ.items()
@@ -254,7 +254,7 @@ def three_digits(value):
     return f"{value:.{0 if value >= 99.95 else 1 if value >= 9.995 else 2}f}"
 
 
-def worded(value, unit):
+def formatted(value, unit):
     if unit != "ns":
         return f"{value / 1024:.1f} MiB" if unit == "KiB" else f"{value:.0f} {unit}"
     for factor, name in ((1e9, "s"), (1e6, "ms"), (1e3, "µs")):
@@ -264,7 +264,7 @@ def worded(value, unit):
 
 
 def spread(values):
-    """Half the distance between the quartiles, as a part of the median."""
+    """Half the interquartile range, relative to the median."""
     if len(values) < 3:
         return "–"
     lower, middle, upper = statistics.quantiles(values, n=4, method="inclusive")
@@ -298,9 +298,9 @@ def contestants_table(samples, group, unit_name):
     for name in sorted(contestants, key=lambda key: samples.median(group, key)):
         values, unit = contestants[name]["values"], contestants[name]["unit"]
         median = samples.median(group, name)
-        row = [name, worded(median, unit), worded(min(values), unit), spread(values)]
+        row = [name, formatted(median, unit), formatted(min(values), unit), spread(values)]
         if per_unit:
-            row.append(worded(median / samples.units[(group, name)], unit))
+            row.append(formatted(median / samples.units[(group, name)], unit))
         if floor:
             row.append(f"{median / samples.median(group, floor):.2f}")
         rows.append(row)
@@ -308,7 +308,7 @@ def contestants_table(samples, group, unit_name):
 
 
 def growth_table(samples):
-    """Groups are worded "growth|WHAT|COUNT": a row each WHAT, a column each size."""
+    """Groups are named "growth|WHAT|COUNT": one row per WHAT, one column per size."""
     kinds = {}
     for group, contestants in samples.groups.items():
         kind = group.split("|", 1)[1]
@@ -319,26 +319,26 @@ def growth_table(samples):
     rows = []
     for kind, costs in kinds.items():
         costs.sort()
-        row = [kind] + [f"{count:,}: {worded(cost, 'ns')}" for count, cost in costs]
+        row = [kind] + [f"{count:,}: {formatted(cost, 'ns')}" for count, cost in costs]
         rows.append(row + [f"{costs[-1][1] / costs[0][1]:.2f}"])
     header = ["cost of one", "few", "ten times as many", "a hundred times", "last / first"]
     return table(header, rows) + "\n"
 
 
-def measured(samples, group, start):
+def measurement(samples, group, start):
     name = samples.find(group, start)
     if not name:
-        sys.exit(f"bench: nothing was measured for a goal of '{group}'")
+        sys.exit(f"bench: no measurement for a goal of '{group}'")
     return name, samples.median(group, name)
 
 
-def judged(goal, samples, group):
-    """What was wanted, what was measured, and whether that is enough."""
-    what, value = measured(samples, group, goal.what)
+def judge(goal, samples, group):
+    """The goal as text, the measured value, and whether the goal is reached."""
+    what, value = measurement(samples, group, goal.what)
     if isinstance(goal, Limit):
-        limit = worded(goal.nanoseconds, "ns")
-        return f"{what}: at most {limit}", worded(value, "ns"), value <= goal.nanoseconds
-    other, other_value = measured(samples, group, goal.other)
+        limit = formatted(goal.nanoseconds, "ns")
+        return f"{what}: at most {limit}", formatted(value, "ns"), value <= goal.nanoseconds
+    other, other_value = measurement(samples, group, goal.other)
     reference = FLOOR if goal.other == FLOOR else other
     ratio = value / other_value
     wanted = f"{what} at most {goal.factor:.3g} × {reference}"
@@ -349,7 +349,7 @@ def goal_lines(section, samples):
     lines = []
     for goal in section.goals:
         for group in goal.groups:
-            wanted, value, reached = judged(goal, samples, group)
+            wanted, value, reached = judge(goal, samples, group)
             verdict = "reached" if reached else "NOT REACHED"
             lines.append(f"- {group}: {wanted}: {value}, {verdict}")
     return "\n".join(lines) + "\n" if lines else ""
@@ -364,7 +364,7 @@ def report(name, section, samples):
     return "\n".join([f"## {section.title}\n", *parts] + ([goals] if goals else []))
 
 
-# Where and when it was measured.
+# The machine and the date.
 
 
 def first_line(command):
@@ -416,12 +416,12 @@ def write_document(text):
     before, _, rest = document.partition(BEGIN)
     _, end, after = rest.partition(END)
     if not end:
-        sys.exit(f"bench: {DOCUMENT} has no place for the tables")
+        sys.exit(f"bench: {DOCUMENT} has no markers for the tables")
     DOCUMENT.write_text(f"{before}{BEGIN}\n\n{text}\n{END}{after}", encoding="utf-8")
 
 
 def main():
-    parser = argparse.ArgumentParser(prog="bench", description="Measures project and peers.")
+    parser = argparse.ArgumentParser(prog="bench", description="Measures the project and its peers.")
     parser.add_argument("programs", type=pathlib.Path, help=argparse.SUPPRESS)
     parser.add_argument("sections", nargs="*", metavar="SECTION", help=", ".join(SECTIONS))
     parser.add_argument("--quick", action="store_true", help="fewer and smaller measurements")
@@ -431,9 +431,9 @@ def main():
     names = options.sections or list(SECTIONS)
     unknown = [name for name in names if name not in SECTIONS]
     if unknown:
-        parser.error(f"no section is called {', '.join(unknown)}")
+        parser.error(f"unknown section: {', '.join(unknown)}")
     if options.write_doc and (options.sections or options.quick or options.cpu):
-        parser.error("the document is written from a whole run only")
+        parser.error("--write-doc needs a full run")
 
     parts = [machine(options) + "\n"]
     print(parts[0], flush=True)

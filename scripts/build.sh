@@ -2,7 +2,7 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 #
-# Configures the given preset if it is not, and builds it, or only the given targets.
+# Configures the given preset if necessary, and builds it or only the given targets.
 # Silent when there is nothing to do.
 #
 #     scripts/build.sh dev
@@ -17,13 +17,13 @@ root=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd -P)
 build=$root/build/$preset
 
 if [ "$(uname -s)" = Darwin ] && command -v brew >/dev/null; then
-    # This toolkit is an older one there, which brew keeps out of the common folders.
+    # Homebrew does not link Qt 5 into its common folders, because it is not the latest Qt.
     CMAKE_PREFIX_PATH=$(brew --prefix qt@5):$(brew --prefix)${CMAKE_PREFIX_PATH:+:$CMAKE_PREFIX_PATH}
     export CMAKE_PREFIX_PATH
 fi
 
-# CMake looks after its own files once configured, but not after the presets,
-# and a build tree that was made elsewhere and copied here is of no use to it.
+# Once configured, CMake tracks changes of its own files but not of the presets, and it cannot use a
+# build tree that was copied from elsewhere.
 configured() {
     [ -f "$build/build.ninja" ] &&
         [ ! "$root/CMakePresets.json" -nt "$build/build.ninja" ] &&
@@ -35,7 +35,7 @@ if ! configured; then
     cmake -S "$root" --preset "$preset"
 fi
 
-# A dry run first, because a build without work still has a line to say about it.
+# A dry run first, because a build with nothing to do still prints a line.
 if ! plan=$(ninja -C "$build" -n "${targets[@]}") || [[ $plan != *"no work to do"* ]]; then
     cmake --build "$build" --target "${targets[@]}"
 fi

@@ -2,8 +2,8 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 #
-# clazy, which knows the mistakes that the toolkit invites, at level 1 over the product's sources
-# and headers. Fails on any finding. Needs build/dev (scripts/build.sh dev).
+# Runs clazy, which finds mistakes in the use of Qt, at level 1 on the product's sources and headers.
+# Fails on any finding. Needs build/dev (scripts/build.sh dev).
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")/.."
 
@@ -12,8 +12,8 @@ while IFS= read -r -d '' file; do
     sources+=("$file")
 done < <(git ls-files -z --cached --others --exclude-standard 'app/*.cpp' 'common/*.cpp')
 
-# The language is named because the commands of build/dev leave it to the compiler's default.
-# It succeeds whatever it finds, so what it says is the result.
+# The language is given because the compile commands of build/dev leave it to the compiler's default.
+# clazy exits with 0 whatever it finds, so its output decides.
 findings=$(printf '%s\0' "${sources[@]}" |
     xargs -0 -n 1 -P "$(getconf _NPROCESSORS_ONLN)" \
         clazy-standalone -p build/dev --checks=level1 --header-filter='/(app|common)/' \

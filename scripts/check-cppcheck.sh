@@ -2,8 +2,8 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 #
-# cppcheck over the product's sources, with what it knows of the toolkit. Fails on any finding; one
-# that is wrong is suppressed where it stands, with the reason. Needs no build.
+# Runs cppcheck, with its description of Qt, on the product's sources. Fails on any finding; a false
+# positive is suppressed in the source, with the reason. Needs no build.
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")/.."
 
@@ -12,9 +12,9 @@ while IFS= read -r -d '' file; do
     sources+=("$file")
 done < <(git ls-files -z --cached --others --exclude-standard 'app/*.cpp' 'common/*.cpp')
 
-# Left out for all sources:
+# Disabled for all sources:
 #   useStlAlgorithm: a loop of two lines reads better than most algorithms
-#   shadowFunction: a local may be called as an accessor that its function has no use for
+#   shadowFunction: a local may have the name of an accessor that its function does not use
 printf '%s\n' "${sources[@]}" |
     cppcheck --file-list=- --quiet --std=c++17 --library=qt --inline-suppr -I . \
         --enable=warning,style,performance,portability --inconclusive \

@@ -2,7 +2,7 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 #
-# Fails where a source file is not formatted as .clang-format says; with --fix, formats it.
+# Fails if a source file does not follow .clang-format; with --fix, formats all of them.
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")/.."
 
@@ -21,4 +21,4 @@ while IFS= read -r -d '' file; do
 done < <(git ls-files -z --cached --others --exclude-standard '*.cpp' '*.h')
 
 clang-format-14 "${action[@]}" "${files[@]}"
-echo "format: ${#files[@]} files are as .clang-format says"
+echo "format: ${#files[@]} files follow .clang-format"

@@ -2,23 +2,23 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 #
-# The rules of this source tree that no compiler checks. Prints each breach, fails on any.
+# Checks the rules of this source tree that no compiler checks. Prints every violation, fails on any.
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")/.."
 
-breaches=0
+violations=0
 
-# rule TEXT COMMAND...: what the command prints are the places where the rule is broken.
+# rule TEXT COMMAND...: the command prints the places that violate the rule.
 rule() {
     local text=$1 places
     shift
     places=$("$@")
     [ -n "$places" ] || return 0
     printf 'house rules: %s:\n%s\n' "$text" "$places"
-    breaches=$((breaches + 1))
+    violations=$((violations + 1))
 }
 
-# Every file that is tracked or would be, as git matches the patterns; a pattern's * takes in folders.
+# All files that are tracked or not ignored and match the patterns of git, whose * also matches /.
 tracked() {
     local file
     git ls-files --cached --others --exclude-standard -- "$@" | sort -u |
@@ -31,7 +31,7 @@ sources() {
     tracked '*.cpp' '*.h' '*.cmake' '*CMakeLists.txt' '*.sh' '*.in' run test bench package check .ci/run .clang-tidy
 }
 
-# grep over the files named on standard input; finding nothing is no failure.
+# Runs grep on the files named on standard input; no match is not a failure.
 search() { xargs -0 -r grep "$@" || [ $? -eq 123 ]; }
 
 without_spdx() {
@@ -47,7 +47,7 @@ without_pragma_once() { tracked '*.h' | search -LE '^#pragma once$'; }
 
 stray_blanks() { sources | search -nHP '\t|[ \t]+$'; }
 
-# Ada is the user of the samples. The names are broken up so as not to find themselves.
+# Ada is the user in the samples. The names are split so that the check does not find itself.
 machine_paths() {
     local start='(^|[^]A-Za-z0-9_.}$)/-])' name='[A-Za-z0-9_.]+'
     tracked | search -nHIP \
@@ -69,13 +69,13 @@ qt_keywords() {
         search -nHE '^\s*(signals|(public|protected|private) slots):|\bemit [A-Za-z]'
 }
 
-# The rooms below the window could include the headers of widgets through the framework.
+# The framework links Qt Widgets, so the compiler would let the rooms below the window use it.
 widgets_below_the_window() {
     tracked 'app/logfile/*' 'app/settingsfile/*' 'app/runninglog/*' |
         search -nHP '^\s*#\s*include\s*<(Qt(Gui|Widgets)\b|Q\w*(Widget|Dialog|Color|Font|Icon|Image|Pixmap|Paint|Palette|Screen|Style|Menu|Label|Button|Layout|MessageBox|Window|Clipboard|GuiApplication)|QApplication)'
 }
 
-# Statements that match a pattern and hold no call of PlainToolTip(); they may go over several lines.
+# Statements, also of several lines, that set a tool tip without calling PlainToolTip().
 bare_tool_tips() {
     local rest='((?!PlainToolTip\()[^;{}])*'
     tracked 'app/*.cpp' 'app/*.h' | search -HPzo \
@@ -83,15 +83,15 @@ bare_tool_tips() {
         tr -s '\0\n' '\n'
 }
 
-# PlainText.cpp is where they are made plain; UserMessages shows boxes as its callers want them.
+# PlainText.cpp makes them plain; UserMessages leaves the format to its callers.
 guessing_widgets() {
     local boxes='(critical|warning|information|question|about)'
     tracked 'app/*.cpp' 'app/*.h' ':!app/UserMessages.cpp' ':(exclude,glob)app/**/PlainText.*' | search -nHP \
         "new QLabel\b|\bQLabel\s+\w+\s*[;({]|QMessageBox::$boxes\(|new QMessageBox\b|\bQMessageBox\s+\w+\s*[;({]|QMessageBox\(|addRow\(\s*(tr\(|QString|\")|QErrorMessage|QProgressDialog|QInputDialog|QTextBrowser|QToolTip::"
 }
 
-# docs/deliberate-oddities.md names rows as `tst_Class::function(row)`, or without a row. A name may be
-# broken over two lines.
+# docs/deliberate-oddities.md names rows as `tst_Class::function(row)`, or without the row. A name may
+# continue on the next line.
 rows_without_test() {
     local name class function row source
     tr '\n' ' ' <docs/deliberate-oddities.md | tr -s ' ' | grep -oP 'tst_\w+::[^\x60]*' |
@@ -106,7 +106,7 @@ rows_without_test() {
                 echo "$name"
             elif [ -n "$row" ] &&
                 ! sed -n "/^void $class::${function}_data()/,/^}/p" "$source" |
-                    grep -F "\"$row\"" >/dev/null; then # -q would end sed early, which counts as failed
+                    grep -F "\"$row\"" >/dev/null; then # with -q, sed would fail with SIGPIPE
                 echo "$name"
             fi
         done
@@ -114,15 +114,15 @@ rows_without_test() {
 
 rule "no SPDX lines at the top" without_spdx
 rule "a header without #pragma once" without_pragma_once
-rule "a tab, or blanks at a line's end" stray_blanks
-rule "a path of one machine" machine_paths
-rule "not as drawn in docs/architecture.md" scripts/check-rooms.py
-rule "a signal that begins with a capital letter" capital_signals
-rule "a keyword of Qt where Q_SIGNALS, Q_SLOTS or Q_EMIT belongs" qt_keywords
-rule "a widget below the window" widgets_below_the_window
+rule "a tab or trailing blanks" stray_blanks
+rule "a machine-specific path" machine_paths
+rule "does not match docs/architecture.md" scripts/check-rooms.py
+rule "a signal that starts with a capital letter" capital_signals
+rule "a Qt keyword instead of Q_SIGNALS, Q_SLOTS or Q_EMIT" qt_keywords
+rule "widgets used below the window" widgets_below_the_window
 rule "a tool tip that does not come from PlainToolTip()" bare_tool_tips
-rule "a widget that guesses whether its text is rich; see app/window/PlainText.h" guessing_widgets
+rule "a widget that guesses its text format; see app/window/PlainText.h" guessing_widgets
 rule "an oddity whose test row does not exist" rows_without_test
 
-[ "$breaches" -eq 0 ] || exit 1
-echo "house rules: $(sources | tr -dc '\0' | wc -c) files keep them"
+[ "$violations" -eq 0 ] || exit 1
+echo "house rules: $(sources | tr -dc '\0' | wc -c) files follow them"

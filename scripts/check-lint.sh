@@ -2,12 +2,11 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 #
-# clang-tidy over the product's sources, and over the headers they include, by the list in
-# .clang-tidy; shellcheck over the scripts. Needs build/dev (scripts/build.sh dev).
+# Runs clang-tidy with the checks of .clang-tidy on the product's sources and the headers that they
+# include, and shellcheck on the scripts. Needs build/dev (scripts/build.sh dev).
 #
-#     scripts/check-lint.sh            the whole list
-#     scripts/check-lint.sh --quick    without the analyzer that follows paths and the two slowest
-#                                      checks: half the time
+#     scripts/check-lint.sh            all checks
+#     scripts/check-lint.sh --quick    without the static analyzer and the two slowest checks
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")/.."
 
@@ -20,8 +19,8 @@ while IFS= read -r -d '' file; do
     sources+=("$file")
 done < <(git ls-files -z --cached --others --exclude-standard 'app/*.cpp' 'common/*.cpp')
 
-# The language is named because the commands of build/dev leave it to the compiler's default.
-# clang-tidy's count of warnings in the toolkit's own headers, a line a file, helps nobody.
+# The language is given because the compile commands of build/dev leave it to the compiler's default.
+# The number of warnings in Qt's own headers, one line per file, is filtered out as noise.
 printf '%s\0' "${sources[@]}" |
     xargs -0 -n 1 -P "$(getconf _NPROCESSORS_ONLN)" \
         clang-tidy-14 --quiet -p build/dev --extra-arg=-std=c++17 --checks="$checks" \

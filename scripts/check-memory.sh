@@ -2,9 +2,9 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 #
-# The log and config tests under valgrind memcheck: every error in the use of memory and every lost
-# block fails. Only the toolkit's own are suppressed. Takes the tests of the preset `coverage`, which
-# ./check has built by then.
+# Runs the log and config tests under valgrind memcheck; every invalid use of memory and every lost
+# block fails. Only Qt's own are suppressed. Uses the tests of the preset `coverage`, which ./check has
+# already built.
 set -euo pipefail
 
 root=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd -P)

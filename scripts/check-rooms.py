@@ -3,9 +3,9 @@
 # SPDX-License-Identifier: MIT
 """Compares the drawing in docs/architecture.md with the sources.
 
-Each arrow of the drawing says that the files of one folder may include those of another. Printed
-are includes and CMake links without an arrow, arrows that nobody uses or that no link carries,
-folders that the drawing leaves out, and files that the page names and that are not there.
+Each arrow of the drawing says that the files of one folder may include those of another. Prints
+includes and CMake links without an arrow, arrows without an include or without a link, folders
+that are missing from the drawing, and files that the page names and that do not exist.
 """
 import glob
 import os
@@ -17,7 +17,7 @@ INCLUDE = re.compile(r'^\s*#\s*include\s*[<"]([^>"]+)[>"]', re.M)
 
 
 def drawing(page):
-    """The rooms, their folders by their names in the drawing, and the arrows between folders."""
+    """The folders of the drawing, and the arrows between them as pairs of folders."""
     text = re.search(r'```mermaid\n(.*?)```', page, re.S).group(1)
     folders = dict(re.findall(r'^\s*(\w+)\["([^"<]+?)(?:<[^"]*)?"\]$', text, re.M))
     arrows = set()
@@ -34,7 +34,7 @@ def room_of(path, rooms):
 
 
 def includes(rooms):
-    """For each pair of rooms, where the first includes the second; relative ones belong nowhere."""
+    """For each pair of rooms, a file of the first that includes the second."""
     found = {}
     for path in sorted(glob.glob('app/**/*.*', recursive=True) +
                        glob.glob('common/**/*.*', recursive=True)):
@@ -87,12 +87,12 @@ def reachable(links, target):
     return seen
 
 
-def link_breaches(rooms, arrows):
+def link_violations(rooms, arrows):
     places, links = libraries(rooms)
     for target in sorted(links):
         for other in sorted(links[target]):
             if not any((a, b) in arrows for a in places[target] for b in places[other]):
-                yield f'{target} links {other}, and no arrow allows that'
+                yield f'{target} links {other}, but no arrow allows that'
     home = {room: target for target in places for room in places[target]}
     for a, b in sorted(arrows):
         if a not in home or b not in home:
@@ -101,7 +101,7 @@ def link_breaches(rooms, arrows):
             yield f'{a} --> {b}: {home[a]} does not link {home[b]}'
 
 
-def breaches():
+def violations():
     with open(PAGE, encoding='utf-8') as file:
         page = file.read()
     rooms, arrows = drawing(page)
@@ -109,21 +109,21 @@ def breaches():
     for pair in sorted(set(used) - arrows):
         yield f'{pair[0]} --> {pair[1]} is not drawn: {used[pair]}'
     for pair in sorted(arrows - set(used)):
-        yield f'{pair[0]} --> {pair[1]} is drawn, and nothing includes that'
+        yield f'{pair[0]} --> {pair[1]} is drawn, but no file includes it'
     for folder in sorted({room_of(path, rooms) for path in
                           glob.glob('app/**/*.cpp', recursive=True) +
                           glob.glob('common/**/*.cpp', recursive=True)} - rooms):
         yield f'{folder} is not drawn'
-    yield from link_breaches(rooms, arrows)
+    yield from link_violations(rooms, arrows)
     for name in sorted(set(re.findall(r'`((?:app|common|docs|scripts|tests)/[^`*]+)`', page))):
         if not os.path.exists(name):
-            yield f'{name} is named, and not there'
+            yield f'{name} is named, but does not exist'
 
 
 def main():
     os.chdir(os.path.join(os.path.dirname(__file__), '..'))
-    for breach in breaches():
-        print(f'{PAGE}: {breach}')
+    for violation in violations():
+        print(f'{PAGE}: {violation}')
 
 
 if __name__ == '__main__':

@@ -2,8 +2,8 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 #
-# Compiles each library of app/ and common/ as one file. Fails where two of its sources use the same
-# name for different things in their unnamed namespaces.
+# Compiles each library of app/ and common/ as one file. Fails if two of its sources use the same name
+# for different things in their unnamed namespaces.
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")/.."
 

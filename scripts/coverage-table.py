@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
-"""Turns gcovr's table (CSV on standard input) into one line a file and a total.
+"""Turns gcovr's table (CSV on standard input) into one line per file and a total.
 
 Fails below 95 % of lines or 90 % of branches.
 """

@@ -2,16 +2,16 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 #
-# Builds the preset `coverage`, runs the tests and prints which part of app/ and common/ they reach,
-# a line a file; fails below 95 % of lines or 90 % of branches.
+# Builds the preset `coverage`, runs the tests and prints their coverage of app/ and common/, one line
+# per file; fails below 95 % of lines or 90 % of branches.
 #
-#     scripts/coverage.sh               all tests but those of the package
-#     scripts/coverage.sh --no-run      what the last run counted
+#     scripts/coverage.sh               all tests except those of the package
+#     scripts/coverage.sh --no-run      the counts of the last run
 #
-# The compiler puts a branch to the handling of exceptions behind almost every call. No exception
-# crosses an interface here, so the product is built without them, but for the one source that
-# catches some; there, and in what it marks as unreachable, such branches are not counted.
-# Which lines and branches are missed stands in build/coverage/report/index.html.
+# The compiler adds an exception branch after almost every call. No exception crosses an interface
+# here, so the product is built without exceptions, except for the one source that catches some; its
+# exception branches, and branches that the compiler marks as unreachable, are not counted.
+# build/coverage/report/index.html shows the missed lines and branches.
 set -euo pipefail
 
 root=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd -P)
@@ -23,7 +23,7 @@ build=$root/build/coverage
 if [ "${1:-}" != --no-run ]; then
     find "$build" -name '*.gcda' -delete
     "$root/scripts/prepare-coverage.sh"
-    # Some tests compare all that a program says, or leave it no room on the disk for its counts.
+    # Some tests compare the whole output of a program, or leave it no disk space for its counts.
     export GCOV_ERROR_FILE=/dev/null
     ctest --test-dir "$build" -j3 --no-tests=error -LE package -V --quiet \
         --output-log "$build/tests.txt" || {
@@ -31,7 +31,7 @@ if [ "${1:-}" != --no-run ]; then
         sed -n '/^The following tests FAILED/,/^$/p' "$build/tests.txt"
         exit 1
     }
-    # What the proofs among them measured.
+    # The figures of the proofs.
     sed -En 's/^[0-9]+: ((hostile input|faults|sudden death|load|memory|trust)[a-z ]*: )/\1/p' \
         "$build/tests.txt"
     grep '% tests passed' "$build/tests.txt"

@@ -2,13 +2,13 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 #
-# Builds the fuzzers and runs each, or those named, for a fixed number of inputs or for a time:
+# Builds the fuzzers and runs all or the named ones, each for a number of inputs or for a time:
 #
 #     scripts/fuzz.sh                              20,000 inputs each
 #     scripts/fuzz.sh --runs 1000 screen_fit
 #     scripts/fuzz.sh --seconds 600
 #
-# An input that fails is left in build/fuzz/failed; keep it as a row in the ordinary tests.
+# A failing input is left in build/fuzz/failed; add it as a row to the ordinary tests.
 set -euo pipefail
 
 root=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd -P)
@@ -37,10 +37,10 @@ dictionary() {
     esac
 }
 
-# What a fuzzer says about itself at its end.
+# A value of the statistics that a fuzzer prints at its end.
 stat_of() { sed -n "s/^stat::$2: *//p" "$build/$1.txt"; }
 
-# One fuzzer. The seeds are only read: what else is found goes to the corpus in the build folder.
+# Runs one fuzzer. New inputs go to the corpus in the build folder; the seeds are only read.
 fuzz() {
     local name=$1 corpus=$build/corpus/$1
     mkdir -p "$corpus"
@@ -58,7 +58,7 @@ fuzz() {
 export root build
 export -f fuzz dictionary stat_of
 
-# Files that fuzzers work on lie in memory if possible, and nothing stays behind of one that fell.
+# The fuzzers' files are in memory if possible, and are removed even after a crash.
 mkdir -p "$build/failed"
 memory=/dev/shm
 [ -w "$memory" ] || memory=$build
@@ -67,10 +67,10 @@ export TMPDIR
 trap 'rm -rf "$TMPDIR"' EXIT
 
 export LC_ALL=C.UTF-8 QT_QPA_PLATFORM=offscreen
-# The toolkit keeps some of its own for the life of the program.
+# Qt keeps some memory for the life of the program.
 export ASAN_OPTIONS=detect_leaks=1
 export LSAN_OPTIONS=suppressions=$root/tests/support/toolkit-leaks.supp:print_suppressions=0
 
-# shellcheck disable=SC2016  # the name is the shell's that xargs starts
+# shellcheck disable=SC2016  # expanded by the shell that xargs starts
 printf '%s\0' "${names[@]}" |
     xargs -0 -n 1 -P "$(getconf _NPROCESSORS_ONLN)" bash -c 'fuzz "$0"'

@@ -3,21 +3,21 @@
 # SPDX-License-Identifier: MIT
 #
 # Installs the packages of the named groups, as root or through sudo (brew on macOS).
-# Nothing is asked of the network, and no password, when all of them are there already.
+# Needs neither network nor password if all of them are already installed.
 #
-#     scripts/install-packages.sh build          what the program is built from
-#     scripts/install-packages.sh wayland        the toolkit's backend for a screen without X11
-#     scripts/install-packages.sh build test     and what its tests need
-#     scripts/install-packages.sh build bench    and the peers that ./bench measures against
-#     scripts/install-packages.sh build fuzz     and the compiler with the fuzzing runtime
-#     scripts/install-packages.sh build lint     and the format and lint checks
-#     scripts/install-packages.sh build package  and what ./package validates and packs with
-#     scripts/install-packages.sh build check    and what else ./check looks with
+#     scripts/install-packages.sh build          to build the program
+#     scripts/install-packages.sh wayland        Qt's platform plug-in for Wayland
+#     scripts/install-packages.sh build test     and to run its tests
+#     scripts/install-packages.sh build bench    and the libraries that ./bench compares with
+#     scripts/install-packages.sh build fuzz     and clang with its fuzzing runtime
+#     scripts/install-packages.sh build lint     and to check format and lint
+#     scripts/install-packages.sh build package  and to validate and build the package
+#     scripts/install-packages.sh build check    and the other tools of ./check
 set -euo pipefail
 
 say() { echo "install-packages: $*" >&2; }
 
-# The names of one group's packages in the system's package manager.
+# The names of a group's packages in the system's package manager.
 packages_of() {
     case "$(uname -s)/$1" in
     Darwin/build) echo cmake ninja qt@5 rapidxml ;;
@@ -36,7 +36,7 @@ packages_of() {
     */check) echo clazy cppcheck gcovr valgrind python3 ;;
     */lint) echo git clang-format-14 clang-tidy-14 shellcheck ;;
     *)
-        say "no group is called '$1'"
+        say "unknown group: $1"
         return 2
         ;;
     esac
@@ -44,7 +44,7 @@ packages_of() {
 
 missing_from_apt() {
     local installed
-    # dpkg-query fails where it does not know a name: just what is asked here.
+    # dpkg-query fails for an unknown name, which is just a missing package here.
     # shellcheck disable=SC2016
     installed=$(dpkg-query -W -f='${db:Status-Status} ${Package}\n' "$@" 2>/dev/null || true)
     for package in "$@"; do
@@ -64,7 +64,7 @@ as_root() {
     elif command -v sudo >/dev/null; then
         sudo "$@"
     else
-        say "not root and no sudo here; as root, run: apt-get install ${missing[*]}"
+        say "neither root nor sudo; as root, run: apt-get install ${missing[*]}"
         return 1
     fi
 }
@@ -88,7 +88,7 @@ if command -v dpkg-query >/dev/null && command -v apt-get >/dev/null; then
 elif command -v brew >/dev/null; then
     manager=brew
 else
-    say "neither apt-get nor brew here; going on in the hope that these are installed: ${names[*]}"
+    say "neither apt-get nor brew found; assuming that these are installed: ${names[*]}"
     exit 0
 fi
 

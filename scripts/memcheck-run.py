@@ -6,7 +6,7 @@
     scripts/memcheck-run.py BUILD-FOLDER SUPPRESSIONS LABEL-PATTERN
 
 Each test is started as CTest would start it, with memcheck in front of the program. A test that
-fails because it is slowed down fails here as well: none of them measures time.
+fails because it is slower here counts as failed: no test may depend on time.
 """
 
 import json
@@ -27,7 +27,7 @@ MEMCHECK = [
 
 
 def tests_of(build, labels):
-    # A program's runs in other languages use memory no differently.
+    # Runs of a program in other languages use memory the same way.
     others = "^(memcheck|locale)$"
     listing = subprocess.run(
         ["ctest", "--test-dir", build, "--show-only=json-v1", "-L", labels, "-LE", others],

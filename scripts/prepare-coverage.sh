@@ -2,8 +2,9 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 #
-# Makes the files of counts that the preset `coverage` writes, where they are missing: empty, and for
-# everyone to write, because some tests become another user, and compare all that a program says.
+# Creates the missing counter files of the preset `coverage`, empty and world-writable: some tests
+# switch to another user and compare the whole output of a program, which must not include warnings
+# about these files.
 set -euo pipefail
 
 root=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd -P)
