@@ -170,7 +170,7 @@ void tst_MruLists::menuTellsThePath()
 
 void tst_MruLists::menuOfManyEntries()
 {
-    // Adding an action looks through those that are there, so a menu takes fewer than a list.
+    // Adding an action searches the existing ones, so a menu gets fewer than a list.
     const QString list = Numbered(Many / 10);
     QMenu recent;
     QCOMPARE(AppUtils::SetupMRUMenu(&recent, list), true);
@@ -411,7 +411,7 @@ void tst_MruLists::removingTheLastEntryLeavesATextThatCanBeStored()
     QString list = QStringLiteral("a");
     QVERIFY(AppUtils::RemoveFromMRUList(QStringLiteral("a"), list));
     QVERIFY(list.isEmpty());
-    QVERIFY(!list.isNull()); // a null text would be refused by the settings
+    QVERIFY(!list.isNull()); // settings would reject a null string
 }
 
 void tst_MruLists::addStepByStep()
@@ -427,7 +427,7 @@ void tst_MruLists::addStepByStep()
     QCOMPARE(list, QString());
 }
 
-// The empty entry of the empty list leaves in the end as the oldest one.
+// The empty entry of the empty list is eventually dropped as the oldest one.
 void tst_MruLists::addInTurn()
 {
     QString list;

@@ -30,7 +30,7 @@ QString Stored(TorkConfigFile& file, QString const& section, QString const& key)
     return text;
 }
 
-// Of several calls, each of which is made.
+// For several calls, each of which must be made.
 bool Any(std::initializer_list<bool> results)
 {
     return std::max(results);
@@ -409,7 +409,7 @@ void tst_TorkConfigFileValues::readBool_data()
         QTest::addRow("\"%s\" is false", no) << no << false;
     QTest::newRow("empty is false") << "" << false;
     QTest::newRow("blank is false") << " " << false;
-    QTest::newRow("line end behind is false") << "yes\n" << false;
+    QTest::newRow("trailing line end is false") << "yes\n" << false;
 }
 
 void tst_TorkConfigFileValues::readBool()
@@ -419,7 +419,7 @@ void tst_TorkConfigFileValues::readBool()
     TorkConfigFile file{QString()};
     file.WriteItem("s", "k", stored);
 
-    // Neither the default nor what the value held before shows through.
+    // Neither the default nor the previous value shows through.
     bool value = !expected;
     QVERIFY(file.ReadBool("s", "k", !expected, value));
     QCOMPARE(value, expected);
@@ -486,7 +486,7 @@ void tst_TorkConfigFileValues::readColor()
     QFETCH(QColor, expected);
     TorkConfigFile file{QString()};
     file.WriteItem("s", "k", stored);
-    if (!expected.isValid()) // the toolkit's own range check
+    if (!expected.isValid()) // Qt's own range check
         QTest::ignoreMessage(QtWarningMsg, "QColor::setRgb: RGB parameters out of range");
 
     QColor colour(9, 8, 7, 6);
@@ -548,10 +548,10 @@ void tst_TorkConfigFileValues::readFont_data()
                            << QFont("Helvetica", 12);
     QTest::newRow("with attributes") << bold.toString() << QByteArray() << true << bold;
     QTest::newRow("missing") << QString() << QByteArray() << false << untouched;
-    QTest::newRow("three fields are no font, and yet the key was found")
+    QTest::newRow("three fields are not a font, but the key was found")
         << "a,b,c" << QByteArray("QFont::fromString: Invalid description 'a,b,c'") << true
         << untouched;
-    QTest::newRow("empty is no font, and yet the key was found")
+    QTest::newRow("empty is not a font, but the key was found")
         << "" << QByteArray("QFont::fromString: Invalid description '(empty)'") << true
         << untouched;
 }
@@ -562,7 +562,7 @@ void tst_TorkConfigFileValues::readFont()
     QFETCH(QByteArray, warning);
     TorkConfigFile file{QString()};
     file.WriteItem("s", "k", stored);
-    if (!warning.isEmpty()) // the toolkit's own
+    if (!warning.isEmpty()) // Qt's own
         QTest::ignoreMessage(QtWarningMsg, warning.constData());
 
     QFont font("Times", 9);
