@@ -50,7 +50,7 @@ private:
 
 namespace {
 
-// A limit that every current file is beyond.
+// A limit that every current file exceeds.
 const unsigned int tight = 1;
 
 } // namespace
@@ -128,7 +128,7 @@ void tst_TorkLogRotation::rotation_data()
         {becameFirst, "app.log.+3: p", "app.log.4: t"});
     row("leading zero", "10", {current, "app.log.03: t"}, {becameFirst, "app.log.4: t"});
 
-    // What stands in the way stays, and so does what should have gone there.
+    // What is in the way stays, and so does what should have gone there.
     row("directory in place of number 1", "10", {current, "app.log.1/"}, {"app.log.1/"});
     row("directory in place of number 2", "10", {current, "app.log.1: a", "app.log.2/"},
         {"app.log.1: a", "app.log.2/"});
@@ -162,7 +162,7 @@ void tst_TorkLogRotation::rotation()
     QCOMPARE(messages.texts(), QStringList());
 }
 
-// Directory and name run together, so that nothing is shifted; removing and copying work.
+// Directory and name are concatenated, so nothing is shifted; removing and copying work.
 void tst_TorkLogRotation::rotationWithoutFinalSlash_data()
 {
     QTest::addColumn<QStringList>("before");
@@ -223,7 +223,7 @@ void tst_TorkLogRotation::rotationInOddDirectories()
              QStringList({"app.log: new\n", "app.log.1: old", "app.log.2: a"}));
 }
 
-// The neighbours are what the toolkit's wildcards would take for the log's own files, and more.
+// The neighbors match what Qt's wildcards would take for the log's own files, and more.
 void tst_TorkLogRotation::onlyOwnFiles_data()
 {
     QTest::addColumn<QString>("prefix");
@@ -300,12 +300,12 @@ void tst_TorkLogRotation::neighboursAloneAreNotTheLog()
     QCOMPARE(folder.listing(), TestFiles::sorted(own + untouched));
 }
 
-// A listing without hidden files never shows such a log: nobody looks at its size, and what is
-// numbered is none of its own.
+// A listing without hidden files never shows such a log: its size is never checked, and its
+// numbered files are not recognized.
 void tst_TorkLogRotation::hiddenNames_data()
 {
     QTest::addColumn<QString>("prefix");
-    QTest::addColumn<bool>("rotates"); // asked for directly
+    QTest::addColumn<bool>("rotates"); // rotation requested directly
     QTest::addColumn<QStringList>("after");
 
     QTest::newRow("full, begins with a dot")
@@ -340,7 +340,7 @@ void tst_TorkLogRotation::hiddenNames()
     QCOMPARE(folder.listing(), after.replaceInStrings("%1", full.mid(4)));
 }
 
-// Whatever lies under a number above the limit goes; only listed files move up, though.
+// Anything with a number above the limit is removed; only listed files move up, though.
 void tst_TorkLogRotation::pruningGoesByName_data()
 {
     QTest::addColumn<QStringList>("before");
@@ -397,7 +397,7 @@ void tst_TorkLogRotation::unfinishedCopies_data()
     QTest::newRow("seven letters") << "app.log.1.aBcXyZz.part: x" << true;
     QTest::newRow("of another number") << "app.log.2.aBcXyZ.part: x" << true;
     QTest::newRow("of another log") << "app2.log.1.aBcXyZ.part: x" << true;
-    QTest::newRow("goes on") << "app.log.1.aBcXyZ.part.gz: x" << true;
+    QTest::newRow("longer extension") << "app.log.1.aBcXyZ.part.gz: x" << true;
     QTest::newRow("other letter case") << "app.log.1.aBcXyZ.PART: x" << true;
     QTest::newRow("link") << "app.log.1.aBcXyZ.part -> app.log" << true;
     QTest::newRow("dangling link") << "app.log.1.aBcXyZ.part -> nowhere" << true;
