@@ -238,7 +238,7 @@ void tst_MruLists::add_data()
                                   << "a|b|c" << 5 << "A|a|b|c";
     QTest::newRow("blanks matter") << " a"
                                    << "a|b" << 5 << " a|a|b";
-    QTest::newRow("paths are not normalised") << "/x/../a"
+    QTest::newRow("paths are not normalized") << "/x/../a"
                                               << "/a" << 5 << "/x/../a|/a";
     QTest::newRow("a part is not the whole") << "ab"
                                              << "abc|b" << 5 << "ab|abc|b";

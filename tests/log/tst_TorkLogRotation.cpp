@@ -31,8 +31,8 @@ private slots:
     void rotationInOddDirectories();
     void onlyOwnFiles_data();
     void onlyOwnFiles();
-    void neighboursAloneAreNotTheLog_data();
-    void neighboursAloneAreNotTheLog();
+    void neighborsAloneAreNotTheLog_data();
+    void neighborsAloneAreNotTheLog();
 
     void hiddenNames_data();
     void hiddenNames();
@@ -227,7 +227,7 @@ void tst_TorkLogRotation::rotationInOddDirectories()
 void tst_TorkLogRotation::onlyOwnFiles_data()
 {
     QTest::addColumn<QString>("prefix");
-    QTest::addColumn<QStringList>("neighbours");
+    QTest::addColumn<QStringList>("neighbors");
 
     QTest::newRow("plain") << "app"
                            << QStringList({"app", "app.1", "app.log1", "app.log-1", "app.logx.1",
@@ -258,13 +258,13 @@ void tst_TorkLogRotation::onlyOwnFiles_data()
 void tst_TorkLogRotation::onlyOwnFiles()
 {
     QFETCH(QString, prefix);
-    QFETCH(QStringList, neighbours);
+    QFETCH(QStringList, neighbors);
     LogFolder folder;
     const QString name = prefix + ".log";
     const QString full(3000, 'f');
     QStringList untouched;
-    for (QString const& neighbour : neighbours)
-        untouched.append(neighbour + ": " + full);
+    for (QString const& neighbor : neighbors)
+        untouched.append(neighbor + ": " + full);
     populate(folder.logs(), untouched);
     populate(folder.logs(), {name + ": " + full, name + ".1: a", name + ".10: j"});
     TorkLog log(folder.logs());
@@ -278,19 +278,19 @@ void tst_TorkLogRotation::onlyOwnFiles()
     QCOMPARE(folder.listing(), TestFiles::sorted(own + untouched));
 }
 
-void tst_TorkLogRotation::neighboursAloneAreNotTheLog_data()
+void tst_TorkLogRotation::neighborsAloneAreNotTheLog_data()
 {
     onlyOwnFiles_data();
 }
 
-void tst_TorkLogRotation::neighboursAloneAreNotTheLog()
+void tst_TorkLogRotation::neighborsAloneAreNotTheLog()
 {
     QFETCH(QString, prefix);
-    QFETCH(QStringList, neighbours);
+    QFETCH(QStringList, neighbors);
     LogFolder folder;
     QStringList untouched;
-    for (QString const& neighbour : neighbours)
-        untouched.append(neighbour + ": n");
+    for (QString const& neighbor : neighbors)
+        untouched.append(neighbor + ": n");
     populate(folder.logs(), untouched);
     TorkLog log(folder.logs());
     folder.prepare(log, prefix);

@@ -134,7 +134,7 @@ void tst_LogLineParser::settings()
     QTEST(entry.message, "message");
 }
 
-// No bytes are read beyond the line, and the parts always add up. Meant for the sanitizers too.
+// No bytes are read beyond the line, and the parts always add up. Also meant for the sanitizers.
 void tst_LogLineParser::anyBytes()
 {
     std::mt19937 random(1);
