@@ -320,7 +320,7 @@ void LoadWithReader(benchmark::State& state, Size size)
         QXmlSimpleReader reader;
         reader.setContentHandler(&handler);
         reader.setErrorHandler(&handler);
-        Require(reader.parse(source), QStringLiteral("the reader did not read"));
+        Require(reader.parse(source), QStringLiteral("the reader failed"));
     });
 }
 

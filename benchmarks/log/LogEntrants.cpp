@@ -50,7 +50,7 @@ std::vector<LogEntrantDescription> CheckedLogEntrants()
         {"glog", MakeGlogEntrant},
         {"Qt message handler, text stream", MakeQtHandlerEntrant},
     };
-    Require(LogMessage().size() == 100, QStringLiteral("the message has not 100 characters"));
+    Require(LogMessage().size() == 100, QStringLiteral("the message does not have 100 characters"));
     for (LogEntrantDescription const& entrant : entrants)
         Check(entrant);
     return entrants;

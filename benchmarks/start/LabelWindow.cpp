@@ -2,7 +2,7 @@
 // SPDX-License-Identifier: MIT
 
 // The program with the smallest useful window: the same startup steps, and labels with the identity
-// and the locations. The difference to the real window is the cost of its own content.
+// and the locations. The difference from the real window is the cost of its own content.
 
 #include "app/AppPaths.h"
 #include "app/WithoutOpenGl_p.h"

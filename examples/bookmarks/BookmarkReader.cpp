@@ -143,8 +143,8 @@ TorkXml_ParseState_Base* BookmarkReader::GetFirstState(QString const& name)
 
 bool BookmarkReader::fatalError(QXmlParseException const& exception)
 {
-    TorkErrorHandler wording(nullptr);
-    Fail(BookmarkErrors::NotWellFormed, wording.format(exception));
+    TorkErrorHandler formatter(nullptr);
+    Fail(BookmarkErrors::NotWellFormed, formatter.format(exception));
     return false;
 }
 

@@ -95,7 +95,7 @@ struct stat StatusOf(QString const& path)
 {
     struct stat status = {};
     if (::lstat(QFile::encodeName(path), &status) != 0)
-        qWarning("%s: cannot be looked at", qPrintable(path));
+        qWarning("%s: stat failed", qPrintable(path));
     return status;
 }
 
@@ -262,7 +262,7 @@ void tst_TorkConfigFileReplace::permissionsAreKept()
 void tst_TorkConfigFileReplace::ownerAndGroupAreKept()
 {
     if (geteuid() != 0)
-        QSKIP("Only the administrator can give files away.");
+        QSKIP("Only root can change the owner of files.");
     QVERIFY(TestFiles::write(path(), oldBytes));
     QVERIFY(SetMode(path(), 0660));
     QVERIFY(::chown(QFile::encodeName(path()), 12345, 23456) == 0);
@@ -305,7 +305,7 @@ int saves(QStringList const& arguments)
 
 #define RUN_AS_ORDINARY_USER(child)                                                                \
     if (geteuid() != 0)                                                                            \
-        QSKIP("Only the administrator can set this up.");                                          \
+        QSKIP("Only root can set this up.");                                                       \
     const ChildProcess::Result child = ChildProcess::run("ordinary", {path()});                    \
     if (child.wasSkipped())                                                                        \
         QSKIP("This process cannot become another user.");                                         \
@@ -453,7 +453,7 @@ void tst_TorkConfigFileReplace::device()
 {
     QFETCH(QString, device);
     if (!QFile::exists(device))
-        QSKIP("There is no such device.");
+        QSKIP("This system has no such device.");
     const Saved saved = SaveNew(device);
     QTEST(saved.result, "result");
     QTEST(saved.error, "error");

@@ -366,7 +366,7 @@ void tst_TorkLogRotation::pruningGoesByName_data()
         << QStringList({"app.log.1", "app.log.3", "app.log.6"});
     QTest::newRow("pipe below a huge number")
         << common + QStringList({"app.log.2147483646: h", "app.log.2147483000 |"}) << usual;
-    QTest::newRow("pipes without a number of their own stay")
+    QTest::newRow("pipes without their own number stay")
         << common +
                QStringList({"app.log.15: o", "app.log.012 |", "app.log.old.12 |", "app.log.x |"})
         << QStringList({"app.log.012", "app.log.1", "app.log.6", "app.log.old.12", "app.log.x"});

@@ -10,7 +10,7 @@ using namespace Velocor;
 namespace {
 
 // Rows, one letter each: first those of the earlier part. Rows are identified by where they start;
-// here the letter stands for that.
+// here the letter does that.
 std::shared_ptr<LogRows> Rows(char const* earlier, char const* newest)
 {
     auto rows = std::make_shared<LogRows>();

@@ -72,7 +72,7 @@ void Messages()
     DebugMessage(nullptr, "only logged", false);
     QString text("two\nlines");
     QString error;
-    Check(StripFormatting(text) == "two lines", "formatting is taken out");
+    Check(StripFormatting(text) == "two lines", "formatting is removed");
     Check(FormatError("error", error) == "error", "an error is formatted");
 }
 

@@ -245,7 +245,7 @@ void writeFor(TorkLog& log, TorkConfigFile& configuration, int entries)
 void tst_Load::aDayLeaksNothing()
 {
     if (heapInUse() < 0)
-        QSKIP("This program's heap does not tell how much of it is in use.");
+        QSKIP("This system does not report heap usage.");
 
     const int entries = Figures::wanted("VELOCOR_DAY_ENTRIES", 86400);
     LogFolder folder;

@@ -206,14 +206,14 @@ QString wrongInEntries(Files const& files, quint64 run, Victim::Report const& re
                                   .arg(stretch.last)
                                   .arg(stretch.part);
         if (rotation.rotates && !stretch.rest.isEmpty())
-            return where + "something else behind them";
+            return where + "something else after them";
         if (stretch.run != run)
             continue;
 
         if (stretch.rest.contains('<' + QByteArray::number(run) + '.'))
-            return where + "entries of the same run behind half an entry";
+            return where + "entries of the same run after half an entry";
         if (isOver)
-            return where + "entries of the same run behind half an entry in the file before";
+            return where + "entries of the same run after half an entry in the file before";
         isOver = stretch.endsInHalf();
         if (next == 0 && stretch.first != 1 && files.lastKey() < rotation.maxLogFiles)
             return where + "those before are lost";

@@ -209,7 +209,7 @@ void tst_Trust::programWritesInItsOwnPlaces_data()
 void tst_Trust::programWritesInItsOwnPlaces()
 {
     if (QStringLiteral(FILE_RECORDER).isEmpty())
-        QSKIP("The sanitizers do not let a library be loaded in front of them.");
+        QSKIP("The sanitizers do not allow a preloaded library.");
     QFETCH(bool, hasRunBefore);
     LogFolder folder;
     const Program program(folder.root());
@@ -262,7 +262,7 @@ ChildProcess::Result runWatched(QString const& report, QStringList const& argume
 void tst_Trust::frameworkWritesWhereItIsTold()
 {
     if (QStringLiteral(FILE_RECORDER).isEmpty())
-        QSKIP("The sanitizers do not let a library be loaded in front of them.");
+        QSKIP("The sanitizers do not allow a preloaded library.");
     LogFolder folder;
     LogFolder reports;
     const QString report = reports.root() + "report";
@@ -280,7 +280,7 @@ void tst_Trust::frameworkWritesWhereItIsTold()
 void tst_Trust::recorderSeesPrograms()
 {
     if (QStringLiteral(FILE_RECORDER).isEmpty())
-        QSKIP("The sanitizers do not let a library be loaded in front of them.");
+        QSKIP("The sanitizers do not allow a preloaded library.");
     LogFolder folder;
     const QString report = folder.root() + "report";
     QProcess process;
@@ -455,7 +455,7 @@ int writesThroughLinks(QStringList const& arguments)
 void tst_Trust::linkOfAnotherUser()
 {
     if (geteuid() != 0)
-        QSKIP("Only the administrator has files that another user may not write.");
+        QSKIP("Only root has files that another user may not write.");
     LogFolder folder;
     QFile::setPermissions(folder.root(), QFile::Permissions(0x7755));
     QFile::setPermissions(folder.logs(), QFile::Permissions(0x7777));

@@ -65,7 +65,7 @@ public:
     {
 #ifdef Q_OS_UNIX
         if (m_changed && seteuid(0) != 0)
-            qFatal("cannot become the administrator again");
+            qFatal("cannot become root again");
         allowTracing();
 #endif
     }

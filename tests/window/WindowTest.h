@@ -29,7 +29,7 @@ public:
         if (QTest::qWaitForWindowExposed(window.get()))
             window->activateWindow();
         if (!QTest::qWaitForWindowActive(window.get()))
-            qWarning("the window does not get the keyboard");
+            qWarning("the window does not get the keyboard focus");
         return window;
     }
 

@@ -276,10 +276,10 @@ void tst_TorkXmlWriters::elements_data()
     AddRow("close without open", {Close("a")}, ">\n");
     AddRow("end tag need not match", {Start("a"), End("b")}, "<a>\n</b>\n");
 
-    AddRow("names are put in as they stand: open", {Open("a<&\">'\\")}, "<a<&\">'\\ ");
-    AddRow("names are put in as they stand: start", {Start("a<&\">'\\")}, "<a<&\">'\\>\n");
-    AddRow("names are put in as they stand: end", {End("a<&\">'\\")}, "</a<&\">'\\>\n");
-    AddRow("names are put in as they stand: leaf", {Element("a<&\">'\\", "x")},
+    AddRow("names are inserted unchanged: open", {Open("a<&\">'\\")}, "<a<&\">'\\ ");
+    AddRow("names are inserted unchanged: start", {Start("a<&\">'\\")}, "<a<&\">'\\>\n");
+    AddRow("names are inserted unchanged: end", {End("a<&\">'\\")}, "</a<&\">'\\>\n");
+    AddRow("names are inserted unchanged: leaf", {Element("a<&\">'\\", "x")},
            "<a<&\">'\\>x</a<&\">'\\>\n");
     AddRow("blank name is a name", {Start(" "), End(" ")}, "< >\n</ >\n");
     AddRow("name with a placeholder: open", {Open("a%1%2")}, "<a%1%2 ");
@@ -311,7 +311,7 @@ void tst_TorkXmlWriters::levels_data()
     AddRow("unit of two blanks", {Start("a"), Indent()}, "<a>\n  ");
     AddRow("unit once a level", {Start("a"), Start("b"), Start("c"), Indent()},
            "<a>\n  <b>\n    <c>\n      ");
-    AddRow("children stand one level in", {Start("a"), Element("b", "1"), End("a")},
+    AddRow("children are indented one level", {Start("a"), Element("b", "1"), End("a")},
            "<a>\n  <b>1</b>\n</a>\n");
     AddRow("leaf leaves the level alone", {Start("a"), Element("b", "1"), Element("c", "2")},
            "<a>\n  <b>1</b>\n  <c>2</c>\n");
@@ -324,12 +324,12 @@ void tst_TorkXmlWriters::levels_data()
     AddRow("start and end restore", {Start("a", 3), End("a", 3), Indent()}, "<a>\n</a>\n");
     AddRow("open, close and end restore", {Open("a", 3), CloseAndEnd("a", 3), Indent()}, "<a />\n");
     AddRow("open and close restore", {Open("a", 3), Close("a", 3), Indent()}, "<a >\n");
-    AddRow("end tag stands at the lowered level", {Start("a", 2), End("b", 1)}, "<a>\n  </b>\n");
+    AddRow("end tag is at the lowered level", {Start("a", 2), End("b", 1)}, "<a>\n  </b>\n");
 
     AddRow("element with attributes ends one level too low",
            {Start("root"), Open("item"), Attribute("a", "1"), Close("item"), End("item")},
            "<root>\n  <item  a=\"1\">\n</item>\n");
-    AddRow("children of an element with attributes stand at its own level",
+    AddRow("children of an element with attributes are at its own level",
            {Start("root"), Open("item"), Attribute("a", "1"), Close("item"), Element("x", "1")},
            "<root>\n  <item  a=\"1\">\n  <x>1</x>\n");
     AddRow("smaller indent at close moves the children in",
