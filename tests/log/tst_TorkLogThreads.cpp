@@ -146,7 +146,7 @@ void tst_TorkLogThreads::entries()
     QCOMPARE(messages(TestFiles::read(folder.logs() + "app.log"), start), allTexts());
 }
 
-// Closing is never tested while others write; each opening may rotate the file, though.
+// Closing makes the next entry reopen the file, which may rotate it.
 void tst_TorkLogThreads::rotationUnderWay()
 {
     LogFolder folder;
@@ -163,7 +163,7 @@ void tst_TorkLogThreads::rotationUnderWay()
         }
     });
 
-    // An opening with room left overwrites the start of the file: not tested here.
+    // A file reopened with room left is overwritten, so its entries are not compared here.
     const QStringList files = folder.listing();
     QVERIFY(files.size() > 1);
     QVERIFY(files.size() <= threadCount * entriesEach / 100 + 1);
