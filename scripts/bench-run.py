@@ -176,7 +176,7 @@ def collect(samples, results, use_cpu):
 
 
 def environment(home):
-    """No zone, no toolkit settings of the user's, and a home that nothing is kept in."""
+    """No time zone, none of the user's Qt settings, and an empty home folder."""
     kept = {
         name: value
         for name, value in os.environ.items()

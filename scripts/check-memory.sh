@@ -3,7 +3,7 @@
 # SPDX-License-Identifier: MIT
 #
 # The log and config tests under valgrind memcheck: every error in the use of memory and every lost
-# block fails. Only the toolkit's own are suppressed. Takes the tests of the preset `coverage`, which
+# block fails. Only Qt's own are suppressed. Takes the tests of the preset `coverage`, which
 # ./check has built by then.
 set -euo pipefail
 
@@ -13,5 +13,5 @@ root=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd -P)
 "$root/scripts/build.sh" coverage tests/log/all tests/config/all
 "$root/scripts/prepare-coverage.sh"
 
-exec "$root/scripts/memcheck-run.py" "$root/build/coverage" "$root/tests/support/toolkit.supp" \
+exec "$root/scripts/memcheck-run.py" "$root/build/coverage" "$root/tests/support/qt.supp" \
     '^(log|config)$'
