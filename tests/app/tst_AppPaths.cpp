@@ -154,7 +154,7 @@ void tst_AppPaths::setupRootPath_data()
     QTest::newRow("not empty: kept, nothing published") << "/kept"
                                                         << "/kept"
                                                         << "not published";
-    QTest::newRow("a blank is not empty") << " "
+    QTest::newRow("a space is not empty") << " "
                                           << " "
                                           << "not published";
 }
@@ -346,8 +346,8 @@ void tst_AppPaths::rootRule_data()
                                                << "e/";
     QTest::newRow("a longer name begins so too") << "f/X.app/Contents/MacOSX"
                                                  << "f/";
-    QTest::newRow("a longer name before is none") << "g/X.app/MyContents/MacOS"
-                                                  << "g/X.app/MyContents/";
+    QTest::newRow("a longer name before is not a bundle") << "g/X.app/MyContents/MacOS"
+                                                          << "g/X.app/MyContents/";
     QTest::newRow("only half of it") << "h/X.app/Contents/Resources"
                                      << "h/X.app/Contents/";
     QTest::newRow("bundle right below the top") << "Y.app/Contents/MacOS"

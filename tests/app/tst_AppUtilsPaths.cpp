@@ -78,7 +78,7 @@ void tst_AppUtilsPaths::setupRootPath_data()
     QTest::newRow("null") << QString() << OwnRoot();
     QTest::newRow("not empty: kept") << "/kept"
                                      << "/kept";
-    QTest::newRow("a blank is not empty") << " "
+    QTest::newRow("a space is not empty") << " "
                                           << " ";
 }
 

@@ -552,8 +552,8 @@ void tst_Program::unusableDataFolder_data()
                                                        << "plain";
     QTest::newRow("a file in the log folder's place") << "other"
                                                       << "other/yourorganization/yourproduct/logs";
-    QTest::newRow("a place where nothing can be made") << "../../proc/nowhere"
-                                                       << "";
+    QTest::newRow("a place where nothing can be created") << "../../proc/nowhere"
+                                                          << "";
 }
 
 // Nothing can be logged; nothing else is affected.

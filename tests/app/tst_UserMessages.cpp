@@ -295,7 +295,7 @@ void tst_UserMessages::titles_data()
     QTest::newRow("letters beyond ASCII")
         << QVariant(QString::fromUtf8("Ger\xC3\xA4t")) << QString::fromUtf8("Ger\xC3\xA4t");
     QTest::newRow("a number becomes a text") << QVariant(42) << "42";
-    QTest::newRow("what is no text gives none") << QVariant(QRect(1, 2, 3, 4)) << "";
+    QTest::newRow("not a string: empty") << QVariant(QRect(1, 2, 3, 4)) << "";
 }
 
 void tst_UserMessages::titles()

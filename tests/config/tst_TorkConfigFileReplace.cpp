@@ -445,7 +445,7 @@ void tst_TorkConfigFileReplace::device_data()
     QTest::addColumn<QString>("device");
     QTest::addColumn<bool>("result");
     QTest::addColumn<QString>("error");
-    QTest::newRow("takes all") << "/dev/null" << true << InPlace("/dev/null", ENODEV);
+    QTest::newRow("accepts everything") << "/dev/null" << true << InPlace("/dev/null", ENODEV);
     QTest::newRow("is always full") << "/dev/full" << false << Unable("/dev/full", ENOSPC);
 }
 

@@ -103,8 +103,8 @@ void tst_TorkLogRotation::rotation_data()
         {current, "app.log.1: a", "app.log.2: b", "app.log.3: c", "app.log.7: g", "app.log.8: h"},
         {becameFirst, "app.log.2: a", "app.log.3: b"});
     row("limit of one", "1", {current, "app.log.1: a"}, {becameFirst});
-    row("limit of none", "0", {current, "app.log.1: a", "app.log.2: b"}, {becameFirst});
-    row("limit of none, none there", "0", {current}, {becameFirst});
+    row("limit of zero", "0", {current, "app.log.1: a", "app.log.2: b"}, {becameFirst});
+    row("limit of zero, no files", "0", {current}, {becameFirst});
     row("negative limit takes number 0 too", "-1", {current, "app.log.0: z", "app.log.1: a"},
         {becameFirst});
 
@@ -141,8 +141,7 @@ void tst_TorkLogRotation::rotation_data()
         {current, "app.log.5: e", "app.log.2147483647: h"}, {becameFirst, "app.log.6: e"});
     row("one below the highest at the highest limit", "2147483647",
         {current, "app.log.2147483646: h"}, {becameFirst, "app.log.2147483647: h"});
-    row("beyond all numbers is none", "10",
-        {current, "app.log.2147483648: h", "app.log.99999999999: i"},
+    row("number out of range", "10", {current, "app.log.2147483648: h", "app.log.99999999999: i"},
         {becameFirst, "app.log.2147483648: h", "app.log.99999999999: i"});
 }
 

@@ -126,7 +126,7 @@ void tst_TorkLogStamps::stampFollowsTheClock_data()
 
     QTest::newRow("usual") << "yyyy-MM-dd hh:mm:ss.z";
     QTest::newRow("three digits of milliseconds") << "dd.MM.yyyy HH:mm:ss,zzz";
-    QTest::newRow("two digits of milliseconds are none") << "ss.zz";
+    QTest::newRow("two letters for milliseconds") << "ss.zz";
     QTest::newRow("without leading zeros") << "d.M.yyyy H:m:s.z";
     QTest::newRow("without separators") << "yyyyMMddhhmmsszzz";
     QTest::newRow("year of two digits") << "yy-MM-dd ss";
@@ -404,7 +404,7 @@ void tst_TorkLogStamps::elapsedTime_data()
         << QByteArray("T Trace dT:[-86399999] x\n");
     QTest::newRow("a day and a second")
         << from << from.addDays(1).addSecs(1) << QByteArray("T Trace dT:[1000] x\n");
-    QTest::newRow("the clock was put back")
+    QTest::newRow("the clock was set back")
         << from << from.addSecs(-60) << QByteArray("T Trace dT:[-60000] x\n");
 }
 

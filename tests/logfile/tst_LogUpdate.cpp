@@ -66,7 +66,7 @@ void tst_LogUpdate::compare_data()
     row("equal rows are not counted from both ends", "aa", "x", "a", "x", false, {1, 1, 0, 0});
     row("the newest run is shorter", "ab", "xy", "ab", "x", true, {});
     row("the earlier part is gone", "ab", "xy", "", "xy", true, {});
-    row("there is an earlier part now", "", "xy", "ab", "xy", true, {});
+    row("an earlier part appears", "", "xy", "ab", "xy", true, {});
 }
 
 void tst_LogUpdate::compare()

@@ -23,7 +23,7 @@ foreach(library IN LISTS libraries)
     if(NOT result EQUAL 0)
         message(FATAL_ERROR "${NM} ${library}: ${result}")
     endif()
-    # An uppercase letter means a global symbol; templates and inline functions (V, W, u) are exempt.
+    # Uppercase means a global symbol; templates and inline functions (V, W, u) are exempt.
     string(REGEX MATCHALL "[0-9a-f]+ [TDBRSC] [^\n]+" symbols "${symbols}")
     if(NOT symbols)
         message(FATAL_ERROR "no symbols in ${library}")

@@ -636,20 +636,20 @@ void tst_TorkXml_ParseManager::endedStateGoes_data()
                                 << "r pushed" << 0 << true;
     QTest::newRow("pushes three") << "+++"
                                   << "r pushed pushed pushed" << 0 << true;
-    QTest::newRow("pushes one and takes it off") << "+-"
-                                                 << "r" << 1 << true;
-    QTest::newRow("takes itself off") << "-"
-                                      << "r" << 1 << false;
-    QTest::newRow("takes itself off and pushes one") << "-+"
-                                                     << "r pushed" << 1 << false;
-    QTest::newRow("takes itself off and back") << "-="
-                                               << "r" << 0 << true;
-    QTest::newRow("takes itself and its parent off") << "--"
-                                                     << "" << 2 << false;
+    QTest::newRow("pushes one and pops it") << "+-"
+                                            << "r" << 1 << true;
+    QTest::newRow("pops itself") << "-"
+                                 << "r" << 1 << false;
+    QTest::newRow("pops itself and pushes one") << "-+"
+                                                << "r pushed" << 1 << false;
+    QTest::newRow("pops itself and pushes itself back") << "-="
+                                                        << "r" << 0 << true;
+    QTest::newRow("pops itself and its parent") << "--"
+                                                << "" << 2 << false;
     QTest::newRow("puts itself below its parent") << "--=="
                                                   << "r" << 0 << true;
-    QTest::newRow("takes more off than there is") << "---"
-                                                  << "" << 3 << false;
+    QTest::newRow("pops more than there is") << "---"
+                                             << "" << 3 << false;
 }
 
 // It is removed and deleted whatever it pushed, but not if it removed itself from the stack.
