@@ -55,7 +55,7 @@ QString Key(int key)
     return QStringLiteral("Key%1").arg(key);
 }
 
-// What settings hold, without a character that one of the formats would have to protect.
+// The contents of the settings, without characters that one of the formats would have to escape.
 QString Value(int section, int key)
 {
     const int number = section * 7919 + key * 104729;
@@ -82,7 +82,7 @@ void ForEach(Size size, Store const& store, ValueMaker value)
     }
 }
 
-// Each contestant: how its settings come to be, are filled, changed, saved and loaded.
+// Each contestant: how its settings are created, filled, changed, saved and loaded.
 
 class Tork
 {
@@ -116,12 +116,12 @@ private:
     TorkConfigFile m_settings;
 };
 
-class ToolkitSettings
+class QtSettings
 {
 public:
     static constexpr char const* Name = "QSettings";
 
-    explicit ToolkitSettings(QString const& file) : m_settings(file, QSettings::IniFormat) {}
+    explicit QtSettings(QString const& file) : m_settings(file, QSettings::IniFormat) {}
 
     void set(int section, int key, QString const& value)
     {
@@ -129,7 +129,7 @@ public:
     }
     void save() { m_settings.sync(); }
 
-    // The sections are parsed when they are first asked for, so each is asked once.
+    // The sections are parsed on first access, so each is accessed once.
     static void load(QString const& file, Size size)
     {
         const QSettings settings(file, QSettings::IniFormat);
@@ -232,7 +232,7 @@ private:
     pugi::xml_node m_root;
 };
 
-// Sets the file's time so that a library which keeps what it has read looks at the file again.
+// Sets the file's time so that a library with a cache reads the file again.
 void MakeYounger(QString const& fileName, int seconds)
 {
     timespec times[2] = {};
@@ -277,7 +277,7 @@ void LoadSettings(benchmark::State& state, Size size)
     TimeLoads(state, file, [size](QString const& name) { Contestant::load(name, size); });
 }
 
-// The least that a store has to do: key and text of each item in memory of their own.
+// The minimum that a store has to do: allocate the key and text of each item.
 class KeepingHandler : public QXmlDefaultHandler
 {
 public:
@@ -303,7 +303,7 @@ private:
     std::vector<std::pair<QString, QString>> m_items;
 };
 
-// The file of TorkConfigFile, read by the reader that it reads with.
+// The file of TorkConfigFile, read by the same reader.
 template <class Handler>
 void LoadWithReader(benchmark::State& state, Size size)
 {
@@ -320,7 +320,7 @@ void LoadWithReader(benchmark::State& state, Size size)
         QXmlSimpleReader reader;
         reader.setContentHandler(&handler);
         reader.setErrorHandler(&handler);
-        Require(reader.parse(source), QStringLiteral("the reader did not read"));
+        Require(reader.parse(source), QStringLiteral("the reader failed"));
     });
 }
 
@@ -358,8 +358,8 @@ void SaveFloor(benchmark::State& state, Size size)
     }
 }
 
-// Typed reads: the numbers of 20 sections with 50 keys each, in a mixed order, as nobody reads
-// settings one after another.
+// Typed reads: the numbers of 20 sections with 50 keys each, in random order, because nobody reads
+// settings sequentially.
 
 constexpr Size ReadSize{20, 50};
 
@@ -398,7 +398,7 @@ std::vector<Place> MixedPlaces()
     return places;
 }
 
-// One number an iteration; `read` gets the indices of section and key.
+// One number per iteration; `read` gets the indices of section and key.
 template <class Read>
 void TimeReads(benchmark::State& state, Read const& read)
 {
@@ -449,7 +449,7 @@ void ReadTork(benchmark::State& state)
     });
 }
 
-void ReadToolkitSettings(benchmark::State& state)
+void ReadQtSettings(benchmark::State& state)
 {
     const ScratchFolder folder;
     QSettings settings(folder.file("settings"), QSettings::IniFormat);
@@ -523,7 +523,7 @@ void Register(std::string const& group, std::string const& name, int iterations,
 
 void RegisterSize(Size size)
 {
-    // About as long for either size.
+    // About the same duration for either size.
     const int times = size.sections * size.keys > 10000 ? 1 : 20;
 
     const std::string load = "load " + size.text();
@@ -531,7 +531,7 @@ void RegisterSize(Size size)
              size);
     Register(load, "SAX reader, texts kept", times, LoadWithReader<KeepingHandler>, size);
     Register(load, Tork::Name, times, LoadSettings<Tork>, size);
-    Register(load, ToolkitSettings::Name, times, LoadSettings<ToolkitSettings>, size);
+    Register(load, QtSettings::Name, times, LoadSettings<QtSettings>, size);
     Register(load, KdeConfig::Name, times, LoadSettings<KdeConfig>, size);
     Register(load, BoostTree::Name, times, LoadSettings<BoostTree>, size);
 
@@ -541,7 +541,7 @@ void RegisterSize(Size size)
     Register(save, Pugi::Name, times * 2, SaveSettings<Pugi>, size);
     Register(save, BoostTree::Name, times, SaveSettings<BoostTree>, size);
     Register(save, KdeConfig::Name, times, SaveSettings<KdeConfig>, size);
-    Register(save, ToolkitSettings::Name, times, SaveSettings<ToolkitSettings>, size);
+    Register(save, QtSettings::Name, times, SaveSettings<QtSettings>, size);
 }
 
 } // namespace
@@ -554,7 +554,7 @@ void RegisterBenchmarks(bool quick)
     const int reads = quick ? 200000 : 1000000;
     Register("typed reads", "floor: two hash lookups", reads, ReadFloor);
     Register("typed reads", "TorkConfigFile", reads, ReadTork);
-    Register("typed reads", "QSettings", reads, ReadToolkitSettings);
+    Register("typed reads", "QSettings", reads, ReadQtSettings);
     Register("typed reads", "KConfig", reads, ReadKdeConfig);
     Register("typed reads", "pugixml", reads, ReadPugi);
 }

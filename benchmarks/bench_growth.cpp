@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// What one unit of each kind of work costs when there are few, more and many of them.
+// The cost of one unit of each kind of work when there are few, more and many of them.
 //
 // Each benchmark is named "growth|WHAT|COUNT" and counts its units.
 
@@ -22,7 +22,7 @@
 
 namespace {
 
-// A log in a folder of its own that writes up to the given size before it rotates.
+// A log in its own folder that writes up to the given size before it rotates.
 class OwnLog
 {
 public:
@@ -69,9 +69,9 @@ void WriteEntries(benchmark::State& state, int entries)
     }
 }
 
-// 10,000 entries behind the given number of others. `maximumSize` decides whether the file is
-// below its limit or has long passed it.
-void WriteEntriesBehind(benchmark::State& state, int present, int maximumSize)
+// 10,000 entries after the given number of others. `maximumSize` decides whether the file is below
+// its limit or well past it.
+void WriteEntriesAfter(benchmark::State& state, int present, int maximumSize)
 {
     constexpr int entries = 10000;
     OwnLog own(maximumSize);
@@ -149,7 +149,7 @@ void ParseStates(benchmark::State& state, int elements)
     }
 }
 
-// The oldest entry comes to the front, so that all the others move.
+// The oldest entry moves to the front, so that all the others move.
 void UpdateRecentFiles(benchmark::State& state, int entries)
 {
     QStringList files;
@@ -192,7 +192,7 @@ void RotateFiles(benchmark::State& state, int files)
 }
 
 // Ten and a hundred times the smallest size follow. The smaller the size the more often it is
-// measured, so that all take about as long and none is measured cold.
+// measured, so that all take about the same time and none is measured cold.
 template <class Function>
 void Register(std::string const& what, int smallest, Function const& function)
 {
@@ -210,11 +210,11 @@ void Register(std::string const& what, int smallest, Function const& function)
     }
 }
 
-void RegisterBehind(std::string const& what, int smallest, int maximumSize)
+void RegisterAfter(std::string const& what, int smallest, int maximumSize)
 {
     for (int present : {smallest, smallest * 10, smallest * 100}) {
         const std::string name = "growth|" + what + '|' + std::to_string(present);
-        benchmark::RegisterBenchmark(name.c_str(), WriteEntriesBehind, present, maximumSize)
+        benchmark::RegisterBenchmark(name.c_str(), WriteEntriesAfter, present, maximumSize)
             ->Iterations(1)
             ->UseRealTime();
     }
@@ -225,14 +225,14 @@ void RegisterBehind(std::string const& what, int smallest, int maximumSize)
 void RegisterBenchmarks(bool quick)
 {
     const int less = quick ? 10 : 1;
-    Register("log entry, by the entries in all", 10000 / less, WriteEntries);
-    RegisterBehind("log entry below the size limit, by those before it", 10000 / less, 2000000000);
-    RegisterBehind("log entry past the size limit, by those before it", 10000 / less, 2048);
-    Register("value stored, by the values", 1000 / less, StoreValues);
-    Register("value loaded, by the values", 1000 / less, LoadValues);
-    Register("value saved, by the values", 1000 / less, SaveValues);
-    Register("element written, by the elements", 10000 / less, WriteElements);
-    Register("state parsed through, by the states", 10000 / less, ParseStates);
-    Register("MRU entry, by the entries of the list", 100 / less, UpdateRecentFiles);
-    Register("numbered log file moved, by the files", 10, RotateFiles);
+    Register("log entry, by total entries", 10000 / less, WriteEntries);
+    RegisterAfter("log entry below the size limit, by entries before it", 10000 / less, 2000000000);
+    RegisterAfter("log entry past the size limit, by entries before it", 10000 / less, 2048);
+    Register("value stored, by number of values", 1000 / less, StoreValues);
+    Register("value loaded, by number of values", 1000 / less, LoadValues);
+    Register("value saved, by number of values", 1000 / less, SaveValues);
+    Register("element written, by number of elements", 10000 / less, WriteElements);
+    Register("state parsed, by number of states", 10000 / less, ParseStates);
+    Register("MRU entry, by number of entries", 100 / less, UpdateRecentFiles);
+    Register("numbered log file moved, by number of files", 10, RotateFiles);
 }

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// What an entry costs the thread that writes it.
+// The cost of an entry to the thread that writes it.
 
 #include "common/log/TorkLog.h"
 #include "log/LogEntrants.h"
@@ -16,7 +16,7 @@ namespace {
 
 void WriteEntries(benchmark::State& state, LogEntrantFactory make)
 {
-    // Shared by the threads of a run, which start and end the loop together.
+    // Shared by the threads of a run, which start and end the loop in sync.
     static std::unique_ptr<ScratchFolder> folder;
     static std::unique_ptr<LogEntrant> log;
     if (state.thread_index() == 0) {

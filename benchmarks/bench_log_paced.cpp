@@ -1,10 +1,10 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// What an entry costs where entries come slowly, and everything that is kept from one entry to
-// the next is cold or out of date: one a millisecond, and one a second.
+// The cost of an entry when entries are rare, and everything cached between them is cold or out of
+// date: one per millisecond, and one per second.
 //
-// Google Benchmark has no pace, so the calls are timed here; the results are worded as its own.
+// Google Benchmark cannot pace calls, so they are timed here; the results use its format.
 
 #include "log/LogEntrants.h"
 #include "support/ScratchFolder.h"
@@ -31,11 +31,11 @@ struct Runner
     std::unique_ptr<LogEntrant> log;
 };
 
-// The toolkit has one message handler, which the two entrants that go through it would take from
-// each other if they stood side by side.
+// Qt has a single message handler, which the two entrants that use it would take from each other if
+// both existed at the same time.
 bool NeedsMessageHandler(LogEntrantDescription const& entrant)
 {
-    return entrant.make == MakeToolkitEntrant || entrant.make == MakeTorkLogByToolkitEntrant ||
+    return entrant.make == MakeQtHandlerEntrant || entrant.make == MakeTorkLogByQtMessagesEntrant ||
            entrant.make == MakeTorkLogBelowLimitEntrant;
 }
 
@@ -70,9 +70,9 @@ public:
         }
     }
 
-    // Each round every entrant writes its entries in a row, one a millisecond. The first of the
-    // row follows a pause and is left out.
-    void oneAMillisecond(int rounds)
+    // In each round every entrant writes a series of entries, one per millisecond. The first of the
+    // series follows a pause and is left out.
+    void onePerMillisecond(int rounds)
     {
         const int entries = 50;
         for (int round = 0; round < rounds; ++round) {
@@ -83,15 +83,15 @@ public:
                     std::this_thread::sleep_until(next += std::chrono::milliseconds(1));
                     const double nanoseconds = NanosecondsOfOneEntry(*runner.log);
                     if (entry > 0)
-                        keep("paced, one a millisecond", runner, nanoseconds);
+                        keep("paced, one per millisecond", runner, nanoseconds);
                 }
             }
         }
     }
 
-    // Each second every entrant writes one entry, spread over the second, always in one order so
-    // that a second passes between two entries of each.
-    void oneASecond(int seconds)
+    // Every second each entrant writes one entry, spread over the second, always in the same order
+    // so that a second passes between two entries of each.
+    void onePerSecond(int seconds)
     {
         shuffle();
         const auto step = std::chrono::microseconds(1000000 / m_runners.size());
@@ -101,7 +101,7 @@ public:
                 std::this_thread::sleep_until(next += step);
                 const double nanoseconds = NanosecondsOfOneEntry(*runner.log);
                 if (second > 0)
-                    keep("paced, one a second", runner, nanoseconds);
+                    keep("paced, one per second", runner, nanoseconds);
             }
         }
     }
@@ -132,8 +132,8 @@ int main(int argc, char** argv)
     const bool quick = arguments.contains("--quick");
 
     PacedRun run;
-    run.oneAMillisecond(quick ? 4 : 20);
-    run.oneASecond(quick ? 8 : 40);
+    run.onePerMillisecond(quick ? 4 : 20);
+    run.onePerSecond(quick ? 8 : 40);
 
     QFile file(arguments[1]);
     Require(file.open(QIODevice::WriteOnly), file.errorString());

@@ -1,11 +1,11 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Whole processes, from exec to the first paint event of the first window, the program and a bare
-// window taking turns. Needs a display.
+// Whole processes, from exec to the first paint event of the first window; the program and a bare
+// window alternate. Needs a display.
 //
-// Google Benchmark measures within a process, so the starts are timed here; the results are worded
-// as its own.
+// Google Benchmark measures within a process, so the starts are timed here; the results use its
+// format.
 
 #include "support/ScratchFolder.h"
 
@@ -61,7 +61,7 @@ std::string ReadToEnd(int descriptor)
     return text;
 }
 
-// Starts the program, which says when its window got its paint event, and ends.
+// Starts the program, which reports when its window got its paint event, and exits.
 Start StartOnce(Program const& program)
 {
     int ends[2] = {};
@@ -128,7 +128,7 @@ int main(int argc, char** argv)
         std::shuffle(programs.begin(), programs.end(), random);
         for (Program const& program : programs) {
             const Start start = StartOnce(program);
-            if (round == 0) // not yet in the file cache, and the log's settings are made
+            if (round == 0) // not yet in the file cache, and creates the log's settings
                 continue;
             times.append(Measurement("start, time", program, start.nanoseconds,
                                      start.processorNanoseconds, "ns"));

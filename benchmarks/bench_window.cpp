@@ -1,12 +1,11 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// What the log view makes its user wait for, on a large log and on one a tenth of that: the file
-// opened, the longest moment without an answer meanwhile, a page scrolled, a filter applied, and
-// the memory that it takes. Needs a display.
+// How long the log view makes its user wait, with a large log and with one a tenth of its size:
+// opening the file, the longest time without a response meanwhile, scrolling a page, applying a
+// filter; and the memory it takes. Needs a display.
 //
-// Google Benchmark knows no event loop, so the waits are timed here; the results are worded as its
-// own.
+// Google Benchmark has no event loop, so the waits are timed here; the results use its format.
 
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogView.h"
@@ -48,7 +47,7 @@ void WriteLog(QString const& fileName, int lines)
 
 double MemoryInKiB()
 {
-    ::malloc_trim(0); // what has been given back already is not the view's
+    ::malloc_trim(0); // memory that was already freed is not the view's
     QFile status(QStringLiteral("/proc/self/status"));
     Require(status.open(QIODevice::ReadOnly), status.errorString());
     const QByteArray text = status.readAll();
@@ -58,7 +57,7 @@ double MemoryInKiB()
 class WindowBench
 {
 public:
-    // Fonts, the style and the like come with the first view of any program.
+    // Fonts, the style and the like are loaded with the first view of any program.
     void warmUp()
     {
         measure(1000);
@@ -80,7 +79,7 @@ public:
         open(model, folder.file("large.log"), lines);
         scroll(view);
         filter(model, "filter by text", QStringLiteral("entry 999"), false);
-        filter(model, "filter by expression", QStringLiteral("entry \\d+77 "), true);
+        filter(model, "filter by regular expression", QStringLiteral("entry \\d+77 "), true);
         m_group.prepend(QStringLiteral("memory of a "));
         keep("view and model", MemoryInKiB() - memoryBefore, "KiB");
     }
@@ -96,7 +95,7 @@ private:
         return double(time.nsecsElapsed());
     }
 
-    // Runs the event loop until all is shown; answers with the longest turn of it.
+    // Runs the event loop until everything is shown; returns its longest iteration.
     static double longestTurnUntil(std::function<bool()> const& isDone)
     {
         double longest = 0;
@@ -112,8 +111,8 @@ private:
             model.Open(fileName, LogLineParser(), false);
             longest = longestTurnUntil([&] { return model.rowCount() >= lines; });
         });
-        keep("open, until every line can be reached", whole);
-        keep("longest moment without an answer meanwhile", longest);
+        keep("open, until every line is available", whole);
+        keep("longest moment without a response", longest);
     }
 
     void scroll(LogView& view)
@@ -125,7 +124,7 @@ private:
                     int(qint64(bar->maximum()) * (page * 37 % PagesScrolled) / PagesScrolled));
                 view.viewport()->repaint();
             });
-            keep("a page scrolled to, anywhere in the file", time);
+            keep("scroll to a random page", time);
         }
     }
 

@@ -43,7 +43,7 @@ void RegisterBenchmarks(bool quick)
     WriteGeneratedDocument(generated, quick ? 10000000 : 50000000, 0);
     RegisterDocument("parse generated document", generated, 1);
 
-    // Copied, so that the disk it lies on is not measured.
+    // Copied, so that its disk is not measured.
     const QString mime = folder.file("mime.xml");
     const QString installed = QStringLiteral("/usr/share/mime/packages/freedesktop.org.xml");
     Require(QFile::copy(installed, mime), installed + QStringLiteral(" cannot be copied"));

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Writing XML of many elements to a file and to bytes.
+// Writing XML of many elements to a file and to memory.
 
 #include "common/xml/TorkXmlFile.h"
 #include "common/xml/TorkXmlStream.h"
@@ -25,7 +25,7 @@
 
 namespace {
 
-// The contents repeat, so that fetching them from memory is not what is measured.
+// The contents repeat, so that loading them from memory is not measured.
 constexpr int Variants = 1024;
 constexpr int AttributesOfElement = 6;
 
@@ -45,7 +45,7 @@ std::string AttributeText(int variant, int attribute)
     return std::to_string(1000 + variant + attribute * 7);
 }
 
-// The same texts in the form that each library takes.
+// The same texts in each library's own string type.
 template <class Text>
 struct Texts
 {
@@ -97,8 +97,8 @@ struct Work
     }
 };
 
-// Each writes the whole document of `work` to the file, or to bytes of its own where the work is
-// not to go to a file, and returns their number.
+// Each writes the whole document of `work` to the file, or to its own byte array if the work does
+// not use a file, and returns the number of bytes.
 
 template <class Writer>
 void WriteWithTork(Writer& writer, Work const& work)
@@ -199,7 +199,7 @@ qint64 WriteFloor(Work const& work, QString const& fileName)
     return bytes.size();
 }
 
-void WriteToolkit(QXmlStreamWriter& writer, Work const& work)
+void WriteQt(QXmlStreamWriter& writer, Work const& work)
 {
     Texts<QString> const& texts = WideTexts();
     writer.setAutoFormatting(true);
@@ -220,18 +220,18 @@ void WriteToolkit(QXmlStreamWriter& writer, Work const& work)
     writer.writeEndDocument();
 }
 
-qint64 WriteToolkit(Work const& work, QString const& fileName)
+qint64 WriteQt(Work const& work, QString const& fileName)
 {
     if (work.toFile) {
         QFile file(fileName);
         Require(file.open(QIODevice::WriteOnly), file.errorString());
         QXmlStreamWriter writer(&file);
-        WriteToolkit(writer, work);
+        WriteQt(writer, work);
         return 0;
     }
     QByteArray bytes;
     QXmlStreamWriter writer(&bytes);
-    WriteToolkit(writer, work);
+    WriteQt(writer, work);
     return bytes.size();
 }
 
@@ -321,8 +321,8 @@ qint64 WritePugi(Work const& work, QString const& fileName)
 
 using Write = qint64 (*)(Work const& work, QString const& fileName);
 
-// One document an iteration. All write about the same: the peers differ by a line end, and by a
-// blank in an empty element.
+// One document per iteration. All write about the same: the peers differ by a line end, and by a
+// space in an empty element.
 void WriteDocument(benchmark::State& state, Work work, Write write)
 {
     const ScratchFolder folder;
@@ -348,7 +348,7 @@ void RegisterWork(std::string const& group, Work const& work)
     const std::vector<std::pair<char const*, Write>> contestants = {
         {"floor: text stream, ready lines", WriteFloor},
         {work.toFile ? "TorkXmlFile" : "TorkXmlStream", WriteTork},
-        {"QXmlStreamWriter", WriteToolkit},
+        {"QXmlStreamWriter", WriteQt},
         {"libxml2", WriteLibxml2},
         {"pugixml, built and saved", WritePugi},
     };
@@ -362,14 +362,14 @@ void RegisterWork(std::string const& group, Work const& work)
 
 } // namespace
 
-// A quick run writes as much: what is smaller stays in memory that is there already, and asking
-// for memory is a part of what writing bytes costs.
+// A quick run writes as much: a smaller document would fit in memory that is already allocated, and
+// allocation is a part of the cost of writing bytes.
 void RegisterBenchmarks(bool)
 {
     const int elements = 1100000;
     RegisterWork("document to file", {Shape::Mixed, elements, true});
     RegisterWork("document to bytes", {Shape::Mixed, elements, false});
-    RegisterWork("leaves alone, to bytes", {Shape::Leaves, elements / 2, false});
-    RegisterWork("elements of six attributes alone, to bytes",
+    RegisterWork("leaves only, to bytes", {Shape::Leaves, elements / 2, false});
+    RegisterWork("elements with six attributes only, to bytes",
                  {Shape::Attributes, elements / 10, false});
 }

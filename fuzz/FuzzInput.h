@@ -35,7 +35,7 @@ public:
         return static_cast<int>(value);
     }
 
-    /// A short text: one byte tells its length, the rest is UTF-8.
+    /// A short text: one byte gives its length, the rest is UTF-8.
     QString text()
     {
         const size_t length = qMin<size_t>(byte(), m_left);
@@ -45,7 +45,7 @@ public:
         return piece;
     }
 
-    /// All that is left.
+    /// The rest of the input.
     QByteArray rest()
     {
         const QByteArray all(reinterpret_cast<char const*>(m_data), int(m_left));
@@ -58,8 +58,7 @@ private:
     size_t m_left;
 };
 
-/// Ends the run where a promise is broken, and says in which line; unlike an assertion, in every
-/// build.
+/// Aborts when a promise is broken, and prints the line; unlike an assertion, in every build.
 inline void Require(bool holds, int line = __builtin_LINE())
 {
     if (holds)
@@ -68,7 +67,7 @@ inline void Require(bool holds, int line = __builtin_LINE())
     std::abort();
 }
 
-/// Keeps the toolkit's warnings about broken input off the terminal.
+/// Suppresses Qt's warnings about broken input.
 inline void SilenceMessages()
 {
     qInstallMessageHandler([](QtMsgType, QMessageLogContext const&, QString const&) {});

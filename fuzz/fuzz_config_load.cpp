@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Configuration files: any bytes load or fail; what was loaded, if it lies in the range that the
+// Configuration files: any bytes load or fail; whatever was loaded, if it is in the range that the
 // store promises, survives saving and loading again.
 
 #include "FuzzInput.h"
@@ -15,7 +15,7 @@
 #include <QMap>
 #include <QTemporaryDir>
 
-// The store tells nobody the names of its sections.
+// The store has no operation that lists its sections.
 struct SectionTable
 {
     using Field = QScopedPointer<TorkOrderedHash<TorkConfigFileSection*>> TorkConfigFile::*;
@@ -44,7 +44,7 @@ bool IsPlainValue(QString const& value)
     return plain;
 }
 
-// An element that is called as the root is one more root to the loader.
+// An element with the root's name is another root to the loader.
 bool IsPromised(QString const& section, QString const& key, QString const& value)
 {
     const QString root = "VelocorSettings";
@@ -110,7 +110,7 @@ extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
     const bool loaded = settings.Load();
     Require(loaded == settings.m_lastError.isEmpty());
 
-    // Whatever was loaded can be saved, and what that makes can be looked at.
+    // Whatever was loaded can be saved, and the result can be checked.
     const Sections contents = Contents(settings);
     Require(settings.Save());
     TorkConfigFile saved(path);

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Any UTF-16 text comes back from both encodings, and from a file that is saved and loaded; any
-// text at all can be decoded.
+// Any UTF-16 text survives both encodings, and a file that is saved and loaded; any text at all can
+// be decoded.
 
 #include "FuzzInput.h"
 
@@ -26,7 +26,7 @@ void ComeBack(QString const& text, Encoder encode, Decoder decode)
     Require(ok ? encode(decoded) == text : decoded == text);
 }
 
-// In all three places of a file.
+// In all three places in a file.
 void ComeBackFromFile(QString const& path, QString const& text)
 {
     const QString value = TorkConfigText::EncodeValue(text);
@@ -60,7 +60,7 @@ extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
 {
     static const QTemporaryDir folder;
 
-    // Two bytes a unit reach every text, and UTF-8 the readable ones.
+    // Two bytes per unit reach every text, and UTF-8 the readable ones.
     QString units;
     for (size_t i = 0; i + 1 < size; i += 2)
         units += QChar(static_cast<ushort>(data[i] << 8 | data[i + 1]));

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Typed values: every reader takes every text, sets what it promises and nothing else; what comes
-// out can be written and comes out again.
+// Typed values: every reader accepts every text, sets what it promises and nothing else; its result
+// can be written and is read back unchanged.
 
 #include "FuzzInput.h"
 
@@ -72,7 +72,7 @@ void ReadExtent(TorkConfigFile& settings)
         return;
     }
     if (extent.width() < 0 || extent.height() < 0)
-        return; // cannot be written in this form: a minus sign separates
+        return; // cannot be written in this form: a minus sign is a separator
     QSize again;
     settings.WriteSize("s", "again", extent);
     Require(settings.ReadSize("s", "again", again) && again == extent);
@@ -97,7 +97,7 @@ extern "C" int LLVMFuzzerInitialize(int* argc, char*** argv)
 {
     SilenceMessages();
     qputenv("QT_QPA_PLATFORM", "offscreen");
-    static QApplication application(*argc, *argv); // fonts and the desktop's extent need one
+    static QApplication application(*argc, *argv); // fonts and the desktop's size need one
     return 0;
 }
 

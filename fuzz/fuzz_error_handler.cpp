@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The XML error handler: any problem is worded, kept, and answered as promised.
+// The XML error handler: any problem is formatted, stored, and answered as documented.
 
 #include "FuzzInput.h"
 
@@ -11,7 +11,8 @@
 
 namespace {
 
-// Placeholders inside the texts are filled too, so only texts without any have a simple wording.
+// Placeholders inside the texts are substituted too, so only texts without any have a simple
+// expected message.
 bool HoldsPlaceholder(QXmlParseException const& problem)
 {
     return problem.message().contains('%') || problem.publicId().contains('%') ||

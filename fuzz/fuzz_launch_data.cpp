@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The launch data file: any text either fails or sets options, and never harms the program.
+// The launch data file: any text either fails or sets options, and never crashes the program.
 
 #include "FuzzInput.h"
 
@@ -21,7 +21,7 @@ bool IsSet(LaunchOption const* option)
 
 extern "C" int LLVMFuzzerInitialize(int*, char***)
 {
-    std::setlocale(LC_ALL, ""); // as an application object does: the text goes through its encoding
+    std::setlocale(LC_ALL, ""); // as an application does: the text is converted to its encoding
     return 0;
 }
 
@@ -37,7 +37,7 @@ extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
     const bool anySet = std::any_of(options.begin(), options.end(), IsSet);
 
     Require(options.size() == 2);
-    // A failure without a message is one of form, and then nothing at all is taken.
+    // A failure without a message is a syntax error, and then nothing at all is applied.
     if (parser.errorText.isEmpty())
         Require(parsed || !anySet);
     else

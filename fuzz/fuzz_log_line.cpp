@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The log view's line parser: any line, in any format, gives parts that lie within it.
+// The log view's line parser: any line, in any format, is split into parts within it.
 
 #include "FuzzInput.h"
 
@@ -19,7 +19,7 @@ extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
     const LogLineParser parser(formats, prefixes);
     const QByteArray line = input.rest();
 
-    // As in a file that is mapped into memory: no zero byte stands behind the line.
+    // As in a memory-mapped file: the line is not NUL-terminated.
     const std::vector<char> bytes(line.begin(), line.end());
     const int length = line.size();
     const LogLineParser::Parts parts = parser.Find(bytes.data(), length);

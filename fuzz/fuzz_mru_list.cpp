@@ -23,7 +23,7 @@ bool UpdateModel(QString const& file, QStringList& entries, int maxCount, int op
         entries.prepend(file);
     while (entries.size() > qMax(0, maxCount))
         entries.removeLast();
-    // Written down and read back: separators inside an entry split it, no entry is an empty one.
+    // Joined and split again: separators inside an entry split it, and empty entries disappear.
     entries = entries.join("|").split("|");
     return true;
 }

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The parse manager over any document, with states that accept and refuse as the input says: no
-// state is lost, none is deleted twice, and no document makes the manager fall.
+// The parse manager with any document, with states that accept and refuse as the input says: no
+// state is lost, none is deleted twice, and no document crashes the manager.
 
 #include "FuzzInput.h"
 
@@ -39,7 +39,7 @@ public:
             return nullptr;
         case 2:
             return new TorkXml_FlushUnknownElement(name, ParseManager());
-        case 3: // for another element than the one it was asked for
+        case 3: // for a different element than requested
             return new MoodyState(name + "x", ParseManager(), m_moods);
         default:
             return new MoodyState(name, ParseManager(), m_moods);
@@ -55,7 +55,7 @@ public:
         return !s_refused;
     }
 
-    // Now and then it changes the stack, as it may: who takes a state off owns it.
+    // Now and then it changes the stack, as it may: whoever pops a state owns it.
     bool EndElement(QString const&) override
     {
         const uint8_t mood = m_moods.byte();
@@ -135,7 +135,7 @@ extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
         reader.setContentHandler(&manager);
         const bool parsed = reader.parse(source);
         Require(!parsed || !manager.isStopped());
-        Require(!parsed || !manager.PopElement()); // every element that opened has ended
+        Require(!parsed || !manager.PopElement()); // every opened element has ended
         QString report;
         manager.FormatErrors(report);
         Require(report.startsWith("Failed to parse the XML content:\n"));

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Window fitting: no overflow for any numbers, and for sane desktops a window inside them.
+// Window fitting: no numbers overflow, and on sane desktops the window ends up inside them.
 
 #include "FuzzInput.h"
 

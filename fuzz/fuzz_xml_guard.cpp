@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The guard over any document: unless it names a limit, Qt's reader tells of the same events as
-// through a plain source, errors and their places included.
+// The guard with any document: unless it reports a limit, Qt's reader reports the same events as
+// with a plain source, including errors and their positions.
 
 #include "FuzzInput.h"
 
@@ -11,7 +11,7 @@
 
 namespace {
 
-// An input is too short to come to any other limit.
+// An input is too short to reach any other limit.
 bool NamesLimit(QStringList const& events)
 {
     for (QString const& event : events) {
@@ -37,7 +37,7 @@ extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
     const QStringList guarded = XmlEvents::of<TorkXmlGuard>(
         document, [](TorkXmlGuard& source, QXmlSimpleReader& reader) { source.Watch(reader); });
     if (NamesLimit(guarded)) {
-        // Without entities, prefixes or levels by the hundred nothing is beyond a limit.
+        // Without entities, prefixes or hundreds of levels nothing exceeds a limit.
         Require(document.contains("<!ENTITY") || document.count(':') > 64 ||
                 document.count('<') > 1000 || document.count('(') > 1000);
         return 0;

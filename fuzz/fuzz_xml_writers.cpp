@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Both XML writers over any sequence of calls: the same results and the same bytes. A sequence that
-// balances its calls makes a document, and a reader finds in it what was written.
+// Both XML writers with any sequence of calls: the same results and the same bytes. A sequence of
+// balanced calls makes a document, and a reader finds in it what was written.
 
 #include "FuzzInput.h"
 
@@ -80,7 +80,7 @@ public:
         Require(result == Apply(m_file, call));
     }
 
-    /// What the stream has made so far, after seeing that the file holds the same.
+    /// The stream's output so far, after checking that the file contains the same.
     QByteArray written()
     {
         m_stream.flush();
@@ -97,7 +97,7 @@ private:
     TorkXmlFile m_file;
 };
 
-// Notes what a document holds, a line a piece; text of nothing but white space is layout.
+// Records the contents of a document, one line per piece; text of only white space is layout.
 class Notes : public QXmlDefaultHandler
 {
 public:
@@ -137,7 +137,7 @@ private:
     QString m_text;
 };
 
-// Of a text, what may stand in a name; never empty.
+// The characters of a text that are allowed in a name; never empty.
 QString PlainName(QString const& text)
 {
     QString name = "e";
@@ -148,7 +148,7 @@ QString PlainName(QString const& text)
     return name;
 }
 
-// Of a text, its printable ASCII without what would end a CDATA section; never empty.
+// The printable ASCII of a text without what would end a CDATA section; never empty.
 QString PlainValue(QString const& text)
 {
     QString value = "v";
@@ -159,7 +159,7 @@ QString PlainValue(QString const& text)
     return value;
 }
 
-// Of a text, what may stand between the quotes of an attribute, which nothing escapes.
+// The characters of a text that are allowed in a quoted attribute, which nothing escapes.
 QString PlainAttribute(QString const& text)
 {
     QString value = PlainValue(text);
@@ -168,7 +168,7 @@ QString PlainAttribute(QString const& text)
     return value;
 }
 
-// A document that balances its calls, as the input says; notes what a reader has to find in it.
+// A document of balanced calls, driven by the input; records what a reader has to find in it.
 class Document
 {
 public:

@@ -49,7 +49,7 @@ class Section:
 
 
 ENTRY = ["entry, 1 thread", "entry, 2 threads", "entry, 4 threads"]
-PACED = ["paced, one a millisecond", "paced, one a second"]
+PACED = ["paced, one per millisecond", "paced, one per second"]
 LOADS = ["load 20x50 values", "load 200x500 values"]
 SAVES = ["save 20x50 values", "save 200x500 values"]
 WRITES = ["document to file", "document to bytes"]
@@ -115,7 +115,7 @@ SECTIONS = {
         goals=[
             Limit(LARGE_LOG, "open", 2e9),
             Limit(LARGE_LOG, "longest moment", 50e6),
-            Limit(LARGE_LOG, "a page scrolled", 16e6),
+            Limit(LARGE_LOG, "scroll", 16e6),
         ],
     ),
     "growth": Section("Cost as work grows", [("bench_growth", "google")], (5, 2)),

@@ -13,5 +13,5 @@ root=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd -P)
 "$root/scripts/build.sh" coverage tests/log/all tests/config/all
 "$root/scripts/prepare-coverage.sh"
 
-exec "$root/scripts/memcheck-run.py" "$root/build/coverage" "$root/tests/support/toolkit.supp" \
+exec "$root/scripts/memcheck-run.py" "$root/build/coverage" "$root/tests/support/qt.supp" \
     '^(log|config)$'

@@ -69,7 +69,7 @@ trap 'rm -rf "$TMPDIR"' EXIT
 export LC_ALL=C.UTF-8 QT_QPA_PLATFORM=offscreen
 # Qt keeps some memory for the life of the program.
 export ASAN_OPTIONS=detect_leaks=1
-export LSAN_OPTIONS=suppressions=$root/tests/support/toolkit-leaks.supp:print_suppressions=0
+export LSAN_OPTIONS=suppressions=$root/tests/support/qt-leaks.supp:print_suppressions=0
 
 # shellcheck disable=SC2016  # expanded by the shell that xargs starts
 printf '%s\0' "${names[@]}" |

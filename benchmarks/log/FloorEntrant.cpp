@@ -14,7 +14,7 @@
 
 namespace {
 
-// What no log can undercut: the line is ready, and one call hands it to the kernel.
+// The lower bound for any log: the line is preformatted, and one call passes it to the kernel.
 class FloorEntrant : public LogEntrant
 {
 public:
@@ -41,8 +41,8 @@ private:
     std::string m_line;
 };
 
-// What the log's fixed behaviour asks for besides: the time, the severity's name in the language of
-// the moment, and the file's size.
+// What the log's fixed behavior requires in addition: the time, the severity's name in the current
+// language, and the file's size.
 class FixedPartsEntrant : public FloorEntrant
 {
 public:

@@ -9,8 +9,8 @@
 
 namespace {
 
-// The most often that the message is found in one file, as some libraries write links and
-// further files beside their log.
+// The maximum number of occurrences of the message in one file, because some libraries write links
+// and further files next to their log.
 int EntriesIn(QString const& folder)
 {
     int most = 0;
@@ -41,16 +41,16 @@ std::vector<LogEntrantDescription> CheckedLogEntrants()
         {"the fixed parts and write(2)", MakeFixedPartsEntrant},
         {"TorkLog", MakeTorkLogEntrant},
         {"TorkLog, size limit not reached", MakeTorkLogBelowLimitEntrant},
-        {"TorkLog, through qInfo()", MakeTorkLogByToolkitEntrant},
+        {"TorkLog, through qInfo()", MakeTorkLogByQtMessagesEntrant},
         {"spdlog basic_file_sink_mt", MakeSpdlogBasicEntrant},
         {"spdlog rotating_file_sink_mt", MakeSpdlogRotatingEntrant},
         {"log4cplus", MakeLog4cplusEntrant},
         {"log4cxx", MakeLog4cxxEntrant},
         {"Boost.Log", MakeBoostLogEntrant},
         {"glog", MakeGlogEntrant},
-        {"toolkit's handler, text stream", MakeToolkitEntrant},
+        {"Qt message handler, text stream", MakeQtHandlerEntrant},
     };
-    Require(LogMessage().size() == 100, QStringLiteral("the message has not 100 characters"));
+    Require(LogMessage().size() == 100, QStringLiteral("the message does not have 100 characters"));
     for (LogEntrantDescription const& entrant : entrants)
         Check(entrant);
     return entrants;

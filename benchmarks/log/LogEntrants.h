@@ -20,7 +20,7 @@ public:
     virtual void write() = 0;
 };
 
-/// Makes an entrant that writes into `folder`, whose path ends in "/". One at a time in a process.
+/// Creates an entrant that writes to `folder`, whose path ends in "/". One at a time in a process.
 using LogEntrantFactory = std::unique_ptr<LogEntrant> (*)(QString const& folder);
 
 struct LogEntrantDescription
@@ -29,7 +29,7 @@ struct LogEntrantDescription
     LogEntrantFactory make;
 };
 
-/// All entrants, after a check of each that an entry is in the file when the call returns.
+/// All entrants, after checking that each has its entry in the file when the call returns.
 std::vector<LogEntrantDescription> CheckedLogEntrants();
 
 /// The message of every entry: 100 characters.
@@ -39,11 +39,11 @@ std::unique_ptr<LogEntrant> MakeFloorEntrant(QString const& folder);
 std::unique_ptr<LogEntrant> MakeFixedPartsEntrant(QString const& folder);
 std::unique_ptr<LogEntrant> MakeTorkLogEntrant(QString const& folder);
 std::unique_ptr<LogEntrant> MakeTorkLogBelowLimitEntrant(QString const& folder);
-std::unique_ptr<LogEntrant> MakeTorkLogByToolkitEntrant(QString const& folder);
+std::unique_ptr<LogEntrant> MakeTorkLogByQtMessagesEntrant(QString const& folder);
 std::unique_ptr<LogEntrant> MakeSpdlogBasicEntrant(QString const& folder);
 std::unique_ptr<LogEntrant> MakeSpdlogRotatingEntrant(QString const& folder);
 std::unique_ptr<LogEntrant> MakeLog4cplusEntrant(QString const& folder);
 std::unique_ptr<LogEntrant> MakeLog4cxxEntrant(QString const& folder);
 std::unique_ptr<LogEntrant> MakeBoostLogEntrant(QString const& folder);
 std::unique_ptr<LogEntrant> MakeGlogEntrant(QString const& folder);
-std::unique_ptr<LogEntrant> MakeToolkitEntrant(QString const& folder);
+std::unique_ptr<LogEntrant> MakeQtHandlerEntrant(QString const& folder);

@@ -33,7 +33,7 @@ std::unique_ptr<LogEntrant> MakeSpdlogBasicEntrant(QString const& folder)
         std::make_shared<spdlog::sinks::basic_file_sink_mt>(file));
 }
 
-// With the limits that TorkLog has by default.
+// With TorkLog's default limits.
 std::unique_ptr<LogEntrant> MakeSpdlogRotatingEntrant(QString const& folder)
 {
     const std::string file = (folder + "spdlog.log").toStdString();

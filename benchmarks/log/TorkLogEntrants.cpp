@@ -11,7 +11,7 @@
 
 namespace {
 
-// The one log of the process, and the message handler that was there before it.
+// The process's only log, and the previous message handler.
 class TorkLogEntrant : public LogEntrant
 {
 public:
@@ -37,7 +37,7 @@ protected:
     QString m_message;
 };
 
-class TorkLogByToolkitEntrant : public TorkLogEntrant
+class TorkLogByQtMessagesEntrant : public TorkLogEntrant
 {
 public:
     using TorkLogEntrant::TorkLogEntrant;
@@ -59,7 +59,7 @@ std::unique_ptr<LogEntrant> MakeTorkLogBelowLimitEntrant(QString const& folder)
     return MakeTorkLogEntrant(folder);
 }
 
-std::unique_ptr<LogEntrant> MakeTorkLogByToolkitEntrant(QString const& folder)
+std::unique_ptr<LogEntrant> MakeTorkLogByQtMessagesEntrant(QString const& folder)
 {
-    return std::make_unique<TorkLogByToolkitEntrant>(folder);
+    return std::make_unique<TorkLogByQtMessagesEntrant>(folder);
 }

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The floor of a start: what any program of the toolkit with a window does.
+// The floor of a start: what any Qt program with a window does.
 
 #include <QApplication>
 #include <QMainWindow>

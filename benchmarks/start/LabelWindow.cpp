@@ -1,9 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The program with the least window that tells its user something: the same start-up steps, and
-// labels with the identity and the places. What the real window costs more is the price of its
-// own content.
+// The program with the smallest useful window: the same startup steps, and labels with the identity
+// and the locations. The difference from the real window is the cost of its own content.
 
 #include "app/AppPaths.h"
 #include "app/WithoutOpenGl_p.h"
@@ -47,7 +46,7 @@ int main(int argc, char** argv)
 
     QMainWindow window;
     window.setCentralWidget(Places());
-    window.resize(1080, 680); // as large as the real one: the size of the picture costs too
+    window.resize(1080, 680); // as large as the real one: the size of the window has a cost too
     window.show();
     return QApplication::exec();
 }

@@ -1,9 +1,9 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// A plug-in that the toolkit loads into the unchanged programs: it reports when the first visible
-// widget gets its first paint event and how much memory the process has needed until then, and ends
-// the process.
+// A plug-in that Qt loads into the unchanged programs: it reports when the first visible widget
+// gets its first paint event and how much memory the process has needed until then, and ends the
+// process.
 
 #include <QCoreApplication>
 #include <QEvent>
@@ -25,7 +25,7 @@ long long NowInNanoseconds()
     return now.tv_sec * 1000000000LL + now.tv_nsec;
 }
 
-// Not what the parent is told by wait4(): that counts the parent's own memory before the exec.
+// Not the value that wait4() gives the parent: it includes the parent's own memory before the exec.
 long PeakMemoryInKiB()
 {
     long peak = 0;

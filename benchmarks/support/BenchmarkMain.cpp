@@ -9,7 +9,7 @@
 
 #include <cstring>
 
-// What Google Benchmark takes on its command line, and --quick as the first argument.
+// Google Benchmark's command line options, after an optional --quick.
 int main(int argc, char** argv)
 {
     const bool quick = argc > 1 && std::strcmp(argv[1], "--quick") == 0;

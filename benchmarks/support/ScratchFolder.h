@@ -6,8 +6,8 @@
 #include <QString>
 #include <QTemporaryDir>
 
-/// A folder for the files of one measurement, on memory-backed disk where there is one, so that
-/// no disk is measured. It goes away with the object. VELOCOR_BENCH_DIR puts it elsewhere.
+/// A folder for the files of one measurement, in memory where possible, so that the disk is not
+/// measured. It is removed with the object. VELOCOR_BENCH_DIR overrides its location.
 class ScratchFolder
 {
 public:
@@ -23,8 +23,8 @@ private:
     QTemporaryDir m_folder;
 };
 
-/// Reads a whole file; ends the program where it cannot be read.
+/// Reads a whole file; exits if it cannot be read.
 QByteArray ReadAll(QString const& fileName);
 
-/// Ends the program with a message unless `holds`. For what must be true of a measurement.
+/// Exits with a message unless `holds`. For conditions that a measurement depends on.
 void Require(bool holds, QString const& message);

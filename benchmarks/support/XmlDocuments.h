@@ -11,13 +11,13 @@
 #include <QXmlInputSource>
 #include <QXmlSimpleReader>
 
-/// Writes a document of records, each of five elements with attributes and text, until it has
-/// `bytes` or more, or `elements` or more; 0 stands for no such limit.
+/// Writes a document of records, each of five elements with attributes and text, until it has at
+/// least `bytes` bytes or `elements` elements; 0 means no such limit.
 ///
 /// @return the number of elements
 int WriteGeneratedDocument(QString const& fileName, qint64 bytes, int elements);
 
-/// Skips a whole document, one flush state an element.
+/// Skips a whole document, one flush state per element.
 class SkippingManager : public TorkXml_ParseManager_Base
 {
 public:
@@ -27,5 +27,5 @@ public:
     }
 };
 
-/// Reads a document piece by piece with the toolkit's SAX reader.
+/// Reads a document piece by piece with Qt's SAX reader.
 bool ReadDocument(QString const& fileName, QXmlDefaultHandler& handler);

@@ -13,6 +13,6 @@ struct Bookmark
 {
     bool isFolder = false;
     QString title;
-    QString address; // of a bookmark
+    QString address; // of a bookmark only
     std::vector<std::unique_ptr<Bookmark>> children;
 };

@@ -5,7 +5,7 @@
 
 #include "common/xml/TorkErrorDictionary.h"
 
-/// What can be wrong with a bookmark file: codes 2000 to 2003 and their texts.
+/// The possible errors in a bookmark file: codes 2000 to 2003 and their texts.
 class BookmarkErrors : public TorkErrorDictionary
 {
 public:

@@ -26,7 +26,7 @@ public:
 
     bool ProcessContent(QString const& name, QString const& content) override
     {
-        if (IsElement(name)) // else an attribute
+        if (IsElement(name)) // otherwise an attribute
             m_text += content;
         return true;
     }
@@ -38,7 +38,7 @@ public:
 
     bool EndElement(QString const&) override
     {
-        m_owner.title = m_text.simplified(); // line breaks and indentation are no part of it
+        m_owner.title = m_text.simplified(); // line breaks and indentation are not part of it
         return true;
     }
 
@@ -47,7 +47,7 @@ private:
     QString m_text;
 };
 
-// <bookmark href="...">: a title, and much that browsers note down besides.
+// <bookmark href="...">: a title, and a lot of browser metadata.
 class BookmarkState : public TorkXml_ParseState_Base
 {
 public:
@@ -127,7 +127,7 @@ bool BookmarkReader::Read(QString const& path)
         return false;
     }
 
-    // A file of somebody else's: the guard ends the parse where it would take all memory, or hours.
+    // An untrusted file: the guard stops the parse before it takes all memory, or hours.
     TorkXmlGuard source(&file);
     QXmlSimpleReader reader;
     source.Watch(reader);
@@ -143,8 +143,8 @@ TorkXml_ParseState_Base* BookmarkReader::GetFirstState(QString const& name)
 
 bool BookmarkReader::fatalError(QXmlParseException const& exception)
 {
-    TorkErrorHandler wording(nullptr);
-    Fail(BookmarkErrors::NotWellFormed, wording.format(exception));
+    TorkErrorHandler formatter(nullptr);
+    Fail(BookmarkErrors::NotWellFormed, formatter.format(exception));
     return false;
 }
 

@@ -7,7 +7,7 @@
 
 #include "common/xml/TorkXml_ParseManager_Base.h"
 
-/// Reads an XBEL 1.0 file: folders, bookmarks and their titles; all else is skipped.
+/// Reads an XBEL 1.0 file: folders, bookmarks and their titles; everything else is skipped.
 ///
 ///     BookmarkReader reader;
 ///     if (!reader.Read(path))
@@ -15,16 +15,16 @@
 class BookmarkReader : public TorkXml_ParseManager_Base
 {
 public:
-    /// @return false, with the reasons in the report, if anything is wrong with the file
+    /// @return false if anything is wrong with the file; the report has the reasons
     bool Read(QString const& path);
 
-    /// What was read: the folder that is the whole file.
+    /// The result: the folder that is the whole file.
     Bookmark const& root() const { return m_root; }
 
-    /// Notes an error of the dictionary's, with what it is about.
+    /// Adds an error of the dictionary, with its subject.
     void Fail(int code, QString const& about);
 
-    /// The same, with the place in the document that is being read.
+    /// The same, with the current position in the document.
     void FailHere(int code);
 
     void setDocumentLocator(QXmlLocator* locator) override { m_locator = locator; }

@@ -9,7 +9,7 @@ namespace {
 
 void WriteTitle(TorkXmlFile& writer, QString title)
 {
-    // The writer puts markup into a CDATA section, but leaves an end of one inside to its caller.
+    // The writer puts markup into a CDATA section, but a section end inside is up to its caller.
     title.replace("]]>", "]]]]><![CDATA[>");
     writer.WriteElement("title", title);
 }
@@ -17,7 +17,7 @@ void WriteTitle(TorkXmlFile& writer, QString title)
 void WriteBookmark(TorkXmlFile& writer, Bookmark const& bookmark)
 {
     writer.WriteElementOpen("bookmark", 1);
-    writer.WriteAttribute("href", bookmark.address.toHtmlEscaped()); // values go out as given
+    writer.WriteAttribute("href", bookmark.address.toHtmlEscaped()); // values are written as given
     if (bookmark.title.isEmpty()) {
         writer.WriteElementCloseAndEnd("bookmark", 1);
         return;
@@ -61,7 +61,7 @@ bool WriteBookmarks(QString const& path, Bookmark const& root, QString& error)
     WriteChildren(writer, root);
     writer.WriteElementEnd("xbel", 1);
 
-    // The operations above report no failed write: the stream's status does.
+    // The operations above do not report a failed write; the stream's status does.
     writer.flush();
     if (writer.status() != QTextStream::Ok) {
         error = writer.errorString();

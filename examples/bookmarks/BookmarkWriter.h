@@ -7,6 +7,6 @@
 
 /// Writes an XBEL 1.0 file.
 ///
-/// @param error  what went wrong, on failure
-/// @return whether all of it has reached the file
+/// @param error  the reason, on failure
+/// @return whether all of it was written to the file
 bool WriteBookmarks(QString const& path, Bookmark const& root, QString& error);

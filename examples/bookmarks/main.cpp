@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Prints the bookmarks of an XBEL 1.0 file as a tree, and writes them back if asked to. Remembers
-// which files it has read.
+// Prints the bookmarks of an XBEL 1.0 file as a tree, and optionally writes them to a new file.
+// Remembers which files it has read.
 
 #include "BookmarkErrors.h"
 #include "BookmarkReader.h"

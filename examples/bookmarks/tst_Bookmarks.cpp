@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Drives the built program as its user does.
+// Runs the built program the way its user does.
 
 #include <QDir>
 #include <QFile>
@@ -43,7 +43,7 @@ private:
     QByteArray read(QString const& path) const;
 
     QTemporaryDir m_folder;
-    QScopedPointer<QTemporaryDir> m_data; // what the program remembers
+    QScopedPointer<QTemporaryDir> m_data; // the program's data
 };
 
 void tst_Bookmarks::init()
@@ -55,7 +55,7 @@ void tst_Bookmarks::init()
 tst_Bookmarks::Result tst_Bookmarks::run(QStringList const& arguments) const
 {
     QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
-    environment.insert("HOME", m_data->path()); // for systems that do not know the other one
+    environment.insert("HOME", m_data->path()); // for systems without the XDG folders
     environment.insert("XDG_DATA_HOME", m_data->path());
     QProcess process;
     process.setProcessEnvironment(environment);
@@ -250,7 +250,7 @@ void tst_Bookmarks::outputThatCannotBeWritten()
     QCOMPARE(result.exitCode, 1);
 }
 
-// Whatever they and their titles are called.
+// Whatever the files and their titles are called.
 void tst_Bookmarks::filesReadSoFar()
 {
     QCOMPARE(run({"--files"}).output, QString());

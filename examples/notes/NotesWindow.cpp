@@ -51,8 +51,8 @@ void NotesWindow::MakeMenus()
     file->addAction(tr("Save &As..."), this, &NotesWindow::SaveAs, QKeySequence::SaveAs);
     file->addAction(tr("&Quit"), this, &QWidget::close, QKeySequence::Quit);
 
-    // Filled just before it can be seen: filling it while one of its own actions runs would delete
-    // that action.
+    // Populated just before it is shown: populating it while one of its own actions runs would
+    // delete that action.
     connect(file, &QMenu::aboutToShow, this, &NotesWindow::ShowRecent);
     connect(m_recentMenu, &QMenu::triggered, this,
             [this](QAction* action) { OpenNote(action->text()); });
@@ -61,8 +61,8 @@ void NotesWindow::MakeMenus()
     view->addAction(tr("&Font..."), this, [this] {
         m_text->setFont(QFontDialog::getFont(nullptr, m_text->font(), this));
     });
-    view->addAction(tr("&Colour..."), this, [this] {
-        SetColour(QColorDialog::getColor(m_text->palette().color(QPalette::Text), this));
+    view->addAction(tr("&Color..."), this, [this] {
+        SetColor(QColorDialog::getColor(m_text->palette().color(QPalette::Text), this));
     });
 }
 
@@ -83,9 +83,9 @@ void NotesWindow::LoadSettings(bool firstStart)
     m_settings.ReadFont("Notes", "font", font);
     m_text->setFont(font);
 
-    QColor colour;
-    m_settings.ReadColor("Notes", "colour", colour);
-    SetColour(colour);
+    QColor color;
+    m_settings.ReadColor("Notes", "color", color);
+    SetColor(color);
 
     QString none;
     m_settings.ReadItem("Notes", "recent", none, m_recent);
@@ -99,29 +99,29 @@ void NotesWindow::SaveSettings()
     m_settings.WriteScreenMetrics("NotesWindow", position, extent);
     QFont font = m_text->font();
     m_settings.WriteFont("Notes", "font", font);
-    QColor colour = m_text->palette().color(QPalette::Text);
-    m_settings.WriteColor("Notes", "colour", colour);
-    // Files are called anything; the store brings back only some of it as it is.
+    QColor color = m_text->palette().color(QPalette::Text);
+    m_settings.WriteColor("Notes", "color", color);
+    // A file name can contain anything; the store preserves only some of it without encoding.
     m_settings.WriteItem("Notes", "recent", TorkConfigText::EncodeValue(m_recent));
 
     if (!m_settings.SaveAtomically())
         CriticalMessage(this, m_settings.m_lastError, true);
 }
 
-void NotesWindow::SetColour(QColor const& colour)
+void NotesWindow::SetColor(QColor const& color)
 {
-    if (!colour.isValid()) // nothing was chosen, or nothing usable was stored
+    if (!color.isValid()) // nothing chosen, or no usable value stored
         return;
 
     QPalette palette = m_text->palette();
-    palette.setColor(QPalette::Text, colour);
+    palette.setColor(QPalette::Text, color);
     m_text->setPalette(palette);
 }
 
 void NotesWindow::ShowRecent()
 {
     AppUtils::SetupMRUMenu(m_recentMenu, m_recent);
-    // A list that once was empty has kept an entry without a name.
+    // A list that was once empty has kept an entry without a name.
     bool any = false;
     const QList<QAction*> actions = m_recentMenu->actions();
     for (QAction* action : actions) {
@@ -136,7 +136,7 @@ void NotesWindow::TakeNote(QString const& path)
     m_path = path;
     m_text->document()->setModified(false);
     setWindowTitle((path.isEmpty() ? tr("New note") : QFileInfo(path).fileName()) + "[*]");
-    AppUtils::AddToMRUList(path, m_recent, RecentCount); // changes nothing where there is no name
+    AppUtils::AddToMRUList(path, m_recent, RecentCount); // does nothing without a name
 }
 
 bool NotesWindow::OpenNote(QString const& path)

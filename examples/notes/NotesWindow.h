@@ -10,10 +10,10 @@
 class QMenu;
 class QPlainTextEdit;
 
-/// A window to write notes in: plain text files, in UTF-8.
+/// A window for writing notes: plain text files, in UTF-8.
 ///
-/// It remembers its place on the desktop, font, colour and recent files in a settings file, which
-/// it reads when it is made and writes when it is closed.
+/// It saves its position on the desktop, font, color and recent files to a settings file, which it
+/// reads when it is created and writes when it is closed.
 class NotesWindow : public QMainWindow
 {
     Q_OBJECT
@@ -22,11 +22,11 @@ public:
     explicit NotesWindow(QString const& settingsFile);
     ~NotesWindow() override;
 
-    /// Shows a note, unless the one at hand has changes that the user wants to keep. A file that
-    /// cannot be read is reported and no longer offered.
+    /// Opens a note, unless the user wants to keep the changes to the current one. A file that
+    /// cannot be read is reported and removed from the recent files.
     bool OpenNote(QString const& path);
 
-    /// Writes the note at hand. A failure is reported and leaves the old file as it was.
+    /// Saves the current note. A failure is reported and leaves the old file unchanged.
     bool SaveNote(QString const& path);
 
 protected:
@@ -36,7 +36,7 @@ private:
     void MakeMenus();
     void LoadSettings(bool firstStart);
     void SaveSettings();
-    void SetColour(QColor const& colour);
+    void SetColor(QColor const& color);
     void ShowRecent();
     void TakeNote(QString const& path);
     bool MayLeaveNote();
@@ -47,5 +47,5 @@ private:
     QPlainTextEdit* m_text = nullptr;
     QMenu* m_recentMenu = nullptr;
     QString m_recent; // newest first, as AppUtils keeps such lists
-    QString m_path;   // of the note at hand; empty until it has a file
+    QString m_path;   // of the current note; empty until it has a file
 };

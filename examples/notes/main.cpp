@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// A small window to write notes in: notes [FILE]
+// A small window for writing notes: notes [FILE]
 
 #include "NotesWindow.h"
 
@@ -12,14 +12,14 @@
 
 #include <QApplication>
 
-// The order matters: the data directory follows from the names, the log lies below it, and the
+// The order matters: the data directory follows from the names, the log is below it, and the
 // message boxes take their title from the caption.
 int main(int argc, char** argv)
 {
     SurviveFailedWrites();
     QApplication application(argc, argv);
     AppPaths::SetOrganizationAndProduct("Tork", "Notes");
-    TorkLog::initialize("notes"); // makes the data directory too
+    TorkLog::initialize("notes"); // creates the data directory too
     application.setProperty("caption", "Notes");
 
     const QuitOnSignal quitOnSignal;

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Drives the window, and once the whole program.
+// Drives the window, and in one test the whole program.
 
 #include "NotesWindow.h"
 
@@ -30,7 +30,7 @@ private slots:
     void initTestCase();
     void init();
     void firstStart();
-    void placeFontAndColour();
+    void placeFontAndColor();
     void recentFiles();
     void recentFileOfAnyName_data();
     void recentFileOfAnyName();
@@ -55,7 +55,7 @@ private:
 
     QScopedPointer<QTemporaryDir> m_folder;
     QString m_settings;
-    QStringList m_boxes; // the texts of the boxes that were answered
+    QStringList m_boxes; // the texts of the boxes that were shown
 };
 
 void tst_Notes::initTestCase()
@@ -109,7 +109,7 @@ QStringList tst_Notes::recent(NotesWindow& window)
     return entries;
 }
 
-// Answers the next box, which blocks until then.
+// Answers the next box, which blocks until it is answered.
 void tst_Notes::answer(QMessageBox::StandardButton button)
 {
     auto* timer = new QTimer(this);
@@ -136,7 +136,7 @@ void tst_Notes::firstStart()
     QVERIFY(QFile::exists(m_settings));
 }
 
-void tst_Notes::placeFontAndColour()
+void tst_Notes::placeFontAndColor()
 {
     QFont font("Monospace", 17);
     font.setBold(true);
@@ -323,7 +323,7 @@ void tst_Notes::askedAboutChanges()
 
 void tst_Notes::brokenSettings()
 {
-    note("notes.cfg", "<VelocorSettings>\n<Notes>\n<colour>1,2,3</colour>\n");
+    note("notes.cfg", "<VelocorSettings>\n<Notes>\n<color>1,2,3</color>\n");
     answer(QMessageBox::Ok);
     NotesWindow window(m_settings);
     QCOMPARE(m_boxes, QStringList("ConfigFile - Could not parse the input file."));

@@ -1,11 +1,11 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Prints, as one JSON object, what the identity and directory operations give for a program that
-// runs from where this one lies.
+// Prints, as one JSON object, the results of the identity and directory operations for a program
+// that runs from this one's location.
 //
-//     frame_probe root      what each root operation puts into an empty string
-//     frame_probe identity  the names and properties after the start-up step
+//     frame_probe root      the result of each root operation on an empty string
+//     frame_probe identity  the names and properties after the startup step
 //     frame_probe bare      both in a process that has no application object
 
 #include "app/AppPaths.h"

@@ -20,8 +20,8 @@
 #include <functional>
 #include <sys/types.h>
 
-// The program itself in an installation tree of its own, run as a process. Needs VELOCOR_PROGRAM,
-// and SPY_PLUGINS for AddSpy().
+// The program itself in its own installation tree, run as a process. Needs VELOCOR_PROGRAM, and
+// SPY_PLUGINS for AddSpy().
 
 inline constexpr int Patience = 60000;
 
@@ -32,7 +32,7 @@ inline QByteArray Option(char const* key, QByteArray const& text)
     return QByteArray("<arg key=\"") + key + "\">" + text + "</arg>\n";
 }
 
-// The pattern of one whole log entry.
+// The pattern of one complete log entry.
 inline QString Entry(QString const& severity, QString const& message)
 {
     return Stamp + " " + severity + " " + QRegularExpression::escape(message) + "\n";
@@ -51,7 +51,7 @@ inline bool Matches(QByteArray const& log, QString const& pattern)
     return Whole(pattern).match(QString::fromLatin1(log)).hasMatch();
 }
 
-// An installation in a temporary tree, and a user with folders of his own in the same tree.
+// An installation in a temporary tree, and a user whose folders are in the same tree.
 class Installation
 {
 public:
@@ -73,8 +73,8 @@ public:
         return top + "data/" + names + "/logs/";
     }
 
-    // Loads the spy into the program. See StartupSpy.cpp. A copy of it, because another user may
-    // not be let into the folder that was built in.
+    // Loads the spy into the program. See StartupSpy.cpp. Uses a copy, because another user may not
+    // have access to the build folder.
     void AddSpy(QString const& end)
     {
         const QString folder = top + "plugins/generic/";
@@ -104,7 +104,7 @@ public:
     bool installed = false;
 };
 
-// A running program that gets signals once its log tells that it has started.
+// A running program that gets signals once its log says that it has started.
 class RunningProgram
 {
 public:
@@ -117,7 +117,7 @@ public:
         m_process.start(installation.program, arguments);
     }
 
-    // Whether the log comes to look like that before the time is over.
+    // Whether the log matches the pattern before the timeout.
     bool WaitForLog(QString const& logFile, QString const& pattern)
     {
         QElapsedTimer time;
@@ -133,7 +133,7 @@ public:
 
     void Send(int signalNumber) const { ::kill(Id(), signalNumber); }
 
-    // The exit code, or -1 for a program that did not end normally.
+    // The exit code, or -1 if the program did not exit normally.
     int ExitCode()
     {
         m_process.waitForFinished(Patience);
@@ -144,7 +144,8 @@ public:
 
     QByteArray Output() { return m_process.readAllStandardOutput(); }
 
-    // The next line that the program prints, with its line end; what there is if it ends before.
+    // The next line that the program prints, including its line feed; whatever there is if it ends
+    // first.
     QByteArray NextLine() { return ::NextLine(m_process); }
 
 private:

@@ -28,12 +28,12 @@ QProcessEnvironment PrivateEnvironment(QString const& folder)
         QDir().mkpath(path);
         environment.insert(entry.variable, path);
     }
-    // The toolkit warns of a runtime folder that others may enter.
+    // Qt warns about a runtime folder that other users may enter.
     QFile::setPermissions(folder + "/run", QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
     environment.insert("LC_ALL", "C.UTF-8");
-    // What the platform plug-in remarks about the desktop is no part of what is tested.
+    // What the platform plug-in says about the desktop is not part of the test.
     environment.insert("QT_LOGGING_RULES", "qt.qpa.*=false");
-    // Some releases of the toolkit remark upon this name.
+    // Some releases of Qt complain about this name.
     environment.remove("QT_LOGGING_TO_CONSOLE");
     return environment;
 }

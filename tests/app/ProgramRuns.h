@@ -11,17 +11,17 @@
 
 #include <functional>
 
-/// Copies a program as @p folder / @p name, so that it runs from there. False if that fails.
+/// Copies a program to @p folder / @p name, so that it runs from there. False if that fails.
 bool CopyProgram(QString const& program, QString const& folder, QString const& name);
 
-/// The environment of this process with home, data, configuration and runtime folders below
-/// @p folder (home, data, config, run), which are made.
+/// The environment of this process with home, data, configuration and runtime folders below @p
+/// folder (home, data, config, run), which are created.
 QProcessEnvironment PrivateEnvironment(QString const& folder);
 
-/// What a program left behind that ran to its end.
+/// The result of a program that ran to its end.
 struct ProgramResult
 {
-    bool finished = false; ///< ended by itself, within the time limit, without a crash
+    bool finished = false; ///< exited by itself, within the time limit, without a crash
     int exitCode = -1;
     QByteArray output;
     QByteArray errors;
@@ -31,8 +31,8 @@ struct ProgramResult
 ProgramResult RunProgram(QString const& program, QStringList const& arguments,
                          QProcessEnvironment const& environment);
 
-/// A process that does something in the child before the program starts there. Killed with it if it
-/// still runs.
+/// A process that runs a function in the child before the program starts there. Killed with this
+/// object if it is still running.
 class PreparedProcess : public QProcess
 {
 public:
@@ -52,6 +52,6 @@ protected:
     }
 };
 
-/// The next line of a process's standard output, with its line end. What there is of it if the
-/// process ends or falls silent before.
+/// The next line of a process's standard output, including its line feed. Whatever there is of it
+/// if the process ends or the time is up.
 QByteArray NextLine(QProcess& process);

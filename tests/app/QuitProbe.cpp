@@ -1,21 +1,21 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// A program with a QuitOnSignal, named by the state in which it gets its signals. It prints a line
-// for each step.
+// A program with a QuitOnSignal, named after the state in which it gets its signals. It prints a
+// line for each step.
 //
 //     quit_probe core      an event loop without windows
-//     quit_probe window    a window that lets itself be closed
-//     quit_probe asks      a window that asks in a box before it closes
+//     quit_probe window    a window that can be closed
+//     quit_probe asks      a window that asks for confirmation before it closes
 //     quit_probe refuses   a window that never closes
 //     quit_probe box       a box before exec(), and a window after it
 //     quit_probe boxes     two boxes, one after the other, before exec()
-//     quit_probe question  before exec() a box that must be answered; it is, by itself
+//     quit_probe question  before exec() a box that must be answered; it is, automatically
 //     quit_probe dialog    a window and a box over it
-//     quit_probe stuck     an event loop that never turns again
-//     quit_probe errno     prints what a signal changes of errno while the pipe is full
-//     quit_probe pipe      prints the flags of the descriptors that are new
-//     quit_probe fork      prints how a forked child ends that gets SIGTERM, then as core
+//     quit_probe stuck     an event loop that is blocked
+//     quit_probe errno     prints how a signal changes errno while the pipe is full
+//     quit_probe pipe      prints the flags of the new descriptors
+//     quit_probe fork      prints how a forked child ends when it gets SIGTERM, then as core
 //     quit_probe after     signals after the object is gone
 //     quit_probe wait      no event loop yet when "ready" is printed, and one when the input ends
 
@@ -44,7 +44,7 @@ void Print(QByteArray const& line)
     std::fflush(stdout);
 }
 
-// Runs once an event loop turns.
+// Runs once the event loop is running.
 void PrintInLoop(char const* line)
 {
     QTimer::singleShot(0, QCoreApplication::instance(), [line] { Print(line); });
@@ -107,7 +107,7 @@ int BoxBeforeExec(int count)
     return Exec();
 }
 
-// With two ways to agree and none to decline, the box does not let itself be closed.
+// With two accepting buttons and no rejecting one, the box cannot be closed.
 int QuestionBeforeExec()
 {
     QTimer::singleShot(600, qApp, [] {

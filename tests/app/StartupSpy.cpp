@@ -1,12 +1,12 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// A generic plug-in of the toolkit, named in QT_QPA_GENERIC_PLUGINS, that watches the unchanged
-// program from inside. It comes to life in the QApplication constructor, notes what happens to the
-// application object, and once the event loop runs writes a report and ends the program.
+// A generic Qt plug-in, named in QT_QPA_GENERIC_PLUGINS, that watches the unchanged program from
+// inside. It is created in the QApplication constructor, records what happens to the application
+// object, and once the event loop runs writes a report and ends the program.
 //
 //     SPY_REPORT  the file to write, JSON
-//     SPY_END     "close" closes the windows as their user would; a number is the exit code
+//     SPY_END     "close" closes the windows as the user would; a number is the exit code
 
 #include <QApplication>
 #include <QDynamicPropertyChangeEvent>
@@ -22,7 +22,7 @@
 
 namespace {
 
-// Whether the log service has been started: its first start makes this file.
+// Whether the log service has been started: its first start creates this file.
 bool LogIsStarted()
 {
     return QFile::exists(QStandardPaths::writableLocation(QStandardPaths::DataLocation) +
@@ -54,7 +54,7 @@ QJsonObject Properties()
 {
     QJsonObject properties;
     for (QByteArray const& name : qApp->dynamicPropertyNames()) {
-        if (name.startsWith('_')) // the toolkit's own
+        if (name.startsWith('_')) // Qt's own
             continue;
         const QVariant value = qApp->property(name);
         const bool isText = value.userType() == QMetaType::QString;

@@ -23,7 +23,7 @@ namespace {
 
 char const* const Properties[] = {"RootPath", "DataPath", "DocPath"};
 
-// This program lies outside any bundle: the parent of its folder.
+// This program is outside any bundle: the parent of its folder.
 QString OwnRoot()
 {
     return QFileInfo(QCoreApplication::applicationDirPath()).path() + "/";
@@ -53,7 +53,7 @@ QJsonObject Parsed(ProgramResult const& result)
     return QJsonDocument::fromJson(result.output).object();
 }
 
-// Notes in which order names and properties change.
+// Records the order in which names and properties change.
 class ChangeRecorder : public QObject
 {
 public:
@@ -120,7 +120,7 @@ private:
     QProcessEnvironment Environment() const { return PrivateEnvironment(m_tree.path()); }
     QString Top() const { return QFileInfo(m_tree.path()).canonicalFilePath() + "/"; }
 
-    // An installation whose probe lies in tool/bin.
+    // An installation whose probe is in tool/bin.
     QTemporaryDir m_tree;
     QString m_probe;
     QString m_dataFile;
@@ -154,7 +154,7 @@ void tst_AppPaths::setupRootPath_data()
     QTest::newRow("not empty: kept, nothing published") << "/kept"
                                                         << "/kept"
                                                         << "not published";
-    QTest::newRow("a blank is not empty") << " "
+    QTest::newRow("a space is not empty") << " "
                                           << " "
                                           << "not published";
 }
@@ -183,7 +183,7 @@ void tst_AppPaths::setupProgramPath_data()
 
     QTest::newRow("empty") << "";
     QTest::newRow("null") << QString();
-    QTest::newRow("not empty: computed all the same") << "/overwritten/";
+    QTest::newRow("not empty: computed anyway") << "/overwritten/";
 }
 
 void tst_AppPaths::setupProgramPath()
@@ -346,8 +346,8 @@ void tst_AppPaths::rootRule_data()
                                                << "e/";
     QTest::newRow("a longer name begins so too") << "f/X.app/Contents/MacOSX"
                                                  << "f/";
-    QTest::newRow("a longer name before is none") << "g/X.app/MyContents/MacOS"
-                                                  << "g/X.app/MyContents/";
+    QTest::newRow("a longer name before is not a bundle") << "g/X.app/MyContents/MacOS"
+                                                          << "g/X.app/MyContents/";
     QTest::newRow("only half of it") << "h/X.app/Contents/Resources"
                                      << "h/X.app/Contents/";
     QTest::newRow("bundle right below the top") << "Y.app/Contents/MacOS"
@@ -451,7 +451,7 @@ void tst_AppPaths::identity_data()
         << QString::fromUtf8("Ger\xC3\xA4t \xE2\x82\xAC");
     QTest::newRow("150 kB of opened elements")
         << o + QByteArray("<a>").repeated(50000) << org << prod;
-    QTest::newRow("opened elements behind an instruction that looks like a comment")
+    QTest::newRow("opened elements after an instruction that looks like a comment")
         << o + "<?><!--?>" + QByteArray("<a>").repeated(50000) << org << prod;
     QTest::newRow("10 MB of opened elements")
         << o + QByteArray("<a>").repeated(10 * 1000 * 1000 / 3) << org << prod;
@@ -544,7 +544,7 @@ void tst_AppPaths::identityReadsTheRootOnly()
     QCOMPARE(Parsed(result).value("product").toString(), QString("yourproduct"));
 }
 
-// The toolkit then knows no program folder, so that the root is "/".
+// Qt then knows no program folder, so the root is "/".
 void tst_AppPaths::withoutApplicationObject()
 {
     if (QFile::exists("/appdata.cfg"))

@@ -14,7 +14,7 @@
 
 namespace {
 
-// This program lies outside any bundle: the parent of its folder.
+// This program is outside any bundle: the parent of its folder.
 QString OwnRoot()
 {
     return QFileInfo(QCoreApplication::applicationDirPath()).path() + "/";
@@ -32,7 +32,7 @@ QString DocumentsLocation()
 
 } // namespace
 
-// None of these operations publishes anything: cleanup() looks for properties after every row.
+// None of these operations publishes anything: cleanup() checks for properties after every row.
 class tst_AppUtilsPaths : public QObject
 {
     Q_OBJECT
@@ -78,7 +78,7 @@ void tst_AppUtilsPaths::setupRootPath_data()
     QTest::newRow("null") << QString() << OwnRoot();
     QTest::newRow("not empty: kept") << "/kept"
                                      << "/kept";
-    QTest::newRow("a blank is not empty") << " "
+    QTest::newRow("a space is not empty") << " "
                                           << " ";
 }
 
@@ -89,7 +89,7 @@ void tst_AppUtilsPaths::setupRootPath()
     QTEST(input, "output");
 }
 
-// Unlike its namesake that publishes, this one keeps what is there.
+// Unlike the publishing operation of the same name, this one keeps what is there.
 void tst_AppUtilsPaths::setupProgramPath_data()
 {
     setupRootPath_data();
@@ -209,7 +209,7 @@ void tst_AppUtilsPaths::rootRule_data()
                                              << "c/X.app/contents/";
 }
 
-// All six operations are asked, those that publish too: they share one rule.
+// All six operations are called, including those that publish: they share one rule.
 void tst_AppUtilsPaths::rootRule()
 {
     QFETCH(QString, folder);

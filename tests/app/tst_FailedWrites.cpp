@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Writes that fail, in processes that would be killed for them.
+// Failing writes, in processes that would otherwise be killed by them.
 
 #include "Installation.h"
 
@@ -25,7 +25,7 @@ bool SetFileSizeLimit(rlim_t bytes)
     return setrlimit(RLIMIT_FSIZE, &limit) == 0;
 }
 
-// A program that measures coverage writes files when it ends.
+// A coverage build writes files on exit.
 void LiftFileSizeLimit(pid_t process)
 {
     rlimit limit = {};
@@ -142,8 +142,8 @@ void tst_FailedWrites::programStartsWithAFileSizeLimit_data()
     QTest::newRow("a part of the settings fits") << 20;
 }
 
-// The log and the settings are cut off; the program goes on. See the log's own tests for what is
-// left of them.
+// The log and the settings are cut off; the program keeps running. The log's own tests check what
+// is left of them.
 void tst_FailedWrites::programStartsWithAFileSizeLimit()
 {
     QFETCH(int, bytes);

@@ -16,7 +16,7 @@ namespace {
 
 constexpr int TenMegabytes = 10 * 1000 * 1000;
 
-// The two options in the order in which the start-up step adds them.
+// The two options in the order in which the startup step adds them.
 void AddBothOptions(LaunchOptionParser& parser)
 {
     parser.AddOption(
@@ -83,7 +83,7 @@ private slots:
 
 void tst_LaunchOptionParser::init()
 {
-    // Values pass through the locale's encoding; CTest gives one that holds every character.
+    // Values pass through the locale's encoding; CTest sets one that has every character.
     const QByteArray codec = QTextCodec::codecForLocale()->name();
     if (codec != "UTF-8")
         QSKIP("the locale's encoding is not UTF-8");
@@ -219,7 +219,7 @@ void tst_LaunchOptionParser::parseOptions_data()
                                      << "[P]";
     QTest::newRow("only one") << o << "[O]" << none;
 
-    // Which top-level nodes are looked at.
+    // Which top-level nodes are considered.
     QTest::newRow("white space only") << " \t\n " << none << none;
     QTest::newRow("declaration only") << "<?xml version=\"1.0\"?>" << none << none;
     QTest::newRow("comment only") << "<!-- " + o + " -->" << none << none;
@@ -415,7 +415,7 @@ void tst_LaunchOptionParser::malformed_data()
         << QString("<arg key=\"product\">Q" + QString(QChar(0)) + "</arg>");
 }
 
-// A well-formed element goes before each, so that a value applied in spite of the error shows.
+// Each is preceded by a well-formed element, so that a value applied despite the error shows.
 void tst_LaunchOptionParser::malformed()
 {
     QFETCH(QString, text);
@@ -607,7 +607,7 @@ void tst_LaunchOptionParser::longestFile_data()
     QTest::newRow("one more") << 256 * 1024 * 1024 + 1 << false << "unset";
 }
 
-// The rest of the file is zeros that take no room on the disk.
+// The rest of the file is zeros that take no space on the disk.
 void tst_LaunchOptionParser::longestFile()
 {
     QFETCH(int, length);
@@ -666,7 +666,7 @@ void tst_LaunchOptionParser::hugeFile_data()
     QTest::newRow("10 MB of bare text") << filler << false << -1;
 }
 
-// length: of the value that was set, -1 for none.
+// length: that of the value that was set, -1 for none.
 void tst_LaunchOptionParser::hugeFile()
 {
     QFETCH(QByteArray, bytes);

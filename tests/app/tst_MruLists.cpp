@@ -170,7 +170,7 @@ void tst_MruLists::menuTellsThePath()
 
 void tst_MruLists::menuOfManyEntries()
 {
-    // Adding an action looks through those that are there, so a menu takes fewer than a list.
+    // Adding an action searches the existing ones, so a menu gets fewer than a list.
     const QString list = Numbered(Many / 10);
     QMenu recent;
     QCOMPARE(AppUtils::SetupMRUMenu(&recent, list), true);
@@ -238,7 +238,7 @@ void tst_MruLists::add_data()
                                   << "a|b|c" << 5 << "A|a|b|c";
     QTest::newRow("blanks matter") << " a"
                                    << "a|b" << 5 << " a|a|b";
-    QTest::newRow("paths are not normalised") << "/x/../a"
+    QTest::newRow("paths are not normalized") << "/x/../a"
                                               << "/a" << 5 << "/x/../a|/a";
     QTest::newRow("a part is not the whole") << "ab"
                                              << "abc|b" << 5 << "ab|abc|b";
@@ -411,7 +411,7 @@ void tst_MruLists::removingTheLastEntryLeavesATextThatCanBeStored()
     QString list = QStringLiteral("a");
     QVERIFY(AppUtils::RemoveFromMRUList(QStringLiteral("a"), list));
     QVERIFY(list.isEmpty());
-    QVERIFY(!list.isNull()); // a null text would be refused by the settings
+    QVERIFY(!list.isNull()); // settings would reject a null string
 }
 
 void tst_MruLists::addStepByStep()
@@ -427,7 +427,7 @@ void tst_MruLists::addStepByStep()
     QCOMPARE(list, QString());
 }
 
-// The empty entry of the empty list leaves in the end as the oldest one.
+// The empty entry of the empty list is eventually dropped as the oldest one.
 void tst_MruLists::addInTurn()
 {
     QString list;

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The program itself, copied into installation trees of its own and run as a process.
+// The program itself, copied into its own installation trees and run as a process.
 
 #include "Installation.h"
 #include "ProgramRuns.h"
@@ -23,7 +23,8 @@
 
 namespace {
 
-// The settings that a first start saves, one line each and sorted: their order is the table's.
+// The settings that a first start saves, one per line and sorted, because the table's order is
+// random.
 QByteArray const FirstSettings("<dateTimeFormat>yyyy-MM-dd hh:mm:ss.z</dateTimeFormat>\n"
                                "<elapsedTimePrefix>dT:</elapsedTimePrefix>\n"
                                "<filePrefix>velocor</filePrefix>\n"
@@ -33,7 +34,7 @@ QByteArray const FirstSettings("<dateTimeFormat>yyyy-MM-dd hh:mm:ss.z</dateTimeF
                                "<maxLogFileSize>1000000</maxLogFileSize>\n"
                                "<maxLogFiles>10</maxLogFiles>\n");
 
-// A settings file with its items in a known order; anything else in it comes back as it is.
+// A settings file with its items in a known order; anything else in it is unchanged.
 QByteArray WithSortedItems(QByteArray const& file)
 {
     const QByteArray head("<LogSettings>\n<config>\n");
@@ -109,7 +110,7 @@ void tst_Program::firstStart_data()
     QTest::newRow("ampersand") << Option("product", "P&amp;Q") << "yourorganization/P&Q";
     QTest::newRow("empty organization")
         << Option("organization", "") + Option("product", "Alone") << "Alone";
-    QTest::newRow("empty product: the toolkit puts the program's own name in its place")
+    QTest::newRow("empty product: Qt substitutes the program's own name")
         << Option("product", "") << "yourorganization/velocor";
     QTest::newRow("empty file") << QByteArray("") << defaults;
     QTest::newRow("malformed") << Option("product", "Product") + "<arg" << defaults;
@@ -139,7 +140,7 @@ void tst_Program::firstStart()
     program.Send(SIGTERM);
     QCOMPARE(program.ExitCode(), 0);
     QVERIFY2(started, "log: " + TestFiles::read(logs + "velocor.log"));
-    if (HasDesktop()) // otherwise it prints where its log is
+    if (HasDesktop()) // otherwise it prints the log's location
         QCOMPARE(program.Output(), QByteArray());
 
     QCOMPARE(QDir(logs).entryList(QDir::AllEntries | QDir::Hidden | QDir::NoDotAndDotDot),
@@ -160,7 +161,7 @@ void tst_Program::launchDataThatIsNoRegularFile_data()
         QTest::newRow(kind) << QString(kind);
 }
 
-// It neither stops nor delays the start; the defaults hold.
+// This neither prevents nor delays the start; the defaults apply.
 void tst_Program::launchDataThatIsNoRegularFile()
 {
     QFETCH(QString, kind);
@@ -194,8 +195,8 @@ void tst_Program::secondStart_data()
         << QByteArray("\xE2\x82\xAC") << QString::fromUtf8("\xE2\x82\xAC");
 }
 
-// The settings file is there now: loading it is what the log tells of first. The log is written
-// over from its beginning, and the shorter text of the first start is covered whole.
+// Now the settings file exists, so the log first reports loading it. The log is overwritten from
+// the beginning, and the shorter text of the first start is completely covered.
 void tst_Program::secondStart()
 {
     QFETCH(QByteArray, product);
@@ -232,7 +233,7 @@ void tst_Program::thirdStartWritesOverTheSecond()
     for (int start = 1; start <= 2; ++start)
         QCOMPARE(RunProgram(installation.program, {}, installation.environment).exitCode, 0);
 
-    // What is longer than the new text stays behind it.
+    // Whatever is longer than the new text remains after it.
     const QByteArray before = TestFiles::read(logFile) + QByteArray(500, 'x') + "\n";
     QVERIFY(TestFiles::write(logFile, before));
     QCOMPARE(RunProgram(installation.program, {}, installation.environment).exitCode, 0);
@@ -253,7 +254,7 @@ void tst_Program::storedSettings_data()
 
     // %1 in the first entry, which is always the same, is the settings file.
     QTest::newRow("no items: the defaults") << QByteArray("") << StartEntry;
-    QTest::newRow("switched off: the loading is told all the same")
+    QTest::newRow("disabled: loading is reported anyway")
         << QByteArray("<loggingEnabled>no</loggingEnabled>\n") << "";
     QTest::newRow("another prefix: the open file stays in use")
         << QByteArray("<filePrefix>other</filePrefix>\n") << StartEntry;
@@ -301,7 +302,7 @@ void tst_Program::brokenSettings_data()
     QTest::newRow("no XML") << QByteArray("maxLogFiles = 10\n");
 }
 
-// The program starts all the same, and its log tells what was wrong.
+// The program starts anyway, and its log reports the problem.
 void tst_Program::brokenSettings()
 {
     QFETCH(QByteArray, settings);
@@ -353,7 +354,7 @@ void tst_Program::manySignals()
     QVERIFY(installation.installed);
     RunningProgram program(installation);
     QVERIFY(program.WaitForLog(installation.LogFolder() + "velocor.log", StartEntry));
-    // All at one moment: the process is held still until they have all been sent.
+    // All at the same moment: the process is stopped until they have all been sent.
     program.Send(SIGSTOP);
     for (int i = 0; i < 100; ++i)
         program.Send(i % 2 ? SIGTERM : SIGINT);
@@ -409,7 +410,7 @@ void tst_Program::bundle()
     QVERIFY(QFile::exists(installation.LogFolder("Org/Pro") + "logsettings.cfg"));
 }
 
-// The dynamic loader tells which function of which library the program calls for the first time.
+// The dynamic loader reports which function of which library the program calls for the first time.
 void tst_Program::nothingOfQtRunsBeforeTheApplicationObject()
 {
     Installation installation;
@@ -431,7 +432,7 @@ void tst_Program::nothingOfQtRunsBeforeTheApplicationObject()
     const int application = calls.indexOf(QRegularExpression(".*`_ZN12QApplicationC1.*"));
     const int later = calls.indexOf(QRegularExpression(".*`unsetenv'.*"));
     if (!(0 <= start && start < application && application < later))
-        QSKIP("here functions are not looked up when they are called");
+        QSKIP("this build binds functions at load time");
     const QStringList before = calls.mid(start, application - start);
     QCOMPARE(before.filter("libQt5"), QStringList());
 }
@@ -445,7 +446,7 @@ void tst_Program::startOrder()
     const ProgramResult result = RunProgram(installation.program, {}, installation.environment);
     QCOMPARE(result.exitCode, 0);
 
-    // The first RootPath is that under which the launch data is looked for.
+    // The first RootPath is the one where the launch data is looked up.
     const QJsonArray steps = installation.Report().value("steps").toArray();
     QCOMPARE(steps, QJsonArray({"RootPath", "organization", "product", "DataPath", "DocPath",
                                 "caption", "show", "exec"}));
@@ -551,11 +552,11 @@ void tst_Program::unusableDataFolder_data()
                                                        << "plain";
     QTest::newRow("a file in the log folder's place") << "other"
                                                       << "other/yourorganization/yourproduct/logs";
-    QTest::newRow("a place where nothing can be made") << "../../proc/nowhere"
-                                                       << "";
+    QTest::newRow("a place where nothing can be created") << "../../proc/nowhere"
+                                                          << "";
 }
 
-// Nothing can be logged; nothing else is the worse for it.
+// Nothing can be logged; nothing else is affected.
 void tst_Program::unusableDataFolder()
 {
     QFETCH(QString, folder);

@@ -15,7 +15,7 @@
 namespace {
 
 constexpr int Patience = 30000;
-constexpr int AnotherRequest = 250; // milliseconds; well beyond one request
+constexpr int AnotherRequest = 250; // milliseconds; well past a single request
 
 class Probe
 {
@@ -162,7 +162,7 @@ void tst_QuitOnSignal::aBoxBeforeTheLoopIsClosedAndTheLoopEnds_data()
     QTest::newRow("two boxes, one after the other") << "boxes";
 }
 
-// The window that is made after the box is closed too.
+// The window that is created after the box is closed too.
 void tst_QuitOnSignal::aBoxBeforeTheLoopIsClosedAndTheLoopEnds()
 {
     QFETCH(QString, state);
@@ -232,7 +232,7 @@ void tst_QuitOnSignal::theSecondEndsAtOnce()
     QCOMPARE(probe.Rest(), QByteArray());
 }
 
-// What timeout(1) and a closing terminal do: they send to the process and to its group.
+// As timeout(1) and a closing terminal do: they signal both the process and its group.
 void tst_QuitOnSignal::signalsAtOneMomentAreOneRequest()
 {
     Probe probe("asks");

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The program on a machine that has no display: its first log, and what it prints.
+// The program on a machine without a display: its first log, and what it prints.
 
 #include "Installation.h"
 
@@ -74,8 +74,8 @@ void tst_StartWithoutScreen::theFirstLogHoldsTheStartAndNothingElse_data()
         QTest::newRow(platform) << QString(platform);
 }
 
-// No warning before, none while the window is completed, none when it closes. The window is
-// complete once there is something to save.
+// No warning before the window is complete, during it, or on close. The window is complete once
+// there is something to save.
 void tst_StartWithoutScreen::theFirstLogHoldsTheStartAndNothingElse()
 {
     QFETCH(QString, platform);
@@ -107,7 +107,7 @@ void tst_StartWithoutScreen::endsBySignal_data()
     QTest::newRow("SIGHUP") << SIGHUP;
 }
 
-// With the state of the window saved.
+// With saved window state.
 void tst_StartWithoutScreen::endsBySignal()
 {
     QFETCH(int, signalNumber);
@@ -179,7 +179,7 @@ void tst_StartWithoutScreen::troubleWithOutputKeepsNoEntryFromTheLog_data()
     QTest::newRow("standard streams closed") << ChildSetup(CloseStreams);
 }
 
-// Nor does it end the program, or print into the log.
+// It does not end the program either, or print into the log.
 void tst_StartWithoutScreen::troubleWithOutputKeepsNoEntryFromTheLog()
 {
     QFETCH(ChildSetup, inChild);

@@ -25,7 +25,7 @@ struct LogMessage
     QtMsgType type;
     QString text;
     QString category;
-    bool hasPlace; ///< a file, a line or a function came with it
+    bool hasPlace; ///< it came with a file, a line or a function
     bool boxIsStillThere;
 };
 
@@ -39,7 +39,7 @@ void Record(QtMsgType type, QMessageLogContext const& context, QString const& te
                        !g_box.isNull()});
 }
 
-// What the user saw, noted while the box was open.
+// What the user saw, recorded while the box was open.
 struct SeenBox
 {
     int count = 0;
@@ -55,7 +55,7 @@ struct SeenBox
     int messagesBefore = -1;
 };
 
-// Looks at the box that the next event loop shows, then closes it.
+// Inspects the box that the next event loop shows, then closes it.
 class BoxCloser : public QObject
 {
 public:
@@ -146,7 +146,7 @@ private:
     QtMessageHandler m_handler = nullptr;
 };
 
-// Without a window manager the toolkit remarks on the focus of every box.
+// Without a window manager Qt warns about the focus of every box.
 void tst_UserMessages::initTestCase()
 {
     QLoggingCategory::setFilterRules("qt.qpa.*=false");
@@ -295,7 +295,7 @@ void tst_UserMessages::titles_data()
     QTest::newRow("letters beyond ASCII")
         << QVariant(QString::fromUtf8("Ger\xC3\xA4t")) << QString::fromUtf8("Ger\xC3\xA4t");
     QTest::newRow("a number becomes a text") << QVariant(42) << "42";
-    QTest::newRow("what is no text gives none") << QVariant(QRect(1, 2, 3, 4)) << "";
+    QTest::newRow("not a string: empty") << QVariant(QRect(1, 2, 3, 4)) << "";
 }
 
 void tst_UserMessages::titles()
@@ -351,7 +351,7 @@ void tst_UserMessages::closedByKey_data()
     QTest::newRow("escape") << int(Qt::Key_Escape);
 }
 
-// One button only: every way out of the box is that button.
+// A single button: every way out of the box is that button.
 void tst_UserMessages::closedByKey()
 {
     QFETCH(int, key);
@@ -366,7 +366,7 @@ void tst_UserMessages::nothingIsLoggedWhileTheBoxIsOpen()
 {
     int messagesLater = -1;
     const BoxCloser closer([&messagesLater](QMessageBox& box) {
-        // Some turns of the event loop pass before the user makes up his mind.
+        // The event loop runs a few times before the user decides.
         for (int turn = 0; turn < 5; ++turn)
             QCoreApplication::processEvents();
         messagesLater = g_messages.size();
@@ -420,7 +420,7 @@ void tst_UserMessages::inTheLogFile()
     QFETCH(QByteArray, severity);
     const QTemporaryDir folder;
     const QString path = folder.path() + "/";
-    // A stamp of fixed text, so that the whole file can be compared.
+    // A constant stamp, so that the whole file can be compared.
     QVERIFY(
         TestFiles::write(path + "settings.cfg",
                          "<LogSettings>\n<config>\n<filePrefix>app</filePrefix>\n"
@@ -455,8 +455,8 @@ void tst_UserMessages::stripFormatting_data()
                          << "a b";
     QTest::newRow("line feed and tab") << "a\nb\tc"
                                        << "a b c";
-    QTest::newRow("each gives a blank of its own") << "\n\n\t\t"
-                                                   << "    ";
+    QTest::newRow("each becomes its own space") << "\n\n\t\t"
+                                                << "    ";
     QTest::newRow("at both ends") << "\na\t"
                                   << " a ";
     QTest::newRow("repeated blanks stay") << "a   b"

@@ -13,7 +13,7 @@ namespace {
 
 constexpr char const* Variable = "QT_XCB_GL_INTEGRATION";
 
-// The libraries are loaded when a window is made, not before.
+// The libraries are loaded when a window is created, not before.
 QByteArray LibrariesOfAShownWindow()
 {
     QWidget window;

@@ -12,7 +12,7 @@
 
 #include <utility>
 
-/// What a configuration file object holds, worded so that a test compares it in one go.
+/// The contents of a configuration file object, formatted so that a test compares them in one go.
 namespace ConfigContents {
 
 /// Every name that loading `document` could possibly give a section.

@@ -10,7 +10,7 @@
 
 #include <functional>
 
-/// What several tests of the store share.
+/// What several tests of the store have in common.
 namespace StoreTest {
 
 const QString NotFoundText = QStringLiteral("ConfigFile - File not found.");

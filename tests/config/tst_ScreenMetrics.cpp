@@ -152,7 +152,7 @@ void tst_ScreenMetrics::fits()
     checkRead(stored, position, size);
 }
 
-// Numbers that no window has: sums and differences wrap in 32 bits.
+// Unrealistic numbers: sums and differences wrap in 32 bits.
 void tst_ScreenMetrics::wraps_data()
 {
     QTest::addColumn<QString>("stored");

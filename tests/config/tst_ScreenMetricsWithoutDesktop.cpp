@@ -11,7 +11,7 @@
 
 #include <memory>
 
-// Programs that have no desktop, because their application object is none with windows.
+// Programs without a desktop, because their application object is not a GUI one.
 class tst_ScreenMetricsWithoutDesktop : public QObject
 {
     Q_OBJECT
@@ -28,8 +28,8 @@ enum Application { None, Core, Gui };
 
 std::unique_ptr<QCoreApplication> MakeApplication(int kind)
 {
-    // Of the screen plugins, the one that leaves nothing behind when it goes. The arguments must
-    // outlive the application, which takes away those that it understood.
+    // Of the screen plug-ins, the one that cleans up after itself. The arguments must outlive the
+    // application, which removes those that it recognized.
     static char name[] = "program";
     static char option[] = "-platform";
     static char plugin[] = "minimal";

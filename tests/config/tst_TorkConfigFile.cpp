@@ -28,7 +28,7 @@ namespace {
 
 using Lookup = std::function<bool(TorkConfigFile&, QString const&)>;
 
-// A section that tells when it is deleted.
+// A section that reports when it is deleted.
 class WatchedSection : public TorkConfigFileSection
 {
 public:
@@ -227,7 +227,7 @@ void tst_TorkConfigFile::lookup()
 
     QTEST(ask(file, asked), "expected");
 
-    // A question makes no section.
+    // A lookup creates no section.
     QCOMPARE(ConfigContents::of(file, {"MainWindow", "Other", asked}),
              QString("MainWindow{k=[v]}Other{k=[v]}"));
 }
@@ -312,7 +312,7 @@ void tst_TorkConfigFile::appendSectionThatWasPushedOut_data()
     QTest::newRow("to another file") << true;
 }
 
-// The two go on changing places; each is deleted once, by whom it belongs to in the end.
+// The two keep changing places; each is deleted once, by its final owner.
 void tst_TorkConfigFile::appendSectionThatWasPushedOut()
 {
     QFETCH(bool, toAnotherFile);
@@ -355,13 +355,13 @@ void tst_TorkConfigFile::appendSectionKeepsBlanksInTheName()
     QVERIFY(file.HasSection("My Section"));
     QVERIFY(!file.HasSection("MySection"));
 
-    // Reading drops the blank from the name, and so does not find it.
+    // Reading drops the space from the name, and so does not find it.
     QString none("none");
     QString value;
     QVERIFY(!file.ReadItem("My Section", "k", none, value));
     QCOMPARE(value, QString("none"));
 
-    // Nor a key that holds one, while others are still found.
+    // Nor a key that contains one, while others are still found.
     file.WriteItem("MySection", "k", "w");
     file.FindSection("MySection")->AddValue("my key", "x");
     QVERIFY(!file.ReadItem("My Section", "my key", none, value));
@@ -496,7 +496,7 @@ void tst_TorkConfigFile::writeItem_data()
     QTest::newRow("any text as key") << "Main" << QString("\u043A\u043B\u044E\u0447<%1>") << "v"
                                      << "Main" << QString("\u043A\u043B\u044E\u0447<%1>");
 
-    // A new section's name goes through Latin-1 bytes that are read as UTF-8.
+    // A new section's name is converted to Latin-1 bytes that are then decoded as UTF-8.
     QTest::newRow("section name in Latin-1") << QString("Stra\u00DFe") << "key"
                                              << "v" << QString("Stra%1e").arg(replacement) << "key";
     QTest::newRow("section name that happens to be UTF-8") << QString("\u00C3\u00A9") << "key"
@@ -565,7 +565,7 @@ void tst_TorkConfigFile::writeItemReplaces()
              QString("MainWindow{Key=[third];key=[second]}"));
 }
 
-// The name that was asked for is never found, so each write makes its section again.
+// The requested name is never found, so each write creates its section again.
 void tst_TorkConfigFile::newSectionPushesOutItsNamesake()
 {
     const QString written("\u00E9");
@@ -591,7 +591,7 @@ void tst_TorkConfigFile::pushedOutSectionIsItsHolders_data()
     }
 }
 
-// Run under the address sanitizer, which sees what is deleted twice, too late or never.
+// Run under AddressSanitizer, which reports what is deleted twice, too late or never.
 void tst_TorkConfigFile::pushedOutSectionIsItsHolders()
 {
     QFETCH(QString, made);
@@ -633,7 +633,7 @@ void tst_TorkConfigFile::pushedOutSectionIsItsHolders()
     }
 }
 
-// The leak checker sees one that stays behind.
+// The leak checker reports one that remains.
 void tst_TorkConfigFile::pushedOutSectionNobodyHolds()
 {
     const QString stored = QChar(QChar::ReplacementCharacter);

@@ -230,7 +230,7 @@ void tst_TorkConfigFileDocHandler::readerWithoutFile()
     QTEST(handler.lastOpenedElement(), "lastOpened");
 }
 
-// Only the handler of the load in progress makes sections and items.
+// Only the handler of the load in progress creates sections and items.
 void tst_TorkConfigFileDocHandler::fileOutsideItsLoadStaysAsItIs()
 {
     TorkConfigFile file{QString()};

@@ -31,7 +31,7 @@ namespace {
 
 const QString NoNameText = QStringLiteral("ConfigFile - Load failed - No file name specified.");
 
-// The log in a folder of its own, for as long as this object lives.
+// The log in its own folder, for as long as this object lives.
 class LogSession
 {
 public:
@@ -59,7 +59,7 @@ public:
         return lines;
     }
 
-    /// Writes an entry, so that the log file exists also where nothing else does.
+    /// Writes an entry, so that the log file exists even where nothing else writes one.
     void mark() { TorkLog::logger()->trace("mark"); }
 
 private:
@@ -67,7 +67,7 @@ private:
     QtMessageHandler m_previous;
 };
 
-// Puts every text of a context between brackets.
+// Puts every text of a context in brackets.
 class BracketTranslator : public QTranslator
 {
 public:
@@ -185,7 +185,7 @@ void tst_TorkConfigFileFailures::specialFile_data()
                                  << "";
 }
 
-// The alarm ends a test that waits for the other end of a pipe, or for the end of a device.
+// The alarm ends a test that hangs on the other end of a pipe or the end of a device.
 void tst_TorkConfigFileFailures::specialFile()
 {
 #ifdef Q_OS_UNIX

@@ -21,7 +21,7 @@ using Step = std::function<void(TorkConfigFile&)>;
 
 const QString NotParsedText = QStringLiteral("ConfigFile - Could not parse the input file.");
 
-// What a load of a whole file, cut off at each byte, must never mix up.
+// What loading a file truncated at any byte must never mix up.
 const QByteArray Sample = "<VelocorSettings>\n"
                           "<Main>\n"
                           "<first>one</first>\n"
@@ -34,7 +34,7 @@ const QByteArray Sample = "<VelocorSettings>\n"
                           "</Other>\n"
                           "</VelocorSettings>\n";
 
-// Runs a function each time the toolkit issues a critical message, and swallows all messages.
+// Runs a function whenever Qt issues a critical message, and suppresses all messages.
 class OnCriticalMessage
 {
 public:
@@ -157,9 +157,9 @@ void tst_TorkConfigFileLoad::shape_data()
     QTest::newRow("section with text only") << QByteArray("<r><s>text</s></r>") << "s{}";
     QTest::newRow("text beside an item")
         << QByteArray("<r><s>text<k>v</k>more</s></r>") << "s{k=[v]}";
-    QTest::newRow("letter case tells sections apart")
+    QTest::newRow("section names are case-sensitive")
         << QByteArray("<r><s><k>v</k></s><S><k>w</k></S></r>") << "S{k=[w]}s{k=[v]}";
-    QTest::newRow("letter case tells keys apart")
+    QTest::newRow("keys are case-sensitive")
         << QByteArray("<r><s><k>v</k><K>w</K></s></r>") << "s{K=[w];k=[v]}";
     QTest::newRow("item named like its section")
         << QByteArray("<r><s><s>v</s></s></r>") << "s{s=[v]}";
@@ -182,7 +182,7 @@ void tst_TorkConfigFileLoad::shape_data()
         << QByteArray("<r a='1'><s b='2' k='3'><k c=\"4\">v</k></s></r>") << "s{k=[v]}";
     QTest::newRow("prefixes are dropped")
         << QByteArray("<p:r xmlns:p='urn:p'><p:s><p:k>v</p:k></p:s></p:r>") << "s{k=[v]}";
-    QTest::newRow("prefixes nobody declared are dropped too")
+    QTest::newRow("undeclared prefixes are dropped too")
         << QByteArray("<r><p:s><q:k>v</q:k></p:s></r>") << "s{k=[v]}";
     QTest::newRow("prefixes do not keep sections apart")
         << QByteArray("<r xmlns:p='u' xmlns:q='w'><p:s><k>v</k></p:s><q:s><l>w</l></q:s></r>")
@@ -221,7 +221,7 @@ void tst_TorkConfigFileLoad::values_data()
     QTest::newRow("entity within text") << QByteArray("<k>a&amp;b</k>") << "k=[a&b]";
     QTest::newRow("character references") << QByteArray("<k>&#65;&#x42;</k>") << "k=[AB]";
 
-    // Only the first text that the reader reports counts.
+    // Only the first text that the reader reports is used.
     QTest::newRow("text before CDATA") << QByteArray("<k>a<![CDATA[b]]></k>") << "k=[a]";
     QTest::newRow("CDATA before text") << QByteArray("<k><![CDATA[a]]>b</k>") << "k=[a]";
     QTest::newRow("empty CDATA before text") << QByteArray("<k><![CDATA[]]>b</k>") << "k=[]";
@@ -230,8 +230,8 @@ void tst_TorkConfigFileLoad::values_data()
     QTest::newRow("comment before text") << QByteArray("<k><!-- c -->b</k>") << "k=[b]";
     QTest::newRow("comment only") << QByteArray("<k><!-- c --></k>") << "";
     QTest::newRow("instruction within text") << QByteArray("<k>a<?p q?>b</k>") << "k=[a]";
-    QTest::newRow("entity nobody declared within text") << QByteArray("<k>a&none;b</k>") << "k=[a]";
-    QTest::newRow("entity nobody declared") << QByteArray("<k>&none;</k>") << "";
+    QTest::newRow("undeclared entity within text") << QByteArray("<k>a&none;b</k>") << "k=[a]";
+    QTest::newRow("undeclared entity") << QByteArray("<k>&none;</k>") << "";
     QTest::newRow("element within text") << QByteArray("<k>a<d/>b</k>") << "k=[a]";
 
     QTest::newRow("empty item leaves the next alone") << QByteArray("<j></j><k>v</k>") << "k=[v]";
@@ -260,7 +260,7 @@ void tst_TorkConfigFileLoad::rootElementName_data()
     QTest::newRow("section named like the document's own root element")
         << QByteArray("<r><r><k>v</k></r></r>") << "r{k=[v]}";
 
-    // An element of that name is no section and no item, wherever it stands.
+    // An element of that name is neither section nor item, wherever it appears.
     QTest::newRow("as a section, none before")
         << QByteArray("<VelocorSettings><VelocorSettings><k>v</k></VelocorSettings>"
                       "</VelocorSettings>")
@@ -278,7 +278,7 @@ void tst_TorkConfigFileLoad::rootElementName_data()
                                 << "s{k=[w]}";
     QTest::newRow("as an item without text")
         << QByteArray("<r><s><VelocorSettings/><k>w</k></s></r>") << "s{k=[w]}";
-    // The item before it goes on waiting for its text.
+    // The item before it keeps waiting for its text.
     QTest::newRow("as a section after an item without text")
         << QByteArray("<r><s><k/></s><VelocorSettings><VelocorSettings><d>x</d></VelocorSettings>"
                       "</VelocorSettings></r>")
@@ -389,7 +389,7 @@ void tst_TorkConfigFileLoad::encodings_data()
     QTest::newRow("key beyond ASCII")
         << QByteArray("<r><s><\xC3\xA9>v</\xC3\xA9></s></r>") << QString("s{\u00E9=[v]}");
 
-    // A section's name goes through Latin-1 bytes that are read as UTF-8.
+    // A section's name is converted to Latin-1 bytes that are then decoded as UTF-8.
     QTest::newRow("section name in Latin-1")
         << QByteArray("<r><\xC3\xA9><k>v</k><l>w</l></\xC3\xA9></r>")
         << replacement + "{k=[v];l=[w]}";
@@ -513,7 +513,7 @@ void tst_TorkConfigFileLoad::malformed()
     candidates << "old";
     QTEST(ConfigContents::of(file, candidates), "expected");
 
-    // The reader's own message, and no other.
+    // The reader's own message, and nothing else.
     const QStringList texts = messages.texts();
     QCOMPARE(texts.size(), 1);
     QVERIFY2(texts[0].startsWith("critical: TorkErrorHandler::fatalError:  \"Xml Parse Failure."),
@@ -579,14 +579,14 @@ void tst_TorkConfigFileLoad::cutOff()
     QCOMPARE(file.Load(), complete);
     QCOMPARE(file.m_lastError, complete ? QString() : NotParsedText);
 
-    // A section is there once its start tag is; half a name is no section.
+    // A section exists once its start tag is complete; half a name is no section.
     for (char const* name : {"Main", "Empty", "Other"}) {
         const bool started = document.contains('<' + QByteArray(name) + '>');
         QCOMPARE(file.HasSection(QString(name)), started);
     }
     QVERIFY(!file.HasSection("Mai") && !file.HasSection("Empt") && !file.HasSection("Othe"));
 
-    // An item is there whole or not at all: certainly once it has ended, never before it started.
+    // An item is complete or missing: always there once it has ended, never before it started.
     const struct
     {
         char const* section;
@@ -632,7 +632,7 @@ void tst_TorkConfigFileLoad::damagedByte()
     QCOMPARE(messages.texts().size(), loaded ? 0 : 1);
     QVERIFY(!file.HasSection("old"));
 
-    // What stands before the damage is read as ever.
+    // Everything before the damage is read as usual.
     if (document.left(place).contains("</first>")) {
         QString none;
         QString value;
@@ -656,7 +656,7 @@ void tst_TorkConfigFileLoad::nested_data()
     QTest::newRow("500000 levels left open") << 500000 << false << false << "s{j=[1]}";
 }
 
-// The reader calls itself once per level, and a program has only so much stack.
+// The reader recurses once per level, and the stack is limited.
 void tst_TorkConfigFileLoad::nested()
 {
     QFETCH(int, levels);
@@ -734,7 +734,7 @@ void tst_TorkConfigFileLoad::secondLoad_data()
     QTest::newRow("section of the root element's name: no section is current any more")
         << QByteArray("<r><s><k>v</k></s></r>")
         << QByteArray("<r><VelocorSettings><l>w</l></VelocorSettings></r>") << true << "";
-    QTest::newRow("depth starts anew after an item left open")
+    QTest::newRow("depth starts again after an item left open")
         << QByteArray("<r><s><k>") << QByteArray("<r><t><l>w</l></t></r>") << true << "t{l=[w]}";
 }
 
@@ -770,7 +770,7 @@ void tst_TorkConfigFileLoad::loadDeletesEarlierSections()
     int deleted = 0;
     TorkConfigFile file(path());
     file.AppendSection(new WatchedSection(deleted));
-    QVERIFY(!file.Load()); // no file yet
+    QVERIFY(!file.Load()); // the file does not exist yet
     QCOMPARE(deleted, 0);
     QVERIFY(TestFiles::write(path(), "<r><s><k>v</k></s></r>"));
     QVERIFY(file.Load());
@@ -790,8 +790,8 @@ void tst_TorkConfigFileLoad::loadedFileCanBeSaved()
                         "</VelocorSettings>\n"));
 }
 
-// The steps that the handler calls work only while a load is under way. A document that breaks off
-// leaves the load where it is for as long as its error is being reported, and so for the steps.
+// The steps that the handler calls work only while a load is in progress. A document that breaks
+// off leaves the load in progress while its error is being reported, so the steps work then too.
 void tst_TorkConfigFileLoad::steps_data()
 {
     QTest::addColumn<QByteArray>("document");

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// SaveAtomically(): what it leaves in every kind of place.
+// SaveAtomically(): its effect in every kind of place.
 
 #include "common/config/TorkConfigFile.h"
 #include "support/ChildProcess.h"
@@ -95,7 +95,7 @@ struct stat StatusOf(QString const& path)
 {
     struct stat status = {};
     if (::lstat(QFile::encodeName(path), &status) != 0)
-        qWarning("%s: cannot be looked at", qPrintable(path));
+        qWarning("%s: stat failed", qPrintable(path));
     return status;
 }
 
@@ -121,7 +121,7 @@ QString Unable(QString const& path, int error)
 
 } // namespace
 
-// Other users get in too.
+// Other users can enter too.
 void tst_TorkConfigFileReplace::init()
 {
     m_folder.reset(new QTemporaryDir);
@@ -262,7 +262,7 @@ void tst_TorkConfigFileReplace::permissionsAreKept()
 void tst_TorkConfigFileReplace::ownerAndGroupAreKept()
 {
     if (geteuid() != 0)
-        QSKIP("Only the administrator can give files away.");
+        QSKIP("Only root can change the owner of files.");
     QVERIFY(TestFiles::write(path(), oldBytes));
     QVERIFY(SetMode(path(), 0660));
     QVERIFY(::chown(QFile::encodeName(path()), 12345, 23456) == 0);
@@ -275,7 +275,7 @@ void tst_TorkConfigFileReplace::ownerAndGroupAreKept()
 
 namespace {
 
-// As the user without rights; prints the result and what is told.
+// Runs as the unprivileged user; prints the result and what is reported.
 int savesAsOrdinaryUser(QStringList const& arguments)
 {
     if (!ProcessLimits::becomeOrdinaryUser())
@@ -305,13 +305,13 @@ int saves(QStringList const& arguments)
 
 #define RUN_AS_ORDINARY_USER(child)                                                                \
     if (geteuid() != 0)                                                                            \
-        QSKIP("Only the administrator can set this up.");                                          \
+        QSKIP("Only root can set this up.");                                                       \
     const ChildProcess::Result child = ChildProcess::run("ordinary", {path()});                    \
     if (child.wasSkipped())                                                                        \
         QSKIP("This process cannot become another user.");                                         \
     QVERIFY2(child.ended(), child.report())
 
-// The user owns file and folder, but is in no group but its own.
+// The user owns file and folder, but belongs only to its own group.
 void tst_TorkConfigFileReplace::lostGroupGetsNoRights()
 {
     QVERIFY(TestFiles::write(path(), oldBytes));
@@ -331,7 +331,7 @@ void tst_TorkConfigFileReplace::linkStays_data()
 {
     QTest::addColumn<QString>("target");  // of the link viewer.cfg
     QTest::addColumn<QString>("between"); // target of the link "between"; empty: there is none
-    QTest::addColumn<QString>("file");    // where the settings are then
+    QTest::addColumn<QString>("file");    // where the settings end up
     QTest::addColumn<bool>("isThere");
 
     QTest::newRow("beside it") << "real.cfg"
@@ -445,7 +445,7 @@ void tst_TorkConfigFileReplace::device_data()
     QTest::addColumn<QString>("device");
     QTest::addColumn<bool>("result");
     QTest::addColumn<QString>("error");
-    QTest::newRow("takes all") << "/dev/null" << true << InPlace("/dev/null", ENODEV);
+    QTest::newRow("accepts everything") << "/dev/null" << true << InPlace("/dev/null", ENODEV);
     QTest::newRow("is always full") << "/dev/full" << false << Unable("/dev/full", ENOSPC);
 }
 
@@ -453,7 +453,7 @@ void tst_TorkConfigFileReplace::device()
 {
     QFETCH(QString, device);
     if (!QFile::exists(device))
-        QSKIP("There is no such device.");
+        QSKIP("This system has no such device.");
     const Saved saved = SaveNew(device);
     QTEST(saved.result, "result");
     QTEST(saved.error, "error");
@@ -461,7 +461,7 @@ void tst_TorkConfigFileReplace::device()
     QVERIFY(!QFile::exists(device + ".saving"));
 }
 
-// What may not be written is not replaced either.
+// What may not be written may not be replaced either.
 void tst_TorkConfigFileReplace::readOnlyFile()
 {
     QVERIFY(TestFiles::write(path(), oldBytes));
@@ -491,7 +491,7 @@ void tst_TorkConfigFileReplace::newFileInReadOnlyFolder()
     QCOMPARE(TestFiles::listing(m_folder->path()), QStringList());
 }
 
-// As in the system's temporary folder: everybody makes files, only the owner replaces them.
+// As in the system's temporary folder: everybody may create files, only the owner may replace them.
 void tst_TorkConfigFileReplace::foldersWithStickyBit()
 {
     QVERIFY(TestFiles::write(path(), oldBytes));
@@ -568,7 +568,7 @@ void tst_TorkConfigFileReplace::folderInTheNewFilesPlace()
 
 namespace {
 
-// A save that is under way until this object goes, or until it is told to end.
+// A save that is in progress while this object lives, or until it is told to end.
 class OtherSave
 {
 public:
@@ -625,7 +625,7 @@ void tst_TorkConfigFileReplace::givesUpOnAnotherSave()
              QStringList({"viewer.cfg: old\n", "viewer.cfg.saving: half"}));
 }
 
-// Whoever reads meanwhile finds a whole file, and no save takes another's file away.
+// A concurrent reader finds a complete file, and no save removes another's file.
 void tst_TorkConfigFileReplace::manySavesAtOnce()
 {
     QVERIFY(SaveNew(path()).result);

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Which values and names come back from a save and a load without an encoding, and what happens to
-// the rest of the file: the warning in docs/config-file.md, row by row.
+// Which values and names survive a save and a load without an encoding, and what happens to the
+// rest of the file: the warning in docs/config-file.md, row by row.
 
 #include "common/config/TorkConfigFile.h"
 #include "common/config/TorkConfigText.h"
@@ -31,8 +31,8 @@ namespace {
 
 enum Fate {
     Same,    // comes back
-    Changed, // comes back as something else, and the rest of the file as it was
-    Lost,    // does not come back, the rest of the file does
+    Changed, // comes back as something else; the rest of the file is unchanged
+    Lost,    // does not come back; the rest of the file does
     Refused  // the load fails, and all later sections are lost
 };
 
@@ -44,7 +44,7 @@ QString Read(TorkConfigFile& settings, QString const& section, QString const& ke
     return value;
 }
 
-// What became of the item, by what is there now.
+// What became of the item, judging by what is there now.
 Fate FateOf(bool loaded, QString const& stored, QString const& wanted)
 {
     if (!loaded)
@@ -56,10 +56,10 @@ Fate FateOf(bool loaded, QString const& stored, QString const& wanted)
 
 } // namespace
 
-// The section "Later" comes behind what is tested.
+// The section "Later" comes after the one under test.
 bool tst_TorkConfigFileRoundTrip::saveAndLoad(TorkConfigFile& saved, TorkConfigFile& loaded) const
 {
-    const MessageCapture messages; // the reader complains of what it refuses
+    const MessageCapture messages; // the reader complains about what it refuses
     saved.SetFileName(m_folder.filePath("settings.cfg"));
     saved.WriteItem("Later", "key", "still here");
     saved.Save();

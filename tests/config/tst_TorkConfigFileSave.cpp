@@ -161,7 +161,7 @@ void tst_TorkConfigFileSave::save_data()
 
     QTest::newRow("no section") << usual << items({})
                                 << QByteArray("<VelocorSettings>\n</VelocorSettings>\n");
-    QTest::newRow("root element of its own")
+    QTest::newRow("its own root element")
         << "LogSettings" << items({"k", "v"})
         << QByteArray("<LogSettings>\n<s>\n<k>v</k>\n</s>\n</LogSettings>\n");
     QTest::newRow("empty root element name") << "" << items({}) << QByteArray("<>\n</>\n");
@@ -209,7 +209,7 @@ void tst_TorkConfigFileSave::save_data()
                   "?>1 ?</?"
                   "?>\n");
 
-    // Key, value and key are put in one after the other, each at the lowest marker left by then.
+    // Key, value and key are substituted one at a time, each at the lowest marker left by then.
     QTest::newRow("value holds %1") << usual << items({"k", "%1"}) << inside("<k>k</%3>\n");
     QTest::newRow("value holds %2") << usual << items({"k", "a%2b"}) << inside("<k>akb</%3>\n");
     QTest::newRow("value holds %3") << usual << items({"k", "%3"}) << inside("<k>k</k>\n");

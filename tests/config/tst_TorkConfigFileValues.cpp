@@ -30,7 +30,7 @@ QString Stored(TorkConfigFile& file, QString const& section, QString const& key)
     return text;
 }
 
-// Of several calls, each of which is made.
+// For several calls, each of which must be made.
 bool Any(std::initializer_list<bool> results)
 {
     return std::max(results);
@@ -73,8 +73,8 @@ private slots:
 
     void intComesBack_data();
     void intComesBack();
-    void colourComesBack_data();
-    void colourComesBack();
+    void colorComesBack_data();
+    void colorComesBack();
     void fontComesBack();
 };
 
@@ -106,20 +106,20 @@ void tst_TorkConfigFileValues::written_data()
     QTest::newRow("true") << truth(true) << "yes";
     QTest::newRow("false") << truth(false) << "no";
 
-    const auto colour = [](QColor const& value) {
+    const auto color = [](QColor const& value) {
         return Action([=](TorkConfigFile& f) {
             QColor given = value;
             return f.WriteColor("s", "k", given) && given == value;
         });
     };
-    QTest::newRow("colour") << colour(QColor(255, 128, 0)) << "255,128,0";
-    QTest::newRow("transparent colour: the same without alpha")
-        << colour(QColor(255, 128, 0, 0)) << "255,128,0";
-    QTest::newRow("half transparent colour") << colour(QColor(1, 2, 3, 127)) << "1,2,3";
-    QTest::newRow("black") << colour(QColor(Qt::black)) << "0,0,0";
-    QTest::newRow("white") << colour(QColor(Qt::white)) << "255,255,255";
-    QTest::newRow("colour given by hue") << colour(QColor::fromHsv(120, 255, 255)) << "0,255,0";
-    QTest::newRow("invalid colour") << colour(QColor()) << "0,0,0";
+    QTest::newRow("color") << color(QColor(255, 128, 0)) << "255,128,0";
+    QTest::newRow("transparent color: the same without alpha")
+        << color(QColor(255, 128, 0, 0)) << "255,128,0";
+    QTest::newRow("half transparent color") << color(QColor(1, 2, 3, 127)) << "1,2,3";
+    QTest::newRow("black") << color(QColor(Qt::black)) << "0,0,0";
+    QTest::newRow("white") << color(QColor(Qt::white)) << "255,255,255";
+    QTest::newRow("color given by hue") << color(QColor::fromHsv(120, 255, 255)) << "0,255,0";
+    QTest::newRow("invalid color") << color(QColor()) << "0,0,0";
 
     const auto size = [](QSize const& value) {
         return Action([=](TorkConfigFile& f) {
@@ -180,12 +180,12 @@ void tst_TorkConfigFileValues::namesLoseTheirBlanks_data()
         bool value = false;
         return f.ReadBool(section, key, false, value) && value;
     });
-    QTest::newRow("colour") << Action([=](TorkConfigFile& f) {
-        QColor colour(1, 2, 3);
-        return f.WriteColor(section, key, colour);
+    QTest::newRow("color") << Action([=](TorkConfigFile& f) {
+        QColor color(1, 2, 3);
+        return f.WriteColor(section, key, color);
     }) << "1,2,3" << Action([=](TorkConfigFile& f) {
-        QColor colour;
-        return f.ReadColor(section, key, colour) && colour == QColor(1, 2, 3);
+        QColor color;
+        return f.ReadColor(section, key, color) && color == QColor(1, 2, 3);
     });
     QTest::newRow("size") << Action([=](TorkConfigFile& f) {
         QSize size(4, 5);
@@ -231,9 +231,9 @@ void tst_TorkConfigFileValues::nullKey_data()
         [](TorkConfigFile& f) { return f.WriteItem("s", QString(), 1U); });
     QTest::newRow("bool") << Action(
         [](TorkConfigFile& f) { return f.WriteBool("s", QString(), true); });
-    QTest::newRow("colour") << Action([](TorkConfigFile& f) {
-        QColor colour(Qt::red);
-        return f.WriteColor("s", QString(), colour);
+    QTest::newRow("color") << Action([](TorkConfigFile& f) {
+        QColor color(Qt::red);
+        return f.WriteColor("s", QString(), color);
     });
     QTest::newRow("size") << Action([](TorkConfigFile& f) {
         QSize size(1, 2);
@@ -271,9 +271,9 @@ void tst_TorkConfigFileValues::readersLeaveTheFileAlone_data()
         bool value = false;
         return Any({f.ReadBool("s", "missing", true, value), f.ReadBool("new", "k", true, value)});
     });
-    QTest::newRow("colour") << Action([](TorkConfigFile& f) {
-        QColor colour(Qt::red);
-        return Any({f.ReadColor("s", "missing", colour), f.ReadColor("new", "k", colour)});
+    QTest::newRow("color") << Action([](TorkConfigFile& f) {
+        QColor color(Qt::red);
+        return Any({f.ReadColor("s", "missing", color), f.ReadColor("new", "k", color)});
     });
     QTest::newRow("size") << Action([](TorkConfigFile& f) {
         QSize size(1, 2);
@@ -409,7 +409,7 @@ void tst_TorkConfigFileValues::readBool_data()
         QTest::addRow("\"%s\" is false", no) << no << false;
     QTest::newRow("empty is false") << "" << false;
     QTest::newRow("blank is false") << " " << false;
-    QTest::newRow("line end behind is false") << "yes\n" << false;
+    QTest::newRow("trailing line end is false") << "yes\n" << false;
 }
 
 void tst_TorkConfigFileValues::readBool()
@@ -419,7 +419,7 @@ void tst_TorkConfigFileValues::readBool()
     TorkConfigFile file{QString()};
     file.WriteItem("s", "k", stored);
 
-    // Neither the default nor what the value held before shows through.
+    // Neither the default nor the previous value shows through.
     bool value = !expected;
     QVERIFY(file.ReadBool("s", "k", !expected, value));
     QCOMPARE(value, expected);
@@ -473,7 +473,7 @@ void tst_TorkConfigFileValues::readColor_data()
     QTest::newRow("minus in front") << "-1,2,3" << false << untouched;
     QTest::newRow("other separator") << "1;2;3" << false << untouched;
     QTest::newRow("backslash does not separate") << "1\\2\\3" << false << untouched;
-    QTest::newRow("colour name") << "red" << false << untouched;
+    QTest::newRow("color name") << "red" << false << untouched;
     QTest::newRow("hexadecimal name") << "#ff0000" << false << untouched;
     QTest::newRow("empty") << "" << false << untouched;
     QTest::newRow("missing") << QString() << false << untouched;
@@ -486,13 +486,13 @@ void tst_TorkConfigFileValues::readColor()
     QFETCH(QColor, expected);
     TorkConfigFile file{QString()};
     file.WriteItem("s", "k", stored);
-    if (!expected.isValid()) // the toolkit's own range check
+    if (!expected.isValid()) // Qt's own range check
         QTest::ignoreMessage(QtWarningMsg, "QColor::setRgb: RGB parameters out of range");
 
-    QColor colour(9, 8, 7, 6);
-    QTEST(file.ReadColor("s", "k", colour), "found");
-    QCOMPARE(colour, expected);
-    QCOMPARE(colour.alpha(), expected.alpha());
+    QColor color(9, 8, 7, 6);
+    QTEST(file.ReadColor("s", "k", color), "found");
+    QCOMPARE(color, expected);
+    QCOMPARE(color.alpha(), expected.alpha());
 }
 
 void tst_TorkConfigFileValues::readSize_data()
@@ -548,10 +548,10 @@ void tst_TorkConfigFileValues::readFont_data()
                            << QFont("Helvetica", 12);
     QTest::newRow("with attributes") << bold.toString() << QByteArray() << true << bold;
     QTest::newRow("missing") << QString() << QByteArray() << false << untouched;
-    QTest::newRow("three fields are no font, and yet the key was found")
+    QTest::newRow("three fields are not a font, but the key was found")
         << "a,b,c" << QByteArray("QFont::fromString: Invalid description 'a,b,c'") << true
         << untouched;
-    QTest::newRow("empty is no font, and yet the key was found")
+    QTest::newRow("empty is not a font, but the key was found")
         << "" << QByteArray("QFont::fromString: Invalid description '(empty)'") << true
         << untouched;
 }
@@ -562,7 +562,7 @@ void tst_TorkConfigFileValues::readFont()
     QFETCH(QByteArray, warning);
     TorkConfigFile file{QString()};
     file.WriteItem("s", "k", stored);
-    if (!warning.isEmpty()) // the toolkit's own
+    if (!warning.isEmpty()) // Qt's own
         QTest::ignoreMessage(QtWarningMsg, warning.constData());
 
     QFont font("Times", 9);
@@ -587,7 +587,7 @@ void tst_TorkConfigFileValues::intComesBack()
     QCOMPARE(value, number);
 }
 
-void tst_TorkConfigFileValues::colourComesBack_data()
+void tst_TorkConfigFileValues::colorComesBack_data()
 {
     QTest::addColumn<QColor>("written");
     QTest::addColumn<QColor>("read");
@@ -596,14 +596,14 @@ void tst_TorkConfigFileValues::colourComesBack_data()
     QTest::newRow("transparent comes back opaque") << QColor(1, 2, 3, 0) << QColor(1, 2, 3, 255);
 }
 
-void tst_TorkConfigFileValues::colourComesBack()
+void tst_TorkConfigFileValues::colorComesBack()
 {
     QFETCH(QColor, written);
     TorkConfigFile file{QString()};
     QVERIFY(file.WriteColor("s", "k", written));
-    QColor colour;
-    QVERIFY(file.ReadColor("s", "k", colour));
-    QTEST(colour, "read");
+    QColor color;
+    QVERIFY(file.ReadColor("s", "k", color));
+    QTEST(color, "read");
 }
 
 void tst_TorkConfigFileValues::fontComesBack()

@@ -175,13 +175,13 @@ void tst_TorkConfigText::isPlainName_data()
     QTest::addColumn<bool>("expected");
     QTest::newRow("letters") << "abc" << true;
     QTest::newRow("underscore first") << "_a" << true;
-    QTest::newRow("digits behind") << "a1.b-c" << true;
+    QTest::newRow("trailing digits") << "a1.b-c" << true;
     QTest::newRow("digit first") << "1a" << false;
     QTest::newRow("blank") << "a b" << false;
     QTest::newRow("markup") << "a<" << false;
     QTest::newRow("empty") << "" << false;
     QTest::newRow("umlaut") << QString::fromUtf8("\xC3\xA4") << false;
-    QTest::newRow("line feed behind") << "a\n" << false;
+    QTest::newRow("trailing line feed") << "a\n" << false;
 }
 
 void tst_TorkConfigText::isPlainName()

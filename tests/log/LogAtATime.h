@@ -7,7 +7,7 @@
 
 #include <ctime>
 
-/// A log at a moment that a test sets.
+/// A log at a moment set by the test.
 namespace LogAtATime {
 
 /// Three digits of milliseconds look the same in every Qt, however it formats a single z.
@@ -19,7 +19,7 @@ inline const QDateTime& now()
 
 const char stampOfNow[] = "2021-03-04 05:06:07.123";
 
-/// Null: not set. Qt sees it at once; the C library does after tzset() only.
+/// Null: not set. Qt notices a change immediately; the C library only after tzset().
 inline void setZone(QByteArray const& zone)
 {
     if (zone.isNull())

@@ -10,10 +10,10 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-/// What several tests of log files share.
+/// What several tests of log files have in common.
 namespace LogFileTest {
 
-/// Makes what TestFiles::listing() would show.
+/// Builds what TestFiles::listing() would return.
 inline void populate(QString const& folder, QStringList const& entries)
 {
     for (QString const& entry : entries) {
@@ -26,7 +26,7 @@ inline void populate(QString const& folder, QStringList const& entries)
     }
 }
 
-/// The reason that the toolkit itself gives.
+/// The reason as Qt itself reports it.
 inline QString reasonNotToOpen(QString const& path)
 {
     QFile file(path);
@@ -34,7 +34,7 @@ inline QString reasonNotToOpen(QString const& path)
     return opened ? QString() : file.errorString();
 }
 
-/// Makes what an entry of the form "name |" (a pipe), "name -> target" or populate()'s says.
+/// Creates the entry "name |" (a pipe), "name -> target", or whatever populate() accepts.
 inline void make(QString const& folder, QString const& entry)
 {
     const QString path = folder + entry.section(' ', 0, 0);

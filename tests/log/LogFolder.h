@@ -10,7 +10,7 @@
 #include <QTemporaryDir>
 #include <QtTest>
 
-/// A folder for one log and its settings, empty at first. It stays when the test has failed.
+/// A folder for one log and its settings, initially empty. It is kept when the test has failed.
 class LogFolder
 {
 public:
@@ -28,10 +28,10 @@ public:
     /// Everything, ending in "/".
     QString root() const { return m_folder.path() + '/'; }
 
-    /// The log directory, ending in "/". It is there.
+    /// The log directory, ending in "/". It exists.
     QString logs() const { return root() + "logs/"; }
 
-    /// A settings file outside the log directory. It is not there at first.
+    /// A settings file outside the log directory. It does not exist at first.
     QString settingsFile() const { return root() + "settings.cfg"; }
 
     /// The text of a settings file with these values.
@@ -43,8 +43,8 @@ public:
         return text + "</config>\n</LogSettings>\n";
     }
 
-    /// Sets a log up from a settings file. What is not among the values has the file's default,
-    /// but the stamp, which is the letter T, so that entries can be told in advance.
+    /// Sets a log up from a settings file. Missing values have the file's defaults, except that the
+    /// stamp is the letter T, which makes entries predictable.
     void configure(TorkLog& log, Settings values) const
     {
         if (!values.contains("dateTimeFormat"))
@@ -54,7 +54,7 @@ public:
         QVERIFY(log.loadPreferences());
     }
 
-    /// A log in the log directory with this base name and size limit, switched on.
+    /// A log in the log directory with this base name and size limit, enabled.
     void prepare(TorkLog& log, QString const& prefix, unsigned int maxLogFileSize = 1000000) const
     {
         log.setOutputPath(logs());
@@ -62,7 +62,7 @@ public:
                   {{"filePrefix", prefix}, {"maxLogFileSize", QString::number(maxLogFileSize)}});
     }
 
-    /// What lies in the log directory: see TestFiles::listing().
+    /// The contents of the log directory: see TestFiles::listing().
     QStringList listing() const { return TestFiles::listing(logs()); }
 
 private:

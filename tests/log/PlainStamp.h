@@ -8,7 +8,7 @@
 #include <QLocale>
 #include <QString>
 
-/// The stamp of an entry in plain words: what Qt makes of the format; in the C locale where Latin-1
+/// The plain version of an entry's stamp: Qt's result for the format; in the C locale where Latin-1
 /// lacks a character of that.
 inline QByteArray plainStamp(QDateTime const& time, QString const& format)
 {

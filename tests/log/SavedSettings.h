@@ -9,7 +9,7 @@
 
 #include <algorithm>
 
-/// The text of saved log settings, and what a log says of its own.
+/// The text of saved log settings, and what a log reports about its own.
 namespace SavedSettings {
 
 const char stampOfNow[] = "2021-03-04 05:06:07.123";
@@ -31,7 +31,7 @@ inline QStringList names(QString const& folder)
     return result;
 }
 
-/// A settings file with its items in alphabetical order: nobody promises theirs.
+/// A settings file with its items in alphabetical order, as their real order is unspecified.
 inline QByteArray inOrder(QByteArray const& text)
 {
     const QByteArray start = "<LogSettings>\n<config>\n";
@@ -73,7 +73,7 @@ inline QByteArray config(QByteArray const& items)
     return "<LogSettings>\n<config>\n" + items + "</config>\n</LogSettings>\n";
 }
 
-/// What the getters and the file name tell of the settings.
+/// The settings as the getters and the file name report them.
 inline QString described(TorkLog& log)
 {
     const auto onOff = [](bool on) {

@@ -83,7 +83,7 @@ void tst_TorkLogEntries::entry_data()
     QTest::newRow("error") << 3 << "x" << false << QByteArray("T Error x\n");
     QTest::newRow("fatal") << 4 << "x" << false << QByteArray("T Fatal x\n");
     QTest::newRow("unknown severity has no name") << 7 << "x" << false << QByteArray("T  x\n");
-    QTest::newRow("just behind the last severity") << 5 << "x" << false << QByteArray("T  x\n");
+    QTest::newRow("just beyond the last severity") << 5 << "x" << false << QByteArray("T  x\n");
     QTest::newRow("negative severity") << -1 << "x" << false << QByteArray("T  x\n");
     QTest::newRow("elapsed time") << 2 << "x" << true << QByteArray("T Warning dT:[0] x\n");
     QTest::newRow("elapsed time, unknown severity")
@@ -222,8 +222,8 @@ void tst_TorkLogEntries::severityName_data()
     QTest::newRow("2") << 2 << "Warning";
     QTest::newRow("3") << 3 << "Error";
     QTest::newRow("4") << 4 << "Fatal";
-    QTest::newRow("behind the last") << 5 << "";
-    QTest::newRow("far behind") << 2147483647 << "";
+    QTest::newRow("after the last") << 5 << "";
+    QTest::newRow("far beyond") << 2147483647 << "";
     QTest::newRow("negative") << -1 << "";
 }
 
@@ -295,7 +295,7 @@ void tst_TorkLogEntries::severityNameIsTranslated()
 
 namespace {
 
-// Cases for a process of their own; the first argument is the log directory.
+// Cases that need their own process; the first argument is the log directory.
 
 } // namespace
 

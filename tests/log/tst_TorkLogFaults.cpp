@@ -56,7 +56,7 @@ void tst_TorkLogFaults::cleanup()
 
 namespace {
 
-// More than a pipe holds; then something that is a file takes its place.
+// More than a pipe holds; then a regular file replaces it.
 int writesToNoFile(QStringList const& arguments)
 {
     TorkLog log(arguments.at(0));
@@ -156,13 +156,13 @@ void tst_TorkLogFaults::directoryRemovedWhileOpen()
     folder.prepare(log, "app");
     log.write(QStringLiteral("1\n"));
 
-    // The open file lives on without a name.
+    // The open file remains without a name.
     QVERIFY(QDir(folder.logs()).removeRecursively());
     log.write(QStringLiteral("2\n"));
     QCOMPARE(log.errorString(), QString());
     QVERIFY(!QFile::exists(folder.logs()));
 
-    // Opened anew, it is made anew.
+    // Reopening creates the file again.
     QVERIFY(log.close());
     log.write(QStringLiteral("3\n"));
     QCOMPARE(folder.listing(), QStringList("app.log: 3\n"));
@@ -188,8 +188,8 @@ namespace {
 const QFileDevice::Permissions readOnly = QFileDevice::ReadOwner | QFileDevice::ExeOwner;
 const QFileDevice::Permissions writable = readOnly | QFileDevice::WriteOwner;
 
-// Writes while the permissions are missing and once more when they are back; tells on the standard
-// output the reason of the failure and what lies in the directory each time.
+// Writes while the permissions are missing and once more when they are restored; prints the reason
+// of the failure and the contents of the directory each time.
 int writesWithoutPermission(QStringList const& arguments)
 {
     if (!ProcessLimits::becomeOrdinaryUser())
@@ -227,7 +227,7 @@ void tst_TorkLogFaults::withoutPermission_data()
     QTest::newRow("file") << "app.log" << QStringList("app.log: 1234\n")
                           << QByteArray("Permission denied\napp.log: 1234\n\napp.log: two\n\n\n")
                           << QByteArray("\"two\\n\"\n");
-    // Nothing can be moved out of the way, so the old content is written over.
+    // Nothing can be moved out of the way, so the old content is overwritten.
     QTest::newRow("directory with a full file")
         << "" << QStringList({"app.log: 12345678\n", "app.log.1: a"})
         << QByteArray("\napp.log: one\n5678\n|app.log.1: a\n"
@@ -291,7 +291,7 @@ void tst_TorkLogFaults::diskFull_data()
     QTest::addColumn<QString>("then");
     QTest::addColumn<QByteArray>("expected");
 
-    QTest::newRow("for good") << "for good" << allLines().left(4096);
+    QTest::newRow("permanently") << "permanently" << allLines().left(4096);
     QTest::newRow("until there is room again") << "then room" << allLines() + "last\n";
 }
 

@@ -319,10 +319,11 @@ void tst_TorkLogFiles::destructorClosesTheFile()
     QCOMPARE(folder.listing(), QStringList("app.log: x\n"));
 }
 
-// A missing directory is made, after its path has lost the last character, whatever that is.
+// A missing directory is created, after the last character of its path, whatever it is, has been
+// removed.
 void tst_TorkLogFiles::directory_data()
 {
-    QTest::addColumn<QString>("path"); // %1 stands for the folder of the test
+    QTest::addColumn<QString>("path"); // %1 is replaced with the test's folder
     QTest::addColumn<QStringList>("expected");
 
     QTest::newRow("there") << "%1there/" << QStringList({"there/", "there/app.log: x\n"});
@@ -364,7 +365,7 @@ void tst_TorkLogFiles::directory()
     QTEST(TestFiles::listing(work), "expected");
 }
 
-// No directory can be made of an empty path, about which the toolkit complains, but the file can.
+// No directory can be created from an empty path, which Qt complains about, but the file can.
 void tst_TorkLogFiles::emptyPathIsTheWorkingDirectory()
 {
     LogFolder folder;
@@ -377,7 +378,7 @@ void tst_TorkLogFiles::emptyPathIsTheWorkingDirectory()
     log.write(QStringLiteral("1\n"));
     QCOMPARE(folder.listing(), QStringList("app.log: 1\n"));
 
-    // Now the file is there, and the directory is not asked for.
+    // Now the file exists, and the directory is not needed.
     MessageCapture messages;
     QVERIFY(log.close());
     log.write(QStringLiteral("2\n"));
@@ -429,7 +430,7 @@ void tst_TorkLogFiles::locateReturnsTheFileWhereEntriesEnd()
     log.write(QStringLiteral("6\n"));
     QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("12\n34\n56\n"));
 
-    // Whoever has it may use it again.
+    // Anyone who holds it may use it again.
     log.write(QStringLiteral("7\n"));
     QCOMPARE(file->pos(), 11);
     file->write("8\n");
@@ -503,7 +504,7 @@ void tst_TorkLogFiles::openEmptyFileTakesAnything()
     log.write(QStringLiteral("beyond the limit\n"));
     QCOMPARE(folder.listing(), QStringList("app.log: beyond the limit\n"));
 
-    // Emptied by somebody else: the entry goes to the end, without a gap of NULs before it.
+    // Truncated by another program: the entry goes to the end, without a gap of NULs before it.
     QVERIFY(QFile::resize(folder.logs() + "app.log", 0));
     log.write(QStringLiteral("and once more\n"));
     QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("and once more\n"));
@@ -533,7 +534,7 @@ void tst_TorkLogFiles::closedFileIsRotatedOnReopening()
     QCOMPARE(folder.listing(), QStringList({"app.log: 2\n", "app.log.1: 1\n12345678\n"}));
 }
 
-// Every line that is read empties the file and writes all that is kept so far once more.
+// Every line that is read truncates the file and rewrites everything kept so far.
 void tst_TorkLogFiles::trimming_data()
 {
     QTest::addColumn<unsigned int>("limit");
@@ -541,7 +542,7 @@ void tst_TorkLogFiles::trimming_data()
     QTest::addColumn<QStringList>("lines");
     QTest::addColumn<QByteArray>("after");
 
-    QTest::newRow("reads on behind the last entry")
+    QTest::newRow("keeps reading after the last entry")
         << 40u << QByteArray("0123456789\nabcdefghij\nABCDEFGHIJ\n")
         << QStringList({"xxxx\n", "yyyyyyyy\n"})
         << QByteArray("abcdefghij"

@@ -73,10 +73,10 @@ void tst_TorkLogLifetime::cleanup()
     TestClock::release();
 }
 
-// The log directory is made before the settings are saved into it, and then for the first entry.
+// The log directory is created before the settings are saved into it, and then for the first entry.
 void tst_TorkLogLifetime::firstStart_data()
 {
-    QTest::addColumn<QString>("path"); // %1 stands for the folder of the test
+    QTest::addColumn<QString>("path"); // %1 is replaced with the test's folder
     QTest::addColumn<QString>("settings");
     QTest::addColumn<QStringList>("afterStart");
     QTest::addColumn<QStringList>("afterEntry");
@@ -252,7 +252,7 @@ void tst_TorkLogLifetime::initializeTwice()
     QVERIFY(installed == m_handler); // not even the message handler is installed again
 }
 
-// Settings that are there win over what the start gives.
+// Existing settings take precedence over the arguments of the start.
 void tst_TorkLogLifetime::laterStart_data()
 {
     QTest::addColumn<QByteArray>("text");
@@ -377,7 +377,7 @@ void tst_TorkLogLifetime::malformedSettingsAtStart()
     QCOMPARE(described(*log), QString("3 1000000 on off off logdata.log"));
     QCOMPARE(TestFiles::read(settings), text);
 
-    // What happened is told in three entries of one line each.
+    // What happened is reported in three entries of one line each.
     const QList<QByteArray> entries = TestFiles::read(folder.logs() + "app.log").split('\n');
     QCOMPARE(entries.size(), 4);
     QCOMPARE(entries[0], stamped("Trace Loading configuration from " + settings.toLatin1()));
@@ -394,8 +394,8 @@ namespace {
 
 const QFileDevice::Permissions readOnly = QFileDevice::ReadOwner | QFileDevice::ExeOwner;
 
-// Starts and writes with the settings file or the log directory closed; tells on the standard
-// output what the settings are then, and what lies in the directory in the end.
+// Starts and writes with the settings file or the log directory closed; prints the resulting
+// settings and the final contents of the directory.
 int startsWithoutPermission(QStringList const& arguments)
 {
     if (!ProcessLimits::becomeOrdinaryUser())
@@ -501,7 +501,7 @@ void tst_TorkLogLifetime::shutdownClosesTheFile()
     QCOMPARE(openFiles.entryList(all).size(), before);
 }
 
-// Whoever hears of the end, or logs in it, no longer meets a log.
+// Code that is notified of the end, or logs during it, no longer finds a log.
 void tst_TorkLogLifetime::shutdownClearsThePointerFirst()
 {
     LogFolder folder;

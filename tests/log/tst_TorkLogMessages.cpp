@@ -27,8 +27,8 @@ private slots:
     void messageHandler_data();
     void messageHandler();
     void messageHandlerWithoutLog();
-    void toolkitMessages_data();
-    void toolkitMessages();
+    void qtMessages_data();
+    void qtMessages();
     void fatalMessage();
 
     void echo_data();
@@ -76,7 +76,7 @@ void tst_TorkLogMessages::messageHandler_data()
     QTest::newRow("any other") << 7 << QByteArray("Trace");
 }
 
-// Whatever the context: it is not used.
+// Whatever the context: it is ignored.
 void tst_TorkLogMessages::messageHandler()
 {
     QFETCH(int, type);
@@ -101,7 +101,7 @@ void tst_TorkLogMessages::messageHandlerWithoutLog()
     QVERIFY(QDir::setCurrent("/"));
 }
 
-void tst_TorkLogMessages::toolkitMessages_data()
+void tst_TorkLogMessages::qtMessages_data()
 {
     QTest::addColumn<int>("type");
     QTest::addColumn<QByteArray>("expected");
@@ -111,11 +111,10 @@ void tst_TorkLogMessages::toolkitMessages_data()
     QTest::newRow("info") << 2 << QByteArray("Trace a");
     QTest::newRow("warning") << 3 << QByteArray("Warning a");
     QTest::newRow("critical") << 4 << QByteArray("Error a");
-    QTest::newRow("of the toolkit itself")
-        << 5 << QByteArray("Warning QDir::mkpath: Empty or null file name");
+    QTest::newRow("Qt's own") << 5 << QByteArray("Warning QDir::mkpath: Empty or null file name");
 }
 
-void tst_TorkLogMessages::toolkitMessages()
+void tst_TorkLogMessages::qtMessages()
 {
     QFETCH(int, type);
     QFETCH(QByteArray, expected);
@@ -202,7 +201,7 @@ int echoesNothing(QStringList const& arguments)
     return 0;
 }
 
-// The toolkit complains about the empty path while the log's own lock is held.
+// Qt complains about the empty path while the log's own lock is held.
 int warnsUnderTheLock(QStringList const& arguments)
 {
     TorkLog* const log = startLog(arguments.at(0));
@@ -308,7 +307,7 @@ void tst_TorkLogMessages::echoStaysOutOfTheLog()
                                                              stamped("Warning not echoed\n"));
 }
 
-// Also where it was not installed before: that is how the toolkit's messages find back.
+// Also where it was not installed before: that is how Qt messages reach the log again.
 void tst_TorkLogMessages::echoInstallsTheMessageHandler()
 {
     LogFolder folder;
@@ -347,7 +346,7 @@ void tst_TorkLogMessages::messageUnderTheLock_data()
     QTest::newRow("entry with echo") << "echo" << complaint + '"' + stamped("Warning x\\n\"\n");
 }
 
-// It goes to the toolkit's default output, once, and the entry is written.
+// It goes to Qt's default output, once, and the entry is written.
 void tst_TorkLogMessages::messageUnderTheLock()
 {
     QFETCH(QString, kind);
@@ -361,7 +360,7 @@ void tst_TorkLogMessages::messageUnderTheLock()
              QStringList("app.log: " + stamped("Warning x\n") + stamped("Warning later\n")));
 }
 
-// A message that is raised there is an entry like any other.
+// A message that is raised there is an ordinary entry.
 void tst_TorkLogMessages::entryIsBuiltOutsideTheLock()
 {
     LogFolder folder;

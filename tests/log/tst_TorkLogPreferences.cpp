@@ -216,7 +216,7 @@ void tst_TorkLogPreferences::saveReplacesTheFile()
     QCOMPARE(inOrder(TestFiles::read(folder.settingsFile())), savedByStart("no", ""));
 }
 
-// Saving succeeds in every case, as far as its result tells.
+// Saving succeeds in every case, according to its result.
 void tst_TorkLogPreferences::saveFails_data()
 {
     QTest::addColumn<QString>("name");
@@ -237,7 +237,7 @@ void tst_TorkLogPreferences::saveFails()
     QCOMPARE(TestFiles::listing(folder.root()), QStringList("logs/"));
 }
 
-// Before each load 33 files of 2048 bytes are set: what a number that is none leaves.
+// Before each load 33 files of 2048 bytes are set: what an invalid number leaves unchanged.
 void tst_TorkLogPreferences::load_data()
 {
     QTest::addColumn<QByteArray>("text");
@@ -356,7 +356,7 @@ void tst_TorkLogPreferences::textsInForce()
     QCOMPARE(log.filePrefix(), QString("my"));
 }
 
-// Entries show what is in force.
+// Entries show the settings in effect.
 void tst_TorkLogPreferences::loadedTexts()
 {
     LogFolder folder;
@@ -391,7 +391,7 @@ void tst_TorkLogPreferences::loadOfMissingFile()
     QCOMPARE(TestFiles::listing(folder.root()), QStringList("logs/"));
 }
 
-// What was read before the fault counts, the rest has its defaults.
+// What was read before the fault is kept, the rest has its defaults.
 void tst_TorkLogPreferences::loadOfMalformedFile_data()
 {
     QTest::addColumn<QByteArray>("text");
@@ -414,7 +414,7 @@ void tst_TorkLogPreferences::loadOfMalformedFile_data()
         "<maxLogFiles>3<</config></LogSettings>",
         "3 1000000 off off off app.log");
     row("second root element", "<LogSettings></LogSettings><x/>", loadDefaults);
-    row("text behind the root element", "<LogSettings></LogSettings>x", loadDefaults);
+    row("text after the root element", "<LogSettings></LogSettings>x", loadDefaults);
     row("bare ampersand",
         "<LogSettings><config><maxLogFiles>3</maxLogFiles><x>a & b</x></config></LogSettings>",
         "3 1000000 on off off logdata.log");
@@ -492,8 +492,8 @@ void tst_TorkLogPreferences::unknownOperation_data()
 {
     QTest::addColumn<int>("operation");
 
-    QTest::newRow("behind the last") << 2;
-    QTest::newRow("far behind") << 2147483647;
+    QTest::newRow("after the last") << 2;
+    QTest::newRow("far beyond") << 2147483647;
     QTest::newRow("negative") << -1;
 }
 

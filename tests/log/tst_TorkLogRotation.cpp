@@ -31,8 +31,8 @@ private slots:
     void rotationInOddDirectories();
     void onlyOwnFiles_data();
     void onlyOwnFiles();
-    void neighboursAloneAreNotTheLog_data();
-    void neighboursAloneAreNotTheLog();
+    void neighborsAloneAreNotTheLog_data();
+    void neighborsAloneAreNotTheLog();
 
     void hiddenNames_data();
     void hiddenNames();
@@ -50,7 +50,7 @@ private:
 
 namespace {
 
-// A limit that every current file is beyond.
+// A limit that every current file exceeds.
 const unsigned int tight = 1;
 
 } // namespace
@@ -103,8 +103,8 @@ void tst_TorkLogRotation::rotation_data()
         {current, "app.log.1: a", "app.log.2: b", "app.log.3: c", "app.log.7: g", "app.log.8: h"},
         {becameFirst, "app.log.2: a", "app.log.3: b"});
     row("limit of one", "1", {current, "app.log.1: a"}, {becameFirst});
-    row("limit of none", "0", {current, "app.log.1: a", "app.log.2: b"}, {becameFirst});
-    row("limit of none, none there", "0", {current}, {becameFirst});
+    row("limit of zero", "0", {current, "app.log.1: a", "app.log.2: b"}, {becameFirst});
+    row("limit of zero, no files", "0", {current}, {becameFirst});
     row("negative limit takes number 0 too", "-1", {current, "app.log.0: z", "app.log.1: a"},
         {becameFirst});
 
@@ -128,7 +128,7 @@ void tst_TorkLogRotation::rotation_data()
         {becameFirst, "app.log.+3: p", "app.log.4: t"});
     row("leading zero", "10", {current, "app.log.03: t"}, {becameFirst, "app.log.4: t"});
 
-    // What stands in the way stays, and so does what should have gone there.
+    // What is in the way stays, and so does what should have gone there.
     row("directory in place of number 1", "10", {current, "app.log.1/"}, {"app.log.1/"});
     row("directory in place of number 2", "10", {current, "app.log.1: a", "app.log.2/"},
         {"app.log.1: a", "app.log.2/"});
@@ -141,8 +141,7 @@ void tst_TorkLogRotation::rotation_data()
         {current, "app.log.5: e", "app.log.2147483647: h"}, {becameFirst, "app.log.6: e"});
     row("one below the highest at the highest limit", "2147483647",
         {current, "app.log.2147483646: h"}, {becameFirst, "app.log.2147483647: h"});
-    row("beyond all numbers is none", "10",
-        {current, "app.log.2147483648: h", "app.log.99999999999: i"},
+    row("number out of range", "10", {current, "app.log.2147483648: h", "app.log.99999999999: i"},
         {becameFirst, "app.log.2147483648: h", "app.log.99999999999: i"});
 }
 
@@ -162,7 +161,7 @@ void tst_TorkLogRotation::rotation()
     QCOMPARE(messages.texts(), QStringList());
 }
 
-// Directory and name run together, so that nothing is shifted; removing and copying work.
+// Directory and name are concatenated, so nothing is shifted; removing and copying work.
 void tst_TorkLogRotation::rotationWithoutFinalSlash_data()
 {
     QTest::addColumn<QStringList>("before");
@@ -223,11 +222,11 @@ void tst_TorkLogRotation::rotationInOddDirectories()
              QStringList({"app.log: new\n", "app.log.1: old", "app.log.2: a"}));
 }
 
-// The neighbours are what the toolkit's wildcards would take for the log's own files, and more.
+// The neighbors match what Qt's wildcards would take for the log's own files, and more.
 void tst_TorkLogRotation::onlyOwnFiles_data()
 {
     QTest::addColumn<QString>("prefix");
-    QTest::addColumn<QStringList>("neighbours");
+    QTest::addColumn<QStringList>("neighbors");
 
     QTest::newRow("plain") << "app"
                            << QStringList({"app", "app.1", "app.log1", "app.log-1", "app.logx.1",
@@ -258,13 +257,13 @@ void tst_TorkLogRotation::onlyOwnFiles_data()
 void tst_TorkLogRotation::onlyOwnFiles()
 {
     QFETCH(QString, prefix);
-    QFETCH(QStringList, neighbours);
+    QFETCH(QStringList, neighbors);
     LogFolder folder;
     const QString name = prefix + ".log";
     const QString full(3000, 'f');
     QStringList untouched;
-    for (QString const& neighbour : neighbours)
-        untouched.append(neighbour + ": " + full);
+    for (QString const& neighbor : neighbors)
+        untouched.append(neighbor + ": " + full);
     populate(folder.logs(), untouched);
     populate(folder.logs(), {name + ": " + full, name + ".1: a", name + ".10: j"});
     TorkLog log(folder.logs());
@@ -278,19 +277,19 @@ void tst_TorkLogRotation::onlyOwnFiles()
     QCOMPARE(folder.listing(), TestFiles::sorted(own + untouched));
 }
 
-void tst_TorkLogRotation::neighboursAloneAreNotTheLog_data()
+void tst_TorkLogRotation::neighborsAloneAreNotTheLog_data()
 {
     onlyOwnFiles_data();
 }
 
-void tst_TorkLogRotation::neighboursAloneAreNotTheLog()
+void tst_TorkLogRotation::neighborsAloneAreNotTheLog()
 {
     QFETCH(QString, prefix);
-    QFETCH(QStringList, neighbours);
+    QFETCH(QStringList, neighbors);
     LogFolder folder;
     QStringList untouched;
-    for (QString const& neighbour : neighbours)
-        untouched.append(neighbour + ": n");
+    for (QString const& neighbor : neighbors)
+        untouched.append(neighbor + ": n");
     populate(folder.logs(), untouched);
     TorkLog log(folder.logs());
     folder.prepare(log, prefix);
@@ -300,12 +299,12 @@ void tst_TorkLogRotation::neighboursAloneAreNotTheLog()
     QCOMPARE(folder.listing(), TestFiles::sorted(own + untouched));
 }
 
-// A listing without hidden files never shows such a log: nobody looks at its size, and what is
-// numbered is none of its own.
+// A listing without hidden files never shows such a log: its size is never checked, and its
+// numbered files are not recognized.
 void tst_TorkLogRotation::hiddenNames_data()
 {
     QTest::addColumn<QString>("prefix");
-    QTest::addColumn<bool>("rotates"); // asked for directly
+    QTest::addColumn<bool>("rotates"); // rotation requested directly
     QTest::addColumn<QStringList>("after");
 
     QTest::newRow("full, begins with a dot")
@@ -340,7 +339,7 @@ void tst_TorkLogRotation::hiddenNames()
     QCOMPARE(folder.listing(), after.replaceInStrings("%1", full.mid(4)));
 }
 
-// Whatever lies under a number above the limit goes; only listed files move up, though.
+// Anything with a number above the limit is removed; only listed files move up, though.
 void tst_TorkLogRotation::pruningGoesByName_data()
 {
     QTest::addColumn<QStringList>("before");
@@ -366,7 +365,7 @@ void tst_TorkLogRotation::pruningGoesByName_data()
         << QStringList({"app.log.1", "app.log.3", "app.log.6"});
     QTest::newRow("pipe below a huge number")
         << common + QStringList({"app.log.2147483646: h", "app.log.2147483000 |"}) << usual;
-    QTest::newRow("pipes without a number of their own stay")
+    QTest::newRow("pipes without their own number stay")
         << common +
                QStringList({"app.log.15: o", "app.log.012 |", "app.log.old.12 |", "app.log.x |"})
         << QStringList({"app.log.012", "app.log.1", "app.log.6", "app.log.old.12", "app.log.x"});
@@ -397,7 +396,7 @@ void tst_TorkLogRotation::unfinishedCopies_data()
     QTest::newRow("seven letters") << "app.log.1.aBcXyZz.part: x" << true;
     QTest::newRow("of another number") << "app.log.2.aBcXyZ.part: x" << true;
     QTest::newRow("of another log") << "app2.log.1.aBcXyZ.part: x" << true;
-    QTest::newRow("goes on") << "app.log.1.aBcXyZ.part.gz: x" << true;
+    QTest::newRow("longer extension") << "app.log.1.aBcXyZ.part.gz: x" << true;
     QTest::newRow("other letter case") << "app.log.1.aBcXyZ.PART: x" << true;
     QTest::newRow("link") << "app.log.1.aBcXyZ.part -> app.log" << true;
     QTest::newRow("dangling link") << "app.log.1.aBcXyZ.part -> nowhere" << true;

@@ -186,7 +186,7 @@ void tst_TorkLogSettings::clearKeepsTimeOfLastEntry()
     QCOMPARE(folder.listing(), QStringList("app.log: T Trace dT:[40] x\n"));
 }
 
-// The key is known, but it is neither loaded nor saved, and nothing goes to the console for it.
+// The key is known, but it is neither loaded nor saved, and produces no console output.
 void tst_TorkLogSettings::consoleSwitchIsInert()
 {
     LogFolder folder;
@@ -329,7 +329,7 @@ void tst_TorkLogSettings::settersLeaveSettingsFile()
     QCOMPARE(TestFiles::read(folder.settingsFile()), before);
 }
 
-// Only an enumeration with a fixed type may hold what none of its names stands for.
+// Only an enumeration with a fixed underlying type may have a value without a name.
 void tst_TorkLogSettings::enumerationsTakeAnyNumber()
 {
     const TorkLog::EventSeverity severity{7};

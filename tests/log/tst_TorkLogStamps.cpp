@@ -57,7 +57,7 @@ QDateTime utc(QDate const& date, QTime const& time)
     return QDateTime(date, time, Qt::UTC);
 }
 
-// The whole moment, the same in every Qt.
+// The complete date and time, the same in every Qt.
 const char stampFormat[] = "yyyy-MM-dd hh:mm:ss.zzz";
 
 } // namespace
@@ -126,7 +126,7 @@ void tst_TorkLogStamps::stampFollowsTheClock_data()
 
     QTest::newRow("usual") << "yyyy-MM-dd hh:mm:ss.z";
     QTest::newRow("three digits of milliseconds") << "dd.MM.yyyy HH:mm:ss,zzz";
-    QTest::newRow("two digits of milliseconds are none") << "ss.zz";
+    QTest::newRow("two letters for milliseconds") << "ss.zz";
     QTest::newRow("without leading zeros") << "d.M.yyyy H:m:s.z";
     QTest::newRow("without separators") << "yyyyMMddhhmmsszzz";
     QTest::newRow("year of two digits") << "yy-MM-dd ss";
@@ -146,7 +146,7 @@ void tst_TorkLogStamps::stampFollowsTheClock_data()
     QTest::newRow("longer only in words") << QString(60, '.') + "zsh";
 }
 
-// What is kept from one entry to the next is what Qt would say again.
+// What is cached between entries equals what Qt would return again.
 void tst_TorkLogStamps::stampFollowsTheClock()
 {
     QFETCH(QString, format);
@@ -166,7 +166,7 @@ void tst_TorkLogStamps::stampFollowsTheClock()
     QCOMPARE(TestFiles::read(folder.logs() + "app.log"), expected);
 }
 
-// At one and the same moment, lest a stamp that was made for another format is used again.
+// All at the same moment, so that a stamp cached for another format would show.
 void tst_TorkLogStamps::stampFollowsTheFormat()
 {
     LogFolder folder;
@@ -189,7 +189,7 @@ void tst_TorkLogStamps::stampFollowsTheFormat()
                           "second.log: S Trace 2\nS Trace 5\n"}));
 }
 
-// A dropped entry moves the time of the last entry only.
+// A dropped entry updates only the time of the last entry.
 void tst_TorkLogStamps::stampAfterDroppedEntry()
 {
     LogFolder folder;
@@ -216,7 +216,7 @@ void tst_TorkLogStamps::stampFollowsTheTimeZone_data()
 
     const QByteArray berlin("Europe/Berlin");
     const QByteArray tokyo("Asia/Tokyo");
-    // Longer than what is kept, and the same up to there.
+    // Longer than what is cached, and equal up to there.
     const QByteArray longWay(":/usr/share/zoneinfo" + QByteArray("/.").repeated(40));
     const QByteArray inBerlin("2021-03-04 13:00:00.000");
     const QByteArray inTokyo("2021-03-04 21:00:00.000");
@@ -265,7 +265,7 @@ void tst_TorkLogStamps::stampInRepeatedHour_data()
     QTest::addColumn<QDateTime>("change");
     QTest::addColumn<QByteArray>("expected");
 
-    // Standard time itself steps back, so that both hours are called the same.
+    // Standard time itself steps back, so both hours have the same zone name.
     QTest::newRow("Kazakhstan 2024")
         << QByteArray("Asia/Almaty") << utc(QDate(2024, 2, 29), QTime(18, 0))
         << QByteArray("23:59:59 23:00:00 23:30:00 23:59:59 00:00:00");
@@ -383,7 +383,7 @@ void tst_TorkLogStamps::stampInTheUsersLanguage()
              expected.replace("|", " Trace x\n") + " Trace x\n");
 }
 
-// From time of day to time of day, whatever the dates.
+// From time of day to time of day, ignoring the dates.
 void tst_TorkLogStamps::elapsedTime_data()
 {
     QTest::addColumn<QDateTime>("from");
@@ -404,7 +404,7 @@ void tst_TorkLogStamps::elapsedTime_data()
         << QByteArray("T Trace dT:[-86399999] x\n");
     QTest::newRow("a day and a second")
         << from << from.addDays(1).addSecs(1) << QByteArray("T Trace dT:[1000] x\n");
-    QTest::newRow("the clock was put back")
+    QTest::newRow("the clock was set back")
         << from << from.addSecs(-60) << QByteArray("T Trace dT:[-60000] x\n");
 }
 
@@ -423,7 +423,7 @@ void tst_TorkLogStamps::elapsedTime()
     QTEST(TestFiles::read(folder.logs() + "app.log"), "expected");
 }
 
-// Every entry restarts the count, also one that was not written; a ready line is none.
+// Every entry restarts the count, even one that was not written; a preformatted line does not.
 void tst_TorkLogStamps::elapsedTimeBetweenEntries()
 {
     LogFolder folder;
@@ -452,7 +452,7 @@ void tst_TorkLogStamps::elapsedTimeBetweenEntries()
     TestClock::advance(128);
     log.trace("d");
 
-    // "d" was written over the start, as the file was opened anew.
+    // "d" overwrote the start, because the file was reopened.
     QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("T Trace dT:[128] d\ne off\n"
                                                                     "T Trace dT:[2] a\n"
                                                                     "T Trace dT:[8] b\n"
@@ -462,13 +462,13 @@ void tst_TorkLogStamps::elapsedTimeBetweenEntries()
 
 void tst_TorkLogStamps::elapsedTimeFollowsTheTimeZone_data()
 {
-    QTest::addColumn<bool>("enabled"); // while the entry before is written
+    QTest::addColumn<bool>("enabled"); // during the previous entry
 
     QTest::newRow("from entry to entry") << true;
     QTest::newRow("from an entry that is dropped") << false;
 }
 
-// Each time of day is that of the zone in force then.
+// Each time of day is in the zone in effect at that time.
 void tst_TorkLogStamps::elapsedTimeFollowsTheTimeZone()
 {
     QFETCH(bool, enabled);

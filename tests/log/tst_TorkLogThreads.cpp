@@ -15,9 +15,9 @@
 #include <thread>
 #include <vector>
 
-/// Eight threads write at once: every entry is whole and none is lost. Built for ThreadSanitizer,
-/// the program also fails on every data race; tests/support/ThreadSanitizerMutex.cpp makes the
-/// toolkit's mutexes known to it.
+/// Eight threads write at the same time: every entry is whole and none is lost. Built for
+/// ThreadSanitizer, the program also fails on every data race;
+/// tests/support/ThreadSanitizerMutex.cpp makes Qt's mutexes known to it.
 class tst_TorkLogThreads : public QObject
 {
     Q_OBJECT
@@ -62,7 +62,7 @@ void inThreads(std::function<void(int)> const& work)
 
 QString text(int thread, int entry)
 {
-    // Lengths differ, lest torn entries fit together again.
+    // Different lengths, so that torn entries do not fit together by accident.
     return QString("<%1.%2 %3>").arg(thread).arg(entry).arg(QString(thread * 7 + entry % 5, 'x'));
 }
 
@@ -77,7 +77,7 @@ QStringList allTexts()
     return texts;
 }
 
-// The messages of the entries, each of which has to match `start` before its message.
+// The messages of the entries; the text before each has to match `start`.
 QStringList messages(QByteArray const& entries, QString const& start)
 {
     const QRegularExpression whole("^" + start + " (<[^<>]*>)$");
@@ -118,7 +118,7 @@ void tst_TorkLogThreads::entries_data()
     QTest::newRow("entries with elapsed time")
         << "entry" << true << stamp + "Error dT:\\[-?\\d+\\]";
     QTest::newRow("ready lines") << "line" << false << "ready";
-    QTest::newRow("messages of the toolkit") << "message" << false << stamp + "Warning";
+    QTest::newRow("Qt messages") << "message" << false << stamp + "Warning";
     QTest::newRow("debug streams") << "stream" << true << stamp + "Trace dT:\\[-?\\d+\\]";
 }
 
@@ -146,7 +146,7 @@ void tst_TorkLogThreads::entries()
     QCOMPARE(messages(TestFiles::read(folder.logs() + "app.log"), start), allTexts());
 }
 
-// Nobody closes the file in earnest while others write; each opening may rotate it, though.
+// Closing makes the next entry reopen the file, which may rotate it.
 void tst_TorkLogThreads::rotationUnderWay()
 {
     LogFolder folder;
@@ -163,7 +163,7 @@ void tst_TorkLogThreads::rotationUnderWay()
         }
     });
 
-    // An opening with room left writes over the start of the file: that is not what this is about.
+    // A file reopened with room left is overwritten, so its entries are not compared here.
     const QStringList files = folder.listing();
     QVERIFY(files.size() > 1);
     QVERIFY(files.size() <= threadCount * entriesEach / 100 + 1);
@@ -189,7 +189,7 @@ void tst_TorkLogThreads::settingsChangedMeanwhile()
              allTexts());
 }
 
-// Half of the threads write; each of the others keeps calling one part of the rest.
+// Half of the threads write; each of the others keeps calling one of the other operations.
 void tst_TorkLogThreads::everythingElseMeanwhile()
 {
     LogFolder folder;
@@ -337,7 +337,7 @@ void tst_TorkLogThreads::shutdownMeanwhile()
 
 int main(int argc, char** argv)
 {
-    // Without a time zone in the environment the C library reads the system's anew for every local
+    // Without a time zone in the environment the C library rereads the system's for every local
     // time, under a lock that ThreadSanitizer does not see.
     qputenv("TZ", "UTC");
     QDateTime::currentDateTime().toString();

@@ -16,7 +16,7 @@ using DemoLog::writtenOver;
 
 namespace {
 
-// One pass over a file, in slices of the given size.
+// A single pass over a file, in slices of the given size.
 void Pass(LogIndex& index, QByteArray const& file, int slice)
 {
     qint64 offset = index.Begin();
@@ -124,15 +124,15 @@ void tst_LogIndex::order_data()
                QStringList("[newest]") + Lines(newer);
 
     file = newer + "continued\n" + "er 0\n" + older.mid(older.indexOf('\n') + 1);
-    QTest::newRow("a line that goes on with the newest entry stays with it")
+    QTest::newRow("a line that continues the newest entry stays with it")
         << file
         << QStringList({"[earlier]", "torn: er 0"}) + Lines(older).mid(1) +
                QStringList("[newest]") + Lines(newer) + QStringList("continued");
 
-    QTest::newRow("nothing but a torn line behind the run")
+    QTest::newRow("nothing but a torn line after the run")
         << QByteArray(newer + "er 0\n") << Lines(newer) + QStringList("er 0");
 
-    // In an hour that is set back, entries are older than those before, yet not than the first.
+    // In an hour that is repeated, entries are older than the ones before, but not than the first.
     const QByteArray back =
         entry("01:00:00.000", "Trace", "start") + entry("02:59:59.000", "Trace", "summer") +
         entry("02:00:01.000", "Trace", "winter") + entry("02:30:00.000", "Trace", "on");
@@ -159,7 +159,7 @@ void tst_LogIndex::slices_data()
         QTest::newRow(qPrintable(QString("%1 bytes").arg(slice))) << slice;
 }
 
-// However the file comes in, the rows are the same.
+// However the file is sliced, the rows are the same.
 void tst_LogIndex::slices()
 {
     QFETCH(int, slice);
@@ -181,12 +181,12 @@ void tst_LogIndex::threeRuns()
     const QStringList rows = TextsOf(file);
     QCOMPARE(rows.first(), QString("[earlier]"));
     QCOMPARE(rows.mid(rows.indexOf("[newest]") + 1), Lines(third));
-    // What is left of the first run comes before what is left of the second.
+    // The rest of the first run comes before the rest of the second.
     QVERIFY(rows.indexOf(Lines(first).last()) < rows.indexOf(Lines(second).last()));
     QVERIFY(rows.indexOf(Lines(first).last()) > 0);
 }
 
-// Beyond a number of runs the order is no longer told, but every line is still there.
+// Beyond a number of runs the order is no longer determined, but every line is still there.
 void tst_LogIndex::manyRuns()
 {
     QByteArray file;
@@ -289,7 +289,7 @@ void tst_LogIndex::textFilter()
     Pass(index, file, 100);
     QCOMPARE(Texts(index, file, filter).size(), 11);
 
-    // A match behind the limit of a very long line is not looked for; one before it is.
+    // A match past the limit of a very long line is not found; one before it is.
     const QByteArray longLine = entry("09:00:00.000", "Trace", QString(LogIndex::LineLimit, 'x'));
     LogFilter longFilter;
     QVERIFY(longFilter.SetText("xxx", false, true));
@@ -316,8 +316,8 @@ void tst_LogIndex::passesOverAWritingRun_data()
         QTest::newRow(qPrintable(QString("seed %1").arg(seed))) << seed;
 }
 
-// A run writes over what older ones left, entry by entry; after each few entries a pass from where
-// the last one ended finds the same rows as a fresh look at the whole file.
+// A run overwrites older ones entry by entry; after every few entries, a pass from where the last
+// one ended finds the same rows as a fresh pass over the whole file.
 void tst_LogIndex::passesOverAWritingRun()
 {
     QFETCH(unsigned, seed);
@@ -354,7 +354,7 @@ void tst_LogIndex::readsOnlyWhatIsNew()
     QCOMPARE(index.Begin(), end);
     index.End();
 
-    // Behind a seam nothing is read that was read before.
+    // After a seam nothing is read twice.
     const int seam = file.lastIndexOf('\n', 1000) + 1;
     const QByteArray overwritten =
         writtenOver(run(5000, QTime(17, 0), "older", true), file.left(seam));

@@ -50,7 +50,7 @@ void tst_LogLineParser::parse_data()
     entry("error", "Error hello", LogEntry::Error, "", "hello");
     entry("fatal", "Fatal hello", LogEntry::Fatal, "", "hello");
     entry("empty message", "Trace ", LogEntry::Trace, "", "");
-    entry("cut behind the name", "Trace", LogEntry::Trace, "", "");
+    entry("cut after the name", "Trace", LogEntry::Trace, "", "");
     entry("blanks in front of the message stay", "Trace   x", LogEntry::Trace, "", "  x");
     entry("elapsed time", "Trace dT:[250] x", LogEntry::Trace, "250", "x");
     entry("negative elapsed time", "Trace dT:[-86399999] x", LogEntry::Trace, "-86399999", "x");
@@ -66,7 +66,7 @@ void tst_LogLineParser::parse_data()
     noEntry("plain text", "no stamp here");
     noEntry("severity name in plain text", "the last Error was this");
     noEntry("severity name as part of a word", stamp + " Traces x");
-    noEntry("severity name far behind", QByteArray(200, '1') + " Error x");
+    noEntry("severity name far to the right", QByteArray(200, '1') + " Error x");
     noEntry("stamp alone", stamp);
 
     QTest::newRow("any stamp with a digit counts")
@@ -101,7 +101,7 @@ void tst_LogLineParser::settings_data()
                                 << "dT:" << QByteArray("03.03. 09:02 Trace x") << "03.03. 09:02"
                                 << ""
                                 << "x";
-    QTest::newRow("the default format besides")
+    QTest::newRow("the default format as well")
         << "dd.MM. hh:mm"
         << "dT:" << QByteArray("2025-03-03 09:02:11.031 Trace x") << "2025-03-03 09:02:11.031"
         << ""
@@ -134,7 +134,7 @@ void tst_LogLineParser::settings()
     QTEST(entry.message, "message");
 }
 
-// No bytes are read beyond the line, and the parts always add up. Meant for the sanitizers too.
+// No bytes are read beyond the line, and the parts always add up. Also meant for the sanitizers.
 void tst_LogLineParser::anyBytes()
 {
     std::mt19937 random(1);

@@ -40,7 +40,7 @@ void tst_LogSeverities::severities()
     QTEST(LogSeverities::IsProblem(asked), "isProblem");
 }
 
-// The log translates its names as those of QObject, and so are they here.
+// The log translates its names in the context of QObject, and so does this test.
 void tst_LogSeverities::translatedName()
 {
     class Translator : public QTranslator

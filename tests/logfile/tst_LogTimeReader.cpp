@@ -15,8 +15,8 @@ class tst_LogTimeReader : public QObject
 private slots:
     void length_data();
     void length();
-    void readsWhatTheToolkitWrites_data();
-    void readsWhatTheToolkitWrites();
+    void readsWhatQtWrites_data();
+    void readsWhatQtWrites();
     void order_data();
     void order();
     void hasDate_data();
@@ -43,8 +43,7 @@ void tst_LogTimeReader::length_data()
         << byDefault << QByteArray("2025-0x-03 09:02:11.031 Trace x") << -1 << false;
     QTest::newRow("quoted text alone")
         << QString("'now'") << QByteArray("now Trace x") << 3 << false;
-    QTest::newRow("two quotes stand for one")
-        << QString("hh''mm") << QByteArray("09'30 x") << 5 << true;
+    QTest::newRow("two quotes mean one") << QString("hh''mm") << QByteArray("09'30 x") << 5 << true;
     QTest::newRow("a quote that is never closed")
         << QString("'at ") << QByteArray("at x") << 3 << false;
     QTest::newRow("empty format") << QString("") << QByteArray("x") << 0 << false;
@@ -54,7 +53,7 @@ void tst_LogTimeReader::length_data()
         << QString("h:mm a") << QByteArray("9:30 pm x") << 7 << true;
     QTest::newRow("half of the day at the end of a line")
         << QString("h:mm ap") << QByteArray("9:30 pm") << 7 << true;
-    QTest::newRow("a year of one letter stands for itself")
+    QTest::newRow("a one-letter year is literal")
         << QString("y hh:mm") << QByteArray("y 09:30 x") << 7 << true;
     QTest::newRow("two names of the month")
         << QString("MMM MMMM hh:mm") << QByteArray("May May 09:30 x") << 13 << true;
@@ -76,7 +75,7 @@ void tst_LogTimeReader::length()
     QCOMPARE(stamp.key >= 0, tellsTime);
 }
 
-void tst_LogTimeReader::readsWhatTheToolkitWrites_data()
+void tst_LogTimeReader::readsWhatQtWrites_data()
 {
     QTest::addColumn<QString>("format");
 
@@ -87,8 +86,8 @@ void tst_LogTimeReader::readsWhatTheToolkitWrites_data()
         QTest::newRow(format) << QString(format);
 }
 
-// Whatever a format makes of a time is read to its end, and later times read as later ones.
-void tst_LogTimeReader::readsWhatTheToolkitWrites()
+// Whatever a format produces for a time is parsed to its end, and the order of times is kept.
+void tst_LogTimeReader::readsWhatQtWrites()
 {
     QFETCH(QString, format);
     const LogTimeReader reader(format);

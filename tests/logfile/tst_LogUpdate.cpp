@@ -9,8 +9,8 @@ using namespace Velocor;
 
 namespace {
 
-// Rows, a letter each: first those of the earlier part. Where a row starts tells rows apart, and
-// here the letter does.
+// Rows, one letter each: first those of the earlier part. Rows are identified by where they start;
+// here the letter does that.
 std::shared_ptr<LogRows> Rows(char const* earlier, char const* newest)
 {
     auto rows = std::make_shared<LogRows>();
@@ -35,8 +35,8 @@ private slots:
     void marksCount();
 };
 
-// The numbers are: the place of the change, how many rows went and came there, and how many rows
-// at the former end read differently.
+// The numbers are: the position of the change, how many rows were removed and added there, and how
+// many rows at the former end have a different text.
 void tst_LogUpdate::compare_data()
 {
     QTest::addColumn<QByteArray>("earlierBefore");
@@ -66,7 +66,7 @@ void tst_LogUpdate::compare_data()
     row("equal rows are not counted from both ends", "aa", "x", "a", "x", false, {1, 1, 0, 0});
     row("the newest run is shorter", "ab", "xy", "ab", "x", true, {});
     row("the earlier part is gone", "ab", "xy", "", "xy", true, {});
-    row("there is an earlier part now", "", "xy", "ab", "xy", true, {});
+    row("an earlier part appears", "", "xy", "ab", "xy", true, {});
 }
 
 void tst_LogUpdate::compare()

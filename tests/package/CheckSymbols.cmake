@@ -2,8 +2,8 @@
 # SPDX-License-Identifier: MIT
 
 # The names that the static libraries in PREFIX add to every program that links them: in namespace
-# Velocor, with the framework's prefix, or declared by an installed header. Any other could be a name
-# of the program's own.
+# Velocor, with the framework's prefix, or declared by an installed header. Any other could clash
+# with the program's own.
 
 file(GLOB_RECURSE headers "${PREFIX}/include/*.h")
 set(declared "")
@@ -23,7 +23,7 @@ foreach(library IN LISTS libraries)
     if(NOT result EQUAL 0)
         message(FATAL_ERROR "${NM} ${library}: ${result}")
     endif()
-    # A capital letter for what every file sees, but for templates and inline functions (V, W, u).
+    # Uppercase means a global symbol; templates and inline functions (V, W, u) are exempt.
     string(REGEX MATCHALL "[0-9a-f]+ [TDBRSC] [^\n]+" symbols "${symbols}")
     if(NOT symbols)
         message(FATAL_ERROR "no symbols in ${library}")
@@ -35,7 +35,7 @@ foreach(library IN LISTS libraries)
         if(name STREQUAL "Velocor" OR name MATCHES "^Tork[A-Z]")
             continue()
         endif()
-        # On a line that is no comment.
+        # On a line that is not a comment.
         if(NOT declared MATCHES "\n(class|struct) ${name}[ \n]" AND
            NOT declared MATCHES "\n[A-Za-z][^\n]* ${name}\\(")
             list(APPEND strays "${symbol}")

@@ -1,9 +1,9 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 
-# Compares the names in PREFIX with those an application developer is promised: no file less, and
-# no header or folder more. The names that differ between systems and builds are left out. SOURCE is
-# the source tree, whose headers are for applications unless their names end in _p.h.
+# Compares the names in PREFIX with those an application developer is promised: no file missing,
+# and no additional header or folder. Names that differ between systems and builds are ignored.
+# SOURCE is the source tree, whose headers are for applications unless their names end in _p.h.
 
 set(expected
     appdata.cfg

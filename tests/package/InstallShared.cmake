@@ -2,8 +2,8 @@
 # SPDX-License-Identifier: MIT
 
 # Builds the framework of the project in SOURCE as a shared library and the frame on top of it, and
-# installs both into PREFIX. Not the program, which would take long: BUILD/common is the framework's
-# part of the build tree, and of the program's part only what belongs to the frame is taken.
+# installs both into PREFIX. Not the program, which takes long to build: BUILD/common is the
+# framework's part of the build tree, and of the program's part only the frame is installed.
 
 execute_process(COMMAND "${CMAKE_COMMAND}" -S "${SOURCE}" -B "${BUILD}" -G "${GENERATOR}"
     ${OPTIONS} -DBUILD_SHARED_LIBS=ON -DVELOCOR_BUILD_TESTS=OFF

@@ -1,7 +1,8 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 
-# Builds a program the plain way, from what pkg-config says of the package in PREFIX, and runs it.
+# Builds a program directly with the flags that pkg-config gives for the package in PREFIX, and runs
+# it.
 
 set(ENV{PKG_CONFIG_PATH} "${PREFIX}/lib/pkgconfig:$ENV{PKG_CONFIG_PATH}")
 

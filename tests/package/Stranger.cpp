@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// A program outside the tree that uses every class of the frame, and has classes of its own that
-// are called like those of the program in this tree. Returns 0 if neither disturbs the other.
+// A program outside the tree that uses every class of the frame, and whose own classes have the
+// same names as those of the program in this tree. Returns 0 if neither interferes with the other.
 
 #include "StrangersClasses.h"
 
@@ -47,7 +47,7 @@ void LaunchData()
 {
     LaunchOptionParser parser;
     parser.AddOption(new LaunchOption("name", "name", "n", 1, ""));
-    // Deeper than the stranger's own NestedDeeperThan() would let through.
+    // Deeper than the stranger's own NestedDeeperThan() would allow.
     QString xml = "<args><arg key=\"name\">value</arg></args>";
     QString flat = "<arg key=\"name\">value</arg>";
     parser.ParseOptions(xml);
@@ -72,7 +72,7 @@ void Messages()
     DebugMessage(nullptr, "only logged", false);
     QString text("two\nlines");
     QString error;
-    Check(StripFormatting(text) == "two lines", "formatting is taken out");
+    Check(StripFormatting(text) == "two lines", "formatting is removed");
     Check(FormatError("error", error) == "error", "an error is formatted");
 }
 
@@ -105,7 +105,7 @@ int main(int argc, char** argv)
     Messages();
     OwnClasses();
 
-    // Ends by the frame's handler, not by the stranger's function of that name.
+    // Ends through the frame's handler, not through the stranger's function of that name.
     MainWindow window;
     window.show();
     QTimer::singleShot(0, [] { std::raise(SIGTERM); });

@@ -9,10 +9,10 @@
 #include <QString>
 #include <QStringList>
 
-// Classes that other programs are likely to have, called like those of the program in this tree but
-// laid out otherwise. Each object checks that its own constructor made it.
+// Classes that other programs are likely to have, with the names of those of the program in this
+// tree but a different layout. Each object checks that its own constructor created it.
 
-/// Out of line, as stock examples have it.
+/// Out of line, as usual.
 class MainWindow : public QMainWindow
 {
     Q_OBJECT
@@ -43,7 +43,7 @@ private:
     int m_end = 4711;
 };
 
-/// Some of it inline.
+/// Partly inline.
 class LogView
 {
 public:
@@ -56,7 +56,7 @@ private:
     QString m_text = "view";
 };
 
-/// With a meta-object of its own.
+/// With its own meta-object.
 class RecentFiles : public QObject
 {
     Q_OBJECT
@@ -81,7 +81,7 @@ private:
     int m_chosen = 0;
 };
 
-/// No widget, and next to nothing in it.
+/// Not a widget, and nearly empty.
 struct SettingsEditor
 {
     SettingsEditor() : mark('s') {}
@@ -90,7 +90,7 @@ struct SettingsEditor
     char mark;
 };
 
-/// Called like helpers of the frame that no installed header declares.
+/// Named like helpers of the frame that no installed header declares.
 class WithoutOpenGl
 {
 public:

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// A program outside the tree that the frame has to work for. Returns 0 if it does.
+// A program outside the tree for which the frame has to work. Returns 0 if it does.
 
 #include "app/AppPaths.h"
 #include "app/AppUtils.h"

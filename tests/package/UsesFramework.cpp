@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// A program outside the tree that settings, log and XML have to work for. Returns 0 if they do.
+// A program outside the tree for which settings, log and XML have to work. Returns 0 if they do.
 
 #include "common/config/TorkConfigFile.h"
 #include "common/log/TorkLog.h"
@@ -49,7 +49,7 @@ void Settings(QString const& path)
           "settings come back");
 }
 
-// What reaches into the classes' fields, or makes them grow.
+// Operations that access the classes' fields, or make them grow.
 void Sections()
 {
     TorkConfigFile settings{QString()};
@@ -65,7 +65,7 @@ void Sections()
     auto* section = new TorkConfigFileSection("Main");
     section->AddValue("key", "value");
     settings.AppendSection(section);
-    delete found; // pushed out
+    delete found; // replaced, so no longer owned by the settings
     Check(settings.keyList("Main") == QStringList("key"), "a section pushes out its namesake");
     settings.Clear();
     Check(!settings.HasSection(QStringLiteral("Main")), "sections are cleared");

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// What docs/ shows is what the program does: the samples are made again here, and the tests that
-// the pages name exist.
+// What docs/ shows is what the program does: the samples are generated again here, and the tests
+// that the pages name exist.
 
 #include "app/AppUtils.h"
 #include "app/LaunchOptionParser.h"
@@ -52,7 +52,7 @@ QString Read(QString const& path)
     return QString::fromUtf8(TestFiles::read(QStringLiteral(PROJECT_FOLDER "/") + path));
 }
 
-// The block below the comment that names it.
+// The code block below the comment that names it.
 QString Sample(QString const& page, QString const& name)
 {
     const QRegularExpression block("<!-- sample: " + name + " -->\n```[a-z]*\n(.*?\n)```\n",

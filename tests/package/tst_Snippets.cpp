@@ -2,7 +2,7 @@
 // SPDX-License-Identifier: MIT
 
 // The usage examples in the headers are those that are compiled: examples/snippets has a file for
-// each header, and shows what the header shows.
+// each header, with the same code as the header.
 
 #include "support/TestFiles.h"
 
@@ -64,7 +64,7 @@ void tst_Snippets::headerShowsCompiledExample_data()
             QDir(QStringLiteral(PROJECT_FOLDER "/") + folder).entryList({"*.h"}, QDir::Files);
         QVERIFY2(!headers.isEmpty(), qPrintable(folder));
         for (QString const& header : headers) {
-            // A member of both writers, which no application names.
+            // A member of both writers, which no application uses by name.
             if (!header.endsWith("_p.h") && header != "TorkXmlLayout.h")
                 QTest::newRow(qPrintable(header)) << folder + '/' + header;
         }

@@ -6,10 +6,10 @@
 #include <QByteArray>
 #include <QString>
 
-/// The plain wording of what a settings file is written in.
+/// The plain version of what is written to a settings file.
 namespace PlainLine {
 
-/// A value as it stands in the file.
+/// A value as it appears in the file.
 inline QString filtered(QString const& value)
 {
     for (char const* markup : {"&", "'", "<", ">", "\""}) {

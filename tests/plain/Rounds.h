@@ -9,25 +9,25 @@
 #include <cstdio>
 #include <random>
 
-/// How much a comparison with the plain wording tries, and from which seed.
+/// How many rounds a comparison with the plain version runs, and from which seed.
 ///
-/// `VELOCOR_PLAIN=full` asks for the full size, as ./check does; `VELOCOR_SEED` replays one run.
-/// The seed of every run is printed, so that a failure can be repeated.
+/// `VELOCOR_PLAIN=full` selects the full size, as ./check does; `VELOCOR_SEED` replays one run.
+/// Every run prints its seed, so that a failure can be reproduced.
 namespace Rounds {
 
-/// Whether the full size is asked for.
+/// Whether the full size was requested.
 inline bool isFull()
 {
     return qgetenv("VELOCOR_PLAIN") == "full";
 }
 
-/// How often to try: `usual` takes about a second, `full` is the documented size.
+/// The number of rounds: `usual` takes about a second, `full` is the documented size.
 inline int count(int usual, int full)
 {
     return isFull() ? full : usual;
 }
 
-/// The seed of this process: the one that is asked for, or a new one, which is printed.
+/// The seed of this process: the one requested, or a new one, which is printed.
 inline quint32 seed()
 {
     static const quint32 chosen = [] {

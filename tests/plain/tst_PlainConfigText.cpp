@@ -2,7 +2,7 @@
 // SPDX-License-Identifier: MIT
 
 // Every UTF-16 unit, and random texts of all of them, through the encodings and through a file that
-// is really saved and loaded: as a value, as a key and as the name of a section.
+// is really saved and loaded: as a value, as a key and as a section name.
 
 #include "Rounds.h"
 
@@ -40,7 +40,7 @@ private:
 
 namespace {
 
-// The plain wording: what stays, and four digits for all else.
+// The plain version: safe characters are kept, all others become four digits.
 QString PlainEncoding(QString const& text, bool isName)
 {
     const QString letters = "abcdefghijklmnopqrstuvwxyzABCDEFGHIJKLMNOPQRSTUVWXYZ";
@@ -77,7 +77,7 @@ bool ComesBack(QString const& text)
            Value(text) == PlainEncoding(text, false) && Name(text) == PlainEncoding(text, true);
 }
 
-// Whether all of these texts, each another one, come back from one file in every place.
+// Whether all of these (distinct) texts come back from one file in every place.
 bool AllComeBack(QString const& path, QStringList const& texts)
 {
     TorkConfigFile saved(path);
@@ -144,7 +144,7 @@ bool IsKeptAsName(QString const& text)
     return asKey && asSection;
 }
 
-// All texts of up to so many of the pieces, but the empty one.
+// All non-empty texts of up to this many pieces.
 QStringList Combinations(QStringList const& pieces, int most)
 {
     QStringList all;
@@ -202,7 +202,7 @@ void tst_PlainConfigText::everyUnit()
     m_units += texts.size();
 }
 
-// Units of all kinds in a row, the dangerous ones above all.
+// Units of all kinds in a row, mostly the dangerous ones.
 void tst_PlainConfigText::randomTexts()
 {
     const QString dangerous = "%123L]>&'<\"\\_u0041-.:/ \t\r\nVe";
@@ -232,8 +232,8 @@ void tst_PlainConfigText::randomTexts()
     }
 }
 
-// Whatever a decoder takes for an encoding is the encoding of what it makes of it; all else it
-// leaves alone.
+// Whatever a decoder accepts as an encoding is the encoding of its result; it leaves everything
+// else unchanged.
 void tst_PlainConfigText::randomEncodings()
 {
     const QString alphabet = "\\_u0041ef%a ";
@@ -253,7 +253,7 @@ void tst_PlainConfigText::randomEncodings()
     }
 }
 
-// What is called a plain value comes back from a file without encoding, and nothing else does.
+// A plain value, and nothing else, comes back from a file without encoding.
 void tst_PlainConfigText::plainValues()
 {
     QStringList texts =

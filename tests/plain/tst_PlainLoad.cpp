@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Loading random documents beside the plain wording of it: a handler that keeps lists of texts, on
-// Qt's reader alone.
+// Compares loading of random documents with the plain version: a handler that keeps lists of texts,
+// on Qt's reader alone.
 
 #include "common/config/TorkConfigFile.h"
 
@@ -30,7 +30,7 @@ struct PlainSection
     QVector<std::pair<QString, QString>> items;
 };
 
-// The load steps one by one, every lookup a walk through a list.
+// The load one step at a time; every lookup is a linear search.
 class PlainLoader : public QXmlDefaultHandler
 {
 public:
@@ -130,7 +130,7 @@ private:
     QVector<PlainSection> m_sections;
 };
 
-// Makes documents that come near every rule of the format, and some that break XML's own.
+// Generates documents that touch every rule of the format, and some that are not well-formed XML.
 class Documents
 {
 public:
@@ -346,8 +346,8 @@ void tst_PlainLoad::compare(QByteArray const& document, bool& parses, int& value
             ++values;
         }
     }
-    // The file tells the order of the sections, and that there are no others.
-    QVERIFY(QFile::remove(path)); // some disks take a while to make a file shorter
+    // The file gives the order of the sections and shows that there are no others.
+    QVERIFY(QFile::remove(path)); // some disks are slow to truncate a file
     QVERIFY(file.Save());
     QCOMPARE(TestFiles::read(path), SavedBytes(plain.sections()));
     QVERIFY(QFile::remove(path));
@@ -371,7 +371,7 @@ void tst_PlainLoad::randomDocuments()
     }
     std::printf("plain load: %d documents compared, %d of them well-formed, %d values\n", count,
                 wellFormed, values);
-    // Else the documents prove little.
+    // Otherwise the documents prove little.
     QVERIFY(wellFormed > count / 4 && wellFormed < count);
     QVERIFY(values > count);
 }

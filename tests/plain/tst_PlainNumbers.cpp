@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The numbers that ReadInt() and ReadUint() give beside their plain wording, QString::toInt(), and
-// the names under which they find them beside QString::remove().
+// Compares the numbers that ReadInt() and ReadUint() return with their plain version,
+// QString::toInt(), and the names under which they find them with QString::remove().
 
 #include "common/config/TorkConfigFile.h"
 
@@ -46,7 +46,7 @@ void tst_PlainNumbers::compare(QString const& text)
         QFAIL(qPrintable(QStringLiteral("\"%1\" is read as %2").arg(text).arg(number)));
 }
 
-// Of all characters that a number may hold or be mistaken for.
+// From all characters that a number may contain or that could be mistaken for part of one.
 void tst_PlainNumbers::everyShortText()
 {
     const QString characters =
@@ -71,7 +71,7 @@ void tst_PlainNumbers::everyShortText()
     }
 }
 
-// Numbers around every limit, with zeros in front and now and then a strange character.
+// Numbers around every limit, with leading zeros and an occasional stray character.
 void tst_PlainNumbers::randomTexts()
 {
     std::mt19937 random(Rounds::seed());
@@ -91,7 +91,7 @@ void tst_PlainNumbers::randomTexts()
     }
 }
 
-// Sections and keys with spaces anywhere, of which some are then the same.
+// Sections and keys with spaces anywhere, so that some of them become equal.
 void tst_PlainNumbers::namesWithSpaces()
 {
     std::mt19937 random(Rounds::seed());

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The lines of a saved settings file beside their plain wording: three texts put into a line one
-// after another, and the line turned into Latin-1.
+// Compares the lines of a saved settings file with their plain version: three arguments substituted
+// one at a time, and the line converted to Latin-1.
 
 #include "common/config/TorkConfigFile.h"
 
@@ -30,7 +30,7 @@ QByteArray PlainFile(Pairs const& items)
     return file + "</s>\n</VelocorSettings>\n";
 }
 
-// What matters to a line, to its conversion, and to nothing.
+// Characters that matter to a line, to its conversion, or to neither.
 QString Chosen()
 {
     return QStringLiteral("%123456789 0Ln&'<>\"[]!CDATA/\\-_.:;=#aZz\n\t\r\u007F\u0080\u00A0\u00E9"
@@ -71,7 +71,7 @@ private:
     int m_lines = 0;
 };
 
-// Keys are stored as they are in a section of the test's own, where no operation cleans them.
+// Keys are stored unchanged in a section that belongs to the test, where no operation cleans them.
 void tst_PlainSave::compare(Pairs const& items)
 {
     TorkConfigFile file(m_folder.filePath("x.cfg"));
@@ -79,7 +79,7 @@ void tst_PlainSave::compare(Pairs const& items)
     file.AppendSection(section);
     for (auto const& item : items)
         section->AddValue(item.first, item.second);
-    QCOMPARE(section->values().size(), items.size()); // no key twice
+    QCOMPARE(section->values().size(), items.size()); // no duplicate keys
 
     QVERIFY(file.Save());
     QVERIFY2(file.m_lastError.isEmpty(), qPrintable(file.m_lastError));
@@ -154,7 +154,7 @@ void tst_PlainSave::randomLines()
     }
 }
 
-// The lines of the root element and of sections are filled once each.
+// The lines of the root element and of sections have a single substitution each.
 void tst_PlainSave::names()
 {
     for (char const* name : {"s", "%1", "a%2b", "%L1", "<&>", "", "\xC3\xA9", "\xE2\x82\xAC"}) {

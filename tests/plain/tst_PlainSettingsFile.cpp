@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// What the settings editor says that saving would lose, beside what is really gone from the file
-// after the store has loaded and saved it.
+// Compares what the settings editor says saving would lose with what is really missing from the
+// file after the store has loaded and saved it.
 
 #include "app/settingsfile/SettingsFileReader.h"
 #include "app/settingsfile/SettingsFileWriter.h"
@@ -23,8 +23,8 @@ using namespace Velocor;
 
 namespace {
 
-// All that a document holds, one line each, but the blanks between elements and the prefixes of
-// names, which mean nothing to the store. The pieces of a text are one.
+// Everything a document contains, one line each, except for white space between elements and
+// namespace prefixes, which mean nothing to the store. Consecutive pieces of text are joined.
 class Contents : public QXmlDefaultHandler
 {
 public:
@@ -93,7 +93,7 @@ private:
     bool m_isLeaf = false;
 };
 
-// Makes documents most of which hold one or two things that the store passes over, or none.
+// Generates documents; most contain one or two things that the store ignores, or none.
 class Documents
 {
 public:
@@ -258,12 +258,12 @@ void tst_PlainSettingsFile::compareDocument(QByteArray const& text)
         return;
     QCOMPARE(document.losses.isEmpty(), document.lossCount == 0);
 
-    QVERIFY(QFile::remove(path)); // some disks take a while to make a file shorter
+    QVERIFY(QFile::remove(path)); // some disks are slow to truncate a file
     QVERIFY(store.Save());
     const QByteArray saved = TestFiles::read(path);
     {
         const MessageCapture messages;
-        store.Load(); // an empty value is in the file, but not after loading it
+        store.Load(); // an empty value is in the file, but is gone after loading it
     }
     const QStringList before = Contents::of(text);
     const bool isKept = !text.startsWith("<?xml") && before == Contents::of(saved) &&
@@ -288,7 +288,7 @@ void tst_PlainSettingsFile::randomDocuments()
             return;
         }
     }
-    // Else the documents prove little.
+    // Otherwise the documents prove little.
     QVERIFY(m_keptDocuments > m_documents / 5 && m_keptDocuments < m_documents * 4 / 5);
 }
 

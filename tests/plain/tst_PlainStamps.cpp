@@ -20,8 +20,8 @@
 #include <random>
 #include <thread>
 
-/// Time stamps and elapsed times beside QDateTime::toString() of the moment itself, and beside the
-/// fields that the C library has for it.
+/// Compares time stamps and elapsed times with QDateTime::toString() of the moment itself, and with
+/// the fields that the C library computes for it.
 class tst_PlainStamps : public QObject
 {
     Q_OBJECT
@@ -81,7 +81,7 @@ QByteArray plain(qint64 moment, QString const& format)
     return plainStamp(QDateTime::fromMSecsSinceEpoch(moment), format);
 }
 
-// The fields of the C library, for moments after 1970.
+// The fields as the C library computes them, for moments after 1970.
 tm libraryTime(qint64 moment)
 {
     tzset();
@@ -112,7 +112,7 @@ QByteArray latin1(TorkLogLine const& line)
     return QString::fromUtf16(line.constData(), line.size()).toLatin1();
 }
 
-// A stamp and the time of day, as the log asks for them.
+// A stamp and the time of day, as the log requests them.
 QByteArray asked(qint64 moment, QString const& format, quint64 generation)
 {
     ++g_stamps;
@@ -123,7 +123,7 @@ QByteArray asked(qint64 moment, QString const& format, quint64 generation)
     return latin1(line) + " | " + QByteArray::number(timeOfDay);
 }
 
-// Empty if the log's stamp is the plain one, the first and the second time; else all of them.
+// Empty if the log's stamp equals the plain one both times; otherwise all of them.
 QByteArray differenceInStamp(qint64 moment, QString const& format, quint64 generation)
 {
     const QByteArray first = asked(moment, format, generation);
@@ -137,8 +137,8 @@ QByteArray differenceInStamp(qint64 moment, QString const& format, quint64 gener
            second + "; expected " + expected;
 }
 
-// A log whose entries have the number of the moment for their message. The clock is set in UTC: a
-// local time may stand for two moments.
+// A log whose entries have the number of the moment as their message. The clock is set in UTC
+// because a local time can be ambiguous.
 class Log
 {
 public:
@@ -233,16 +233,16 @@ void tst_PlainStamps::millisecondsOfAMinute_data()
     QTest::newRow("the first minute of 1970") << QByteArray("Asia/Tokyo") << qint64(0);
 }
 
-// One thread goes through the minute as time does, the other one backwards. The first milliseconds
-// that a thread happens to see must not decide on how it formats the others. The zone's name ("t")
-// is left out: Qt reads it from the C library while the other thread may be setting it.
+// One thread goes through the minute forward, the other backward. The milliseconds that a thread
+// happens to see first must not decide how it formats the others. The zone's name ("t") is left
+// out: Qt reads it from the C library while the other thread may be setting it.
 void tst_PlainStamps::millisecondsOfAMinute()
 {
     QFETCH(QByteArray, zone);
     QFETCH(qint64, minute);
     setZone(zone);
 
-    // A prime, so that each format gets other milliseconds.
+    // A prime, so that each format gets different milliseconds.
     const int step = Rounds::isFull() ? 1 : 499;
     const auto walk = [&](bool backwards, QByteArray& difference) {
         quint64 generation = 0;
@@ -275,7 +275,7 @@ void tst_PlainStamps::entriesOfTwoThreads_data()
         QTest::addRow("\"%.40s\"", format) << QByteArray(format);
 }
 
-// Entry by entry in turns, each moment by both of them.
+// Alternating entry by entry; each moment is formatted by both of them.
 void tst_PlainStamps::entriesOfTwoThreads()
 {
     QFETCH(QByteArray, format);
@@ -316,7 +316,7 @@ void tst_PlainStamps::clockChanges_data()
     addClockChanges();
 }
 
-// The hours around a change, each second of them at full size, somewhere within the second.
+// The hours around a change: every second at full size, at a random millisecond.
 void tst_PlainStamps::clockChanges()
 {
     QFETCH(QByteArray, zone);
@@ -347,7 +347,7 @@ void tst_PlainStamps::clockChanges()
     }
 }
 
-// All changes since 1970 that the system's zones know; a part of the zones at the usual size.
+// All changes since 1970 in the system's time zones; a subset of the zones at the usual size.
 void tst_PlainStamps::changesOfAllZones()
 {
     std::mt19937 random(Rounds::seed());
@@ -378,7 +378,7 @@ void tst_PlainStamps::changesOfAllZones()
     QVERIFY(zones > 0);
 }
 
-// What is kept from the entry before may hold no longer, whatever has changed since.
+// What was cached for the previous entry may be stale, whatever has changed since.
 void tst_PlainStamps::formatZoneAndMomentAtRandom()
 {
     std::mt19937 random(Rounds::seed());
@@ -423,9 +423,9 @@ void tst_PlainStamps::formatZoneAndMomentAtRandom()
             format = oneOf(int(sizeof formats / sizeof *formats));
             break;
         default:
-            break; // all is as before
+            break; // nothing changes
         }
-        if (oneOf(8) == 0) { // an entry of a log that is switched off
+        if (oneOf(8) == 0) { // an entry of a disabled log
             const QTime time = QDateTime::fromMSecsSinceEpoch(moment).time();
             QCOMPARE(TorkLogStamp::TimeOfDay(moment), time.msecsSinceStartOfDay());
         }
@@ -446,7 +446,7 @@ void tst_PlainStamps::languages_data()
 
 namespace {
 
-// Days with all their names, in the morning and in the afternoon; each of a year at full size.
+// Days with all their names, in the morning and in the afternoon; every day of a year at full size.
 int writesAYear(QStringList const&)
 {
     for (const char* format : formats) {
@@ -474,7 +474,7 @@ int writesAYear(QStringList const&)
 
 } // namespace
 
-// Also with digits and names beyond Latin-1, none of which may end as a question mark.
+// Also with digits and names beyond Latin-1, none of which may turn into a question mark.
 void tst_PlainStamps::languages()
 {
     QFETCH(QByteArray, language);

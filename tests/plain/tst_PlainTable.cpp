@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The ordered table of sections and values beside its plain wording: a QHash and a list.
+// Compares the ordered table of sections and values with its plain version: a QHash and a list.
 
 #include "common/config/TorkOrderedHash_p.h"
 
@@ -15,7 +15,7 @@
 
 namespace {
 
-// What the table has to do, without a thought of speed.
+// What the table has to do, without regard to speed.
 class PlainTable
 {
 public:
@@ -43,8 +43,8 @@ private:
     QStringList m_order;
 };
 
-// Short keys that often meet again, keys of one letter case and another, with NUL and beyond
-// Latin-1, empty and null ones.
+// Short keys that often collide, keys that differ only in case, keys with NUL and beyond Latin-1,
+// empty and null ones.
 QString RandomKey(std::mt19937& random)
 {
     const QString letters = QStringLiteral("aAbB \u00E9\u20AC") + QChar(0) + QChar(0xD800);
@@ -118,7 +118,7 @@ void tst_PlainTable::randomOperations()
     std::printf("plain table: %d operations, %d whole tables compared\n", operations, m_compared);
 }
 
-// A key or value of the table itself is stored in it while it grows.
+// A key or value taken from the table itself is stored in it while it grows.
 void tst_PlainTable::referencesIntoTheTable()
 {
     TorkOrderedHash<QString> table;

@@ -1,10 +1,10 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Both XML writers beside a plain one, which makes each piece by its virtual call, over random
-// calls: the same bytes, result codes and calls that reach a subclass, whatever it overrides, also
-// where its Write() comes back to the writer, on every kind of device, with and without run-time
-// type information.
+// Compares both XML writers with a plain one, which makes a virtual call for each piece, over
+// random calls: the same bytes, result codes and calls that reach a subclass, whatever it
+// overrides, also where its Write() reenters the writer, on every kind of device, with and without
+// run-time type information.
 
 #include "common/xml/TorkXmlFile.h"
 #include "common/xml/TorkXmlStream.h"
@@ -40,15 +40,15 @@ struct Kind
     };
 
     int overridden = 0;
-    int failEvery = 0;   // each so many-th Write() reports -1; 0 for none
-    int returnEvery = 0; // at each so many-th Write() the writer is used again; 0 for none
+    int failEvery = 0;   // every nth Write() reports -1; 0 for none
+    int returnEvery = 0; // every nth Write() reenters the writer; 0 for none
     int indentCode = 0;  // what an overridden WriteCurrentIndent() returns
     int valueCode = 0;   // what an overridden WriteElementValue() returns
     bool isFile = false; // whose Write() returns 0
     int fieldWidth = 0;
 };
 
-// What reached a subclass, and how often its Write() was called.
+// The calls that reached a subclass, and how often its Write() was called.
 struct Record
 {
     QStringList calls;
@@ -62,7 +62,7 @@ QString Call(char const* operation, QString const& first, QString const& second 
     return QLatin1String(operation) + '(' + first + '|' + second + ')';
 }
 
-// What an overridden Write() does that comes back to the writer with the text it was given.
+// What an overridden Write() does when it reenters the writer with the text it was given.
 template <class Writer>
 void ComeBack(Writer& writer, Kind const& kind, QString const& text)
 {
@@ -228,7 +228,7 @@ private:
     QString m_pending;
 };
 
-// A subclass that overrides everything, and of what its kind does not override knows nothing.
+// A subclass that overrides everything but ignores what its kind does not override.
 template <class Writer>
 class Subclass : public Writer
 {
@@ -380,7 +380,7 @@ private:
     std::mt19937 m_engine;
 };
 
-// What a sequence left behind.
+// The outcome of a sequence.
 struct Outcome
 {
     QVector<int> codes;
@@ -401,7 +401,7 @@ QString Words(Outcome const& outcome)
     return words + "\n" + outcome.calls.join("\n") + "\n" + QString::fromLatin1(outcome.bytes);
 }
 
-// On a level that is high by accident every line has as many blanks; sequences stay short enough.
+// On a deep level every line is indented as deeply; the sequences are short enough for that.
 Steps Sequence(Dice& dice)
 {
     Steps steps;
@@ -520,7 +520,7 @@ Outcome tst_PlainWriters::file(Steps const& steps, Kind const& kind)
 
 void tst_PlainWriters::sameAsPlain()
 {
-    // Qt complains of each text that goes to no device.
+    // Qt warns about each text that is written without a device.
     qInstallMessageHandler([](QtMsgType, QMessageLogContext const&, QString const&) {});
     Dice dice(Rounds::seed());
     const int count = Rounds::count(4000, 100000);

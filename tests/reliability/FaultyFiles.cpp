@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// A program's own definitions are linked before those of the C library, so the toolkit's library
-// comes here for its file calls. Each one either fails as it was told or is passed on.
+// A program's own definitions take precedence over those of the C library, so Qt calls these for
+// its file operations. Each one either fails as requested or forwards the call.
 
 #include "reliability/FaultyFiles.h"
 
@@ -28,7 +28,8 @@ namespace {
 
 enum class Fault { None, Error, CutShort, DiskFull };
 
-// Plain data without constructors: the calls begin before this program's static objects are made.
+// Plain data without constructors: the calls begin before this program's static objects are
+// constructed.
 char s_folder[PATH_MAX];
 std::atomic<Fault> s_fault{Fault::None};
 int s_step;
@@ -41,7 +42,7 @@ bool s_strayed;
 char const* s_call = "";
 char s_path[PATH_MAX];
 
-// What lies below the folder, by its descriptor; empty for others.
+// The path below the folder, by its descriptor; empty for others.
 constexpr int Descriptors = 4096;
 std::array<std::array<char, 256>, Descriptors> s_open;
 
@@ -92,7 +93,7 @@ bool IsDue()
     return s_count == s_step || (s_lasts && s_count > s_step);
 }
 
-// Whether the call is to fail; errno is then set.
+// Whether the call is to fail; if so, errno is set.
 bool Fails(char const* call, char const* path)
 {
     if (s_fault != Fault::Error || !Concerns(path) || !IsDue())
@@ -107,7 +108,7 @@ bool Fails(char const* call, int descriptor)
     return Concerns(descriptor) && Fails(call, PathOf(descriptor));
 }
 
-// How many of `length` bytes a call may write; -1 if it is to fail, and errno is then set.
+// How many of `length` bytes a call may write; -1 if it is to fail, in which case errno is set.
 ssize_t Allowed(char const* call, int descriptor, size_t length)
 {
     if (Fails(call, descriptor))
@@ -243,7 +244,7 @@ int open64(char const* path, int flags, ...)
     return descriptor;
 }
 
-// As the system does it, a descriptor is gone even when closing it fails.
+// As on the system, a descriptor is gone even when closing it fails.
 int close(int descriptor)
 {
     ORIGINAL(close);
@@ -274,7 +275,7 @@ ssize_t sendfile(int to, int from, off_t* offset, size_t length) noexcept
 {
     ORIGINAL(sendfile);
     struct stat source = {};
-    const long position = syscall(SYS_lseek, from, 0, SEEK_CUR); // not to be counted
+    const long position = syscall(SYS_lseek, from, 0, SEEK_CUR); // not counted
     size_t wanted = length;
     if (Concerns(to) && position >= 0 && fstat(from, &source) == 0)
         wanted = static_cast<size_t>(qMax<off_t>(0, source.st_size - position));
@@ -294,7 +295,7 @@ off64_t lseek64(int descriptor, off64_t offset, int from) noexcept
     return Fails("lseek", descriptor) ? -1 : original(descriptor, offset, from);
 }
 
-// The files of a test need not outlive the machine: nobody waits for the disk.
+// A test's files need not survive a crash of the machine: nothing waits for the disk.
 int fsync(int descriptor)
 {
     ORIGINAL(fsync);
@@ -390,7 +391,7 @@ int access(char const* path, int mode) noexcept
     return Fails("access", path) ? -1 : original(path, mode);
 }
 
-// The toolkit asks by descriptor with an empty path.
+// Qt passes a descriptor with an empty path.
 int statx(int folder, char const* path, int flags, unsigned mask, struct statx* status) noexcept
 {
     ORIGINAL(statx);

@@ -8,9 +8,8 @@
 
 /// Makes the system's file calls fail on request, in programs that are built with FaultyFiles.cpp.
 ///
-/// It stands between the toolkit and the C library and counts the calls that concern one folder.
-/// Calls on anything else, and all calls while no fault is set, go straight through. One thread at
-/// a time.
+/// It is between Qt and the C library and counts the calls that concern one folder. Calls on
+/// anything else, and all calls while no fault is set, are forwarded. One thread at a time.
 ///
 ///     for (int step = 1;; ++step) {
 ///         FaultyFiles files(folder);
@@ -33,22 +32,22 @@ public:
     /// From now on counts the calls; the one numbered `step`, from 1, fails with this error.
     void failAt(int step, Duration duration, int error);
 
-    /// The same for the calls that write: that one takes over only the first half of its bytes.
+    /// The same for the calls that write: that one accepts only the first half of its bytes.
     void cutShortAt(int step);
 
-    /// From now on takes only this many bytes; then the disk is full.
+    /// From now on accepts only this many bytes; then the disk is full.
     void limitBytes(qint64 bytes);
 
-    /// Puts an end to the fault; the last one can still be asked for.
+    /// Clears the fault; the last one can still be queried.
     void mend();
 
-    /// Whether the fault came about.
+    /// Whether the fault occurred.
     bool reached() const;
 
-    /// Whether a file outside the folder was opened for writing meanwhile.
+    /// Whether a file outside the folder was opened for writing in the meantime.
     bool strayed() const;
 
-    /// The first call that failed: its name in the C library, and the path it was about.
+    /// The first call that failed: its name in the C library, and its path.
     QString call() const;
     QString path() const;
 };

@@ -8,17 +8,17 @@
 
 #include <cstdio>
 
-/// What a proof measured, and how much of it is asked for.
+/// What a proof measured, and how large it was requested to be.
 namespace Figures {
 
-/// Prints the one line that tells what was proved: "sudden death: 60 kills, ...".
+/// Prints the one line that reports what was proved: "sudden death: 60 kills, ...".
 inline void print(QString const& line)
 {
     std::printf("%s\n", qPrintable(line));
     std::fflush(stdout);
 }
 
-/// How often to try: the number in this environment variable, or else the usual one.
+/// The number of rounds: from this environment variable, or else the usual one.
 inline int wanted(char const* variable, int usual)
 {
     bool isNumber = false;

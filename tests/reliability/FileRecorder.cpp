@@ -1,10 +1,10 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// A library to be loaded in front of an unchanged program (LD_PRELOAD): it notes every file that
-// the program opens for writing, makes, moves or removes, and every program that it starts.
+// A library to be preloaded into an unchanged program (LD_PRELOAD): it records every file that the
+// program opens for writing, creates, moves or removes, and every program that it starts.
 //
-//     FILE_RECORDER  the file to note it in, a line "CALL PATH" each
+//     FILE_RECORDER  the file to record it in, a line "CALL PATH" each
 
 #include <cerrno>
 #include <climits>
@@ -44,7 +44,7 @@ void Note(char const* call, char const* path)
         std::strcat(folder, "/");
     char line[2 * PATH_MAX + 32];
     const int length = std::snprintf(line, sizeof line, "%s %s%s\n", call, folder, path);
-    // By the bare system calls, which nobody listens to.
+    // With raw system calls, which are not intercepted.
     const long file = syscall(SYS_openat, AT_FDCWD, report, O_WRONLY | O_APPEND | O_CREAT, 0666);
     if (file >= 0) {
         syscall(SYS_write, file, line, length);

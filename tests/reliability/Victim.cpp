@@ -1,15 +1,15 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Logs and saves until it is killed, and tells after each call that it has returned.
+// Logs and saves until it is killed, and reports after each call that it has returned.
 //
 //     reliability_victim ROOT RUN ENTRIES [NAMED]
 //     reliability_victim ROOT RUN atomically
 //
-// The second only saves, each time by replacing the file in one step. ROOT holds the folder logs/,
-// settings.cfg and report, the shared memory. The log file is closed after every ENTRIES entries,
-// so that the next one opens it again; 0: it stays open. With NAMED the file system knows no files
-// without a name.
+// The second only saves, each time by atomically replacing the file. ROOT contains the folder
+// logs/, settings.cfg and report, the shared memory. The log file is closed after every ENTRIES
+// entries, so that the next one reopens it; 0: it stays open. With NAMED the file system does not
+// support unnamed files.
 
 #include "reliability/Victim.h"
 
@@ -60,7 +60,7 @@ bool saveAtomically(TorkConfigFile& configuration, quint64 run, Victim::Report& 
 
 } // namespace
 
-// In front of the C library's, for Qt.
+// Overrides the C library's, for Qt.
 #ifdef O_TMPFILE
 extern "C" int open64(char const* path, int flags, ...)
 {
@@ -93,7 +93,7 @@ int main(int argc, char** argv)
     if (QByteArray(argv[3]) == "atomically")
         return saveAtomically(configuration, run, *report) ? 0 : 1;
 
-    // Off until the settings are loaded, lest loading them is traced into the file.
+    // Off until the settings are loaded, so that loading them is not traced into the file.
     TorkLog* const log = TorkLog::initialize(root + "logs/", "app", root + "settings.cfg", false);
     report->running = 1;
 

@@ -9,10 +9,10 @@
 
 #include <atomic>
 
-/// The program that logs and saves until it is killed, and what it and its killer agree on.
+/// The program that logs and saves until it is killed, and what it shares with its killer.
 namespace Victim {
 
-/// What the victim tells in memory that both share, and that outlives it.
+/// What the victim reports in shared memory, which outlives it.
 struct Report
 {
     std::atomic<quint64> running;
@@ -22,8 +22,8 @@ struct Report
     std::atomic<quint64> saveReturned;
 };
 
-/// The message of an entry. Most are short; some reach over several pages of memory, and a few are
-/// longer than the file's buffer.
+/// The message of an entry. Most are short; some span several pages of memory, and a few are longer
+/// than the file's buffer.
 inline QByteArray message(quint64 run, quint64 entry)
 {
     const int length = entry % 500 == 499 ? 20000

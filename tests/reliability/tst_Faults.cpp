@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Every file call of the log and of the configuration store fails once, and every one with all
-// that follow it: the walk goes on until an operation is through before its fault comes up.
+// Every file call of the log and of the configuration store fails once, and every one together with
+// all later ones: the test continues until an operation completes before its fault occurs.
 
 #include "common/config/TorkConfigFile.h"
 #include "common/log/TorkLog.h"
@@ -65,7 +65,7 @@ namespace {
 int s_steps = 0;
 int s_bytes = 0;
 
-// The log and a configuration file among files that are none of their business.
+// The log and a configuration file among unrelated files.
 class Scene
 {
 public:
@@ -104,7 +104,7 @@ public:
     TorkLog log;
 };
 
-// For the failed check.
+// For the message of a failed check.
 QByteArray where(Scene const& scene, int step)
 {
     return "step " + QByteArray::number(step) + ": " + scene.files.call().toLatin1() + " of " +
@@ -123,7 +123,7 @@ void write(TorkLog& log, QByteArray const& line)
     log.write(QString::fromLatin1(line));
 }
 
-// The entry is there, once and whole, or the log says that it found no file to write it to.
+// The entry is there, once and whole, or the log reports that it found no file to write it to.
 bool tellsWhatBecameOfIt(Scene const& scene, QByteArray const& content)
 {
     return content.count(during) == 1 ||
@@ -134,7 +134,7 @@ bool tellsWhatBecameOfIt(Scene const& scene, QByteArray const& content)
 
 namespace {
 
-// Most loads here end with a complaint of the XML reader.
+// Most loads here end with an error of the XML reader.
 void dropMessage(QtMsgType, QMessageLogContext const&, QString const&) {}
 
 } // namespace
@@ -162,7 +162,7 @@ void tst_Faults::cleanupTestCase()
 
 void tst_Faults::faults()
 {
-    QTest::addColumn<int>("error"); // 0: writes only a part
+    QTest::addColumn<int>("error"); // 0: writes only part of the data
     QTest::addColumn<bool>("lasts");
 
     QTest::newRow("device error") << EIO << false;
@@ -218,7 +218,7 @@ void tst_Faults::entryIntoOpenFile()
 
 namespace {
 
-// The older files before the rotation, and what no number may hold but.
+// The older files before the rotation, and the only contents that a number may have.
 const QByteArray full(120, 'c');
 const QByteArrayList older = {"first\n", "second\n", "third\n"};
 
@@ -241,7 +241,7 @@ QByteArrayList numbered(Scene const& scene)
     return contents;
 }
 
-// All older files are still there, each whole and once, but for the oldest above the limit.
+// All older files are still there, each whole and once, except for the oldest above the limit.
 bool olderFilesAreKept(Scene const& scene)
 {
     QByteArrayList contents = numbered(scene);
@@ -252,8 +252,8 @@ bool olderFilesAreKept(Scene const& scene)
 
 } // namespace
 
-// Where the current file could not be removed the entry goes over its start, and the next one trims
-// it: that is how the log treats any old content.
+// Where the current file could not be removed the entry overwrites its start, and the next one
+// trims it: that is how the log treats any old content.
 void tst_Faults::entryThatRotates()
 {
     for (int step = 1;; ++step, ++s_steps) {
@@ -280,8 +280,8 @@ void tst_Faults::entryThatRotates()
     }
 }
 
-// The open file is too full and holds old lines behind the last entry. Trimming drops what the file
-// held, so an entry that a fault kept from the disk may go with it; the later one never.
+// The open file is over its limit and has old lines after the last entry. Trimming drops what the
+// file held, so an entry that a fault kept from the disk may go with it; the later one never.
 void tst_Faults::entryThatTrims()
 {
     for (int step = 1;; ++step, ++s_steps) {
@@ -325,7 +325,7 @@ void tst_Faults::closing()
     }
 }
 
-// Makes the log directory, the settings file and the first entries.
+// Creates the log directory, the settings file and the first entries.
 void tst_Faults::firstStart()
 {
     for (int step = 1;; ++step, ++s_steps) {
@@ -375,7 +375,7 @@ void tst_Faults::settingsSaved()
     }
 }
 
-// Every value is the stored one or the one that a file without the key gives.
+// Every value is the stored one or the default for a missing key.
 void tst_Faults::settingsLoaded()
 {
     for (int step = 1;; ++step, ++s_steps) {
@@ -456,8 +456,8 @@ void tst_Faults::configurationSaved()
     }
 }
 
-// The file is the old one or the new one whatever fails, and the result tells which. A link to it
-// stays.
+// The file is the old one or the new one whatever fails, and the result says which. A link to it
+// remains.
 void tst_Faults::configurationReplaced()
 {
     QFETCH(int, error);
@@ -501,7 +501,7 @@ void tst_Faults::configurationReplaced()
             break;
         }
     }
-    // It waits for the file, and for its folder.
+    // It syncs the file and its folder.
     QVERIFY(error == 0 || failedSyncs.contains("viewer.cfg.saving"));
     QVERIFY(error == 0 || failedSyncs.size() >= 2);
 }
@@ -537,7 +537,7 @@ void tst_Faults::configurationLoaded()
     }
 }
 
-// What had room is there, and nothing is said: a save tells only of a file that does not open.
+// What fit is there, and nothing is reported: a save reports only a file that does not open.
 void tst_Faults::diskFullAtEveryByteOfASave()
 {
     for (int step = 0; step <= newConfiguration.size(); ++step, ++s_bytes) {
@@ -563,7 +563,7 @@ void tst_Faults::diskFullAtEveryByteOfASave()
     }
 }
 
-// Beside the file there is no room for another, so it stays the old one.
+// There is no room for another file next to it, so it stays the old one.
 void tst_Faults::diskFullAtEveryByteOfAReplacement()
 {
     for (int step = 0; step <= newConfiguration.size(); ++step, ++s_bytes) {
@@ -586,7 +586,7 @@ void tst_Faults::diskFullAtEveryByteOfAReplacement()
     }
 }
 
-// No older file is lost, none is left half-made; the entries follow when there is room again.
+// No older file is lost, none is left incomplete; the entries continue when there is room again.
 void tst_Faults::diskFullAtEveryByteOfARotation()
 {
     const int most = full.size() + during.size();
@@ -642,7 +642,7 @@ void tst_Faults::diskFullForLong()
         scene.files.mend();
         write(scene.log, after);
 
-        // A short one may still find room that a long one did not.
+        // A short one may still fit where a long one did not.
         QByteArray expected;
         const QByteArray content = TestFiles::read(scene.current());
         for (int i = 0; i < 1000; ++i) {
@@ -657,7 +657,8 @@ void tst_Faults::diskFullForLong()
 
 int main(int argc, char** argv)
 {
-    // Hundreds of scenes are set and struck: not on the disk where there is a folder in memory.
+    // Hundreds of folders are created and removed: in memory rather than on the disk where
+    // possible.
     if (!qEnvironmentVariableIsSet("TMPDIR") && QFileInfo("/dev/shm").isWritable())
         qputenv("TMPDIR", "/dev/shm");
 

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Many threads write at full speed in every way there is, and one writes for a day.
+// Many threads write at full speed in every possible way, and one writes for a day.
 //
 //     VELOCOR_ENTRIES      entries of each of the 16 threads
 //     VELOCOR_DAY_ENTRIES  entries of the day
@@ -63,11 +63,11 @@ TorkLog* startLog(LogFolder const& folder, QString const& maxLogFileSize)
                                           {"maxLogFiles", "100000"},
                                           {"maxLogFileSize", maxLogFileSize}};
     TestFiles::write(folder.settingsFile(), LogFolder::settingsText(settings));
-    // Off until the settings are loaded, lest loading them is traced into the file.
+    // Off until the settings are loaded, so that loading them is not traced into the file.
     return TorkLog::initialize(folder.logs(), "app", folder.settingsFile(), false);
 }
 
-// Lengths differ, lest torn entries fit together again.
+// Different lengths, so that torn entries do not fit together by accident.
 QByteArray text(int thread, int entry)
 {
     return '<' + QByteArray::number(thread) + '.' + QByteArray::number(entry) + ' ' +
@@ -121,7 +121,7 @@ void inThreads(TorkLog& log, int reopenings)
         thread.join();
 }
 
-// The log files, the oldest first.
+// The log files, oldest first.
 QStringList filesIn(QString const& logs)
 {
     QList<int> numbers;
@@ -136,11 +136,12 @@ QStringList filesIn(QString const& logs)
     return files << logs + "app.log";
 }
 
-// Every line is a whole entry, and the next one of its thread: so none is lost, none there twice.
+// Every line is a whole entry, and the next one of its thread, so none is lost and none is
+// duplicated.
 class Counter
 {
 public:
-    // False at the first line that is none.
+    // False at the first line that is not.
     bool take(QString const& path)
     {
         QFile file(path);
@@ -212,7 +213,7 @@ void tst_Load::threads()
 
 namespace {
 
-// Bytes in use; -1 where the heap does not tell.
+// Bytes in use; -1 where the heap does not report them.
 qint64 heapInUse()
 {
 #if defined(TEST_UNDER_ADDRESS_SANITIZER) || defined(TEST_UNDER_THREAD_SANITIZER)
@@ -239,12 +240,12 @@ void writeFor(TorkLog& log, TorkConfigFile& configuration, int entries)
 
 } // namespace
 
-// The first entries are not counted: with them come the buffers that stay. These may still grow a
+// The first entries are not counted: they allocate the buffers that stay. These may still grow a
 // little, but not with the number of entries.
 void tst_Load::aDayLeaksNothing()
 {
     if (heapInUse() < 0)
-        QSKIP("This program's heap does not tell how much of it is in use.");
+        QSKIP("This system does not report heap usage.");
 
     const int entries = Figures::wanted("VELOCOR_DAY_ENTRIES", 86400);
     LogFolder folder;
@@ -277,7 +278,7 @@ void tst_Load::cleanupTestCase()
 
 int main(int argc, char** argv)
 {
-    // Without a time zone in the environment the C library reads the system's anew for every local
+    // Without a time zone in the environment the C library rereads the system's for every local
     // time, under a lock that ThreadSanitizer does not see.
     qputenv("TZ", "UTC");
     QDateTime::currentDateTime().toString();

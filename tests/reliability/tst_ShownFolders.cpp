@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The one place from which the program has another one started: it shows folders in the desktop's
-// file manager. Whatever they are called, their address arrives as one argument and no shell reads
+// The only place from which the program starts another one: it shows folders in the desktop's file
+// manager. Whatever they are called, their address arrives as one argument and no shell interprets
 // it.
 
 #include "app/window/PlacesPanel.h"
@@ -32,7 +32,7 @@ private:
     int m_arrived = 0;
 };
 
-// A program of our own stands where the toolkit looks, once, for the desktop's.
+// A program of our own is found where Qt looks, once, for the desktop's.
 void tst_ShownFolders::initTestCase()
 {
     if (QGuiApplication::platformName() != "xcb")
@@ -47,7 +47,7 @@ void tst_ShownFolders::initTestCase()
     QVERIFY(QFile::setPermissions(m_opener, own));
     qputenv("PATH", QFile::encodeName(bin) + ':' + qgetenv("PATH"));
 
-    // What a shell would make would be made there.
+    // Anything that a shell creates would be created there.
     const QString work = m_folder.path() + "/work";
     QVERIFY(QDir().mkpath(work) && QDir::setCurrent(work));
 }

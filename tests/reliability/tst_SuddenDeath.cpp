@@ -1,10 +1,10 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// A program that logs and saves is killed at a random moment and started again, over and over.
-// After each death the files are held against what the program had been told was done.
+// A program that logs and saves is killed at a random moment and restarted, over and over. After
+// each death the files are compared with what the program had been told was done.
 //
-//     VELOCOR_KILLS  how often, all in all
+//     VELOCOR_KILLS  how often, in total
 
 #include "common/log/TorkLog.h"
 #include "log/LogFolder.h"
@@ -43,7 +43,7 @@ private:
 
 namespace {
 
-// Rotation as the settings file of a row has it.
+// Rotation as set in a row's settings file.
 struct Rotation
 {
     int maxLogFiles;
@@ -59,18 +59,18 @@ struct Rotation
     }
 };
 
-// What a log file holds: entries of one run in a row from its start, then perhaps a part of the
-// next one, and then what an older run has left.
+// The contents of a log file: consecutive entries of one run from its start, then perhaps a part of
+// the next one, and then what an older run has left.
 struct Stretch
 {
     quint64 run = 0;
     quint64 first = 0;
     quint64 last = 0; // of the whole ones
-    int part = 0;     // bytes of the one behind
+    int part = 0;     // bytes of the one that follows
     QByteArray rest;
 
     // An older run's entry may begin with the same few bytes; only from the run's number on is it
-    // sure whose part it is.
+    // certain which one it belongs to.
     bool endsInHalf() const { return part > Victim::line(run, last + 1).indexOf('.'); }
 };
 
@@ -100,7 +100,7 @@ Stretch stretchOf(QByteArray const& content)
     return stretch;
 }
 
-// The log files by their number; the current one has 0.
+// The log files by number; the current one is 0.
 using Files = QMap<int, QByteArray>;
 
 Files filesIn(QString const& logs)
@@ -115,14 +115,14 @@ Files filesIn(QString const& logs)
     return files;
 }
 
-// How many copies were cut short that have a name.
+// How many named copies were cut short.
 int unfinishedCopies(QString const& logs)
 {
     return QDir(logs).entryList({"app.log.1.*.part"}, QDir::Files | QDir::Hidden).size();
 }
 
 // Whether no other file is left in the log directory. A copy that was cut short has no name; only
-// where the file system knows no such files it has one, until the next rotation.
+// where the file system does not support that it has one, until the next rotation.
 bool holdsOnlyTheLog(QString const& logs, bool isNamed)
 {
     const QStringList names = QDir(logs).entryList(QDir::Files | QDir::Hidden);
@@ -143,9 +143,9 @@ public:
         report = reinterpret_cast<Victim::Report*>(m_file.map(0, sizeof(Victim::Report)));
     }
 
-    // False if it did not come to life or ended by itself.
+    // False if it did not start or ended by itself.
     //
-    // @param task  the victim's last argument but for "named"
+    // @param task  the victim's last argument, except for "named"
     bool runAndKill(quint64 run, QByteArray const& task, bool isNamed = false)
     {
         new (report) Victim::Report{};
@@ -184,7 +184,7 @@ private:
     std::mt19937 m_random{std::random_device()()};
 };
 
-// What is found wrong is told in a text; empty: nothing.
+// Errors are reported as a text; empty: none.
 
 QString wrongInEntries(Files const& files, quint64 run, Victim::Report const& report,
                        Rotation const& rotation)
@@ -206,14 +206,14 @@ QString wrongInEntries(Files const& files, quint64 run, Victim::Report const& re
                                   .arg(stretch.last)
                                   .arg(stretch.part);
         if (rotation.rotates && !stretch.rest.isEmpty())
-            return where + "something else behind them";
+            return where + "something else after them";
         if (stretch.run != run)
             continue;
 
         if (stretch.rest.contains('<' + QByteArray::number(run) + '.'))
-            return where + "entries of the same run behind half an entry";
+            return where + "entries of the same run after half an entry";
         if (isOver)
-            return where + "entries of the same run behind half an entry in the file before";
+            return where + "entries of the same run after half an entry in the file before";
         isOver = stretch.endsInHalf();
         if (next == 0 && stretch.first != 1 && files.lastKey() < rotation.maxLogFiles)
             return where + "those before are lost";
@@ -248,7 +248,7 @@ QString wrongInOlderFiles(Files const& before, Files const& after, quint64 shift
     return QString();
 }
 
-// The last save that returned is there, or as much of the one begun after it as was written.
+// The last save that returned is there, or as much of the next one as was written.
 QString wrongInConfiguration(QByteArray const& before, QByteArray const& after, quint64 run,
                              Victim::Report const& report)
 {
@@ -277,7 +277,7 @@ quint64 s_leftovers = 0;
 
 namespace {
 
-// Of a save that was cut the XML reader complains.
+// The XML reader complains about a truncated save.
 void dropMessage(QtMsgType, QMessageLogContext const&, QString const&) {}
 
 } // namespace
@@ -298,7 +298,7 @@ void tst_SuddenDeath::killed_data()
     QTest::addColumn<int>("maxLogFiles");
     QTest::addColumn<int>("entriesBetween");
     QTest::addColumn<bool>("rotates");
-    QTest::addColumn<bool>("isNamed"); // the file system knows no files without a name
+    QTest::addColumn<bool>("isNamed"); // the file system does not support unnamed files
 
     QTest::newRow("each run writes over the one before") << 10 << 0 << false << false;
     QTest::newRow("each start rotates") << 6 << 0 << true << false;
@@ -359,8 +359,8 @@ void tst_SuddenDeath::killed()
     }
 }
 
-// The file is a whole one each time: that of the last save that returned, or of the one under way.
-// Beside it is at most the new file of that one.
+// The file is complete each time: that of the last save that returned, or of the one in progress.
+// Next to it is at most the new file of that one.
 void tst_SuddenDeath::killedWhileReplacing()
 {
     const LogFolder folder;
@@ -406,7 +406,7 @@ void tst_SuddenDeath::cleanupTestCase()
 {
     if (m_failed)
         return;
-    // Either may have been asked for alone.
+    // Either may have been requested alone.
     if (s_kills) {
         QVERIFY(s_entries > 0 && s_saves > 0);
         Figures::print(

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Faults that the system itself makes: a full disk, a folder that takes no new file, no descriptor
-// left, a folder that is gone.
+// Faults that the system itself produces: a full disk, a folder that accepts no new files, no
+// descriptor left, a folder that is gone.
 
 #include "common/config/TorkConfigFile.h"
 #include "common/log/TorkLog.h"
@@ -39,7 +39,7 @@ void write(TorkLog& log, QByteArray const& line)
     log.write(QString::fromLatin1(line));
 }
 
-// A small file system of its own in a folder, while it lives.
+// A small file system in a folder, mounted while it lives.
 class SmallDisk
 {
 public:
@@ -74,7 +74,8 @@ private:
 
 } // namespace
 
-// A rotation loses what was to become number 1, a save is cut, and both go on when there is room.
+// A rotation loses what was to become number 1, a save is cut, and both continue when there is
+// room.
 void tst_SystemLimits::fullDisk()
 {
     LogFolder folder;
@@ -116,7 +117,7 @@ void tst_SystemLimits::fullDisk()
 
 namespace {
 
-// Rotates in a folder that takes no new file, of a log that may be written all the same.
+// Rotates in a folder that accepts no new files, where the log itself may be written.
 int rotatesInReadOnlyFolder(QStringList const& arguments)
 {
     QString const& logs = arguments.at(0);
@@ -166,7 +167,7 @@ void tst_SystemLimits::readOnlyFolder()
 
 namespace {
 
-// Allows no more open files than there are, or all again.
+// Allows no more open files than there are now, or restores the limit.
 bool allowMoreFiles(bool allow)
 {
 #ifdef NEEDS_DESCRIPTORS
@@ -236,7 +237,7 @@ void tst_SystemLimits::tooManyOpenFiles()
     m_shown.append("too many open files");
 }
 
-// What goes to the open file is gone with it; the next opening makes the folder anew.
+// What goes to the open file is lost with it; the next opening creates the folder again.
 void tst_SystemLimits::folderRemoved()
 {
     LogFolder folder;

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// What the program and the framework do to the files of their user: nothing outside the places
-// that are theirs, nobody else's rights, no other target by way of a link, and no shell.
+// What the program and the framework do to their user's files: nothing outside their own places, no
+// permissions for others, no other target through a link, and no shell.
 
 #include "common/config/TorkConfigFile.h"
 #include "common/log/TorkLog.h"
@@ -57,7 +57,7 @@ namespace {
 int s_files = 0;
 int s_names = 0;
 
-// Sets the rights that new files do not get, and puts them back.
+// Sets the permissions that new files do not get, and restores them.
 class Mask
 {
 public:
@@ -85,8 +85,8 @@ void write(TorkLog& log, QByteArray const& line)
     log.write(QString::fromLatin1(line));
 }
 
-// The notes of FileRecorder.cpp: what was done, and to which file. What a program counts that is
-// built to measure coverage is no part of its work.
+// The records of FileRecorder.cpp: what was done, and to which file. The counters that a coverage
+// build writes are ignored.
 struct Note
 {
     QString call;
@@ -104,8 +104,8 @@ QList<Note> notesIn(QString const& report)
     return notes;
 }
 
-// The notes that are about none of these folders and what lies in them. Folders on the way there
-// may be made.
+// The records that concern none of these folders or their contents. Folders on the way there may be
+// created.
 QStringList strayNotes(QList<Note> const& notes, QStringList const& folders)
 {
     QStringList stray;
@@ -136,7 +136,7 @@ QProcessEnvironment watched(QString const& report)
     return environment;
 }
 
-// The program in a home of its own, started and ended as its user would from a terminal.
+// The program in its own home folder, started and ended as its user would from a terminal.
 class Program
 {
 public:
@@ -155,7 +155,7 @@ public:
         environment.insert("QT_QPA_PLATFORM", "offscreen");
     }
 
-    // The folder of data and log.
+    // The folder that contains data and log.
     QString data() const { return m_top + "data/yourorganization/yourproduct/"; }
 
     bool run() const
@@ -204,11 +204,12 @@ void tst_Trust::programWritesInItsOwnPlaces_data()
     QTest::newRow("later start that rotates the log") << true;
 }
 
-// Fonts and the desktop's services are the toolkit's business; where it keeps them is told apart.
+// Fonts and the desktop's services are up to Qt; the places where it keeps them are listed
+// separately.
 void tst_Trust::programWritesInItsOwnPlaces()
 {
     if (QStringLiteral(FILE_RECORDER).isEmpty())
-        QSKIP("The sanitizers do not let a library be loaded in front of them.");
+        QSKIP("The sanitizers do not allow a preloaded library.");
     QFETCH(bool, hasRunBefore);
     LogFolder folder;
     const Program program(folder.root());
@@ -217,9 +218,9 @@ void tst_Trust::programWritesInItsOwnPlaces()
     QVERIFY(program.run());
 
     const QList<Note> notes = notesIn(program.report);
-    const QStringList ofTheToolkit = {folder.root() + "run/",
-                                      folder.root() + "home/.cache/fontconfig/"};
-    QCOMPARE(strayNotes(notes, ofTheToolkit + QStringList(program.data())), QStringList());
+    const QStringList qtFolders = {folder.root() + "run/",
+                                   folder.root() + "home/.cache/fontconfig/"};
+    QCOMPARE(strayNotes(notes, qtFolders + QStringList(program.data())), QStringList());
     QVERIFY(contains(notes, "open", program.data() + "logs/velocor.log"));
     QCOMPARE(contains(notes, "link", program.data() + "logs/velocor.log.1"), hasRunBefore);
     s_files += notes.size();
@@ -227,7 +228,7 @@ void tst_Trust::programWritesInItsOwnPlaces()
 
 namespace {
 
-// Logs with rotation, saves and loads; the shell would find work in all names.
+// Logs with rotation, saves and loads; all names contain something for a shell to execute.
 int works(QStringList const& arguments)
 {
     QString const& root = arguments.at(0);
@@ -261,7 +262,7 @@ ChildProcess::Result runWatched(QString const& report, QStringList const& argume
 void tst_Trust::frameworkWritesWhereItIsTold()
 {
     if (QStringLiteral(FILE_RECORDER).isEmpty())
-        QSKIP("The sanitizers do not let a library be loaded in front of them.");
+        QSKIP("The sanitizers do not allow a preloaded library.");
     LogFolder folder;
     LogFolder reports;
     const QString report = reports.root() + "report";
@@ -279,7 +280,7 @@ void tst_Trust::frameworkWritesWhereItIsTold()
 void tst_Trust::recorderSeesPrograms()
 {
     if (QStringLiteral(FILE_RECORDER).isEmpty())
-        QSKIP("The sanitizers do not let a library be loaded in front of them.");
+        QSKIP("The sanitizers do not allow a preloaded library.");
     LogFolder folder;
     const QString report = folder.root() + "report";
     QProcess process;
@@ -365,7 +366,7 @@ void tst_Trust::linkToNothingAsCurrentFile()
     QVERIFY(isLink(folder.logs() + "app.log"));
 }
 
-// The link goes, its target stays as it is; number 1 is a copy.
+// The link is removed, its target is unchanged; number 1 is a copy.
 void tst_Trust::linkAsCurrentFileIsRotated()
 {
     LogFolder folder;
@@ -402,7 +403,7 @@ void tst_Trust::linksAsOlderFiles()
     QCOMPARE(TestFiles::read(folder.root() + "two"), QByteArray("two\n"));
 }
 
-// It stands in the way like anything that cannot be moved, and nothing is made behind it.
+// It is in the way like anything that cannot be moved, and nothing is created through it.
 void tst_Trust::linkToNothingAsNumberOne()
 {
     LogFolder folder;
@@ -431,7 +432,7 @@ void tst_Trust::linkAsConfiguration()
 
 namespace {
 
-// As a user without rights, in a folder where everybody may write.
+// As an unprivileged user, in a folder where everybody may write.
 int writesThroughLinks(QStringList const& arguments)
 {
     if (!ProcessLimits::becomeOrdinaryUser())
@@ -450,11 +451,11 @@ int writesThroughLinks(QStringList const& arguments)
 
 } // namespace
 
-// A link lends nobody rights: what the user may not write is not written by way of it.
+// A link grants nobody permissions: what the user may not write is not written through it.
 void tst_Trust::linkOfAnotherUser()
 {
     if (geteuid() != 0)
-        QSKIP("Only the administrator has files that another user may not write.");
+        QSKIP("Only root has files that another user may not write.");
     LogFolder folder;
     QFile::setPermissions(folder.root(), QFile::Permissions(0x7755));
     QFile::setPermissions(folder.logs(), QFile::Permissions(0x7777));
@@ -487,7 +488,7 @@ void tst_Trust::namesReachNoShell_data()
     QTest::newRow("variable and home") << "~$HOME";
 }
 
-// Folder, log and configuration file have that name; entries and values hold commands anyway.
+// Folder, log and configuration file have that name; entries and values contain commands anyway.
 void tst_Trust::namesReachNoShell()
 {
     QFETCH(QString, name);

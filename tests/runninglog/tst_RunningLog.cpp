@@ -35,7 +35,7 @@ private slots:
     void healthDirectoryInTheWay();
 };
 
-// Where the window looks for others.
+// Where the window looks for other programs.
 static QString runningFolder(TestRun const& test)
 {
     return test.folder() + "data/running-app.log";
@@ -56,7 +56,7 @@ void tst_RunningLog::preferences()
     preferences.filePrefix = "other";
     QCOMPARE(preferences.Apply(), QString());
 
-    // The first two hold at once, the others from the next start on.
+    // The first two take effect immediately, the others at the next start.
     QCOMPARE(RunningLog::DateFormat(), QString("yyyy-MM-dd hh:mm:ss.z"));
     QCOMPARE(RunningLog::ElapsedPrefix(), QString("dT:"));
     TorkLog::logger()->trace("x");
@@ -65,7 +65,7 @@ void tst_RunningLog::preferences()
     QCOMPARE(TorkLog::logger()->maxLogFiles(), 7U);
     QCOMPARE(LogPreferences::Read().filePrefix, QString("other"));
 
-    // The log opens its file before it knows of the other name, and the window goes by the file.
+    // The log opens its file before it knows the other name, and the window follows the file.
     TorkLog::shutdown();
     QVERIFY(QFile::remove(test.logFile()));
     TorkLog::initialize(test.folder() + "data/logs/", "app", QString(), true);
@@ -103,7 +103,7 @@ void tst_RunningLog::preferencesCannotBeSaved()
     preferences.maxFiles = 7;
     QCOMPARE(preferences.Apply(), "Unable to save " + file + ": Is a directory");
 
-    // The running log is as it was.
+    // The running log is unchanged.
     TorkLog const* log = TorkLog::logger();
     QCOMPARE(log->enabled(), true);
     QCOMPARE(log->logElapsedTime(), false);
@@ -117,7 +117,7 @@ void tst_RunningLog::preferencesInAnotherFile()
     const QString file = test.folder() + "elsewhere/my.cfg";
     TorkLog::logger()->setPreferencesFileName(file);
     QCOMPARE(LogPreferences::FileName(), file);
-    QCOMPARE(LogPreferences::Read().filePrefix, QString("app")); // in force, as the file is missing
+    QCOMPARE(LogPreferences::Read().filePrefix, QString("app")); // in effect: no file
 
     LogPreferences preferences = LogPreferences::Read();
     preferences.maxFiles = 7;
@@ -128,7 +128,7 @@ void tst_RunningLog::preferencesInAnotherFile()
     QCOMPARE(TorkLog::logger()->filePrefix(), QString("app"));
 }
 
-// Another log in the folder, newer than the open one, is not taken for it.
+// Another log in the folder, newer than the open one, is not mistaken for it.
 void tst_RunningLog::fileNameIsTheOpenOne()
 {
     const TestRun test;
@@ -189,7 +189,7 @@ void tst_RunningLog::instancesLeaveNothing()
     QVERIFY(!QFile::exists(runningFolder(test)));
 }
 
-// A program that was killed does not count any more.
+// A program that was killed is no longer counted.
 void tst_RunningLog::instanceLeftBehind()
 {
     const TestRun test;
@@ -227,7 +227,7 @@ void tst_RunningLog::healthDirectoryInTheWay()
     QCOMPARE(health.Check(), QString());
 }
 
-// Started with "--hold FILE" it is another program that shares a log, until its input ends.
+// Started with "--hold FILE" this is another program that shares a log, until its input ends.
 int main(int argc, char** argv)
 {
     QCoreApplication application(argc, argv);

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Reading configuration-store files beside the store, and saving them through it.
+// Compares reading configuration-store files with the store, and saves them through it.
 
 #include "app/settingsfile/SettingsFileReader.h"
 #include "app/settingsfile/SettingsFileWriter.h"
@@ -124,7 +124,7 @@ void tst_SettingsFile::readsWhatTheStoreReads_data()
     QTest::newRow("entities") << QByteArray("<S><a>x&amp;y</a><b>&lt;</b></S>");
     QTest::newRow("CDATA in pieces") << QByteArray("<S><a>x<![CDATA[y]]>z</a></S>");
     QTest::newRow("nested") << QByteArray("<S><a><b>1</b></a><c>2</c></S>");
-    QTest::newRow("nested behind a text") << QByteArray("<S><a>0<b>1</b></a></S>");
+    QTest::newRow("nested after a text") << QByteArray("<S><a>0<b>1</b></a></S>");
     QTest::newRow("no text") << QByteArray("<S><a/></S><T>text<b>1</b></T>");
     QTest::newRow("called like the root") << QByteArray("<R><a>1</a></R><S><R>2</R><b>3</b></S>");
     QTest::newRow("comment in a value") << QByteArray("<S><a>x<!-- c -->y</a></S>");
@@ -224,7 +224,7 @@ void tst_SettingsFile::losses_data()
     QTest::newRow("null character") << QString("a") + QChar(0) << true;
 }
 
-// What is said to be kept comes back the same, what is said to be lost does not.
+// What is reported as kept comes back unchanged, what is reported as lost does not.
 void tst_SettingsFile::losses()
 {
     QFETCH(QString, value);
@@ -273,7 +273,7 @@ void tst_SettingsFile::lossesOfNames()
     QTEST(SettingsFileWriter::Losses(document), "expected");
 }
 
-// Neither where settings are kept nor where temporary files are.
+// Neither in the settings folder nor in the temporary one.
 void tst_SettingsFile::lossesWriteNoFile()
 {
     const QTemporaryDir folder;

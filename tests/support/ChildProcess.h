@@ -13,10 +13,10 @@
 #include <QStringList>
 #include <QtTest>
 
-/// Cases that need a process of their own: because they look at what goes to the standard error
-/// output, may hang, end the process, or change what it is allowed to do.
+/// Cases that need their own process: because they check what goes to standard error, may hang, end
+/// the process, or change what it is allowed to do.
 ///
-/// A case is a function of the test program; the program starts itself once more to run it.
+/// A case is a function of the test program; the program starts itself again to run it.
 ///
 ///     int echoes(QStringList const& arguments) { ...; return 0; }
 ///
@@ -35,7 +35,7 @@ namespace ChildProcess {
 
 using Case = int (*)(QStringList const& arguments);
 
-/// What a case returns when this machine cannot show what it is about.
+/// What a case returns when it cannot be tested on this machine.
 const int skipped = 77;
 
 struct Result
@@ -66,7 +66,7 @@ inline Result run(QString const& name, QStringList const& arguments = QStringLis
     QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
     environment.remove("QT_LOGGING_RULES");
     environment.remove("QT_MESSAGE_PATTERN");
-    // Later releases of the toolkit complain about this name on the very output that is compared.
+    // Later releases of Qt complain about this name on the very output that is compared.
     environment.remove("QT_LOGGING_TO_CONSOLE");
     environment.insert("QT_FORCE_STDERR_LOGGING", "1");
     if (!environment.contains("LC_ALL")) // a test may be about another language

@@ -7,7 +7,7 @@
 #include <QString>
 #include <QTime>
 
-/// Log files for tests and pictures of the window.
+/// Log files for tests and screenshots of the window.
 namespace DemoLog {
 
 /// One entry, stamped on 3 March 2025 or the day before.
@@ -18,8 +18,8 @@ inline QByteArray entry(QString const& time, char const* severity, QString const
     return QString("%1 %2 %3 %4\n").arg(day, time, severity, message).toLatin1();
 }
 
-/// The text that a run has written over that of the run before, as the log does it: the newest run
-/// on top, the rest of the older one behind it, torn where the newest ends.
+/// The text that a run has written over that of the previous run, as the log does it: the newest
+/// run first, followed by the rest of the older one, cut where the newest ends.
 inline QByteArray writtenOver(QByteArray const& older, QByteArray const& newer)
 {
     return newer + older.mid(newer.size());
@@ -37,7 +37,7 @@ inline QByteArray run(int count, QTime time, char const* what, bool dayBefore = 
     return text;
 }
 
-/// What a lively program may have written in its newest run and the one before.
+/// What a busy program may have written in its newest run and the previous one.
 inline QByteArray lifelike()
 {
     QByteArray older;

@@ -8,9 +8,9 @@
 #include <QStringList>
 #include <QtGlobal>
 
-/// Collects the toolkit's messages while it lives, and then gives the channel back.
+/// Collects Qt messages while it lives, then restores the previous handler.
 ///
-/// One at a time. Any thread may issue messages meanwhile.
+/// One at a time. Messages may come from any thread.
 ///
 ///     MessageCapture messages;
 ///     qWarning("no");
@@ -22,7 +22,7 @@ public:
     {
         QtMsgType type;
         QString category;
-        bool hasPlace; ///< whether a file, a line or a function came along
+        bool hasPlace; ///< whether it came with a file, a line or a function
         QString text;
     };
 
@@ -46,7 +46,7 @@ public:
         return m_messages;
     }
 
-    /// One text a message, its type in front: "debug: ", "info: ", "warning: ", "critical: ".
+    /// One text per message, prefixed by its type: "debug: ", "info: ", "warning: ", "critical: ".
     QStringList texts() const
     {
         QStringList result;

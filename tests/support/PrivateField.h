@@ -3,9 +3,9 @@
 
 #pragma once
 
-/// Reaches a private field that no operation sets, for the rules that depend on it all the same.
+/// Accesses a private field that no operation sets, for the rules that depend on it anyway.
 ///
-/// Explicit instantiations may name private members: that is all there is to it.
+/// Explicit instantiations may name private members; this relies on nothing else.
 ///
 ///     struct Extension { using Field = QString TorkLog::*; friend Field privateField(Extension);
 ///     }; template struct PrivateField<Extension, &TorkLog::m_fileExtension>;

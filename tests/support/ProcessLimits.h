@@ -16,14 +16,14 @@
 #include <sys/prctl.h>
 #endif
 
-/// Takes rights away from the running process. Except for OrdinaryUser there is no way back: for
-/// child processes only.
+/// Takes privileges away from the running process. Except for OrdinaryUser this cannot be undone:
+/// for child processes only.
 namespace ProcessLimits {
 
-/// The user who owns nothing. To the administrator the permissions of files mean nothing.
+/// The user who owns nothing. File permissions do not apply to root.
 constexpr unsigned NobodyId = 65534;
 
-/// A process that changed its user is closed to tracing, which leak checkers depend on.
+/// A process that changed its user cannot be traced, which leak checkers depend on.
 inline void allowTracing()
 {
 #ifdef Q_OS_LINUX
@@ -31,8 +31,8 @@ inline void allowTracing()
 #endif
 }
 
-/// Makes the permissions of files hold for the rest of the process: the administrator becomes a
-/// user without rights. Returns false where that is not possible.
+/// Makes file permissions apply for the rest of the process: root becomes an unprivileged user.
+/// Returns false where that is not possible.
 inline bool becomeOrdinaryUser()
 {
 #ifdef Q_OS_UNIX
@@ -47,7 +47,7 @@ inline bool becomeOrdinaryUser()
 #endif
 }
 
-/// Makes the permissions of files hold while this object lives.
+/// Makes file permissions apply while this object lives.
 class OrdinaryUser
 {
     Q_DISABLE_COPY(OrdinaryUser)
@@ -65,12 +65,12 @@ public:
     {
 #ifdef Q_OS_UNIX
         if (m_changed && seteuid(0) != 0)
-            qFatal("cannot become the administrator again");
+            qFatal("cannot become root again");
         allowTracing();
 #endif
     }
 
-    /// Whether permissions hold; if not, the test cannot run here.
+    /// Whether permissions apply; if not, the test cannot run here.
     bool isInForce() const
     {
         return m_isInForce;
@@ -82,7 +82,7 @@ private:
     bool m_isInForce = false;
 };
 
-/// Lifts the limit of limitFileSize() again.
+/// Lifts the limit of limitFileSize().
 inline bool unlimitFileSize()
 {
 #ifdef Q_OS_UNIX
@@ -97,13 +97,13 @@ inline bool unlimitFileSize()
 }
 
 /// From now on no file grows beyond this number of bytes: writing fails as on a full disk. The
-/// limit ends with the program, before a build that measures coverage adds its counts to a file.
+/// limit is lifted when the program ends, before a coverage build writes its counters to a file.
 inline bool limitFileSize(unsigned long bytes)
 {
 #ifdef Q_OS_UNIX
     std::atexit([] { unlimitFileSize(); });
-    // By default the system would kill this process, as it would any program that does not ask for
-    // failed writes.
+    // By default the system would kill this process, as it would any program that does not choose
+    // to handle failed writes.
     std::signal(SIGXFSZ, SIG_IGN);
     rlimit limit = {};
     if (getrlimit(RLIMIT_FSIZE, &limit) != 0)
@@ -116,7 +116,7 @@ inline bool limitFileSize(unsigned long bytes)
 #endif
 }
 
-/// For processes that are meant to die: no memory image is left behind.
+/// For processes that are meant to die: no core dump is written.
 inline void leaveNoCoreFile()
 {
 #ifdef Q_OS_UNIX

@@ -3,8 +3,8 @@
 
 #pragma once
 
-// Whether this is built for a sanitizer, which each compiler says in its own way. A watched program
-// has a heap of its own and takes more memory.
+// Whether this is a sanitizer build, which each compiler reports in its own way. An instrumented
+// program has its own heap and uses more memory.
 
 #if defined(__has_feature)
 #if __has_feature(address_sanitizer)

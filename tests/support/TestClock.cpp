@@ -7,14 +7,14 @@
 
 namespace {
 
-bool s_stands = false;
+bool s_isSet = false;
 qint64 s_time = 0; // milliseconds since the epoch
 
 } // namespace
 
 void TestClock::set(QDateTime const& now)
 {
-    s_stands = true;
+    s_isSet = true;
     s_time = now.toMSecsSinceEpoch();
 }
 
@@ -25,15 +25,15 @@ void TestClock::advance(qint64 milliseconds)
 
 void TestClock::release()
 {
-    s_stands = false;
+    s_isSet = false;
 }
 
-// A program's own definitions are linked before the toolkit's, so every caller in it comes here.
+// A program's own definitions take precedence over Qt's, so every caller in it ends up here.
 
 qint64 QDateTime::currentMSecsSinceEpoch() noexcept
 {
     using namespace std::chrono;
-    if (s_stands)
+    if (s_isSet)
         return s_time;
     return duration_cast<milliseconds>(system_clock::now().time_since_epoch()).count();
 }

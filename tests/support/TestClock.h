@@ -5,11 +5,11 @@
 
 #include <QDateTime>
 
-/// The clock behind QDateTime::currentDateTime() and QDateTime::currentMSecsSinceEpoch() in
+/// The clock that QDateTime::currentDateTime() and QDateTime::currentMSecsSinceEpoch() read in
 /// programs that are built with TestClock.cpp.
 ///
-/// It runs with the system's until it is set; then it stands still. Set it while no other thread
-/// asks for the time.
+/// It follows the system clock until it is set; then it stops. Set it only while no other thread
+/// reads the time.
 namespace TestClock {
 
 void set(QDateTime const& now);

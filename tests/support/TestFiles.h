@@ -13,13 +13,13 @@
 
 #include <algorithm>
 
-/// Whole files in, whole files out, for tests that compare what a program leaves on the disk.
+/// Reads and writes whole files, for tests that compare what a program leaves on the disk.
 ///
 ///     TestFiles::write(folder + "app.log", "old\n");
 ///     QCOMPARE(TestFiles::listing(folder), QStringList({"app.log: old\n"}));
 namespace TestFiles {
 
-/// Replaces the file by these bytes and makes the folders above it.
+/// Replaces the file's contents with these bytes and creates its parent folders.
 inline bool write(QString const& path, QByteArray const& bytes)
 {
     QDir().mkpath(QFileInfo(path).path());
@@ -31,7 +31,7 @@ inline bool write(QString const& path, QByteArray const& bytes)
     return file.write(bytes) == bytes.size();
 }
 
-/// The bytes of a file; of one that does not open, a text that no test expects.
+/// The bytes of a file; if it does not open, a text that no test expects.
 inline QByteArray read(QString const& path)
 {
     QFile file(path);
@@ -40,7 +40,7 @@ inline QByteArray read(QString const& path)
     return file.readAll();
 }
 
-/// The entries of a listing in the order of their names.
+/// The entries of a listing, sorted by name.
 inline QStringList sorted(QStringList entries)
 {
     std::sort(entries.begin(), entries.end(), [](QString const& left, QString const& right) {
@@ -49,8 +49,8 @@ inline QStringList sorted(QStringList entries)
     return entries;
 }
 
-/// Everything below a folder, hidden entries too, in the order of the names: "name: content" for a
-/// file, "name/" for a folder. Bytes are shown as Latin-1.
+/// Everything below a folder, including hidden entries, sorted by name: "name: content" for a file,
+/// "name/" for a folder. Bytes are shown as Latin-1.
 inline QStringList listing(QString const& folder)
 {
     QStringList entries;

@@ -10,12 +10,12 @@
 #include <QTemporaryDir>
 #include <QVariant>
 
-/// A program's surroundings for tests: identity, directories and a log, all in a folder that goes
-/// when the object does.
+/// A program's surroundings for tests: identity, directories and a log, all in a folder that is
+/// removed with the object.
 class TestRun
 {
 public:
-    /// @param log  what stands in the log file before anything opens it
+    /// @param log  contents of the log file before anything opens it
     explicit TestRun(QByteArray const& log = QByteArray())
     {
         m_handler = qInstallMessageHandler(nullptr);

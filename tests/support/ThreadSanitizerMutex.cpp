@@ -1,10 +1,10 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// QMutex lives in the toolkit's library, which is not built for ThreadSanitizer, and it rests on
-// system calls that the sanitizer does not know: what a mutex protects would look like a data race.
-// This program's own definitions stand in front of the library's, call them, and tell the sanitizer
-// what they did. Without the sanitizer this file is empty.
+// QMutex is part of the Qt library, which is not built for ThreadSanitizer, and it relies on system
+// calls that the sanitizer does not know: anything a mutex protects would look like a data race.
+// This program's own definitions take precedence over the library's, call them, and tell the
+// sanitizer what they did. Without the sanitizer this file is empty.
 
 #include "support/Sanitizers.h"
 
@@ -29,8 +29,8 @@ Function original(const char* name)
 
 } // namespace
 
-// The test library's own time keeper: it ends its thread and deletes what the thread used, in an
-// order that rests on those same system calls.
+// QtTest's own watchdog ends its thread and deletes what the thread used, in an order that relies
+// on those same system calls.
 extern "C" const char* __tsan_default_suppressions()
 {
     return "race:^QWaitCondition::~QWaitCondition\n"

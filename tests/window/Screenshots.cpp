@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Makes pictures of every view of the window, in light and dark:
+// Takes screenshots of every view of the window, in light and dark:
 //
 //     window_screenshots FOLDER
 //
@@ -51,7 +51,7 @@ QPalette DarkPalette()
 {
     const QColor text(0xe6, 0xe6, 0xe6);
     const QColor window(0x2b, 0x2d, 0x30);
-    QPalette palette(QColor(0x36, 0x38, 0x3c), window); // works the shades out
+    QPalette palette(QColor(0x36, 0x38, 0x3c), window); // computes the shades
     palette.setColor(QPalette::Window, window);
     palette.setColor(QPalette::WindowText, text);
     palette.setColor(QPalette::Base, QColor(0x1e, 0x1f, 0x22));

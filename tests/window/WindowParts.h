@@ -12,7 +12,7 @@
 
 #include <QAction>
 
-/// The parts of a window, found as assistive technology finds them.
+/// The parts of a window, found the way assistive technology finds them.
 namespace WindowParts {
 
 constexpr int Patience = 20000; // milliseconds

@@ -14,27 +14,27 @@
 #include <functional>
 #include <memory>
 
-/// A program's surroundings, and what tests of its window do in them.
+/// A program's surroundings, and common operations of the tests of its window.
 class WindowTest : public TestRun
 {
 public:
     using TestRun::TestRun;
 
-    /// A window on the screen, with the keyboard and with its log read.
+    /// A window on the screen, with keyboard focus and its log read.
     static std::unique_ptr<Velocor::MainWindow> show()
     {
         auto window = std::make_unique<Velocor::MainWindow>();
         window->show();
-        // Where no window manager does it, the window has to ask for the keyboard itself.
+        // Without a window manager, the window has to take the keyboard focus itself.
         if (QTest::qWaitForWindowExposed(window.get()))
             window->activateWindow();
         if (!QTest::qWaitForWindowActive(window.get()))
-            qWarning("the window does not get the keyboard");
+            qWarning("the window does not get the keyboard focus");
         return window;
     }
 
-    /// Does something with the modal dialog that comes up next, soon after it is on the screen. The
-    /// dialog is closed if the test fails meanwhile, or else nothing would go on behind it.
+    /// Runs a function with the next modal dialog, soon after it appears. The dialog is closed if
+    /// the test fails in the meantime; otherwise it would block everything else.
     template <class Dialog>
     static void whenShown(std::function<void(Dialog*)> const& work)
     {

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Files that are none, and files that are far too large, opened in the window.
+// Files that are not regular files, and files that are far too large, opened in the window.
 
 #include "WindowTest.h"
 
@@ -52,7 +52,7 @@ namespace {
 constexpr int Patience = 20000; // milliseconds
 constexpr int TenMegabytes = 10000000;
 
-// A named pipe that notes whether anybody has opened it, and lets go whoever did.
+// A named pipe that records whether anybody has opened it, and releases whoever did.
 class Pipe
 {
 public:
@@ -76,7 +76,7 @@ public:
     bool wasOpened() const { return m_opened; }
 
 private:
-    // Readers wait for a writer and writers for a reader: each gets one here, in turns.
+    // Readers wait for a writer and writers for a reader: each gets one here, alternately.
     void lookForOthers()
     {
         while (!m_over) {
@@ -139,7 +139,7 @@ QByteArray WithValue(QByteArray const& value, QByteArray const& other = "no")
     return "<R>\n<S>\n<long>" + value + "</long>\n<other>" + other + "</other>\n</S>\n</R>\n";
 }
 
-// Ten megabytes in which no piece can be taken for another.
+// Ten megabytes in which no two pieces are alike.
 QByteArray LongValue()
 {
     QByteArray value;
@@ -250,7 +250,7 @@ void tst_HostileFiles::isToldAndNotOpened()
         QVERIFY(!pipe->wasOpened());
 }
 
-// A file in a tab that is replaced by a pipe.
+// The file of an open tab is replaced by a pipe.
 void tst_HostileFiles::becomesAPipe()
 {
     const WindowTest test;
@@ -323,7 +323,7 @@ void tst_HostileFiles::windowSettingsAtTheEnd()
 {
     const WindowTest test;
     const auto window = WindowTest::show();
-    QTRY_VERIFY(window->findChild<FileTabs*>()); // before that, nothing is saved
+    QTRY_VERIFY(window->findChild<FileTabs*>()); // until then, nothing is saved
     const Pipe pipe(test.settingsFile());
     window->close();
     QVERIFY(!pipe.wasOpened());
@@ -368,8 +368,8 @@ void tst_HostileFiles::recentFilesAreCapped_data()
     QTest::newRow("as long as may be") << most << most;
     QTest::newRow("too long by one") << most + "x|/b"
                                      << "/b";
-    QTest::newRow("behind a long one") << "/a|" + QString(1700000, 'x') + "|/b"
-                                       << "/a|/b";
+    QTest::newRow("after a long one") << "/a|" + QString(1700000, 'x') + "|/b"
+                                      << "/a|/b";
 }
 
 void tst_HostileFiles::recentFilesAreCapped()
@@ -439,7 +439,7 @@ void tst_HostileFiles::longValueSurvivesOtherEdits()
     auto* editor = window->findChild<FileTabs*>()->currentEditor();
     auto* tree = editor->findChild<QTreeWidget*>();
 
-    // The long value is looked at.
+    // The long value is opened.
     tree->setFocus();
     tree->setCurrentItem(tree->topLevelItem(0)->child(0), 1);
     QString looked;
@@ -504,7 +504,7 @@ void tst_HostileFiles::longValueIsEdited()
         text->setFocus();
         QTest::keyClick(text, Qt::Key_End, Qt::ControlModifier);
         QTest::keyClicks(text, "end");
-        QTest::keyClick(dialog, Qt::Key_Tab); // out of the text, to OK
+        QTest::keyClick(dialog, Qt::Key_Tab); // leaves the text, for OK
         QTest::keyClick(dialog->focusWidget(), Qt::Key_Return);
     });
     if (way == "F2")
@@ -530,7 +530,7 @@ void tst_HostileFiles::longValueIsEdited()
     QVERIFY(TestFiles::read(file) == WithValue(value + "end"));
 }
 
-// A long value can become short; its cell is then edited as any other.
+// A long value can become short; its cell is then edited like any other.
 void tst_HostileFiles::longValueIsTypedOver()
 {
     const WindowTest test;
@@ -678,7 +678,7 @@ void tst_HostileFiles::reportEndsWithTheLastLine()
     QCOMPARE(tail.count('\n'), int(SystemReport::TailLines));
 }
 
-// The newest run on top ends after more than 16 MiB, and an older one follows.
+// The newest run at the top ends after more than 16 MiB, and an older one follows.
 void tst_HostileFiles::reportOfALongNewestRun()
 {
     const QByteArray padding(500, 'x');

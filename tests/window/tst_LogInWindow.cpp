@@ -39,7 +39,7 @@ QPoint RowCentre(LogView* view, int row)
     return view->visualRect(view->model()->index(row, LogModel::MessageColumn)).center();
 }
 
-// Choice boxes react to the box, not to all of the widget's area.
+// A check box reacts to clicks on the box, not on the whole area of the widget.
 void ClickBox(QCheckBox* box)
 {
     QTest::mouseClick(box, Qt::LeftButton, Qt::NoModifier, QPoint(8, box->height() / 2));
@@ -78,8 +78,8 @@ private slots:
 
 void tst_LogInWindow::initTestCase()
 {
-    // Where a window goes while the X11 plugin asks about it, that warns, over a test's log. The
-    // environment would come too late for it: it was read with the application object.
+    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
+    // in a test's log. The environment would be too late: it was read with the application object.
     QLoggingCategory::setFilterRules("qt.qpa.*=false");
 }
 
@@ -158,7 +158,7 @@ void tst_LogInWindow::filterByText()
     QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier | Qt::ShiftModifier);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 30, Patience);
 
-    // Marks are drawn in a colour that is nowhere else.
+    // Marks are drawn in a color that is used nowhere else.
     QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
     QTest::keyClicks(QApplication::focusWidget(), "Entry 7");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
@@ -247,7 +247,7 @@ void tst_LogInWindow::copiesLines()
     QCOMPARE(window->statusBar()->currentMessage(), QString("20 line(s) copied"));
 }
 
-// From the menu too, a text field in focus is meant before the log is.
+// From the menu too, a focused text field takes precedence over the log.
 void tst_LogInWindow::copiesFromTheMenu()
 {
     const QByteArray log = run(3, QTime(9, 0), "x");
@@ -338,8 +338,8 @@ void tst_LogInWindow::earlierRuns()
     QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) > 4, Patience);
 }
 
-// The newest run writes over the first rows of the earlier part; the rows in view and the selection
-// stay what they are.
+// The newest run overwrites the first rows of the earlier part; the rows in view and the selection
+// do not change.
 void tst_LogInWindow::keepsItsPlace()
 {
     const QByteArray older = run(400, QTime(17, 0), "older", true);

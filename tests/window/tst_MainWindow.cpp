@@ -34,7 +34,7 @@ using DemoLog::run;
 
 namespace {
 
-// The text in one of the places, in the way that assistive technology finds it.
+// The text in one of the locations, found the way assistive technology finds it.
 QString Place(MainWindow& window, QString const& name)
 {
     auto const* field = Child<QLineEdit>(&window, name);
@@ -73,8 +73,8 @@ private slots:
 
 void tst_MainWindow::initTestCase()
 {
-    // Where a window goes while the X11 plugin asks about it, that warns, over a test's log. The
-    // environment would come too late for it: it was read with the application object.
+    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
+    // in a test's log. The environment would be too late: it was read with the application object.
     QLoggingCategory::setFilterRules("qt.qpa.*=false");
 }
 
@@ -94,7 +94,7 @@ void tst_MainWindow::fitsTheScreen()
     QVERIFY(window->width() <= screen.width());
     QVERIFY(window->height() <= screen.height());
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
-    // All of the log's controls are to be seen, and so are some lines.
+    // All of the log's controls are visible, and so are some lines.
     const QList<QWidget*> all = Panel(*window)->findChildren<QWidget*>();
     for (QWidget* widget : all) {
         if (widget->isVisible() && qobject_cast<QAbstractButton*>(widget))

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Nothing from a file, a path or a log line is read as rich text: the window is walked with names
-// and contents that look like markup.
+// Nothing from a file, a path or a log line is interpreted as rich text: every part of the window
+// is checked with names and contents that look like markup.
 
 #include "WindowTest.h"
 
@@ -46,7 +46,7 @@ namespace {
 
 constexpr int Patience = 20000; // milliseconds
 
-// What a widget that guesses shows for a text.
+// What a widget that guesses the format shows for a text.
 QString Displayed(QString const& text)
 {
     if (!Qt::mightBeRichText(text))
@@ -105,7 +105,7 @@ void CheckModel(QAbstractItemView const* view, QStringList& breaches)
     walk(QModelIndex());
 }
 
-// Everything below a window that could take a text for rich.
+// Everything below a window that could interpret a text as rich text.
 QStringList Breaches(QWidget* top)
 {
     QStringList breaches;
@@ -170,7 +170,7 @@ void ClickNamed(QWidget* window, QString const& text)
     QFAIL(qPrintable("no button " + text));
 }
 
-// A program whose names, folders, log and settings all hold a piece of markup.
+// A program whose names, folders, log and settings all contain markup.
 class HostilePlace
 {
 public:
@@ -203,7 +203,7 @@ public:
     const QString log;
 };
 
-// The next box is looked at and answered with a key.
+// Inspects the next box and answers it with a key.
 void LookAtNextBox(QStringList* seen, QString* text, Qt::Key answer = Qt::Key_Escape)
 {
     WindowTest::whenShown<QMessageBox>([=](QMessageBox* box) {
@@ -310,7 +310,7 @@ void tst_PlainTextOnly::anyToolTip()
                                 "x", "<b>", "</p>", "<p>", "<table>", "#60;",  "&quot;"};
     std::mt19937 random(11);
     for (int i = 0; i < 20000; ++i) {
-        QString text = "x"; // leading and trailing blanks are the layout's business
+        QString text = "x"; // leading and trailing white space is up to the layout
         const int count = static_cast<int>(random() % 12);
         for (int j = 0; j < count; ++j)
             text = pieces.at(static_cast<int>(random() % pieces.size())) + text;
@@ -349,14 +349,14 @@ void tst_PlainTextOnly::window()
     window->OpenFile(place.log);
     auto* tabs = window->findChild<FileTabs*>();
     auto* files = tabs->currentLog()->findChild<QComboBox*>();
-    files->showPopup(); // fills itself
+    files->showPopup(); // populated on demand
     files->hidePopup();
     QCOMPARE(files->count(), 2);
     QTRY_COMPARE_WITH_TIMEOUT(tabs->currentLog()->model()->rowCount(), 2, Patience);
     window->OpenFile(place.settings);
     QCOMPARE(Breaches(window.get()).join('\n'), QString());
 
-    // The names are there, and as they are.
+    // The names are shown, and unchanged.
     QStringList texts;
     const QList<QLabel*> labels = window->findChildren<QLabel*>();
     for (QLabel const* label : labels)
@@ -369,7 +369,7 @@ void tst_PlainTextOnly::window()
     QCOMPARE(tree->topLevelItem(0)->child(0)->text(1), markup);
 }
 
-// What Qt really shows when the mouse rests.
+// What Qt really shows when the mouse hovers.
 void tst_PlainTextOnly::shownToolTips()
 {
     QFETCH(QString, markup);
@@ -566,7 +566,7 @@ void tst_PlainTextOnly::boxOfTheLogSettings()
     QVERIFY2(text.contains(place.folder), qPrintable(text));
 }
 
-// Qt's own box, in which it asks about a file that is there already.
+// Qt's own box, which asks whether to replace an existing file.
 void tst_PlainTextOnly::boxOfTheFileDialog()
 {
     QFETCH(QString, markup);

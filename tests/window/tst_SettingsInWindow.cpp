@@ -44,8 +44,8 @@ private slots:
 
 void tst_SettingsInWindow::initTestCase()
 {
-    // Where a window goes while the X11 plugin asks about it, that warns, over a test's log. The
-    // environment would come too late for it: it was read with the application object.
+    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
+    // in a test's log. The environment would be too late: it was read with the application object.
     QLoggingCategory::setFilterRules("qt.qpa.*=false");
 }
 
@@ -83,7 +83,7 @@ void tst_SettingsInWindow::editsSettings()
     QVERIFY(Action(*window, "Save")->isEnabled());
     QVERIFY(window->findChild<FileTabs*>()->tabText(1).endsWith("*"));
 
-    // A key is added and gets a name, which is put right where the store could not write it.
+    // A key is added and named; the name is corrected where the store could not write it.
     QList<QPushButton*> buttons = editor->findChildren<QPushButton*>();
     const auto button = [&](QString const& text) {
         return *std::find_if(buttons.begin(), buttons.end(), [&](QPushButton* candidate) {
@@ -255,7 +255,7 @@ void tst_SettingsInWindow::askedBeforeClosing()
     QCOMPARE(TestFiles::read(file).contains("<font>new</font>"), saves);
 }
 
-// What has been typed into a cell counts, also without the Enter key.
+// Text typed into a cell is kept even without the Enter key.
 void tst_SettingsInWindow::closesWhileEditing()
 {
     for (bool close : {true, false}) {
@@ -276,7 +276,7 @@ void tst_SettingsInWindow::closesWhileEditing()
             QVERIFY(window->close());
             QVERIFY(TestFiles::read(file).contains("typed"));
         }
-        window.reset(); // also without having been closed
+        window.reset(); // even without having been closed
         QCoreApplication::processEvents();
     }
 }

@@ -27,7 +27,7 @@ using DemoLog::run;
 
 namespace {
 
-// What a screen reader could say of a widget.
+// What a screen reader could announce for a widget.
 bool HasName(QWidget const* widget)
 {
     if (!widget->accessibleName().isEmpty() || !widget->windowTitle().isEmpty())
@@ -41,7 +41,7 @@ bool HasName(QWidget const* widget)
                        [&](QLabel const* label) { return label->buddy() == widget; });
 }
 
-// Parts that a widget makes for itself and speaks for.
+// Parts that a widget creates and is accessible for.
 bool IsInnerPart(QWidget const* widget)
 {
     const QString name = widget->objectName();
@@ -91,8 +91,8 @@ private slots:
 
 void tst_WindowAccessibility::initTestCase()
 {
-    // Where a window goes while the X11 plugin asks about it, that warns, over a test's log. The
-    // environment would come too late for it: it was read with the application object.
+    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
+    // in a test's log. The environment would be too late: it was read with the application object.
     QLoggingCategory::setFilterRules("qt.qpa.*=false");
 }
 
@@ -161,7 +161,7 @@ void tst_WindowAccessibility::shortcuts()
     }
 }
 
-// In each menu every entry has a letter of its own.
+// Within each menu, every entry has a unique mnemonic.
 void tst_WindowAccessibility::menusByKeyboard()
 {
     const WindowTest test;
@@ -183,7 +183,7 @@ void tst_WindowAccessibility::menusByKeyboard()
     }
 }
 
-// The tab key reaches every control of the log once before it comes back to the first.
+// The Tab key reaches every control of the log once before it returns to the first.
 void tst_WindowAccessibility::tabOrder()
 {
     const WindowTest test(run(5, QTime(9, 0), "x"));

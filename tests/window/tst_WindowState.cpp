@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// What the window keeps between two runs, and the small helpers around it.
+// What the window keeps between two runs, and its small helpers.
 
 #include "WindowTest.h"
 
@@ -173,7 +173,7 @@ void tst_WindowState::damagedTwice()
     QCOMPARE(TestFiles::read(test.settingsFile() + ".damaged-2"), QByteArray("second"));
 }
 
-// A directory cannot be read as a file, and is left alone.
+// A directory cannot be read as a file, and is ignored.
 void tst_WindowState::damagedFileThatCannotBeMoved()
 {
     const WindowTest test;
@@ -361,7 +361,7 @@ void tst_WindowState::severityIcons()
             return SeverityIcons::Icon(severity, palette).pixmap(16).toImage();
         };
         QVERIFY(!image(light).isNull());
-        // Trace has the text's colour, which is the same in both here.
+        // Trace has the color of the text, which is the same in both here.
         const bool isSame = severity == LogEntry::Trace;
         QCOMPARE(image(light) == image(dark), isSame);
         QCOMPARE(SeverityIcons::Colour(severity, light) == SeverityIcons::Colour(severity, dark),

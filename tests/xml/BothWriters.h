@@ -34,7 +34,7 @@ inline Outcome WrittenByFile(Steps const& steps)
         TorkXmlFile writer(name);
         if (!writer.open(QIODevice::WriteOnly))
             qFatal("%s: %s", qPrintable(name), qPrintable(writer.errorString()));
-        writer.setCodec("UTF-8"); // a new device, as at open, has the locale's codec again
+        writer.setCodec("UTF-8"); // a new device, as at open, resets the codec to the locale's
         outcome.codes = Perform(writer, steps);
         writer.flush();
         writer.close();

@@ -11,19 +11,19 @@
 #include <QXmlSimpleReader>
 #include <QtTest>
 
-/// States and managers that do what a test wrote down for them.
+/// States and managers that follow the script of a test.
 namespace ScriptedStates {
 
 const QString ReportHeader("Failed to parse the XML content:\n");
 
-/// What the states of a document do, each rule naming the place where it holds.
+/// The behavior of a document's states; each rule names the place where it applies.
 struct Script
 {
     QStringList inPlace;  // "parent>child": the parent's state handles the child itself
     QStringList unknown;  // "parent>child", or ">root": there is no state for it
     QStringList refused;  // "name=content": the content is refused
-    QStringList renamed;  // "element=name": the element's state bears another name
-    QStringList reported; // "name=content": the content is taken, with an error appended
+    QStringList renamed;  // "element=name": the element's state has another name
+    QStringList reported; // "name=content": the content is accepted, with an error appended
     QStringList events;   // what happened, in order
 
     QString NameOfStateOf(QString const& element) const
@@ -127,7 +127,7 @@ inline QString Report(TorkXml_ParseManager_Base& manager)
     return report;
 }
 
-/// The names still on the element stack, innermost first; takes them off.
+/// Pops all names left on the element stack, innermost first, and returns them.
 inline QStringList OpenElements(TorkXml_ParseManager_Base& manager)
 {
     TorkXml_ParseState_Base probe("probe", &manager);

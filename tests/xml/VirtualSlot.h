@@ -8,10 +8,9 @@
 
 /// The position of a virtual operation in its class's table, counted from 0; -1 if not virtual.
 ///
-/// Applications of the family are built apart from the framework, so the order of the slots is
-/// part of what they rely on. Reads the member pointer as the Itanium C++ ABI lays it out (GCC and
-/// Clang, on macOS and Linux): the table offset plus one, or, on ARM, the offset with a mark in
-/// the second word.
+/// Applications of the family are built separately from the framework, so they rely on the order of
+/// the slots. Reads the member pointer as the Itanium C++ ABI lays it out (GCC and Clang, on macOS
+/// and Linux): the table offset plus one, or, on ARM, the offset with a flag in the second word.
 template <class Member>
 std::ptrdiff_t VirtualSlot(Member member)
 {

@@ -17,7 +17,7 @@ namespace WritersWithoutTypes {
 /// What a subclass overrides.
 enum class Overrides { Nothing, Write, ElementValue };
 
-/// Has `use` write with a subclass of TorkXmlStream onto `text`.
+/// Calls `use` with a subclass of TorkXmlStream that writes to `text`.
 ///
 /// @return the calls that reached the subclass, each as the operation and its text
 QStringList withStream(Overrides overrides, QString& text,

@@ -10,11 +10,12 @@
 #include <QXmlInputSource>
 #include <QXmlSimpleReader>
 
-/// Writes down all that Qt's reader tells of a document, as one text an event, and the result last.
+/// Records everything Qt's reader reports about a document, one text per event, and the result
+/// last.
 class XmlEvents : public QXmlDefaultHandler
 {
 public:
-    /// What the reader tells of `document`, which it reads through a source of type `Source`.
+    /// The reader's events for `document`, read through a source of type `Source`.
     template <class Source, class Prepare>
     static QStringList of(QByteArray const& document, Prepare const& prepare)
     {

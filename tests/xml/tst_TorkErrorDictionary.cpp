@@ -19,7 +19,7 @@ static_assert(
 
 namespace {
 
-// A dictionary as a component would derive it: three codes from its base on.
+// A dictionary as a component would derive it: three codes starting at its base.
 class ReaderErrors : public TorkErrorDictionary
 {
 public:

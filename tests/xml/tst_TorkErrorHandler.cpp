@@ -100,7 +100,7 @@ void tst_TorkErrorHandler::format_data()
         << ""
         << "" << 1 << 2 << "one\ntwo\nPublic ID: , System ID: \nLine: 1, Column: 2";
 
-    // The markers are filled in turn, each text at the lowest marker left by then.
+    // The arguments are substituted one at a time, each at the lowest marker left by then.
     QTest::newRow("message holds %1") << "50 %1 off"
                                       << "P"
                                       << "S" << 3 << 7
@@ -249,7 +249,7 @@ void tst_TorkErrorHandler::reader()
     QCOMPARE(messages.texts().size(), parses ? 0 : 1);
 }
 
-// The reader itself warns of nothing, so an element stands for what it would warn of.
+// The reader itself never issues warnings, so an element triggers one instead.
 void tst_TorkErrorHandler::readerGoesOnAfterAWarning()
 {
     class WarningHandler : public QXmlDefaultHandler
@@ -304,7 +304,7 @@ void tst_TorkErrorHandler::logEntries_data()
                                     "odd\\nPublic ID: , System ID: \\nLine: 3, Column: 7\"";
 }
 
-// One entry, on one line: the handler does not write to the log a second time by itself.
+// A single entry, on one line: the handler does not write to the log a second time.
 void tst_TorkErrorHandler::logEntries()
 {
     QFETCH(Report, report);

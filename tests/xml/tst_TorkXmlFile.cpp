@@ -17,19 +17,19 @@
 
 #include <sys/resource.h>
 
-// The text that the writer gives out is tested with the stream's, in tst_TorkXmlWriters; here is
-// what the file adds.
+// The writer's output is tested together with the stream's, in tst_TorkXmlWriters; this tests what
+// the file adds.
 
 namespace {
 
-// What the toolkit itself says of opening such a file.
-QString ToolkitErrorOfOpening(QString const& name, QIODevice::OpenMode mode)
+// Qt's own error for opening such a file.
+QString QtErrorOfOpening(QString const& name, QIODevice::OpenMode mode)
 {
     QFile file(name);
     return file.open(mode) ? QString("opened") : file.errorString();
 }
 
-// No file of this process grows beyond the limit while this lives, as on a disk that is full.
+// While this lives, no file of this process grows beyond the limit, as on a full disk.
 class FileSizeLimit
 {
 public:
@@ -166,7 +166,7 @@ void tst_TorkXmlFile::setNameOfAnOpenFile()
     QVERIFY2(writer.open(QIODevice::WriteOnly), qPrintable(writer.errorString()));
     writer.WriteElement("a", "1");
     {
-        MessageCapture quiet; // the toolkit closes the file, with a warning
+        MessageCapture quiet; // Qt closes the file, with a warning
         writer.setName(Path("second.xml"));
     }
     QCOMPARE(writer.name(), Path("second.xml"));
@@ -261,7 +261,7 @@ void tst_TorkXmlFile::openFails()
     QFETCH(QString, name);
     QFETCH(int, mode);
     const QString path = Path(name);
-    const QString reason = ToolkitErrorOfOpening(path, QIODevice::OpenMode(mode));
+    const QString reason = QtErrorOfOpening(path, QIODevice::OpenMode(mode));
     QVERIFY(reason != "opened");
 
     TorkXmlFile writer(path);
@@ -299,7 +299,7 @@ void tst_TorkXmlFile::openTwice()
     QVERIFY2(writer.open(QIODevice::WriteOnly), qPrintable(writer.errorString()));
     writer.WriteElement("a", "1");
     {
-        MessageCapture quiet; // the toolkit's, that the file is open already
+        MessageCapture quiet; // Qt's warning that the file is already open
         QVERIFY(!writer.open(QIODevice::WriteOnly));
     }
     QVERIFY(writer.isOpen());
@@ -366,7 +366,7 @@ void tst_TorkXmlFile::writesNothingAfterClose()
     const Steps steps{Start("b"), Element("c", "1"), Open("d"), Attribute("x", "1"), Close("d")};
     QVector<int> codes;
     {
-        MessageCapture quiet; // the toolkit's, that the device is not open
+        MessageCapture quiet; // Qt's warning that the device is not open
         TorkXmlFile writer(Path("out.xml"));
         QVERIFY2(writer.open(QIODevice::WriteOnly), qPrintable(writer.errorString()));
         writer.WriteElement("a", "1");
@@ -409,8 +409,8 @@ void tst_TorkXmlFile::neverOpened_data()
     QTest::addColumn<bool>("tried");
     QTest::addColumn<int>("length");
 
-    // A text stream holds 16 KB back: the longer text asks the file before the writer is gone,
-    // the shorter one when it goes.
+    // A text stream buffers 16 KB: the longer text reaches the file before the writer is destroyed,
+    // the shorter one only then.
     QTest::newRow("nothing written") << "out.xml" << false << 0;
     QTest::newRow("short text") << "out.xml" << false << 1;
     QTest::newRow("long text") << "out.xml" << false << 100000;
@@ -431,7 +431,7 @@ void tst_TorkXmlFile::neverOpened()
     int written = -1;
     bool opened = true;
     {
-        MessageCapture quiet; // the toolkit's, that the device is missing or not open
+        MessageCapture quiet; // Qt's warning that the device is missing or not open
         std::unique_ptr<TorkXmlFile> writer(name.isEmpty() ? new TorkXmlFile
                                                            : new TorkXmlFile(Path(name)));
         opened = tried && writer->open(QIODevice::WriteOnly);
@@ -539,8 +539,8 @@ void tst_TorkXmlFile::diskFull()
         writer.close();
     }
 
-    // The codes stay 0, for Write() of a file always returns 0; the status and the file's error
-    // text tell what happened.
+    // The codes stay 0, because Write() of a file always returns 0; the status and the file's error
+    // text report what happened.
     QCOMPARE(codes, QVector<int>(4, 0));
     for (int i = 0; i < 4; ++i)
         QCOMPARE(failed[i], i + 1 >= failingWrite);

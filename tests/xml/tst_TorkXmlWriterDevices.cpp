@@ -21,7 +21,7 @@ using namespace BothWriters;
 
 namespace {
 
-// Takes whole blocks until one of them, counted from 1, and everything after it is refused.
+// Accepts whole blocks until one of them, counted from 1; rejects that one and everything after it.
 class BrokenDevice : public QIODevice
 {
 public:
@@ -170,7 +170,7 @@ void tst_TorkXmlWriterDevices::constructors()
     QFETCH(TextOfConstructor, written);
     QFETCH(QByteArray, before);
 
-    // Nothing pending, level 0 and a unit of two blanks, whatever the constructor.
+    // Nothing pending, level 0 and a unit of two spaces, whatever the constructor.
     const Steps steps{Close("none", 0), Indent(), Start("a"), Element("b", "1"), End("a")};
     QCOMPARE(written(steps), before + ">\n<a>\n  <b>1</b>\n</a>\n");
 }
@@ -182,7 +182,7 @@ void tst_TorkXmlWriterDevices::streamWithoutDevice()
     QVector<int> codes;
     int length = -1;
     {
-        // The toolkit tells of every piece that finds no device; how often is its business.
+        // Qt warns about every piece that has no device; how often is up to Qt.
         MessageCapture quiet;
         TorkXmlStream writer;
         codes = Perform(writer, steps);
@@ -239,8 +239,8 @@ void tst_TorkXmlWriterDevices::failingDevice()
 
     BrokenDevice device(failAt);
     TorkXmlStream writer(&device);
-    // A write to the device at each flush. The codes tell of Write() alone, and Write() tells how
-    // much it was given: a caller learns of the device from the text stream's status.
+    // Each flush writes to the device. The codes report only on Write(), which returns how much it
+    // was given: a caller learns about the device from the text stream's status.
     QCOMPARE(writer.WriteElementStart("a", 1), 0);
     writer.flush();
     QCOMPARE(writer.status() == QTextStream::WriteFailed, failAt <= 1);
@@ -264,7 +264,7 @@ void tst_TorkXmlWriterDevices::failingDeviceDuringWrite()
     BrokenDevice device(1);
     TorkXmlStream writer(&device);
 
-    // More than the text stream holds back, so the device is asked, and refuses, at once.
+    // More than the text stream buffers, so the device is written to, and refuses, immediately.
     const QString text = Repeated('x', 100000);
     QCOMPARE(writer.WriteElement("a", text), 0);
     QCOMPARE(writer.Write(text), text.size());
@@ -279,7 +279,7 @@ void tst_TorkXmlWriterDevices::readOnlyDevice()
     QVector<int> codes;
     const Steps steps{Start("a"), Element("b", "1"), End("a")};
     {
-        MessageCapture quiet; // the toolkit's, of a device that is only to be read
+        MessageCapture quiet; // Qt's warning about a read-only device
         QBuffer device(&content);
         device.open(QIODevice::ReadOnly);
         TorkXmlStream writer(&device);

@@ -20,8 +20,8 @@
 
 using namespace BothWriters;
 
-// Most rows run on both writers, for they share their operations but no class: what holds for one
-// and not the other is a fault.
+// Most rows run on both writers, because they share their operations but no class: any difference
+// between them is a bug.
 
 namespace {
 
@@ -33,7 +33,7 @@ QString ValueForAttributeOf(int length)
     return Repeated('v', length - 4);
 }
 
-// Keeps every call and every piece of text in order, and lets the writer do its work.
+// Records every call and every piece of text in order, and lets the writer do its work.
 template <class Base>
 class RecordingWriter : public Base
 {
@@ -101,7 +101,7 @@ public:
     }
 };
 
-// Its failAt-th piece of text, counted from 1, is not written and reported with a chosen result.
+// Its failAt-th piece of text, counted from 1, is not written; its result is chosen by the test.
 template <class Base>
 class FailingWriter : public Base
 {
@@ -123,7 +123,7 @@ private:
     int m_count = 0;
 };
 
-// Answers with codes of its own from the two operations that WriteElement listens to.
+// Returns its own codes from the two operations whose results WriteElement() uses.
 template <class Base>
 class AnsweringWriter : public Base
 {
@@ -164,7 +164,7 @@ Outcome Written(WriterKind kind, Steps const& steps)
     return kind == WriterKind::Stream ? WrittenByStream(steps) : WrittenByFile(steps);
 }
 
-// One row for each writer.
+// One row per writer.
 void AddRow(char const* name, Steps const& steps, QString const& expected)
 {
     for (WriterKind kind : {WriterKind::Stream, WriterKind::File}) {
@@ -199,7 +199,7 @@ QString NestedText(int levels)
         text += Repeated(' ', 2 * level) + "</e>\n";
     return text;
 }
-// Compile-time: the operations every application of the family overrides or calls.
+// Checked at compile time: the operations every application of the family overrides or calls.
 template <class Writer>
 constexpr bool HasWriterBases()
 {
@@ -276,10 +276,10 @@ void tst_TorkXmlWriters::elements_data()
     AddRow("close without open", {Close("a")}, ">\n");
     AddRow("end tag need not match", {Start("a"), End("b")}, "<a>\n</b>\n");
 
-    AddRow("names are put in as they stand: open", {Open("a<&\">'\\")}, "<a<&\">'\\ ");
-    AddRow("names are put in as they stand: start", {Start("a<&\">'\\")}, "<a<&\">'\\>\n");
-    AddRow("names are put in as they stand: end", {End("a<&\">'\\")}, "</a<&\">'\\>\n");
-    AddRow("names are put in as they stand: leaf", {Element("a<&\">'\\", "x")},
+    AddRow("names are inserted unchanged: open", {Open("a<&\">'\\")}, "<a<&\">'\\ ");
+    AddRow("names are inserted unchanged: start", {Start("a<&\">'\\")}, "<a<&\">'\\>\n");
+    AddRow("names are inserted unchanged: end", {End("a<&\">'\\")}, "</a<&\">'\\>\n");
+    AddRow("names are inserted unchanged: leaf", {Element("a<&\">'\\", "x")},
            "<a<&\">'\\>x</a<&\">'\\>\n");
     AddRow("blank name is a name", {Start(" "), End(" ")}, "< >\n</ >\n");
     AddRow("name with a placeholder: open", {Open("a%1%2")}, "<a%1%2 ");
@@ -311,7 +311,7 @@ void tst_TorkXmlWriters::levels_data()
     AddRow("unit of two blanks", {Start("a"), Indent()}, "<a>\n  ");
     AddRow("unit once a level", {Start("a"), Start("b"), Start("c"), Indent()},
            "<a>\n  <b>\n    <c>\n      ");
-    AddRow("children stand one level in", {Start("a"), Element("b", "1"), End("a")},
+    AddRow("children are indented one level", {Start("a"), Element("b", "1"), End("a")},
            "<a>\n  <b>1</b>\n</a>\n");
     AddRow("leaf leaves the level alone", {Start("a"), Element("b", "1"), Element("c", "2")},
            "<a>\n  <b>1</b>\n  <c>2</c>\n");
@@ -324,12 +324,12 @@ void tst_TorkXmlWriters::levels_data()
     AddRow("start and end restore", {Start("a", 3), End("a", 3), Indent()}, "<a>\n</a>\n");
     AddRow("open, close and end restore", {Open("a", 3), CloseAndEnd("a", 3), Indent()}, "<a />\n");
     AddRow("open and close restore", {Open("a", 3), Close("a", 3), Indent()}, "<a >\n");
-    AddRow("end tag stands at the lowered level", {Start("a", 2), End("b", 1)}, "<a>\n  </b>\n");
+    AddRow("end tag is at the lowered level", {Start("a", 2), End("b", 1)}, "<a>\n  </b>\n");
 
     AddRow("element with attributes ends one level too low",
            {Start("root"), Open("item"), Attribute("a", "1"), Close("item"), End("item")},
            "<root>\n  <item  a=\"1\">\n</item>\n");
-    AddRow("children of an element with attributes stand at its own level",
+    AddRow("children of an element with attributes are at its own level",
            {Start("root"), Open("item"), Attribute("a", "1"), Close("item"), Element("x", "1")},
            "<root>\n  <item  a=\"1\">\n  <x>1</x>\n");
     AddRow("smaller indent at close moves the children in",
@@ -435,7 +435,7 @@ void tst_TorkXmlWriters::attributes_data()
            "<e  a=\"%1\">\n");
     AddRow("placeholder of the value in the value", {Open("e"), Attribute("a", "%2"), Close("e")},
            "<e  a=\"%2\">\n");
-    // The name goes in first and alone; the value then fills the lowest placeholder there is.
+    // The name is substituted first and alone; the value then fills the lowest placeholder left.
     AddRow("first placeholder in the name takes the value",
            {Open("e"), Attribute("a%1", "v"), Close("e")}, "<e  av=\"%2\">\n");
     AddRow("second placeholder in the name takes the value too",
@@ -621,7 +621,8 @@ void tst_TorkXmlWriters::pieces()
     QFETCH(Steps, steps);
     QFETCH(QStringList, expected);
 
-    // Without a device and without a name: an overridden Write takes all there is to write.
+    // Without a device and without a name: an overridden Write() receives everything that is
+    // written.
     RecordingWriter<TorkXmlStream> stream;
     QCOMPARE(Perform(stream, steps), ExpectedCodes(steps));
     QCOMPARE(stream.calls, expected);
@@ -661,11 +662,11 @@ void tst_TorkXmlWriters::failingWrite_data()
         << QStringList{" x=\"1\"/>\n/>\n"};
     QTest::newRow("leaf stops at its start tag")
         << 1 << -1 << Steps{Failed(Element("a", "t"))} << QStringList{};
-    QTest::newRow("leaf goes on after its value")
+    QTest::newRow("leaf continues after its value")
         << 2 << -1 << Steps{Element("a", "t")} << QStringList{"<a>", "</a>\n"};
     QTest::newRow("leaf reports its end tag")
         << 3 << -1 << Steps{Failed(Element("a", "t"))} << QStringList{"<a>", "t"};
-    QTest::newRow("leaf goes on after its indentation")
+    QTest::newRow("leaf continues after its indentation")
         << 2 << -1 << Steps{Start("r"), Element("a", "t")}
         << QStringList{"<r>\n", "<a>", "t", "</a>\n"};
     QTest::newRow("leaf without a value does not write, so does not fail")
@@ -674,18 +675,18 @@ void tst_TorkXmlWriters::failingWrite_data()
     QTest::newRow("value in a section ignores it") << 1 << -1 << Steps{Value("<")} << QStringList{};
     QTest::newRow("indentation ignores it")
         << 2 << -1 << Steps{Start("a", 3), Indent()} << QStringList{"<a>\n", "  ", "  "};
-    QTest::newRow("open goes on after its indentation")
+    QTest::newRow("open continues after its indentation")
         << 2 << -1 << Steps{Start("a"), Open("b"), Indent()}
         << QStringList{"<a>\n", "<b ", "  ", "  "};
-    QTest::newRow("start goes on after its indentation")
+    QTest::newRow("start continues after its indentation")
         << 2 << -1 << Steps{Start("a"), Start("b"), Indent()}
         << QStringList{"<a>\n", "<b>\n", "  ", "  "};
-    QTest::newRow("end goes on after its indentation")
+    QTest::newRow("end continues after its indentation")
         << 2 << -1 << Steps{Start("a", 2), End("b"), Indent()}
         << QStringList{"<a>\n", "</b>\n", "  "};
     QTest::newRow("attribute that does not wrap does not write")
         << 1 << -1 << Steps{Attribute("x", "1")} << QStringList{};
-    QTest::newRow("wrap ignores it and goes on with the new line")
+    QTest::newRow("wrap ignores it and continues with the new line")
         << 1 << -1 << Steps{Attribute("x", "1"), Attribute("y", long81), Close("a")}
         << QStringList{"y=\"" + long81 + "\">\n"};
     QTest::newRow("any negative count is a failure")
@@ -803,7 +804,7 @@ void tst_TorkXmlWriters::paddingOfPieces_data()
     QTest::newRow("each piece by itself") << 4 << QByteArray("<a>\n    <b> 1   </b>\n</a>\n");
 }
 
-// A writer is a text stream too, with all that a text stream can be told.
+// A writer is a text stream too, with all of a text stream's settings.
 void tst_TorkXmlWriters::paddingOfPieces()
 {
     QFETCH(int, width);

@@ -19,7 +19,7 @@ using namespace ScriptedStates;
 
 namespace {
 
-// The process-wide log in a folder of its own, and the message handler of before once it is gone.
+// The process-wide log in its own folder; restores the previous message handler when it is gone.
 class ProcessWideLog
 {
 public:
@@ -197,7 +197,7 @@ void tst_TorkXml_ParseErrors::formatErrors()
     manager.FormatErrors(report);
     QCOMPARE(report, expected);
     manager.FormatErrors(report);
-    QCOMPARE(report, expected); // nothing was cleared, and nothing added to
+    QCOMPARE(report, expected); // nothing was cleared, and nothing added
 }
 
 void tst_TorkXml_ParseErrors::errorsOfStatesDoNotStop()
@@ -256,7 +256,7 @@ void tst_TorkXml_ParseErrors::warningWithTheLog_data()
     QTest::addColumn<int>("code");
     QTest::addColumn<QString>("expected");
 
-    // The text is streamed as a string: in quotes, with what is not printable escaped.
+    // The text is streamed as a string: quoted, with unprintable characters escaped.
     QTest::newRow("text") << QString() << "text" << 0 << "\"text\"";
     QTest::newRow("empty text") << QString() << "" << 0 << "\"\"";
     QTest::newRow("text with quotes")

@@ -57,7 +57,7 @@ private:
 
 QVector<TorkXml_ParseState_Base*> MeddlingState::popped;
 
-// Decides on every child by itself: skips those it is told of, and knows no other.
+// Decides about every child itself: skips those it is told to, and knows no other.
 class DecidingManager : public ScriptedManager
 {
 public:
@@ -76,7 +76,7 @@ private:
     QStringList m_known;
 };
 
-// Remembers the current element and the attributes' names and values at each call.
+// Records the current element and the attributes' names and values at each call.
 class WatchingState : public TorkXml_ParseState_Base
 {
 public:
@@ -232,7 +232,7 @@ void tst_TorkXml_ParseManager::stateStack()
     QCOMPARE(manager.PopState(), first.get());
     QVERIFY(manager.LastState() == nullptr);
     QVERIFY(manager.PopState() == nullptr);
-    QVERIFY(!manager.PopElement()); // the stacks are apart
+    QVERIFY(!manager.PopElement()); // the stacks are separate
 }
 
 void tst_TorkXml_ParseManager::destructorDeletesFromTheTop()
@@ -284,7 +284,7 @@ void tst_TorkXml_ParseManager::endedStateOffTheStackIsNotTouched()
     manager.startElement(QString(), "a", "a", QXmlAttributes());
     std::unique_ptr<TorkXml_ParseState_Base> taken(manager.PopState());
 
-    // Nobody's end tag, then: the name goes, no state is asked, and nothing breaks.
+    // An end tag without a start: the name goes, no state is asked, and nothing breaks.
     QVERIFY(manager.endElement(QString(), "a", "a"));
 
     QCOMPARE(script.events, QStringList({"first(a)"}));
@@ -345,7 +345,7 @@ void tst_TorkXml_ParseManager::routing_data()
         << QStringList{"first(a)", "a.can(b)", "next(b)", "a.next(b)", "b.end(b)",
                        "~b",       "a.can(b)", "next(b)", "a.next(b)", "b.end(b)",
                        "~b",       "a.end(a)", "~a"};
-    QTest::newRow("child of the same name with a state of its own")
+    QTest::newRow("child of the same name with its own state")
         << "<a><a/>t</a>" << QStringList{}
         << QStringList{"first(a)", "a.can(a)",       "next(a)",  "a.next(a)", "a.end(a)",
                        "~a",       "a.content(a,t)", "a.end(a)", "~a"};
@@ -357,14 +357,14 @@ void tst_TorkXml_ParseManager::routing_data()
         << QStringList{"first(a)", "a.content(a,\n )", "a.can(b)",
                        "next(b)",  "a.next(b)",        "b.end(b)",
                        "~b",       "a.end(a)",         "~a"};
-    QTest::newRow("comments and instructions go to nobody")
+    QTest::newRow("comments and instructions are ignored")
         << "<?xml version='1.0'?><!DOCTYPE a><!--c--><a><!--c--><?go on?></a><!--c-->"
         << QStringList{} << QStringList{"first(a)", "a.end(a)", "~a"};
 
     QTest::newRow("in place: no state is made")
         << "<a><b/></a>" << QStringList{"a>b"}
         << QStringList{"first(a)", "a.can(b)", "a.end(a)", "~a"};
-    QTest::newRow("in place: attributes go to nobody")
+    QTest::newRow("in place: attributes are ignored")
         << "<a><b x='1' href='2'/></a>" << QStringList{"a>b"}
         << QStringList{"first(a)", "a.can(b)", "a.end(a)", "~a"};
     QTest::newRow("in place: text comes under the child's name")
@@ -374,7 +374,7 @@ void tst_TorkXml_ParseManager::routing_data()
     QTest::newRow("in place: grandchild is asked of the same state")
         << "<a><b><c>t</c></b></a>" << QStringList{"a>b", "a>c"}
         << QStringList{"first(a)", "a.can(b)", "a.can(c)", "a.content(c,t)", "a.end(a)", "~a"};
-    QTest::newRow("in place: grandchild with a state of its own")
+    QTest::newRow("in place: grandchild with its own state")
         << "<a><b>1<c>2</c>3</b></a>" << QStringList{"a>b"}
         << QStringList{"first(a)", "a.can(b)",       "a.content(b,1)", "a.can(c)",
                        "next(c)",  "a.next(c)",      "c.content(c,2)", "c.end(c)",
@@ -394,7 +394,7 @@ void tst_TorkXml_ParseManager::routing_data()
         << QStringList{"first(r)", "r.can(a)", "next(a)",  "r.next(a)", "a.can(a)",
                        "a.end(a)", "~a",       "r.can(b)", "next(b)",   "r.next(b)",
                        "b.end(b)", "~b",       "r.end(r)", "~r"};
-    QTest::newRow("in place: root's child of the same name leaves the last end tag to nobody")
+    QTest::newRow("in place: root's child of the same name leaves the last end tag without a state")
         << "<a><a/></a>" << QStringList{"a>a"}
         << QStringList{"first(a)", "a.can(a)", "a.end(a)", "~a"};
     QTest::newRow("element after the root's early end is a first one")
@@ -537,7 +537,7 @@ void tst_TorkXml_ParseManager::defaultNextState()
     const std::unique_ptr<TorkXml_ParseState_Base> next(manager.GetNextState("b"));
     QVERIFY(next && next->IsElement("b"));
     QVERIFY(manager.GetNextState("unknown") == nullptr);
-    QVERIFY(manager.LastState()->IsElement("a")); // made, not pushed
+    QVERIFY(manager.LastState()->IsElement("a")); // created, not pushed
 
     QCOMPARE(script.events, QStringList({"a.next(b)", "a.next(unknown)"}));
     QCOMPARE(Report(manager), ReportHeader);
@@ -625,9 +625,9 @@ void tst_TorkXml_ParseManager::inheritedHandlersAcceptEverything()
 
 void tst_TorkXml_ParseManager::endedStateGoes_data()
 {
-    QTest::addColumn<QString>("deed"); // "+" pushes a state, "-" takes one off, "=" puts it back
+    QTest::addColumn<QString>("deed"); // "+" pushes a state, "-" pops one, "=" puts it back
     QTest::addColumn<QString>("left"); // on the stack, from the bottom
-    QTest::addColumn<int>("owned");    // by who took them off
+    QTest::addColumn<int>("owned");    // by the code that popped them
     QTest::addColumn<bool>("isDeleted");
 
     QTest::newRow("does nothing") << ""
@@ -636,23 +636,23 @@ void tst_TorkXml_ParseManager::endedStateGoes_data()
                                 << "r pushed" << 0 << true;
     QTest::newRow("pushes three") << "+++"
                                   << "r pushed pushed pushed" << 0 << true;
-    QTest::newRow("pushes one and takes it off") << "+-"
-                                                 << "r" << 1 << true;
-    QTest::newRow("takes itself off") << "-"
-                                      << "r" << 1 << false;
-    QTest::newRow("takes itself off and pushes one") << "-+"
-                                                     << "r pushed" << 1 << false;
-    QTest::newRow("takes itself off and back") << "-="
-                                               << "r" << 0 << true;
-    QTest::newRow("takes itself and its parent off") << "--"
-                                                     << "" << 2 << false;
+    QTest::newRow("pushes one and pops it") << "+-"
+                                            << "r" << 1 << true;
+    QTest::newRow("pops itself") << "-"
+                                 << "r" << 1 << false;
+    QTest::newRow("pops itself and pushes one") << "-+"
+                                                << "r pushed" << 1 << false;
+    QTest::newRow("pops itself and pushes itself back") << "-="
+                                                        << "r" << 0 << true;
+    QTest::newRow("pops itself and its parent") << "--"
+                                                << "" << 2 << false;
     QTest::newRow("puts itself below its parent") << "--=="
                                                   << "r" << 0 << true;
-    QTest::newRow("takes more off than there is") << "---"
-                                                  << "" << 3 << false;
+    QTest::newRow("pops more than there is") << "---"
+                                             << "" << 3 << false;
 }
 
-// It is removed and deleted whatever it pushed, and not if it took itself off the stack.
+// It is removed and deleted whatever it pushed, but not if it removed itself from the stack.
 void tst_TorkXml_ParseManager::endedStateGoes()
 {
     QFETCH(QString, deed);

@@ -65,7 +65,7 @@ public:
     }
 };
 
-// Handles a kind of element with one more way of its own, to see what the defaults do.
+// Handles one kind of element in an additional way, to show what the defaults do.
 class ReaderOfOneState : public TorkXml_ParseManager_Base
 {
 public:
@@ -310,7 +310,7 @@ void tst_TorkXml_ParseStates::flushMakesFlushStates()
     QVERIFY(typeid(made) == typeid(TorkXml_FlushUnknownElement));
     QVERIFY(made.IsElement(name));
     QCOMPARE(made.ParseManager(), &manager);
-    QVERIFY(manager.LastState() == nullptr); // made, not pushed
+    QVERIFY(manager.LastState() == nullptr); // created, not pushed
 }
 
 void tst_TorkXml_ParseStates::flushKeepsTheBasesEnd()

@@ -169,7 +169,7 @@ void tst_TorkXml_ParseStops::unknownElement()
     QVERIFY(!Parse(manager, document));
     QCOMPARE(Report(manager), ReportHeader + "Error: 1016 " + error + "\n");
     QCOMPARE(OpenElements(manager), openElements);
-    QCOMPARE(ScriptedState::alive, alive); // kept until the manager goes; cleanup() counts again
+    QCOMPARE(ScriptedState::alive, alive); // kept as long as the manager; cleanup() counts again
 }
 
 void tst_TorkXml_ParseStops::unknownElementIsNamedAfterTheStateOnTop()
@@ -186,7 +186,7 @@ void tst_TorkXml_ParseStops::unknownElementIsNamedAfterTheStateOnTop()
 
 void tst_TorkXml_ParseStops::placeholdersInNames()
 {
-    // No reader lets such names pass, but whoever calls the handler himself may use them.
+    // No reader accepts such names, but code that calls the handler directly may use them.
     TorkXml_ParseManager_Base first;
     QVERIFY(!first.startElement(QString(), "%1%2", "%1%2", QXmlAttributes()));
     QCOMPARE(Report(first), ReportHeader + "Error: 1016 No initial parse state for element "
@@ -443,7 +443,7 @@ void tst_TorkXml_ParseStops::tooManyPrefixes()
     QCOMPARE(report, ReportHeader + error);
 }
 
-// What an element declares or uses is over with it.
+// What an element declares or uses ends with it.
 void tst_TorkXml_ParseStops::prefixesThatAreOverDoNotCount()
 {
     QString document = "<r>";

@@ -13,13 +13,13 @@
 #include <QtTest>
 
 // Documents that this project did not write, found where their packages install them. What the
-// manager's states see is compared with what the toolkit's other XML parser sees.
+// manager's states see is compared with what Qt's other XML parser sees.
 
 namespace {
 
 char const* const MimeDatabase = "/usr/share/mime/packages/freedesktop.org.xml";
 
-// What is in a document, by element name: how many, their attributes and their text in order.
+// The contents of a document, by element name: how many, their attributes and their text in order.
 struct Census
 {
     QMap<QString, int> elements;
@@ -49,8 +49,8 @@ public:
 
     bool ProcessContent(QString const& name, QString const& content) override
     {
-        // Attributes come first. One that bears its element's own name would pass for text, and
-        // the comparison would tell.
+        // Attributes come first. One with its element's own name would be taken for text, and the
+        // comparison would fail.
         if (name == m_name)
             m_census.text[m_name] += content;
         else
@@ -76,7 +76,7 @@ public:
     }
 };
 
-// Skips the whole document, and counts how often it was asked on the way.
+// Skips the whole document, and counts how often it was called on the way.
 class FlushingManager : public TorkXml_ParseManager_Base
 {
 public:
@@ -95,7 +95,7 @@ public:
     }
 };
 
-// Knows the root's children by name alone and skips what is in them.
+// Knows the root's children by name alone and skips their contents.
 class ChildCountingState : public TorkXml_ParseState_Base
 {
 public:
@@ -217,7 +217,7 @@ void tst_TorkXml_RealDocuments::documents()
 
     QTest::newRow("shared MIME database") << MimeDatabase;
 
-    // Where they happen to be installed, documents of other makers with other habits.
+    // Where installed, documents of other makers with other habits.
     static const struct
     {
         char const* title;

@@ -1,7 +1,7 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 
-# Runs PROGRAMS, one after another.
+# Runs each of PROGRAMS.
 
 separate_arguments(PROGRAMS)
 foreach(program IN LISTS PROGRAMS)

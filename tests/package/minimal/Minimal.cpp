@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The least that a program can do with the frame, or without it.
+// The minimum that a program can do with the frame, or without it.
 
 #include <QCoreApplication>
 #include <QString>

@@ -1,7 +1,7 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 
-# Runs the built program; then the project that was taken in must have nothing to test or install.
+# Runs the built program; the project that was added must not add tests or install rules.
 
 execute_process(COMMAND ./uses_framework RESULT_VARIABLE result)
 if(NOT result EQUAL 0)

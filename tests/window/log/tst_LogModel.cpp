@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The model over real files that change under it.
+// The model over real files that change while it is in use.
 
 #include "app/window/log/LogModel.h"
 
@@ -51,7 +51,7 @@ bool WriteAt(QString const& path, qint64 offset, QByteArray const& bytes)
            file.write(bytes) == bytes.size();
 }
 
-// Counts on its own what the model announces, as a view does.
+// Tracks independently what the model announces, as a view does.
 class RowCounter : public QObject
 {
 public:
@@ -188,7 +188,7 @@ void tst_LogModel::details()
     QVERIFY(!model.headerData(0, Qt::Horizontal, Qt::FontRole).isValid());
 }
 
-// What an earlier run left behind stands under a heading, which is no line of its own.
+// What an earlier run left is under a heading, which is not a line of the file.
 void tst_LogModel::headings()
 {
     const QByteArray older = run(8, QTime(17, 0), "older", true);
@@ -237,7 +237,7 @@ void tst_LogModel::grows()
     QCOMPARE(counter.resets, 0);
 }
 
-// The size of the file stays the same all the while.
+// The size of the file stays the same throughout.
 void tst_LogModel::newestRunWritesOverTheOlder()
 {
     LogModel model;
@@ -274,7 +274,7 @@ void tst_LogModel::changes_data()
         << QStringList("x 0") + Numbered("y", 0, 4);
 }
 
-// A file that takes the place of the one that was shown, by a change in place or by a rename.
+// A file that replaces the one that was shown, by a change in place or by a rename.
 void tst_LogModel::changes()
 {
     QFETCH(QByteArray, after);
@@ -344,7 +344,7 @@ void tst_LogModel::filter()
     model.SetFilter(filter);
     QTRY_COMPARE_WITH_TIMEOUT(Messages(model), QStringList({"x 1", "x 2"}), Patience);
 
-    // What comes later is filtered too.
+    // Lines added later are filtered too.
     QVERIFY(TestFiles::write(m_file, run(30, QTime(9, 0), "x") +
                                          entry("10:00:00.000", "Trace", "a x 1") +
                                          entry("10:00:01.000", "Trace", "no")));
@@ -450,7 +450,7 @@ void tst_LogModel::withTheLogItself()
     QTRY_COMPARE_WITH_TIMEOUT(Messages(model).last(), QString("one more"), Patience);
 
     TorkLog::shutdown();
-    QTest::qWait(100); // so that the runs are apart in time
+    QTest::qWait(100); // so that the runs have different times
     log = TorkLog::initialize(folder, "app", QString(), true);
     log->error("second");
     QTRY_COMPARE_WITH_TIMEOUT(Messages(model).last(), QString("second"), Patience);
@@ -469,7 +469,7 @@ void tst_LogModel::withTheLogItself()
     qInstallMessageHandler(handler);
 }
 
-// The interface stays alive while a file of 100 MB is read. How long that takes is not judged here.
+// The interface stays responsive while a file of 100 MB is read. How long that takes is not tested.
 void tst_LogModel::millionLines()
 {
     const int lines = 1000000;

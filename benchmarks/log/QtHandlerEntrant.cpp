@@ -17,7 +17,7 @@ namespace {
 QMutex s_mutex;
 QTextStream* s_stream = nullptr;
 
-// As programs of the toolkit write their log when they use nothing but the toolkit.
+// The way Qt programs write their log when they use nothing but Qt.
 void HandleMessage(QtMsgType, QMessageLogContext const&, QString const& message)
 {
     const QMutexLocker lock(&s_mutex);
@@ -26,11 +26,11 @@ void HandleMessage(QtMsgType, QMessageLogContext const&, QString const& message)
     s_stream->flush();
 }
 
-class ToolkitEntrant : public LogEntrant
+class QtHandlerEntrant : public LogEntrant
 {
 public:
-    explicit ToolkitEntrant(QString const& folder)
-        : m_file(folder + "toolkit.log"), m_message(QString::fromStdString(LogMessage()))
+    explicit QtHandlerEntrant(QString const& folder)
+        : m_file(folder + "qt.log"), m_message(QString::fromStdString(LogMessage()))
     {
         Require(m_file.open(QIODevice::WriteOnly), m_file.errorString());
         m_stream.setDevice(&m_file);
@@ -38,7 +38,7 @@ public:
         m_handler = qInstallMessageHandler(HandleMessage);
     }
 
-    ~ToolkitEntrant() override
+    ~QtHandlerEntrant() override
     {
         qInstallMessageHandler(m_handler);
         s_stream = nullptr;
@@ -55,7 +55,7 @@ private:
 
 } // namespace
 
-std::unique_ptr<LogEntrant> MakeToolkitEntrant(QString const& folder)
+std::unique_ptr<LogEntrant> MakeQtHandlerEntrant(QString const& folder)
 {
-    return std::make_unique<ToolkitEntrant>(folder);
+    return std::make_unique<QtHandlerEntrant>(folder);
 }
