@@ -2,7 +2,7 @@
 # SPDX-FileCopyrightText: The Velocor authors
 # SPDX-License-Identifier: MIT
 #
-# Draws the icons anew from velocor.svg: the PNG files here and the icon set of the macOS bundle.
+# Renders the icons from velocor.svg: the PNG files here and the icon set of the macOS bundle.
 # Needs rsvg-convert (librsvg2-bin) and png2icns (icnsutils).
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")"
