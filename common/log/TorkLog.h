@@ -53,7 +53,7 @@ public:
     /// to it; logger() returns the same.
     static TorkLog* m_gLog;
 
-    /// A log of its own with default settings, switched off and without a directory. It touches no
+    /// A separate log with default settings, disabled and without a directory. It touches no
     /// file and receives none of Qt's messages; initialize() creates the one log of a program.
     TorkLog();
 
