@@ -20,9 +20,10 @@
 class LaunchOptionParser
 {
 public:
+    /// A parser without options; add them before reading.
     LaunchOptionParser();
 
-    /// Deletes the options, the first one first.
+    /// Deletes the options, in the order they were added.
     ~LaunchOptionParser();
 
     LaunchOptionParser(LaunchOptionParser const&) = delete;
@@ -45,11 +46,11 @@ public:
 
     /// Sets the options that an XML text names.
     ///
-    /// An unknown key fails the whole text, with a message in errorText, yet what follows is still
+    /// An unknown key fails the whole text, with a message in errorText, but what follows is still
     /// read. Text that is not well-formed, or nested deeper than TorkXmlMaximumDepth, fails
     /// without a message and sets nothing.
     bool ParseOptions(QString& text);
 
     QList<LaunchOption*> options; ///< owned, in the order they were added
-    QString errorText;            ///< messages, one after another with nothing between them
+    QString errorText;            ///< all messages, concatenated without a separator
 };

@@ -90,6 +90,20 @@ guessing_widgets() {
         "new QLabel\b|\bQLabel\s+\w+\s*[;({]|QMessageBox::$boxes\(|new QMessageBox\b|\bQMessageBox\s+\w+\s*[;({]|QMessageBox\(|addRow\(\s*(tr\(|QString|\")|QErrorMessage|QProgressDialog|QInputDialog|QTextBrowser|QToolTip::"
 }
 
+# Headers that are installed, of more than 20 lines, in which fewer than 60 % of the lines that are not
+# blank are comments. Not in order yet:
+# - TorkXml_ParseManager_Base.h, TorkXmlGuard.h: their limits are being revised, their comments with them
+undocumented_headers() {
+    local file
+    tracked ':(glob)app/*.h' 'common/*.h' ':!*_p.h' \
+        ':!common/xml/TorkXml_ParseManager_Base.h' ':!common/xml/TorkXmlGuard.h' |
+        while IFS= read -r -d '' file; do
+            awk -v file="$file" 'NF { lines++ } /^ *\/\// { comments++ }
+                END { if (NR > 20 && comments < 0.6 * lines)
+                    printf "%s: %d of %d lines\n", file, comments, lines }' "$file"
+        done
+}
+
 # docs/deliberate-oddities.md names rows as `tst_Class::function(row)`, or without the row. A name may
 # continue on the next line.
 rows_without_test() {
@@ -122,6 +136,7 @@ rule "a Qt keyword instead of Q_SIGNALS, Q_SLOTS or Q_EMIT" qt_keywords
 rule "widgets used below the window" widgets_below_the_window
 rule "a tool tip that does not come from PlainToolTip()" bare_tool_tips
 rule "a widget that guesses its text format; see app/window/PlainText.h" guessing_widgets
+rule "an installed header with less than 60 % comment lines" undocumented_headers
 rule "an oddity whose test row does not exist" rows_without_test
 
 [ "$violations" -eq 0 ] || exit 1

@@ -25,15 +25,15 @@ void TraceToLog(QString const& message)
         log->trace(message);
 }
 
-// Asked first, as nearly no name holds one and removing none costs more than finding a value.
-bool HoldsSpace(QString const& name)
+// Checked first: almost no name has a space, and QString::remove() copies even if there is none.
+bool HasSpace(QString const& name)
 {
     return std::find(name.begin(), name.end(), QLatin1Char(' ')) != name.end();
 }
 
 QString WithoutSpaces(QString name)
 {
-    return HoldsSpace(name) ? name.remove(QLatin1Char(' ')) : name;
+    return HasSpace(name) ? name.remove(QLatin1Char(' ')) : name;
 }
 
 } // namespace
@@ -111,7 +111,7 @@ bool TorkConfigFile::parseFile()
     TorkErrorHandler errorHandler(TorkLog::m_gLog);
     QFile file(m_fileName);
     QBuffer nothing;
-    // Anything but a file, like a pipe or a device, could keep the load waiting or never end.
+    // Anything but a regular file, such as a pipe or a device, could block the load or never end.
     const bool isFile = QFileInfo(m_fileName).isFile();
     return parse(isFile ? static_cast<QIODevice*>(&file) : &nothing, contentHandler, errorHandler,
                  nullptr);
@@ -157,7 +157,7 @@ bool TorkConfigFile::HasSection(QString const& name)
     return lookUp(name) != nullptr;
 }
 
-// cppcheck-suppress constParameter ; the interface stands
+// cppcheck-suppress constParameter ; part of the public interface
 bool TorkConfigFile::HasSection(QString& name)
 {
     return lookUp(name) != nullptr;
@@ -168,7 +168,7 @@ TorkConfigFileSection* TorkConfigFile::FindSection(QString const& name)
     return handOut(name);
 }
 
-// cppcheck-suppress constParameter ; the interface stands
+// cppcheck-suppress constParameter ; part of the public interface
 TorkConfigFileSection* TorkConfigFile::FindSection(QString& name)
 {
     return handOut(name);
@@ -201,8 +201,8 @@ bool TorkConfigFile::AppendSection(TorkConfigFileSection* section)
     return true;
 }
 
-// The section that has the name so far is left to whoever holds it; nobody else can delete one that
-// was never given out.
+// A section that already has the name now belongs to its holder; one that was never handed out has
+// no holder, so it is deleted here.
 void TorkConfigFile::put(TorkConfigFileSection* section)
 {
     TorkConfigFileSection** found = m_sections->find(section->name());
@@ -239,8 +239,8 @@ QStringList TorkConfigFile::keyList(QString const& section)
 
 QString const* TorkConfigFile::findValue(QString const& section, QString const& key)
 {
-    // No copy of a name without spaces: two of them take a typed read beyond its goal.
-    if (HoldsSpace(section) || HoldsSpace(key))
+    // Names without spaces are not copied: typed reads are frequent.
+    if (HasSpace(section) || HasSpace(key))
         return findCleaned(WithoutSpaces(section), WithoutSpaces(key));
     return findCleaned(section, key);
 }
@@ -251,7 +251,7 @@ QString const* TorkConfigFile::findCleaned(QString const& section, QString const
     return found ? found->m_values->find(key) : nullptr;
 }
 
-// cppcheck-suppress constParameter ; the interface stands
+// cppcheck-suppress constParameter ; part of the public interface
 bool TorkConfigFile::ReadItem(QString const& section, QString const& key, QString& defaultValue,
                               QString& value)
 {
@@ -275,7 +275,7 @@ bool TorkConfigFile::WriteItem(QString const& section, QString const& key, QStri
     return target->AddValue(WithoutSpaces(key), value);
 }
 
-// cppcheck-suppress constParameter ; the interface stands
+// cppcheck-suppress constParameter ; part of the public interface
 bool TorkConfigFile::StartElement(QString& name)
 {
     m_currentElement = name;
@@ -283,7 +283,7 @@ bool TorkConfigFile::StartElement(QString& name)
     if (m_atRoot)
         return true;
 
-    // White space inside a new section is no value, even where the item before had no text.
+    // White space inside a new section is not a value, even if the previous item had no text.
     const int depth = m_activeHandler ? m_activeHandler->depth() : 0;
     if (depth == 1 || depth == 2)
         m_expectingValue = false;
@@ -292,19 +292,19 @@ bool TorkConfigFile::StartElement(QString& name)
         createSection(name);
     else if (depth == 3)
         m_expectingValue = true;
-    // Deeper elements leave the flag: one inside an item without text is stored as if it were the
-    // item.
+    // Deeper elements do not touch the flag: one inside an item without text is stored as if it
+    // were the item.
     return true;
 }
 
 bool TorkConfigFile::EndElement(QString&)
 {
-    // Not made again for each element, as it would be from Latin-1.
+    // A literal, so that nothing is allocated for each element.
     m_currentElement = QStringLiteral(""); // clazy:exclude=empty-qstringliteral
     return true;
 }
 
-// cppcheck-suppress constParameter ; the interface stands
+// cppcheck-suppress constParameter ; part of the public interface
 bool TorkConfigFile::ProcessContent(QString& content)
 {
     if (m_atRoot || !m_expectingValue)

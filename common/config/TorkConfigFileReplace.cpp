@@ -4,12 +4,12 @@
 // How a configuration file is replaced in one step.
 //
 //     viewer.cfg          the old file
-//     viewer.cfg.saving   the new one, while it is written; renamed over the old one when it is
-//                         whole and on the disk
+//     viewer.cfg.saving   the new one, while it is written; renamed over the old one once it is
+//                         complete and on disk
 //
-// QSaveFile would do most of it, but gives the file to another owner, does not wait for the folder,
-// and its random names would pile up where a program is killed over and over. One fixed name
-// cannot, and a lock on it tells a leftover from a save that is under way.
+// QSaveFile would do most of it, but changes the file's owner, does not sync the folder, and leaves
+// another randomly named file each time the program is killed. One fixed name avoids that, and a
+// lock on it distinguishes a leftover from a save in progress.
 
 #include "common/config/TorkConfigFile.h"
 
@@ -31,18 +31,18 @@ namespace {
 
 struct Outcome
 {
-    QString failure;        // empty if all is well
+    QString failure;        // empty on success
     QString inPlaceBecause; // empty if the file was replaced
 };
 
 #ifdef Q_OS_UNIX
 
-// Why a step failed: the system's error number, or 0 where it did not.
+// Why a step failed: its errno, or 0 on success.
 using Failure = int;
 
 constexpr Failure Done = 0;
 
-// Calls again while a signal interrupts.
+// Retries while a signal interrupts the call.
 template <class Call>
 auto Uninterrupted(Call call)
 {
@@ -72,7 +72,7 @@ public:
         return FailureOf(m_descriptor);
     }
 
-    // Gives the lock up too, even if a child process has inherited it.
+    // Releases the lock too, even if a child process has inherited it.
     void Close()
     {
         if (m_descriptor == -1)
@@ -82,8 +82,8 @@ public:
         m_descriptor = -1;
     }
 
-    // False if another process, or another thread, holds the lock. A file system that knows no
-    // locks grants any.
+    // False if another process or thread holds the lock. Without lock support in the file system,
+    // it always succeeds.
     bool Lock() const
     {
         const int result = Uninterrupted([&] { return ::flock(m_descriptor, LOCK_EX | LOCK_NB); });
@@ -96,15 +96,15 @@ private:
     int m_descriptor = -1;
 };
 
-// Makes it the path at the end of all links. The links themselves stay; one without a target gets
-// one.
+// Resolves all symbolic links. The links themselves are kept; the target of a dangling one is
+// created later.
 Failure Follow(QByteArray& path)
 {
-    const int most = 40; // as the system counts
-    for (int links = 0; links <= most; ++links) {
+    const int maximum = 40; // as in the Linux kernel
+    for (int links = 0; links <= maximum; ++links) {
         char target[4096];
         const ssize_t length = ::readlink(path, target, sizeof target);
-        if (length == -1) // no link, or not there
+        if (length == -1) // not a link, or missing
             return errno == EINVAL || errno == ENOENT ? Done : errno;
         if (length == sizeof target)
             return ENAMETOOLONG;
@@ -114,7 +114,7 @@ Failure Follow(QByteArray& path)
     return ELOOP;
 }
 
-// Whether it is still this file that has the name.
+// Whether the name still refers to this file.
 bool HasName(int descriptor, QByteArray const& path)
 {
     struct stat file = {};
@@ -123,7 +123,7 @@ bool HasName(int descriptor, QByteArray const& path)
            file.st_dev == named.st_dev && file.st_ino == named.st_ino;
 }
 
-// Waits for the disk. What is no file on a disk has nothing to wait for.
+// Syncs to disk. What cannot be synced, such as a device, is not an error.
 Failure Sync(int descriptor)
 {
 #ifdef F_FULLFSYNC
@@ -149,8 +149,8 @@ Failure Write(int descriptor, QByteArray const& bytes)
     return Sync(descriptor);
 }
 
-// Owner and group stay if this user may give files to them. Where the group cannot, what it was
-// allowed is not allowed to the group that the file has instead.
+// Owner and group are kept if this user may give files to them. If the group cannot be kept, the
+// new group gets no more rights than others have.
 Failure KeepRights(int descriptor, struct stat const& old)
 {
     struct stat file = {};
@@ -164,11 +164,11 @@ Failure KeepRights(int descriptor, struct stat const& old)
         mode &= ~static_cast<mode_t>(S_IRWXG) | ((mode & S_IRWXO) << 3U);
     const bool keepsOwner =
         file.st_uid == old.st_uid || ::fchown(descriptor, old.st_uid, anyGroup) == 0;
-    Q_UNUSED(keepsOwner) // else it is this user's from now on
+    Q_UNUSED(keepsOwner) // if not, this user owns the file from now on
     return FailureOf(::fchmod(descriptor, mode));
 }
 
-// Removes what a killed save has left.
+// Removes the leftover of a save that was killed.
 //
 // @return EEXIST if another save is still writing it
 Failure RemoveLeftover(QByteArray const& path)
@@ -177,7 +177,7 @@ Failure RemoveLeftover(QByteArray const& path)
     if (::lstat(path, &status) == -1)
         return errno == ENOENT ? Done : errno;
 
-    Descriptor leftover; // locked until it is gone
+    Descriptor leftover; // locked until it is removed
     if (S_ISREG(status.st_mode)) {
         const Failure failure = leftover.Open(path, O_RDONLY | O_NOFOLLOW | O_NONBLOCK);
         if (failure == ENOENT)
@@ -191,7 +191,7 @@ Failure RemoveLeftover(QByteArray const& path)
     return failure == ENOENT ? Done : failure;
 }
 
-// Makes a new file of this name and locks it. Another save of the same file has a second to end.
+// Creates a file of this name and locks it. Waits a second for another save of the same file.
 Failure Create(Descriptor& file, QByteArray const& path, mode_t mode)
 {
     for (int attempt = 0; attempt < 100; ++attempt) {
@@ -199,7 +199,7 @@ Failure Create(Descriptor& file, QByteArray const& path, mode_t mode)
         if (!failure) {
             if (file.Lock() && HasName(file.Number(), path))
                 return Done;
-            failure = EEXIST; // the other one took it for a leftover before it was locked
+            failure = EEXIST; // another save took it for a leftover before it was locked
         } else if (failure == EEXIST) {
             failure = RemoveLeftover(path);
         }
@@ -211,8 +211,8 @@ Failure Create(Descriptor& file, QByteArray const& path, mode_t mode)
     return EAGAIN;
 }
 
-// What a power cut leaves is the old file or the new one in any case, so a folder that cannot be
-// waited for is no failure.
+// A power failure leaves the old file or the new one in any case, so failing to sync the folder is
+// not an error.
 void SyncFolderOf(QByteArray const& path)
 {
     const int slash = path.lastIndexOf('/');
@@ -221,7 +221,7 @@ void SyncFolderOf(QByteArray const& path)
         Sync(folder.Number());
 }
 
-// @param old  what the file is now; null if there is none
+// @param old  status of the existing file; null if there is none
 Failure Replace(QByteArray const& path, QByteArray const& bytes, struct stat const* old)
 {
     const QByteArray newPath = path + ".saving";
@@ -242,10 +242,10 @@ Failure Replace(QByteArray const& path, QByteArray const& bytes, struct stat con
     return failure;
 }
 
-// Whether it is the place that lets no file be replaced: a folder without the right to write, with
-// the sticky bit, or with a directory in the new file's place; a file that is mounted by itself; a
-// name that leaves no room for the new one's.
-bool IsAboutPlace(Failure failure)
+// Whether the location prevents replacing the file: a folder that is not writable, has the sticky
+// bit, or has a directory under the new file's name; a file that is itself a mount point; a name
+// too long to append to.
+bool IsAboutLocation(Failure failure)
 {
     switch (failure) {
     case EACCES:
@@ -267,8 +267,8 @@ Failure WriteOver(int descriptor, QByteArray const& bytes)
     return failure && failure != EINVAL ? failure : Write(descriptor, bytes);
 }
 
-// The end of a save that failed, or that had to write over the file.
-Outcome Told(Failure failure, Failure inPlaceBecause = Done)
+// The outcome of a save that failed, or that had to write in place.
+Outcome MakeOutcome(Failure failure, Failure inPlaceBecause = Done)
 {
     return {failure ? qt_error_string(failure) : QString(),
             inPlaceBecause ? qt_error_string(inPlaceBecause) : QString()};
@@ -277,32 +277,32 @@ Outcome Told(Failure failure, Failure inPlaceBecause = Done)
 Outcome Save(QString const& fileName, QByteArray const& bytes)
 {
     if (fileName.contains(QChar::Null))
-        return Told(EINVAL);
+        return MakeOutcome(EINVAL);
     QByteArray path = QFile::encodeName(fileName);
     Failure failure = Follow(path);
     if (failure)
-        return Told(failure);
+        return MakeOutcome(failure);
 
     struct stat old = {};
     if (::stat(path, &old) == -1)
-        return Told(errno == ENOENT ? Replace(path, bytes, nullptr) : errno);
+        return MakeOutcome(errno == ENOENT ? Replace(path, bytes, nullptr) : errno);
 
-    // Opening a FIFO would wait for its reader.
+    // Opening a FIFO would block until it has a reader.
     if (!S_ISREG(old.st_mode) && !S_ISCHR(old.st_mode))
-        return Told(S_ISDIR(old.st_mode) ? EISDIR : EINVAL);
+        return MakeOutcome(S_ISDIR(old.st_mode) ? EISDIR : EINVAL);
 
-    // A file that may not be written stays as it is, even where its folder would let it be
-    // replaced.
+    // A file that may not be written is left untouched, even if its folder would allow replacing
+    // it.
     Descriptor file;
     failure = file.Open(path, O_WRONLY | O_NONBLOCK);
     if (failure)
-        return Told(failure);
+        return MakeOutcome(failure);
 
     const bool isDevice = S_ISCHR(old.st_mode);
     failure = isDevice ? ENODEV : Replace(path, bytes, &old);
-    if (isDevice || IsAboutPlace(failure))
-        return Told(WriteOver(file.Number(), bytes), failure);
-    return Told(failure);
+    if (isDevice || IsAboutLocation(failure))
+        return MakeOutcome(WriteOver(file.Number(), bytes), failure);
+    return MakeOutcome(failure);
 }
 
 #else

@@ -18,37 +18,37 @@
 
 namespace {
 
-// What a character asks of the line it is saved in.
-enum : uchar { Nothing = 0, Wrapping = 1, Filling = 2 };
+// What a character requires of the line that it is saved in.
+enum : uchar { Nothing = 0, Wrapping = 1, Formatting = 2 };
 
-struct Demands
+struct Needs
 {
     uchar of[0x100] = {};
 };
 
-constexpr Demands MakeDemands()
+constexpr Needs MakeNeeds()
 {
-    Demands demands;
+    Needs needs;
     for (char markup : {'&', '\'', '<', '>', '"'})
-        demands.of[static_cast<uchar>(markup)] = Wrapping;
-    demands.of[static_cast<uchar>('%')] = Filling;
-    return demands;
+        needs.of[static_cast<uchar>(markup)] = Wrapping;
+    needs.of[static_cast<uchar>('%')] = Formatting;
+    return needs;
 }
 
-constexpr Demands DemandsOnLine = MakeDemands();
+constexpr Needs NeedsOnLine = MakeNeeds();
 
-bool HoldsMarkup(QString const& text)
+bool HasMarkup(QString const& text)
 {
     return std::any_of(text.begin(), text.end(), [](QChar character) {
         const ushort unit = character.unicode();
-        return unit <= 0xff && DemandsOnLine.of[unit] == Wrapping;
+        return unit <= 0xff && NeedsOnLine.of[unit] == Wrapping;
     });
 }
 
-// A value as it stands in the file.
+// A value as it is written to the file.
 QString Filtered(QString const& value)
 {
-    return HoldsMarkup(value) ? QLatin1String("<![CDATA[") + value + QLatin1String("]]>") : value;
+    return HasMarkup(value) ? QLatin1String("<![CDATA[") + value + QLatin1String("]]>") : value;
 }
 
 char* Copy(char* to, QLatin1String text)
@@ -56,7 +56,7 @@ char* Copy(char* to, QLatin1String text)
     return std::copy(text.begin(), text.end(), to);
 }
 
-// As QString::toLatin1() converts.
+// Converts like QString::toLatin1().
 char* Copy(char* to, QString const& text)
 {
     return std::transform(text.constBegin(), text.constEnd(), to, [](QChar character) {
@@ -64,8 +64,7 @@ char* Copy(char* to, QString const& text)
     });
 }
 
-// Appends all pieces after making room once, without a byte array of its own for each: half the
-// time of a save.
+// Appends all pieces after reserving space once, without a temporary byte array for each.
 template <class... Pieces>
 void Append(QByteArray& xml, Pieces const&... pieces)
 {
@@ -80,55 +79,55 @@ void AppendTag(QByteArray& xml, char const* opening, QString const& name)
     Append(xml, QLatin1String(opening), name, QLatin1String(">\n"));
 }
 
-// Filled one after another, as ever: a key or value that holds a placeholder of its own comes out
-// changed, and files that hold such lines exist.
-QString FilledItem(QString const& key, QString const& value)
+// Arguments are substituted one at a time, for compatibility: a key or value that contains a
+// placeholder itself comes out changed, and files with such lines exist.
+QString FormattedItem(QString const& key, QString const& value)
 {
     const QString line = QStringLiteral("<%1>%2</%3>\n");
     return line.arg(key).arg(Filtered(value)).arg(key); // clazy:exclude=qstring-arg
 }
 
-// As QString::toLatin1() converts, noting what the characters demand. Other characters with the
-// same low byte are taken for them, which only costs time.
-char* CopyNoting(char* to, QString const& text, uchar& demands)
+// Converts like QString::toLatin1() and notes what the characters need. Characters that share only
+// the low byte with a special one are noted too, which only costs time.
+char* CopyNoting(char* to, QString const& text, uchar& needs)
 {
     for (QChar character : text) {
         const ushort unit = character.unicode();
         *to++ = unit > 0xff ? '?' : static_cast<char>(unit);
-        demands |= DemandsOnLine.of[unit & 0xff];
+        needs |= NeedsOnLine.of[unit & 0xff];
     }
     return to;
 }
 
-// The line of FilledItem(), which alone makes a save take three to four times as long as pugixml
-// does. Made as if key and value held nothing special, which is seen on the way; where they do, it
-// is made again. tests/plain/tst_PlainSave.cpp compares the two.
+// Appends the line of FormattedItem(), without its temporary strings: this is the inner loop of a
+// save. Written as if key and value had no special characters; if one turns up, the line is
+// formatted again. tests/plain/tst_PlainSave.cpp compares the two.
 void AppendItem(QByteArray& xml, QString const& key, QString const& value)
 {
     const int end = xml.size();
     xml.resize(end + 2 * key.size() + value.size() + 6);
     char* const line = xml.data() + end;
-    uchar keyDemands = Nothing;
-    uchar valueDemands = Nothing;
+    uchar keyNeeds = Nothing;
+    uchar valueNeeds = Nothing;
 
     char* to = line;
     *to++ = '<';
-    to = CopyNoting(to, key, keyDemands);
+    to = CopyNoting(to, key, keyNeeds);
     *to++ = '>';
-    to = CopyNoting(to, value, valueDemands);
+    to = CopyNoting(to, value, valueNeeds);
     *to++ = '<';
     *to++ = '/';
     to = std::copy_n(line + 1, key.size(), to);
     *to++ = '>';
     *to = '\n';
 
-    if (valueDemands != Nothing || (keyDemands & Filling)) {
+    if (valueNeeds != Nothing || (keyNeeds & Formatting)) {
         xml.resize(end);
-        Append(xml, FilledItem(key, value));
+        Append(xml, FormattedItem(key, value));
     }
 }
 
-// Opening one waits until somebody reads from it, which may be never.
+// Opening one blocks until it has a reader, possibly forever.
 bool IsPipe(QString const& fileName)
 {
 #ifdef Q_OS_UNIX
@@ -144,11 +143,11 @@ bool IsPipe(QString const& fileName)
 
 bool TorkConfigFile::Save()
 {
-    // Two characters here but one in Load(): existing callers rely on both.
+    // Two characters here, but one in Load(): existing callers rely on both.
     if (m_fileName.length() < 2)
         return true;
 
-    // Made before the file is emptied, so that as little as possible can come between.
+    // Serialize before truncating the file, so that as little as possible can happen in between.
     const QByteArray xml = ToXml();
     QFile file(m_fileName);
     if (IsPipe(m_fileName) || !file.open(QIODevice::WriteOnly)) {
@@ -174,7 +173,7 @@ QByteArray TorkConfigFile::ToXml() const
     return xml;
 }
 
-// cppcheck-suppress constParameter ; the interface stands
+// cppcheck-suppress constParameter ; part of the public interface
 void TorkConfigFile::FilterContent(QString& in, QString& out)
 {
     out = Filtered(in);

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The typed values of TorkConfigFile: how each type is worded, and how its text is read back.
+// The typed values of TorkConfigFile: how each type is formatted and parsed.
 
 #include "common/config/TorkConfigFile.h"
 
@@ -27,7 +27,7 @@ QString Join(std::initializer_list<int> numbers)
     return fields.join(QLatin1Char(','));
 }
 
-// '-' separates too, so no negative number comes back: the format's rule.
+// '-' separates too, so no negative number survives: the format's rule.
 QVector<int> Numbers(QString const& text)
 {
     QVector<int> numbers;
@@ -37,15 +37,15 @@ QVector<int> Numbers(QString const& text)
     return numbers;
 }
 
-// Asking for the desktop without a QApplication ends the program.
+// QApplication::desktop() crashes without a QApplication.
 QDesktopWidget* Desktop()
 {
     const bool haveApplication = qobject_cast<QApplication*>(QCoreApplication::instance());
     return haveApplication ? QApplication::desktop() : nullptr;
 }
 
-// What QString::toInt() gives. Plain short numbers, which nearly all are, are read here: with Qt's
-// conversion alone a typed read takes twice its floor. tests/plain/tst_PlainNumbers.cpp compares
+// Same result as QString::toInt(). Plain short numbers, which almost all are, are parsed here, as
+// Qt's locale-aware conversion dominates a typed read. tests/plain/tst_PlainNumbers.cpp compares
 // the two.
 int ToInt(QString const& text, bool* converted)
 {
@@ -67,7 +67,7 @@ int ToInt(QString const& text, bool* converted)
     return negative ? -number : number;
 }
 
-// Reads all fields as numbers; false at the first that is none.
+// Parses all fields as numbers; false at the first that is not one.
 bool ToInts(QStringList const& fields, QVector<int>& numbers)
 {
     for (QString const& field : fields) {
@@ -114,7 +114,7 @@ bool TorkConfigFile::ReadInt(QString const& section, QString const& key, int def
 bool TorkConfigFile::ReadUint(QString const& section, QString const& key, unsigned int defaultValue,
                               unsigned int& value)
 {
-    // The default takes the same way as a stored text, through the signed conversion.
+    // The default goes through the signed conversion too, like a stored text.
     QString const* text = findValue(section, key);
     bool converted = false;
     const int number = ToInt(text ? *text : QString::number(defaultValue), &converted);
@@ -136,12 +136,12 @@ bool TorkConfigFile::ReadBool(QString const& section, QString const& key, bool d
     return text != nullptr;
 }
 
-bool TorkConfigFile::WriteColor(QString const& section, QString const& key, QColor& colour)
+bool TorkConfigFile::WriteColor(QString const& section, QString const& key, QColor& color)
 {
-    return WriteItem(section, key, Join({colour.red(), colour.green(), colour.blue()}));
+    return WriteItem(section, key, Join({color.red(), color.green(), color.blue()}));
 }
 
-bool TorkConfigFile::ReadColor(QString const& section, QString const& key, QColor& colour)
+bool TorkConfigFile::ReadColor(QString const& section, QString const& key, QColor& color)
 {
     QString const* text = findValue(section, key);
     if (!text)
@@ -151,7 +151,7 @@ bool TorkConfigFile::ReadColor(QString const& section, QString const& key, QColo
     if (numbers.size() != 3)
         return false;
 
-    colour.setRgb(numbers[0], numbers[1], numbers[2]);
+    color.setRgb(numbers[0], numbers[1], numbers[2]);
     return true;
 }
 

@@ -27,7 +27,7 @@ bool StaysInValue(QChar character)
            !QStringLiteral("%&'<>\"]\\").contains(character);
 }
 
-// A colon would be taken for the end of a namespace prefix.
+// A colon would end a namespace prefix.
 bool StaysInName(QChar character, bool isFirst)
 {
     if (isFirst || IsLetter(character))
@@ -36,8 +36,8 @@ bool StaysInName(QChar character, bool isFirst)
     return IsDigit(character) || character == QLatin1Char('.') || character == QLatin1Char('-');
 }
 
-// Whether saving would fill in something at this "%": a line has the placeholders %1 to %3, and the
-// numbers of placeholders have up to two digits.
+// Whether saving would substitute something at this "%": a line has the placeholders %1 to %3, and
+// placeholder numbers have up to two digits.
 bool IsPlaceholder(QString const& text, int percent)
 {
     int i = percent + 1;
@@ -55,7 +55,7 @@ QString Escaped(QLatin1Char escape, QChar character)
     return escape + QStringLiteral("u%1").arg(character.unicode(), HexDigits, 16, QLatin1Char('0'));
 }
 
-// Leaves alone what does not look like an escape.
+// Leaves everything that does not look like an escape unchanged.
 QString Unescaped(QLatin1Char escape, QString const& encoded)
 {
     if (encoded == escape)
@@ -76,7 +76,7 @@ QString Unescaped(QLatin1Char escape, QString const& encoded)
 
 using Encoder = QString (*)(QString const&);
 
-// Each text has one encoding, so whatever else looks like one was not made here.
+// Each text has exactly one encoding; anything else that looks like one was not encoded here.
 QString Decoded(Encoder encode, QLatin1Char escape, QString const& encoded, bool* ok)
 {
     const QString text = Unescaped(escape, encoded);

@@ -10,14 +10,14 @@
 #include <utility>
 #include <vector>
 
-/// A hash table with text keys that is enumerated in the order in which its keys first came in.
+/// A hash table with text keys that iterates in insertion order.
 ///
-/// The plain wording is a QHash beside a list. It makes loading a large file slower than what Qt's
-/// own settings take: each key costs a piece of memory of its own. Here the entries lie in an
-/// array, and a second array finds them. tests/plain/tst_PlainTable.cpp holds it to the plain
-/// wording.
+/// The plain way is a QHash next to a list, but it allocates a node for each key, which dominates
+/// loading a large file. Here the entries are in one array, and a second array indexes them.
+/// tests/plain/tst_PlainTable.cpp compares it with the plain way.
 ///
-/// Keys match exactly and are unique. One thread at a time. Not installed: nothing public shows it.
+/// Keys match exactly and are unique. One thread at a time. Not installed: no public header needs
+/// it.
 template <class Value>
 class TorkOrderedHash
 {
@@ -41,11 +41,11 @@ public:
         return const_cast<Value*>(static_cast<TorkOrderedHash const*>(this)->find(key));
     }
 
-    /// Stores `value` under `key`. An earlier value of that key is replaced at its old place. Both
-    /// may be references into the table itself.
+    /// Stores `value` under `key`. An earlier value of that key is replaced and keeps its position.
+    /// Both may be references into the table itself.
     void insert(QString const& key, Value const& value)
     {
-        Entry entry{key, value}; // before the table grows, and they may move
+        Entry entry{key, value}; // copied before the table grows, which may move them
         if (m_slots.size() < 2 * (m_entries.size() + 1))
             grow();
 
@@ -70,7 +70,7 @@ public:
     typename std::vector<Entry>::const_iterator end() const { return m_entries.end(); }
 
 private:
-    // Where an entry stands, counted from 1; 0 if the slot is free.
+    // The 1-based position of an entry; 0 if the slot is free.
     struct Slot
     {
         uint hash;
@@ -79,16 +79,15 @@ private:
 
     uint hashOf(QString const& key) const { return qHash(key, m_seed); }
 
-    // Qt's comparison, which asks for more than whether they are the same, takes a typed read to
-    // its goal.
+    // Qt's comparison does more than test for equality, and every lookup compares.
     static bool isSame(QString const& a, QString const& b)
     {
         const size_t bytes = static_cast<size_t>(a.length()) * sizeof(QChar);
         return a.length() == b.length() && !std::memcmp(a.constData(), b.constData(), bytes);
     }
 
-    // The slot of the entry with this key, or the free one where its search ends: at least half of
-    // the slots are free, so it does.
+    // The slot of the entry with this key, or the free slot that ends the search: at least half of
+    // the slots are free, so the search does end.
     Slot const& slotOf(QString const& key, uint hash) const
     {
         const size_t mask = m_slots.size() - 1;
@@ -102,7 +101,7 @@ private:
     void grow()
     {
         const std::vector<Slot> before = std::move(m_slots);
-        // cppcheck-suppress accessMoved ; assign() does not care what was left
+        // cppcheck-suppress accessMoved ; assign() works on any moved-from vector
         m_slots.assign(before.empty() ? 8 : 2 * before.size(), Slot{0, 0});
         m_entries.reserve(m_slots.size() / 2);
         const size_t mask = m_slots.size() - 1;
@@ -116,6 +115,6 @@ private:
     }
 
     std::vector<Entry> m_entries;
-    std::vector<Slot> m_slots; // as many as a power of two
+    std::vector<Slot> m_slots; // the size is a power of two
     uint m_seed = static_cast<uint>(qGlobalQHashSeed());
 };

@@ -10,7 +10,7 @@ namespace {
 constexpr int MinimumWidth = 320;
 constexpr int MinimumHeight = 200;
 
-// A damaged file may hold any number, so sums and differences wrap instead of overflowing.
+// A damaged file may contain any number, so sums and differences wrap instead of overflowing.
 int Sum(int a, int b)
 {
     return static_cast<int>(static_cast<unsigned int>(a) + static_cast<unsigned int>(b));
@@ -38,8 +38,8 @@ TorkWindowRect TorkFitToDesktop(int x, int y, int width, int height, QSize const
     if (height > desktop.height())
         height = Difference(desktop.height(), 1);
 
-    // The far edges follow only here: where x and y are on the desktop, the stored edges hold
-    // even if width or height were replaced above. The format's rule.
+    // The far edges change only here: if x and y are on the desktop, the stored edges are used even
+    // if width or height was replaced above. The format's rule.
     if (x < 0) {
         x = 0;
         right = width;

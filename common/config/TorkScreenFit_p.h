@@ -16,8 +16,8 @@ struct TorkWindowRect
 /// Fits a stored window rectangle onto a desktop, so that a window never opens off-screen or
 /// smaller than 320 by 200.
 ///
-/// A window that would reach the right or bottom edge is pulled back to end one pixel inside it.
-/// Works for every int: sums wrap in 32 bits instead of overflowing. Pure, any thread.
+/// A window that would reach the right or bottom edge is moved to end one pixel before it. Works
+/// for any int: sums wrap at 32 bits instead of overflowing. Pure function, any thread.
 ///
 /// @param x, y, width, height  the stored rectangle, in pixels
 /// @param desktop  the extent of the desktop, in pixels

@@ -17,8 +17,8 @@ TorkLog::TorkLog(QString const& path)
 {
     clear();
     m_path = path;
-    // Found out here, where as a rule no other thread runs yet: it takes a look behind the
-    // handler that is installed.
+    // Called here, where usually no other thread runs yet: to find Qt's handler, it must replace
+    // the installed one for a moment.
     TorkLog_DefaultMessageHandler();
 }
 
@@ -81,8 +81,8 @@ QString TorkLog::errorString() const
 
 void TorkLog::setMaxLogFiles(unsigned int count)
 {
-    // The cap looks at the number in force so far, not at the new one: long-standing behaviour
-    // that settings dialogs rely on.
+    // The cap checks the current number, not the new one: long-standing behavior that settings
+    // dialogs rely on.
     if (count == 0)
         m_maxLogFiles = 2;
     else if (m_maxLogFiles > 100)
@@ -107,5 +107,5 @@ void TorkLog::setDateTimeFormat(QString const& format)
 {
     static std::atomic<quint64> generations{0};
     m_dateTimeFormat = format;
-    m_formatGeneration = ++generations; // unique among all logs, as the kept stamps are shared
+    m_formatGeneration = ++generations; // unique across all logs, as the cached stamps are shared
 }

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The entries of the log: how one is worded and how it reaches the file, from any thread.
+// The entries of the log: how one is formatted and written to the file, from any thread.
 
 #include "common/log/TorkLog.h"
 
@@ -44,7 +44,7 @@ void Append(TorkLogLine& line, QString const& text)
     line.append(Units(text), text.length());
 }
 
-// As QString::toLatin1() converts, without memory of its own.
+// Converts like QString::toLatin1(), without allocating.
 void ToLatin1(char* bytes, ushort const* text, int length)
 {
     std::transform(text, text + length, bytes, [](ushort character) {
@@ -98,7 +98,7 @@ void TorkLog::writeLine(ushort const* line, int length)
 
     TorkLogLock lock(m_mutex);
     m_writing = 1;
-    // A file that is opened for this entry has its room already.
+    // A file that is opened for this entry already has room for it.
     const bool wasOpen = m_writer->isOpen();
     const qint64 limit = wasOpen ? qint64(m_maxLogFileSize) : TorkLogWriter::NoLimit;
     if (wasOpen || locate(length)) {
@@ -109,9 +109,9 @@ void TorkLog::writeLine(ushort const* line, int length)
     m_writing = 0;
 }
 
-// The lock is held, so that the handler passes the line on to the toolkit's default output.
-// Installing it first puts it back in the place of any other, without a moment in which messages
-// of other threads would miss the log.
+// The lock is held, so the handler passes the line on to Qt's default output. Installing it first
+// replaces any other handler, without a moment in which messages of other threads would miss the
+// log.
 void TorkLog::echo(QString const& line) const
 {
     qInstallMessageHandler(TorkLog_MessageHandler);
@@ -135,7 +135,7 @@ int TorkLog::appendStamp(TorkLogLine& line, qint64 now) const
     return TorkLogStamp::Make(line, now, format, generation);
 }
 
-// Between times of day only: an interval across midnight comes out negative.
+// The difference between times of day: negative across midnight.
 QString TorkLog::elapsedTime(int timeOfDay) const
 {
     QString prefix;

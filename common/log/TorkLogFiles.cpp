@@ -6,7 +6,7 @@
 // Rotation of app.log with a limit of 3 older files:
 //
 //     before                   after
-//     app.log     too full     app.log      opened anew
+//     app.log     too full     app.log      new
 //     app.log.1                app.log.1    was app.log
 //     app.log.2                app.log.2    was app.log.1
 //     app.log.3                app.log.3    was app.log.2
@@ -29,7 +29,7 @@
 
 namespace {
 
-// As the names have always been formed: an empty path counts as ending in a slash.
+// An empty path counts as ending in a slash, for compatibility with existing file names.
 bool EndsInSlash(QString const& path)
 {
     return path.lastIndexOf(QLatin1Char('/')) == path.length() - 1;
@@ -40,8 +40,8 @@ QString BeforeLastDot(QString const& fileName)
     return fileName.left(fileName.lastIndexOf(QLatin1Char('.')));
 }
 
-// The number of an older file: what follows the last dot; -1 if that is no number.
-int logFileNumber(QString const& fileName)
+// The number of an older file: what follows the last dot; -1 if that is not a number.
+int LogFileNumber(QString const& fileName)
 {
     const int dot = fileName.lastIndexOf(QLatin1Char('.'));
     if (dot == -1)
@@ -52,11 +52,12 @@ int logFileNumber(QString const& fileName)
     return converted ? number : -1;
 }
 
-// What lies in `directory` and is named `name` and a further extension, in name order.
+// The entries of `directory` that are named `name` plus another extension, sorted by name.
 //
-// Compared by hand: Qt's name filters are wildcards that split at blanks and semicolons, read
-// brackets as character sets and ignore letter case, and would take in files of others.
-QStringList NamedLike(QString const& directory, QString const& name, QDir::Filters filters)
+// Compared by hand: Qt's name filters are wildcards that split at spaces and semicolons, treat
+// brackets as character sets and ignore case, and would match unrelated files.
+QStringList EntriesWithExtension(QString const& directory, QString const& name,
+                                 QDir::Filters filters)
 {
     const QString start = name + QLatin1Char('.');
     QStringList found;
@@ -68,30 +69,31 @@ QStringList NamedLike(QString const& directory, QString const& name, QDir::Filte
     return found;
 }
 
-bool HasReachedTheDisk(QFileDevice& file)
+bool SyncToDisk(QFileDevice& file)
 {
     if (!file.flush())
         return false;
 #ifdef Q_OS_UNIX
-    ::fsync(file.handle()); // some file systems cannot; the copy is good all the same
+    ::fsync(file.handle()); // not every file system can; the copy is good anyway
 #endif
     return true;
 }
 
-// A copy has no name before it is whole, or, where the file system knows no such files, one that
-// tells whose it is: app.log.1.aBcDeF.part, which no number can be mistaken for.
+// Until it is complete, a copy has no name or, if the file system does not support unnamed files,
+// one that says what it belongs to and does not end in a number: app.log.1.aBcDeF.part.
 QString PartName(QString const& to)
 {
     return to + QLatin1String(".XXXXXX.part");
 }
 
-// Makes `to`, which must not exist, whole or not at all. Where the directory takes no new file,
-// QFile::copy() would put the text into the system's temporary folder on the way.
+// Creates `to`, which must not exist, completely or not at all. If the directory is not writable,
+// QFile::copy() would leave the text in the system's temporary folder for a while.
 void Copy(QString const& from, QString const& to)
 {
     QFile source(from);
     QTemporaryFile copy(PartName(to));
-    const bool isFile = QFileInfo(from).isFile(); // opening a pipe would wait for a writer
+    const bool isFile =
+        QFileInfo(from).isFile(); // opening a pipe would block until it has a writer
     if (!isFile || QFile::exists(to) || !source.open(QIODevice::ReadOnly) || !copy.open())
         return;
 
@@ -101,19 +103,19 @@ void Copy(QString const& from, QString const& to)
         if (copy.write(block) != block.size())
             return;
     }
-    const bool isWhole = source.error() == QFileDevice::NoError && HasReachedTheDisk(copy);
+    const bool isWhole = source.error() == QFileDevice::NoError && SyncToDisk(copy);
     copy.setPermissions(source.permissions());
     if (isWhole && copy.rename(to))
         copy.setAutoRemove(false);
 }
 
-// Removes what Copy() to number 1 of the log `name` leaves behind when the program is killed.
+// Removes what Copy() to number 1 of the log `name` leaves when the program is killed.
 void RemoveUnfinishedCopies(QString const& directory, QString const& name)
 {
     const QString start = name + QLatin1String(".1");
     const int length = PartName(start).length();
     const QStringList files =
-        NamedLike(directory, start, QDir::Files | QDir::Hidden | QDir::NoSymLinks);
+        EntriesWithExtension(directory, start, QDir::Files | QDir::Hidden | QDir::NoSymLinks);
     for (QString const& file : files) {
         const QStringRef random = file.midRef(start.length() + 1, 6);
         const bool isRandom = std::all_of(random.begin(), random.end(), [](QChar letter) {
@@ -152,8 +154,8 @@ QString& TorkLog::newLogFileName()
 {
     TorkLogLock lock(m_mutex);
     const QString name = currentFilePath();
-    // Left alone where a reader of the buffer would see no change.
-    // cppcheck-suppress duplicateConditionalAssign ; an assignment would take the buffer away
+    // Not assigned if equal: a caller may still be reading the buffer.
+    // cppcheck-suppress duplicateConditionalAssign ; an assignment would replace the buffer
     if (m_logFileName != name)
         m_logFileName = name;
     return m_logFileName;
@@ -185,7 +187,7 @@ bool TorkLog::openFile(QString const& fileName)
     return reason.isNull();
 }
 
-// Empty for a hidden file: QDir::Files does not list one, so the log never looks at its size.
+// Empty for a hidden file: QDir::Files does not list those, so the log never checks their size.
 QFileInfo TorkLog::currentFile() const
 {
     const QString name = currentFileName();
@@ -196,7 +198,7 @@ QFileInfo TorkLog::currentFile() const
 
 void TorkLog::makeLogDirectory(QString const& path)
 {
-    // The last character goes, whatever it is: usually the final slash.
+    // The last character is dropped, whatever it is: usually the final slash.
     const QString directory = path.length() == 1 ? path : path.left(path.length() - 1);
     QDir().mkpath(directory);
 }
@@ -207,8 +209,9 @@ QFile* TorkLog::locateLogFile(QString const& text)
     return locate(text.length()) ? file : nullptr;
 }
 
-// Whether the file that `length` more characters go to is open. It may have been trimmed for them,
-// or have been opened for them.
+// Opens or trims the file to make room for `length` more characters.
+//
+// @return whether a file is open
 bool TorkLog::locate(int length)
 {
     if (m_writer->isOpen()) {
@@ -251,17 +254,17 @@ void TorkLog::deleteOldFiles()
 void TorkLog::shiftOldFiles(QString const& directory) const
 {
     QMap<int, QString> numbered;
-    const QStringList files = NamedLike(directory, currentFileName(), QDir::Files);
+    const QStringList files = EntriesWithExtension(directory, currentFileName(), QDir::Files);
     for (QString const& file : files) {
-        const int number = logFileNumber(file);
+        const int number = LogFileNumber(file);
         if (number != -1)
             numbered.insert(number, file);
     }
     if (numbered.isEmpty() || numbered.lastKey() < 0)
         return;
 
-    // From the highest down, so that each new name is free. Directory and name are joined as they
-    // are: a directory without its final slash runs into the name.
+    // From the highest down, so that each new name is free. Directory and name are joined without a
+    // slash: a directory that lacks the final one runs into the name.
     const QList<int> numbers = numbered.keys();
     for (auto number = numbers.crbegin(); number != numbers.crend() && *number >= 1; ++number) {
         QString const& file = numbered[*number];
@@ -273,9 +276,9 @@ void TorkLog::shiftOldFiles(QString const& directory) const
         pruneOldFiles(directory, qint64(numbered.lastKey()) + 1);
 }
 
-// Removes everything that has the name of an older file, from `highest` down to the first above the
-// limit, be it a pipe or a link to nothing. Goes by the names that are there: a stray file with a
-// huge number must not cost a billion attempts.
+// Removes everything named like an older file, from `highest` down to the first above the limit,
+// even a pipe or a dangling link. Iterates over existing names: a stray file with a huge number
+// must not cost a billion attempts.
 void TorkLog::pruneOldFiles(QString const& directory, qint64 highest) const
 {
     const qint64 lowest = qint64(static_cast<int>(m_maxLogFiles.load())) + 1;
@@ -283,7 +286,7 @@ void TorkLog::pruneOldFiles(QString const& directory, qint64 highest) const
     const QString path = currentFilePath();
 
     const QDir::Filters all = QDir::AllEntries | QDir::System | QDir::NoDotAndDotDot;
-    const QStringList files = NamedLike(directory, name, all);
+    const QStringList files = EntriesWithExtension(directory, name, all);
     for (QString const& file : files) {
         const QString number = file.mid(name.length() + 1);
         const qint64 value = number.toLongLong();

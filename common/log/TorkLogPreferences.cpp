@@ -26,11 +26,11 @@ bool ReadSwitch(TorkConfigFile& settings, QString const& key, bool defaultValue)
     return value;
 }
 
-// A number that does not convert leaves the one in force.
+// A number that does not convert leaves the current one unchanged.
 quint32 ReadNumber(TorkConfigFile& settings, QString const& key, quint32 defaultValue,
-                   quint32 inForce)
+                   quint32 current)
 {
-    unsigned int value = inForce;
+    unsigned int value = current;
     settings.ReadUint(Section(), key, defaultValue, value);
     return value;
 }
@@ -114,7 +114,7 @@ bool TorkLog::load()
     if (!QFile::exists(fileName))
         return false;
 
-    // The values are read whether or not the file parsed: what is missing takes its default.
+    // The values are read even if the file did not parse: what is missing gets its default.
     TorkConfigFile settings(fileName, QStringLiteral("LogSettings"));
     const bool loaded = settings.Load();
 
@@ -134,7 +134,7 @@ bool TorkLog::load()
 
 bool TorkLog::save()
 {
-    // Only copied under the lock: the store traces what it does into this log.
+    // Only copied under the lock, as TorkConfigFile traces to this log.
     QString fileName;
     QString dateTimeFormat;
     QString elapsedTimePrefix;
@@ -160,12 +160,12 @@ bool TorkLog::save()
     return settings.Save();
 }
 
-// On the first start the settings are saved before the first entry makes the log directory.
+// On the first start, the settings are saved before the first entry creates the log directory.
 void TorkLog::makeDirectoryOfPreferences(QString const& fileName) const
 {
     const QString directory = QDir::cleanPath(QFileInfo(fileName).absolutePath());
     const QString logs = path();
-    const bool liesInLogDirectory = directory == QDir::cleanPath(QDir(logs).absolutePath());
-    if (liesInLogDirectory && !QDir(directory).exists())
+    const bool isInLogDirectory = directory == QDir::cleanPath(QDir(logs).absolutePath());
+    if (isInLogDirectory && !QDir(directory).exists())
         makeLogDirectory(logs);
 }

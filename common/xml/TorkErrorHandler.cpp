@@ -17,7 +17,7 @@ bool TorkErrorHandler::warning(QXmlParseException const& exception)
     return true;
 }
 
-// The two labels differ, and log readers of the family tell errors from fatal ones by them.
+// The labels differ on purpose: log readers distinguish errors from fatal errors by them.
 bool TorkErrorHandler::error(QXmlParseException const& exception)
 {
     format(exception);
@@ -40,7 +40,8 @@ QString TorkErrorHandler::errorString() const
 
 QString& TorkErrorHandler::format(QXmlParseException const& exception)
 {
-    // Filled in turn: a message that holds a placeholder takes the next text in its place.
+    // Arguments are substituted one at a time, for compatibility: a message that contains a
+    // placeholder gets the next text in its place.
     m_detailText = QStringLiteral("%1\nPublic ID: %2, System ID: %3\nLine: %4, Column: %5")
                        .arg(exception.message())
                        .arg(exception.publicId()) // clazy:exclude=qstring-arg

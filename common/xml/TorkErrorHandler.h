@@ -9,10 +9,13 @@
 class QXmlParseException;
 class TorkLog;
 
-/// Turns the problems that the toolkit's XML reader reports into readable texts with their place.
+/// Turns problems that Qt's XML reader reports into readable texts with line and column.
 ///
-/// Keeps the last text for the caller and issues each on the toolkit's message channel, from where
-/// it reaches the log. One handler serves one parse on one thread.
+/// Keeps the last text for the caller, and issues each as a Qt message, so it reaches the log if
+/// TorkLog::initialize() was called.
+///
+/// Use one handler per parse, on one thread: errorString() is never cleared, so a second parse
+/// would start with the problem of the first. The reader does not own it.
 ///
 ///     TorkErrorHandler errors(TorkLog::logger());
 ///     reader.setErrorHandler(&errors);
@@ -21,30 +24,39 @@ class TorkLog;
 class TorkErrorHandler : public QXmlErrorHandler
 {
 public:
-    /// @param log  kept, not owned, not written to; may be null
+    /// A handler without a problem yet.
+    ///
+    /// @param log  kept for compatibility, but not used: messages reach the log through Qt; not
+    ///             owned, may be null
     explicit TorkErrorHandler(TorkLog* log);
+
+    /// Does not touch the log.
     ~TorkErrorHandler() override;
 
-    /// Issues the problem as a warning. Returns true: the reader goes on.
+    /// Issues the problem as a Qt warning, a Warning in the log. Returns true: the reader
+    /// continues.
     bool warning(QXmlParseException const& exception) override;
 
-    /// Issues the problem as a critical message. Returns true: the reader goes on.
+    /// Issues the problem as a critical Qt message, an Error in the log. Returns true: the reader
+    /// continues.
     bool error(QXmlParseException const& exception) override;
 
-    /// Issues the problem as a critical message. Returns false: the reader stops.
+    /// Issues the problem as a critical Qt message, an Error in the log. Returns false: the reader
+    /// stops, and QXmlSimpleReader::parse() returns false.
     bool fatalError(QXmlParseException const& exception) override;
 
-    /// The last problem in full, a mere warning too; empty if there was none.
+    /// The last problem, even a mere warning, as three lines after the heading "Xml Parse
+    /// Failure.": message, public and system identifier, line and column. Empty if there was none.
     QString errorString() const override;
 
-    /// Words a problem and keeps both texts.
+    /// Formats a problem and keeps the text for errorString(). Issues no message.
     ///
     /// @return the description with its identifiers, line and column, without the heading that
     ///         errorString() has; a buffer that the next problem overwrites
     QString& format(QXmlParseException const& exception);
 
 private:
-    [[maybe_unused]] TorkLog* m_log; // messages reach it through the toolkit
-    QString m_errorText;
-    QString m_detailText;
+    [[maybe_unused]] TorkLog* m_log; // messages reach it through Qt
+    QString m_errorText;             // with the heading
+    QString m_detailText;            // the buffer that format() returns
 };

@@ -14,7 +14,7 @@ TorkXmlFile::TorkXmlFile(QString const& name)
 
 TorkXmlFile::~TorkXmlFile()
 {
-    // The file goes before the text stream does, which would otherwise flush into freed memory.
+    // The file is destroyed before the text stream, which would otherwise flush to freed memory.
     setDevice(nullptr);
 }
 

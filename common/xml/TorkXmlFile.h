@@ -9,10 +9,19 @@
 #include <QTextStream>
 #include <QXmlInputSource>
 
-/// Writes indented XML element by element into a named file of its own.
+/// Writes indented XML element by element into a named file that it owns.
 ///
-/// The operations and their output are those of TorkXmlStream, but none of them reports a failed
-/// write: see errorString(). One thread at a time.
+/// Operations and output are those of TorkXmlStream, which documents them; output: docs/xml.md. The
+/// caller drives the structure and balances open and end calls; nothing is validated, and names and
+/// attribute values are never escaped.
+///
+/// Errors: no operation reports a failed write, as the text stream buffers the output. To learn of
+/// a full disk, call flush() and check status() and errorString() before close(). A file that is
+/// cut short by a failed write is not removed.
+///
+/// The file is in the locale's encoding unless you call setCodec("UTF-8") before the first text. It
+/// is written in place: to replace an existing file atomically, write to a QSaveFile through a
+/// TorkXmlStream instead. One thread at a time.
 ///
 ///     TorkXmlFile writer(path);
 ///     if (!writer.open(QIODevice::WriteOnly))
@@ -24,69 +33,72 @@
 class TorkXmlFile : public QTextStream, public QXmlInputSource
 {
 public:
-    /// A writer without a file name.
+    /// A writer without a file name; call setName() before open().
     TorkXmlFile();
 
     /// A writer for the file `name`, which is not opened.
     explicit TorkXmlFile(QString const& name);
 
-    /// Writes out what the text stream still holds and closes the file.
+    /// Writes out what the text stream still buffers and closes the file. Collected attributes that
+    /// no close wrote are dropped.
     ~TorkXmlFile() override;
 
-    /// Sets the name of the file, which must not be open.
+    /// Sets the name of the file, which must not be open. Creates nothing.
+    ///
+    /// @param name  a path; its directory must exist when the file is opened
     void setName(QString const& name);
 
-    /// Opens the file. On failure errorString() has the reason.
+    /// Opens the file.
+    ///
+    /// @param mode  as for QFile::open(); QIODevice::WriteOnly truncates an existing file
+    /// @return whether the file is open; if not, errorString() has the reason
     bool open(QIODevice::OpenMode mode);
 
-    /// Closes the file. Collected attributes are not written.
+    /// Writes out what the text stream still buffers and closes the file; nothing if none is open.
+    /// Collected attributes are not written. The level of indentation is kept.
     void close();
 
+    /// Whether the file is open.
     bool isOpen() const;
 
-    /// The toolkit's text for what last went wrong with the file.
+    /// Qt's text for the last problem with the file, in the user's language; "Unknown error" if
+    /// there was none.
     QString errorString() const;
 
+    /// The name of the file, as it was set; empty if none was.
     QString name() const;
 
-    /// Writes a text, in a CDATA section if it holds one of & \ > < ". Nothing if it is empty.
-    /// "]]>" in the text is not split. Returns 0 whatever Write() reported.
+    /// @copydoc TorkXmlStream::WriteElementValue
     virtual int WriteElementValue(QString const& value);
 
-    /// Writes the indentation and "<name " (with the blank), then raises the level by `indent`;
-    /// not if writing failed. WriteAttribute() and a close follow.
+    /// @copydoc TorkXmlStream::WriteElementOpen
     virtual int WriteElementOpen(QString const& name, int indent);
 
-    /// Lowers the level by `indent` and ends the start tag; content follows. Opening and closing
-    /// with equal indents leaves the children at the element's own level, and WriteElementEnd()
-    /// lowers once more: pass a smaller `indent` for indented children.
-    ///
-    /// @param name  only checked; if it is empty the collected attributes are dropped
+    /// @copydoc TorkXmlStream::WriteElementClose
     virtual int WriteElementClose(QString const& name, int indent);
 
-    /// The same for an element without content, which ends here.
+    /// @copydoc TorkXmlStream::WriteElementCloseAndEnd
     virtual int WriteElementCloseAndEnd(QString const& name, int indent);
 
-    /// Writes the indentation and a start tag without attributes on a line of its own, then
-    /// raises the level by `indent`; not if writing failed.
+    /// @copydoc TorkXmlStream::WriteElementStart
     virtual int WriteElementStart(QString const& name, int indent);
 
-    /// Lowers the level by `indent`, then writes the end tag on a line of its own.
+    /// @copydoc TorkXmlStream::WriteElementEnd
     virtual int WriteElementEnd(QString const& name, int indent);
 
-    /// Writes a leaf element with its text on a line of its own; nothing if `value` is empty.
+    /// @copydoc TorkXmlStream::WriteElement
     virtual int WriteElement(QString const& name, QString const& value);
 
-    /// Collects an attribute for the start tag that is open. What would pass 80 characters starts
-    /// a new line at column 0. Returns 1005 or 0, whatever Write() reported.
+    /// @copydoc TorkXmlStream::WriteAttribute
     virtual int WriteAttribute(QString const& name, QString const& value);
 
-    /// Writes the indentation unit once per level; nothing at level 0 or below. Returns 0.
+    /// @copydoc TorkXmlStream::WriteCurrentIndent
     virtual int WriteCurrentIndent();
 
-    /// Puts a text out as it stands. All output goes through here.
+    /// Writes a text unchanged. All output goes through here, so overriding it is enough to see or
+    /// change all of it.
     ///
-    /// @return always 0, so that no operation of this class reports 1006
+    /// @return always 0, so no operation of this class returns 1006
     virtual int Write(QString const& text);
 
 private:

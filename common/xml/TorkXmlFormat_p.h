@@ -11,14 +11,14 @@
 
 /// The formatting of both XML writers. For the writers' own sources.
 ///
-/// The writers share no base class, so the rules are here once, as templates over the writer. Every
-/// piece goes through the writer's virtual operations, one by one, so that a subclass sees each.
+/// The writers share no base class, so the rules are here once, as templates on the writer. Each
+/// piece goes through the writer's virtual operations, so that a subclass sees it.
 namespace TorkXmlFormat {
 
-/// Pending attributes together with one more stay below this many characters, or a line ends.
+/// If the pending attributes and the next one reach this many characters, a new line starts.
 constexpr int PendingLimit = 81;
 
-// Callers balance the levels; one who does not must not run into undefined behavior.
+// Callers balance the levels; one who does not must not cause undefined behavior.
 inline qint32 Raised(qint32 level, int indent)
 {
     return static_cast<qint32>(static_cast<quint32>(level) + static_cast<quint32>(indent));
@@ -29,8 +29,8 @@ inline qint32 Lowered(qint32 level, int indent)
     return static_cast<qint32>(static_cast<quint32>(level) - static_cast<quint32>(indent));
 }
 
-// The backslash is one of them, so that paths stand out; the apostrophe is not. One pass without a
-// stop, which compilers make for several characters at once.
+// The backslash is included, so that paths stand out; the apostrophe is not. No early return, so
+// that compilers can vectorize the loop.
 inline bool NeedsCData(QString const& value)
 {
     ushort found = 0;
@@ -67,7 +67,7 @@ inline QChar* Copy(QString const& text, QChar* to)
     return std::copy_n(text.constData(), text.length(), to);
 }
 
-// Appends literals and texts after making room for all of them once. None of them is `text`.
+// Appends literals and texts after reserving space once. None of them is `text`.
 template <class... Pieces>
 void AppendAll(QString& text, Pieces const&... pieces)
 {
@@ -77,8 +77,8 @@ void AppendAll(QString& text, Pieces const&... pieces)
     ((to = Copy(pieces, to)), ...);
 }
 
-// Joined in memory that is kept from tag to tag, as a new text for each makes a document take more
-// than its goal. It is taken away meanwhile, as an overridden Write() may come back here.
+// Joins the tag in a buffer that is kept from tag to tag, so that nothing is allocated per tag. It
+// is moved out during the call, as an overridden Write() may re-enter the writer.
 template <class Writer, std::size_t StartSize, std::size_t EndSize>
 int WriteTag(Writer& writer, TorkXmlLayout& layout, char const (&start)[StartSize],
              QString const& name, char const (&end)[EndSize])
@@ -91,7 +91,7 @@ int WriteTag(Writer& writer, TorkXmlLayout& layout, char const (&start)[StartSiz
     return written;
 }
 
-// Writes a copy, as an overridden Write() may come back here and change what is pending.
+// Writes a copy, as an overridden Write() may re-enter the writer and change what is pending.
 template <class Writer>
 int WritePending(Writer& writer, TorkXmlLayout const& layout)
 {
@@ -107,7 +107,7 @@ int CurrentIndent(Writer& writer, TorkXmlLayout const& layout)
     return TorkXmlResult::Success;
 }
 
-// A tag that raises the level after it: the start of an element.
+// A tag that raises the level: the start of an element.
 template <class Writer, std::size_t EndSize>
 int RaisingTag(Writer& writer, TorkXmlLayout& layout, QString const& name,
                char const (&end)[EndSize], int indent)
@@ -134,7 +134,7 @@ int ElementStart(Writer& writer, TorkXmlLayout& layout, QString const& name, int
     return RaisingTag(writer, layout, name, ">\n", indent);
 }
 
-// The end of a start tag, with the attributes collected so far before it.
+// The end of a start tag, preceded by the collected attributes.
 template <class Writer>
 int EndOfTag(Writer& writer, TorkXmlLayout& layout, QString const& name, QLatin1String end,
              int indent)
@@ -209,7 +209,7 @@ int ElementValue(Writer& writer, QString const& value)
     return TorkXmlResult::Success;
 }
 
-// Joins an attribute to those that are pending, or begins a new line with it.
+// Appends an attribute to the pending ones, or starts a new line with it.
 template <class Writer, class... Pieces>
 void Collect(Writer& writer, TorkXmlLayout& layout, Pieces const&... pieces)
 {
@@ -218,15 +218,15 @@ void Collect(Writer& writer, TorkXmlLayout& layout, Pieces const&... pieces)
         return;
     }
 
-    // The attribute is then at column 0, without a blank before it.
+    // The attribute is then at column 0, without a space before it.
     layout.pending += QLatin1Char('\n');
     WritePending(writer, layout);
     layout.pending.resize(0);
     AppendAll(layout.pending, pieces...);
 }
 
-// Filled one after another: a name that holds a placeholder takes the value in its place. For any
-// other the result is the same without the search for placeholders.
+// Arguments are substituted one at a time, for compatibility: a name that contains a placeholder
+// gets the value in its place. Any other name needs no placeholders.
 template <class Writer>
 int CollectAttribute(Writer& writer, TorkXmlLayout& layout, QString const& name,
                      QString const& value)

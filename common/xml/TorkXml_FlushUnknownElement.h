@@ -5,8 +5,9 @@
 
 #include "common/xml/TorkXml_ParseState_Base.h"
 
-/// Accepts and drops one element with all that is in it, so that a reader can skip what it does
-/// not know without failing.
+/// Accepts and drops an element with everything in it, so that a reader can skip what it does not
+/// know instead of failing. Return a new one from GetNextState(); the manager owns and deletes it.
+/// Skipped elements still count toward the depth limit.
 ///
 ///     TorkXml_ParseState_Base* FolderState::GetNextState(QString const& name)
 ///     {
@@ -18,15 +19,16 @@ class TorkXml_FlushUnknownElement : public TorkXml_ParseState_Base
 {
 public:
     using TorkXml_ParseState_Base::TorkXml_ParseState_Base;
+    /// Called by the manager when the element ends.
     ~TorkXml_FlushUnknownElement() override;
 
-    /// False: every nested element gets a flush state of its own, so that an element of the same
-    /// name further in does not end the skip.
+    /// Returns false: every nested element gets its own flush state, so that a nested element of
+    /// the same name does not end the skip.
     bool CanHandleElement(QString const& name) override;
 
-    /// A new flush state for the nested element; never null.
+    /// Returns a new flush state for the nested element, owned by the caller; never null.
     TorkXml_ParseState_Base* GetNextState(QString const& name) override;
 
-    /// Drops the content and returns true.
+    /// Drops the text or attribute and returns true: the parse continues.
     bool ProcessContent(QString const& name, QString const& content) override;
 };

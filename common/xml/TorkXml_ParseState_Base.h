@@ -10,10 +10,10 @@ class TorkXml_ParseManager_Base;
 /// Handles one XML element while a document is read; the base of all parse states.
 ///
 /// The parse manager keeps a stack of states. The one on top gets its element's attributes and the
-/// character data, says which child elements it handles in place, makes the states of the others,
-/// and is told when its element ends. Derive one class per kind of element. The manager owns a
-/// state from the moment it is returned from a GetNextState() or GetFirstState(), and deletes it.
-/// One parse on one thread.
+/// character data, says which child elements it handles itself, creates the states of the others,
+/// and is notified when its element ends. Derive one class per kind of element. The manager owns a
+/// state as soon as GetNextState() or GetFirstState() returns it, and deletes it. One parse on one
+/// thread.
 ///
 ///     class TitleState : public TorkXml_ParseState_Base
 ///     {
@@ -45,25 +45,25 @@ public:
     /// Whether `name` is exactly the name of this state's element.
     virtual bool IsElement(QString const& name);
 
-    /// Whether this state handles the child element `name` itself. Then the child gets no state,
-    /// its attributes go to nobody, and its text comes to this state's ProcessContent().
+    /// Whether this state handles the child element `name` itself. The child then gets no state,
+    /// its attributes are dropped, and its text is passed to this state's ProcessContent().
     ///
     /// A child of the same name as this state's own element ends this state one level early: end
     /// tags are matched by name alone.
     ///
-    /// @return here always false
+    /// @return always false here
     virtual bool CanHandleElement(QString const& name);
 
-    /// Makes the state of the child element `name`, owned by the manager from then on.
+    /// Creates the state of the child element `name`; the manager takes ownership.
     ///
-    /// @return null, which fails the parse, if the child is not known; here always null
+    /// @return null, which fails the parse, if the child is unknown; always null here
     virtual TorkXml_ParseState_Base* GetNextState(QString const& name);
 
     /// Takes one piece of content: an attribute's name and value, or the name of the current
     /// element and some of its text.
     ///
-    /// @return false to stop the parse (at text only; ignored for attributes); here always false,
-    ///         so override it wherever text may come, white space between elements included
+    /// @return false to stop the parse (for text only; ignored for attributes); always false here,
+    ///         so override it wherever text may occur, including white space between elements
     virtual bool ProcessContent(QString const& name, QString const& content);
 
     /// This state's own element ended; the state is deleted next. The result is ignored.

@@ -13,5 +13,5 @@ void FindEnd(QXmlInputSource const& source)
     QXmlSimpleReader reader;
     reader.setContentHandler(&handler);
     if (!reader.parse(source))
-        qDebug() << "broken behind" << handler.lastOpenedElement();
+        qDebug() << "broken after" << handler.lastOpenedElement();
 }
