@@ -10,15 +10,15 @@
 ///     auto* product = new LaunchOption("product", "product", "p", 1, "The product name");
 struct LaunchOption
 {
-    /// Sets the fields in their order; no value is set.
+    /// Initializes the fields in order; the value is not set.
     LaunchOption(QString const& optionName, QString const& longForm, QString const& shortForm,
                  qint32 arguments, QString const& text);
 
     QString name;        ///< the key by which the option is found; compared exactly
-    QString longName;    ///< a second form of the name; not consulted
-    QString shortName;   ///< one letter; not consulted
-    qint32 argCount;     ///< how many values follow; not interpreted
-    QString description; ///< for people
-    QString value;       ///< the value read; empty until set
-    bool isSet = false;  ///< whether a value was read, be it an empty one
+    QString longName;    ///< long form of the name; unused
+    QString shortName;   ///< one letter; unused
+    qint32 argCount;     ///< number of values that follow; unused
+    QString description; ///< for users
+    QString value;       ///< the value; empty until set
+    bool isSet = false;  ///< whether a value was read, even an empty one
 };

@@ -22,7 +22,7 @@ class LaunchOptionParser
 public:
     LaunchOptionParser();
 
-    /// Deletes the options, the first one first.
+    /// Deletes the options, in order.
     ~LaunchOptionParser();
 
     LaunchOptionParser(LaunchOptionParser const&) = delete;
@@ -36,20 +36,21 @@ public:
 
     /// Reads a launch data file, in the locale's encoding, and sets the options it names.
     ///
-    /// Only regular files and links to them are read: a pipe or a device could block, or never end.
+    /// Only regular files and links to them are read: reading a pipe or device could block or never
+    /// end.
     ///
     /// @return false if the file is missing, is not a regular file, cannot be opened, has more than
     ///         268435456 characters (256 Mi), or if ParseOptions() fails; an empty file sets
     ///         nothing and succeeds
     bool ReadDataFile(QString const& path);
 
-    /// Sets the options that an XML text names.
+    /// Sets the options named in an XML text.
     ///
-    /// An unknown key fails the whole text, with a message in errorText, yet what follows is still
-    /// read. Text that is not well-formed, or nested deeper than TorkXmlMaximumDepth, fails
+    /// An unknown key makes the call fail with a message in errorText, but later elements are still
+    /// applied. Text that is not well-formed, or nested deeper than TorkXmlMaximumDepth, fails
     /// without a message and sets nothing.
     bool ParseOptions(QString& text);
 
     QList<LaunchOption*> options; ///< owned, in the order they were added
-    QString errorText;            ///< messages, one after another with nothing between them
+    QString errorText;            ///< messages, concatenated without separators
 };
