@@ -27,7 +27,7 @@ QString& StoredProductName()
 void TakeValue(LaunchOptionParser const& parser, QString const& key, QString& value)
 {
     LaunchOption const* option = parser.FindOption(key);
-    if (option && option->isSet) // an empty text counts: it makes the name empty
+    if (option && option->isSet) // also if the value is empty
         value = option->value;
 }
 

@@ -8,8 +8,8 @@
 /// The identity and the directories of the program, published on the application object.
 ///
 /// Every directory ends in "/". The properties "RootPath" (installation), "DataPath" (the user's
-/// data of this program) and "DocPath" (the user's documents) hold them as strings. Nothing is
-/// made on disk or checked. Main thread, at start-up; without an application object nothing is
+/// data for this program) and "DocPath" (the user's documents) hold them as strings. Nothing is
+/// created or checked on disk. Main thread, at startup; without an application object nothing is
 /// published. AppUtils computes the same directories without publishing them.
 ///
 ///     AppPaths::SetOrganizationAndProduct();
@@ -17,16 +17,16 @@
 class AppPaths
 {
 public:
-    /// Sets organisation and product from the launch data file "appdata.cfg" in the installation
-    /// root, or to "yourorganization" and "yourproduct" where the file sets none or is unusable,
+    /// Sets organization and product from the launch data file "appdata.cfg" in the installation
+    /// root, with "yourorganization" and "yourproduct" as defaults for what the file does not set,
     /// and publishes the three directories. Cannot fail.
     static void SetOrganizationAndProduct();
 
     /// Sets the given names, which the data directory depends on, and publishes the directories.
     static void SetOrganizationAndProduct(QString const& organization, QString const& product);
 
-    /// The product name that was set last; empty if it was set empty, where the application object
-    /// answers with the executable's name instead.
+    /// The product name that was last set. If it was set to an empty string this is empty, while
+    /// the application object falls back to the name of the executable.
     static QString const& ProductName();
 
     /// The installation root: the folder that holds the application bundle, or else the parent of
@@ -38,7 +38,7 @@ public:
     /// The installation root, always computed and never published.
     static void SetupProgramPath(QString& path);
 
-    /// The user's data directory of this program. Published as "DataPath".
+    /// The user's data directory for this program. Published as "DataPath".
     static void SetupDataRootPath(QString& path);
 
     /// The user's documents directory. Published as "DocPath".

@@ -30,7 +30,7 @@ QString BeforeLast(QString const& text, QString const& separator)
     return position < 0 ? text : text.left(position);
 }
 
-// Adds or removes one entry. False if nothing is to be changed.
+// Adds or removes one entry. Returns false if nothing changes.
 bool Update(QStringList& entries, QString const& file, AppUtils::MRUOpCode op)
 {
     switch (op) {
@@ -51,7 +51,7 @@ void AppUtils::SetupRootPath(QString& path)
     if (!path.isEmpty())
         return;
 
-    // In a bundle the executable lies in X/Some.app/Contents/MacOS, else in X/bin: either way X.
+    // The executable is in X/Some.app/Contents/MacOS in a bundle, in X/bin otherwise: return X.
     const QString folder =
         BeforeLast(QCoreApplication::applicationDirPath(), QStringLiteral("/Contents/MacOS"));
     path = BeforeLast(folder, QStringLiteral("/")) + QLatin1Char('/');
@@ -114,7 +114,7 @@ bool AppUtils::UpdateMRUList(QString const& file, QString& list, int maxCount, M
     if (!Update(entries, file, op))
         return false;
 
-    // Empty, never null: a null text is refused by the settings, which would keep the old list.
+    // Empty, never null: TorkConfigFile rejects null strings and would keep the old list.
     list = QLatin1String("") + QStringList(entries.mid(0, qMax(0, maxCount))).join(Separator);
     return true;
 }

@@ -21,24 +21,24 @@ class QMenu;
 class AppUtils
 {
 public:
-    /// What UpdateMRUList() does. Any other value changes nothing.
+    /// The operation for UpdateMRUList(). Any other value changes nothing.
     enum MRUOpCode : int { MRUAdd = 0, MRURemove = 1 };
 
     /// The installation root, ending in "/".
     ///
-    /// @param path  receives the directory; left alone if it is not empty
+    /// @param path  receives the directory; unchanged if it is not empty
     static void SetupRootPath(QString& path);
 
     /// The same operation as SetupRootPath().
     static void SetupProgramPath(QString& path);
 
-    /// The user's data directory of this program, ending in "/".
+    /// The user's data directory for this program, ending in "/".
     static void SetupDataRootPath(QString& path);
 
     /// The user's documents directory, ending in "/".
     static void SetupDocumentPath(QString& path);
 
-    /// Sets the organisation's and then the application's name on the application object.
+    /// Sets the organization name and then the application name on the application object.
     static void SetOrganizationAndProduct(QString const& organization, QString const& product);
 
     /// Sets both names, then computes the root (unless `root` is not empty) and the data directory.
@@ -47,22 +47,23 @@ public:
 
     /// Fills a menu with one action per entry, newest first; the action's text is the entry.
     ///
-    /// @return whether there was any entry; the menu is enabled or disabled accordingly
+    /// @return whether there were any entries; the menu is enabled or disabled accordingly
     static bool SetupMRUMenu(QMenu* menu, QString const& list);
 
-    /// Fills a list widget with one item per entry, newest first, in the same way.
+    /// Fills a list widget with one item per entry, in the same way.
     static bool SetupMRUListWidget(QListWidget* widget, QString const& list);
 
-    /// Puts a file at the front of a list or takes it out; only its first occurrence moves.
+    /// Moves a file to the front of a list or removes it; only its first occurrence is affected.
     ///
     /// @param file  the entry; must not be empty; may be the same object as `list`
-    /// @param list  changed on success only, then cut down to its first `maxCount` entries
-    /// @return false if `file` is empty, if an entry to remove is not there, or for any other `op`
+    /// @param list  changed on success only, then truncated to the first `maxCount` entries
+    /// @return false if `file` is empty, if the entry to remove is not in the list, or for any
+    /// other `op`
     static bool UpdateMRUList(QString const& file, QString& list, int maxCount, MRUOpCode op);
 
-    /// Puts a file at the front of a list. See UpdateMRUList().
+    /// Adds a file at the front of a list. See UpdateMRUList().
     static bool AddToMRUList(QString const& file, QString& list, int maxCount);
 
-    /// Takes a file out of a list, which is also cut down to 10 entries. See UpdateMRUList().
+    /// Removes a file from a list and truncates the list to 10 entries. See UpdateMRUList().
     static bool RemoveFromMRUList(QString const& file, QString& list);
 };

@@ -8,7 +8,7 @@
 namespace {
 
 extern "C" {
-// Static, because a namespace does not keep the name of a C function from other files.
+// Static, because a namespace does not hide the name of a C function from other files.
 static void DoNothing(int) {}
 }
 

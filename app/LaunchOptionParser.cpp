@@ -11,7 +11,7 @@
 #include <QFileInfo>
 #include <QTextStream>
 
-// A program that links this may have a rapidxml of its own, of another version or set up otherwise.
+// A program that links this may include its own rapidxml, in another version or configuration.
 #define rapidxml VelocorRapidXml
 #include <rapidxml.hpp>
 
@@ -21,7 +21,7 @@
 
 namespace {
 
-// Far above any real file and far below what would exhaust the memory at the start of a program.
+// Far larger than any real file, but small enough not to exhaust memory at startup.
 constexpr int MaximumLength = 256 * 1024 * 1024;
 
 using XmlAttribute = rapidxml::xml_attribute<char>;
@@ -33,7 +33,7 @@ QString Name(XmlItem const& item)
     return QString::fromLocal8Bit(item.name(), static_cast<int>(item.name_size()));
 }
 
-// By its size: a character reference may have put a zero byte into the value.
+// Uses the size, because a character reference can put a zero byte into the value.
 template <class XmlItem>
 QString Value(XmlItem const& item)
 {
@@ -56,7 +56,7 @@ bool Apply(LaunchOptionParser& parser, XmlNode const& node)
 
     LaunchOption* option = parser.FindOption(Value(*attribute));
     if (!option) {
-        // Reading goes on all the same, whatever the message says.
+        // Parsing continues in spite of the message.
         parser.errorText +=
             QStringLiteral("Unknown %1 = %2. Value: %3 failed to set. - Parsing terminated.")
                 .arg(Name(*attribute), Value(*attribute), Value(node));
@@ -67,7 +67,7 @@ bool Apply(LaunchOptionParser& parser, XmlNode const& node)
     return true;
 }
 
-// Only the first node is chosen by its name: what follows it is visited whatever it is called.
+// Only the first node is selected by name; later siblings are applied whatever their name.
 bool ApplyAll(LaunchOptionParser& parser, rapidxml::xml_document<char> const& document)
 {
     bool allKnown = true;
@@ -102,7 +102,7 @@ LaunchOption* LaunchOptionParser::FindOption(QString const& key) const
 
 bool LaunchOptionParser::ReadDataFile(QString const& path)
 {
-    // Opening a pipe would wait for somebody to write, and a device may never end.
+    // Opening a pipe would block until there is a writer, and a device may have no end.
     if (!QFileInfo(path).isFile())
         return false;
 
@@ -116,7 +116,7 @@ bool LaunchOptionParser::ReadDataFile(QString const& path)
     return content.isEmpty() || ParseOptions(content);
 }
 
-// cppcheck-suppress constParameter ; the interface stands
+// cppcheck-suppress constParameter ; the public signature is fixed
 bool LaunchOptionParser::ParseOptions(QString& text)
 {
     QByteArray xml = text.toLocal8Bit();
@@ -124,7 +124,7 @@ bool LaunchOptionParser::ParseOptions(QString& text)
         return false;
 
     try {
-        // On the heap: the document brings a memory pool of some 64 KiB with it.
+        // On the heap, because the document contains a large memory pool.
         const auto document = std::make_unique<rapidxml::xml_document<char>>();
         document->parse<rapidxml::parse_default>(xml.data());
         return ApplyAll(*this, *document);

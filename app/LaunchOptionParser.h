@@ -37,14 +37,15 @@ public:
 
     /// Reads a launch data file, in the locale's encoding, and sets the options it names.
     ///
-    /// Only regular files and links to them are read: a pipe or a device could block, or never end.
+    /// Only regular files and links to them are read: reading a pipe or device could block or never
+    /// end.
     ///
     /// @return false if the file is missing, is not a regular file, cannot be opened, has more than
     ///         268435456 characters (256 Mi), or if ParseOptions() fails; an empty file sets
     ///         nothing and succeeds
     bool ReadDataFile(QString const& path);
 
-    /// Sets the options that an XML text names.
+    /// Sets the options named in an XML text.
     ///
     /// An unknown key fails the whole text, with a message in errorText, but what follows is still
     /// read. Text that is not well-formed, or nested deeper than TorkXmlMaximumDepth, fails

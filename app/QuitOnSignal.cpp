@@ -27,7 +27,7 @@ int s_pipe[2] = {-1, -1};
 pid_t s_process = 0;
 struct sigaction s_before[SignalCount];
 
-std::atomic<long long> s_firstSignal{None}; // when it came
+std::atomic<long long> s_firstSignal{None}; // its time in milliseconds
 static_assert(ATOMIC_LLONG_LOCK_FREE == 2, "used by a signal handler");
 
 long long Milliseconds()
@@ -52,7 +52,7 @@ void WakeEventLoop()
 {
     const char byte = 0;
     const ssize_t written = write(s_pipe[1], &byte, 1);
-    static_cast<void>(written); // a full pipe wakes the loop too
+    static_cast<void>(written); // if the pipe is full, the loop wakes anyway
 }
 
 // Takes effect when the handler returns: until then the signal is blocked.
@@ -64,13 +64,13 @@ void DieOf(int signalNumber)
 
 extern "C" {
 
-// Static, because a namespace does not keep the name of a C function from other files.
+// Static, because a namespace does not hide the name of a C function from other files.
 static void QuitOnSignalHandler(int signalNumber)
 {
     const int savedErrno = errno;
     const long long now = Milliseconds();
     long long first = None;
-    // A forked child shares the pipe, but its signals are not meant for its parent.
+    // A forked child shares the pipe, but its signals are not for the parent.
     const bool isForked = getpid() != s_process;
     if (!isForked && s_firstSignal.compare_exchange_strong(first, now))
         WakeEventLoop();
@@ -102,7 +102,7 @@ bool IsBoxOpen()
     return HasWidgets() && QApplication::activeModalWidget();
 }
 
-// False if a window refused.
+// Returns false if a window refused to close.
 bool CloseWindows()
 {
     if (!HasWidgets())
@@ -160,10 +160,10 @@ void QuitOnSignal::endProgram()
     const bool boxWasOpen = IsBoxOpen();
     if (CloseWindows()) {
         QCoreApplication::quit();
-        // Before exec() that ended the loop of a box only. Once exec() ends, this is never called.
+        // Before exec(), that only ended the loop of a message box. After exec(), this never runs.
         QTimer::singleShot(0, this, &QuitOnSignal::endProgram);
     } else if (boxWasOpen) {
-        // It was in the way of the others, or belongs to a window that is about to close.
+        // It blocked the other windows, or belongs to a window that is about to close.
         QTimer::singleShot(BoxInterval, this, &QuitOnSignal::endProgramAfterBox);
     }
 }

@@ -5,7 +5,7 @@
 
 namespace Velocor {
 
-/// Whether Qt runs on a platform that shows nothing and has no window manager: "offscreen" or
+/// Whether Qt runs on a platform without a display or window manager: "offscreen" or
 /// "minimal". Needs the application object; GUI thread.
 bool IsScreenlessPlatform();
 

@@ -13,7 +13,7 @@ namespace Velocor {
 
 void OpenMissingStandardStreams()
 {
-    // The system gives out the lowest free number, so in this order each stream gets its own.
+    // open() returns the lowest free descriptor, so in this order each stream gets the right one.
     for (int stream : {STDIN_FILENO, STDOUT_FILENO, STDERR_FILENO}) {
         if (fcntl(stream, F_GETFD) == -1)
             open("/dev/null", O_RDWR);
@@ -27,7 +27,7 @@ void PrintWithoutWaiting(QByteArray const& text)
         return;
     const ssize_t written =
         write(STDOUT_FILENO, text.constData(), static_cast<size_t>(text.size()));
-    static_cast<void>(written); // nobody can be told
+    static_cast<void>(written); // there is nowhere to report a failure
 }
 
 } // namespace Velocor

@@ -9,17 +9,17 @@ namespace Velocor {
 
 /// Opens /dev/null for each of standard input, output and error that the parent process closed.
 ///
-/// Otherwise the next file or socket that is opened takes the free number, and what is printed goes
-/// there: into the log, or into the connection to the display. Call it first in main(), before
-/// there are other threads; uses the C library only.
+/// Otherwise the next file or socket that is opened gets the free descriptor, and program output
+/// ends up in the log file or the display connection. Call it first in main(), before other
+/// threads start; uses the C library only.
 void OpenMissingStandardStreams();
 
-/// Writes to standard output without ever waiting for a reader.
+/// Writes to standard output without ever blocking.
 ///
-/// What standard output has no room for is dropped; failures are ignored. Needs
-/// SurviveFailedWrites() for an output whose reader has gone.
+/// Text that does not fit into the output buffer is dropped; failures are ignored. Needs
+/// SurviveFailedWrites() in case standard output is a pipe without a reader.
 ///
-/// @param text  bytes to write, line end included; at most a few kilobytes
+/// @param text  bytes to write, including the line end; at most a few kilobytes
 void PrintWithoutWaiting(QByteArray const& text);
 
 } // namespace Velocor

@@ -26,7 +26,7 @@ QString OnOneLine(QString text)
 
 void CriticalMessage(QWidget* parent, QString const& text, bool show)
 {
-    const QString shown = text; // the original may change or go while the box is open
+    const QString shown = text; // the original may change or be deleted while the box is open
     if (show)
         QMessageBox::critical(parent, Caption(), shown, QMessageBox::Ok, QMessageBox::NoButton);
     QMessageLogger(nullptr, 0, nullptr).critical() << OnOneLine(shown);

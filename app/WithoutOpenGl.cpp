@@ -16,7 +16,7 @@ constexpr char const* Variable = "QT_XCB_GL_INTEGRATION";
 
 } // namespace
 
-// NOLINTBEGIN(concurrency-mt-unsafe): no other thread runs yet.
+// NOLINTBEGIN(concurrency-mt-unsafe): no other threads are running yet.
 
 // Runs before the application object exists, so it uses the C library only.
 WithoutOpenGl::WithoutOpenGl() : m_isSet(!getenv(Variable))
@@ -35,7 +35,7 @@ void WithoutOpenGl::End()
     if (!m_isSet)
         return;
 #ifndef QT_NO_OPENGL
-    // The plugin reads the variable when OpenGL is asked for, which the first window would do.
+    // The plugin reads the variable when OpenGL is first queried, normally by the first window.
     if (QGuiApplication::platformName() == QLatin1String("xcb"))
         QOpenGLContext::supportsThreadedOpenGL();
 #endif

@@ -5,18 +5,18 @@
 
 namespace Velocor {
 
-/// Keeps the toolkit's X11 plugin from setting up OpenGL, which nothing here draws with.
+/// Keeps Qt's X11 plugin from initializing OpenGL, which this program does not use.
 ///
-/// The set-up loads a graphics driver before the first window can show: more than half of the
-/// start's time and two thirds of its memory. The plugin asks the environment once, and is made to
-/// do so as soon as the application object stands:
+/// Initialization loads a graphics driver before the first window is shown, which costs time and
+/// memory. The plugin reads an environment variable once; this class makes it do so as soon as the
+/// application object exists:
 ///
 ///     Velocor::WithoutOpenGl withoutOpenGl;
 ///     QApplication app(argc, argv);
 ///     withoutOpenGl.End();
 ///
-/// A user's own QT_XCB_GL_INTEGRATION is left as it is and wins. On other platforms nothing reads
-/// the variable. Main thread only, before there are others: the environment is the process's.
+/// If the user has set QT_XCB_GL_INTEGRATION, that value is kept. Other platforms ignore the
+/// variable. Main thread only, before other threads start: the environment belongs to the process.
 class WithoutOpenGl
 {
 public:
@@ -26,7 +26,7 @@ public:
     WithoutOpenGl(WithoutOpenGl const&) = delete;
     WithoutOpenGl& operator=(WithoutOpenGl const&) = delete;
 
-    /// Puts the environment back, so that programs started from here do not inherit the setting.
+    /// Restores the environment, so that child processes do not inherit the setting.
     void End();
 
 private:

@@ -16,8 +16,8 @@ bool StartsWith(char const* text, char const* prefix)
     return std::strncmp(text, prefix, std::strlen(prefix)) == 0;
 }
 
-// Behind the next `end`, or at the end of the text.
-char const* Behind(char const* text, char const* end)
+// The position after the next `end`, or the end of the text.
+char const* SkipPast(char const* text, char const* end)
 {
     char const* found = std::strstr(text, end);
     return found ? found + std::strlen(end) : text + std::strlen(text);
@@ -28,7 +28,7 @@ char const* SkipSpace(char const* text)
     return text + std::strspn(text, " \t\n\r");
 }
 
-// The internal subset of a document type stands in brackets and may hold tags of its own.
+// The internal subset of a document type is in brackets and may contain markup.
 char const* SkipDocumentType(char const* text)
 {
     int brackets = 0;
@@ -43,18 +43,18 @@ char const* SkipDocumentType(char const* text)
     return text;
 }
 
-// Markup behind "<" that is no element.
+// Skips markup after "<" that is not an element.
 char const* SkipSpecial(char const* text)
 {
     if (*text == '?')
-        return Behind(text + 1, "?>");
+        return SkipPast(text + 1, "?>");
     if (StartsWith(text, "!--"))
-        return Behind(text + 3, "-->");
+        return SkipPast(text + 3, "-->");
     if (StartsWith(text, "![CDATA["))
-        return Behind(text, "]]>");
+        return SkipPast(text, "]]>");
     if (StartsWith(text, "!DOCTYPE") && SkipSpace(text + 8) != text + 8)
         return SkipDocumentType(text);
-    return Behind(text, ">");
+    return SkipPast(text, ">");
 }
 
 char const* SkipAttributes(char const* text)
@@ -81,7 +81,7 @@ char const* SkipAttributes(char const* text)
     }
 }
 
-// Reads the tag whose name starts at `text`, and moves `text` behind it.
+// Reads the tag whose name starts at `text`, and advances `text` past it.
 Tag ReadTag(char const*& text)
 {
     text = SkipAttributes(text + std::strcspn(text, " \t\n\r/>?"));

@@ -23,7 +23,7 @@ QString Caption()
     return product.isEmpty() ? QStringLiteral("Velocor") : product;
 }
 
-// Without a screen, the terminal is the only place to say where the log is.
+// Without a screen, the terminal is the only place to show where the log is.
 void PrintLogFileIfScreenless()
 {
     if (!Velocor::IsScreenlessPlatform())
@@ -34,9 +34,9 @@ void PrintLogFileIfScreenless()
 
 } // namespace
 
-// The order matters: nothing of Qt may run before the application object exists, the log directory
-// follows from the names, and message boxes take their title from the caption. Printing comes after
-// the log entry, so that no trouble with standard output can keep the entry from being written.
+// The order matters: Qt must not be used before the application object exists, the log directory
+// depends on the names, and message boxes take their title from the caption. Printing comes after
+// the log entry, so that a problem with standard output cannot prevent the entry.
 int main(int argc, char** argv)
 {
     Velocor::OpenMissingStandardStreams();

@@ -7,17 +7,17 @@
 
 namespace Velocor {
 
-/// One line of a log file, taken apart for people. A plain record.
+/// One line of a log file, split into its parts. A plain record.
 struct LogEntry
 {
-    /// The severities of the log, and what lines have that are no entry of their own.
+    /// The severities of the log; None for lines that are not entries.
     enum Severity : int { Trace = 0, Notification, Warning, Error, Fatal, None };
 
-    QString time; ///< the stamp as it was written; empty if there is none
+    QString time; ///< the time stamp as written; empty if there is none
     Severity severity = None;
-    QString elapsed;      ///< milliseconds since the entry before; empty if not logged
-    QString message;      ///< the rest of the line, or all of a line that is no entry
-    bool isEntry = false; ///< false: goes on with the entry above it, or is torn
+    QString elapsed;      ///< milliseconds since the previous entry; empty if not logged
+    QString message;      ///< the rest of the line, or the whole line if it is not an entry
+    bool isEntry = false; ///< false if it continues the entry above or is torn
 };
 
 } // namespace Velocor

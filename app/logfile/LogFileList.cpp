@@ -11,7 +11,7 @@ namespace Velocor {
 
 namespace {
 
-// The number behind the last dot; -1 if there is none.
+// The number after the last dot; -1 if there is none.
 int NumberOf(QString const& name)
 {
     bool converted = false;

@@ -8,13 +8,13 @@
 
 namespace Velocor {
 
-/// Finds the numbered older files of a log file.
+/// Finds the numbered, rotated files of a log file.
 class LogFileList
 {
 public:
-    /// A log file and the older ones beside it, newest first: "app.log", "app.log.1", and so on.
+    /// A log file and its older files, newest first: "app.log", "app.log.1", and so on.
     ///
-    /// @param path  the log file or one of its older files; is in the list even if it is missing
+    /// @param path  the log file or one of its older files; included even if it does not exist
     static QStringList FilesOf(QString const& path);
 
     /// The path without the number of an older file.

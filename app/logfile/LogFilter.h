@@ -27,14 +27,14 @@ public:
     /// Shows everything.
     LogFilter();
 
-    /// Shows or hides one severity. Lines without one are shown as long as all severities are.
+    /// Shows or hides one severity. Lines without one are shown only if all severities are.
     void SetSeverity(LogEntry::Severity severity, bool shown);
     bool Shows(LogEntry::Severity severity) const;
 
     /// Sets the text that lines have to contain, or the regular expression they have to match.
     ///
     /// @param text  empty: every line matches
-    /// @return false, with the filter as it was, if the expression is not valid
+    /// @return false, with the filter unchanged, if the expression is not valid
     bool SetText(QString const& text, bool isExpression, bool caseSensitive);
 
     /// Whether entries of runs before the newest are shown.
@@ -43,13 +43,13 @@ public:
 
     bool hasText() const { return !m_expression.pattern().isEmpty(); }
 
-    /// Whether a line, as it stands in the file, contains the text.
+    /// Whether a line, as stored in the file, contains the text.
     bool Matches(QString const& line) const;
 
-    /// The places in a text where it does: start and length, in order.
+    /// The matches in a text: start and length, in order.
     QVector<QPair<int, int>> Ranges(QString const& text) const;
 
-    /// What is wrong with an expression, for people; empty if it is valid.
+    /// The error in an expression, for users; empty if it is valid.
     static QString ErrorOf(QString const& expression);
 
     /// Whether both let the same lines through the text filter.
@@ -59,7 +59,7 @@ private:
     unsigned m_severities;
     bool m_earlierRuns = true;
     bool m_isExpression = false;
-    QStringMatcher m_matcher; // skips ahead, so it is far faster on many lines than contains()
+    QStringMatcher m_matcher; // prepared once for many lines
     QRegularExpression m_expression;
 };
 

@@ -12,15 +12,15 @@ namespace Velocor {
 
 namespace {
 
-constexpr size_t MostRuns = 64;
+constexpr size_t MaximumRuns = 64;
 
-// So many lines without a time are read anew in every pass; more of them are taken for settled.
-constexpr size_t MostReread = 1000;
+// Up to this many lines without a time are read again in every pass; beyond that they are final.
+constexpr size_t MaximumReread = 1000;
 
-// Threads that start together may write their entries in another order than they stamped them.
+// Concurrent threads may write their entries in a different order than they stamped them.
 constexpr qint64 Tolerance = 20; // milliseconds
 
-// Twelve hours in the units of LogTimeReader's keys.
+// Twelve hours, in the units of LogTimeReader keys.
 constexpr qint64 HalfADay = qint64(12) * 60 * 61 * 1000;
 
 template <class T>
@@ -44,7 +44,7 @@ LogIndex::LogIndex(LogLineParser const& parser, LogFilter const& filter)
     m_runs.emplace_back();
 }
 
-// The first line that the next pass reads anew.
+// The first line that the next pass reads again.
 size_t LogIndex::resumeLine() const
 {
     const size_t end = m_runs.size() > 1 ? m_runs[1].firstLine : m_starts.size();
@@ -52,7 +52,7 @@ size_t LogIndex::resumeLine() const
     if (!m_newestIsTimed)
         return settled;
     const size_t afterTimed = m_newestLastTimed + 1;
-    if (m_runs.size() == 1 && end > afterTimed + MostReread)
+    if (m_runs.size() == 1 && end > afterTimed + MaximumReread)
         return settled;
     return std::min(afterTimed, settled);
 }
@@ -66,7 +66,7 @@ void LogIndex::forgetFrom(size_t line)
         m_runs[0] = Run();
         m_newestIsTimed = false;
     } else if (m_newestIsTimed && m_newestLastTimed >= line) {
-        // The incomplete line that is read anew was the timed one.
+        // The incomplete line that is read again was the timed one.
         m_newestLastTimed = line - 1;
         m_newestLastTime = m_runs[0].firstTime;
     }
@@ -157,7 +157,7 @@ quint8 LogIndex::markOf(LogLineParser::Parts const& parts, char const* line, int
     return mark;
 }
 
-// False if the rest of the file is known.
+// Returns false if the rest of the file is known.
 bool LogIndex::addLine(char const* line, int length, bool complete)
 {
     if (length > 0 && line[length - 1] == '\r')
@@ -180,10 +180,10 @@ bool LogIndex::addLine(char const* line, int length, bool complete)
 
 bool LogIndex::isOlder(LogLineParser::Parts const& parts) const
 {
-    if (parts.timeKey < 0 || !m_runHasTimed || m_runs.size() >= MostRuns)
+    if (parts.timeKey < 0 || !m_runHasTimed || m_runs.size() >= MaximumRuns)
         return false;
     Run const& run = m_runs.back();
-    // A run tells of its settings in the default format before it comes to use another.
+    // A run logs its settings in the default format before it switches to another.
     if (parts.hasDate != run.hasDate)
         return run.timedLines > 1;
     if (parts.timeKey + Tolerance >= run.firstTime || parts.timeKey >= m_lastTime)
@@ -192,7 +192,7 @@ bool LogIndex::isOlder(LogLineParser::Parts const& parts) const
     return !isNextDay;
 }
 
-// The last line without a time before an older entry is what is left of a torn one.
+// The last line without a time before an older entry is the rest of a torn entry.
 void LogIndex::beginRun(LogLineParser::Parts const& parts)
 {
     Run run;
@@ -207,7 +207,7 @@ void LogIndex::beginRun(LogLineParser::Parts const& parts)
     m_runHasTimed = false;
 }
 
-// Takes over the lines from the older entry at `start` on, if they are known.
+// Reuses the lines from the older entry at `start` on, if they are known.
 bool LogIndex::joinKnownLines(qint64 start)
 {
     const auto found = std::lower_bound(m_knownStarts.begin(), m_knownStarts.end(), start);

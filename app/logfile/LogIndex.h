@@ -13,20 +13,20 @@
 
 namespace Velocor {
 
-/// Knows where the lines of a log file begin, how serious they are, and which run wrote them.
+/// An index of a log file: where its lines start, their severities, and which run wrote them.
 ///
-/// The log opens its file without truncating it and writes from the start on. After a restart the
-/// newest entries therefore stand on top and older ones behind them, the first of those torn as a
-/// rule; behind them may be what even earlier runs left:
+/// The log opens its file without truncating it and writes from the start. After a restart, the
+/// newest entries are therefore at the top, followed by older entries, the first of which is
+/// usually torn; entries of even earlier runs may follow:
 ///
-///     newest run  |  rest of the run before  |  rest of an earlier one
+///     newest run  |  rest of previous run    |  rest of an earlier one
 ///                 ^ the seam                 ^ another
 ///
-/// A seam is where an entry is older than both the entry before it and the first entry of its run.
-/// While the newest run writes on, its seam moves; Begin() goes back to the last entry before it,
-/// and Feed() stops as soon as it meets a line that it knows.
+/// A seam is where an entry is older than both the previous entry and the first entry of its run.
+/// As the newest run writes more entries, its seam moves; Begin() returns to the last entry before
+/// it, and Feed() stops as soon as it reaches a known line.
 ///
-/// Pure: it is fed the bytes. One thread at a time.
+/// Pure: the caller supplies the bytes. One thread at a time.
 ///
 ///     qint64 offset = index.Begin();
 ///     while (... && index.Feed(bytes, count)) {}
@@ -40,27 +40,28 @@ public:
 
     /// Starts a pass over the file.
     ///
-    /// @return the offset from which the file has to be read: 0 in the first pass
+    /// @return the offset to read the file from: 0 in the first pass
     qint64 Begin();
 
-    /// Takes the next bytes of the file.
+    /// Processes the next bytes of the file.
     ///
-    /// @return false if the rest of the file is known from the pass before; read no further then
+    /// @return false if the rest of the file is known from the previous pass; stop reading then
     bool Feed(char const* bytes, int count);
 
-    /// Ends the pass at the end of the file; a last line without line end counts as a line.
+    /// Ends the pass at the end of the file; a last line without a line end counts as a line.
     void End();
 
-    /// The lines that a filter lets through. Its text is the one that the index was made with.
+    /// The lines that match a filter, whose text must be that of the filter the index was made
+    /// with.
     LogRows Rows(LogFilter const& filter) const;
 
-    /// Where the next pass is going to begin. What lies before is settled.
+    /// Where the next pass will begin. Everything before it is final.
     qint64 resumeOffset() const;
 
-    /// How many lines the file has.
+    /// The number of lines in the file.
     size_t size() const { return m_starts.size(); }
 
-    /// How many runs left entries in the file, at most 64: what lies behind is not told apart.
+    /// The number of runs with entries in the file, at most 64: later ones are not distinguished.
     size_t runs() const { return m_runs.size(); }
 
     /// Whether any entry has an elapsed time.
@@ -96,12 +97,12 @@ private:
     bool m_hasElapsed = false;
     bool m_lastIsComplete = true;
 
-    // The newest run's last entry with a time: behind it the next pass begins.
+    // The newest run's last entry with a time: the next pass begins after it.
     bool m_newestIsTimed = false;
     size_t m_newestLastTimed = 0;
     qint64 m_newestLastTime = -1;
 
-    // The pass.
+    // The current pass.
     qint64 m_position = 0;
     qint64 m_lineStart = 0;
     QByteArray m_partialLine;
@@ -110,7 +111,7 @@ private:
     size_t m_lastTimed = 0;
     qint64 m_lastTime = -1;
 
-    // What the pass before found behind the seam.
+    // What the previous pass found after the seam.
     std::vector<qint64> m_knownStarts;
     std::vector<quint8> m_knownMarks;
     std::vector<Run> m_knownRuns;

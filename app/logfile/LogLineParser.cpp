@@ -14,7 +14,7 @@ namespace Velocor {
 namespace {
 
 // No stamp is longer; a severity name further on is part of a message.
-constexpr int LongestStamp = 80;
+constexpr int MaximumStampLength = 80;
 
 QStringList WithDefault(QStringList texts, QString const& byDefault)
 {
@@ -29,7 +29,7 @@ bool HoldsDigit(char const* text, int length)
     return std::any_of(text, text + length, IsAsciiDigit);
 }
 
-// The number of bytes that "[-12] " takes up to its "]"; 0 if there is no such number.
+// The length of a number such as "[-12] ", up to its "]"; 0 if there is none.
 int NumberInBrackets(char const* text, int length)
 {
     int at = 1;
@@ -104,7 +104,7 @@ bool LogLineParser::findByFormat(char const* line, int length, Parts& parts) con
 
 bool LogLineParser::findByName(char const* line, int length, Parts& parts) const
 {
-    const int limit = std::min(length, LongestStamp);
+    const int limit = std::min(length, MaximumStampLength);
     for (int blank = 0; blank < limit; ++blank) {
         if (line[blank] != ' ')
             continue;

@@ -14,11 +14,11 @@
 
 namespace Velocor {
 
-/// Takes the lines of a log file apart: time stamp, severity name, elapsed time, message.
+/// Splits the lines of a log file: time stamp, severity name, elapsed time, message.
 ///
-/// The stamp's format is a setting that may have changed while a file was being written, so the
-/// formats in use are tried first; after that any text with a digit in it counts as a stamp if a
-/// severity name stands behind it. Pure; any thread. File format: docs/log-file.md.
+/// The date format is a setting that may have changed while the file was being written, so the
+/// given formats are tried first; after that, any text with a digit counts as a time stamp if a
+/// severity name follows it. Pure; any thread. File format: docs/log-file.md.
 ///
 ///     LogLineParser parser({"yyyy-MM-dd hh:mm:ss.z"}, {"dT:"});
 ///     LogEntry entry = parser.Parse(line);
@@ -29,7 +29,7 @@ public:
     struct Parts
     {
         int timeLength = 0;
-        qint64 timeKey = -1; ///< see LogTimeReader::Stamp; -1 if the time cannot be told
+        qint64 timeKey = -1; ///< see LogTimeReader::Stamp; -1 if the time is unknown
         bool hasDate = false;
         LogEntry::Severity severity = LogEntry::None;
         int elapsed = 0; ///< start of the elapsed milliseconds
@@ -41,20 +41,20 @@ public:
     /// A parser for the log's own defaults.
     LogLineParser();
 
-    /// @param dateFormats  those that entries may be stamped with, the likeliest first; the
-    ///                     default format is tried in any case
-    /// @param elapsedPrefixes  texts before the elapsed milliseconds; likewise
+    /// @param dateFormats  formats that entries may use, the likeliest first; the default
+    ///                     format is always tried
+    /// @param elapsedPrefixes  texts before the elapsed milliseconds, in the same way
     LogLineParser(QStringList const& dateFormats, QStringList const& elapsedPrefixes);
 
     /// Finds the parts of one line.
     ///
-    /// @param line  in Latin-1, without its line end; of very long lines the start is enough
+    /// @param line  in Latin-1, without its line end; for very long lines the start is enough
     Parts Find(char const* line, int length) const;
 
-    /// Takes one line apart.
+    /// Parses one line.
     LogEntry Parse(QByteArray const& line) const;
 
-    /// The most that Find() looks at, in bytes.
+    /// The maximum length that Find() examines, in bytes.
     static constexpr int SearchLimit = 512;
 
 private:

@@ -11,26 +11,26 @@
 
 namespace Velocor {
 
-/// The rows of the log view, oldest first: where in the file each begins, and what it is.
+/// The rows of the log view, oldest first: where each starts in the file, and what it is.
 ///
-/// Nine bytes a row; the texts stay in the file. If entries of earlier runs are among them, two
-/// heading rows stand before the earlier ones and before the newest run's.
+/// The texts stay in the file, to keep memory use low. If there are entries of earlier runs, a
+/// heading row precedes them and another one precedes the newest run.
 struct LogRows
 {
-    /// Starts of the heading rows, which no line of a file has.
+    /// Start values of the heading rows, which no line can have.
     static constexpr qint64 EarlierHeading = -1;
     static constexpr qint64 NewestHeading = -2;
 
-    /// What is known of a row besides its start: a LogEntry::Severity and these flags.
+    /// The mark of a row: a LogEntry::Severity and these flags.
     static constexpr quint8 SeverityMask = 0x07;
-    static constexpr quint8 Continued = 0x08; ///< no entry of its own; has the severity above it
-    static constexpr quint8 Torn = 0x10;      ///< its first part was written over
+    static constexpr quint8 Continued = 0x08; ///< not an entry; has the severity of the entry above
+    static constexpr quint8 Torn = 0x10;      ///< its first part was overwritten
     static constexpr quint8 Timed = 0x20;     ///< its time is known
-    static constexpr quint8 Unmatched = 0x40; ///< the text filter does not let it through
+    static constexpr quint8 Unmatched = 0x40; ///< does not match the text filter
 
     std::vector<qint64> starts;
     std::vector<quint8> marks;
-    size_t earlier = 0;  ///< how many rows are of earlier runs, with their heading; 0 if none
+    size_t earlier = 0;  ///< rows of earlier runs, including their heading; 0 if none
     size_t problems = 0; ///< entries that are warnings or worse
 
     size_t size() const { return starts.size(); }

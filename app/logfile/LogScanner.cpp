@@ -16,7 +16,7 @@ constexpr int SliceSize = 1 << 20;
 constexpr int HeadSize = 256;
 constexpr int AnchorSize = 256;
 
-// So long after a change another one may carry the same time of change.
+// Within this time, two changes may have the same modification time.
 constexpr qint64 StampUncertainty = 2000; // milliseconds
 
 QByteArray BytesAt(QFile& file, qint64 offset, qint64 count)
@@ -24,7 +24,7 @@ QByteArray BytesAt(QFile& file, qint64 offset, qint64 count)
     return file.seek(offset) ? file.read(count) : QByteArray();
 }
 
-// Why a file has not been opened; empty if there is none.
+// Why a file could not be opened; empty if it does not exist.
 QString ErrorOf(QFile const& file)
 {
     const QFileInfo info(file.fileName());
@@ -49,8 +49,8 @@ void LogScanner::Open(int request, QString const& path, LogLineParser const& par
     m_path = path;
     m_parser = parser;
     m_filter = filter;
-    if (isWanted())
-        readAnew();
+    if (isCurrentRequest())
+        readFromStart();
 }
 
 void LogScanner::SetFilter(int request, LogFilter const& filter)
@@ -58,12 +58,12 @@ void LogScanner::SetFilter(int request, LogFilter const& filter)
     const bool sameText = filter.HasSameText(m_filter);
     m_request = request;
     m_filter = filter;
-    if (!isWanted())
-        m_complete = m_complete && sameText; // the text is still to be looked for
+    if (!isCurrentRequest())
+        m_complete = m_complete && sameText; // the text has not been searched for yet
     else if (sameText && m_complete)
-        tell(true);
+        report(true);
     else
-        readAnew();
+        readFromStart();
 }
 
 void LogScanner::startOver()
@@ -77,47 +77,47 @@ void LogScanner::startOver()
     m_complete = false;
 }
 
-void LogScanner::readAnew()
+void LogScanner::readFromStart()
 {
     startOver();
     QFile file(m_path);
     if (!QFileInfo(m_path).isFile() || !file.open(QIODevice::ReadOnly)) {
         m_error = ErrorOf(file);
-        tellMissing();
+        reportMissing();
         return;
     }
     m_exists = true;
     m_error.clear();
     if (readFrom(file, m_index.Begin()))
-        tell(true);
+        report(true);
 }
 
-void LogScanner::tellMissing()
+void LogScanner::reportMissing()
 {
     startOver();
     m_exists = false;
     m_complete = true;
-    tell(true);
+    report(true);
 }
 
-// False if another request has come up meanwhile.
+// Returns false if a newer request has arrived.
 bool LogScanner::readFrom(QFile& file, qint64 offset)
 {
     m_modified = QFileInfo(m_path).lastModified();
     const qint64 size = file.size();
     QByteArray slice(SliceSize, Qt::Uninitialized);
     bool more = file.seek(offset);
-    int told = 0;
+    int reported = 0;
     while (more) {
-        if (!isWanted())
+        if (!isCurrentRequest())
             return false;
         const qint64 count = file.read(slice.data(), slice.size());
         if (count <= 0)
             break;
         more = m_index.Feed(slice.constData(), static_cast<int>(count));
         const int percent = size > 0 ? static_cast<int>(file.pos() * 100 / size) : 100;
-        if (percent >= told + 10) {
-            told = percent;
+        if (percent >= reported + 10) {
+            reported = percent;
             Q_EMIT progressed(m_request, percent);
         }
     }
@@ -155,7 +155,7 @@ bool LogScanner::looksUnchanged() const
 
 void LogScanner::Poll()
 {
-    if (m_path.isEmpty() || !isWanted() || (m_complete && looksUnchanged())) {
+    if (m_path.isEmpty() || !isCurrentRequest() || (m_complete && looksUnchanged())) {
         Q_EMIT polled();
         return;
     }
@@ -164,18 +164,18 @@ void LogScanner::Poll()
     const bool opened = QFileInfo(m_path).isFile() && file.open(QIODevice::ReadOnly);
     if (!opened && (m_exists || !m_complete)) {
         m_error = ErrorOf(file);
-        tellMissing();
+        reportMissing();
     } else if (opened && (!m_complete || !m_exists || !isSameFile(file))) {
-        readAnew();
+        readFromStart();
     } else if (opened) {
         m_complete = false; // until the pass is over
         if (readFrom(file, m_index.Begin()))
-            tell(false);
+            report(false);
     }
     Q_EMIT polled();
 }
 
-void LogScanner::tell(bool isReset)
+void LogScanner::report(bool isReset)
 {
     LogUpdate update;
     update.request = m_request;

@@ -16,14 +16,15 @@ class QFile;
 
 namespace Velocor {
 
-/// Reads a log file in a thread of its own and tells what rows a view of it has.
+/// Reads a log file in its own thread and reports the rows for a view of it.
 ///
-/// The file is read in slices through an ordinary handle: a mapped one would end the program when
-/// the file is cut short. It is recognised by its first bytes and by those before the place where
-/// reading goes on; if either has changed, it is another file or another run and is read anew.
+/// The file is read in slices through an ordinary handle: with a mapped file, the program would
+/// crash if the file were truncated. The file is identified by its first bytes and by those before
+/// the position where reading resumes; if either has changed, it is another file or another run and
+/// is read from the start.
 ///
-/// Requests are numbered; Want() with a later number stops the work on an earlier one.
-/// Want() is for any thread, everything else for the scanner's own.
+/// Requests are numbered; SetCurrentRequest() with a later number cancels work on an earlier one.
+/// SetCurrentRequest() may be called from any thread, everything else only from the scanner's.
 class LogScanner : public QObject
 {
     Q_OBJECT
@@ -31,18 +32,18 @@ class LogScanner : public QObject
 public:
     explicit LogScanner(QObject* parent = nullptr);
 
-    /// Announces the request that counts from now on.
-    void Want(int request) { m_wanted = request; }
+    /// Makes earlier requests obsolete.
+    void SetCurrentRequest(int request) { m_currentRequest = request; }
 
 public Q_SLOTS:
     /// Reads a file from its start.
     void Open(int request, QString const& path, Velocor::LogLineParser const& parser,
               Velocor::LogFilter const& filter);
 
-    /// Looks for changes and reads them. Always answers with polled().
+    /// Checks for changes and reads them. Always emits polled() at the end.
     void Poll();
 
-    /// Shows other rows of the same file.
+    /// Reports the rows of the same file that match another filter.
     void SetFilter(int request, Velocor::LogFilter const& filter);
 
 Q_SIGNALS:
@@ -51,17 +52,17 @@ Q_SIGNALS:
     void polled();
 
 private:
-    bool isWanted() const { return m_wanted == m_request; }
-    void readAnew();
+    bool isCurrentRequest() const { return m_currentRequest == m_request; }
+    void readFromStart();
     bool readFrom(QFile& file, qint64 offset);
     bool looksUnchanged() const;
     bool isSameFile(QFile& file) const;
     void noteFile(QFile& file);
-    void tellMissing();
-    void tell(bool isReset);
+    void reportMissing();
+    void report(bool isReset);
     void startOver();
 
-    std::atomic<int> m_wanted{0};
+    std::atomic<int> m_currentRequest{0};
     int m_request = 0;
     QString m_path;
     LogLineParser m_parser;

@@ -11,7 +11,7 @@ namespace Velocor {
 
 namespace {
 
-// In the order of LogEntry::Severity. The context is the one the log translates its names in.
+// In the order of LogEntry::Severity. The context is the one that the log uses for translation.
 constexpr char const* Names[] = {
     QT_TRANSLATE_NOOP("QObject", "Trace"),   QT_TRANSLATE_NOOP("QObject", "Notification"),
     QT_TRANSLATE_NOOP("QObject", "Warning"), QT_TRANSLATE_NOOP("QObject", "Error"),

@@ -9,15 +9,15 @@
 
 namespace Velocor {
 
-/// What is known of the severities: their names, and which of them tell of a problem. Any thread.
+/// The names of the severities, and which of them are problems. Any thread.
 class LogSeverities
 {
 public:
-    /// The name that entries carry where nothing is translated; empty for None.
+    /// The untranslated name in log entries; empty for None.
     static char const* LoggedName(LogEntry::Severity severity);
 
-    /// The name in the user's language, which is also the one in entries of a translated program;
-    /// empty for None.
+    /// The name in the user's language, which a translated program also uses in its entries; empty
+    /// for None.
     static QString Name(LogEntry::Severity severity);
 
     /// Whether it is a warning or worse.

@@ -15,21 +15,21 @@ namespace Velocor {
 
 namespace {
 
-// Letters of any language: what is not a letter of ASCII but above it may be one.
+// Letters of any language: anything above ASCII may be one.
 bool IsWordCharacter(char c)
 {
     const unsigned char byte = static_cast<unsigned char>(c);
     return (byte >= 'a' && byte <= 'z') || (byte >= 'A' && byte <= 'Z') || byte >= 0x80;
 }
 
-// One-digit milliseconds: "5" is a half second for newer toolkits, 5 ms for older ones.
+// One-digit milliseconds: "5" means half a second in newer Qt versions, 5 ms in older ones.
 bool WritesFractions()
 {
     return QTime(0, 0, 0, 5).toString(QStringLiteral("z")) == QLatin1String("005");
 }
 
-// How many of equal letters make one field.
-int TakenAtOnce(QChar letter, int count)
+// How many equal letters form one field.
+int FieldLength(QChar letter, int count)
 {
     switch (letter.toLatin1()) {
     case 'y':
@@ -97,7 +97,7 @@ void LogTimeReader::parseFormat(QString const& format)
     }
 }
 
-// Quoted text stands for itself, and two quotes in a row for one, as the toolkit writes them.
+// Quoted text is literal, and two quotes in a row are one quote, as in Qt.
 int LogTimeReader::addQuoted(QString const& format, int position)
 {
     const QLatin1Char quote('\'');
@@ -141,9 +141,9 @@ void LogTimeReader::addNumber(Field field, int minimum, int maximum)
 void LogTimeReader::addFields(QChar letter, int count)
 {
     while (count > 0) {
-        const int taken = TakenAtOnce(letter, count);
-        addField(letter, taken);
-        count -= taken;
+        const int length = FieldLength(letter, count);
+        addField(letter, length);
+        count -= length;
     }
 }
 
@@ -181,7 +181,7 @@ void LogTimeReader::addField(QChar letter, int length)
     case 'z':
         addNumber(Fraction, length, 3);
         break;
-    default: { // half of the day, time zone
+    default: { // AM/PM, time zone
         const Field field = letter == QLatin1Char('t') ? Literal : HalfDay;
         m_tokens.push_back({Word, field, 0, 0, QByteArray()});
     }

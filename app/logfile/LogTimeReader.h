@@ -10,10 +10,10 @@
 
 namespace Velocor {
 
-/// Reads the time stamps of log entries that were written in one date format.
+/// Reads the time stamps of log entries in one date format.
 ///
-/// A format is taken apart once; reading a stamp then costs some ten nanoseconds, which matters in
-/// files of a million lines. Any thread; reading changes nothing.
+/// The format is parsed once, because large files contain millions of time stamps. Any thread;
+/// reading changes nothing.
 ///
 ///     LogTimeReader reader("yyyy-MM-dd hh:mm:ss.z");
 ///     LogTimeReader::Stamp stamp = reader.Read(line, length);
@@ -22,20 +22,20 @@ namespace Velocor {
 class LogTimeReader
 {
 public:
-    /// A stamp that was read.
+    /// A parsed time stamp.
     struct Stamp
     {
-        int length = -1; ///< bytes that the stamp takes; -1 if there is none
-        qint64 key = -1; ///< grows with time; -1 if the format tells no time of day
+        int length = -1; ///< length in bytes; -1 if there is no time stamp
+        qint64 key = -1; ///< increases with time; -1 if the format has no time of day
     };
 
     /// @param format  a date format as QDateTime::toString() understands it
     explicit LogTimeReader(QString const& format);
 
-    /// Reads the stamp at the start of a line, in Latin-1.
+    /// Reads the time stamp at the start of a line, in Latin-1.
     Stamp Read(char const* text, int length) const;
 
-    /// Whether stamps tell year, month and day; those of the others start anew at midnight.
+    /// Whether time stamps have a year, month and day; without them, keys restart at midnight.
     bool hasDate() const { return m_hasDate; }
 
 private:
@@ -65,7 +65,7 @@ private:
     bool readMonth(char const*& at, char const* end, Values& values) const;
 
     std::vector<Token> m_tokens;
-    std::vector<QByteArray> m_monthNames; // long and short ones in turn, January first
+    std::vector<QByteArray> m_monthNames; // long and short names alternate, January first
     bool m_hasDate = false;
     bool m_hasTime = false;
     bool m_fractionOfSecond = false;

@@ -12,18 +12,18 @@
 
 namespace Velocor {
 
-/// What a LogScanner found: all rows, and how they differ from those it told of before.
+/// What a LogScanner found: all rows, and how they differ from those of its previous update.
 ///
-/// A change keeps both ends of the earlier part and all but the last rows of the newest run's, so
-/// that views keep their place in the file.
+/// A change keeps both ends of the earlier runs, and all but the last rows of the newest run, so
+/// that views can keep their position.
 struct LogUpdate
 {
-    int request = 0;     ///< the request that this answers
-    bool isReset = true; ///< nothing is known to be as before; the numbers below mean nothing then
-    size_t changeAt = 0; ///< first row of the earlier part that differs
-    size_t removed = 0;  ///< rows that were there before
-    size_t inserted = 0; ///< rows that are there instead
-    size_t changedTail = 0; ///< rows at the former end that read differently now
+    int request = 0;        ///< the request that this update answers
+    bool isReset = true;    ///< all rows may have changed; the numbers below are meaningless
+    size_t changeAt = 0;    ///< first row of the earlier runs that differs
+    size_t removed = 0;     ///< number of rows removed there
+    size_t inserted = 0;    ///< number of rows inserted there
+    size_t changedTail = 0; ///< changed rows at the former end
 
     std::shared_ptr<LogRows const> rows;
     bool exists = true;
@@ -31,7 +31,7 @@ struct LogUpdate
     size_t lines = 0;
     bool hasElapsed = false;
 
-    /// Works the numbers out from the rows before and after.
+    /// Computes the numbers from the rows before and after.
     void Compare(LogRows const& before);
 };
 

@@ -24,14 +24,14 @@ InstanceList::InstanceList(QString const& folder) : m_folder(folder), m_ownName(
 {
     QDir().mkpath(m_folder);
     m_lock = std::make_unique<QLockFile>(m_folder + QLatin1Char('/') + m_ownName);
-    m_lock->setStaleLockTime(0); // a program may run for weeks; only its end frees its lock
+    m_lock->setStaleLockTime(0); // never stale: a program may run for weeks
     m_lock->tryLock(0);
 }
 
 InstanceList::~InstanceList()
 {
     m_lock.reset();
-    QDir().rmdir(m_folder); // stays if others are in it
+    QDir().rmdir(m_folder); // fails if others are still using it
 }
 
 QList<qint64> InstanceList::Others() const
@@ -45,7 +45,7 @@ QList<qint64> InstanceList::Others() const
         QLockFile lock(m_folder + QLatin1Char('/') + name);
         lock.setStaleLockTime(0);
         if (lock.tryLock(0))
-            continue; // left behind; unlocking removes it
+            continue; // stale; unlocking removes it
         if (lock.error() == QLockFile::LockFailedError)
             others.append(QFileInfo(name).completeBaseName().toLongLong());
     }

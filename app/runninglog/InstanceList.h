@@ -12,30 +12,30 @@ class QLockFile;
 
 namespace Velocor {
 
-/// The running programs that share one log, as far as they have a list like this.
+/// The running programs that share one log, if they use this list too.
 ///
-/// Each holds a lock file of its own, called after its process number, in a folder that stands for
-/// the log; the locks of programs that ended without letting go are removed. Where the folder
-/// cannot be made, nobody else is found.
+/// Each holds its own lock file, named after its process ID, in a folder for that log; locks of
+/// programs that ended without releasing them are removed. If the folder cannot be created, no
+/// other programs are found.
 ///
 ///     InstanceList instances(dataPath + "running-program.log");
 ///     if (!instances.Others().isEmpty())
-///         tell(...);
+///         report(...);
 class InstanceList
 {
 public:
     /// Joins the list.
     ///
-    /// @param folder  made if need be; for lock files only
+    /// @param folder  created if necessary; for lock files only
     explicit InstanceList(QString const& folder);
 
-    /// Leaves it. The last one removes the folder.
+    /// Leaves the list. The last program removes the folder.
     ~InstanceList();
 
     InstanceList(InstanceList const&) = delete;
     InstanceList& operator=(InstanceList const&) = delete;
 
-    /// The process numbers of the others.
+    /// The process IDs of the others.
     QList<qint64> Others() const;
 
 private:

@@ -32,21 +32,20 @@ QString LogHealth::writingProblem()
     if (!log)
         return QObject::tr("There is no log");
     if (!log->enabled())
-        return QObject::tr("The log is switched off");
+        return QObject::tr("Logging is off");
 
-    // The log keeps the text of its last failure also when a later try succeeds.
+    // The log keeps the error text of its last failure even after a later success.
     const QFileInfo file(RunningLog::FileName());
     const bool usable = file.isFile() && file.isWritable();
     if (!log->errorString().isEmpty() && !usable)
-        return QObject::tr("The log cannot be written: %1").arg(log->errorString());
+        return QObject::tr("Cannot write the log: %1").arg(log->errorString());
     if (file.exists() && !usable)
-        return QObject::tr("The log cannot be written: %1 is no writable file")
-            .arg(file.filePath());
+        return QObject::tr("Cannot write the log: %1 is not writable").arg(file.filePath());
 
     const QStorageInfo storage(file.path());
     if (storage.isValid() && storage.isReady() && storage.bytesTotal() > 0 &&
         storage.bytesAvailable() == 0)
-        return QObject::tr("The log cannot be written: the disk is full");
+        return QObject::tr("Cannot write the log: the disk is full");
     return QString();
 }
 
@@ -66,8 +65,11 @@ QString LogHealth::sharingProblem()
         numbers.append(QString::number(number));
     if (numbers.isEmpty())
         return QString();
-    return QObject::tr("Another running program writes to the same log (process %1)")
-        .arg(numbers.join(QLatin1String(", ")));
+    const QString text =
+        numbers.size() == 1
+            ? QObject::tr("Another running program writes to the same log (process %1)")
+            : QObject::tr("Other running programs write to the same log (processes %1)");
+    return text.arg(numbers.join(QLatin1String(", ")));
 }
 
 } // namespace Velocor

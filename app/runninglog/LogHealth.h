@@ -11,7 +11,7 @@ namespace Velocor {
 
 class InstanceList;
 
-/// Whether the program's log can be relied on: it is on, can be written, and is nobody else's too.
+/// Checks whether the log is reliable: enabled, writable, and not shared with other programs.
 ///
 ///     LogHealth health;
 ///     statusLabel->setText(health.Check());
@@ -21,7 +21,7 @@ public:
     LogHealth();
     ~LogHealth();
 
-    /// What is wrong at the moment, in one sentence; empty if all is well. Looks at the disk.
+    /// The current problem, in one sentence; empty if there is none. Accesses the disk.
     QString Check();
 
 private:

@@ -29,14 +29,14 @@ QString RootName()
     return QStringLiteral("LogSettings");
 }
 
-// The store refuses a null text; an empty one shows in the comparison after saving.
+// The store rejects null strings; an empty one is found by the comparison after saving.
 QString NotNull(QString const& text)
 {
     return text.isNull() ? QString(QLatin1String("")) : text;
 }
 
-// The settings file as the log reads it, but without the entries that this would make. Opening a
-// pipe would wait, and a device may have no end.
+// The settings file as the log reads it, but without writing log entries. Only a regular file:
+// opening a pipe would block, and a device may have no end.
 class SettingsFile : public TorkConfigFile
 {
 public:
@@ -100,13 +100,13 @@ QString LogPreferences::Apply() const
     log->setLogElapsedTime(elapsedTime);
     log->setLogPipeToConsole(echo);
     if (log->maxLogFiles() > 100)
-        log->setMaxLogFiles(files); // the setter goes down to 100 first
+        log->setMaxLogFiles(files); // the first call only lowers it to 100
     log->setMaxLogFiles(files);
     return QString();
 }
 
-// All of the log's settings, also those that are not changed here: the file may be missing or may
-// not parse.
+// Writes all of the log's settings, even those not changed here: the file may be missing or
+// malformed.
 QString LogPreferences::save(unsigned maxFileSize, unsigned files) const
 {
     const QString fileName = FileName();
@@ -126,12 +126,11 @@ QString LogPreferences::save(unsigned maxFileSize, unsigned files) const
     const SettingsFile readBack(fileName);
     const bool arrived = readBack.isLoaded() && readBack.ToXml() == file.ToXml();
     return arrived ? QString()
-                   : QObject::tr("The settings file %1 does not hold all of the settings now.")
-                         .arg(fileName);
+                   : QObject::tr("The settings file %1 is incomplete after saving.").arg(fileName);
 }
 
-// A control character would break the lines of the log.
-bool LogPreferences::IsKept(QString const& text)
+// A control character would break log lines.
+bool LogPreferences::IsStorable(QString const& text)
 {
     const bool printable = std::all_of(text.begin(), text.end(), [](QChar c) {
         return c.unicode() >= 0x20 && c.unicode() != 0x7f;
@@ -139,9 +138,9 @@ bool LogPreferences::IsKept(QString const& text)
     return printable && TorkConfigText::IsPlainValue(text);
 }
 
-bool LogPreferences::IsFilePrefix(QString const& text)
+bool LogPreferences::IsValidFilePrefix(QString const& text)
 {
-    return IsKept(text) && !text.contains(QLatin1Char('/')) && text != QLatin1String(".") &&
+    return IsStorable(text) && !text.contains(QLatin1Char('/')) && text != QLatin1String(".") &&
            text != QLatin1String("..");
 }
 

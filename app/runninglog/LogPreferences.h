@@ -7,9 +7,9 @@
 
 namespace Velocor {
 
-/// The log's settings, those in force and those that its settings file keeps for the next start.
+/// The log's settings: those in effect, and those in its settings file for the next start.
 ///
-/// The log has setters for some of its settings only; the others are changed in its settings file.
+/// The log has setters for only some of its settings; the others are changed in its settings file.
 /// Nothing here is logged. GUI thread. Settings: docs/log-settings.md.
 ///
 ///     LogPreferences preferences = LogPreferences::Read();
@@ -17,36 +17,35 @@ namespace Velocor {
 ///     const QString error = preferences.Apply();
 struct LogPreferences
 {
-    // Set at once.
+    // Take effect immediately.
     bool enabled = true;
     bool elapsedTime = false;
     bool echo = false;
     int maxFiles = 10;
 
-    // From the next start on.
+    // Take effect at the next start.
     QString elapsedPrefix;
     QString dateFormat;
     QString filePrefix;
 
-    /// What the log has in force; for the settings from the next start on what its settings file
-    /// says, if it says anything.
+    /// The settings in effect; for those that take effect at the next start, the values in the
+    /// settings file, if any.
     static LogPreferences Read();
 
-    /// Saves all of them, then puts those that can be set at once in force.
+    /// Saves all settings, then applies those that can take effect immediately.
     ///
-    /// @return the reason of a failure, which leaves the running log as it was; empty if all is
-    ///     well
+    /// @return the reason for a failure, which leaves the running log unchanged; empty on success
     QString Apply() const;
 
     /// The log's settings file; empty if there is no log.
     static QString FileName();
 
-    /// Whether the log's settings file keeps this text as a value, and it fits in a line of the
-    /// log: a plain value (see TorkConfigText::IsPlainValue()) without control characters.
-    static bool IsKept(QString const& text);
+    /// Whether the settings file can store this text and it fits into a log line: a plain value
+    /// (see TorkConfigText::IsPlainValue()) without control characters.
+    static bool IsStorable(QString const& text);
 
-    /// Whether log files can be called so: kept, no "/", and not "." or "..".
-    static bool IsFilePrefix(QString const& text);
+    /// Whether this is a valid log file name: storable, without "/", and not "." or "..".
+    static bool IsValidFilePrefix(QString const& text);
 
 private:
     QString save(unsigned maxFileSize, unsigned files) const;

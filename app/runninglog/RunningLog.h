@@ -7,16 +7,16 @@
 
 namespace Velocor {
 
-/// What the running program's log writes, and where.
+/// The file and the formats of the running program's log.
 class RunningLog
 {
 public:
-    /// Its path: of the open file, whatever the settings say by now, or of the one that the next
-    /// entry opens. Empty if there is no log.
+    /// The path of the open file, whatever the settings are by now, or of the file that the next
+    /// entry will open. Empty if there is no log.
     static QString FileName();
 
-    /// The format of its time stamps, as QDateTime::toString() takes it, and the text before its
-    /// elapsed times, both as they are in force; without a log the log's defaults.
+    /// The format of time stamps, for QDateTime::toString(), and the text before elapsed times,
+    /// both as currently in effect; without a log, its defaults.
     static QString DateFormat();
     static QString ElapsedPrefix();
 };

@@ -14,7 +14,7 @@ namespace Velocor {
 /// Values by section and key.
 using SettingsValues = QHash<QPair<QString, QString>, QString>;
 
-/// What a configuration-store file holds, in its own order, and what the store makes of it.
+/// The content of a configuration file, in file order, and what the store would not keep.
 /// A plain record.
 struct SettingsDocument
 {
@@ -33,15 +33,15 @@ struct SettingsDocument
     QString rootName;
     QVector<Section> sections;
 
-    bool isReadable = false; ///< whether the file could be read from the disk
+    bool isReadable = false; ///< whether the file could be read from disk
     bool isParsed = false;
-    QString error; ///< the system's or the reader's message; empty if all is well
-    int line = 0;  ///< place of the error, from 1 on; 0 if it has none
+    QString error; ///< message of the system or the parser; empty on success
+    int line = 0;  ///< position of the error, starting at 1; 0 if unknown
     int column = 0;
 
-    /// What the file holds that the store does not keep, one text each, with its line.
+    /// What the store does not keep, one message each, with its line.
     QStringList losses;
-    int lossCount = 0; ///< of all of them; only the first are worded
+    int lossCount = 0; ///< the number of all losses; `losses` has only the first ones
 
     /// The value under a section and a key; `byDefault` if there is none.
     QString Value(QString const& section, QString const& key,
@@ -50,7 +50,7 @@ struct SettingsDocument
     /// All values, for looking up many of them.
     SettingsValues AllValues() const;
 
-    /// Stores a value, making the section if need be.
+    /// Stores a value, creating the section if necessary.
     void SetValue(QString const& section, QString const& key, QString const& value);
 
     /// Whether both hold the same sections, keys and values in the same order.

@@ -23,7 +23,8 @@ SettingsDocument SettingsFileReader::Read(QString const& path)
     const QFileInfo info(path);
     if (info.isDir())
         document.error = QObject::tr("Is a folder");
-    else if (info.exists() && !info.isFile()) // opening a pipe waits, and a device may have no end
+    else if (info.exists() &&
+             !info.isFile()) // opening a pipe would block, and a device may have no end
         document.error = QObject::tr("Not a regular file");
     else if (!file.open(QIODevice::ReadOnly))
         document.error = file.errorString();
@@ -53,7 +54,7 @@ void SettingsFileReader::read(QIODevice& device, SettingsDocument& document)
     SettingsFileReader reader(store, document);
     document.isParsed = store.LoadFrom(&device, reader);
     if (!document.isParsed && document.error.isEmpty())
-        document.error = QObject::tr("The file is no configuration file");
+        document.error = QObject::tr("not a configuration file");
 
     const QStringList names = store.sectionList();
     for (QString const& name : names) {
@@ -69,7 +70,7 @@ void SettingsFileReader::read(QIODevice& device, SettingsDocument& document)
 void SettingsFileReader::noteLoss(QString const& what)
 {
     ++m_document.lossCount;
-    if (m_document.losses.size() >= MostLosses)
+    if (m_document.losses.size() >= MaximumLosses)
         return;
     const int line = m_locator ? m_locator->lineNumber() : 0;
     m_document.losses.append(QObject::tr("Line %1: %2").arg(line).arg(what));
@@ -87,10 +88,11 @@ bool SettingsFileReader::startElement(QString const& namespaceURI, QString const
     for (int i = 0; i < attributes.count(); ++i)
         noteLoss(QObject::tr("the attribute \"%1\" of \"%2\"").arg(attributes.qName(i), localName));
 
-    const bool isCalledLikeRoot = newDepth > 1 && localName == m_document.rootName;
-    const bool isSection = newDepth == 2 && !isCalledLikeRoot;
-    if (isCalledLikeRoot)
-        noteLoss(QObject::tr("the element \"%1\", which is called like the root").arg(localName));
+    const bool hasRootName = newDepth > 1 && localName == m_document.rootName;
+    const bool isSection = newDepth == 2 && !hasRootName;
+    if (hasRootName)
+        noteLoss(QObject::tr("the element \"%1\", which has the same name as the root element")
+                     .arg(localName));
     else if (isSection && m_store.HasSection(localName))
         noteLoss(QObject::tr("a second section \"%1\", merged with the first").arg(localName));
     else if (newDepth > 3)
@@ -107,11 +109,11 @@ bool SettingsFileReader::endElement(QString const& namespaceURI, QString const& 
 {
     m_isAfterValue = false;
     if (depth() == 3 && isAtStartTag() && m_store.IsExpectingValue())
-        noteLoss(QObject::tr("\"%1\", which has no text").arg(localName));
+        noteLoss(QObject::tr("the empty item \"%1\"").arg(localName));
     return TorkConfigFileDocHandler::endElement(namespaceURI, localName, qName);
 }
 
-// Before the store takes a value: whether it has a place for it, and one that is free.
+// Called before the store accepts a value: checks that it has a section and is not a duplicate.
 void SettingsFileReader::noteLossOfValue()
 {
     TorkConfigFileSection const* section = m_store.CurrentSection();
@@ -119,9 +121,9 @@ void SettingsFileReader::noteLossOfValue()
     QString none;
     QString earlier;
     if (!section)
-        noteLoss(QObject::tr("\"%1\", which is in no section").arg(key));
+        noteLoss(QObject::tr("\"%1\", which is outside any section").arg(key));
     else if (m_store.ReadItem(section->name(), key, none, earlier))
-        noteLoss(QObject::tr("a second value of \"%1\", in the place of the first").arg(key));
+        noteLoss(QObject::tr("the first value of \"%1\", replaced by a second one").arg(key));
 }
 
 bool SettingsFileReader::characters(QString const& text)
@@ -130,10 +132,10 @@ bool SettingsFileReader::characters(QString const& text)
         noteLossOfValue();
         m_isAfterValue = depth() == 3;
     } else if (m_isAfterValue) {
-        noteLoss(QObject::tr("the value of \"%1\" from \"%2\" on")
+        noteLoss(QObject::tr("the value of \"%1\", starting at \"%2\"")
                      .arg(lastOpenedElement(), text.left(20)));
     } else if (!text.trimmed().isEmpty()) {
-        noteLoss(QObject::tr("the text \"%1\" outside of values").arg(text.trimmed().left(20)));
+        noteLoss(QObject::tr("the text \"%1\" outside any value").arg(text.trimmed().left(20)));
     }
     return TorkConfigFileDocHandler::characters(text);
 }
@@ -141,7 +143,7 @@ bool SettingsFileReader::characters(QString const& text)
 bool SettingsFileReader::processingInstruction(QString const& target, QString const&)
 {
     if (target != QLatin1String("xml"))
-        noteLoss(QObject::tr("the instruction \"%1\"").arg(target));
+        noteLoss(QObject::tr("the processing instruction \"%1\"").arg(target));
     return true;
 }
 

@@ -11,26 +11,26 @@ class TorkConfigFile;
 
 namespace Velocor {
 
-/// Reads a configuration-store file through the store, and notes what the store passes over.
+/// Reads a configuration file through the store, and notes what the store ignores.
 ///
-/// What is a section, a key or a value is the store's decision; this class follows the parse to
-/// tell what saving would lose and where a file is broken. Nothing is written to the log. File
+/// The store decides what is a section, a key or a value; this class only observes the parser, to
+/// report what saving would lose and where a file is broken. Nothing is written to the log. File
 /// format: docs/config-file.md.
 ///
 ///     SettingsDocument document = SettingsFileReader::Read(path);
 ///     if (!document.isParsed)
-///         tell(document.error, document.line, document.column);
+///         report(document.error, document.line, document.column);
 class SettingsFileReader : private TorkConfigFileDocHandler
 {
 public:
     /// Reads a file. Only regular files and links to them are read.
     static SettingsDocument Read(QString const& path);
 
-    /// Reads a text as if it were the content of a file.
+    /// Reads the content of a file from memory.
     static SettingsDocument ReadBytes(QByteArray const& bytes);
 
-    /// The most losses that are formatted; the others are only counted.
-    static constexpr int MostLosses = 50;
+    /// The maximum number of losses that are formatted; the others are only counted.
+    static constexpr int MaximumLosses = 50;
 
 private:
     SettingsFileReader(TorkConfigFile& store, SettingsDocument& document);

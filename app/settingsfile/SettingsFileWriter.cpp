@@ -22,7 +22,7 @@ bool IsLatin1(QString const& text)
     return std::all_of(text.begin(), text.end(), [](QChar c) { return c.unicode() < 256; });
 }
 
-// Why a value does not come back.
+// Why a value does not read back unchanged.
 QString ReasonOf(QString const& value)
 {
     if (value.contains(QLatin1String("]]>")))
@@ -30,8 +30,8 @@ QString ReasonOf(QString const& value)
     if (!IsLatin1(value))
         return QObject::tr("characters outside Latin-1 become \"?\"");
     if (value.isEmpty())
-        return QObject::tr("an empty value is not kept");
-    return QObject::tr("the value would read differently afterwards");
+        return QObject::tr("empty values are not saved");
+    return QObject::tr("the value would change when read back");
 }
 
 QString Message(SettingsDocument::Section const& section, SettingsDocument::Item const& item,
@@ -40,15 +40,14 @@ QString Message(SettingsDocument::Section const& section, SettingsDocument::Item
     return QStringLiteral("%1 / %2: %3").arg(section.name, item.key, reason);
 }
 
-// Moves the items that the store can write from the section to the result.
+// Returns the section with only the items that the store can write.
 SettingsDocument::Section WithoutLosses(SettingsDocument::Section const& section,
                                         QStringList& losses)
 {
     SettingsDocument::Section writable{section.name, {}};
     for (SettingsDocument::Item const& item : section.items) {
         if (!TorkConfigText::IsPlainName(item.key))
-            losses.append(
-                Message(section, item, QObject::tr("the key is no name that the store can write")));
+            losses.append(Message(section, item, QObject::tr("the key is not a valid name")));
         if (!TorkConfigText::IsPlainValue(item.value))
             losses.append(Message(section, item, ReasonOf(item.value)));
         else if (TorkConfigText::IsPlainName(item.key))
@@ -77,8 +76,7 @@ QStringList SettingsFileWriter::Losses(SettingsDocument const& document)
     for (SettingsDocument::Section const& section : document.sections) {
         const SettingsDocument::Section kept = WithoutLosses(section, losses);
         if (!TorkConfigText::IsPlainName(section.name))
-            losses.append(QObject::tr("%1: the section has no name that the store can write")
-                              .arg(section.name));
+            losses.append(QObject::tr("%1: the section name is not valid").arg(section.name));
         else if (section.name == document.rootName)
             losses.append(QObject::tr("%1: the section has the same name as the root element")
                               .arg(section.name));
@@ -86,7 +84,7 @@ QStringList SettingsFileWriter::Losses(SettingsDocument const& document)
             writable.sections.append(kept);
     }
 
-    // Whatever else gets lost, the store itself tells.
+    // Any other loss shows when the text is read back.
     TorkConfigFile store(QString(), document.rootName);
     Fill(store, writable);
     const SettingsValues readBack = SettingsFileReader::ReadBytes(store.ToXml()).AllValues();
@@ -112,11 +110,11 @@ bool SettingsFileWriter::Save(QString const& path, SettingsDocument const& docum
         return false;
     }
 
-    // The store does not look at what the disk makes of its bytes.
+    // The store does not verify what was written to disk.
     const SettingsDocument readBack = SettingsFileReader::Read(path);
     const bool arrived = readBack.isParsed && readBack.sections.size() == document.sections.size();
     if (!arrived)
-        *error = QObject::tr("The file was written, but does not read back whole. "
+        *error = QObject::tr("The file was written, but does not read back completely. "
                              "The disk may be full.");
     return arrived;
 }
@@ -131,7 +129,7 @@ bool SettingsFileWriter::KeepBackup(QString const& path, QString* error)
         return false;
     }
     if (QFile::exists(copy) && !QFile::remove(copy)) {
-        *error = QObject::tr("The file %1 cannot be replaced.").arg(copy);
+        *error = QObject::tr("Cannot replace the file %1.").arg(copy);
         return false;
     }
     QFile file(path);

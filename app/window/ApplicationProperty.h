@@ -9,8 +9,8 @@
 
 namespace Velocor {
 
-/// A text that the start has published on the application object: a directory such as "DataPath",
-/// ending in "/", or the "caption". Empty if there is none. GUI thread.
+/// A string property of the application object, set at startup: a directory such as "DataPath",
+/// ending in "/", or the "caption". Empty if it is not set. GUI thread.
 inline QString ApplicationProperty(char const* name)
 {
     return QCoreApplication::instance()->property(name).toString();

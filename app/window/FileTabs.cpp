@@ -44,7 +44,7 @@ FileTabs::FileTabs(QWidget* parent) : QTabWidget(parent)
     connect(this, &QTabWidget::currentChanged, this, &FileTabs::stateChanged);
 }
 
-// The style's own close button is an image that dark palettes swallow.
+// The style's close button is an image that is invisible on dark palettes.
 void FileTabs::addCloseButton(QWidget* page, QString const& name)
 {
     auto* button = new QToolButton;

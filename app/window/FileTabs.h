@@ -11,32 +11,32 @@ namespace Velocor {
 class LogPanel;
 class SettingsEditor;
 
-/// The centre of the window: the program's own log, and behind it the files that were opened.
+/// The central widget: a tab for the program's own log, followed by tabs for opened files.
 class FileTabs : public QTabWidget
 {
     Q_OBJECT
 
 public:
-    /// Makes the tab of the program's log, without reading it yet.
+    /// Creates the tab for the program's log, without reading it yet.
     explicit FileTabs(QWidget* parent = nullptr);
 
-    /// Shows a file in a tab of its own, or the tab that it has already.
+    /// Shows a file in a new tab, or in its existing tab.
     ///
-    /// A file that begins with "<" is taken for a settings file, any other for a log.
+    /// A file that begins with "<" is treated as a settings file, any other as a log.
     void OpenFile(QString const& path);
 
-    /// Closes the current tab unless it is the program's log or its file is to be kept open.
+    /// Closes the current tab, unless it is the program's log or the user cancels.
     void CloseCurrent();
 
-    /// Asks about all changes that have not been saved.
+    /// Asks about all unsaved changes.
     ///
-    /// @return false if the window is to stay
+    /// @return false if the user cancels
     bool MayCloseAll();
 
     /// The panel of the program's own log.
     LogPanel* ownLog() const { return m_ownLog; }
 
-    /// What the current tab shows; null if it is of the other kind.
+    /// The content of the current tab; null if it is of the other type.
     LogPanel* currentLog() const;
     SettingsEditor* currentEditor() const;
 

@@ -33,8 +33,8 @@
 #include <QUrl>
 #include <QVBoxLayout>
 
-// Resources of a static library have to be asked for, from outside of any namespace.
-static void InitResources()
+// Resources of a static library must be initialized explicitly, outside any namespace.
+static void InitializeResources()
 {
     Q_INIT_RESOURCE(window);
 }
@@ -45,8 +45,8 @@ namespace {
 
 constexpr int HealthInterval = 2000; // milliseconds
 constexpr int MessageTime = 6000;    // milliseconds
-constexpr int MostDropped = 20;
-constexpr int LongestMessage = 1000; // characters
+constexpr int MaximumDroppedFiles = 20;
+constexpr int MaximumMessageLength = 1000; // characters
 
 QIcon WindowIcon()
 {
@@ -64,22 +64,22 @@ MainWindow::MainWindow(QWidget* parent)
 {
     setWindowTitle(ApplicationProperty("caption"));
     setAcceptDrops(true);
-    // Size limits are for the window manager. A platform without one says in the log that it cannot
-    // pass them on.
+    // Size limits are for the window manager. Platforms without one log a warning that they do not
+    // support them.
     if (IsScreenlessPlatform())
         layout()->setSizeConstraint(QLayout::SetNoConstraint);
     makeFirstContent();
     restoreFirstState();
 }
 
-// A window that is deleted unclosed is hidden then, which ends the editing of a cell.
+// Deleting an open window hides it, which ends cell editing and makes the tabs send signals.
 MainWindow::~MainWindow()
 {
     if (m_tabs)
         disconnect(m_tabs, nullptr, this, nullptr);
 }
 
-// The menus are there from the start, so that nothing moves when they are filled.
+// The menu bar exists from the start, so that nothing moves when the menus are filled.
 void MainWindow::makeFirstContent()
 {
     m_splitter->setAccessibleName(tr("Places and files"));
@@ -105,7 +105,7 @@ void MainWindow::complete()
 {
     if (m_tabs)
         return;
-    InitResources();
+    InitializeResources();
     QGuiApplication::setWindowIcon(WindowIcon());
     QGuiApplication::setDesktopFileName(QStringLiteral("org.tork.velocor"));
     new SelectableMessageBoxes(this);
@@ -128,8 +128,8 @@ void MainWindow::makeTabs()
     m_tabs->show();
     m_splitter->setStretchFactor(1, 1);
     m_splitter->setSizes(sizes);
-    connect(m_places, &PlacesPanel::messageReported, this, &MainWindow::say);
-    connect(m_tabs, &FileTabs::messageReported, this, &MainWindow::say);
+    connect(m_places, &PlacesPanel::messageReported, this, &MainWindow::showMessage);
+    connect(m_tabs, &FileTabs::messageReported, this, &MainWindow::showMessage);
     connect(m_tabs, &FileTabs::stateChanged, this, &MainWindow::updateState);
     m_tabs->ownLog()->setFocus();
 }
@@ -184,16 +184,15 @@ void MainWindow::makeFileMenu()
     m_recentMenu = menu->addMenu(tr("Open &Recent"));
     m_recent = new RecentFiles(m_recentMenu, this);
     connect(m_recent, &RecentFiles::fileChosen, this, &MainWindow::OpenFile);
-    m_save = addAction(menu, tr("&Save"), QKeySequence::Save, tr("Save the settings file in front"),
+    m_save = addAction(menu, tr("&Save"), QKeySequence::Save, tr("Save the current settings file"),
                        [this] { m_tabs->currentEditor()->Save(); });
-    m_close = addAction(menu, tr("&Close Tab"), QKeySequence::Close, tr("Close the file in front"),
+    m_close = addAction(menu, tr("&Close Tab"), QKeySequence::Close, tr("Close the current file"),
                         [this] { m_tabs->CloseCurrent(); });
     menu->addSeparator();
     addAction(menu, tr("Open Log &Folder"), QKeySequence(tr("Ctrl+Shift+O")),
               tr("Show the log files in the file manager"), [this] { openLogFolder(); });
     addAction(menu, tr("Save Re&port..."), QKeySequence(tr("Ctrl+Shift+R")),
-              tr("Collect what a bug report needs, look at it and save it"),
-              [this] { saveReport(); });
+              tr("Review and save the information for a bug report"), [this] { saveReport(); });
     menu->addSeparator();
     QAction* quit = addAction(menu, tr("&Quit"), QKeySequence(tr("Ctrl+Q")),
                               tr("Close the program"), [this] { close(); });
@@ -209,14 +208,14 @@ void MainWindow::makeEditMenu()
               [this] { selectAll(); });
     menu->addSeparator();
     m_logActions.append(addAction(menu, tr("&Filter"), QKeySequence::Find,
-                                  tr("Show only lines that contain a text"),
+                                  tr("Show only lines that contain the filter text"),
                                   [this] { m_tabs->currentLog()->FocusFilter(); }));
     m_logActions.append(addAction(menu, tr("Clear Fi&lter"), QKeySequence(tr("Ctrl+Shift+F")),
                                   tr("Show all lines again"),
                                   [this] { m_tabs->currentLog()->ClearFilter(); }));
     menu->addSeparator();
     QAction* settings = addAction(menu, tr("Log &Settings..."), QKeySequence(tr("Ctrl+,")),
-                                  tr("Change what the log writes and how much of it is kept"),
+                                  tr("Change what is logged and how many log files are kept"),
                                   [this] { changeLogSettings(); });
     settings->setMenuRole(QAction::PreferencesRole);
 }
@@ -225,18 +224,18 @@ void MainWindow::makeViewMenu()
 {
     QMenu* menu = m_menus.at(2);
     m_showPlaces = addSwitch(menu, tr("&Places"), QKeySequence(tr("F9")),
-                             tr("Show who the program is and where its files lie"),
+                             tr("Show program identity and file locations"),
                              [this](bool shown) { m_places->setVisible(shown); });
     m_showPlaces->setChecked(true);
     menu->addSeparator();
     m_earlierRuns = addSwitch(menu, tr("&Earlier Runs"), QKeySequence(tr("Ctrl+Shift+E")),
-                              tr("Show what earlier runs have left in the file"),
+                              tr("Show entries from earlier runs"),
                               [this](bool shown) { m_tabs->currentLog()->SetEarlierRuns(shown); });
     m_pause = addSwitch(menu, tr("P&ause"), QKeySequence(tr("Ctrl+Shift+P")),
-                        tr("Leave the view as it is while the log goes on"),
+                        tr("Stop updating the view while logging continues"),
                         [this](bool paused) { m_tabs->currentLog()->SetPaused(paused); });
     m_follow = addSwitch(menu, tr("&Follow Newest"), QKeySequence(tr("Ctrl+Shift+N")),
-                         tr("Keep the newest entry in view"),
+                         tr("Scroll to new entries as they arrive"),
                          [this](bool follow) { m_tabs->currentLog()->SetFollowing(follow); });
     menu->addSeparator();
     m_logActions += {m_earlierRuns, m_pause, m_follow};
@@ -248,7 +247,7 @@ void MainWindow::makeViewMenu()
                                   [this] { m_tabs->currentLog()->GoToProblem(-1); }));
     menu->addSeparator();
     m_logActions.append(addAction(menu, tr("&Reload"), QKeySequence(tr("F5")),
-                                  tr("Read the file anew"),
+                                  tr("Reload the file"),
                                   [this] { m_tabs->currentLog()->Reload(); }));
 }
 
@@ -257,7 +256,7 @@ void MainWindow::makeHelpMenu()
     QMenu* menu = m_menus.at(3);
     QAction* about =
         addAction(menu, tr("&About %1").arg(QStringLiteral("Velocor")), QKeySequence(tr("F1")),
-                  tr("Versions, system and directories"), [this] { showAbout(); });
+                  tr("Show versions, system and directories"), [this] { showAbout(); });
     about->setMenuRole(QAction::AboutRole);
 }
 
@@ -266,7 +265,7 @@ void MainWindow::restoreFirstState()
     const QSize available = QApplication::desktop()->availableGeometry(this).size();
     resize(QSize(1080, 680).boundedTo(available * 9 / 10));
 
-    m_damage = m_settings.Load();
+    m_startupMessage = m_settings.Load();
     m_settings.RestoreGeometry(this);
     const QList<int> sizes = m_settings.Numbers(QStringLiteral("panes"));
     if (sizes.size() == m_splitter->count())
@@ -276,8 +275,8 @@ void MainWindow::restoreFirstState()
 
 void MainWindow::restoreState()
 {
-    if (!m_damage.isEmpty())
-        m_notice->Tell(m_damage);
+    if (!m_startupMessage.isEmpty())
+        m_notice->ShowMessage(m_startupMessage);
     m_tabs->ownLog()->SetColumnWidths(m_settings.Numbers(QStringLiteral("columns")));
     m_tabs->ownLog()->SetPaneSizes(m_settings.Numbers(QStringLiteral("linePane")));
     m_recent->SetList(m_settings.Text(QStringLiteral("recentFiles")));
@@ -294,7 +293,7 @@ void MainWindow::saveState()
     m_settings.SetNumbers(QStringLiteral("linePane"), m_tabs->ownLog()->paneSizes());
     m_settings.SetText(QStringLiteral("recentFiles"), m_recent->list());
 
-    // Not in a box: the window may be closing because the system is.
+    // No message box: the window may be closing because of a system shutdown.
     const QString error = m_settings.Save();
     if (!error.isEmpty())
         WarningMessage(this, error, false);
@@ -345,9 +344,9 @@ void MainWindow::updateState()
     m_earlierRuns->setChecked(log->showsEarlierRuns());
 }
 
-void MainWindow::say(QString const& text)
+void MainWindow::showMessage(QString const& text)
 {
-    statusBar()->showMessage(Shortened(text, LongestMessage), MessageTime);
+    statusBar()->showMessage(Shortened(text, MaximumMessageLength), MessageTime);
 }
 
 void MainWindow::chooseFile()
@@ -368,11 +367,11 @@ void MainWindow::OpenFile(QString const& path)
         return;
     }
     if (QFileInfo(full).isDir()) {
-        say(tr("%1 is a folder").arg(full));
+        showMessage(tr("%1 is a folder").arg(full));
         return;
     }
-    if (!QFileInfo(full).isFile()) { // opening a pipe waits, and a device may have no end
-        say(tr("%1 is not a regular file").arg(full));
+    if (!QFileInfo(full).isFile()) { // opening a pipe would block, and a device may have no end
+        showMessage(tr("%1 is not a regular file").arg(full));
         return;
     }
     m_tabs->OpenFile(full);
@@ -382,12 +381,12 @@ void MainWindow::OpenFile(QString const& path)
 bool MainWindow::offerToForget(QString const& path)
 {
     if (!m_recent->Contains(path)) {
-        say(tr("There is no file %1").arg(path));
+        showMessage(tr("%1 does not exist").arg(path));
         return false;
     }
     PlainMessageBox box(
         QMessageBox::Question, this,
-        tr("There is no file %1 any more.\nRemove it from the list of recent files?").arg(path),
+        tr("%1 no longer exists.\nRemove it from the list of recent files?").arg(path),
         QMessageBox::Yes | QMessageBox::No);
     if (box.exec() != QMessageBox::Yes)
         return false;
@@ -398,14 +397,15 @@ bool MainWindow::offerToForget(QString const& path)
 void MainWindow::openLogFolder()
 {
     if (!PlacesPanel::OpenPlace(RunningLog::FileName()))
-        say(tr("The log folder cannot be shown: it is not there, or there is no file manager"));
+        showMessage(
+            tr("Cannot open the log folder: it does not exist, or there is no file manager"));
 }
 
 void MainWindow::saveReport()
 {
     ReportDialog dialog(tr("Save Report"),
-                        tr("This is what the report holds. Look through it before you pass it on: "
-                           "the log may tell more than you want others to know."),
+                        tr("This is the content of the report. Review it before you share it: "
+                           "the log may contain private information."),
                         SystemReport::Whole(m_settings.fileName()), true, this);
     dialog.exec();
 }
@@ -414,7 +414,7 @@ void MainWindow::showAbout()
 {
     ReportDialog dialog(tr("About %1").arg(QStringLiteral("Velocor")),
                         QStringLiteral("Velocor %1\n").arg(QLatin1String(VELOCOR_VERSION)) +
-                            tr("The start-up program of the Tork family. MIT licence."),
+                            tr("The startup program of the Tork family. MIT license."),
                         SystemReport::Facts(m_settings.fileName()), false, this);
     dialog.exec();
 }
@@ -423,12 +423,12 @@ void MainWindow::changeLogSettings()
 {
     LogSettingsDialog dialog(this);
     if (dialog.exec() == QDialog::Accepted) {
-        say(tr("The log settings have been saved"));
+        showMessage(tr("Log settings saved"));
         checkLog();
     }
 }
 
-// A text field in focus copies its own selection, also from the menu.
+// A focused text field copies its own selection, also when invoked from the menu.
 void MainWindow::copy()
 {
     QWidget* focused = QApplication::focusWidget();
@@ -453,7 +453,7 @@ void MainWindow::closeEvent(QCloseEvent* event)
         event->ignore();
         return;
     }
-    if (m_tabs) // otherwise nothing can have changed
+    if (m_tabs) // otherwise there is nothing to save
         saveState();
     event->accept();
 }
@@ -471,7 +471,7 @@ void MainWindow::dragEnterEvent(QDragEnterEvent* event)
 
 void MainWindow::dropEvent(QDropEvent* event)
 {
-    const QList<QUrl> urls = event->mimeData()->urls().mid(0, MostDropped);
+    const QList<QUrl> urls = event->mimeData()->urls().mid(0, MaximumDroppedFiles);
     for (QUrl const& url : urls) {
         if (url.isLocalFile())
             OpenFile(url.toLocalFile());

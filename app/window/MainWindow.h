@@ -23,12 +23,13 @@ class NoticeBar;
 class PlacesPanel;
 class RecentFiles;
 
-/// The program's top-level window: its log, live; who it is and where its files lie; files of the
-/// family to look at; the log's settings; and what a bug report needs.
+/// The main window: the live log, program identity and file locations, other log and settings
+/// files, the log settings, and reports for bugs.
 ///
-/// Reads the application object's properties and the log when it is made, so make it after both are
-/// set up. It writes no log entry of its own while the program starts. For its first paint
-/// it has the identity and places only; all else is made right after that, or when it is needed.
+/// Reads the application object's properties and the log when it is constructed, so create it after
+/// both are set up. It writes no log entries at startup. To show up quickly, it has only the
+/// identity and locations for its first paint; everything else is created right after that or on
+/// demand.
 class MainWindow : public QMainWindow
 {
     Q_OBJECT
@@ -39,7 +40,7 @@ public:
 
     /// Shows a log file or a settings file in a tab, and remembers it among the recent ones.
     ///
-    /// For a file that is not there it offers to forget it.
+    /// If the file does not exist, offers to remove it from the recent files.
     void OpenFile(QString const& path);
 
 protected:
@@ -69,7 +70,7 @@ private:
     void startWork();
     void updateState();
     void checkLog();
-    void say(QString const& text);
+    void showMessage(QString const& text);
 
     void chooseFile();
     void openLogFolder();
@@ -81,14 +82,14 @@ private:
     bool offerToForget(QString const& path);
 
     WindowSettings m_settings;
-    QString m_damage; ///< what is to be told of the settings file
+    QString m_startupMessage; ///< about a damaged settings file
     NoticeBar* m_notice = nullptr;
     QSplitter* m_splitter;
     PlacesPanel* m_places;
     FileTabs* m_tabs = nullptr; ///< null until the window is complete
     QLabel* m_summary = nullptr;
     QLabel* m_health = nullptr;
-    QList<QMenu*> m_menus; ///< in the order of the bar
+    QList<QMenu*> m_menus; ///< in menu bar order
     QMenu* m_recentMenu = nullptr;
     RecentFiles* m_recent = nullptr;
 
@@ -98,7 +99,7 @@ private:
     QAction* m_earlierRuns = nullptr;
     QAction* m_pause = nullptr;
     QAction* m_follow = nullptr;
-    QList<QAction*> m_logActions; // those that need a log in front
+    QList<QAction*> m_logActions; // those that need a log in the current tab
 
     std::unique_ptr<LogHealth> m_logHealth;
     QTimer m_healthTimer;

@@ -72,14 +72,14 @@ void PlacesPanel::addValue(QString const& caption, QString const& text, bool isP
     value->setToolTip(PlainToolTip(text));
     value->setAccessibleDescription(text);
     value->setCursorPosition(0);
-    QPalette flat; // only this role is set, so the others go on following the window's
+    QPalette flat; // sets only this role, so the others still follow the window's palette
     flat.setBrush(QPalette::Base, Qt::transparent);
     value->setPalette(flat);
 
     QLabel* label = NewPlainLabel(caption);
     label->setBuddy(value);
 
-    // As high as the buttons are going to be, so that nothing moves when they come.
+    // As high as the buttons, so that nothing moves when they are added.
     label->setMinimumHeight(fontMetrics().height() + 8);
     auto* row = new QHBoxLayout;
     row->setSpacing(2);
@@ -96,12 +96,12 @@ void PlacesPanel::AddButtons()
         QToolButton* open = nullptr;
         if (row.isPlace) {
             open = MakeButton(tr("Open"), tr("Open: %1").arg(row.caption),
-                              tr("Show it in the file manager"));
+                              tr("Show in the file manager"));
             connect(open, &QToolButton::clicked, this, [this, row] { openPlace(row.text); });
             row.layout->addWidget(open);
         }
-        QToolButton* copyButton = MakeButton(tr("Copy"), tr("Copy: %1").arg(row.caption),
-                                             tr("Copy the text to the clipboard"));
+        QToolButton* copyButton =
+            MakeButton(tr("Copy"), tr("Copy: %1").arg(row.caption), tr("Copy to the clipboard"));
         connect(copyButton, &QToolButton::clicked, this,
                 [this, row] { copy(row.caption, row.text); });
         row.layout->addWidget(copyButton);
@@ -126,7 +126,7 @@ void PlacesPanel::openPlace(QString const& path)
 {
     if (!OpenPlace(path))
         Q_EMIT messageReported(
-            tr("%1 cannot be shown: it is not there, or there is no file manager").arg(path));
+            tr("Cannot open %1: it does not exist, or there is no file manager").arg(path));
 }
 
 void PlacesPanel::copy(QString const& caption, QString const& text)

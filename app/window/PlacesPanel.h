@@ -12,7 +12,7 @@ class QVBoxLayout;
 
 namespace Velocor {
 
-/// Who the program is and where its files lie, each to be opened in the file manager or copied.
+/// Program identity and file locations, with buttons to copy them or open the file manager.
 class PlacesPanel : public QWidget
 {
     Q_OBJECT
@@ -21,16 +21,16 @@ public:
     /// @param settingsFile  the window's settings file
     explicit PlacesPanel(QString const& settingsFile, QWidget* parent = nullptr);
 
-    /// Adds the buttons, once; the panel does without them until the window has been painted.
+    /// Adds the buttons. Call once; separate from construction, so that the first paint is quick.
     void AddButtons();
 
-    /// Shows a file's folder or a folder in the system's file manager.
+    /// Shows a folder, or the folder of a file, in the system's file manager.
     ///
-    /// @return false if there is no such folder or nothing to show it
+    /// @return false if the folder does not exist or there is no file manager
     static bool OpenPlace(QString const& path);
 
 Q_SIGNALS:
-    /// A button could not do its work, or has done it.
+    /// The result of a button click, for the status bar.
     void messageReported(QString const& text);
 
 private:

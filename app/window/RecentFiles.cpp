@@ -16,29 +16,29 @@ namespace {
 
 constexpr QLatin1Char Separator('|');
 
-constexpr int LongestName = 100; // characters shown in the menu
+constexpr int MaximumNameLength = 100; // characters
 
-// The empty list reads as one empty entry, which would stay behind the files for good. A path that
-// is too long is left out: shortened, it would name another file.
+// The empty list reads as one empty entry, which would stay in the list forever. A path that is too
+// long is dropped: shortened, it would name another file.
 QString UsableEntries(QString const& list)
 {
     QStringList entries;
     int start = 0;
-    while (start < list.size() && entries.size() < RecentFiles::MostFiles) {
+    while (start < list.size() && entries.size() < RecentFiles::MaximumFiles) {
         int end = list.indexOf(Separator, start);
         if (end < 0)
             end = list.size();
-        if (end > start && end - start <= RecentFiles::LongestPath)
+        if (end > start && end - start <= RecentFiles::MaximumPathLength)
             entries.append(list.mid(start, end - start));
         start = end + 1;
     }
     return entries.join(Separator);
 }
 
-// "&" would mark a key, and a tab would set off a shortcut.
+// "&" would mark a mnemonic, and a tab would start the shortcut column.
 QString MenuText(QString const& path)
 {
-    QString name = Shortened(QFileInfo(path).fileName(), LongestName);
+    QString name = Shortened(QFileInfo(path).fileName(), MaximumNameLength);
     name.replace(QLatin1Char('\t'), QLatin1Char(' '));
     return name.replace(QLatin1Char('&'), QLatin1String("&&"));
 }
@@ -64,9 +64,9 @@ void RecentFiles::SetList(QString const& list)
 
 void RecentFiles::Add(QString const& path)
 {
-    if (path.contains(Separator) || path.size() > LongestPath)
+    if (path.contains(Separator) || path.size() > MaximumPathLength)
         return;
-    AppUtils::AddToMRUList(path, m_list, MostFiles);
+    AppUtils::AddToMRUList(path, m_list, MaximumFiles);
     SetList(m_list);
 }
 
@@ -86,7 +86,7 @@ void RecentFiles::Clear()
     SetList(QString());
 }
 
-// The menu shows names with their number as a key to press; paths are the actions' tool tips.
+// The menu shows file names with a number as mnemonic; the tool tips show the full paths.
 void RecentFiles::fillMenu()
 {
     m_menu->clear();
@@ -107,7 +107,7 @@ void RecentFiles::fillMenu()
     }
     m_menu->addSeparator();
     QAction* clear = m_menu->addAction(tr("&Clear"));
-    clear->setToolTip(PlainToolTip(tr("Forget all recently opened files")));
+    clear->setToolTip(PlainToolTip(tr("Clear the list of recent files")));
     connect(clear, &QAction::triggered, this, &RecentFiles::Clear);
 }
 

@@ -14,22 +14,22 @@ namespace Velocor {
 ///
 ///     RecentFiles recent(menu);
 ///     recent.SetList(settings.Text("recentFiles"));
-///     connect(&recent, &RecentFiles::fileChosen, this, &MainWindow::openFile);
+///     connect(&recent, &RecentFiles::fileChosen, this, &MainWindow::OpenFile);
 class RecentFiles : public QObject
 {
     Q_OBJECT
 
 public:
-    /// @param menu  filled anew whenever the list changes; not owned
+    /// @param menu  refilled whenever the list changes; not owned
     explicit RecentFiles(QMenu* menu, QObject* parent = nullptr);
 
-    /// Takes over a list as list() gave it. See AppUtils for its form. Of a list from elsewhere,
-    /// the first `MostFiles` entries are kept that are neither empty nor longer than `LongestPath`.
+    /// Sets a list that list() returned; see AppUtils for the format. Keeps the first
+    /// `MaximumFiles` entries that are neither empty nor longer than `MaximumPathLength`.
     void SetList(QString const& list);
     QString const& list() const { return m_list; }
 
-    /// Puts a file at the front. A path with "|" in it, or one longer than
-    /// `LongestPath`, cannot be kept and is passed over.
+    /// Adds a file at the front. A path that contains "|" or is longer than `MaximumPathLength` is
+    /// ignored.
     void Add(QString const& path);
 
     /// Whether the path is one of the files.
@@ -37,11 +37,11 @@ public:
     void Remove(QString const& path);
     void Clear();
 
-    /// The most files that are remembered.
-    static constexpr int MostFiles = 10;
+    /// The maximum number of files in the list.
+    static constexpr int MaximumFiles = 10;
 
-    /// The longest path that is remembered, in characters.
-    static constexpr int LongestPath = 4096;
+    /// The maximum length of a path, in characters.
+    static constexpr int MaximumPathLength = 4096;
 
 Q_SIGNALS:
     /// A file was chosen in the menu.

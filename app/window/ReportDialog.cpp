@@ -36,7 +36,7 @@ ReportDialog::ReportDialog(QString const& title, QString const& heading, QString
 
     QLabel* icon = NewPlainLabel();
     icon->setPixmap(QGuiApplication::windowIcon().pixmap(48));
-    icon->setAccessibleName(tr("Icon of the program"));
+    icon->setAccessibleName(tr("Program icon"));
     QLabel* label = NewPlainLabel(heading);
     label->setWordWrap(true);
     label->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
@@ -93,7 +93,7 @@ void ReportDialog::chooseFile()
     if (error.isEmpty())
         accept();
     else
-        PlainMessageBox(QMessageBox::Critical, this, tr("%1 was not saved.\n%2").arg(path, error))
+        PlainMessageBox(QMessageBox::Critical, this, tr("Could not save %1.\n%2").arg(path, error))
             .exec();
 }
 

@@ -10,23 +10,23 @@ class QPlainTextEdit;
 
 namespace Velocor {
 
-/// Shows a text that is meant for others before it is copied or saved.
+/// Shows a report for review before it is copied or saved.
 class ReportDialog : public QDialog
 {
     Q_OBJECT
 
 public:
     /// @param heading  a sentence above the text
-    /// @param saves  whether it offers to save the text besides copying it
+    /// @param saves  whether the text can be saved as well as copied
     ReportDialog(QString const& title, QString const& heading, QString const& text, bool saves,
                  QWidget* parent = nullptr);
 
-    /// Puts the text on the clipboard.
+    /// Copies the text to the clipboard.
     void Copy();
 
     /// Writes the text to a file, in UTF-8.
     ///
-    /// @return the reason of a failure; empty if all is well
+    /// @return the reason for a failure; empty on success
     QString SaveTo(QString const& path) const;
 
 private:

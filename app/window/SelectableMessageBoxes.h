@@ -7,11 +7,11 @@
 
 namespace Velocor {
 
-/// While it lives, the texts of all message boxes of the program can be selected with mouse and
-/// keyboard, to be copied into a report or a search.
+/// As long as this object exists, the text of every message box in the program can be selected with
+/// mouse and keyboard, so that it can be copied.
 ///
-/// The boxes in which Qt's file dialog asks about files are made plain text as well: they name the
-/// files without a look at what Qt takes for markup.
+/// The message boxes of Qt's file dialog are also set to plain text: they show file names, which
+/// could otherwise be displayed as rich text.
 class SelectableMessageBoxes : public QObject
 {
     Q_OBJECT

@@ -27,7 +27,7 @@ namespace Velocor {
 
 namespace {
 
-// How much of the log is read at once, in bytes.
+// The size of one read, in bytes.
 constexpr int SliceSize = 1 << 20;
 
 QString Line(QString const& caption, QString const& text)
@@ -72,7 +72,7 @@ QString Screens()
 QString Directory(QString const& caption, QString const& path)
 {
     const QFileInfo info(path);
-    QString state = QObject::tr("not there");
+    QString state = QObject::tr("does not exist");
     if (info.isDir())
         state = info.isWritable() ? QObject::tr("writable") : QObject::tr("not writable");
     return Line(caption, QStringLiteral("%1 (%2)").arg(path, state));
@@ -81,7 +81,7 @@ QString Directory(QString const& caption, QString const& path)
 QString File(QString const& caption, QString const& path)
 {
     const QFileInfo info(path);
-    QString state = QObject::tr("not there");
+    QString state = QObject::tr("does not exist");
     if (info.exists())
         state = info.isFile() ? FileSizeText(info.size()) : QObject::tr("not a regular file");
     return Line(caption, QStringLiteral("%1 (%2)").arg(path, state));
@@ -93,24 +93,26 @@ QString LogState()
     if (!log)
         return QObject::tr("none");
     QString text = log->enabled() ? QObject::tr("on") : QObject::tr("off");
-    text += QObject::tr(", limit %1 a file, %2 older files")
-                .arg(FileSizeText(log->maxLogFileSize()))
-                .arg(log->maxLogFiles());
+    text += QObject::tr(", limit %1 per file, ").arg(FileSizeText(log->maxLogFileSize()));
+    text += log->maxLogFiles() == 1 ? QObject::tr("1 older file")
+                                    : QObject::tr("%1 older files").arg(log->maxLogFiles());
     if (!log->errorString().isEmpty())
         text += QObject::tr(", last error: %1").arg(log->errorString());
     return text;
 }
 
-QString OlderFiles()
+QString LogFiles()
 {
     qint64 size = 0;
     const QStringList files = LogFileList::FilesOf(RunningLog::FileName());
     for (QString const& file : files)
         size += QFileInfo(file).size();
-    return QObject::tr("%1, %2 in all").arg(files.size()).arg(FileSizeText(size));
+    const QString count =
+        files.size() == 1 ? QObject::tr("1 file") : QObject::tr("%1 files").arg(files.size());
+    return QObject::tr("%1, %2 in total").arg(count, FileSizeText(size));
 }
 
-// The whole log, because its newest entries may be anywhere in the file.
+// Reads the whole log, because its newest entries may be anywhere in the file.
 LogRows RowsOf(QFile& file)
 {
     LogIndex index(RunningLogParser());
@@ -123,7 +125,7 @@ LogRows RowsOf(QFile& file)
     return index.Rows(LogFilter());
 }
 
-// A line without its end; of a very long one, the start.
+// A line without its line end; only the start if it is very long.
 QString LineAt(QFile& file, qint64 start)
 {
     file.seek(start);
@@ -134,7 +136,7 @@ QString LineAt(QFile& file, qint64 start)
     return QString::fromLatin1(line) + (isCut ? QString(QChar(0x2026)) : QString());
 }
 
-QString Memory()
+QString AvailableSpace()
 {
     const QStorageInfo storage(ApplicationProperty("DataPath"));
     return storage.isValid() ? FileSizeText(storage.bytesAvailable()) : QObject::tr("unknown");
@@ -149,10 +151,10 @@ QString SystemReport::Facts(QString const& settingsFile)
                  QStringLiteral("Velocor %1").arg(QLatin1String(VELOCOR_VERSION)));
     text += Line(QObject::tr("Organization"), QCoreApplication::organizationName());
     text += Line(QObject::tr("Product"), QCoreApplication::applicationName());
-    text += Line(QObject::tr("Toolkit built with"), QLatin1String(QT_VERSION_STR));
-    text += Line(QObject::tr("Toolkit running"), QLatin1String(qVersion()));
+    text += Line(QObject::tr("Built with Qt"), QLatin1String(QT_VERSION_STR));
+    text += Line(QObject::tr("Running with Qt"), QLatin1String(qVersion()));
     text += Line(QObject::tr("Compiler"), Compiler());
-    text += Line(QObject::tr("Built for"), QSysInfo::buildAbi());
+    text += Line(QObject::tr("Build ABI"), QSysInfo::buildAbi());
     text += Line(QObject::tr("System"), QSysInfo::prettyProductName());
     text += Line(QObject::tr("Kernel"),
                  QSysInfo::kernelType() + QLatin1Char(' ') + QSysInfo::kernelVersion());
@@ -168,9 +170,9 @@ QString SystemReport::Facts(QString const& settingsFile)
     text += File(QObject::tr("Settings file"), settingsFile);
     text += File(QObject::tr("Log settings"), LogPreferences::FileName());
     text += File(QObject::tr("Log file"), RunningLog::FileName());
-    text += Line(QObject::tr("Log files"), OlderFiles());
+    text += Line(QObject::tr("Log files"), LogFiles());
     text += Line(QObject::tr("Log"), LogState());
-    text += Line(QObject::tr("Free space for data"), Memory());
+    text += Line(QObject::tr("Free space for data"), AvailableSpace());
     return text;
 }
 
@@ -193,8 +195,8 @@ QString SystemReport::LogTail(int lines)
 QString SystemReport::Whole(QString const& settingsFile)
 {
     const QString time = QDateTime::currentDateTimeUtc().toString(Qt::ISODate);
-    return QObject::tr("Report of %1\n\n").arg(time) + Facts(settingsFile) +
-           QObject::tr("\nThe last %1 lines of the log\n\n").arg(TailLines) + LogTail(TailLines);
+    return QObject::tr("Report created %1\n\n").arg(time) + Facts(settingsFile) +
+           QObject::tr("\nLast %1 lines of the log\n\n").arg(TailLines) + LogTail(TailLines);
 }
 
 } // namespace Velocor

@@ -7,25 +7,26 @@
 
 namespace Velocor {
 
-/// What a bug report needs: versions, system, screens, directories, sizes, and the end of the log.
+/// Information for bug reports: versions, system, screens, directories, sizes, and the end of the
+/// log.
 class SystemReport
 {
 public:
-    /// All but the log, one fact a line.
+    /// Everything but the log, one fact per line.
     ///
     /// @param settingsFile  the window's settings file
     static QString Facts(QString const& settingsFile);
 
-    /// The last lines of the current log, oldest first. Those of the newest run come last, whatever
-    /// stands behind them in the file. The whole file is read to find them.
+    /// The last lines of the current log, oldest first. Those of the newest run come last, even if
+    /// older ones follow in the file. The whole file is read to find them.
     ///
-    /// Of a line longer than LogIndex::LineLimit bytes comes the start, followed by an ellipsis.
+    /// Lines longer than LogIndex::LineLimit bytes are cut and end with an ellipsis.
     static QString LogTail(int lines);
 
-    /// Both under headings.
+    /// The facts and the end of the log, with headings.
     static QString Whole(QString const& settingsFile);
 
-    /// How many lines of the log a whole report has.
+    /// The number of log lines in Whole().
     static constexpr int TailLines = 200;
 };
 

@@ -25,8 +25,8 @@ QString Section()
     return QStringLiteral("MainWindow");
 }
 
-// Whether enough of the rectangle's top is on a screen for the window to be seen and moved.
-bool MeetsAScreen(QRect const& rectangle)
+// Whether enough of the top of the rectangle is on a screen to see and move the window.
+bool IsOnScreen(QRect const& rectangle)
 {
     const QRect top(rectangle.topLeft(), QSize(rectangle.width(), 40));
     const QList<QScreen*> screens = QGuiApplication::screens();
@@ -38,7 +38,7 @@ bool MeetsAScreen(QRect const& rectangle)
     return false;
 }
 
-QRect InTheMiddle(QSize const& size)
+QRect Centered(QSize const& size)
 {
     QScreen const* screen = QGuiApplication::primaryScreen();
     const QRect available = screen ? screen->availableGeometry() : QRect(0, 0, 800, 600);
@@ -47,14 +47,14 @@ QRect InTheMiddle(QSize const& size)
     return rectangle;
 }
 
-// Where the window is not maximised or in full screen, its normal geometry is its geometry.
+// Falls back to geometry(), which differs only for maximized and full-screen windows.
 QRect NormalGeometry(QWidget const* window)
 {
     const QRect normal = window->normalGeometry();
     return normal.isValid() ? normal : window->geometry();
 }
 
-// Values of earlier versions, which left more signs as they are.
+// Decodes values of earlier versions, which escaped fewer characters.
 QString Unescaped(QString const& text)
 {
     QString plain;
@@ -84,11 +84,11 @@ QString WindowSettings::Load()
     const SettingsDocument document = SettingsFileReader::Read(m_fileName);
     if (!document.isReadable) {
         m_mayWrite = false;
-        return QObject::tr("The settings file %1 cannot be read (%2). It is left as it is.")
+        return QObject::tr("Cannot read the settings file %1 (%2). It is left unchanged.")
             .arg(m_fileName, document.error);
     }
     if (!document.isParsed)
-        return putAside();
+        return renameDamagedFile();
 
     for (SettingsDocument::Section const& section : document.sections) {
         for (SettingsDocument::Item const& item : section.items)
@@ -97,7 +97,7 @@ QString WindowSettings::Load()
     return QString();
 }
 
-QString WindowSettings::putAside()
+QString WindowSettings::renameDamagedFile()
 {
     for (int number = 1; number < 1000; ++number) {
         const QString name = QStringLiteral("%1.damaged-%2").arg(m_fileName).arg(number);
@@ -105,13 +105,13 @@ QString WindowSettings::putAside()
             continue;
         if (!QFile::rename(m_fileName, name))
             break;
-        return QObject::tr("The settings file was damaged, so the window starts with its "
-                           "defaults. The damaged file is kept as %1.")
+        return QObject::tr("The settings file was damaged, so default settings are used. "
+                           "The damaged file was kept as %1.")
             .arg(name);
     }
     m_mayWrite = false;
-    return QObject::tr("The settings file %1 is damaged and cannot be put aside. It is left as it "
-                       "is, and changes will not be saved.")
+    return QObject::tr("The settings file %1 is damaged and cannot be renamed. It is left "
+                       "unchanged, and window settings will not be saved.")
         .arg(m_fileName);
 }
 
@@ -135,8 +135,8 @@ void WindowSettings::RestoreGeometry(QWidget* window)
         return;
 
     QRect rectangle(position, size);
-    if (!MeetsAScreen(rectangle))
-        rectangle = InTheMiddle(size);
+    if (!IsOnScreen(rectangle))
+        rectangle = Centered(size);
     window->setGeometry(rectangle);
     if (Flag(QStringLiteral("maximized"), false))
         window->setWindowState(window->windowState() | Qt::WindowMaximized);

@@ -12,12 +12,11 @@ class QWidget;
 
 namespace Velocor {
 
-/// The state of the window between two runs, in the settings file "velocor.cfg" of the data
-/// directory.
+/// The saved state of the window, in the settings file "velocor.cfg" in the data directory.
 ///
-/// The file is read by SettingsFileReader rather than by TorkConfigFile::Load(), whose traces would
-/// come before the first entry of the log. A file that does not parse is put aside under another
-/// name, and is never written over. Keys and values: docs/window.md.
+/// The file is read by SettingsFileReader instead of TorkConfigFile::Load(), which would log traces
+/// before the first entry of the log. A malformed file is renamed and never overwritten. Keys and
+/// values: docs/window.md.
 ///
 ///     WindowSettings settings(dataPath);
 ///     settings.Load();
@@ -30,22 +29,22 @@ public:
 
     /// Reads the file, if there is one.
     ///
-    /// @return what is to be told about a damaged file, for people; empty if all is well
+    /// @return a message for the user about a damaged file; empty on success
     QString Load();
 
-    /// Writes the file and makes its directory.
+    /// Writes the file, creating its directory if necessary.
     ///
-    /// @return the reason of a failure; empty if all is well
+    /// @return the reason for a failure; empty on success
     QString Save();
 
-    /// Moves and sizes a window as it was saved; in the middle of the primary screen if no screen
-    /// shows that place any more, or with its own size if none was saved.
+    /// Restores the saved position and size of a window. Centers it on the primary screen if its
+    /// position is no longer on any screen; leaves it unchanged if nothing was saved.
     void RestoreGeometry(QWidget* window);
 
-    /// Notes a window's geometry. A maximised window keeps its normal one too.
+    /// Stores the geometry of a window; for a maximized window, its normal geometry as well.
     void NoteGeometry(QWidget* window);
 
-    /// Numbers separated by commas: widths of columns, sizes of panes. Empty if there are none.
+    /// Comma-separated numbers: column widths, pane sizes. Empty if missing or invalid.
     QList<int> Numbers(QString const& key);
     void SetNumbers(QString const& key, QList<int> const& numbers);
 
@@ -58,7 +57,7 @@ public:
     QString const& fileName() const { return m_fileName; }
 
 private:
-    QString putAside();
+    QString renameDamagedFile();
 
     QString m_fileName;
     TorkConfigFile m_file;

@@ -297,6 +297,7 @@ private:
     void setFilePrefix(QString const& prefix);
     void setDateTimeFormat(QString const& format);
 
+    // Keeps fork() from leaving a child with a lock that a thread of the parent holds.
     static void registerForkHandlers();
 
     // Each setting that the settings file keeps is followed by its key there. What is atomic can be

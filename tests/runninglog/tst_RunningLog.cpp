@@ -157,7 +157,7 @@ void tst_RunningLog::isKept_data()
 void tst_RunningLog::isKept()
 {
     QFETCH(QString, text);
-    QTEST(LogPreferences::IsKept(text), "expected");
+    QTEST(LogPreferences::IsStorable(text), "expected");
 }
 
 void tst_RunningLog::instances()
@@ -208,7 +208,7 @@ void tst_RunningLog::health()
     LogHealth health;
     QCOMPARE(health.Check(), QString());
     TorkLog::logger()->setEnable(false);
-    QCOMPARE(health.Check(), QString("The log is switched off"));
+    QCOMPARE(health.Check(), QString("Logging is off"));
     TorkLog::logger()->setEnable(true);
     QCOMPARE(health.Check(), QString());
     TorkLog::shutdown();
@@ -221,7 +221,7 @@ void tst_RunningLog::healthDirectoryInTheWay()
     QVERIFY(QDir().mkpath(test.logFile()));
     TorkLog::logger()->trace("lost");
     LogHealth health;
-    QVERIFY2(health.Check().startsWith("The log cannot be written: "), qPrintable(health.Check()));
+    QVERIFY2(health.Check().startsWith("Cannot write the log: "), qPrintable(health.Check()));
     QVERIFY(QDir(test.logFile()).removeRecursively());
     TorkLog::logger()->trace("kept");
     QCOMPARE(health.Check(), QString());

@@ -87,19 +87,20 @@ void tst_SettingsFile::read_data()
     row("comment", "<S><!-- why --><a>v</a></S>", "[S] a=v", 1, "Line 2: the comment \"why\"");
     row("nesting", "<S><a>v<deep>w</deep></a></S>", "[S] a=v", 2,
         "Line 2: the nesting of the element \"deep\"");
-    row("element without text", "<S><a></a></S>", "[S]", 1, "Line 2: \"a\", which has no text");
-    row("empty element", "<S><a/></S>", "[S]", 1, "Line 2: \"a\", which has no text");
+    row("element without text", "<S><a></a></S>", "[S]", 1, "Line 2: the empty item \"a\"");
+    row("empty element", "<S><a/></S>", "[S]", 1, "Line 2: the empty item \"a\"");
     row("key twice", "<S><a>1</a><a>2</a></S>", "[S] a=2", 1,
-        "Line 2: a second value of \"a\", in the place of the first");
+        "Line 2: the first value of \"a\", replaced by a second one");
     row("section twice", "<S><a>1</a></S><S><b>2</b></S>", "[S] a=1 b=2", 1,
         "Line 2: a second section \"S\", merged with the first");
     row("text in a section", "<S>text<a>1</a></S>", "[S] a=1", 1,
-        "Line 2: the text \"text\" outside of values");
-    row("instruction", "<?do it?><S><a>1</a></S>", "[S] a=1", 1, "Line 2: the instruction \"do\"");
+        "Line 2: the text \"text\" outside any value");
+    row("instruction", "<?do it?><S><a>1</a></S>", "[S] a=1", 1,
+        "Line 2: the processing instruction \"do\"");
     row("section name beyond ASCII", "<\xC3\xA9><a>1</a></\xC3\xA9>", "[\xEF\xBF\xBD] a=1", 1,
         "Line 2: the name of the section \"\xC3\xA9\"");
-    row("section called like the root", "<R><a>1</a></R>", "", 2,
-        "Line 2: the element \"R\", which is called like the root");
+    row("section named like the root", "<R><a>1</a></R>", "", 2,
+        "Line 2: the element \"R\", which has the same name as the root element");
     QTest::newRow("declaration") << QByteArray("<?xml version=\"1.0\"?><R><S><a>1</a></S></R>")
                                  << "[S] a=1" << 1 << "Line 1: the XML declaration";
 }
@@ -126,7 +127,7 @@ void tst_SettingsFile::readsWhatTheStoreReads_data()
     QTest::newRow("nested") << QByteArray("<S><a><b>1</b></a><c>2</c></S>");
     QTest::newRow("nested after a text") << QByteArray("<S><a>0<b>1</b></a></S>");
     QTest::newRow("no text") << QByteArray("<S><a/></S><T>text<b>1</b></T>");
-    QTest::newRow("called like the root") << QByteArray("<R><a>1</a></R><S><R>2</R><b>3</b></S>");
+    QTest::newRow("named like the root") << QByteArray("<R><a>1</a></R><S><R>2</R><b>3</b></S>");
     QTest::newRow("comment in a value") << QByteArray("<S><a>x<!-- c -->y</a></S>");
     QTest::newRow("comment before a value") << QByteArray("<S><a><!-- c -->y</a></S>");
     QTest::newRow("long value") << "<S><a>" + QByteArray(100000, 'x') + "</a></S>";
@@ -246,21 +247,19 @@ void tst_SettingsFile::lossesOfNames_data()
     QTest::addColumn<QStringList>("expected");
     QTest::newRow("names") << "S"
                            << "k" << QStringList();
-    QTest::newRow("blank in a key")
-        << "S"
-        << "a b" << QStringList("S / a b: the key is no name that the store can write");
-    QTest::newRow("blank in a section")
-        << "A B"
-        << "k" << QStringList("A B: the section has no name that the store can write");
+    QTest::newRow("blank in a key") << "S"
+                                    << "a b" << QStringList("S / a b: the key is not a valid name");
+    QTest::newRow("blank in a section") << "A B"
+                                        << "k" << QStringList("A B: the section name is not valid");
     QTest::newRow("section without a name")
         << ""
-        << "k" << QStringList(": the section has no name that the store can write");
+        << "k" << QStringList(": the section name is not valid");
     QTest::newRow("section called as the root")
         << "Root"
         << "k" << QStringList("Root: the section has the same name as the root element");
     QTest::newRow("key called as the root")
         << "S"
-        << "Root" << QStringList("S / Root: the value would read differently afterwards");
+        << "Root" << QStringList("S / Root: the value would change when read back");
 }
 
 void tst_SettingsFile::lossesOfNames()

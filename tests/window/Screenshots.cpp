@@ -36,8 +36,8 @@ QByteArray const SettingsText("<?xml version=\"1.0\"?>\n"
                               "<VelocorSettings>\n"
                               "<!-- kept by hand -->\n"
                               "<Editor><font>DejaVu Sans,10</font><wrap>yes</wrap></Editor>\n"
-                              "<Colours><marker>255,193,77</marker><paper>250,250,245</paper>\n"
-                              "<ink>30,30,30</ink></Colours>\n"
+                              "<Colors><marker>255,193,77</marker><paper>250,250,245</paper>\n"
+                              "<ink>30,30,30</ink></Colors>\n"
                               "<Network><proxy>none</proxy><timeout>30</timeout></Network>\n"
                               "</VelocorSettings>\n");
 

@@ -151,7 +151,7 @@ QByteArray LongValue()
 }
 
 // The longest text that the tree has to measure.
-int LongestCell(QTreeWidget const* tree)
+int MaximumCellLength(QTreeWidget const* tree)
 {
     int longest = 0;
     QTreeWidgetItemIterator item(const_cast<QTreeWidget*>(tree));
@@ -311,7 +311,8 @@ void tst_HostileFiles::windowSettings()
         const auto window = WindowTest::show();
         QTRY_VERIFY(window->findChild<NoticeBar*>());
         const QString told = window->findChild<NoticeBar*>()->text();
-        QVERIFY2(told.contains(test.settingsFile() + " cannot be read (Not a regular file)"),
+        QVERIFY2(told.contains("Cannot read the settings file " + test.settingsFile() +
+                               " (Not a regular file)"),
                  qPrintable(told));
         window->close();
     }
@@ -358,12 +359,12 @@ void tst_HostileFiles::recentFilesAreCapped_data()
 {
     QTest::addColumn<QString>("list");
     QTest::addColumn<QString>("kept");
-    const QString most(RecentFiles::LongestPath, 'x');
+    const QString most(RecentFiles::MaximumPathLength, 'x');
     QTest::newRow("nothing") << ""
                              << "";
     QTest::newRow("only separators") << QString(1700000, '|') << "";
     QTest::newRow("many") << QString("/a|").repeated(600000)
-                          << "/a" + QString("|/a").repeated(RecentFiles::MostFiles - 1);
+                          << "/a" + QString("|/a").repeated(RecentFiles::MaximumFiles - 1);
     QTest::newRow("one long") << QString(1700000, 'x') << "";
     QTest::newRow("as long as may be") << most << most;
     QTest::newRow("too long by one") << most + "x|/b"
@@ -380,7 +381,7 @@ void tst_HostileFiles::recentFilesAreCapped()
     recent.SetList(list);
     QTEST(recent.list(), "kept");
     recent.SetList("/a");
-    recent.Add('/' + QString(RecentFiles::LongestPath, 'x'));
+    recent.Add('/' + QString(RecentFiles::MaximumPathLength, 'x'));
     QCOMPARE(recent.list(), QString("/a"));
 }
 
@@ -403,7 +404,7 @@ void tst_HostileFiles::recentFilesInTheWindow()
         const auto window = WindowTest::show();
         QTRY_VERIFY(Action(*window, "Open Recent"));
         QCOMPARE(Action(*window, "Open Recent")->menu()->actions().size(),
-                 RecentFiles::MostFiles + 2);
+                 RecentFiles::MaximumFiles + 2);
         window->close();
     }
     QVERIFY(QFileInfo(test.settingsFile()).size() < 2000);
@@ -423,7 +424,7 @@ void tst_HostileFiles::longValueIsShownShortened()
     const QString shown = tree->topLevelItem(0)->child(0)->text(1);
     QVERIFY2(shown.startsWith("0 1 2 3 ") && shown.endsWith(QChar(0x2026) + QString(" (10 MB)")),
              qPrintable(shown.left(300)));
-    QVERIFY(LongestCell(tree) <= 1000);
+    QVERIFY(MaximumCellLength(tree) <= 1000);
     QCOMPARE(editor.document().Value("S", "long", ""), QString::fromLatin1(value));
     QVERIFY(!editor.isModified());
 }
@@ -472,7 +473,7 @@ void tst_HostileFiles::longValueSurvivesOtherEdits()
     QVERIFY(!editor->isModified());
     const QByteArray expected = WithValue(value, "yes").replace("long>", "renamed>");
     QVERIFY(TestFiles::read(file) == expected);
-    QVERIFY(LongestCell(tree) <= 1000);
+    QVERIFY(MaximumCellLength(tree) <= 1000);
 }
 
 void tst_HostileFiles::longValueIsEdited_data()
@@ -523,7 +524,7 @@ void tst_HostileFiles::longValueIsEdited()
     QTRY_VERIFY_WITH_TIMEOUT(editor->isModified(), Patience);
     QTest::qWait(50);
     QVERIFY(!QApplication::activeModalWidget());
-    QVERIFY(LongestCell(tree) <= 1000);
+    QVERIFY(MaximumCellLength(tree) <= 1000);
     window->activateWindow();
     QVERIFY(QTest::qWaitForWindowActive(window.get()));
     QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
@@ -572,7 +573,7 @@ void tst_HostileFiles::longValueIsPasted()
     auto* tree = editor.findChild<QTreeWidget*>();
     const QString pasted = QString("p").repeated(5000);
     tree->topLevelItem(0)->child(0)->setText(1, pasted); // as a cell's editor does
-    QVERIFY(LongestCell(tree) <= 1000);
+    QVERIFY(MaximumCellLength(tree) <= 1000);
     QCOMPARE(editor.document().Value("S", "long", ""), pasted);
     QVERIFY(editor.Save());
     QCOMPARE(TestFiles::read(file), WithValue(pasted.toLatin1()));
@@ -591,7 +592,7 @@ void tst_HostileFiles::longName()
     editor.resize(700, 500);
     editor.show();
     auto* tree = editor.findChild<QTreeWidget*>();
-    QVERIFY(LongestCell(tree) <= 1000);
+    QVERIFY(MaximumCellLength(tree) <= 1000);
     tree->setCurrentItem(tree->topLevelItem(0)->child(0), 0);
     QTest::keyClick(tree, Qt::Key_F2);
     QTest::qWait(50);
@@ -623,7 +624,7 @@ void tst_HostileFiles::valueDialog_data()
 {
     QTest::addColumn<QString>("value");
     QTest::addColumn<bool>("inPieces");
-    const QString longLine(Velocor::ValueDialog::LongestLine + 1, 'x');
+    const QString longLine(Velocor::ValueDialog::MaximumLineLength + 1, 'x');
     QTest::newRow("empty") << "" << false;
     QTest::newRow("lines") << "a\nb\n\nc\n" << false;
     QTest::newRow("no-break space") << QString("a") + QChar(0xa0) + "b" << false;
@@ -651,12 +652,12 @@ void tst_HostileFiles::valueDialog()
     QVERIFY(dialog.isModified());
     QVERIFY(dialog.value() == "a\n" + value);
     for (QTextBlock block = text->document()->begin(); block.isValid(); block = block.next())
-        QVERIFY(block.length() <= Velocor::ValueDialog::LongestLine + 1);
+        QVERIFY(block.length() <= Velocor::ValueDialog::MaximumLineLength + 1);
 }
 
 void tst_HostileFiles::valueDialogPastes()
 {
-    const QString value(Velocor::ValueDialog::LongestLine + 1, 'x');
+    const QString value(Velocor::ValueDialog::MaximumLineLength + 1, 'x');
     const QString pasted = QString("p").repeated(20000) + "\nq";
     Velocor::ValueDialog dialog("name", value);
     dialog.show();

@@ -187,7 +187,7 @@ void tst_LogInWindow::filterByExpression()
     QTest::keyClicks(QApplication::focusWidget(), "x (3|4)$");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
 
-    auto const* error = Child<QLabel>(window.get(), "Error in the filter");
+    auto const* error = Child<QLabel>(window.get(), "Filter error");
     QVERIFY(!error->isVisible());
     QTest::keyClicks(QApplication::focusWidget(), "(");
     QTRY_VERIFY(error->isVisible());
@@ -244,7 +244,7 @@ void tst_LogInWindow::copiesLines()
     QTest::keyClick(view, Qt::Key_A, Qt::ControlModifier);
     QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
     QCOMPARE(QGuiApplication::clipboard()->text(), QString(log));
-    QCOMPARE(window->statusBar()->currentMessage(), QString("20 line(s) copied"));
+    QCOMPARE(window->statusBar()->currentMessage(), QString("20 lines copied"));
 }
 
 // From the menu too, a focused text field takes precedence over the log.
@@ -257,7 +257,7 @@ void tst_LogInWindow::copiesFromTheMenu()
     View(*window)->clearSelection();
     window->setFocus();
     Action(*window, "Copy")->trigger();
-    QCOMPARE(window->statusBar()->currentMessage(), QString("No line is selected"));
+    QCOMPARE(window->statusBar()->currentMessage(), QString("No lines selected"));
     Action(*window, "Select All")->trigger();
     Action(*window, "Copy")->trigger();
     QCOMPARE(QGuiApplication::clipboard()->text(), QString(log));
@@ -283,11 +283,11 @@ void tst_LogInWindow::problems()
     QCOMPARE(View(*window)->currentIndex().row(), 3);
     QTest::keyClick(window.get(), Qt::Key_F8);
     QCOMPARE(View(*window)->currentIndex().row(), 3);
-    QCOMPARE(window->statusBar()->currentMessage(), QString("No further warning or error below"));
+    QCOMPARE(window->statusBar()->currentMessage(), QString("No more warnings or errors below"));
     QTest::keyClick(window.get(), Qt::Key_F8, Qt::ShiftModifier);
     QCOMPARE(View(*window)->currentIndex().row(), 1);
     QTest::keyClick(window.get(), Qt::Key_F8, Qt::ShiftModifier);
-    QCOMPARE(window->statusBar()->currentMessage(), QString("No further warning or error above"));
+    QCOMPARE(window->statusBar()->currentMessage(), QString("No more warnings or errors above"));
 }
 
 void tst_LogInWindow::currentLine()
@@ -298,7 +298,7 @@ void tst_LogInWindow::currentLine()
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
     QTest::mouseClick(View(*window)->viewport(), Qt::LeftButton, Qt::NoModifier,
                       RowCentre(View(*window), 0));
-    auto const* line = Child<QPlainTextEdit>(window.get(), "The current line in full");
+    auto const* line = Child<QPlainTextEdit>(window.get(), "Full text of the current line");
     QVERIFY(line->toPlainText().endsWith("yyy end"));
 }
 
@@ -379,7 +379,7 @@ void tst_LogInWindow::logSettings()
     const WindowTest test(run(1, QTime(9, 0), "x"));
     const auto window = WindowTest::show();
     WindowTest::whenShown<LogSettingsDialog>([&](LogSettingsDialog* dialog) {
-        Child<QSpinBox>(dialog, "Older files kept")->setValue(5);
+        Child<QSpinBox>(dialog, "Older files to keep")->setValue(5);
         const QList<QCheckBox*> boxes = dialog->findChildren<QCheckBox*>();
         for (QCheckBox* box : boxes) {
             if (box->text().contains("time since"))
@@ -388,8 +388,8 @@ void tst_LogInWindow::logSettings()
         auto* format = Child<QLineEdit>(dialog, "Date format");
         format->selectAll();
         QTest::keyClicks(format, "'at' hh:mm");
-        QVERIFY(Child<QLabel>(dialog, "Sample of an entry")->text().startsWith("at "));
-        QVERIFY(Child<QLabel>(dialog, "Sample of an entry")->text().contains("dT:[250]"));
+        QVERIFY(Child<QLabel>(dialog, "Sample entry")->text().startsWith("at "));
+        QVERIFY(Child<QLabel>(dialog, "Sample entry")->text().contains("dT:[250]"));
         QTest::keyClick(format, Qt::Key_Return);
     });
     QTest::keyClick(window.get(), Qt::Key_Comma, Qt::ControlModifier);
@@ -411,12 +411,12 @@ void tst_LogInWindow::logSettingsRefused()
     QAbstractButton* ok = dialog.findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Ok);
     QVERIFY(ok->isEnabled());
     for (char const* bad : {"", "a/b", "..", "\xC3\xA4"}) {
-        Child<QLineEdit>(&dialog, "Name of the log files")->setText(QString::fromUtf8(bad));
+        Child<QLineEdit>(&dialog, "Log file name")->setText(QString::fromUtf8(bad));
         QVERIFY2(!ok->isEnabled(), bad);
         dialog.accept();
         QVERIFY(dialog.isVisible());
     }
-    QVERIFY(!Child<QLabel>(&dialog, "Problem with the settings")->text().isEmpty());
+    QVERIFY(!Child<QLabel>(&dialog, "Settings problem")->text().isEmpty());
     dialog.reject();
     QCOMPARE(TestFiles::read(test.folder() + "data/logs/logsettings.cfg"), before);
 }
@@ -427,7 +427,7 @@ void tst_LogInWindow::logSwitchedOff()
     TorkLog::logger()->setEnable(false);
     const auto window = WindowTest::show();
     auto const* state = Child<QLabel>(window.get(), "State of the log");
-    QTRY_COMPARE_WITH_TIMEOUT(state->text(), QString("The log is switched off"), Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(state->text(), QString("Logging is off"), Patience);
     TorkLog::logger()->setEnable(true);
     QTRY_COMPARE_WITH_TIMEOUT(state->text(), QString(), Patience);
 }

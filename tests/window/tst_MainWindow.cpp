@@ -260,7 +260,7 @@ void tst_MainWindow::forgetsMissingFile()
     QVERIFY(!menu->isEnabled());
     QCOMPARE(window->findChild<FileTabs*>()->count(), 1);
     window->OpenFile(test.folder() + "never there");
-    QVERIFY(window->statusBar()->currentMessage().startsWith("There is no file"));
+    QVERIFY(window->statusBar()->currentMessage().endsWith(" does not exist"));
 }
 
 void tst_MainWindow::dropsFiles()
@@ -303,7 +303,7 @@ void tst_MainWindow::about()
     });
     QTest::keyClick(window.get(), Qt::Key_F1);
     const QString copied = QGuiApplication::clipboard()->text();
-    QVERIFY2(copied.contains("Toolkit running: ") && copied.contains(test.logFile()),
+    QVERIFY2(copied.contains("Running with Qt: ") && copied.contains(test.logFile()),
              qPrintable(copied));
 }
 
@@ -379,7 +379,7 @@ void tst_MainWindow::damagedState()
     QVERIFY(notice->isVisible());
     QVERIFY2(notice->text().contains(test.settingsFile() + ".damaged-1"),
              qPrintable(notice->text()));
-    Click(Child<QPushButton>(notice, "Dismiss the notice"));
+    Click(Child<QPushButton>(notice, "Dismiss notice"));
     QVERIFY(!notice->isVisible());
     window->close();
     QCOMPARE(TestFiles::read(test.settingsFile() + ".damaged-1"),

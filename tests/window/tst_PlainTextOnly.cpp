@@ -428,7 +428,7 @@ void tst_PlainTextOnly::statusText()
         [&] {
             const QList<QLabel*> labels = window->statusBar()->findChildren<QLabel*>();
             return std::any_of(labels.begin(), labels.end(), [](QLabel const* label) {
-                return label->text().startsWith("The log cannot be written") &&
+                return label->text().startsWith("Cannot write the log") &&
                        Displayed(label->toolTip()) == label->text();
             });
         }(),
@@ -478,14 +478,14 @@ void tst_PlainTextOnly::lossBox()
     QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
     QCOMPARE(breaches.join('\n'), QString());
     QVERIFY2(text.contains("the comment \"" + markup.left(20)), qPrintable(text));
-    QVERIFY2(text.contains(markup + ".cfg would lose this"), qPrintable(text));
+    QVERIFY2(text.contains(markup + ".cfg would lose:"), qPrintable(text));
 
     // The window asks before it closes.
     breaches = QStringList("no box");
     LookAtNextBox(&breaches, &text);
     QVERIFY(!window->close());
     QCOMPARE(breaches.join('\n'), QString());
-    QCOMPARE(text, markup + ".cfg has been changed. Save it?\n");
+    QCOMPARE(text, "Save changes to " + markup + ".cfg?\n");
     QVERIFY(window->findChild<FileTabs*>()->currentEditor());
 }
 
@@ -522,7 +522,7 @@ void tst_PlainTextOnly::boxesOfTheEditor()
     LookAtNextBox(&breaches, &text);
     QVERIFY(!editor.Save());
     QCOMPARE(breaches.join('\n'), QString());
-    QVERIFY2(text.contains(markup + ".cfg has been changed"), qPrintable(text));
+    QVERIFY2(text.contains(markup + ".cfg was changed"), qPrintable(text));
 
     // The file cannot be saved.
     QVERIFY(QFile::remove(settings));
@@ -531,7 +531,7 @@ void tst_PlainTextOnly::boxesOfTheEditor()
     LookAtNextBox(&breaches, &text);
     QVERIFY(!editor.Save());
     QCOMPARE(breaches.join('\n'), QString());
-    QVERIFY2(text.contains(settings + " was not saved"), qPrintable(text));
+    QVERIFY2(text.contains("Could not save " + settings), qPrintable(text));
 }
 
 void tst_PlainTextOnly::boxAboutAMissingFile()
@@ -606,7 +606,7 @@ void tst_PlainTextOnly::notices()
     const QList<NoticeBar*> bars = window->findChildren<NoticeBar*>();
     for (NoticeBar const* bar : bars)
         notices.append(bar->text());
-    QVERIFY2(notices.join('\n').contains(place.settings + " is not shown as a tree"),
+    QVERIFY2(notices.join('\n').contains("Cannot show " + place.settings + " as a tree"),
              qPrintable(notices.join('\n')));
     QVERIFY2(notices.join('\n').contains(place.folder + "velocor.cfg.damaged-1"),
              qPrintable(notices.join('\n')));

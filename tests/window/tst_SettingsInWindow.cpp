@@ -172,7 +172,7 @@ void tst_SettingsInWindow::brokenSettings()
     auto* editor = window->findChild<FileTabs*>()->currentEditor();
     const QString told = editor->findChild<NoticeBar*>()->text();
     QVERIFY2(told.contains("tag mismatch") && told.contains("line 3, column"), qPrintable(told));
-    auto const* text = Child<QPlainTextEdit>(editor, "The file as text");
+    auto const* text = Child<QPlainTextEdit>(editor, "File text");
     QVERIFY(text->isVisible() && text->isReadOnly());
     QCOMPARE(text->toPlainText(), QString(broken));
     QCOMPARE(text->textCursor().blockNumber(), 2);

@@ -205,7 +205,7 @@ void tst_WindowAccessibility::tabOrder()
                           "Regular expression", "Show Trace", "Show Notification", "Show Warning",
                           "Show Error", "Show Fatal"}));
     QVERIFY(order.contains("Log entries"));
-    QVERIFY(order.contains("The current line in full"));
+    QVERIFY(order.contains("Full text of the current line"));
     QVERIFY(order.contains("Copy: Organization"));
     QVERIFY(order.size() < 60);
 }

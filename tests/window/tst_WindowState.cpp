@@ -248,7 +248,7 @@ void tst_WindowState::recentFiles()
     QCOMPARE(recent.list(), QString("/b"));
     for (int i = 0; i < 20; ++i)
         recent.Add(QString("/%1").arg(i));
-    QCOMPARE(recent.list().split('|').size(), int(RecentFiles::MostFiles));
+    QCOMPARE(recent.list().split('|').size(), int(RecentFiles::MaximumFiles));
     recent.Clear();
     QCOMPARE(recent.list(), QString());
     QVERIFY(!menu.isEnabled());
@@ -322,7 +322,7 @@ void tst_WindowState::report()
 
     const QString facts = SystemReport::Facts(test.settingsFile());
     for (QString const& expected :
-         {QString("Program: Velocor "), QString("Toolkit running: ") + qVersion(),
+         {QString("Program: Velocor "), QString("Running with Qt: ") + qVersion(),
           QString("Organization: Org\n"), QString("Product: Product\n"), QString("Locale: "),
           QString("Style: "), QString("Screen 1: "), "Data: " + test.folder() + "data/ (",
           "Log file: " + test.logFile() + " ("})
@@ -364,7 +364,7 @@ void tst_WindowState::severityIcons()
         // Trace has the color of the text, which is the same in both here.
         const bool isSame = severity == LogEntry::Trace;
         QCOMPARE(image(light) == image(dark), isSame);
-        QCOMPARE(SeverityIcons::Colour(severity, light) == SeverityIcons::Colour(severity, dark),
+        QCOMPARE(SeverityIcons::Color(severity, light) == SeverityIcons::Color(severity, dark),
                  isSame);
     }
 }

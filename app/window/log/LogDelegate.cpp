@@ -14,7 +14,7 @@ namespace Velocor {
 
 namespace {
 
-QColor Mixed(QColor const& a, QColor const& b, qreal share)
+QColor Blended(QColor const& a, QColor const& b, qreal share)
 {
     return QColor::fromRgbF(a.redF() * (1 - share) + b.redF() * share,
                             a.greenF() * (1 - share) + b.greenF() * share,
@@ -26,7 +26,7 @@ QStyle const* StyleOf(QStyleOptionViewItem const& option)
     return option.widget ? option.widget->style() : QApplication::style();
 }
 
-// Dark letters on yellow, readable on any background, and underlined for whom yellow is no mark.
+// Dark text on yellow, readable on any background; underlined for users who cannot see yellow.
 QTextCharFormat MarkFormat()
 {
     QTextCharFormat format;
@@ -52,10 +52,10 @@ void LogDelegate::initStyleOption(QStyleOptionViewItem* option, QModelIndex cons
     const auto severity =
         static_cast<LogEntry::Severity>(index.data(LogModel::SeverityRole).toInt());
     if (index.data(LogModel::EarlierRole).toBool())
-        option->backgroundBrush = Mixed(option->palette.color(QPalette::Base),
-                                        option->palette.color(QPalette::Text), 0.045);
+        option->backgroundBrush = Blended(option->palette.color(QPalette::Base),
+                                          option->palette.color(QPalette::Text), 0.045);
     if (index.column() == LogModel::SeverityColumn)
-        option->palette.setColor(QPalette::Text, SeverityIcons::Colour(severity, option->palette));
+        option->palette.setColor(QPalette::Text, SeverityIcons::Color(severity, option->palette));
 }
 
 void LogDelegate::paint(QPainter* painter, QStyleOptionViewItem const& option,
@@ -68,7 +68,7 @@ void LogDelegate::paint(QPainter* painter, QStyleOptionViewItem const& option,
         return;
     }
 
-    // In the severity column the icon says it, and the filter does not look at translated names.
+    // Not in the severity column, because the filter does not search translated names.
     const bool isMarkable = index.column() != LogModel::SeverityColumn;
     const QVector<QPair<int, int>> ranges =
         isMarkable ? m_filter.Ranges(cell.text) : QVector<QPair<int, int>>();
@@ -81,7 +81,7 @@ void LogDelegate::paint(QPainter* painter, QStyleOptionViewItem const& option,
 void LogDelegate::paintHeading(QPainter* painter, QStyleOptionViewItem const& option)
 {
     const QColor text = option.palette.color(QPalette::Text);
-    const QColor background = Mixed(option.palette.color(QPalette::Base), text, 0.14);
+    const QColor background = Blended(option.palette.color(QPalette::Base), text, 0.14);
     painter->save();
     painter->fillRect(option.rect, background);
     painter->setFont(option.font);

@@ -9,8 +9,8 @@
 
 namespace Velocor {
 
-/// Draws the cells of a log view: headings between runs, colours of severities, and the places
-/// where the filter's text was found.
+/// Draws the cells of a log view: headings between runs, severity colors, and highlighted matches
+/// of the filter text.
 class LogDelegate : public QStyledItemDelegate
 {
     Q_OBJECT
@@ -18,7 +18,7 @@ class LogDelegate : public QStyledItemDelegate
 public:
     explicit LogDelegate(QObject* parent = nullptr);
 
-    /// Marks what this filter finds.
+    /// Highlights the matches of this filter.
     void SetFilter(LogFilter const& filter) { m_filter = filter; }
 
     void paint(QPainter* painter, QStyleOptionViewItem const& option,

@@ -28,16 +28,16 @@ LogFilterBar::LogFilterBar(QWidget* parent)
     m_text->setPlaceholderText(tr("Filter"));
     m_text->setClearButtonEnabled(true);
     m_text->setAccessibleName(tr("Filter by text"));
-    m_text->setAcceptDrops(false); // files dropped here are for the window
+    m_text->setAcceptDrops(false); // leave dropped files to the window
     m_text->setToolTip(PlainToolTip(tr("Show only lines that contain this text (Ctrl+F)")));
-    m_error->setAccessibleName(tr("Error in the filter"));
+    m_error->setAccessibleName(tr("Filter error"));
     m_error->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
     m_error->setWordWrap(true);
     m_error->hide();
 
-    m_case = makeOption(tr("Aa"), tr("Match case"), tr("Tell capital letters from small ones"));
+    m_case = makeOption(tr("Aa"), tr("Match case"), tr("Match case"));
     m_expression = makeOption(tr(".*"), tr("Regular expression"),
-                              tr("The text is a regular expression, matched against whole lines"));
+                              tr("Search each line with a regular expression"));
 
     auto* row = new QHBoxLayout;
     row->setSpacing(6);
@@ -67,7 +67,7 @@ QCheckBox* LogFilterBar::makeOption(QString const& text, QString const& name,
 {
     auto* option = new QCheckBox(text);
     option->setAccessibleName(name);
-    option->setToolTip(PlainToolTip(name + QLatin1String(": ") + toolTip));
+    option->setToolTip(PlainToolTip(toolTip));
     connect(option, &QCheckBox::toggled, this, &LogFilterBar::apply);
     return option;
 }
@@ -83,7 +83,7 @@ void LogFilterBar::addSeverities()
         button->setText(name);
         button->setAccessibleName(tr("Show %1").arg(name));
         button->setToolTip(
-            PlainToolTip(tr("Show or hide entries of severity %1 (Ctrl+%2)").arg(name).arg(i + 1)));
+            PlainToolTip(tr("Show or hide %1 entries (Ctrl+%2)").arg(name).arg(i + 1)));
         button->setShortcut(QKeySequence(Qt::CTRL | (Qt::Key_1 + i)));
         button->setToolButtonStyle(Qt::ToolButtonIconOnly);
         connect(button, &QToolButton::toggled, this, &LogFilterBar::apply);
@@ -129,14 +129,14 @@ void LogFilterBar::SetEarlierRuns(bool shown)
 void LogFilterBar::apply()
 {
     if (m_severities.size() < LogEntry::None)
-        return; // while the controls are being made
+        return; // controls are not complete yet
     m_typing.stop();
     for (int i = 0; i < m_severities.size(); ++i)
         m_filter.SetSeverity(static_cast<LogEntry::Severity>(i), m_severities.at(i)->isChecked());
 
     const bool isExpression = m_expression->isChecked();
     const QString error = isExpression ? LogFilter::ErrorOf(m_text->text()) : QString();
-    m_error->setText(tr("Not a valid expression: %1").arg(error));
+    m_error->setText(tr("Invalid regular expression: %1").arg(error));
     m_error->setVisible(!error.isEmpty());
     m_filter.SetText(m_text->text(), isExpression, m_case->isChecked());
     Q_EMIT filterChanged();

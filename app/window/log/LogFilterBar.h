@@ -15,7 +15,7 @@ class QToolButton;
 
 namespace Velocor {
 
-/// The controls of a log view's filter: a text, how it is meant, and one button per severity.
+/// The filter controls of a log view: text, match options, and one button per severity.
 class LogFilterBar : public QWidget
 {
     Q_OBJECT
@@ -23,13 +23,13 @@ class LogFilterBar : public QWidget
 public:
     explicit LogFilterBar(QWidget* parent = nullptr);
 
-    /// The filter that the controls say; with the last valid expression while one is being typed.
+    /// The current filter; while an invalid expression is entered, with the last valid one.
     LogFilter const& filter() const { return m_filter; }
 
-    /// Puts the keyboard into the text field and selects what is there.
+    /// Focuses the text field and selects its text.
     void FocusText();
 
-    /// Takes every restriction away.
+    /// Resets the text and the severities.
     void Clear();
 
     void SetEarlierRuns(bool shown);

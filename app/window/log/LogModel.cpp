@@ -18,7 +18,7 @@ namespace Velocor {
 
 namespace {
 
-// Control characters would break rows or vanish.
+// Control characters would break rows or be invisible.
 QString OnOneLine(QString text)
 {
     for (QChar& c : text) {
@@ -40,12 +40,12 @@ LogModel::LogModel(QObject* parent) : QAbstractTableModel(parent), m_entries(100
 LogModel::~LogModel()
 {
     if (m_scanner)
-        m_scanner->Want(-1);
+        m_scanner->SetCurrentRequest(-1);
     m_thread.quit();
     m_thread.wait();
 }
 
-// Only when there is something to read: a thread costs the start-up time.
+// Not in the constructor, because starting a thread slows down startup.
 void LogModel::startScanner()
 {
     if (m_scanner)
@@ -53,9 +53,9 @@ void LogModel::startScanner()
     m_scanner = new LogScanner;
     m_scanner->moveToThread(&m_thread);
     connect(&m_thread, &QThread::finished, m_scanner, &QObject::deleteLater);
-    connect(this, &LogModel::openWanted, m_scanner, &LogScanner::Open);
-    connect(this, &LogModel::filterWanted, m_scanner, &LogScanner::SetFilter);
-    connect(this, &LogModel::pollWanted, m_scanner, &LogScanner::Poll);
+    connect(this, &LogModel::openRequested, m_scanner, &LogScanner::Open);
+    connect(this, &LogModel::filterRequested, m_scanner, &LogScanner::SetFilter);
+    connect(this, &LogModel::pollRequested, m_scanner, &LogScanner::Poll);
     connect(m_scanner, &LogScanner::updated, this, &LogModel::take);
     connect(m_scanner, &LogScanner::polled, this, [this] { m_polling = false; });
     connect(m_scanner, &LogScanner::progressed, this, [this](int request, int percent) {
@@ -79,8 +79,8 @@ void LogModel::Reload()
         return;
     startScanner();
     m_reading = true;
-    m_scanner->Want(++m_request);
-    Q_EMIT openWanted(m_request, m_path, m_parser, m_filter);
+    m_scanner->SetCurrentRequest(++m_request);
+    Q_EMIT openRequested(m_request, m_path, m_parser, m_filter);
     if (!m_paused)
         m_pollTimer.start();
 }
@@ -91,8 +91,8 @@ void LogModel::SetFilter(LogFilter const& filter)
     if (!m_scanner)
         return;
     m_reading = true;
-    m_scanner->Want(++m_request);
-    Q_EMIT filterWanted(m_request, m_filter);
+    m_scanner->SetCurrentRequest(++m_request);
+    Q_EMIT filterRequested(m_request, m_filter);
 }
 
 void LogModel::SetPaused(bool paused)
@@ -111,7 +111,7 @@ void LogModel::poll()
     if (m_polling || m_reading)
         return;
     m_polling = true;
-    Q_EMIT pollWanted();
+    Q_EMIT pollRequested();
 }
 
 void LogModel::take(LogUpdate const& update)
@@ -139,8 +139,8 @@ void LogModel::reset(LogUpdate const& update)
     endResetModel();
 }
 
-// First the earlier part, whose first rows the newest run writes over, then the new rows at the
-// end. In between, the new rows without those at the end are what views see.
+// First the earlier runs, whose first rows the newest run overwrites, then the new rows at the end.
+// In between, views see the new rows except those at the end.
 void LogModel::applyChange(LogUpdate const& update)
 {
     const int at = static_cast<int>(update.changeAt);
@@ -262,7 +262,7 @@ QString LogModel::toolTip(int row, int column) const
     if (isHeading(row))
         return QString();
     if (m_state.rows->marks[static_cast<size_t>(row)] & LogRows::Torn)
-        return tr("What is left of an entry that a later run wrote over");
+        return tr("Remainder of an entry that a later run overwrote");
     if (column != MessageColumn)
         return QString();
     return cellText(row, column);

@@ -21,8 +21,8 @@ class LogScanner;
 /// A log file as a table, live: time, severity, elapsed time and message of each line, oldest
 /// first.
 ///
-/// Lines are read from the file when a view asks for them; all searching is done by a LogScanner in
-/// another thread. Heading rows stand between the runs. GUI thread.
+/// Lines are read from the file when a view needs them; all searching is done by a LogScanner in
+/// another thread. Heading rows separate the runs. GUI thread.
 ///
 ///     LogModel model;
 ///     model.Open(TorkLog::logger()->newLogFileName(), LogLineParser());
@@ -36,35 +36,35 @@ public:
     enum Role {
         SeverityRole = Qt::UserRole, ///< a LogEntry::Severity
         HeadingRole,                 ///< whether the row is a heading
-        EarlierRole                  ///< whether the row is of an earlier run
+        EarlierRole                  ///< whether the row belongs to an earlier run
     };
 
     explicit LogModel(QObject* parent = nullptr);
     ~LogModel() override;
 
-    /// Shows another file, or the same one read anew. The rows come when they have been found.
+    /// Shows another file, or reloads the same one. Rows appear when they have been read.
     ///
-    /// @param isCurrent  whether the running program writes it; only words the heading
+    /// @param isCurrent  whether the running program writes it; only affects the heading
     void Open(QString const& path, LogLineParser const& parser, bool isCurrent);
 
-    /// Reads the file anew, whatever is known of it.
+    /// Reads the file again from the start.
     void Reload();
 
-    /// Shows the rows that a filter lets through.
+    /// Shows only the rows that match a filter.
     void SetFilter(LogFilter const& filter);
     LogFilter const& filter() const { return m_filter; }
 
-    /// While the model is paused it does not look for changes.
+    /// While the model is paused, it does not check for changes.
     void SetPaused(bool paused);
     bool isPaused() const { return m_paused; }
 
-    /// The nearest row after (step 1) or before (step -1) `row` that tells of a warning or worse;
+    /// The nearest row after (step 1) or before (step -1) `row` that is a warning or worse;
     /// -1 if there is none.
     int FindProblem(int row, int step) const;
 
-    /// A row's line as it stands in the file, without its line end; empty for a heading.
+    /// The line of a row, as stored in the file, without its line end; empty for a heading.
     ///
-    /// @param limit  the most bytes to read
+    /// @param limit  maximum number of bytes to read
     QString LineText(int row, int limit) const;
 
     QString const& path() const { return m_path; }
@@ -77,24 +77,24 @@ public:
     QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
     Qt::ItemFlags flags(QModelIndex const& index) const override;
 
-    /// How often the file is looked at, in milliseconds.
+    /// The interval between checks for changes, in milliseconds.
     static constexpr int PollInterval = 250;
 
-    /// The most of a line that is shown, in bytes.
+    /// The maximum length shown of a line, in bytes.
     static constexpr int ShownLimit = 4096;
 
 Q_SIGNALS:
-    /// The rows have been brought up to date.
+    /// The rows have been updated.
     void refreshed();
 
-    /// Reading goes on; 100 when it is done.
+    /// Progress of reading, in percent; 100 when done.
     void progressed(int percent);
 
-    // To the scanner's thread. A queued call finds its types by the names given here.
-    void openWanted(int request, QString const& path, Velocor::LogLineParser const& parser,
-                    Velocor::LogFilter const& filter);
-    void filterWanted(int request, Velocor::LogFilter const& filter);
-    void pollWanted();
+    // To the scanner's thread. Fully qualified, because queued connections look up types by name.
+    void openRequested(int request, QString const& path, Velocor::LogLineParser const& parser,
+                       Velocor::LogFilter const& filter);
+    void filterRequested(int request, Velocor::LogFilter const& filter);
+    void pollRequested();
 
 private:
     void startScanner();
@@ -121,7 +121,7 @@ private:
     LogLineParser m_parser;
     LogFilter m_filter;
     LogUpdate m_state;
-    int m_rowCount = 0; // less than the rows of m_state only while a change is being announced
+    int m_rowCount = 0; // fewer than the rows of m_state only while a change is being signaled
     mutable QFile m_file;
     mutable QCache<qint64, LogEntry> m_entries;
 };

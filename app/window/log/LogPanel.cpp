@@ -28,7 +28,7 @@ namespace Velocor {
 
 namespace {
 
-// Fills itself with the files that are there at the moment when it is opened.
+// Refreshes its list of files whenever it is opened.
 class FileBox : public QComboBox
 {
 public:
@@ -54,7 +54,7 @@ LogPanel::LogPanel(QWidget* parent)
     setFocusProxy(m_view);
 }
 
-// The model and the view tell of changes while they are deleted.
+// The model and the view send signals while they are deleted.
 LogPanel::~LogPanel()
 {
     disconnect(m_view->selectionModel(), nullptr, this, nullptr);
@@ -71,20 +71,20 @@ void LogPanel::makeControls()
     };
     m_files = files;
     m_files->setAccessibleName(tr("Log file"));
-    m_files->setToolTip(PlainToolTip(tr("The current log file and the older ones beside it")));
+    m_files->setToolTip(PlainToolTip(tr("The current log file and older log files")));
     m_files->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon);
     m_files->setMinimumContentsLength(16);
 
     m_pause->setToolTip(
-        PlainToolTip(tr("Leave the view as it is while the log goes on (Ctrl+Shift+P)")));
-    m_follow->setToolTip(PlainToolTip(tr("Keep the newest entry in view (Ctrl+Shift+N)")));
+        PlainToolTip(tr("Stop updating the view while logging continues (Ctrl+Shift+P)")));
+    m_follow->setToolTip(PlainToolTip(tr("Scroll to new entries as they arrive (Ctrl+Shift+N)")));
     m_follow->setChecked(true);
 
     m_line = new QPlainTextEdit;
     m_line->setReadOnly(true);
     m_line->setTabChangesFocus(true);
-    m_line->setAccessibleName(tr("The current line in full"));
-    m_line->setPlaceholderText(tr("Choose a line to see all of it here"));
+    m_line->setAccessibleName(tr("Full text of the current line"));
+    m_line->setPlaceholderText(tr("Select a line to see its full text here"));
     m_line->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
 }
 
@@ -169,7 +169,7 @@ void LogPanel::fillFileList()
     const QStringList files = LogFileList::FilesOf(path());
     for (QString const& file : files) {
         const QFileInfo info(file);
-        const QString size = info.exists() ? FileSizeText(info.size()) : tr("not there");
+        const QString size = info.exists() ? FileSizeText(info.size()) : tr("does not exist");
         m_files->addItem(tr("%1 (%2)").arg(info.fileName(), size), file);
         m_files->setItemData(m_files->count() - 1, PlainToolTip(file), Qt::ToolTipRole);
     }
@@ -235,12 +235,12 @@ void LogPanel::CopySelected()
 {
     const int count = m_view->CopySelected();
     if (count == 0)
-        Q_EMIT messageReported(tr("No line is selected"));
-    else if (count >= LogView::MostCopied)
-        Q_EMIT messageReported(
-            tr("The first %L1 of the selected lines have been copied").arg(count));
+        Q_EMIT messageReported(tr("No lines selected"));
+    else if (count >= LogView::MaximumCopiedLines)
+        Q_EMIT messageReported(tr("Copied only the first %L1 selected lines").arg(count));
     else
-        Q_EMIT messageReported(tr("%Ln line(s) copied", nullptr, count));
+        Q_EMIT messageReported(count == 1 ? tr("1 line copied")
+                                          : tr("%L1 lines copied").arg(count));
 }
 
 void LogPanel::SelectAll()
@@ -254,8 +254,8 @@ void LogPanel::GoToProblem(int step)
         m_view->setFocus();
         return;
     }
-    Q_EMIT messageReported(step > 0 ? tr("No further warning or error below")
-                                    : tr("No further warning or error above"));
+    Q_EMIT messageReported(step > 0 ? tr("No more warnings or errors below")
+                                    : tr("No more warnings or errors above"));
 }
 
 QString LogPanel::path() const
@@ -266,17 +266,16 @@ QString LogPanel::path() const
 QString LogPanel::summary() const
 {
     if (m_model->isReading() && m_percent < 100)
-        return tr("Reading, %1 %").arg(m_percent);
+        return tr("Reading: %1%").arg(m_percent);
     LogUpdate const& state = m_model->state();
-    const QString separator = QStringLiteral("  %1  ").arg(QChar(0xb7)); // a dot in the middle
+    const QString separator = QStringLiteral("  %1  ").arg(QChar(0xb7)); // middle dot
     const QLocale locale;
     const auto lines = static_cast<qlonglong>(state.lines);
     qlonglong shown = m_model->rowCount();
     if (state.rows->earlier > 0)
-        shown -= 2; // the headings
-    QString text = shown < lines
-                       ? tr("%1 of %2 lines").arg(locale.toString(shown), locale.toString(lines))
-                       : tr("%1 lines").arg(locale.toString(lines));
+        shown -= 2; // headings
+    const QString all = lines == 1 ? tr("1 line") : tr("%1 lines").arg(locale.toString(lines));
+    QString text = shown < lines ? tr("%1 of %2").arg(locale.toString(shown), all) : all;
     const auto problems = static_cast<qlonglong>(state.rows->problems);
     text += separator +
             (problems == 1 ? tr("1 problem") : tr("%1 problems").arg(locale.toString(problems)));
@@ -289,13 +288,13 @@ void LogPanel::updatePlaceholder()
 {
     LogUpdate const& state = m_model->state();
     if (m_model->isReading())
-        m_view->SetPlaceholder(m_percent < 100 ? tr("Reading, %1 %").arg(m_percent) : QString());
+        m_view->SetPlaceholder(m_percent < 100 ? tr("Reading: %1%").arg(m_percent) : QString());
     else if (!state.error.isEmpty())
-        m_view->SetPlaceholder(tr("%1 cannot be read:\n%2").arg(path(), state.error));
+        m_view->SetPlaceholder(tr("Cannot read %1:\n%2").arg(path(), state.error));
     else if (!state.exists)
-        m_view->SetPlaceholder(tr("There is no file %1 at the moment.").arg(path()));
+        m_view->SetPlaceholder(tr("%1 does not exist.").arg(path()));
     else if (state.lines > 0)
-        m_view->SetPlaceholder(tr("No line passes the filter."));
+        m_view->SetPlaceholder(tr("No lines match the filter."));
     else
         m_view->SetPlaceholder(tr("The log is empty."));
 }

@@ -18,8 +18,8 @@ class LogFilterBar;
 class LogModel;
 class LogView;
 
-/// A log with all that belongs to it: the choice of its older files, filter, table, and the text of
-/// the current line.
+/// A log view with its controls: choice of older files, filter, table, and the text of the current
+/// line.
 ///
 ///     auto* panel = new LogPanel;
 ///     panel->Open(TorkLog::logger()->newLogFileName(), true);
@@ -36,7 +36,7 @@ public:
     /// @param isCurrent  whether the running program writes to it
     void Open(QString const& path, bool isCurrent);
 
-    /// Reads the file anew.
+    /// Reads the file again from the start.
     void Reload();
 
     void SetPaused(bool paused);
@@ -51,14 +51,14 @@ public:
     void CopySelected();
     void SelectAll();
 
-    /// Goes to the next (step 1) or previous (step -1) warning or worse, or tells that there is
-    /// none.
+    /// Goes to the next (step 1) or previous (step -1) warning or worse, or reports that
+    /// there is none.
     void GoToProblem(int step);
 
-    /// The file that is shown.
+    /// The current file.
     QString path() const;
 
-    /// What the rows are at the moment, in a few words.
+    /// A short summary of the rows, for the status bar.
     QString summary() const;
 
     QList<int> columnWidths() const;
@@ -70,10 +70,10 @@ public:
     LogView* view() const { return m_view; }
 
 Q_SIGNALS:
-    /// Something that the window's actions or its status line show has changed.
+    /// The state shown by the window's actions or status bar has changed.
     void stateChanged();
 
-    /// Something to be told in passing.
+    /// A message for the status bar.
     void messageReported(QString const& text);
 
 private:
@@ -94,7 +94,7 @@ private:
     QCheckBox* m_follow;
     QPlainTextEdit* m_line = nullptr;
     QSplitter* m_splitter;
-    QString m_currentPath; // the file that the running program writes, if it is one
+    QString m_currentPath; // the log of the running program; empty for other logs
     int m_percent = 100;
 };
 

@@ -20,9 +20,9 @@
 namespace Velocor {
 
 LogSettingsDialog::LogSettingsDialog(QWidget* parent)
-    : QDialog(parent), m_enabled(new QCheckBox(tr("&Write the log"))),
-      m_elapsed(new QCheckBox(tr("&Log the time since the entry before"))),
-      m_echo(new QCheckBox(tr("&Echo entries to the console"))), m_maxFiles(new QSpinBox),
+    : QDialog(parent), m_enabled(new QCheckBox(tr("&Enable logging"))),
+      m_elapsed(new QCheckBox(tr("&Log time since the previous entry"))),
+      m_echo(new QCheckBox(tr("Echo entries &to the console"))), m_maxFiles(new QSpinBox),
       m_elapsedPrefix(new QLineEdit), m_dateFormat(new QLineEdit), m_filePrefix(new QLineEdit),
       m_sample(NewPlainLabel()), m_problem(NewPlainLabel()),
       m_buttons(new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel))
@@ -44,25 +44,25 @@ LogSettingsDialog::LogSettingsDialog(QWidget* parent)
 void LogSettingsDialog::makeFields()
 {
     m_maxFiles->setRange(1, 100);
-    m_maxFiles->setAccessibleName(tr("Older files kept"));
-    m_sample->setAccessibleName(tr("Sample of an entry"));
+    m_maxFiles->setAccessibleName(tr("Older files to keep"));
+    m_sample->setAccessibleName(tr("Sample entry"));
     m_sample->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
     m_sample->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
-    m_problem->setAccessibleName(tr("Problem with the settings"));
+    m_problem->setAccessibleName(tr("Settings problem"));
     m_problem->setWordWrap(true);
 
-    auto* now = new QGroupBox(tr("At once"));
+    auto* now = new QGroupBox(tr("Immediately"));
     auto* nowForm = new QFormLayout(now);
     nowForm->addRow(m_enabled);
     nowForm->addRow(m_elapsed);
     nowForm->addRow(m_echo);
-    addRow(nowForm, tr("&Older files kept:"), m_maxFiles);
+    addRow(nowForm, tr("&Older files to keep:"), m_maxFiles);
 
-    auto* later = new QGroupBox(tr("From the next start"));
+    auto* later = new QGroupBox(tr("After restart"));
     auto* laterForm = new QFormLayout(later);
     addNextStartField(laterForm, tr("&Date format:"), m_dateFormat);
-    addNextStartField(laterForm, tr("&Prefix of the elapsed time:"), m_elapsedPrefix);
-    addNextStartField(laterForm, tr("&Name of the log files:"), m_filePrefix);
+    addNextStartField(laterForm, tr("Elapsed time &prefix:"), m_elapsedPrefix);
+    addNextStartField(laterForm, tr("Log file &name:"), m_filePrefix);
     addRow(laterForm, tr("Sample:"), m_sample);
 
     auto* layout = new QVBoxLayout(this);
@@ -84,8 +84,8 @@ void LogSettingsDialog::addNextStartField(QFormLayout* form, QString const& capt
 {
     field->setMinimumWidth(260);
     field->setAccessibleName(QString(caption).remove(QLatin1Char('&')).remove(QLatin1Char(':')));
-    field->setAccessibleDescription(tr("From the next start"));
-    field->setToolTip(PlainToolTip(tr("From the next start")));
+    field->setAccessibleDescription(tr("After restart"));
+    field->setToolTip(PlainToolTip(tr("After restart")));
     addRow(form, caption, field);
 }
 
@@ -115,12 +115,12 @@ LogPreferences LogSettingsDialog::preferences() const
 
 QString LogSettingsDialog::problem() const
 {
-    if (!LogPreferences::IsKept(m_dateFormat->text()))
-        return tr("The settings file cannot keep this date format.");
-    if (!LogPreferences::IsKept(m_elapsedPrefix->text()))
-        return tr("The settings file cannot keep this prefix of the elapsed time.");
-    if (!LogPreferences::IsFilePrefix(m_filePrefix->text()))
-        return tr("Log files cannot be called like this.");
+    if (!LogPreferences::IsStorable(m_dateFormat->text()))
+        return tr("This date format cannot be saved.");
+    if (!LogPreferences::IsStorable(m_elapsedPrefix->text()))
+        return tr("This elapsed time prefix cannot be saved.");
+    if (!LogPreferences::IsValidFilePrefix(m_filePrefix->text()))
+        return tr("Not a valid log file name.");
     return QString();
 }
 

@@ -16,7 +16,7 @@ class QSpinBox;
 
 namespace Velocor {
 
-/// Changes the log's settings. What the log cannot take over while it runs says so.
+/// Changes the log settings. Settings that take effect only after a restart are labeled so.
 class LogSettingsDialog : public QDialog
 {
     Q_OBJECT
@@ -24,7 +24,7 @@ class LogSettingsDialog : public QDialog
 public:
     explicit LogSettingsDialog(QWidget* parent = nullptr);
 
-    /// What the fields say.
+    /// The values in the fields.
     LogPreferences preferences() const;
 
     void accept() override;

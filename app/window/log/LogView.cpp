@@ -49,9 +49,10 @@ void LogView::setUp()
     horizontalHeader()->setStretchLastSection(true);
     horizontalHeader()->setHighlightSections(false);
     horizontalHeader()->setSectionsMovable(false);
-    horizontalHeader()->setAccessibleName(tr("Columns of the log"));
-    verticalHeader()->setAccessibleName(tr("Rows of the log"));
-    if (auto* corner = findChild<QAbstractButton*>()) // hidden with the rows' header, yet there
+    horizontalHeader()->setAccessibleName(tr("Log columns"));
+    verticalHeader()->setAccessibleName(tr("Log rows"));
+    if (auto* corner =
+            findChild<QAbstractButton*>()) // hidden along with the header, but still exists
         corner->setAccessibleName(tr("Select all rows"));
     setRowHeight();
 }
@@ -101,7 +102,7 @@ void LogView::noteScrolled(int value)
         SetFollowing(value == verticalScrollBar()->maximum());
 }
 
-// New rows above the ones in view would push them out of it.
+// Compensates for rows inserted above the visible ones.
 void LogView::rowsInserted(QModelIndex const& parent, int first, int last)
 {
     const bool above = !m_following && first < rowAt(0);
@@ -129,13 +130,13 @@ void LogView::afterRefresh()
     setColumnHidden(LogModel::ElapsedColumn, !m_model->state().hasElapsed);
     updateHeadings();
     if (m_following) {
-        updateGeometries(); // brings the scroll bar's range up to date
+        updateGeometries(); // updates the scroll bar's range
         scrollToBottom();
     }
     viewport()->update();
 }
 
-// A heading goes over the whole width.
+// A heading spans all columns.
 void LogView::updateHeadings()
 {
     const int earlier = static_cast<int>(m_model->state().rows->earlier);
@@ -167,7 +168,8 @@ QList<int> LogView::selectedRowNumbers() const
     QList<int> rows;
     const QItemSelection selection = selectionModel()->selection();
     for (QItemSelectionRange const& range : selection) {
-        for (int row = range.top(); row <= range.bottom() && rows.size() < MostCopied; ++row)
+        for (int row = range.top(); row <= range.bottom() && rows.size() < MaximumCopiedLines;
+             ++row)
             rows.append(row);
     }
     std::sort(rows.begin(), rows.end());

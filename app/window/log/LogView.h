@@ -10,9 +10,9 @@ namespace Velocor {
 class LogDelegate;
 class LogModel;
 
-/// The table of a log: keeps its place while rows come and go, follows the newest on request.
+/// The table of a log: keeps its position while rows change, or follows the newest entry.
 ///
-/// Following ends when the user scrolls away from the end and begins when he scrolls back to it.
+/// Following stops when the user scrolls away from the end and resumes on scrolling back to it.
 class LogView : public QTableView
 {
     Q_OBJECT
@@ -21,7 +21,7 @@ public:
     /// @param model  shown from the start; not owned
     explicit LogView(LogModel* model, QWidget* parent = nullptr);
 
-    /// Keeps the newest row in view, or stays where it is.
+    /// Whether to keep the newest row in view.
     void SetFollowing(bool following);
     bool isFollowing() const { return m_following; }
 
@@ -30,22 +30,22 @@ public:
     /// @return false if there is none
     bool GoToProblem(int step);
 
-    /// Copies the selected lines as they stand in the file.
+    /// Copies the selected lines, as stored in the file.
     ///
-    /// @return how many lines were copied
+    /// @return the number of lines copied
     int CopySelected();
 
-    /// What the empty table tells instead of rows; empty: nothing.
+    /// The text that is shown while the table is empty.
     void SetPlaceholder(QString const& text);
 
-    /// Marks what the model's filter finds.
+    /// Updates the highlighting to the model's filter.
     void UpdateMarks();
 
-    /// Column widths that suit the font.
+    /// Sets column widths that match the font.
     void SetDefaultWidths();
 
-    /// The most lines that are copied.
-    static constexpr int MostCopied = 100000;
+    /// The maximum number of lines copied.
+    static constexpr int MaximumCopiedLines = 100000;
 
 Q_SIGNALS:
     void followingChanged(bool following);

@@ -7,7 +7,7 @@
 
 namespace Velocor {
 
-/// A parser for what the log of this run writes, in the format that is in force. GUI thread.
+/// A parser for the current format of the running program's log. GUI thread.
 LogLineParser RunningLogParser();
 
 } // namespace Velocor

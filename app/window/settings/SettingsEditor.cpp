@@ -31,18 +31,18 @@ namespace Velocor {
 
 namespace {
 
-// The most of a broken file that is shown, in bytes.
+// The maximum size shown of a malformed file, in bytes.
 constexpr qint64 ShownLimit = 1 << 20;
 
-// The most characters of a name or value that a cell shows, and that are edited in it. Qt would
-// measure and lay out all of a text for each look at its cell.
-constexpr int LongestCell = 1000;
-constexpr int ShownOfLong = 200;
+// The maximum number of characters that a cell shows and edits. Qt would lay out the whole text
+// each time the cell is drawn.
+constexpr int MaximumCellLength = 1000;
+constexpr int ShortenedLength = 200;
 
-// The most characters of each line in a box that asks.
-constexpr int LongestLoss = 300;
+// The maximum length of each line in a message box, in characters.
+constexpr int MaximumLossLength = 300;
 
-// Holds the text of a cell that shows only its start.
+// The full text of a cell that shows only the start.
 constexpr int FullTextRole = Qt::UserRole;
 
 bool IsLong(QTreeWidgetItem const* item, int column)
@@ -57,12 +57,12 @@ QString FullText(QTreeWidgetItem const* item, int column)
 
 void SetFullText(QTreeWidgetItem* item, int column, QString const& text)
 {
-    const bool isLong = text.size() > LongestCell;
+    const bool isLong = text.size() > MaximumCellLength;
     item->setData(column, FullTextRole, isLong ? QVariant(text) : QVariant());
-    item->setText(column, isLong ? Shortened(text, ShownOfLong) : text);
+    item->setText(column, isLong ? Shortened(text, ShortenedLength) : text);
 }
 
-// Keeps the shortened text of a cell from being edited as if it were all of it.
+// Opens a dialog for cells with shortened text, which must not be edited in place.
 class CellDelegate : public QStyledItemDelegate
 {
 public:
@@ -80,9 +80,9 @@ public:
     }
 };
 
-QString NameRole()
+QString NameHint()
 {
-    return QObject::tr("Letters, digits, \"_\", \"-\" and \".\", with a letter or \"_\" first");
+    return QObject::tr("Use letters, digits, \"_\", \"-\" and \".\"; start with a letter or \"_\"");
 }
 
 } // namespace
@@ -100,7 +100,7 @@ SettingsEditor::SettingsEditor(QWidget* parent)
     setFocusProxy(m_tree);
 }
 
-// A cell that is being edited tells of its end while the tree is deleted.
+// If a cell is being edited, deleting the tree emits a signal.
 SettingsEditor::~SettingsEditor()
 {
     disconnect(m_tree, nullptr, this, nullptr);
@@ -121,7 +121,7 @@ QWidget* SettingsEditor::makeTreePage()
     m_tree = new QTreeWidget;
     m_tree->setAccessibleName(tr("Settings"));
     m_tree->setHeaderLabels({tr("Section / key"), tr("Value")});
-    m_tree->header()->setAccessibleName(tr("Columns of the settings"));
+    m_tree->header()->setAccessibleName(tr("Settings columns"));
     m_tree->setEditTriggers(QAbstractItemView::DoubleClicked | QAbstractItemView::EditKeyPressed |
                             QAbstractItemView::AnyKeyPressed);
     m_tree->setAlternatingRowColors(true);
@@ -135,8 +135,8 @@ QWidget* SettingsEditor::makeTreePage()
     connect(m_tree, &QTreeWidget::itemActivated, this, &SettingsEditor::editLongValueSoon);
 
     QPushButton* addSectionButton = makeButton(tr("Add &Section"), tr("Add an empty section"));
-    m_addValue = makeButton(tr("Add &Key"), tr("Add a key to the chosen section"));
-    m_remove = makeButton(tr("&Remove"), tr("Remove the chosen section or key"));
+    m_addValue = makeButton(tr("Add &Key"), tr("Add a key to the selected section"));
+    m_remove = makeButton(tr("&Remove"), tr("Remove the selected section or key"));
     m_save = makeButton(tr("Sa&ve"), tr("Save the file (Ctrl+S)"));
     connect(addSectionButton, &QPushButton::clicked, this, &SettingsEditor::addSection);
     connect(m_addValue, &QPushButton::clicked, this, &SettingsEditor::addValue);
@@ -169,7 +169,7 @@ QWidget* SettingsEditor::makeTextPage()
     m_text->setTabChangesFocus(true);
     m_text->setLineWrapMode(QPlainTextEdit::NoWrap);
     m_text->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
-    m_text->setAccessibleName(tr("The file as text"));
+    m_text->setAccessibleName(tr("File text"));
     m_text->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
     return m_text;
 }
@@ -211,18 +211,18 @@ void SettingsEditor::showTree(SettingsDocument const& document)
     m_pages->setCurrentIndex(0);
     setFocusProxy(m_tree);
     if (m_fileLossCount > 0)
-        m_notice->Tell(
+        m_notice->ShowMessage(
             m_fileLossCount == 1
-                ? tr("This file holds one thing that saving would lose.")
-                : tr("This file holds %1 things that saving would lose.").arg(m_fileLossCount));
+                ? tr("Saving would lose 1 item in this file.")
+                : tr("Saving would lose %1 items in this file.").arg(m_fileLossCount));
 }
 
 void SettingsEditor::showBroken(SettingsDocument const& document)
 {
-    QString message = tr("%1 is not shown as a tree: %2").arg(m_path, document.error);
+    QString message = tr("Cannot show %1 as a tree: %2").arg(m_path, document.error);
     if (document.line > 0)
         message += tr(" (line %1, column %2)").arg(document.line).arg(document.column);
-    m_notice->Tell(message);
+    m_notice->ShowMessage(message);
 
     QFile file(m_path);
     if (document.isReadable && file.open(QIODevice::ReadOnly))
@@ -249,7 +249,7 @@ QTreeWidgetItem* SettingsEditor::addItem(QTreeWidgetItem* section, QString const
     auto* item = section ? new QTreeWidgetItem(section) : new QTreeWidgetItem(m_tree);
     SetFullText(item, 0, key);
     SetFullText(item, 1, value);
-    item->setToolTip(0, PlainToolTip(NameRole()));
+    item->setToolTip(0, PlainToolTip(NameHint()));
     item->setFlags(Qt::ItemIsEnabled | Qt::ItemIsSelectable | Qt::ItemIsEditable);
     if (!section) {
         QFont bold = m_tree->font();
@@ -259,7 +259,7 @@ QTreeWidgetItem* SettingsEditor::addItem(QTreeWidgetItem* section, QString const
     return item;
 }
 
-QString SettingsEditor::freeName(QTreeWidgetItem* section, QString const& base) const
+QString SettingsEditor::uniqueName(QTreeWidgetItem* section, QString const& base) const
 {
     QStringList taken;
     const int count = section ? section->childCount() : m_tree->topLevelItemCount();
@@ -276,7 +276,7 @@ void SettingsEditor::addSection()
     QTreeWidgetItem* item = nullptr;
     {
         const QScopedValueRollback<bool> filling(m_filling, true);
-        item = addItem(nullptr, freeName(nullptr, QStringLiteral("Section")), QString());
+        item = addItem(nullptr, uniqueName(nullptr, QStringLiteral("Section")), QString());
     }
     setModified(true);
     m_tree->setCurrentItem(item);
@@ -292,7 +292,7 @@ void SettingsEditor::addValue()
     QTreeWidgetItem* item = nullptr;
     {
         const QScopedValueRollback<bool> filling(m_filling, true);
-        item = addItem(section, freeName(section, QStringLiteral("key")), tr("value"));
+        item = addItem(section, uniqueName(section, QStringLiteral("key")), tr("value"));
     }
     setModified(true);
     section->setExpanded(true);
@@ -306,8 +306,8 @@ void SettingsEditor::remove()
     setModified(true);
 }
 
-// A name that the store cannot write, or that is there already, is put right at once; a section
-// has no value of its own.
+// Replaces a name that the store cannot write or that is already in use; clears the value of a
+// section.
 void SettingsEditor::checkNames(QTreeWidgetItem* item)
 {
     if (m_filling)
@@ -317,18 +317,18 @@ void SettingsEditor::checkNames(QTreeWidgetItem* item)
     QString name = FullText(item, 0);
     name.remove(QLatin1Char(' '));
     if (!TorkConfigText::IsPlainName(name)) {
-        Q_EMIT messageReported(tr("\"%1\" is no name for a section or key: %2")
-                                   .arg(Shortened(name, ShownOfLong), NameRole()));
+        Q_EMIT messageReported(tr("\"%1\" is not a valid section or key name. %2")
+                                   .arg(Shortened(name, ShortenedLength), NameHint()));
         name = section ? QStringLiteral("key") : QStringLiteral("Section");
     }
     SetFullText(item, 0, QString());
-    SetFullText(item, 0, freeName(section, name));
+    SetFullText(item, 0, uniqueName(section, name));
     SetFullText(item, 1, section ? FullText(item, 1) : QString());
     setModified(true);
 }
 
-// Later, because the tree is still busy with the key or click; and once, though a double click both
-// edits a cell and activates it.
+// Delayed, because the tree is still handling the key or click; and only once, because a double
+// click both edits a cell and activates it.
 void SettingsEditor::editLongValueSoon()
 {
     if (m_editingLongValue)
@@ -379,43 +379,43 @@ SettingsDocument SettingsEditor::document() const
     return document;
 }
 
-bool SettingsEditor::ask(QString const& text, QString const& details, QString const& goOn)
+bool SettingsEditor::ask(QString const& text, QString const& details, QString const& acceptText)
 {
     PlainMessageBox box(QMessageBox::Warning, this, text, QMessageBox::Cancel, details);
-    QPushButton* yes = box.addButton(goOn, QMessageBox::AcceptRole);
+    QPushButton* yes = box.addButton(acceptText, QMessageBox::AcceptRole);
     box.setDefaultButton(QMessageBox::Cancel);
     box.exec();
     return box.clickedButton() == yes;
 }
 
-bool SettingsEditor::mayLose()
+bool SettingsEditor::confirmLosses()
 {
     QStringList losses = m_fileLosses + SettingsFileWriter::Losses(document());
-    const int unworded = m_fileLossCount - m_fileLosses.size();
+    const int unlisted = m_fileLossCount - m_fileLosses.size();
     if (losses.isEmpty())
         return true;
 
     const int most = 12;
-    const int more = losses.size() - most + unworded;
+    const int more = losses.size() - most + unlisted;
     if (losses.size() > most)
         losses = losses.mid(0, most);
     for (QString& loss : losses)
-        loss = Shortened(loss, LongestLoss);
+        loss = Shortened(loss, MaximumLossLength);
     if (more > 0)
         losses.append(tr("and %1 more").arg(more));
-    return ask(tr("Saving %1 would lose this:").arg(QFileInfo(m_path).fileName()),
-               losses.join(QLatin1Char('\n')), tr("Save All the Same"));
+    return ask(tr("Saving %1 would lose:").arg(QFileInfo(m_path).fileName()),
+               losses.join(QLatin1Char('\n')), tr("Save Anyway"));
 }
 
-bool SettingsEditor::mayReplaceChanged()
+bool SettingsEditor::confirmOverwrite()
 {
     if (!QFileInfo::exists(m_path) || QFileInfo(m_path).lastModified() == m_read)
         return true;
-    return ask(tr("%1 has been changed by another program.").arg(QFileInfo(m_path).fileName()),
-               tr("Saving would undo those changes."), tr("Save All the Same"));
+    return ask(tr("%1 was changed by another program.").arg(QFileInfo(m_path).fileName()),
+               tr("Saving would overwrite those changes."), tr("Save Anyway"));
 }
 
-bool SettingsEditor::keepBackup()
+bool SettingsEditor::makeBackup()
 {
     if (m_hasBackup)
         return true;
@@ -423,21 +423,22 @@ bool SettingsEditor::keepBackup()
     m_hasBackup = SettingsFileWriter::KeepBackup(m_path, &error);
     if (m_hasBackup)
         return true;
-    return ask(tr("No copy of %1 can be kept.").arg(QFileInfo(m_path).fileName()), error,
-               tr("Save Without a Copy"));
+    return ask(tr("Cannot back up %1.").arg(QFileInfo(m_path).fileName()), error,
+               tr("Save Without Backup"));
 }
 
 bool SettingsEditor::Save()
 {
     if (m_pages->currentIndex() != 0)
         return false;
-    m_pages->setFocus(); // ends the editing of a cell
-    if (!mayReplaceChanged() || !mayLose() || !keepBackup())
+    m_pages->setFocus(); // ends cell editing
+    if (!confirmOverwrite() || !confirmLosses() || !makeBackup())
         return false;
 
     QString error;
     if (!SettingsFileWriter::Save(m_path, document(), &error)) {
-        PlainMessageBox(QMessageBox::Critical, this, tr("%1 was not saved.\n%2").arg(m_path, error))
+        PlainMessageBox(QMessageBox::Critical, this,
+                        tr("Could not save %1.\n%2").arg(m_path, error))
             .exec();
         return false;
     }
@@ -452,11 +453,11 @@ bool SettingsEditor::Save()
 
 bool SettingsEditor::MayClose()
 {
-    m_pages->setFocus(); // ends the editing of a cell
+    m_pages->setFocus(); // ends cell editing
     if (!m_modified)
         return true;
     PlainMessageBox box(QMessageBox::Question, this,
-                        tr("%1 has been changed. Save it?").arg(QFileInfo(m_path).fileName()),
+                        tr("Save changes to %1?").arg(QFileInfo(m_path).fileName()),
                         QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel);
     box.setDefaultButton(QMessageBox::Save);
     const int answer = box.exec();

@@ -18,14 +18,14 @@ namespace Velocor {
 
 class NoticeBar;
 
-/// A configuration-store file as a tree of sections, keys and values that can be edited and saved.
+/// Edits a configuration file as a tree of sections, keys and values.
 ///
-/// Before the first save a copy of the file is kept as ".bak". What the store would lose is told
-/// before saving. A file that does not parse is shown as text, with the place of the error, and
-/// cannot be saved.
+/// Before the first save, the file is copied to ".bak". The user is asked before anything is lost
+/// by saving. A malformed file is shown as text, with the position of the error, and cannot be
+/// saved.
 ///
-/// A cell shows only the start of a long text, with its size. A long value is edited in a dialog of
-/// its own, and a long name not at all; both are saved in full.
+/// A cell shows only the start of a long text, with its size. A long value is edited in a separate
+/// dialog, and a long name cannot be edited; both are saved in full.
 class SettingsEditor : public QWidget
 {
     Q_OBJECT
@@ -34,23 +34,23 @@ public:
     explicit SettingsEditor(QWidget* parent = nullptr);
     ~SettingsEditor() override;
 
-    /// Shows a file. What has been edited so far is dropped.
+    /// Shows a file. Unsaved changes are discarded.
     void Open(QString const& path);
 
-    /// Saves through the configuration store, after asking where something would be lost.
+    /// Saves through the configuration store, after asking if anything would be lost.
     ///
     /// @return whether the file was saved
     bool Save();
 
-    /// Asks what to do with changes, if there are any.
+    /// Asks what to do with unsaved changes, if any.
     ///
-    /// @return false if the file is to stay open
+    /// @return false if the user cancels or saving fails
     bool MayClose();
 
     bool isModified() const { return m_modified; }
     QString const& path() const { return m_path; }
 
-    /// What the tree holds at the moment.
+    /// The current content of the tree.
     SettingsDocument document() const;
 
 Q_SIGNALS:
@@ -71,17 +71,17 @@ private:
     void editLongValueSoon();
     void editLongValue();
     QTreeWidgetItem* addItem(QTreeWidgetItem* section, QString const& key, QString const& value);
-    QString freeName(QTreeWidgetItem* section, QString const& base) const;
-    bool mayLose();
-    bool mayReplaceChanged();
-    bool ask(QString const& text, QString const& details, QString const& goOn);
-    bool keepBackup();
+    QString uniqueName(QTreeWidgetItem* section, QString const& base) const;
+    bool confirmLosses();
+    bool confirmOverwrite();
+    bool ask(QString const& text, QString const& details, QString const& acceptText);
+    bool makeBackup();
 
     QString m_path;
     QString m_rootName;
     QStringList m_fileLosses;
     int m_fileLossCount = 0;
-    QDateTime m_read; ///< time of the file's last change when it was read
+    QDateTime m_read; ///< modification time of the file when it was read
     bool m_modified = false;
     bool m_filling = false;
     bool m_hasBackup = false;

@@ -23,14 +23,14 @@ namespace {
 
 constexpr int PieceLength = 1000;
 
-// The sign for a line break in front, others only for values that contain it.
+// The symbol for a newline, or another one if the value contains it.
 QChar FreeMark(QString const& value)
 {
     for (ushort candidate : {0x2424, 0x21b5, 0x240a, 0x00b6}) {
         if (!value.contains(QChar(candidate)))
             return QChar(candidate);
     }
-    ushort candidate = 0xe000; // for private use
+    ushort candidate = 0xe000; // private use area
     while (value.contains(QChar(candidate)) && candidate < 0xf8ff)
         ++candidate;
     return QChar(candidate);
@@ -39,16 +39,16 @@ QChar FreeMark(QString const& value)
 bool HasLongLine(QString const& value)
 {
     int start = 0;
-    while (value.size() - start > ValueDialog::LongestLine) {
+    while (value.size() - start > ValueDialog::MaximumLineLength) {
         const int end = value.indexOf(QLatin1Char('\n'), start);
-        if (end < 0 || end - start > ValueDialog::LongestLine)
+        if (end < 0 || end - start > ValueDialog::MaximumLineLength)
             return true;
         start = end + 1;
     }
     return false;
 }
 
-QString InPieces(QString const& value, QChar mark)
+QString SplitLines(QString const& value, QChar mark)
 {
     QString text;
     text.reserve(value.size() + value.size() / PieceLength + 1);
@@ -68,7 +68,7 @@ QString InPieces(QString const& value, QChar mark)
     return text;
 }
 
-// Where line breaks are marked, those that are typed or pasted are marked as well.
+// If line breaks are marked, also marks those that are typed or pasted.
 class ValueEdit : public QPlainTextEdit
 {
 public:
@@ -92,7 +92,7 @@ protected:
         }
         QString text = source->text();
         text.replace(QLatin1String("\r\n"), QLatin1String("\n"));
-        insertPlainText(InPieces(text, m_mark));
+        insertPlainText(SplitLines(text, m_mark));
     }
 
 private:
@@ -108,16 +108,16 @@ ValueDialog::ValueDialog(QString const& name, QString const& value, QWidget* par
     setWindowTitle(QObject::tr("Edit Value"));
     QString heading = QStringLiteral("%1 (%2)").arg(name, FileSizeText(value.toUtf8().size()));
     if (!m_mark.isNull())
-        heading +=
-            QLatin1Char('\n') +
-            QObject::tr("Long lines are shown in pieces; only %1 marks a line break.").arg(m_mark);
+        heading += QLatin1Char('\n') +
+                   QObject::tr("Long lines are split for display; only %1 marks a line break.")
+                       .arg(m_mark);
     QLabel* label = NewPlainLabel(heading);
     label->setWordWrap(true);
     m_text->setLineWrapMode(QPlainTextEdit::NoWrap);
     m_text->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
     m_text->setTabChangesFocus(true);
     m_text->setAccessibleName(QObject::tr("Value"));
-    m_text->setPlainText(m_mark.isNull() ? value : InPieces(value, m_mark));
+    m_text->setPlainText(m_mark.isNull() ? value : SplitLines(value, m_mark));
     m_text->document()->setModified(false);
 
     auto* buttons = new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel);
@@ -140,7 +140,7 @@ bool ValueDialog::isModified() const
     return m_text->document()->isModified();
 }
 
-// Not toPlainText(), which turns no-break spaces into spaces.
+// Not toPlainText(), which converts non-breaking spaces to spaces.
 QString ValueDialog::value() const
 {
     if (!isModified())

@@ -10,11 +10,11 @@ class QPlainTextEdit;
 
 namespace Velocor {
 
-/// Edits a value that is too long for a cell of a table. GUI thread only.
+/// Edits a value that is too long for a table cell. GUI thread only.
 ///
-/// Qt lays out a line as a whole, again with each key, which takes many seconds for one of some
-/// megabytes. If a line is longer than `LongestLine`, all lines are shown in pieces, and a sign
-/// that the value does not contain marks the real line breaks; the dialog says so.
+/// Qt lays out a whole line again on each key press, which makes very long lines unusable. If a
+/// line is longer than `MaximumLineLength`, all lines are split for display, and a symbol
+/// that the value does not contain marks the real line breaks, which the dialog explains.
 ///
 ///     ValueDialog dialog(tr("Editor / style"), value, this);
 ///     if (dialog.exec() == QDialog::Accepted)
@@ -22,22 +22,22 @@ namespace Velocor {
 class ValueDialog : public QDialog
 {
 public:
-    /// @param name  what the value is called
+    /// @param name  the name of the value
     /// @param value  of any length
     ValueDialog(QString const& name, QString const& value, QWidget* parent = nullptr);
 
     /// Whether the text has been edited.
     bool isModified() const;
 
-    /// The text as it is now; exactly the value given if it has not been edited.
+    /// The current text; exactly the given value if it has not been edited.
     QString value() const;
 
-    /// The longest line that is shown in one piece, in characters.
-    static constexpr int LongestLine = 10000;
+    /// The maximum length of a line that is not split, in characters.
+    static constexpr int MaximumLineLength = 10000;
 
 private:
     QString m_value;
-    QChar m_mark; ///< of a real line break; null if lines are shown whole
+    QChar m_mark; ///< marks real line breaks; null if lines are not split
     QPlainTextEdit* m_text;
 };
 

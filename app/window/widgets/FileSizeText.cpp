@@ -10,6 +10,8 @@ namespace Velocor {
 
 QString FileSizeText(qint64 bytes)
 {
+    if (bytes == 1)
+        return QObject::tr("1 byte");
     if (bytes < 1000)
         return QObject::tr("%1 bytes").arg(bytes);
 

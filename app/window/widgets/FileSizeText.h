@@ -7,7 +7,7 @@
 
 namespace Velocor {
 
-/// A number of bytes for people, in decimal units: "812 bytes", "1.2 MB".
+/// Formats a number of bytes for users, in decimal units: "812 bytes", "1.2 MB".
 QString FileSizeText(qint64 bytes);
 
 } // namespace Velocor

@@ -25,7 +25,7 @@ NoticeBar::NoticeBar(QWidget* parent)
 
     auto* dismiss = new QPushButton(tr("Dismiss"));
     dismiss->setAutoDefault(false);
-    dismiss->setAccessibleName(tr("Dismiss the notice"));
+    dismiss->setAccessibleName(tr("Dismiss notice"));
     connect(dismiss, &QPushButton::clicked, this, &NoticeBar::Dismiss);
 
     auto* layout = new QHBoxLayout(this);
@@ -37,7 +37,7 @@ NoticeBar::NoticeBar(QWidget* parent)
     hide();
 }
 
-void NoticeBar::Tell(QString const& text)
+void NoticeBar::ShowMessage(QString const& text)
 {
     m_icon->setPixmap(SeverityIcons::Icon(LogEntry::Warning, palette()).pixmap(16));
     m_label->setText(isHidden() ? text : m_label->text() + QLatin1Char('\n') + text);

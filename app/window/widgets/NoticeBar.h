@@ -9,20 +9,20 @@ class QLabel;
 
 namespace Velocor {
 
-/// A strip above a view that tells of something without stopping the work; can be dismissed. Its
-/// text can be selected.
+/// A bar above a view that shows messages without interrupting the user and can be dismissed. The
+/// text is selectable.
 class NoticeBar : public QFrame
 {
     Q_OBJECT
 
 public:
-    /// Hidden until there is something to tell.
+    /// Hidden until there is a message.
     explicit NoticeBar(QWidget* parent = nullptr);
 
-    /// Shows a text, below those that have not been dismissed yet.
-    void Tell(QString const& text);
+    /// Shows a message, below those not dismissed yet.
+    void ShowMessage(QString const& text);
 
-    /// Takes all texts away.
+    /// Removes all messages.
     void Dismiss();
 
     QString text() const;

@@ -12,17 +12,17 @@ namespace Velocor {
 
 namespace {
 
-// Qt shows a plain tool tip on one line, however long it is.
-constexpr int LongestLine = 120;
+// Longer text is wrapped: Qt shows a plain tool tip on one line, however long it is.
+constexpr int MaximumLineLength = 120;
 
 } // namespace
 
 QString PlainToolTip(QString const& text)
 {
-    const QString shown = Shortened(text, LongestToolTip);
-    if (shown.size() <= LongestLine && !Qt::mightBeRichText(shown))
+    const QString shown = Shortened(text, MaximumToolTipLength);
+    if (shown.size() <= MaximumLineLength && !Qt::mightBeRichText(shown))
         return shown;
-    // Without a tag around it, escaped text is not always taken for rich: "&amp;lt;" is not.
+    // Without a tag, Qt does not always detect escaped text as rich text: "&amp;lt;" is plain.
     return QLatin1String("<p style=\"white-space:pre-wrap\">") + shown.toHtmlEscaped() +
            QLatin1String("</p>");
 }
@@ -44,8 +44,8 @@ QLabel* NewPlainLabel(QString const& text)
     return label;
 }
 
-// The labels are made plain before they get a text from outside: a box makes the second label when
-// its text is set, and that one opens links by itself.
+// The labels are set to plain text before they get their text: the box creates the label for the
+// informative text when that is first set, and that label opens links itself.
 PlainMessageBox::PlainMessageBox(Icon icon, QWidget* parent, QString const& text,
                                  StandardButtons buttons, QString const& details)
     : QMessageBox(icon, parent ? parent->window()->windowTitle() : QString(), QString(), buttons,

@@ -13,11 +13,11 @@ namespace Velocor {
 
 namespace {
 
-constexpr qreal Box = 16; // the shapes below are drawn in a square of this size
+constexpr qreal Box = 16; // size of the square that shapes are drawn in
 constexpr int Sizes[] = {16, 24, 32, 48};
 
-// Each with a contrast of more than 4.5 to 1 against its background.
-QColor TwoToned(QPalette const& palette, QRgb onLight, QRgb onDark)
+// Chosen for a contrast of more than 4.5:1 against the background.
+QColor ForBackground(QPalette const& palette, QRgb onLight, QRgb onDark)
 {
     return QColor(SeverityIcons::IsDark(palette) ? onDark : onLight);
 }
@@ -33,18 +33,18 @@ QPolygonF Octagon()
                        << QPointF(11, 15) << QPointF(5, 15) << QPointF(1, 11) << QPointF(1, 5);
 }
 
-void DrawMark(QPainter& painter, QColor const& colour, qreal top, qreal bottom)
+void DrawMark(QPainter& painter, QColor const& color, qreal top, qreal bottom)
 {
-    painter.setPen(QPen(colour, 1.9, Qt::SolidLine, Qt::RoundCap));
+    painter.setPen(QPen(color, 1.9, Qt::SolidLine, Qt::RoundCap));
     painter.drawLine(QPointF(8, top), QPointF(8, bottom));
     painter.setPen(Qt::NoPen);
-    painter.setBrush(colour);
+    painter.setBrush(color);
     painter.drawEllipse(QPointF(8, bottom + 3), 1.1, 1.1);
 }
 
-void DrawCross(QPainter& painter, QColor const& colour)
+void DrawCross(QPainter& painter, QColor const& color)
 {
-    painter.setPen(QPen(colour, 2, Qt::SolidLine, Qt::RoundCap));
+    painter.setPen(QPen(color, 2, Qt::SolidLine, Qt::RoundCap));
     painter.drawLine(QPointF(5.4, 5.4), QPointF(10.6, 10.6));
     painter.drawLine(QPointF(10.6, 5.4), QPointF(5.4, 10.6));
 }
@@ -59,10 +59,10 @@ void DrawInformation(QPainter& painter, QColor const& mark)
     painter.drawEllipse(QPointF(8, 4.6), 1.15, 1.15);
 }
 
-void Draw(QPainter& painter, LogEntry::Severity severity, QColor const& colour, QColor const& mark)
+void Draw(QPainter& painter, LogEntry::Severity severity, QColor const& color, QColor const& mark)
 {
     painter.setPen(Qt::NoPen);
-    painter.setBrush(colour);
+    painter.setBrush(color);
     switch (severity) {
     case LogEntry::Trace:
         painter.drawEllipse(QPointF(8, 8), 2.4, 2.4);
@@ -87,18 +87,18 @@ void Draw(QPainter& painter, LogEntry::Severity severity, QColor const& colour, 
     }
 }
 
-QPixmap Pixmap(int size, LogEntry::Severity severity, QColor const& colour, QColor const& mark)
+QPixmap Pixmap(int size, LogEntry::Severity severity, QColor const& color, QColor const& mark)
 {
     QPixmap pixmap(size, size);
     pixmap.fill(Qt::transparent);
     QPainter painter(&pixmap);
     painter.setRenderHint(QPainter::Antialiasing);
     painter.scale(size / Box, size / Box);
-    Draw(painter, severity, colour, mark);
+    Draw(painter, severity, color, mark);
     return pixmap;
 }
 
-QPixmap StruckThrough(QPixmap const& pixmap, QColor const& colour)
+QPixmap StruckThrough(QPixmap const& pixmap, QColor const& color)
 {
     QPixmap result(pixmap.size());
     result.fill(Qt::transparent);
@@ -108,18 +108,18 @@ QPixmap StruckThrough(QPixmap const& pixmap, QColor const& colour)
     painter.drawPixmap(0, 0, pixmap);
     painter.setOpacity(1);
     painter.scale(pixmap.width() / Box, pixmap.height() / Box);
-    painter.setPen(QPen(colour, 1.4, Qt::SolidLine, Qt::RoundCap));
+    painter.setPen(QPen(color, 1.4, Qt::SolidLine, Qt::RoundCap));
     painter.drawLine(QPointF(2, 14), QPointF(14, 2));
     return result;
 }
 
-// A trace's dot is not to outdo the others.
-QColor IconColour(LogEntry::Severity severity, QPalette const& palette)
+// The trace dot is faded, to be less prominent than the others.
+QColor IconColor(LogEntry::Severity severity, QPalette const& palette)
 {
-    QColor colour = SeverityIcons::Colour(severity, palette);
+    QColor color = SeverityIcons::Color(severity, palette);
     if (severity == LogEntry::Trace)
-        colour.setAlphaF(0.55);
-    return colour;
+        color.setAlphaF(0.55);
+    return color;
 }
 
 } // namespace
@@ -129,17 +129,17 @@ bool SeverityIcons::IsDark(QPalette const& palette)
     return palette.color(QPalette::Base).lightness() < 128;
 }
 
-QColor SeverityIcons::Colour(LogEntry::Severity severity, QPalette const& palette)
+QColor SeverityIcons::Color(LogEntry::Severity severity, QPalette const& palette)
 {
     switch (severity) {
     case LogEntry::Notification:
-        return TwoToned(palette, 0xff1a5fb4, 0xff78aeed);
+        return ForBackground(palette, 0xff1a5fb4, 0xff78aeed);
     case LogEntry::Warning:
-        return TwoToned(palette, 0xff8f5200, 0xfff5c211);
+        return ForBackground(palette, 0xff8f5200, 0xfff5c211);
     case LogEntry::Error:
-        return TwoToned(palette, 0xffc01c28, 0xffff7b7b);
+        return ForBackground(palette, 0xffc01c28, 0xffff7b7b);
     case LogEntry::Fatal:
-        return TwoToned(palette, 0xff9c1482, 0xffff8ee6);
+        return ForBackground(palette, 0xff9c1482, 0xffff8ee6);
     case LogEntry::Trace:
     case LogEntry::None:
         break;
@@ -152,15 +152,15 @@ QIcon SeverityIcons::Icon(LogEntry::Severity severity, QPalette const& palette)
     if (severity == LogEntry::None)
         return QIcon();
 
-    // Never deleted: images must not outlive the application object by a little.
+    // Never deleted, because pixmaps must not be destroyed after the application object.
     static auto* const icons = new QHash<int, QIcon>;
     const int key = severity * 2 + (IsDark(palette) ? 1 : 0);
     QIcon& icon = (*icons)[key];
     if (icon.isNull()) {
-        const QColor colour = IconColour(severity, palette);
+        const QColor color = IconColor(severity, palette);
         QColor const& selected = palette.color(QPalette::HighlightedText);
         for (int size : Sizes) {
-            icon.addPixmap(Pixmap(size, severity, colour, palette.color(QPalette::Base)));
+            icon.addPixmap(Pixmap(size, severity, color, palette.color(QPalette::Base)));
             icon.addPixmap(Pixmap(size, severity, selected, palette.color(QPalette::Highlight)),
                            QIcon::Selected);
         }
@@ -171,9 +171,9 @@ QIcon SeverityIcons::Icon(LogEntry::Severity severity, QPalette const& palette)
 QIcon SeverityIcons::SwitchIcon(LogEntry::Severity severity, QPalette const& palette)
 {
     QIcon icon;
-    const QColor colour = IconColour(severity, palette);
+    const QColor color = IconColor(severity, palette);
     for (int size : Sizes) {
-        const QPixmap on = Pixmap(size, severity, colour, palette.color(QPalette::Base));
+        const QPixmap on = Pixmap(size, severity, color, palette.color(QPalette::Base));
         icon.addPixmap(on, QIcon::Normal, QIcon::On);
         icon.addPixmap(StruckThrough(on, palette.color(QPalette::ButtonText)), QIcon::Normal,
                        QIcon::Off);

@@ -12,20 +12,20 @@ class QPalette;
 
 namespace Velocor {
 
-/// Colours and icons of the severities. Each icon has a shape of its own, so that they are told
-/// apart without their colours; colours suit the light or dark background of a palette.
+/// Colors and icons of the severities. Each icon has its own shape, so that they differ without
+/// color as well; colors match the light or dark background of the palette.
 class SeverityIcons
 {
 public:
-    /// The icon; a null one for None. Drawn once and kept. GUI thread.
+    /// The icon; null for None. Drawn once and cached. GUI thread.
     static QIcon Icon(LogEntry::Severity severity, QPalette const& palette);
 
-    /// The icon of a switch that shows or hides the severity: full while it is on, pale and struck
-    /// through while it is off.
+    /// The icon of a toggle button for the severity: normal when on, faded and struck through when
+    /// off.
     static QIcon SwitchIcon(LogEntry::Severity severity, QPalette const& palette);
 
-    /// The colour of text and icon; the palette's own text colour for Trace and None.
-    static QColor Colour(LogEntry::Severity severity, QPalette const& palette);
+    /// The color of text and icon; the palette's own text color for Trace and None.
+    static QColor Color(LogEntry::Severity severity, QPalette const& palette);
 
     /// Whether a palette's background is dark.
     static bool IsDark(QPalette const& palette);

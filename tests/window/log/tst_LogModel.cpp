@@ -207,7 +207,7 @@ void tst_LogModel::headings()
 
     const QModelIndex torn = model.index(1, LogModel::MessageColumn);
     QCOMPARE(torn.data(Qt::ToolTipRole).toString(),
-             QString("What is left of an entry that a later run wrote over"));
+             QString("Remainder of an entry that a later run overwrote"));
     QVERIFY(!torn.sibling(1, LogModel::SeverityColumn).data(Qt::DecorationRole).isValid());
 }
 
