@@ -172,7 +172,7 @@ void LogScanner::Poll()
         if (readFrom(file, m_index.Begin()))
             report(false);
     }
-    Q_EMIT polled();
+    Q_EMIT polled(); // NOLINT(readability-misleading-indentation): Q_EMIT is empty
 }
 
 void LogScanner::report(bool isReset)
