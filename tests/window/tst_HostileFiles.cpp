@@ -194,6 +194,7 @@ private slots:
     void longLoss();
     void valueDialog_data();
     void valueDialog();
+    void valueDialogUntouched();
     void valueDialogPastes();
 
     void reportEndsWithTheLastLine();
@@ -318,6 +319,11 @@ void tst_HostileFiles::windowSettings()
     }
     QVERIFY(!pipe.wasOpened());
     QVERIFY(QFileInfo::exists(file) && !QFileInfo(file).isFile());
+
+    // What could not be read is not replaced at the end, even by a program that could write it.
+    WindowSettings settings(test.folder() + "data/");
+    QVERIFY(!settings.Load().isEmpty());
+    QCOMPARE(settings.Save(), QString());
 }
 
 void tst_HostileFiles::windowSettingsAtTheEnd()
@@ -383,6 +389,14 @@ void tst_HostileFiles::recentFilesAreCapped()
     recent.SetList("/a");
     recent.Add('/' + QString(RecentFiles::MaximumPathLength, 'x'));
     QCOMPARE(recent.list(), QString("/a"));
+
+    // One that is too long does not push the oldest out of a full list either.
+    QStringList full;
+    for (int i = 0; i < RecentFiles::MostFiles; ++i)
+        full.append('/' + QString::number(i));
+    recent.SetList(full.join('|'));
+    recent.Add('/' + QString(RecentFiles::LongestPath, 'x'));
+    QCOMPARE(recent.list(), full.join('|'));
 }
 
 void tst_HostileFiles::longNamesInTheMenu()
@@ -634,6 +648,8 @@ void tst_HostileFiles::valueDialog_data()
     QTest::newRow("the sign itself") << longLine + QChar(0x2424) + '\n' + QChar(0x21b5) << true;
     QTest::newRow("pairs of surrogates")
         << QString::fromUtf8("\xF0\x9F\x98\x80").repeated(6000) + "\nx" << true;
+    QTest::newRow("pairs of surrogates at odd places")
+        << 'a' + QString::fromUtf8("\xF0\x9F\x98\x80").repeated(6000) + "\nx" << true;
 }
 
 void tst_HostileFiles::valueDialog()
@@ -646,6 +662,8 @@ void tst_HostileFiles::valueDialog()
     QVERIFY(dialog.value() == value);
     QCOMPARE(dialog.findChild<QLabel*>()->text().contains('\n'), inPieces);
     auto* text = dialog.findChild<QPlainTextEdit*>();
+    for (QTextBlock block = text->document()->begin(); block.isValid(); block = block.next())
+        QVERIFY(block.text().isEmpty() || !block.text().at(0).isLowSurrogate());
     QTest::keyClick(text, Qt::Key_Home, Qt::ControlModifier);
     QTest::keyClicks(text, "a");
     QTest::keyClick(text, Qt::Key_Return);
@@ -653,6 +671,18 @@ void tst_HostileFiles::valueDialog()
     QVERIFY(dialog.value() == "a\n" + value);
     for (QTextBlock block = text->document()->begin(); block.isValid(); block = block.next())
         QVERIFY(block.length() <= Velocor::ValueDialog::MaximumLineLength + 1);
+}
+
+// Qt's editor takes each of these for a line break.
+void tst_HostileFiles::valueDialogUntouched()
+{
+    for (int length : {1, Velocor::ValueDialog::LongestLine + 1}) {
+        const QString value = QString(length, 'x') + "\ra\r\nb" + QChar(QChar::ParagraphSeparator);
+        Velocor::ValueDialog dialog("name", value);
+        dialog.show();
+        QVERIFY(!dialog.isModified());
+        QVERIFY(dialog.value() == value);
+    }
 }
 
 void tst_HostileFiles::valueDialogPastes()
