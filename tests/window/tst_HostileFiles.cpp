@@ -52,6 +52,10 @@ namespace {
 constexpr int Patience = 20000; // milliseconds
 constexpr int TenMegabytes = 10000000;
 
+// Before the application object, which would look for a session bus and start one: the child gets
+// this process' files, and a pipe that it has open looks as if the window had opened it.
+const bool NoSessionBus = qputenv("DBUS_SESSION_BUS_ADDRESS", "unix:path=/nonexistent");
+
 // A named pipe that records whether anybody has opened it, and releases whoever did.
 class Pipe
 {
@@ -204,6 +208,7 @@ private slots:
 
 void tst_HostileFiles::initTestCase()
 {
+    QVERIFY(NoSessionBus);
     QLoggingCategory::setFilterRules("qt.qpa.*=false");
 }
 

@@ -36,6 +36,13 @@ QChar FreeMark(QString const& value)
     return QChar(candidate);
 }
 
+// The text widget turns these into line feeds, so an edited value would lose them.
+bool HasOtherBreaks(QString const& value)
+{
+    return value.contains(QLatin1Char('\r')) || value.contains(QChar(QChar::LineSeparator)) ||
+           value.contains(QChar(QChar::ParagraphSeparator));
+}
+
 bool HasLongLine(QString const& value)
 {
     int start = 0;
@@ -111,6 +118,11 @@ ValueDialog::ValueDialog(QString const& name, QString const& value, QWidget* par
         heading += QLatin1Char('\n') +
                    QObject::tr("Long lines are split for display; only %1 marks a line break.")
                        .arg(m_mark);
+    m_text->setReadOnly(HasOtherBreaks(value));
+    if (m_text->isReadOnly())
+        heading += QLatin1Char('\n') +
+                   QObject::tr("This value contains carriage returns or Unicode line separators, so "
+                               "it cannot be edited here.");
     QLabel* label = NewPlainLabel(heading);
     label->setWordWrap(true);
     m_text->setLineWrapMode(QPlainTextEdit::NoWrap);
