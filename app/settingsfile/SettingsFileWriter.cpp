@@ -59,7 +59,8 @@ SettingsDocument::Section WithoutLosses(SettingsDocument::Section const& section
 void Fill(TorkConfigFile& store, SettingsDocument const& document)
 {
     for (SettingsDocument::Section const& section : document.sections) {
-        store.AppendSection(new TorkConfigFileSection(section.name.toUtf8().constData()));
+        if (!store.HasSection(section.name)) // one that is replaced would be nobody's
+            store.AppendSection(new TorkConfigFileSection(section.name.toUtf8().constData()));
         for (SettingsDocument::Item const& item : section.items)
             store.WriteItem(section.name, item.key,
                             item.value.isNull() ? QString(QLatin1String("")) : item.value);

@@ -297,7 +297,8 @@ void tst_PlainSettingsFile::compareValues(SettingsDocument const& document)
     const QString path = m_folder.filePath("x.cfg");
     TorkConfigFile store(path, document.rootName);
     for (SettingsDocument::Section const& section : document.sections) {
-        store.AppendSection(new TorkConfigFileSection(section.name.toUtf8().constData()));
+        if (!store.HasSection(section.name))
+            store.AppendSection(new TorkConfigFileSection(section.name.toUtf8().constData()));
         for (SettingsDocument::Item const& item : section.items)
             store.FindSection(section.name)->AddValue(item.key, item.value);
     }

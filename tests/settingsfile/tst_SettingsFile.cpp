@@ -277,7 +277,7 @@ void tst_SettingsFile::lossesWriteNoFile()
 {
     const QTemporaryDir folder;
     const QByteArray temporary = qgetenv("TMPDIR");
-    qApp->setProperty("DataPath", QString(folder.path() + "/data/"));
+    QCoreApplication::instance()->setProperty("DataPath", QString(folder.path() + "/data/"));
     qputenv("TMPDIR", QFile::encodeName(folder.path()));
     QFileSystemWatcher watcher({folder.path()});
     const QSignalSpy changes(&watcher, &QFileSystemWatcher::directoryChanged);
@@ -287,7 +287,7 @@ void tst_SettingsFile::lossesWriteNoFile()
         qunsetenv("TMPDIR");
     else
         qputenv("TMPDIR", temporary);
-    qApp->setProperty("DataPath", QVariant());
+    QCoreApplication::instance()->setProperty("DataPath", QVariant());
     QCOMPARE(losses.size(), 1);
     QCOMPARE(changes.size(), 0);
     QCOMPARE(QDir(folder.path()).entryList(QDir::AllEntries | QDir::NoDotAndDotDot), QStringList());

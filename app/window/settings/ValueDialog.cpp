@@ -120,9 +120,10 @@ ValueDialog::ValueDialog(QString const& name, QString const& value, QWidget* par
                        .arg(m_mark);
     m_text->setReadOnly(HasOtherBreaks(value));
     if (m_text->isReadOnly())
-        heading += QLatin1Char('\n') +
-                   QObject::tr("This value contains carriage returns or Unicode line separators, so "
-                               "it cannot be edited here.");
+        heading +=
+            QLatin1Char('\n') +
+            QObject::tr("This value contains carriage returns or Unicode line separators, so "
+                        "it cannot be edited here.");
     QLabel* label = NewPlainLabel(heading);
     label->setWordWrap(true);
     m_text->setLineWrapMode(QPlainTextEdit::NoWrap);
