@@ -397,10 +397,10 @@ void tst_HostileFiles::recentFilesAreCapped()
 
     // One that is too long does not push the oldest out of a full list either.
     QStringList full;
-    for (int i = 0; i < RecentFiles::MostFiles; ++i)
+    for (int i = 0; i < RecentFiles::MaximumFiles; ++i)
         full.append('/' + QString::number(i));
     recent.SetList(full.join('|'));
-    recent.Add('/' + QString(RecentFiles::LongestPath, 'x'));
+    recent.Add('/' + QString(RecentFiles::MaximumPathLength, 'x'));
     QCOMPARE(recent.list(), full.join('|'));
 }
 
@@ -681,7 +681,7 @@ void tst_HostileFiles::valueDialog()
 // Qt's editor takes each of these for a line break.
 void tst_HostileFiles::valueDialogUntouched()
 {
-    for (int length : {1, Velocor::ValueDialog::LongestLine + 1}) {
+    for (int length : {1, Velocor::ValueDialog::MaximumLineLength + 1}) {
         const QString value = QString(length, 'x') + "\ra\r\nb" + QChar(QChar::ParagraphSeparator);
         Velocor::ValueDialog dialog("name", value);
         dialog.show();
