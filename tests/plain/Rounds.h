@@ -11,8 +11,10 @@
 
 /// How many rounds a comparison with the plain version runs, and from which seed.
 ///
-/// `VELOCOR_PLAIN=full` selects the full size, as ./check does; `VELOCOR_SEED` replays one run.
-/// Every run prints its seed, so that a failure can be reproduced.
+/// `VELOCOR_PLAIN=full` selects the full size, as ./check does, with a new seed in every run. The
+/// usual size always has the same seed: a change is judged by what it changes, not by luck.
+/// `VELOCOR_SEED` selects a seed, or a new one if it is `new`. Every run prints its seed, so that a
+/// failure can be reproduced.
 namespace Rounds {
 
 /// Whether the full size was requested.
@@ -27,13 +29,16 @@ inline int count(int usual, int full)
     return isFull() ? full : usual;
 }
 
-/// The seed of this process: the one requested, or a new one, which is printed.
+/// The seed of this process: the one requested or, if there is none, a new one at full size and
+/// always the same otherwise. It is printed.
 inline quint32 seed()
 {
     static const quint32 chosen = [] {
+        const QByteArray requested = qgetenv("VELOCOR_SEED");
         bool isNumber = false;
-        const quint32 asked = qgetenv("VELOCOR_SEED").toUInt(&isNumber);
-        const quint32 seed = isNumber ? asked : std::random_device()();
+        quint32 seed = requested.toUInt(&isNumber);
+        if (!isNumber)
+            seed = isFull() || requested == "new" ? std::random_device()() : 1;
         std::printf("seed: VELOCOR_SEED=%u\n", seed);
         std::fflush(stdout);
         return seed;

@@ -126,8 +126,12 @@ public:
     {
         SettingsDocument document;
         document.rootName = "R";
+        QStringList names;
         for (int sections = 1 + below(3); sections > 0; --sections) {
             const QString section = writtenName("S" + QString::number(sections));
+            if (names.contains(section))
+                continue; // a document holds each section once
+            names.append(section);
             document.sections.append({section, {}});
             for (int items = below(4); items > 0; --items)
                 document.SetValue(section, writtenName("k" + QString::number(items)), value());
