@@ -7,13 +7,10 @@
 // Google Benchmark cannot pace calls, so they are timed here; the results use its format.
 
 #include "log/LogEntrants.h"
+#include "support/Measurements.h"
 #include "support/ScratchFolder.h"
 
 #include <QCoreApplication>
-#include <QFile>
-#include <QJsonArray>
-#include <QJsonDocument>
-#include <QJsonObject>
 
 #include <algorithm>
 #include <chrono>
@@ -44,16 +41,6 @@ double NanosecondsOfOneEntry(LogEntrant& log)
     const Clock::time_point before = Clock::now();
     log.write();
     return std::chrono::duration<double, std::nano>(Clock::now() - before).count();
-}
-
-QJsonObject Measurement(QString const& group, char const* name, double nanoseconds)
-{
-    return {{"name", group + '|' + QLatin1String(name)},
-            {"run_type", "iteration"},
-            {"threads", 1},
-            {"iterations", 1},
-            {"real_time", nanoseconds},
-            {"time_unit", "ns"}};
 }
 
 class PacedRun
@@ -106,18 +93,18 @@ public:
         }
     }
 
-    QJsonObject result() const { return {{"benchmarks", m_measurements}}; }
+    Measurements const& measurements() const { return m_measurements; }
 
 private:
     void shuffle() { std::shuffle(m_runners.begin(), m_runners.end(), m_random); }
 
     void keep(QString const& group, Runner const& runner, double nanoseconds)
     {
-        m_measurements.append(Measurement(group, runner.name, nanoseconds));
+        m_measurements.add(group, runner.name, nanoseconds, "ns");
     }
 
     std::vector<Runner> m_runners;
-    QJsonArray m_measurements;
+    Measurements m_measurements;
     std::mt19937 m_random{std::random_device{}()};
 };
 
@@ -135,8 +122,6 @@ int main(int argc, char** argv)
     run.onePerMillisecond(quick ? 4 : 20);
     run.onePerSecond(quick ? 8 : 40);
 
-    QFile file(arguments[1]);
-    Require(file.open(QIODevice::WriteOnly), file.errorString());
-    file.write(QJsonDocument(run.result()).toJson());
+    run.measurements().save(arguments[1]);
     return 0;
 }

@@ -7,12 +7,8 @@
 // Google Benchmark measures within a process, so the starts are timed here; the results use its
 // format.
 
+#include "support/Measurements.h"
 #include "support/ScratchFolder.h"
-
-#include <QFile>
-#include <QJsonArray>
-#include <QJsonDocument>
-#include <QJsonObject>
 
 #include <algorithm>
 #include <array>
@@ -93,18 +89,6 @@ Start StartOnce(Program const& program)
             double(peak)};
 }
 
-QJsonObject Measurement(char const* group, Program const& program, double value,
-                        double processorValue, char const* unit)
-{
-    return {{"name", QLatin1String(group) + QLatin1Char('|') + QLatin1String(program.name)},
-            {"run_type", "iteration"},
-            {"threads", 1},
-            {"iterations", 1},
-            {"real_time", value},
-            {"cpu_time", processorValue},
-            {"time_unit", unit}};
-}
-
 } // namespace
 
 // bench_start RESULTS ROUNDS
@@ -115,14 +99,14 @@ int main(int argc, char** argv)
     ::setenv("QT_PLUGIN_PATH", VELOCOR_PROBE_PLUGINS, 1);
     ::setenv("QT_QPA_GENERIC_PLUGINS", "startprobe", 1);
 
-    std::array<Program, 3> programs = {
+    std::array<Program, 4> programs = {
         Program{"floor: bare QMainWindow", VELOCOR_BARE_WINDOW},
+        Program{"empty window, no OpenGL", VELOCOR_EMPTY_WINDOW},
         Program{"window of labels, no OpenGL", VELOCOR_LABEL_WINDOW},
         Program{"velocor", VELOCOR_PROGRAM},
     };
     std::mt19937 random{std::random_device{}()};
-    QJsonArray times;
-    QJsonArray memory;
+    Measurements measurements;
     const int rounds = std::atoi(argv[2]);
     for (int round = 0; round <= rounds; ++round) {
         std::shuffle(programs.begin(), programs.end(), random);
@@ -130,17 +114,11 @@ int main(int argc, char** argv)
             const Start start = StartOnce(program);
             if (round == 0) // not yet in the file cache, and creates the log's settings
                 continue;
-            times.append(Measurement("start, time", program, start.nanoseconds,
-                                     start.processorNanoseconds, "ns"));
-            memory.append(
-                Measurement("start, peak memory", program, start.peakKiB, start.peakKiB, "KiB"));
+            measurements.add("start, time", program.name, start.nanoseconds, "ns",
+                             start.processorNanoseconds);
+            measurements.add("start, peak memory", program.name, start.peakKiB, "KiB");
         }
     }
-    for (QJsonValue const& measurement : memory)
-        times.append(measurement);
-
-    QFile file(QString::fromLocal8Bit(argv[1]));
-    Require(file.open(QIODevice::WriteOnly), file.errorString());
-    file.write(QJsonDocument(QJsonObject{{"benchmarks", times}}).toJson());
+    measurements.save(QString::fromLocal8Bit(argv[1]));
     return 0;
 }

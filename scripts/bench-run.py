@@ -18,18 +18,23 @@ import subprocess
 import sys
 import tempfile
 
+import bench_charts
+
 ROOT = pathlib.Path(__file__).resolve().parent.parent
 DOCUMENT = ROOT / "docs" / "performance.md"
+CHARTS = ROOT / "docs" / "images" / "bench"
 BEGIN = "<!-- tables: written by ./bench --write-doc -->"
 END = "<!-- end of the tables -->"
 FLOOR = "floor"
 
 
 class Goal:
-    """`what` costs at most `factor` times what `other` costs, in each of `groups`."""
+    """`what` costs at most `factor` times what `other` costs, in each of `groups`; `given_up` says
+    for what it was given up, if it was."""
 
-    def __init__(self, groups, what, factor, other):
+    def __init__(self, groups, what, factor, other, given_up=None):
         self.groups, self.what, self.factor, self.other = groups, what, factor, other
+        self.given_up = given_up
 
 
 class Limit:
@@ -37,6 +42,7 @@ class Limit:
 
     def __init__(self, groups, what, nanoseconds):
         self.groups, self.what, self.nanoseconds = groups, what, nanoseconds
+        self.given_up = None
 
 
 class Section:
@@ -59,14 +65,21 @@ PARSES = ["parse generated document", "parse shared MIME database"]
 SECTIONS = {
     "log": Section(
         "Log entries",
-        [("bench_log", "google"), ("bench_log_paced", "own")],
+        [
+            ("bench_log", "google"),
+            ("bench_log_paced", "own"),
+            ("bench_log_tail", "own"),
+            ("bench_log_cost", "own"),
+            ("bench_log_kill", "own"),
+        ],
         (11, 3),
         goals=[
-            Goal(ENTRY, "TorkLog", 1.0, "spdlog basic_file_sink_mt"),
-            Goal(ENTRY, "TorkLog", 1.0, "spdlog rotating_file_sink_mt"),
-            Goal(ENTRY[:1], "TorkLog", 1.6, FLOOR),
-            Goal(PACED, "TorkLog", 1.0, "log4cplus"),
-            Goal(["off"], "TorkLog", 5.0, FLOOR),
+            Goal(ENTRY[:1], "TorkLog", 1.15, "spdlog basic_file_sink_mt"),
+            Goal(ENTRY[:1], "TorkLog", 1.15, "spdlog rotating_file_sink_mt"),
+            Goal(ENTRY[1:], "TorkLog", 1.0, "spdlog basic_file_sink_mt"),
+            Goal(ENTRY[1:], "TorkLog", 1.0, "spdlog rotating_file_sink_mt"),
+            Goal(PACED, "TorkLog", 1.0, "log4cplus", given_up="exact time stamps"),
+            Goal(["off"], "TorkLog", 1.4, FLOOR, given_up="an exact time of day"),
         ],
     ),
     "config": Section(
@@ -74,11 +87,11 @@ SECTIONS = {
         [("bench_config", "google")],
         (11, 3),
         goals=[
-            Goal(LOADS, "TorkConfigFile", 1.25, FLOOR),
+            Goal(LOADS, "TorkConfigFile", 1.1, "SAX reader, texts kept"),
             Goal(LOADS, "TorkConfigFile", 1.0, "KConfig"),
-            Goal(LOADS[1:], "TorkConfigFile", 1.0, "QSettings"),
-            Goal(SAVES, "TorkConfigFile", 1.2, "pugixml"),
-            Goal(SAVES, "TorkConfigFile", 0.1, "QSettings"),
+            Goal(LOADS, "TorkConfigFile", 1.0, "QSettings"),
+            Goal(SAVES, "TorkConfigFile", 0.6, "pugixml"),
+            Goal(SAVES, "TorkConfigFile", 2.0, FLOOR),
             Goal(["typed reads"], "TorkConfigFile", 1.5, FLOOR),
         ],
     ),
@@ -88,8 +101,7 @@ SECTIONS = {
         (7, 3),
         unit="element",
         goals=[
-            Goal(WRITES, "Tork", 3.0, FLOOR),
-            Goal(WRITES, "Tork", 1 / 3.5, "QXmlStreamWriter"),
+            Goal(WRITES, "Tork", 2.0, FLOOR),
         ],
     ),
     "parse": Section(
@@ -100,12 +112,11 @@ SECTIONS = {
     ),
     "start": Section(
         "Start to the first painted window",
-        [("bench_start", "display")],
+        [("bench_start", "display"), ("bench_idle", "display")],
         (40, 10),
         goals=[
-            Goal(["start, time"], "velocor", 0.75, FLOOR),
+            Goal(["start, time"], "velocor", 1.05, "empty window"),
             Goal(["start, peak memory"], "velocor", 0.5, FLOOR),
-            Goal(["start, time"], "velocor", 1.1, "window of labels"),
         ],
     ),
     "window": Section(
@@ -129,6 +140,7 @@ class Samples:
     def __init__(self):
         self.groups = {}
         self.units = {}
+        self.rows = {}  # by group and contestant: lists of (column, value, unit)
 
     def add(self, group, name, value, unit, units=None):
         samples = self.groups.setdefault(group, {}).setdefault(name, {"values": [], "unit": unit})
@@ -160,6 +172,9 @@ def collect(samples, results, use_cpu):
     for entry in sorted(results["benchmarks"], key=lambda entry: entry.get("family_index", 0)):
         if entry.get("error_occurred"):
             sys.exit(f"bench: {entry['name']}: {entry['error_message']}")
+        if entry["run_type"] == "row":
+            group, name = entry["name"].rsplit("|", 1)
+            samples.rows.setdefault(group, {})[name] = entry["columns"]
         if entry["run_type"] != "iteration":
             continue
         full_name = entry["name"].split("/")[0]
@@ -304,7 +319,26 @@ def contestants_table(samples, group, unit_name):
         if floor:
             row.append(f"{median / samples.median(group, floor):.2f}")
         rows.append(row)
-    return f"### {group[0].upper()}{group[1:]}\n\n{table(header, rows)}\n"
+    return table(header, rows) + "\n"
+
+
+def plain_or_formatted(value, unit):
+    if unit:
+        return formatted(value, unit)
+    return f"{value:,.0f}" if value == int(value) else f"{value:.2f}"
+
+
+def rows_table(rows):
+    """One line per contestant, sorted by its first column if that is a time."""
+    names = list(rows)
+    if rows[names[0]][0][2] == "ns":
+        names.sort(key=lambda name: rows[name][0][1])
+    header = ["", *(column for column, _, _ in rows[names[0]])]
+    lines = [
+        [name, *(plain_or_formatted(value, unit) for _, value, unit in rows[name])]
+        for name in names
+    ]
+    return table(header, lines) + "\n"
 
 
 def growth_table(samples):
@@ -351,15 +385,50 @@ def goal_lines(section, samples):
         for group in goal.groups:
             wanted, value, reached = judge(goal, samples, group)
             verdict = "reached" if reached else "NOT REACHED"
+            if goal.given_up and not reached:
+                verdict = f"given up for {goal.given_up}"
             lines.append(f"- {group}: {wanted}: {value}, {verdict}")
     return "\n".join(lines) + "\n" if lines else ""
 
 
-def report(name, section, samples):
+def charts_of(samples):
+    """The charts of a section by group: medians with their quartiles, or p50 with p99."""
+    charts = {}
+    for group, contestants in samples.groups.items():
+        rows = []
+        for name in sorted(contestants, key=lambda key: samples.median(group, key)):
+            values, unit = contestants[name]["values"], contestants[name]["unit"]
+            median = samples.median(group, name)
+            low, _, high = statistics.quantiles(values, n=4, method="inclusive")
+            rows.append((name, median, low, high, formatted(median, unit)))
+        charts[group] = bench_charts.chart(rows)
+    for group, contestants in samples.rows.items():
+        rows = []
+        for name, columns in contestants.items():
+            figures = {column: value for column, value, _ in columns}
+            if "p99" in figures:
+                text = formatted(figures["p50"], "ns")
+                rows.append((name, figures["p50"], figures["p50"], figures["p99"], text))
+        if rows:
+            charts[group] = bench_charts.chart(sorted(rows, key=lambda row: row[1]))
+    return charts
+
+
+def titled(group, text, charts):
+    title = group[0].upper() + group[1:]
+    picture = f"![{title}](images/bench/{bench_charts.file_name(group)})\n\n"
+    return f"### {title}\n\n{picture if group in charts else ''}{text}"
+
+
+def report(name, section, samples, charts):
     if name == "growth":
         parts = [growth_table(samples)]
     else:
-        parts = [contestants_table(samples, group, section.unit) for group in samples.groups]
+        parts = [
+            titled(group, contestants_table(samples, group, section.unit), charts)
+            for group in samples.groups
+        ]
+    parts += [titled(group, rows_table(rows), charts) for group, rows in samples.rows.items()]
     goals = goal_lines(section, samples)
     return "\n".join([f"## {section.title}\n", *parts] + ([goals] if goals else []))
 
@@ -436,12 +505,17 @@ def main():
         parser.error("--write-doc needs a full run")
 
     parts = [machine(options) + "\n"]
+    charts = {}
     print(parts[0], flush=True)
     for name in names:
         section = SECTIONS[name]
-        parts.append(report(name, section, measure(section, options.programs, options)))
+        samples = measure(section, options.programs, options)
+        if options.write_doc and name != "growth":
+            charts.update(charts_of(samples))
+        parts.append(report(name, section, samples, charts))
         print(parts[-1], flush=True)
     if options.write_doc:
+        bench_charts.write(CHARTS, charts)
         write_document("\n".join(parts))
 
 

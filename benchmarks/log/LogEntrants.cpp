@@ -9,18 +9,6 @@
 
 namespace {
 
-// The maximum number of occurrences of the message in one file, because some libraries write links
-// and further files next to their log.
-int EntriesIn(QString const& folder)
-{
-    int most = 0;
-    const QByteArray message = QByteArray::fromStdString(LogMessage());
-    const QStringList files = QDir(folder).entryList(QDir::Files);
-    for (QString const& file : files)
-        most = qMax(most, ReadAll(folder + file).count(message));
-    return most;
-}
-
 void Check(LogEntrantDescription const& entrant)
 {
     const ScratchFolder folder;
@@ -33,6 +21,16 @@ void Check(LogEntrantDescription const& entrant)
 }
 
 } // namespace
+
+int EntriesIn(QString const& folder)
+{
+    int most = 0;
+    const QByteArray message = QByteArray::fromStdString(LogMessage());
+    const QStringList files = QDir(folder).entryList(QDir::Files);
+    for (QString const& file : files)
+        most = qMax(most, ReadAll(folder + file).count(message));
+    return most;
+}
 
 std::vector<LogEntrantDescription> CheckedLogEntrants()
 {

@@ -29,6 +29,7 @@ public:
     }
 
     void write() override { TorkLog::m_gLog->write(TorkLog::Notification, m_message); }
+    void reopen() override { TorkLog::m_gLog->close(); }
 
 private:
     QtMessageHandler m_handler;
@@ -44,6 +45,13 @@ public:
     void write() override { QMessageLogger().info().noquote() << m_message; }
 };
 
+void SetLimit(QString const& folder, int bytes)
+{
+    TorkConfigFile settings(folder + "logsettings.cfg", "LogSettings");
+    settings.WriteItem("config", "maxLogFileSize", bytes);
+    settings.Save();
+}
+
 } // namespace
 
 std::unique_ptr<LogEntrant> MakeTorkLogEntrant(QString const& folder)
@@ -53,9 +61,13 @@ std::unique_ptr<LogEntrant> MakeTorkLogEntrant(QString const& folder)
 
 std::unique_ptr<LogEntrant> MakeTorkLogBelowLimitEntrant(QString const& folder)
 {
-    TorkConfigFile settings(folder + "logsettings.cfg", "LogSettings");
-    settings.WriteItem("config", "maxLogFileSize", 2000000000);
-    settings.Save();
+    SetLimit(folder, 2000000000);
+    return MakeTorkLogEntrant(folder);
+}
+
+std::unique_ptr<LogEntrant> MakeTorkLogSmallEntrant(QString const& folder)
+{
+    SetLimit(folder, 100000);
     return MakeTorkLogEntrant(folder);
 }
 
