@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <cstring>
+#include <limits>
 
 namespace Velocor {
 
@@ -20,8 +21,13 @@ constexpr size_t MaximumReread = 1000;
 // Concurrent threads may write their entries in a different order than they stamped them.
 constexpr qint64 Tolerance = 20; // milliseconds
 
-// Twelve hours, in the units of LogTimeReader keys.
-constexpr qint64 HalfADay = qint64(12) * 60 * 61 * 1000;
+// In the units of LogTimeReader keys, whose minutes have 61 seconds.
+constexpr qint64 Hour = qint64(60) * 61 * 1000;
+constexpr qint64 HalfADay = 12 * Hour;
+
+// The most that the end of daylight saving time sets a clock back; and a minute, because stamps may
+// be given in minutes.
+constexpr qint64 ClockChange = Hour + qint64(61) * 1000;
 
 template <class T>
 void MoveTail(std::vector<T>& from, size_t first, std::vector<T>& to)
@@ -38,8 +44,8 @@ void AppendTail(std::vector<T>& to, std::vector<T> const& from, size_t first)
 
 } // namespace
 
-LogIndex::LogIndex(LogLineParser const& parser, LogFilter const& filter)
-    : m_parser(parser), m_filter(filter)
+LogIndex::LogIndex(LogLineParser const& parser, LogFilter const& filter, bool isOneRun)
+    : m_parser(parser), m_filter(filter), m_isOneRun(isOneRun)
 {
     m_runs.emplace_back();
 }
@@ -83,20 +89,22 @@ qint64 LogIndex::resumeOffset() const
 
 qint64 LogIndex::Begin()
 {
+    const bool isFirst = m_starts.empty();
+    const bool hasSeam = m_runs.size() > 1;
+    m_formerEnd = m_position;
+    m_knownEnd = m_lastIsComplete || isFirst ? m_position : m_starts.back();
+    m_knownSeam = hasSeam ? m_starts[m_runs[1].firstLine] : -1;
+    m_isSeamUnchanged = false;
+    m_hasMoved = false;
+    // What follows a file that was read to its end was added to it, however old it looks.
+    if (m_isOneRun || (!isFirst && !hasSeam))
+        m_seamLimit = 0;
+    else
+        m_seamLimit = isFirst ? std::numeric_limits<qint64>::max() : m_knownEnd;
+
     m_position = resumeOffset();
     const size_t resume = resumeLine();
-
-    m_knownRuns.clear();
-    m_knownStarts.clear();
-    m_knownMarks.clear();
-    if (m_runs.size() > 1) {
-        const size_t seam = m_runs[1].firstLine;
-        m_knownRuns.assign(m_runs.begin() + 1, m_runs.end());
-        for (Run& run : m_knownRuns)
-            run.firstLine -= seam;
-        MoveTail(m_starts, seam, m_knownStarts);
-        MoveTail(m_marks, seam, m_knownMarks);
-    }
+    keepKnownLines();
     forgetFrom(resume);
 
     m_lineStart = m_position;
@@ -104,6 +112,29 @@ qint64 LogIndex::Begin()
     m_lineIsPartial = false;
     m_lastIsComplete = true;
     return m_position;
+}
+
+// Sets the lines after the seam aside, but for an incomplete last one.
+void LogIndex::keepKnownLines()
+{
+    m_knownRuns.clear();
+    m_knownStarts.clear();
+    m_knownMarks.clear();
+    if (m_runs.size() < 2)
+        return;
+
+    const size_t seam = m_runs[1].firstLine;
+    m_knownRuns.assign(m_runs.begin() + 1, m_runs.end());
+    for (Run& run : m_knownRuns)
+        run.firstLine -= seam;
+    MoveTail(m_starts, seam, m_knownStarts);
+    MoveTail(m_marks, seam, m_knownMarks);
+    if (!m_lastIsComplete) {
+        m_knownStarts.pop_back();
+        m_knownMarks.pop_back();
+    }
+    while (m_knownRuns.size() > 1 && m_knownRuns.back().firstLine >= m_knownStarts.size())
+        m_knownRuns.pop_back();
 }
 
 bool LogIndex::Feed(char const* bytes, int count)
@@ -136,11 +167,11 @@ bool LogIndex::Feed(char const* bytes, int count)
 
 void LogIndex::End()
 {
-    if (m_lineIsPartial)
-        addLine(m_partialLine.constData(), m_partialLine.size(), false);
     m_knownRuns.clear();
     m_knownStarts.clear();
     m_knownMarks.clear();
+    if (m_lineIsPartial)
+        addLine(m_partialLine.constData(), m_partialLine.size(), false);
 }
 
 quint8 LogIndex::markOf(LogLineParser::Parts const& parts, char const* line, int length) const
@@ -157,20 +188,23 @@ quint8 LogIndex::markOf(LogLineParser::Parts const& parts, char const* line, int
     return mark;
 }
 
-// Returns false if the rest of the file is known.
+// Returns false if the lines up to the new position are known.
 bool LogIndex::addLine(char const* line, int length, bool complete)
 {
+    const qint64 end = m_lineStart + length + 1;
     if (length > 0 && line[length - 1] == '\r')
         --length;
     const LogLineParser::Parts parts = m_parser.Find(line, std::min(length, LineLimit));
     m_hasElapsed = m_hasElapsed || parts.elapsedLength > 0;
     m_lastIsComplete = complete;
 
-    if (isOlder(parts)) {
+    if (isSeam(parts, end)) {
         beginRun(parts);
         if (joinKnownLines(m_lineStart))
             return false;
     }
+    if (m_isSeamUnchanged && m_lineStart >= m_formerEnd)
+        joinRuns();
     m_marks.push_back(markOf(parts, line, std::min(length, LineLimit)));
     m_starts.push_back(m_lineStart);
     if (parts.timeKey >= 0)
@@ -178,18 +212,64 @@ bool LogIndex::addLine(char const* line, int length, bool complete)
     return true;
 }
 
-bool LogIndex::isOlder(LogLineParser::Parts const& parts) const
+bool LogIndex::isSeam(LogLineParser::Parts const& parts, qint64 end) const
 {
-    if (parts.timeKey < 0 || !m_runHasTimed || m_runs.size() >= MaximumRuns)
+    if (parts.timeKey < 0 || !m_runHasTimed || m_runs.size() >= MaximumRuns ||
+        m_lineStart >= m_seamLimit)
         return false;
     Run const& run = m_runs.back();
-    // A run logs its settings in the default format before it switches to another.
-    if (parts.hasDate != run.hasDate)
-        return run.timedLines > 1;
-    if (parts.timeKey + Tolerance >= run.firstTime || parts.timeKey >= m_lastTime)
+    const bool changesFormat = parts.hasDate != run.hasDate && run.timedLines > 1;
+    const bool isEarlier = parts.hasDate == run.hasDate && isOlder(parts);
+    if (!m_knownStarts.empty())
+        return (changesFormat || isEarlier) && isKnown(parts, end);
+
+    const bool followsRest = m_starts.size() > m_lastTimed + 1;
+    // A run logs its settings in the default format, with a date, before it switches to another.
+    return (changesFormat && (followsRest || parts.hasDate)) ||
+           (isEarlier && (followsRest || parts.timeKey + ClockChange < m_lastTime));
+}
+
+bool LogIndex::isOlder(LogLineParser::Parts const& parts) const
+{
+    Run const& run = m_runs.back();
+    if (parts.timeKey + Tolerance + parts.resolution > std::min(run.firstTime, m_lastTime))
         return false;
     const bool isNextDay = !run.hasDate && m_lastTime - parts.timeKey > HalfADay;
     return !isNextDay;
+}
+
+// Whether the current line, which ends at `end`, is one of those that followed the seam. The rest
+// of a torn entry is not: where it was, the newest run writes next.
+bool LogIndex::isKnown(LogLineParser::Parts const& parts, qint64 end) const
+{
+    const auto found = std::lower_bound(m_knownStarts.begin(), m_knownStarts.end(), m_lineStart);
+    if (found == m_knownStarts.end() || *found != m_lineStart)
+        return false;
+    const quint8 mark = m_knownMarks[static_cast<size_t>(found - m_knownStarts.begin())];
+    const bool isLast = found + 1 == m_knownStarts.end();
+    return !(mark & LogRows::Torn) && (mark & LogRows::Timed) &&
+           (mark & LogRows::SeverityMask) == static_cast<quint8>(parts.severity) &&
+           end == (isLast ? m_knownEnd : found[1]);
+}
+
+// The log writes at the end of the file, so whatever looked like a seam was none.
+void LogIndex::joinRuns()
+{
+    for (size_t number = 1; number < m_runs.size(); ++number) {
+        const size_t first = m_runs[number].firstLine;
+        if (m_marks[first] & LogRows::Torn)
+            m_marks[first] = (m_marks[first - 1] & LogRows::SeverityMask) | LogRows::Continued |
+                             (m_marks[first] & LogRows::Unmatched);
+    }
+    m_runs.resize(1);
+    m_isSeamUnchanged = false;
+    m_isOneRun = true;
+    m_hasMoved = true;
+    m_runHasTimed = true;
+    m_newestLastTimed = m_marks.size() - 1;
+    while (!(m_marks[m_newestLastTimed] & LogRows::Timed))
+        --m_newestLastTimed; // the first line of each run but the newest follows a timed one
+    m_lastTimed = m_newestLastTimed;
 }
 
 // The last line without a time before an older entry is the rest of a torn entry.
@@ -214,6 +294,10 @@ bool LogIndex::joinKnownLines(qint64 start)
     if (found == m_knownStarts.end() || *found != start || m_runs.size() != 2)
         return false;
 
+    const qint64 seam =
+        m_runs[1].firstLine < m_starts.size() ? m_starts[m_runs[1].firstLine] : start;
+    m_isSeamUnchanged = seam == m_knownSeam;
+    m_hasMoved = !m_isSeamUnchanged;
     const auto first = static_cast<size_t>(found - m_knownStarts.begin());
     const size_t joint = m_starts.size();
     AppendTail(m_starts, m_knownStarts, first);
@@ -227,7 +311,13 @@ bool LogIndex::joinKnownLines(qint64 start)
         known.firstLine += joint - first;
         m_runs.push_back(known);
     }
+    m_runHasTimed = true;
+    m_lastTimed = m_starts.size() - 1;
     m_lineIsPartial = false;
+    m_partialLine.clear();
+    m_seamLimit = 0;
+    m_position = m_knownEnd;
+    m_lineStart = m_knownEnd;
     return true;
 }
 

@@ -22,21 +22,30 @@ namespace Velocor {
 ///     newest run  |  rest of previous run    |  rest of an earlier one
 ///                 ^ the seam                 ^ another
 ///
-/// A seam is where an entry is older than both the previous entry and the first entry of its run.
+/// A seam is where an entry is older than both the previous entry and the first entry of its run,
+/// and follows the rest of a torn entry; or where it is so much older that no change of clocks
+/// explains it. That is a guess: a clock may be set back after an entry of several lines. It
+/// decides only the order of the runs. Every line of the file is indexed, wherever seams are.
+///
 /// As the newest run writes more entries, its seam moves; Begin() returns to the last entry before
-/// it, and Feed() stops as soon as it reaches a known line.
+/// it, and Feed() skips the lines that are known to follow it. If the file grows at its end while
+/// the seam stays, it was none: the log writes at the end.
 ///
 /// Pure: the caller supplies the bytes. One thread at a time.
 ///
-///     qint64 offset = index.Begin();
-///     while (... && index.Feed(bytes, count)) {}
+///     file.seek(index.Begin());
+///     while ((count = file.read(bytes, size)) > 0) {
+///         if (!index.Feed(bytes, count))
+///             file.seek(index.nextOffset());
+///     }
 ///     index.End();
 ///     LogRows rows = index.Rows(filter);
 class LogIndex
 {
 public:
+    /// @param isOneRun  whether all lines are known to be of one run, so that no seam is looked for
     explicit LogIndex(LogLineParser const& parser = LogLineParser(),
-                      LogFilter const& filter = LogFilter());
+                      LogFilter const& filter = LogFilter(), bool isOneRun = false);
 
     /// Starts a pass over the file.
     ///
@@ -45,8 +54,12 @@ public:
 
     /// Processes the next bytes of the file.
     ///
-    /// @return false if the rest of the file is known from the previous pass; stop reading then
+    /// @return false if the lines before nextOffset() are known from the previous pass, and reading
+    ///         must go on there
     bool Feed(char const* bytes, int count);
+
+    /// The offset of the next bytes to feed; after End(), where the file ended.
+    qint64 nextOffset() const { return m_position; }
 
     /// Ends the pass at the end of the file; a last line without a line end counts as a line.
     void End();
@@ -63,6 +76,12 @@ public:
 
     /// The number of runs with entries in the file, at most 64: later ones are not distinguished.
     size_t runs() const { return m_runs.size(); }
+
+    /// Whether the file was seen growing at its end, so that all of its lines are of one run.
+    bool isOneRun() const { return m_isOneRun; }
+
+    /// Whether the last pass found the seam in another place, or that it was none.
+    bool hasMoved() const { return m_hasMoved; }
 
     /// Whether any entry has an elapsed time.
     bool hasElapsed() const { return m_hasElapsed; }
@@ -83,7 +102,11 @@ private:
     void forgetFrom(size_t line);
     bool addLine(char const* line, int length, bool complete);
     quint8 markOf(LogLineParser::Parts const& parts, char const* line, int length) const;
+    bool isSeam(LogLineParser::Parts const& parts, qint64 end) const;
     bool isOlder(LogLineParser::Parts const& parts) const;
+    bool isKnown(LogLineParser::Parts const& parts, qint64 end) const;
+    void keepKnownLines();
+    void joinRuns();
     void beginRun(LogLineParser::Parts const& parts);
     bool joinKnownLines(qint64 start);
     void noteTime(LogLineParser::Parts const& parts);
@@ -102,7 +125,11 @@ private:
     size_t m_newestLastTimed = 0;
     qint64 m_newestLastTime = -1;
 
+    bool m_isOneRun = false;
+    bool m_hasMoved = false;
+
     // The current pass.
+    qint64 m_seamLimit = 0; // no seam from here on
     qint64 m_position = 0;
     qint64 m_lineStart = 0;
     QByteArray m_partialLine;
@@ -111,7 +138,11 @@ private:
     size_t m_lastTimed = 0;
     qint64 m_lastTime = -1;
 
-    // What the previous pass found after the seam.
+    // What the previous pass found: the end of the file, and the complete lines after the seam.
+    qint64 m_formerEnd = 0;
+    qint64 m_knownEnd = 0;
+    qint64 m_knownSeam = -1; // -1: there was none
+    bool m_isSeamUnchanged = false;
     std::vector<qint64> m_knownStarts;
     std::vector<quint8> m_knownMarks;
     std::vector<Run> m_knownRuns;

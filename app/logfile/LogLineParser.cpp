@@ -95,6 +95,7 @@ bool LogLineParser::findByFormat(char const* line, int length, Parts& parts) con
         parts.timeLength = blank;
         parts.timeKey = stamp.key;
         parts.hasDate = reader.hasDate();
+        parts.resolution = reader.resolution();
         parts.severity = name ? name->severity : LogEntry::None;
         parts.message = std::min(length, blank + 2 + (name ? name->text.size() : 0));
         return true;

@@ -31,6 +31,7 @@ public:
         int timeLength = 0;
         qint64 timeKey = -1; ///< see LogTimeReader::Stamp; -1 if the time is unknown
         bool hasDate = false;
+        int resolution = 1; ///< see LogTimeReader::resolution()
         LogEntry::Severity severity = LogEntry::None;
         int elapsed = 0; ///< start of the elapsed milliseconds
         int elapsedLength = 0;

@@ -15,6 +15,7 @@ namespace {
 constexpr int SliceSize = 1 << 20;
 constexpr int HeadSize = 256;
 constexpr int AnchorSize = 256;
+constexpr int TailSize = 256;
 
 // Within this time, two changes may have the same modification time.
 constexpr qint64 StampUncertainty = 2000; // milliseconds
@@ -50,7 +51,7 @@ void LogScanner::Open(int request, QString const& path, LogLineParser const& par
     m_parser = parser;
     m_filter = filter;
     if (isCurrentRequest())
-        readFromStart();
+        readFromStart(false);
 }
 
 void LogScanner::SetFilter(int request, LogFilter const& filter)
@@ -63,23 +64,24 @@ void LogScanner::SetFilter(int request, LogFilter const& filter)
     else if (sameText && m_complete)
         report(true);
     else
-        readFromStart();
+        readFromStart(m_index.isOneRun());
 }
 
-void LogScanner::startOver()
+void LogScanner::startOver(bool isOneRun)
 {
-    m_index = LogIndex(m_parser, m_filter);
+    m_index = LogIndex(m_parser, m_filter, isOneRun);
     m_rows = std::make_shared<LogRows>();
     m_head.clear();
     m_anchor.clear();
+    m_tail.clear();
     m_size = 0;
     m_modified = QDateTime();
     m_complete = false;
 }
 
-void LogScanner::readFromStart()
+void LogScanner::readFromStart(bool isOneRun)
 {
-    startOver();
+    startOver(isOneRun);
     QFile file(m_path);
     if (!QFileInfo(m_path).isFile() || !file.open(QIODevice::ReadOnly)) {
         m_error = ErrorOf(file);
@@ -88,25 +90,25 @@ void LogScanner::readFromStart()
     }
     m_exists = true;
     m_error.clear();
-    if (readFrom(file, m_index.Begin()))
+    if (readFrom(file))
         report(true);
 }
 
 void LogScanner::reportMissing()
 {
-    startOver();
+    startOver(false);
     m_exists = false;
     m_complete = true;
     report(true);
 }
 
 // Returns false if a newer request has arrived.
-bool LogScanner::readFrom(QFile& file, qint64 offset)
+bool LogScanner::readFrom(QFile& file)
 {
     m_modified = QFileInfo(m_path).lastModified();
     const qint64 size = file.size();
     QByteArray slice(SliceSize, Qt::Uninitialized);
-    bool more = file.seek(offset);
+    bool more = file.seek(m_index.Begin());
     int reported = 0;
     while (more) {
         if (!isCurrentRequest())
@@ -114,7 +116,8 @@ bool LogScanner::readFrom(QFile& file, qint64 offset)
         const qint64 count = file.read(slice.data(), slice.size());
         if (count <= 0)
             break;
-        more = m_index.Feed(slice.constData(), static_cast<int>(count));
+        if (!m_index.Feed(slice.constData(), static_cast<int>(count)))
+            more = file.seek(m_index.nextOffset());
         const int percent = size > 0 ? static_cast<int>(file.pos() * 100 / size) : 100;
         if (percent >= reported + 10) {
             reported = percent;
@@ -122,9 +125,25 @@ bool LogScanner::readFrom(QFile& file, qint64 offset)
         }
     }
     m_index.End();
-    m_complete = true;
     noteFile(file);
+    m_complete = m_size >= m_index.nextOffset(); // otherwise it was truncated meanwhile
     return true;
+}
+
+// Reads what the file has got since the last pass. A modification without anything new where the
+// index expects it was made elsewhere.
+void LogScanner::readChanges(QFile& file)
+{
+    const QDateTime modified = m_modified;
+    const qint64 end = m_index.nextOffset();
+    m_complete = false; // until the pass is over
+    if (!readFrom(file))
+        return;
+    const bool isNew = m_index.hasMoved() || m_index.nextOffset() != end;
+    if (!isNew && m_modified != modified)
+        readFromStart(false);
+    else
+        report(false);
 }
 
 void LogScanner::noteFile(QFile& file)
@@ -134,13 +153,17 @@ void LogScanner::noteFile(QFile& file)
     m_head = BytesAt(file, 0, std::min<qint64>(HeadSize, m_anchorEnd));
     const qint64 start = std::max<qint64>(0, m_anchorEnd - AnchorSize);
     m_anchor = BytesAt(file, start, m_anchorEnd - start);
+    const qint64 end = m_index.nextOffset();
+    m_tail = BytesAt(file, std::max<qint64>(0, end - TailSize), std::min<qint64>(end, TailSize));
 }
 
 bool LogScanner::isSameFile(QFile& file) const
 {
     if (file.size() < m_size || !BytesAt(file, 0, HeadSize).startsWith(m_head))
         return false;
-    return BytesAt(file, m_anchorEnd - m_anchor.size(), m_anchor.size()) == m_anchor;
+    const qint64 end = m_index.nextOffset();
+    return BytesAt(file, m_anchorEnd - m_anchor.size(), m_anchor.size()) == m_anchor &&
+           BytesAt(file, end - m_tail.size(), m_tail.size()) == m_tail;
 }
 
 bool LogScanner::looksUnchanged() const
@@ -166,11 +189,9 @@ void LogScanner::Poll()
         m_error = ErrorOf(file);
         reportMissing();
     } else if (opened && (!m_complete || !m_exists || !isSameFile(file))) {
-        readFromStart();
+        readFromStart(false);
     } else if (opened) {
-        m_complete = false; // until the pass is over
-        if (readFrom(file, m_index.Begin()))
-            report(false);
+        readChanges(file);
     }
     Q_EMIT polled(); // NOLINT(readability-misleading-indentation): Q_EMIT is empty
 }

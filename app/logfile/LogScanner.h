@@ -19,9 +19,10 @@ namespace Velocor {
 /// Reads a log file in its own thread and reports the rows for a view of it.
 ///
 /// The file is read in slices through an ordinary handle: with a mapped file, the program would
-/// crash if the file were truncated. The file is identified by its first bytes and by those before
-/// the position where reading resumes; if either has changed, it is another file or another run and
-/// is read from the start.
+/// crash if the file were truncated. The file is identified by its first bytes, by those before the
+/// position where reading resumes, and by its last; if any have changed, it is another file or
+/// another run and is read from the start. So it is if the file was modified and nothing new is
+/// found where it is expected.
 ///
 /// Requests are numbered; SetCurrentRequest() with a later number cancels work on an earlier one.
 /// SetCurrentRequest() may be called from any thread, everything else only from the scanner's.
@@ -53,14 +54,15 @@ Q_SIGNALS:
 
 private:
     bool isCurrentRequest() const { return m_currentRequest == m_request; }
-    void readFromStart();
-    bool readFrom(QFile& file, qint64 offset);
+    void readFromStart(bool isOneRun);
+    bool readFrom(QFile& file);
+    void readChanges(QFile& file);
     bool looksUnchanged() const;
     bool isSameFile(QFile& file) const;
     void noteFile(QFile& file);
     void reportMissing();
     void report(bool isReset);
-    void startOver();
+    void startOver(bool isOneRun);
 
     std::atomic<int> m_currentRequest{0};
     int m_request = 0;
@@ -78,6 +80,7 @@ private:
     QByteArray m_head;
     QByteArray m_anchor;
     qint64 m_anchorEnd = 0;
+    QByteArray m_tail;
 };
 
 } // namespace Velocor

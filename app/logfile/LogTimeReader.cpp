@@ -71,6 +71,7 @@ LogTimeReader::LogTimeReader(QString const& format) : m_fractionOfSecond(WritesF
         found[token.field] = true;
     m_hasDate = (found[Year] || found[ShortYear]) && found[Month] && found[Day];
     m_hasTime = found[Hour] && found[Minute];
+    m_resolution = found[Fraction] ? 1 : found[Second] ? 1000 : 61 * 1000;
 }
 
 void LogTimeReader::parseFormat(QString const& format)

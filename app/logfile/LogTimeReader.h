@@ -38,6 +38,10 @@ public:
     /// Whether time stamps have a year, month and day; without them, keys restart at midnight.
     bool hasDate() const { return m_hasDate; }
 
+    /// By how much the keys of different time stamps differ at least: that of a millisecond, a
+    /// second or a minute.
+    int resolution() const { return m_resolution; }
+
 private:
     enum Field { Literal, Year, ShortYear, Month, Day, Hour, Minute, Second, Fraction, HalfDay };
     enum Kind { Exactly, Number, MonthName, Word };
@@ -67,6 +71,7 @@ private:
     std::vector<Token> m_tokens;
     std::vector<QByteArray> m_monthNames; // long and short names alternate, January first
     bool m_hasDate = false;
+    int m_resolution = 1;
     bool m_hasTime = false;
     bool m_fractionOfSecond = false;
 };

@@ -20,11 +20,10 @@ namespace {
 void Pass(LogIndex& index, QByteArray const& file, int slice)
 {
     qint64 offset = index.Begin();
-    bool more = true;
-    while (more && offset < file.size()) {
+    while (offset < file.size()) {
         const QByteArray bytes = file.mid(static_cast<int>(offset), slice);
-        more = index.Feed(bytes.constData(), bytes.size());
-        offset += bytes.size();
+        const bool goesOn = index.Feed(bytes.constData(), bytes.size());
+        offset = goesOn ? offset + bytes.size() : index.nextOffset();
     }
     index.End();
 }
@@ -85,6 +84,7 @@ private slots:
     void problems();
     void passesOverAWritingRun_data();
     void passesOverAWritingRun();
+    void growthAtTheEndMakesOneRun();
     void readsOnlyWhatIsNew();
     void incompleteLastLine();
     void anyBytes();
@@ -137,6 +137,11 @@ void tst_LogIndex::order_data()
         entry("01:00:00.000", "Trace", "start") + entry("02:59:59.000", "Trace", "summer") +
         entry("02:00:01.000", "Trace", "winter") + entry("02:30:00.000", "Trace", "on");
     QTest::newRow("a clock that is set back is no seam") << back << Lines(back);
+
+    const QByteArray shortRun =
+        entry("03:10:00.000", "Trace", "summer") + entry("02:10:01.000", "Error", "winter");
+    QTest::newRow("a short run whose clock is set back an hour is no seam")
+        << shortRun << Lines(shortRun);
 
     const QByteArray threads = entry("09:00:00.010", "Trace", "a") +
                                entry("09:00:00.012", "Trace", "b") +
@@ -191,13 +196,13 @@ void tst_LogIndex::manyRuns()
 {
     QByteArray file;
     for (int i = 1000; i > 0; --i)
-        file += entry(QTime(0, 0).addSecs(i * 60).toString("hh:mm:ss.zzz"), "Trace",
-                      QString::number(i));
+        file += "rest\n" + entry(QTime(0, 0).addSecs(i * 60).toString("hh:mm:ss.zzz"), "Trace",
+                                 QString::number(i));
     LogIndex index;
     Pass(index, file, 4096);
     QVERIFY(index.runs() <= 64);
-    QCOMPARE(index.size(), size_t(1000));
-    QCOMPARE(index.Rows(LogFilter()).size(), size_t(1002));
+    QCOMPARE(index.size(), size_t(2000));
+    QCOMPARE(index.Rows(LogFilter()).size(), size_t(2002));
 }
 
 void tst_LogIndex::dateFormats_data()
@@ -210,10 +215,10 @@ void tst_LogIndex::dateFormats_data()
         << "dd.MM.yyyy hh:mm" << QByteArray("02.04.2025 09:00 Trace a\n02.04.2025 09:01 Trace b\n")
         << QByteArray("03.03.2025 09:00 Trace c\n03.03.2025 09:01 Trace d\n");
     QTest::newRow("time of day only") << "hh:mm" << QByteArray("09:00 Trace a\n09:01 Trace b\n")
-                                      << QByteArray("08:00 Trace c\n08:01 Trace d\n");
+                                      << QByteArray("07:00 Trace c\n07:01 Trace d\n");
     QTest::newRow("the first entry is still in the default format")
         << "hh:mm" << QByteArray("2025-03-03 09:00:00.000 Trace a\n09:01 Trace b\n09:02 Trace x\n")
-        << QByteArray("08:00 Trace c\n08:01 Trace d\n");
+        << QByteArray("07:00 Trace c\n07:01 Trace d\n");
     QTest::newRow("the older run wrote dates")
         << "hh:mm" << QByteArray("09:00 Trace a\n09:01 Trace b\n")
         << QByteArray("2025-03-03 10:00:00.000 Trace c\n2025-03-03 10:00:01.000 Trace d\n");
@@ -226,6 +231,12 @@ void tst_LogIndex::dateFormats()
     QFETCH(QByteArray, older);
     QCOMPARE(TextsOf(newer + older, LogLineParser({format}, {})),
              QStringList("[earlier]") + Lines(older) + QStringList("[newest]") + Lines(newer));
+
+    // The settings are logged in the default format, before the one from the settings is in force.
+    const QByteArray switched = QByteArray("2025-03-03 09:00:35.310 Trace a\n"
+                                           "2025-03-03 09:00:35.311 Trace b\n") +
+                                newer;
+    QCOMPARE(TextsOf(switched, LogLineParser({format}, {})), Lines(switched));
 
     const QByteArray midnight("23:59 Trace a\n00:00 Trace b\n00:01 Trace c\n");
     QCOMPARE(TextsOf(midnight, LogLineParser({"hh:mm"}, {})), Lines(midnight));
@@ -341,6 +352,26 @@ void tst_LogIndex::passesOverAWritingRun()
                 newest += "it goes on\n";
         }
     }
+}
+
+// A seam that stays while the file grows behind it was a clock that was set back.
+void tst_LogIndex::growthAtTheEndMakesOneRun()
+{
+    QByteArray file = entry("03:10:00.000", "Trace", "summer") + "continued\n" +
+                      entry("02:10:01.000", "Error", "winter");
+    LogIndex index;
+    Pass(index, file, 4096);
+    QCOMPARE(index.runs(), size_t(2));
+    file += entry("02:10:02.000", "Trace", "more");
+    Pass(index, file, 4096);
+    QCOMPARE(Texts(index, file), Lines(file));
+    QVERIFY(index.isOneRun());
+    QCOMPARE(index.Rows(LogFilter()).marks[1] & LogRows::Torn, 0);
+
+    // Nor is another one looked for.
+    file += "continued\n" + entry("01:00:00.000", "Trace", "and back again");
+    Pass(index, file, 4096);
+    QCOMPARE(Texts(index, file), Lines(file));
 }
 
 void tst_LogIndex::readsOnlyWhatIsNew()

@@ -407,7 +407,7 @@ void tst_LogModel::heading_data()
 void tst_LogModel::heading()
 {
     QFETCH(bool, isCurrent);
-    QVERIFY(TestFiles::write(m_file, run(1, QTime(9, 0), "n") + run(3, QTime(8, 0), "o")));
+    QVERIFY(TestFiles::write(m_file, run(1, QTime(9, 0), "n") + run(3, QTime(7, 0), "o")));
     LogModel model;
     model.Open(m_file, LogLineParser(), isCurrent);
     QTRY_COMPARE_WITH_TIMEOUT(model.rowCount(), 6, Patience);
