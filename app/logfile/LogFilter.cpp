@@ -11,6 +11,19 @@ namespace {
 
 constexpr unsigned AllSeverities = (1U << LogEntry::None) - 1;
 
+// How many ways to match one text are tried. Some expressions have more ways than anybody can wait
+// for, and Qt knows no time limit.
+constexpr int MaximumTries = 1000000;
+constexpr int MaximumTriesWhilePainting = 20000;
+
+// The limit is written into the expression, as only the library below Qt knows it.
+QRegularExpression Limited(QString const& pattern, int tries, bool caseSensitive)
+{
+    return QRegularExpression(QStringLiteral("(*LIMIT_MATCH=%1)").arg(tries) + pattern,
+                              caseSensitive ? QRegularExpression::NoPatternOption
+                                            : QRegularExpression::CaseInsensitiveOption);
+}
+
 } // namespace
 
 LogFilter::LogFilter() : m_severities(AllSeverities) {}
@@ -36,18 +49,24 @@ bool LogFilter::SetText(QString const& text, bool isExpression, bool caseSensiti
         return false;
 
     m_isExpression = isExpression;
+    m_text = text;
     m_matcher = QStringMatcher(text, caseSensitive ? Qt::CaseSensitive : Qt::CaseInsensitive);
-    m_expression = QRegularExpression(isExpression ? text : QRegularExpression::escape(text),
-                                      caseSensitive ? QRegularExpression::NoPatternOption
-                                                    : QRegularExpression::CaseInsensitiveOption);
+    const QString pattern = isExpression ? text : QRegularExpression::escape(text);
+    m_expression = Limited(pattern, MaximumTries, caseSensitive);
+    m_marking = Limited(pattern, MaximumTriesWhilePainting, caseSensitive);
     return true;
 }
 
-bool LogFilter::Matches(QString const& line) const
+LogFilter::Match LogFilter::Find(QString const& line) const
 {
     if (!hasText())
-        return true;
-    return m_isExpression ? m_expression.match(line).hasMatch() : m_matcher.indexIn(line) >= 0;
+        return Yes;
+    if (!m_isExpression)
+        return m_matcher.indexIn(line) >= 0 ? Yes : No;
+    const QRegularExpressionMatch match = m_expression.match(line);
+    if (!match.isValid())
+        return TooLong;
+    return match.hasMatch() ? Yes : No;
 }
 
 QVector<QPair<int, int>> LogFilter::Ranges(QString const& text) const
@@ -55,7 +74,7 @@ QVector<QPair<int, int>> LogFilter::Ranges(QString const& text) const
     QVector<QPair<int, int>> ranges;
     if (!hasText())
         return ranges;
-    QRegularExpressionMatchIterator matches = m_expression.globalMatch(text);
+    QRegularExpressionMatchIterator matches = m_marking.globalMatch(text);
     while (matches.hasNext()) {
         const QRegularExpressionMatch match = matches.next();
         if (match.capturedLength() > 0)

@@ -41,12 +41,21 @@ public:
     void SetEarlierRuns(bool shown) { m_earlierRuns = shown; }
     bool earlierRuns() const { return m_earlierRuns; }
 
-    bool hasText() const { return !m_expression.pattern().isEmpty(); }
+    bool hasText() const { return !m_text.isEmpty(); }
+    bool isExpression() const { return m_isExpression; }
+
+    enum Match {
+        Yes,
+        No,
+        TooLong ///< unknown: the expression tried too many ways to match this line
+    };
 
     /// Whether a line, as stored in the file, contains the text.
-    bool Matches(QString const& line) const;
+    Match Find(QString const& line) const;
+    bool Matches(QString const& line) const { return Find(line) == Yes; }
 
-    /// The matches in a text: start and length, in order.
+    /// The matches in a text: start and length, in order. An expression that takes too long to find
+    /// them has none.
     QVector<QPair<int, int>> Ranges(QString const& text) const;
 
     /// The error in an expression, for users; empty if it is valid.
@@ -59,8 +68,10 @@ private:
     unsigned m_severities;
     bool m_earlierRuns = true;
     bool m_isExpression = false;
-    QStringMatcher m_matcher; // prepared once for many lines
-    QRegularExpression m_expression;
+    QString m_text;
+    QStringMatcher m_matcher;        // prepared once for many lines
+    QRegularExpression m_expression; // to find lines
+    QRegularExpression m_marking;    // to mark matches while painting, which must be quick
 };
 
 } // namespace Velocor

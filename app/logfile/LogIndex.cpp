@@ -174,7 +174,17 @@ void LogIndex::End()
         addLine(m_partialLine.constData(), m_partialLine.size(), false);
 }
 
-quint8 LogIndex::markOf(LogLineParser::Parts const& parts, char const* line, int length) const
+bool LogIndex::isMatched(char const* line, int length)
+{
+    if (!m_filter.hasText() || m_slowLine > 0)
+        return true;
+    const LogFilter::Match match = m_filter.Find(QString::fromLatin1(line, length));
+    if (match == LogFilter::TooLong)
+        m_slowLine = m_starts.size() + 1;
+    return match == LogFilter::Yes;
+}
+
+quint8 LogIndex::markOf(LogLineParser::Parts const& parts, char const* line, int length)
 {
     quint8 mark = LogEntry::None;
     if (parts.isEntry)
@@ -183,7 +193,7 @@ quint8 LogIndex::markOf(LogLineParser::Parts const& parts, char const* line, int
         mark = (m_marks.back() & LogRows::SeverityMask) | LogRows::Continued;
     if (parts.timeKey >= 0)
         mark |= LogRows::Timed;
-    if (m_filter.hasText() && !m_filter.Matches(QString::fromLatin1(line, length)))
+    if (!isMatched(line, length))
         mark |= LogRows::Unmatched;
     return mark;
 }
@@ -350,7 +360,8 @@ LogRows LogIndex::Rows(LogFilter const& filter) const
         for (size_t line = m_runs[number].firstLine; line < end; ++line) {
             const quint8 mark = m_marks[line];
             const auto severity = static_cast<LogEntry::Severity>(mark & LogRows::SeverityMask);
-            if ((mark & LogRows::Unmatched) || !filter.Shows(severity))
+            const bool isMatched = m_slowLine > 0 || !(mark & LogRows::Unmatched);
+            if (!isMatched || !filter.Shows(severity))
                 continue;
             rows.add(m_starts[line], mark);
             if (LogSeverities::IsProblem(severity) && !(mark & LogRows::Continued))

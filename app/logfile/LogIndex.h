@@ -83,6 +83,11 @@ public:
     /// Whether the last pass found the seam in another place, or that it was none.
     bool hasMoved() const { return m_hasMoved; }
 
+    /// The number of the first line, starting at 1, that the filter's expression takes too long
+    /// for; 0 if there is none. With such a line the text is no longer searched for, and all lines
+    /// match.
+    size_t slowLine() const { return m_slowLine; }
+
     /// Whether any entry has an elapsed time.
     bool hasElapsed() const { return m_hasElapsed; }
 
@@ -101,7 +106,8 @@ private:
     size_t resumeLine() const;
     void forgetFrom(size_t line);
     bool addLine(char const* line, int length, bool complete);
-    quint8 markOf(LogLineParser::Parts const& parts, char const* line, int length) const;
+    quint8 markOf(LogLineParser::Parts const& parts, char const* line, int length);
+    bool isMatched(char const* line, int length);
     bool isSeam(LogLineParser::Parts const& parts, qint64 end) const;
     bool isOlder(LogLineParser::Parts const& parts) const;
     bool isKnown(LogLineParser::Parts const& parts, qint64 end) const;
@@ -118,6 +124,7 @@ private:
     std::vector<quint8> m_marks;
     std::vector<Run> m_runs; // newest first, as in the file
     bool m_hasElapsed = false;
+    size_t m_slowLine = 0;
     bool m_lastIsComplete = true;
 
     // The newest run's last entry with a time: the next pass begins after it.

@@ -13,6 +13,9 @@ namespace Velocor {
 namespace {
 
 constexpr int SliceSize = 1 << 20;
+
+// With an expression, which may be slow, a newer request is looked for more often.
+constexpr int PieceSize = 1 << 12;
 constexpr int HeadSize = 256;
 constexpr int AnchorSize = 256;
 constexpr int TailSize = 256;
@@ -111,13 +114,13 @@ bool LogScanner::readFrom(QFile& file)
     bool more = file.seek(m_index.Begin());
     int reported = 0;
     while (more) {
-        if (!isCurrentRequest())
-            return false;
         const qint64 count = file.read(slice.data(), slice.size());
         if (count <= 0)
             break;
-        if (!m_index.Feed(slice.constData(), static_cast<int>(count)))
+        if (!feed(slice, count))
             more = file.seek(m_index.nextOffset());
+        if (!isCurrentRequest())
+            return false;
         const int percent = size > 0 ? static_cast<int>(file.pos() * 100 / size) : 100;
         if (percent >= reported + 10) {
             reported = percent;
@@ -127,6 +130,19 @@ bool LogScanner::readFrom(QFile& file)
     m_index.End();
     noteFile(file);
     m_complete = m_size >= m_index.nextOffset(); // otherwise it was truncated meanwhile
+    return true;
+}
+
+// Feeds what was read. Returns false if reading must go on elsewhere.
+bool LogScanner::feed(QByteArray const& slice, qint64 count)
+{
+    const bool isSlow = m_filter.hasText() && m_filter.isExpression();
+    const qint64 piece = isSlow ? PieceSize : count;
+    for (qint64 at = 0; at < count && isCurrentRequest(); at += piece) {
+        const auto length = static_cast<int>(std::min(piece, count - at));
+        if (!m_index.Feed(slice.constData() + at, length))
+            return false;
+    }
     return true;
 }
 
@@ -210,6 +226,7 @@ void LogScanner::report(bool isReset)
     update.error = m_error;
     update.lines = m_index.size();
     update.hasElapsed = m_index.hasElapsed();
+    update.slowLine = m_index.slowLine();
     if (!nothingNew)
         Q_EMIT updated(update);
 }

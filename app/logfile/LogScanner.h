@@ -56,6 +56,7 @@ private:
     bool isCurrentRequest() const { return m_currentRequest == m_request; }
     void readFromStart(bool isOneRun);
     bool readFrom(QFile& file);
+    bool feed(QByteArray const& slice, qint64 count);
     void readChanges(QFile& file);
     bool looksUnchanged() const;
     bool isSameFile(QFile& file) const;

@@ -29,6 +29,7 @@ struct LogUpdate
     bool exists = true;
     QString error; ///< why the file could not be read; empty if it could
     size_t lines = 0;
+    size_t slowLine = 0; ///< see LogIndex::slowLine()
     bool hasElapsed = false;
 
     /// Computes the numbers from the rows before and after.

@@ -65,6 +65,10 @@ private slots:
     void copiesLines();
     void copiesFromTheMenu();
     void problems();
+    void noProblems();
+    void problemsStartInView();
+    void currentLineStays();
+    void slowExpression();
     void currentLine();
     void olderFiles();
     void earlierRuns();
@@ -192,9 +196,10 @@ void tst_LogInWindow::filterByExpression()
     QTest::keyClicks(QApplication::focusWidget(), "(");
     QTRY_VERIFY(error->isVisible());
     QVERIFY2(error->text().contains("at character"), qPrintable(error->text()));
-    QCOMPARE(Rows(*window), 2);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 30, Patience);
     QTest::keyClick(QApplication::focusWidget(), Qt::Key_Backspace);
     QTRY_VERIFY(!error->isVisible());
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
 }
 
 void tst_LogInWindow::filterBySeverity()
@@ -282,12 +287,111 @@ void tst_LogInWindow::problems()
     QTest::keyClick(window.get(), Qt::Key_F8);
     QCOMPARE(View(*window)->currentIndex().row(), 3);
     QTest::keyClick(window.get(), Qt::Key_F8);
-    QCOMPARE(View(*window)->currentIndex().row(), 3);
-    QCOMPARE(window->statusBar()->currentMessage(), QString("No more warnings or errors below"));
-    QTest::keyClick(window.get(), Qt::Key_F8, Qt::ShiftModifier);
     QCOMPARE(View(*window)->currentIndex().row(), 1);
+    QCOMPARE(window->statusBar()->currentMessage(), QString("Continued from the top"));
     QTest::keyClick(window.get(), Qt::Key_F8, Qt::ShiftModifier);
-    QCOMPARE(window->statusBar()->currentMessage(), QString("No more warnings or errors above"));
+    QCOMPARE(View(*window)->currentIndex().row(), 3);
+    QCOMPARE(window->statusBar()->currentMessage(), QString("Continued from the bottom"));
+    QTest::keyClick(window.get(), Qt::Key_F8, Qt::ShiftModifier);
+    QCOMPARE(View(*window)->selectionModel()->selectedRows().size(), 1);
+    QCOMPARE(View(*window)->currentIndex().row(), 1);
+}
+
+void tst_LogInWindow::noProblems()
+{
+    const WindowTest test(run(3, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
+    QTest::keyClick(window.get(), Qt::Key_F8);
+    QCOMPARE(window->statusBar()->currentMessage(), QString("No warnings or errors"));
+    QVERIFY(!View(*window)->currentIndex().isValid());
+}
+
+// Without a current row the search begins with the rows in view, and the hit comes with context.
+void tst_LogInWindow::problemsStartInView()
+{
+    QByteArray log;
+    for (int i = 0; i < 300; ++i)
+        log += entry(QTime(9, 0).addSecs(i).toString("hh:mm:ss.zzz"), i % 100 ? "Trace" : "Error",
+                     QString("line %1").arg(i));
+    const WindowTest test(log);
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 300, Patience);
+    LogView* view = View(*window);
+    view->verticalScrollBar()->setValue(150);
+    QTest::keyClick(window.get(), Qt::Key_F8);
+    QCOMPARE(view->currentIndex().row(), 200);
+    QVERIFY(view->rowAt(0) < 200 - 3);
+    QVERIFY(view->rowAt(view->viewport()->height() - 1) > 200 + 3);
+
+    view->clearSelection();
+    view->setCurrentIndex(QModelIndex());
+    view->verticalScrollBar()->setValue(150);
+    QTest::keyClick(window.get(), Qt::Key_F8, Qt::ShiftModifier);
+    QCOMPARE(view->currentIndex().row(), 100);
+}
+
+// Whatever the filter shows and hides, the line that the user looks at stays where it is.
+void tst_LogInWindow::currentLineStays()
+{
+    QByteArray log;
+    for (int i = 0; i < 300; ++i)
+        log += entry(QTime(9, 0).addSecs(i).toString("hh:mm:ss.zzz"), i % 2 ? "Trace" : "Error",
+                     QString("line %1").arg(i));
+    const WindowTest test(log);
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 300, Patience);
+    LogView* view = View(*window);
+    auto* field = Child<QLineEdit>(window.get(), "Filter by text");
+    field->setFocus();
+    QTest::keyClicks(field, "line 15");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 11, Patience);
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::NoModifier, RowCentre(view, 4));
+    const auto message = [view] {
+        const int row = view->currentIndex().row();
+        return view->model()->index(row, LogModel::MessageColumn).data().toString();
+    };
+    QCOMPARE(message(), QString("line 153"));
+
+    field->setFocus();
+    QTest::keyClick(field, Qt::Key_A, Qt::ControlModifier);
+    QTest::keyClick(field, Qt::Key_Delete);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 300, Patience);
+    QCOMPARE(message(), QString("line 153"));
+    QVERIFY(view->viewport()->rect().contains(view->visualRect(view->currentIndex()).center()));
+    QCOMPARE(view->selectionModel()->selectedRows().size(), 1);
+    QVERIFY(!view->isFollowing());
+
+    // Filtered out: the nearest one.
+    QTest::keyClick(window.get(), Qt::Key_1, Qt::ControlModifier);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 150, Patience);
+    QVERIFY(message() == "line 152" || message() == "line 154");
+    QVERIFY(view->viewport()->rect().contains(view->visualRect(view->currentIndex()).center()));
+}
+
+// An expression that takes too long is stopped and filters nothing.
+void tst_LogInWindow::slowExpression()
+{
+    const WindowTest test(run(3, QTime(9, 0), "x") +
+                          entry("10:00:00.000", "Trace", QString(200, 'a') + "1"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 4, Patience);
+    ClickBox(Child<QCheckBox>(window.get(), "Regular expression"));
+    auto* field = Child<QLineEdit>(window.get(), "Filter by text");
+    field->setFocus();
+    QTest::keyClicks(field, "(a+)+[b-z]$");
+    auto* error = Child<QLabel>(window.get(), "Filter error");
+    QTRY_COMPARE_WITH_TIMEOUT(
+        error->text(),
+        QString("The regular expression takes too long at line 4, nothing is filtered."), Patience);
+    QVERIFY(error->isVisible());
+    QCOMPARE(Rows(*window), 4);
+
+    field->setFocus();
+    QTest::keyClick(field, Qt::Key_A, Qt::ControlModifier);
+    QTest::keyClicks(field, "x [12]");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    QVERIFY(!error->isVisible());
 }
 
 void tst_LogInWindow::currentLine()

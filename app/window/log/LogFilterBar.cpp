@@ -136,10 +136,27 @@ void LogFilterBar::apply()
 
     const bool isExpression = m_expression->isChecked();
     const QString error = isExpression ? LogFilter::ErrorOf(m_text->text()) : QString();
-    m_error->setText(tr("Invalid regular expression: %1").arg(error));
-    m_error->setVisible(!error.isEmpty());
-    m_filter.SetText(m_text->text(), isExpression, m_case->isChecked());
+    showError(error.isEmpty()
+                  ? QString()
+                  : tr("Invalid regular expression, nothing is filtered: %1").arg(error));
+    m_filter.SetText(error.isEmpty() ? m_text->text() : QString(), isExpression,
+                     m_case->isChecked());
     Q_EMIT filterChanged();
+}
+
+void LogFilterBar::showError(QString const& error)
+{
+    m_error->setText(error);
+    m_error->setVisible(!error.isEmpty());
+}
+
+void LogFilterBar::ShowSlowLine(size_t line)
+{
+    if (line > 0)
+        showError(tr("The regular expression takes too long at line %L1, nothing is filtered.")
+                      .arg(static_cast<qulonglong>(line)));
+    else if (m_filter.hasText())
+        showError(QString());
 }
 
 } // namespace Velocor

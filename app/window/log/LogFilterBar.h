@@ -23,7 +23,7 @@ class LogFilterBar : public QWidget
 public:
     explicit LogFilterBar(QWidget* parent = nullptr);
 
-    /// The current filter; while an invalid expression is entered, with the last valid one.
+    /// The current filter; without a text while an invalid expression is entered.
     LogFilter const& filter() const { return m_filter; }
 
     /// Focuses the text field and selects its text.
@@ -33,6 +33,9 @@ public:
     void Clear();
 
     void SetEarlierRuns(bool shown);
+
+    /// Says that the expression takes too long at a line, starting at 1; 0 if it does not.
+    void ShowSlowLine(size_t line);
 
 Q_SIGNALS:
     void filterChanged();
@@ -45,6 +48,7 @@ private:
     void addSeverities();
     void updateIcons();
     void apply();
+    void showError(QString const& error);
 
     QLineEdit* m_text;
     QCheckBox* m_case;

@@ -62,6 +62,13 @@ public:
     /// -1 if there is none.
     int FindProblem(int row, int step) const;
 
+    /// Where the line of a row starts in the file; negative for a heading.
+    qint64 LineStart(int row) const { return m_state.rows->starts[static_cast<size_t>(row)]; }
+
+    /// The row whose line starts there or, if it is filtered out, as near to it as possible; -1 if
+    /// there are no lines.
+    int RowNear(qint64 start) const;
+
     /// The line of a row, as stored in the file, without its line end; empty for a heading.
     ///
     /// @param limit  maximum number of bytes to read

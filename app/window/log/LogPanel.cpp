@@ -131,6 +131,7 @@ void LogPanel::connectAll()
     connect(m_view->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
             &LogPanel::showCurrentLine);
     connect(m_model, &LogModel::refreshed, this, [this] {
+        m_filterBar->ShowSlowLine(m_model->state().slowLine);
         updatePlaceholder();
         if (!m_view->currentIndex().isValid())
             showCurrentLine();
@@ -250,12 +251,15 @@ void LogPanel::SelectAll()
 
 void LogPanel::GoToProblem(int step)
 {
-    if (m_view->GoToProblem(step)) {
-        m_view->setFocus();
+    const LogView::Jump jump = m_view->GoToProblem(step);
+    if (jump == LogView::Jump::None) {
+        Q_EMIT messageReported(tr("No warnings or errors"));
         return;
     }
-    Q_EMIT messageReported(step > 0 ? tr("No more warnings or errors below")
-                                    : tr("No more warnings or errors above"));
+    m_view->setFocus();
+    if (jump == LogView::Jump::Wrapped)
+        Q_EMIT messageReported(step > 0 ? tr("Continued from the top")
+                                        : tr("Continued from the bottom"));
 }
 
 QString LogPanel::path() const

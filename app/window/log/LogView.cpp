@@ -28,6 +28,7 @@ LogView::LogView(LogModel* model, QWidget* parent)
     setModel(model);
     SetDefaultWidths();
     connect(verticalScrollBar(), &QScrollBar::valueChanged, this, &LogView::noteScrolled);
+    connect(model, &LogModel::modelAboutToBeReset, this, &LogView::noteCurrent);
     connect(model, &LogModel::refreshed, this, &LogView::afterRefresh);
 }
 
@@ -129,11 +130,46 @@ void LogView::afterRefresh()
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
     setColumnHidden(LogModel::ElapsedColumn, !m_model->state().hasElapsed);
     updateHeadings();
+    restoreCurrent();
     if (m_following) {
         updateGeometries(); // updates the scroll bar's range
         scrollToBottom();
     }
     viewport()->update();
+}
+
+void LogView::noteCurrent()
+{
+    const int row = currentIndex().row();
+    if (row < 0 || m_model->LineStart(row) < 0)
+        return;
+    m_keptPath = m_model->path();
+    m_keptStart = m_model->LineStart(row);
+    m_keptText = m_model->LineText(row, LogModel::ShownLimit);
+    const int visible = viewport()->height() / std::max(1, rowHeight(row)) - 1;
+    m_keptDistance = qBound(0, row - rowAt(0), std::max(0, visible));
+}
+
+// After the rows were replaced. Another file has its own current line, and so has one whose lines
+// were written over.
+void LogView::restoreCurrent()
+{
+    if (m_keptStart < 0 || m_model->isReading())
+        return;
+    const qint64 start = m_keptStart;
+    m_keptStart = -1;
+    const int row = m_model->path() == m_keptPath ? m_model->RowNear(start) : -1;
+    const bool isOther = row >= 0 && m_model->LineStart(row) == start &&
+                         m_model->LineText(row, LogModel::ShownLimit) != m_keptText;
+    if (row < 0 || isOther || currentIndex().isValid())
+        return;
+    const QModelIndex index = m_model->index(row, LogModel::TimeColumn);
+    selectionModel()->setCurrentIndex(index, QItemSelectionModel::ClearAndSelect |
+                                                 QItemSelectionModel::Rows);
+    if (row + 1 < m_model->rowCount())
+        SetFollowing(false);
+    updateGeometries(); // updates the scroll bar's range
+    verticalScrollBar()->setValue(row - m_keptDistance);
 }
 
 // A heading spans all columns.
@@ -150,17 +186,33 @@ void LogView::updateHeadings()
     setSpan(earlier, 0, 1, LogModel::ColumnCount);
 }
 
-bool LogView::GoToProblem(int step)
+// The row to start from: the current one, or the one outside of the visible rows.
+int LogView::rowBefore(int step) const
 {
-    const int from = currentIndex().isValid() ? currentIndex().row()
-                     : step > 0               ? -1
-                                              : m_model->rowCount();
-    const int row = m_model->FindProblem(from, step);
+    if (currentIndex().isValid())
+        return currentIndex().row();
+    if (step > 0)
+        return rowAt(0) - 1;
+    const int last = rowAt(viewport()->height() - 1);
+    return last < 0 ? m_model->rowCount() : last + 1;
+}
+
+LogView::Jump LogView::GoToProblem(int step)
+{
+    Jump jump = Jump::Ahead;
+    int row = m_model->FindProblem(rowBefore(step), step);
+    if (row < 0) {
+        jump = Jump::Wrapped;
+        row = m_model->FindProblem(step > 0 ? -1 : m_model->rowCount(), step);
+    }
     if (row < 0)
-        return false;
-    setCurrentIndex(m_model->index(row, LogModel::TimeColumn));
-    scrollTo(currentIndex(), EnsureVisible);
-    return true;
+        return Jump::None;
+    // Whatever keys are held: Shift would extend the selection.
+    const QModelIndex index = m_model->index(row, LogModel::TimeColumn);
+    selectionModel()->setCurrentIndex(index, QItemSelectionModel::ClearAndSelect |
+                                                 QItemSelectionModel::Rows);
+    scrollTo(index, PositionAtCenter);
+    return jump;
 }
 
 QList<int> LogView::selectedRowNumbers() const

@@ -12,7 +12,9 @@ class LogModel;
 
 /// The table of a log: keeps its position while rows change, or follows the newest entry.
 ///
-/// Following stops when the user scrolls away from the end and resumes on scrolling back to it.
+/// Following stops when the user scrolls away from the end and resumes on scrolling back to it. The
+/// current line stays current and in view when the filter changes; if it is filtered out, the
+/// nearest one takes its place.
 class LogView : public QTableView
 {
     Q_OBJECT
@@ -25,10 +27,15 @@ public:
     void SetFollowing(bool following);
     bool isFollowing() const { return m_following; }
 
-    /// Goes to the next (step 1) or previous (step -1) warning or worse.
-    ///
-    /// @return false if there is none
-    bool GoToProblem(int step);
+    enum class Jump {
+        None,   ///< there is nothing to go to
+        Ahead,  ///< in the requested direction
+        Wrapped ///< from the other end
+    };
+
+    /// Goes to the next (step 1) or previous (step -1) warning or worse, from the current row or,
+    /// without one, from the rows in view.
+    Jump GoToProblem(int step);
 
     /// Copies the selected lines, as stored in the file.
     ///
@@ -60,6 +67,9 @@ private:
     void setUp();
     void noteScrolled(int value);
     void afterRefresh();
+    void noteCurrent();
+    void restoreCurrent();
+    int rowBefore(int step) const;
     void setRowHeight();
     void updateHeadings();
     QList<int> selectedRowNumbers() const;
@@ -70,6 +80,12 @@ private:
     bool m_following = true;
     bool m_scrollingItself = false;
     int m_earlierRows = -1;
+
+    // The current line and its distance from the top, while the rows are replaced.
+    QString m_keptPath;
+    QString m_keptText;
+    qint64 m_keptStart = -1;
+    int m_keptDistance = 0;
 };
 
 } // namespace Velocor
