@@ -58,6 +58,7 @@ private slots:
     void showsTheLog();
     void followsTheLog();
     void followsUntilScrolled();
+    void firstProblemIsFound();
     void filterByText();
     void filterByExpression();
     void filterBySeverity();
@@ -139,6 +140,24 @@ void tst_LogInWindow::followsUntilScrolled()
     QTest::keyClick(window.get(), Qt::Key_N, Qt::ControlModifier | Qt::ShiftModifier);
     QVERIFY(Panel(*window)->isFollowing());
     QCOMPARE(view->verticalScrollBar()->value(), view->verticalScrollBar()->maximum());
+}
+
+// Getting the focus makes no line the current one, so the search starts before the first line.
+void tst_LogInWindow::firstProblemIsFound()
+{
+    const WindowTest test(entry("09:00:00.000", "Error", "a") +
+                          entry("09:00:01.000", "Trace", "b"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    LogView* view = View(*window);
+    Child<QLineEdit>(window.get(), "Filter by text")->setFocus();
+    view->setFocus();
+    QTRY_VERIFY(view->hasFocus());
+    QVERIFY(!view->currentIndex().isValid());
+    QCOMPARE(Child<QPlainTextEdit>(window.get(), "Full text of the current line")->toPlainText(),
+             QString());
+    QTest::keyClick(window.get(), Qt::Key_F8);
+    QCOMPARE(view->currentIndex().row(), 0);
 }
 
 void tst_LogInWindow::filterByText()

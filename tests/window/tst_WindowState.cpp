@@ -44,6 +44,8 @@ private slots:
     void fileSize();
     void withoutALog();
     void report();
+    void reportIncludesOlderFiles_data();
+    void reportIncludesOlderFiles();
     void reportOfATroubledLog();
     void severityIcons();
 };
@@ -330,6 +332,34 @@ void tst_WindowState::report()
     const QString whole = SystemReport::Whole(test.settingsFile());
     QVERIFY(whole.contains(facts));
     QVERIFY(whole.endsWith(SystemReport::LogTail(SystemReport::TailLines)));
+}
+
+void tst_WindowState::reportIncludesOlderFiles_data()
+{
+    QTest::addColumn<int>("lines");
+    QTest::addColumn<QByteArray>("expected");
+
+    const QByteArray now = DemoLog::run(2, QTime(9, 0), "now");
+    const QByteArray crashed = DemoLog::run(3, QTime(8, 0), "crashed");
+    const QByteArray before = DemoLog::run(4, QTime(7, 0), "before");
+    const auto row = [](char const* name, int lines, QByteArray const& expected) {
+        QTest::newRow(name) << lines << expected;
+    };
+    row("the current one has enough lines", 2, now);
+    row("the end of the newest older one", 4, crashed.mid(crashed.indexOf('\n') + 1) + now);
+    row("all of it", 5, crashed + now);
+    row("all files", 20, before + crashed + now);
+}
+
+// After a restart that moved a full file, the end of the crashed run is in an older one.
+void tst_WindowState::reportIncludesOlderFiles()
+{
+    QFETCH(int, lines);
+    QFETCH(QByteArray, expected);
+    const WindowTest test(DemoLog::run(2, QTime(9, 0), "now"));
+    QVERIFY(TestFiles::write(test.logFile() + ".1", DemoLog::run(3, QTime(8, 0), "crashed")));
+    QVERIFY(TestFiles::write(test.logFile() + ".2", DemoLog::run(4, QTime(7, 0), "before")));
+    QCOMPARE(SystemReport::LogTail(lines), QString(expected));
 }
 
 void tst_WindowState::reportOfATroubledLog()

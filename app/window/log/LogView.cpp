@@ -84,6 +84,16 @@ void LogView::changeEvent(QEvent* event)
         setRowHeight();
 }
 
+// Qt makes the first row the current one, although nobody has selected it: its text would be shown
+// as that of the current line, and a search for the next problem would start after it.
+void LogView::focusInEvent(QFocusEvent* event)
+{
+    const bool hadCurrent = currentIndex().isValid();
+    QTableView::focusInEvent(event);
+    if (!hadCurrent)
+        selectionModel()->clearCurrentIndex();
+}
+
 void LogView::SetFollowing(bool following)
 {
     if (following) {
