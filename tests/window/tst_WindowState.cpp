@@ -17,6 +17,9 @@
 #include <QMenu>
 #include <QScreen>
 
+#include <algorithm>
+#include <cmath>
+
 using namespace Velocor;
 
 class tst_WindowState : public QObject
@@ -377,6 +380,25 @@ void tst_WindowState::reportOfATroubledLog()
     QCOMPARE(SystemReport::LogTail(10), QString());
 }
 
+namespace {
+
+double Luminance(QColor const& color)
+{
+    const auto linear = [](double part) {
+        return part <= 0.03928 ? part / 12.92 : std::pow((part + 0.055) / 1.055, 2.4);
+    };
+    return 0.2126 * linear(color.redF()) + 0.7152 * linear(color.greenF()) +
+           0.0722 * linear(color.blueF());
+}
+
+double Contrast(QColor const& a, QColor const& b)
+{
+    const auto both = std::minmax(Luminance(a), Luminance(b));
+    return (both.second + 0.05) / (both.first + 0.05);
+}
+
+} // namespace
+
 void tst_WindowState::severityIcons()
 {
     QPalette dark;
@@ -396,6 +418,12 @@ void tst_WindowState::severityIcons()
         QCOMPARE(image(light) == image(dark), isSame);
         QCOMPARE(SeverityIcons::Color(severity, light) == SeverityIcons::Color(severity, dark),
                  isSame);
+        for (QPalette const& palette : {light, dark}) {
+            const QColor color = SeverityIcons::Color(severity, palette);
+            if (!isSame)
+                QVERIFY2(Contrast(color, palette.color(QPalette::Base)) > 4.5,
+                         qPrintable(color.name()));
+        }
     }
 }
 
