@@ -135,7 +135,7 @@ rule "a signal that starts with a capital letter" capital_signals
 rule "a Qt keyword instead of Q_SIGNALS, Q_SLOTS or Q_EMIT" qt_keywords
 rule "widgets used below the window" widgets_below_the_window
 rule "a tool tip that does not come from PlainToolTip()" bare_tool_tips
-rule "a widget that guesses its text format; see app/window/PlainText.h" guessing_widgets
+rule "a widget that guesses its text format; see app/window/widgets/PlainText.h" guessing_widgets
 rule "an installed header with less than 60 % comment lines" undocumented_headers
 rule "an oddity whose test row does not exist" rows_without_test
 

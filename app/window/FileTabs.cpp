@@ -81,8 +81,8 @@ SettingsEditor* FileTabs::addEditor(QString const& title, QString const& path)
     connect(editor, &SettingsEditor::messageReported, this, &FileTabs::messageReported);
     connect(editor, &SettingsEditor::modifiedChanged, this, [this, editor, title](bool modified) {
         setTabText(indexOf(editor), modified ? title + QLatin1String(" *") : title);
-        Q_EMIT stateChanged();
     });
+    connect(editor, &SettingsEditor::canSaveChanged, this, &FileTabs::stateChanged);
     setTabToolTip(addTab(editor, title), PlainToolTip(path));
     addCloseButton(editor, name);
     return editor;

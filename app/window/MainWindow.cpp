@@ -17,6 +17,7 @@
 #include "app/window/log/LogPanel.h"
 #include "app/window/log/LogSettingsDialog.h"
 #include "app/window/settings/SettingsEditor.h"
+#include "app/window/widgets/ElidedLabel.h"
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
 
@@ -24,7 +25,6 @@
 #include <QCloseEvent>
 #include <QDesktopWidget>
 #include <QFileDialog>
-#include <QLabel>
 #include <QMenuBar>
 #include <QMessageBox>
 #include <QMimeData>
@@ -136,16 +136,24 @@ void MainWindow::makeTabs()
 
 void MainWindow::makeStatusBar()
 {
-    m_health = NewPlainLabel();
-    m_summary = NewPlainLabel();
+    m_health = new ElidedLabel(Qt::ElideRight);
+    m_summary = new ElidedLabel(Qt::ElideMiddle);
     m_health->setAccessibleName(tr("State of the log"));
     m_health->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
     m_health->setContentsMargins(6, 0, 0, 0);
     m_summary->setAccessibleName(tr("Lines shown"));
-    m_summary->setContentsMargins(0, 0, 6, 0);
+    m_summary->setContentsMargins(18, 0, 6, 0);
     statusBar()->setAccessibleName(tr("Status"));
     statusBar()->addWidget(m_health, 1);
-    statusBar()->addPermanentWidget(m_summary);
+    statusBar()->addWidget(m_summary); // not permanent, to leave all room to messages
+    limitSummary();
+}
+
+// The path of a settings file may be longer than the window is wide.
+void MainWindow::limitSummary()
+{
+    if (m_summary)
+        m_summary->setMaximumWidth(width() / 2);
 }
 
 QAction* MainWindow::addAction(QMenu* menu, QString const& text, QKeySequence const& shortcut,
@@ -334,9 +342,10 @@ void MainWindow::updateState()
     SettingsEditor const* editor = m_tabs->currentEditor();
     for (QAction* action : qAsConst(m_logActions))
         action->setEnabled(log != nullptr);
-    m_save->setEnabled(editor && editor->isModified());
+    m_save->setEnabled(editor && editor->CanSave());
     m_close->setEnabled(m_tabs->currentWidget() != m_tabs->ownLog());
     m_summary->setText(log ? log->summary() : editor->path());
+    m_summary->setToolTip(PlainToolTip(log ? QString() : editor->path()));
     if (!log)
         return;
     m_pause->setChecked(log->isPaused());
@@ -445,6 +454,12 @@ void MainWindow::selectAll()
         QMetaObject::invokeMethod(focused, "selectAll");
     else if (LogPanel* log = m_tabs->currentLog())
         log->SelectAll();
+}
+
+void MainWindow::resizeEvent(QResizeEvent* event)
+{
+    QMainWindow::resizeEvent(event);
+    limitSummary();
 }
 
 void MainWindow::closeEvent(QCloseEvent* event)

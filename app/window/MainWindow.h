@@ -11,12 +11,12 @@
 #include <functional>
 #include <memory>
 
-class QLabel;
 class QMenu;
 class QSplitter;
 
 namespace Velocor {
 
+class ElidedLabel;
 class FileTabs;
 class LogHealth;
 class NoticeBar;
@@ -45,6 +45,7 @@ public:
 
 protected:
     bool event(QEvent* event) override;
+    void resizeEvent(QResizeEvent* event) override;
     void closeEvent(QCloseEvent* event) override;
     void dragEnterEvent(QDragEnterEvent* event) override;
     void dropEvent(QDropEvent* event) override;
@@ -54,6 +55,7 @@ private:
     void complete();
     void makeTabs();
     void makeStatusBar();
+    void limitSummary();
     void makeMenus();
     void makeFileMenu();
     void makeEditMenu();
@@ -87,8 +89,8 @@ private:
     QSplitter* m_splitter;
     PlacesPanel* m_places;
     FileTabs* m_tabs = nullptr; ///< null until the window is complete
-    QLabel* m_summary = nullptr;
-    QLabel* m_health = nullptr;
+    ElidedLabel* m_summary = nullptr;
+    ElidedLabel* m_health = nullptr;
     QList<QMenu*> m_menus; ///< in menu bar order
     QMenu* m_recentMenu = nullptr;
     RecentFiles* m_recent = nullptr;

@@ -136,6 +136,23 @@ QString LineAt(QFile& file, qint64 start)
     return QString::fromLatin1(line) + (isCut ? QString(QChar(0x2026)) : QString());
 }
 
+// The last lines in the order in which they were logged, without headings.
+QStringList LastLines(QString const& path, int count)
+{
+    QFile file(path);
+    if (!QFileInfo(file).isFile() || !file.open(QIODevice::ReadOnly))
+        return QStringList();
+
+    const LogRows rows = RowsOf(file);
+    QStringList lines;
+    for (size_t row = rows.size(); row > 0 && lines.size() < count; --row) {
+        const qint64 start = rows.starts[row - 1];
+        if (start >= 0)
+            lines.prepend(LineAt(file, start));
+    }
+    return lines;
+}
+
 QString AvailableSpace()
 {
     const QStorageInfo storage(ApplicationProperty("DataPath"));
@@ -176,19 +193,14 @@ QString SystemReport::Facts(QString const& settingsFile)
     return text;
 }
 
+// The current file alone may not have the end of the previous run: a new run that finds the file
+// full moves it to the older ones first.
 QString SystemReport::LogTail(int lines)
 {
-    QFile file(RunningLog::FileName());
-    if (!QFileInfo(file).isFile() || !file.open(QIODevice::ReadOnly))
-        return QString();
-
-    const LogRows rows = RowsOf(file);
     QStringList tail;
-    for (size_t row = rows.size(); row > 0 && tail.size() < lines; --row) {
-        const qint64 start = rows.starts[row - 1];
-        if (start >= 0)
-            tail.prepend(LineAt(file, start));
-    }
+    const QStringList files = LogFileList::FilesOf(RunningLog::FileName()); // newest first
+    for (int i = 0; i < files.size() && tail.size() < lines; ++i)
+        tail = LastLines(files.at(i), lines - tail.size()) + tail;
     return tail.isEmpty() ? QString() : tail.join(QLatin1Char('\n')) + QLatin1Char('\n');
 }
 

@@ -18,7 +18,8 @@ public:
     static QString Facts(QString const& settingsFile);
 
     /// The last lines of the current log, oldest first. Those of the newest run come last, even if
-    /// older ones follow in the file. The whole file is read to find them.
+    /// older ones follow in the file. The whole file is read to find them. If it has fewer lines,
+    /// the last ones of the older files precede them.
     ///
     /// Lines longer than LogIndex::LineLimit bytes are cut and end with an ellipsis.
     static QString LogTail(int lines);

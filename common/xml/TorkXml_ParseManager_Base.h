@@ -110,7 +110,8 @@ public:
     /// The same for "Error: CODE on Element: ELEMENT", a line feed and "Content: CONTENT".
     void AppendError(QString const& element, QString const& content, int code);
 
-    /// Words all errors so far as one report: a heading, then each error and a line feed.
+    /// Formats all errors so far as one report: a heading, then each error and a line feed. The
+    /// heading is there even if there are no errors, so call this only after a parse that failed.
     void FormatErrors(QString& report) const;
 
 private:

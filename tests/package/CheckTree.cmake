@@ -11,7 +11,8 @@ set(expected
     lib/cmake/Tork/TorkConfigVersion.cmake
     lib/cmake/Tork/TorkTargets.cmake
     lib/cmake/Tork/VelocorTargets.cmake
-    lib/pkgconfig/tork.pc)
+    lib/pkgconfig/tork.pc
+    lib/pkgconfig/velocor-frame.pc)
 
 file(GLOB headers RELATIVE "${SOURCE}" "${SOURCE}/app/*.h" "${SOURCE}/common/*/*.h")
 list(FILTER headers EXCLUDE REGEX "_p\\.h$")

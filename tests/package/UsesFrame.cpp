@@ -5,7 +5,9 @@
 
 #include "app/AppPaths.h"
 #include "app/AppUtils.h"
+#include "app/FailedWrites.h"
 #include "app/LaunchOptionParser.h"
+#include "app/QuitOnSignal.h"
 #include "app/UserMessages.h"
 
 #include <QApplication>
@@ -14,7 +16,9 @@
 
 int main(int argc, char** argv)
 {
+    SurviveFailedWrites();
     QApplication application(argc, argv);
+    const QuitOnSignal quitOnSignal;
     AppPaths::SetOrganizationAndProduct("Some Organization", "Some Product");
     QString xml = "<arg key=\"name\">value</arg>";
     LaunchOptionParser parser;

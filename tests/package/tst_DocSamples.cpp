@@ -17,6 +17,7 @@
 #include <QDebug>
 #include <QDir>
 #include <QLibraryInfo>
+#include <QProcess>
 #include <QRegularExpression>
 #include <QTemporaryDir>
 #include <QVersionNumber>
@@ -39,6 +40,9 @@ private slots:
     void recentFiles();
     void xmlOutput();
     void xmlReport();
+    void xmlReaderIsTheProgram();
+    void xmlReader_data();
+    void xmlReader();
     void namedTestsExist_data();
     void namedTestsExist();
     void linkedFilesExist_data();
@@ -245,6 +249,51 @@ void tst_DocSamples::xmlReport()
     QString report;
     manager.FormatErrors(report);
     QCOMPARE(report, Sample("xml.md", "xml-report"));
+}
+
+void tst_DocSamples::xmlReaderIsTheProgram()
+{
+    const QString program = Read("tests/package/TitleReader.cpp");
+    QCOMPARE(program.mid(program.indexOf("#include")), Sample("xml.md", "xml-reader"));
+}
+
+void tst_DocSamples::xmlReader_data()
+{
+    QTest::addColumn<QString>("document");
+    QTest::addColumn<QString>("output");
+    QTest::addColumn<QString>("errors");
+
+    const QString none;
+    const QString heading = "Failed to parse the XML content:\n";
+    QTest::newRow("titles") << "<library title='x'>\n<title>A</title><n><title>no</title></n>"
+                               "<title>B<i>no</i>C</title>\n</library>"
+                            << "A\nBC\n"
+                            << none;
+    QTest::newRow("malformed") << "<library>\n  <title>First</titel>\n</library>\n"
+                               << none << Sample("xml.md", "xml-reader-malformed");
+    QTest::newRow("unknown") << "<html/>" << none << Sample("xml.md", "xml-reader-unknown");
+    QTest::newRow("beyond a limit")
+        << "<!DOCTYPE library [<!ELEMENT a " + QString("(").repeated(2000) << none
+        << heading + "More than 1000 groups are inside each other in a "
+                     "document type.\nPublic ID: , System ID: \n"
+                     "Line: 1, Column: 1032\n";
+}
+
+void tst_DocSamples::xmlReader()
+{
+    QFETCH(QString, document);
+    QFETCH(QString, output);
+    QFETCH(QString, errors);
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("some.xml");
+    QVERIFY(TestFiles::write(path, document.toUtf8()));
+
+    QProcess program;
+    program.start(TITLE_READER, {path});
+    QVERIFY(program.waitForFinished());
+    QCOMPARE(QString::fromUtf8(program.readAllStandardError()), errors);
+    QCOMPARE(QString::fromUtf8(program.readAllStandardOutput()), output);
+    QCOMPARE(program.exitCode(), errors.isEmpty() ? 0 : 1);
 }
 
 // As "tst_Class::function(row)" or "tst_Class::function".

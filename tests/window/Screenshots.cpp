@@ -8,29 +8,26 @@
 // The build target "screenshots" runs it on a virtual display and puts them into docs/images.
 
 #include "app/window/MainWindow.h"
-#include "app/window/ReportDialog.h"
-#include "app/window/SystemReport.h"
 #include "app/window/log/LogPanel.h"
-#include "app/window/log/LogSettingsDialog.h"
-#include "app/window/settings/SettingsEditor.h"
 #include "common/log/TorkLog.h"
 #include "support/DemoLog.h"
 #include "support/TestFiles.h"
 
+#include <QAction>
 #include <QApplication>
-#include <QComboBox>
 #include <QLineEdit>
 #include <QStyleFactory>
 #include <QTabWidget>
 #include <QTableView>
 #include <QTest>
 #include <QTextStream>
+#include <QTimer>
 
 using namespace Velocor;
 
 namespace {
 
-QString const Home("/tmp/velocor-demo/");
+QString const Home("/tmp/velocor/");
 
 QByteArray const SettingsText("<?xml version=\"1.0\"?>\n"
                               "<VelocorSettings>\n"
@@ -125,28 +122,26 @@ void TakeLogViews(MainWindow& window, Camera const& camera)
     table->clearSelection();
 }
 
+// Of the dialog that a menu item opens.
+void TakeDialog(MainWindow& window, QString const& item, Camera const& camera, QString const& name)
+{
+    QTimer::singleShot(0, [&] {
+        QWidget* dialog = QApplication::activeModalWidget();
+        camera.take(*dialog, name);
+        dialog->close();
+    });
+    const QList<QAction*> actions = window.findChildren<QAction*>();
+    for (QAction* action : actions) {
+        if (QString(action->text()).remove('&') == item)
+            action->trigger();
+    }
+}
+
 void TakeDialogs(MainWindow& window, Camera const& camera)
 {
-    LogSettingsDialog settings(&window);
-    settings.show();
-    camera.take(settings, "log-settings");
-    settings.close();
-
-    const QString own = Home + "velocor.cfg";
-    ReportDialog about("About Velocor",
-                       "Velocor " VELOCOR_VERSION
-                       "\nThe start-up program of the Tork family. MIT licence.",
-                       SystemReport::Facts(own), false, &window);
-    about.show();
-    camera.take(about, "about");
-    about.close();
-
-    ReportDialog report("Save Report",
-                        "This is what the report holds. Look through it before you pass it on: "
-                        "the log may tell more than you want others to know.",
-                        SystemReport::Whole(own), true, &window);
-    report.show();
-    camera.take(report, "report");
+    TakeDialog(window, "Log Settings...", camera, "log-settings");
+    TakeDialog(window, "About Velocor", camera, "about");
+    TakeDialog(window, "Save Report...", camera, "report");
 }
 
 void TakeAll(QString const& folder, QString const& suffix)
@@ -173,6 +168,7 @@ void TakeAll(QString const& folder, QString const& suffix)
     damaged.show();
     camera.take(damaged, "damaged");
     QDir(Home).remove("velocor.cfg");
+    QDir(Home).remove("velocor.cfg.damaged-1"); // or the next one gets another name
 }
 
 } // namespace

@@ -198,6 +198,8 @@ private slots:
     void longLoss();
     void valueDialog_data();
     void valueDialog();
+    void valueDialogMark_data();
+    void valueDialogMark();
     void valueDialogUntouched();
     void valueDialogPastes();
 
@@ -676,6 +678,31 @@ void tst_HostileFiles::valueDialog()
     QVERIFY(dialog.value() == "a\n" + value);
     for (QTextBlock block = text->document()->begin(); block.isValid(); block = block.next())
         QVERIFY(block.length() <= Velocor::ValueDialog::MaximumLineLength + 1);
+}
+
+void tst_HostileFiles::valueDialogMark_data()
+{
+    QTest::addColumn<QString>("start");
+    QTest::addColumn<QString>("mark");
+
+    const auto row = [](char const* name, char const* start, char const* mark) {
+        QTest::newRow(name) << QString::fromUtf8(start) << QString::fromUtf8(mark);
+    };
+    row("usual", "", "\xE2\x86\xB5");
+    row("value with the usual one", "\xE2\x86\xB5", "\xC2\xB6");
+}
+
+// Symbols that are in usual fonts, unlike the one called "symbol for newline".
+void tst_HostileFiles::valueDialogMark()
+{
+    QFETCH(QString, start);
+    QFETCH(QString, mark);
+    const QString value =
+        start + QString(Velocor::ValueDialog::MaximumLineLength + 1, 'x') + "\nend";
+    Velocor::ValueDialog dialog("name", value);
+    QVERIFY(dialog.findChild<QPlainTextEdit*>()->toPlainText().endsWith(mark + "\nend"));
+    const QString heading = dialog.findChild<QLabel*>()->text();
+    QVERIFY2(heading.contains("only " + mark + " marks"), qPrintable(heading));
 }
 
 // Qt's editor takes each of these for a line break.

@@ -58,6 +58,8 @@ private slots:
     void showsTheLog();
     void followsTheLog();
     void followsUntilScrolled();
+    void followsWhileResized();
+    void firstProblemIsFound();
     void filterByText();
     void filterByExpression();
     void filterBySeverity();
@@ -143,6 +145,47 @@ void tst_LogInWindow::followsUntilScrolled()
     QTest::keyClick(window.get(), Qt::Key_N, Qt::ControlModifier | Qt::ShiftModifier);
     QVERIFY(Panel(*window)->isFollowing());
     QCOMPARE(view->verticalScrollBar()->value(), view->verticalScrollBar()->maximum());
+}
+
+void tst_LogInWindow::followsWhileResized()
+{
+    const WindowTest test(run(60, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 60, Patience);
+    LogView* view = View(*window);
+    const auto newest = [&] {
+        return view->visualRect(view->model()->index(59, LogModel::MessageColumn));
+    };
+    QTRY_VERIFY(view->viewport()->rect().contains(newest().center()));
+    for (int height : {450, 560}) {
+        window->resize(700, height);
+        QTRY_COMPARE(window->height(), height);
+        QVERIFY(view->isFollowing());
+        QVERIFY(view->viewport()->rect().contains(newest().center()));
+    }
+    view->SetFollowing(false);
+    const int position = view->verticalScrollBar()->value();
+    window->resize(700, 450);
+    QTRY_COMPARE(window->height(), 450);
+    QCOMPARE(view->verticalScrollBar()->value(), position);
+}
+
+// Getting the focus makes no line the current one, so the search starts before the first line.
+void tst_LogInWindow::firstProblemIsFound()
+{
+    const WindowTest test(entry("09:00:00.000", "Error", "a") +
+                          entry("09:00:01.000", "Trace", "b"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    LogView* view = View(*window);
+    Child<QLineEdit>(window.get(), "Filter by text")->setFocus();
+    view->setFocus();
+    QTRY_VERIFY(view->hasFocus());
+    QVERIFY(!view->currentIndex().isValid());
+    QCOMPARE(Child<QPlainTextEdit>(window.get(), "Full text of the current line")->toPlainText(),
+             QString());
+    QTest::keyClick(window.get(), Qt::Key_F8);
+    QCOMPARE(view->currentIndex().row(), 0);
 }
 
 void tst_LogInWindow::filterByText()

@@ -7,7 +7,9 @@
 
 #include "app/window/FileTabs.h"
 #include "app/window/settings/SettingsEditor.h"
+#include "app/window/widgets/ElidedLabel.h"
 #include "app/window/widgets/NoticeBar.h"
+#include "common/log/TorkLog.h"
 
 #include <QAbstractButton>
 #include <QClipboard>
@@ -17,6 +19,7 @@
 #include <QMessageBox>
 #include <QPlainTextEdit>
 #include <QPushButton>
+#include <QStatusBar>
 #include <QTreeWidget>
 
 using namespace Velocor;
@@ -31,6 +34,14 @@ private slots:
     void cleanup();
 
     void editsSettings();
+    void rejectedNameKeepsTheOld_data();
+    void rejectedNameKeepsTheOld();
+    void rejectedNameChangesNothing();
+    void valueOfAnUnusualNameIsEdited();
+    void savesWhatIsBeingTyped();
+    void escapeLeavesNothingToSave();
+    void sizeOfALongValueIsVisible();
+    void statusTextsHaveRoom();
     void losesKnowingly_data();
     void losesKnowingly();
     void brokenSettings();
@@ -117,6 +128,193 @@ void tst_SettingsInWindow::editsSettings()
     tree->topLevelItem(0)->child(0)->setText(1, "again");
     QVERIFY(editor->Save());
     QCOMPARE(TestFiles::read(file + ".bak"), Settings);
+}
+
+namespace {
+
+// Types a text over that of a cell, without ending the editing.
+void TypeInto(QTreeWidget* tree, QTreeWidgetItem* item, int column, QString const& text)
+{
+    tree->setFocus();
+    tree->setCurrentItem(item, column);
+    QTest::keyClick(tree, Qt::Key_F2);
+    QTRY_VERIFY(tree->findChild<QLineEdit*>());
+    QTest::keyClicks(tree->findChild<QLineEdit*>(), text);
+}
+
+void Enter(QTreeWidget* tree)
+{
+    QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
+    QTRY_VERIFY(!tree->findChild<QLineEdit*>());
+}
+
+} // namespace
+
+void tst_SettingsInWindow::rejectedNameKeepsTheOld_data()
+{
+    QTest::addColumn<bool>("isSection");
+    QTest::addColumn<QString>("typed");
+    QTest::addColumn<QString>("told");
+
+    const auto row = [](char const* name, bool isSection, char const* typed, char const* told) {
+        QTest::newRow(name) << isSection << QString::fromUtf8(typed) << QString::fromUtf8(told);
+    };
+    row("section with a digit first", true, "1st",
+        "\"1st\" is not a valid section or key name, so \"Editor\" is kept. ");
+    row("key with a digit first", false, "2nd font",
+        "\"2ndfont\" is not a valid section or key name, so \"font\" is kept. ");
+    row("place markers", false, "%1%2",
+        "\"%1%2\" is not a valid section or key name, so \"font\" is kept. ");
+    row("nothing", false, " ", "\"\" is not a valid section or key name, so \"font\" is kept. ");
+    row("name of another key", false, "wrap",
+        "There is already a \"wrap\" here, so \"font\" is kept.");
+    row("name of another section", true, "Other",
+        "There is already a \"Other\" here, so \"Editor\" is kept.");
+}
+
+void tst_SettingsInWindow::rejectedNameKeepsTheOld()
+{
+    QFETCH(bool, isSection);
+    QFETCH(QString, typed);
+    QFETCH(QString, told);
+    const WindowTest test;
+    const QString file = test.folder() + "some.cfg";
+    const QByteArray content =
+        QByteArray(Settings).replace("</V", "<Other>\n<k>v</k>\n</Other>\n</V");
+    QVERIFY(TestFiles::write(file, content));
+    const auto window = WindowTest::show();
+    window->OpenFile(file);
+    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    QTreeWidgetItem* section = tree->topLevelItem(0);
+    QTreeWidgetItem* item = isSection ? section : section->child(0);
+    const QString old = item->text(0);
+
+    TypeInto(tree, item, 0, typed);
+    Enter(tree);
+    QCOMPARE(item->text(0), old);
+    const QString status = window->statusBar()->currentMessage();
+    QVERIFY2(status.startsWith(told), qPrintable(status));
+
+    // A valid name is still taken afterwards.
+    TypeInto(tree, item, 0, "valid");
+    Enter(tree);
+    QCOMPARE(item->text(0), QString("valid"));
+    QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
+    QCOMPARE(TestFiles::read(file), QByteArray(content).replace(old.toLatin1(), "valid"));
+}
+
+void tst_SettingsInWindow::rejectedNameChangesNothing()
+{
+    const WindowTest test;
+    const QString file = test.folder() + "some.cfg";
+    QVERIFY(TestFiles::write(file, Settings));
+    const auto window = WindowTest::show();
+    window->OpenFile(file);
+    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    TypeInto(tree, tree->topLevelItem(0), 0, "C++");
+    Enter(tree);
+    QVERIFY(!window->findChild<FileTabs*>()->currentEditor()->isModified());
+    QVERIFY(!Action(*window, "Save")->isEnabled());
+}
+
+// The store reads names that it cannot write.
+void tst_SettingsInWindow::valueOfAnUnusualNameIsEdited()
+{
+    const WindowTest test;
+    const QString file = test.folder() + "some.cfg";
+    QVERIFY(TestFiles::write(file, QByteArray(Settings).replace("font", "gr\xC3\xB6\xC3\x9F"
+                                                                        "e")));
+    const auto window = WindowTest::show();
+    window->OpenFile(file);
+    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    QTreeWidgetItem* item = tree->topLevelItem(0)->child(0);
+    TypeInto(tree, item, 1, "12");
+    Enter(tree);
+    QCOMPARE(item->text(0), QString::fromUtf8("gr\xC3\xB6\xC3\x9F"
+                                              "e"));
+    QCOMPARE(item->text(1), QString("12"));
+}
+
+void tst_SettingsInWindow::savesWhatIsBeingTyped()
+{
+    const WindowTest test;
+    const QString file = test.folder() + "some.cfg";
+    QVERIFY(TestFiles::write(file, Settings));
+    const auto window = WindowTest::show();
+    window->OpenFile(file);
+    auto* editor = window->findChild<FileTabs*>()->currentEditor();
+    auto* tree = Child<QTreeWidget>(editor, "Settings");
+    for (char const* typed : {"Sans", "Mono"}) { // the second time after a save
+        TypeInto(tree, tree->topLevelItem(0)->child(0), 1, typed);
+        QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_S, Qt::ControlModifier);
+        QCOMPARE(TestFiles::read(file), QByteArray(Settings).replace("Serif", typed));
+        QVERIFY(!editor->isModified());
+        QTRY_VERIFY(!Action(*window, "Save")->isEnabled());
+        QTRY_VERIFY(!tree->findChild<QLineEdit*>());
+    }
+}
+
+void tst_SettingsInWindow::escapeLeavesNothingToSave()
+{
+    const WindowTest test;
+    const QString file = test.folder() + "some.cfg";
+    QVERIFY(TestFiles::write(file, Settings));
+    const auto window = WindowTest::show();
+    window->OpenFile(file);
+    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    TypeInto(tree, tree->topLevelItem(0)->child(0), 1, "Sans");
+    QVERIFY(Action(*window, "Save")->isEnabled());
+    QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Escape);
+    QTRY_VERIFY(!Action(*window, "Save")->isEnabled());
+    QCOMPARE(tree->topLevelItem(0)->child(0)->text(1), QString("Serif"));
+    QCOMPARE(TestFiles::read(file), Settings);
+}
+
+void tst_SettingsInWindow::sizeOfALongValueIsVisible()
+{
+    const WindowTest test;
+    const QString file = test.folder() + "some.cfg";
+    QVERIFY(TestFiles::write(
+        file, QByteArray(Settings).replace("Serif", QByteArray("word ").repeated(5000))));
+    const auto window = WindowTest::show();
+    window->OpenFile(file);
+    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    QTreeWidgetItem const* item = tree->topLevelItem(0)->child(0);
+    const int width = tree->visualItemRect(item).width() - tree->columnWidth(0);
+    QVERIFY(width > 50 && width < tree->fontMetrics().boundingRect(item->text(1)).width());
+    const QString shown =
+        tree->fontMetrics().elidedText(item->text(1), tree->textElideMode(), width);
+    QVERIFY2(shown.endsWith("(25 kB)"), qPrintable(shown));
+}
+
+void tst_SettingsInWindow::statusTextsHaveRoom()
+{
+    const WindowTest test;
+    const QString folder = test.folder() + QString("a-long-name/").repeated(15);
+    const QString file = folder + "some.cfg";
+    QVERIFY(QDir().mkpath(folder));
+    QVERIFY(TestFiles::write(file, Settings));
+    TorkLog::logger()->setEnable(false);
+    const auto window = WindowTest::show();
+    window->resize(700, 500);
+    window->OpenFile(file);
+    auto const* health = static_cast<ElidedLabel*>(Child<QLabel>(window.get(), "State of the log"));
+    auto const* summary = static_cast<ElidedLabel*>(Child<QLabel>(window.get(), "Lines shown"));
+    QTRY_COMPARE(summary->text(), file);
+    QTRY_VERIFY2(summary->ShownText().endsWith("/some.cfg"), qPrintable(summary->ShownText()));
+    QVERIFY(summary->width() <= window->width() / 2);
+    QTRY_COMPARE(health->ShownText(), QString("Logging is off"));
+    QVERIFY(health->geometry().right() < summary->geometry().left());
+
+    // A message has the whole width.
+    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    TypeInto(tree, tree->topLevelItem(0), 0, "C++");
+    Enter(tree);
+    QVERIFY(!window->statusBar()->currentMessage().isEmpty());
+    QVERIFY(!summary->isVisible() && !health->isVisible());
+    window->statusBar()->clearMessage();
+    QVERIFY(summary->isVisible() && health->isVisible());
+    TorkLog::logger()->setEnable(true);
 }
 
 void tst_SettingsInWindow::losesKnowingly_data()

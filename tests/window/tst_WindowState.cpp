@@ -17,6 +17,9 @@
 #include <QMenu>
 #include <QScreen>
 
+#include <algorithm>
+#include <cmath>
+
 using namespace Velocor;
 
 class tst_WindowState : public QObject
@@ -44,6 +47,8 @@ private slots:
     void fileSize();
     void withoutALog();
     void report();
+    void reportIncludesOlderFiles_data();
+    void reportIncludesOlderFiles();
     void reportOfATroubledLog();
     void severityIcons();
 };
@@ -332,6 +337,34 @@ void tst_WindowState::report()
     QVERIFY(whole.endsWith(SystemReport::LogTail(SystemReport::TailLines)));
 }
 
+void tst_WindowState::reportIncludesOlderFiles_data()
+{
+    QTest::addColumn<int>("lines");
+    QTest::addColumn<QByteArray>("expected");
+
+    const QByteArray now = DemoLog::run(2, QTime(9, 0), "now");
+    const QByteArray crashed = DemoLog::run(3, QTime(8, 0), "crashed");
+    const QByteArray before = DemoLog::run(4, QTime(7, 0), "before");
+    const auto row = [](char const* name, int lines, QByteArray const& expected) {
+        QTest::newRow(name) << lines << expected;
+    };
+    row("the current one has enough lines", 2, now);
+    row("the end of the newest older one", 4, crashed.mid(crashed.indexOf('\n') + 1) + now);
+    row("all of it", 5, crashed + now);
+    row("all files", 20, before + crashed + now);
+}
+
+// After a restart that moved a full file, the end of the crashed run is in an older one.
+void tst_WindowState::reportIncludesOlderFiles()
+{
+    QFETCH(int, lines);
+    QFETCH(QByteArray, expected);
+    const WindowTest test(DemoLog::run(2, QTime(9, 0), "now"));
+    QVERIFY(TestFiles::write(test.logFile() + ".1", DemoLog::run(3, QTime(8, 0), "crashed")));
+    QVERIFY(TestFiles::write(test.logFile() + ".2", DemoLog::run(4, QTime(7, 0), "before")));
+    QCOMPARE(SystemReport::LogTail(lines), QString(expected));
+}
+
 void tst_WindowState::reportOfATroubledLog()
 {
     const WindowTest test;
@@ -346,6 +379,25 @@ void tst_WindowState::reportOfATroubledLog()
     QVERIFY(QDir(test.logFile()).removeRecursively());
     QCOMPARE(SystemReport::LogTail(10), QString());
 }
+
+namespace {
+
+double Luminance(QColor const& color)
+{
+    const auto linear = [](double part) {
+        return part <= 0.03928 ? part / 12.92 : std::pow((part + 0.055) / 1.055, 2.4);
+    };
+    return 0.2126 * linear(color.redF()) + 0.7152 * linear(color.greenF()) +
+           0.0722 * linear(color.blueF());
+}
+
+double Contrast(QColor const& a, QColor const& b)
+{
+    const auto both = std::minmax(Luminance(a), Luminance(b));
+    return (both.second + 0.05) / (both.first + 0.05);
+}
+
+} // namespace
 
 void tst_WindowState::severityIcons()
 {
@@ -366,6 +418,12 @@ void tst_WindowState::severityIcons()
         QCOMPARE(image(light) == image(dark), isSame);
         QCOMPARE(SeverityIcons::Color(severity, light) == SeverityIcons::Color(severity, dark),
                  isSame);
+        for (QPalette const& palette : {light, dark}) {
+            const QColor color = SeverityIcons::Color(severity, palette);
+            if (!isSame)
+                QVERIFY2(Contrast(color, palette.color(QPalette::Base)) > 4.5,
+                         qPrintable(color.name()));
+        }
     }
 }
 

@@ -85,6 +85,26 @@ void LogView::changeEvent(QEvent* event)
         setRowHeight();
 }
 
+// A lower view would show the same first row, and no longer the newest one.
+void LogView::resizeEvent(QResizeEvent* event)
+{
+    QTableView::resizeEvent(event);
+    if (!m_following)
+        return;
+    const QScopedValueRollback<bool> guard(m_scrollingItself, true);
+    scrollToBottom();
+}
+
+// Qt makes the first row the current one, although nobody has selected it: its text would be shown
+// as that of the current line, and a search for the next problem would start after it.
+void LogView::focusInEvent(QFocusEvent* event)
+{
+    const bool hadCurrent = currentIndex().isValid();
+    QTableView::focusInEvent(event);
+    if (!hadCurrent)
+        selectionModel()->clearCurrentIndex();
+}
+
 void LogView::SetFollowing(bool following)
 {
     if (following) {

@@ -60,6 +60,8 @@ Q_SIGNALS:
 protected:
     void paintEvent(QPaintEvent* event) override;
     void changeEvent(QEvent* event) override;
+    void resizeEvent(QResizeEvent* event) override;
+    void focusInEvent(QFocusEvent* event) override;
     void rowsInserted(QModelIndex const& parent, int first, int last) override;
     void rowsAboutToBeRemoved(QModelIndex const& parent, int first, int last) override;
 

@@ -42,8 +42,11 @@ constexpr int ShortenedLength = 200;
 // The maximum length of each line in a message box, in characters.
 constexpr int MaximumLossLength = 300;
 
-// The full text of a cell that shows only the start.
-constexpr int FullTextRole = Qt::UserRole;
+constexpr int FullTextRole = Qt::UserRole; // the full text of a cell that shows only the start
+constexpr int NameRole = Qt::UserRole + 1; // the name before it was edited
+
+// The maximum length of each name in a status message, in characters.
+constexpr int MaximumNameLength = 40;
 
 bool IsLong(QTreeWidgetItem const* item, int column)
 {
@@ -62,6 +65,13 @@ void SetFullText(QTreeWidgetItem* item, int column, QString const& text)
     item->setText(column, isLong ? Shortened(text, ShortenedLength) : text);
 }
 
+// A name is kept in full in its role, so that it can be restored.
+void SetName(QTreeWidgetItem* item, QString const& name)
+{
+    SetFullText(item, 0, name);
+    item->setData(0, NameRole, name);
+}
+
 // Opens a dialog for cells with shortened text, which must not be edited in place.
 class CellDelegate : public QStyledItemDelegate
 {
@@ -69,14 +79,23 @@ public:
     using QStyledItemDelegate::QStyledItemDelegate;
 
     std::function<void()> editLong;
+    std::function<void(bool)> noteEditing;
 
     QWidget* createEditor(QWidget* parent, QStyleOptionViewItem const& option,
                           QModelIndex const& index) const override
     {
-        if (!index.data(FullTextRole).isValid())
+        if (!index.data(FullTextRole).isValid()) {
+            noteEditing(true);
             return QStyledItemDelegate::createEditor(parent, option, index);
+        }
         editLong();
         return nullptr;
+    }
+
+    void destroyEditor(QWidget* editor, QModelIndex const& index) const override
+    {
+        QStyledItemDelegate::destroyEditor(editor, index);
+        noteEditing(false);
     }
 };
 
@@ -100,10 +119,12 @@ SettingsEditor::SettingsEditor(QWidget* parent)
     setFocusProxy(m_tree);
 }
 
-// If a cell is being edited, deleting the tree emits a signal.
+// If a cell is being edited, deleting the tree ends that and emits a signal.
 SettingsEditor::~SettingsEditor()
 {
     disconnect(m_tree, nullptr, this, nullptr);
+    static_cast<CellDelegate*>(m_tree->itemDelegate())->noteEditing = [](bool) {
+    };
 }
 
 QPushButton* SettingsEditor::makeButton(QString const& text, QString const& toolTip)
@@ -126,9 +147,14 @@ QWidget* SettingsEditor::makeTreePage()
                             QAbstractItemView::AnyKeyPressed);
     m_tree->setAlternatingRowColors(true);
     m_tree->setUniformRowHeights(true);
+    m_tree->setTextElideMode(Qt::ElideMiddle); // a long value ends in its size
     auto* delegate = new CellDelegate(m_tree);
     delegate->editLong = [this] {
         editLongValueSoon();
+    };
+    delegate->noteEditing = [this](bool editing) {
+        m_isEditing = editing;
+        updateCanSave();
     };
     m_tree->setItemDelegate(delegate);
     connect(m_tree, &QTreeWidget::itemChanged, this, &SettingsEditor::checkNames);
@@ -247,7 +273,7 @@ QTreeWidgetItem* SettingsEditor::addItem(QTreeWidgetItem* section, QString const
                                          QString const& value)
 {
     auto* item = section ? new QTreeWidgetItem(section) : new QTreeWidgetItem(m_tree);
-    SetFullText(item, 0, key);
+    SetName(item, key);
     SetFullText(item, 1, value);
     item->setToolTip(0, PlainToolTip(NameHint()));
     item->setFlags(Qt::ItemIsEnabled | Qt::ItemIsSelectable | Qt::ItemIsEditable);
@@ -259,28 +285,36 @@ QTreeWidgetItem* SettingsEditor::addItem(QTreeWidgetItem* section, QString const
     return item;
 }
 
-QString SettingsEditor::uniqueName(QTreeWidgetItem* section, QString const& base) const
+// The names of the other sections, or of the other keys in the section.
+QStringList SettingsEditor::namesBeside(QTreeWidgetItem* item) const
 {
-    QStringList taken;
-    const int count = section ? section->childCount() : m_tree->topLevelItemCount();
-    for (int i = 0; i < count; ++i)
-        taken.append(FullText(section ? section->child(i) : m_tree->topLevelItem(i), 0));
-    QString name = base;
-    for (int number = 2; taken.contains(name); ++number)
-        name = base + QString::number(number);
-    return name;
+    QStringList names;
+    QTreeWidgetItem const* section = item->parent() ? item->parent() : m_tree->invisibleRootItem();
+    for (int i = 0; i < section->childCount(); ++i) {
+        if (section->child(i) != item)
+            names.append(FullText(section->child(i), 0));
+    }
+    return names;
 }
 
-void SettingsEditor::addSection()
+void SettingsEditor::addNamed(QTreeWidgetItem* section, QString const& base, QString const& value)
 {
     QTreeWidgetItem* item = nullptr;
     {
         const QScopedValueRollback<bool> filling(m_filling, true);
-        item = addItem(nullptr, uniqueName(nullptr, QStringLiteral("Section")), QString());
+        item = addItem(section, base, value);
+        const QStringList taken = namesBeside(item);
+        for (int number = 2; taken.contains(item->text(0)); ++number)
+            SetName(item, base + QString::number(number));
     }
     setModified(true);
     m_tree->setCurrentItem(item);
     m_tree->editItem(item, 0);
+}
+
+void SettingsEditor::addSection()
+{
+    addNamed(nullptr, QStringLiteral("Section"), QString());
 }
 
 void SettingsEditor::addValue()
@@ -289,15 +323,8 @@ void SettingsEditor::addValue()
     if (!current)
         return;
     QTreeWidgetItem* section = current->parent() ? current->parent() : current;
-    QTreeWidgetItem* item = nullptr;
-    {
-        const QScopedValueRollback<bool> filling(m_filling, true);
-        item = addItem(section, uniqueName(section, QStringLiteral("key")), tr("value"));
-    }
-    setModified(true);
     section->setExpanded(true);
-    m_tree->setCurrentItem(item);
-    m_tree->editItem(item, 0);
+    addNamed(section, QStringLiteral("key"), tr("value"));
 }
 
 void SettingsEditor::remove()
@@ -306,24 +333,33 @@ void SettingsEditor::remove()
     setModified(true);
 }
 
-// Replaces a name that the store cannot write or that is already in use; clears the value of a
-// section.
+QString SettingsEditor::nameProblem(QTreeWidgetItem* item, QString const& name) const
+{
+    if (!TorkConfigText::IsPlainName(name))
+        return tr("\"%1\" is not a valid section or key name, so \"%2\" is kept. ") + NameHint();
+    if (namesBeside(item).contains(name))
+        return tr("There is already a \"%1\" here, so \"%2\" is kept.");
+    return QString();
+}
+
+// Restores a name if the new one cannot be used; clears the value of a section.
 void SettingsEditor::checkNames(QTreeWidgetItem* item)
 {
     if (m_filling)
         return;
     const QScopedValueRollback<bool> filling(m_filling, true);
-    QTreeWidgetItem* section = item->parent();
+    const QString oldName = item->data(0, NameRole).toString();
     QString name = FullText(item, 0);
     name.remove(QLatin1Char(' '));
-    if (!TorkConfigText::IsPlainName(name)) {
-        Q_EMIT messageReported(tr("\"%1\" is not a valid section or key name. %2")
-                                   .arg(Shortened(name, ShortenedLength), NameHint()));
-        name = section ? QStringLiteral("key") : QStringLiteral("Section");
+    const QString problem = name == oldName ? QString() : nameProblem(item, name);
+    if (!problem.isEmpty()) {
+        SetName(item, oldName);
+        Q_EMIT messageReported(
+            problem.arg(Shortened(name, MaximumNameLength), Shortened(oldName, MaximumNameLength)));
+        return;
     }
-    SetFullText(item, 0, QString());
-    SetFullText(item, 0, uniqueName(section, name));
-    SetFullText(item, 1, section ? FullText(item, 1) : QString());
+    SetName(item, name);
+    SetFullText(item, 1, item->parent() ? FullText(item, 1) : QString());
     setModified(true);
 }
 
@@ -358,11 +394,26 @@ void SettingsEditor::editLongValue()
 
 void SettingsEditor::setModified(bool modified)
 {
-    m_save->setEnabled(modified);
-    if (modified == m_modified)
+    if (modified != m_modified) {
+        m_modified = modified;
+        Q_EMIT modifiedChanged(modified);
+    }
+    updateCanSave();
+}
+
+// What is being typed can be saved too: saving ends the editing of the cell first.
+void SettingsEditor::updateCanSave()
+{
+    const bool canSave = m_modified || m_isEditing;
+    if (canSave == m_save->isEnabled())
         return;
-    m_modified = modified;
-    Q_EMIT modifiedChanged(modified);
+    m_save->setEnabled(canSave);
+    Q_EMIT canSaveChanged(canSave);
+}
+
+bool SettingsEditor::CanSave() const
+{
+    return m_save->isEnabled();
 }
 
 SettingsDocument SettingsEditor::document() const
@@ -432,6 +483,8 @@ bool SettingsEditor::Save()
     if (m_pages->currentIndex() != 0)
         return false;
     m_pages->setFocus(); // ends cell editing
+    if (!m_modified)
+        return true;
     if (!confirmOverwrite() || !confirmLosses() || !makeBackup())
         return false;
 

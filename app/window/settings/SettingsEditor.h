@@ -37,15 +37,19 @@ public:
     /// Shows a file. Unsaved changes are discarded.
     void Open(QString const& path);
 
-    /// Saves through the configuration store, after asking if anything would be lost.
+    /// Ends the editing of a cell and saves through the configuration store, after asking if
+    /// anything would be lost. Does nothing if there are no changes.
     ///
-    /// @return whether the file was saved
+    /// @return whether the file has all changes now
     bool Save();
 
     /// Asks what to do with unsaved changes, if any.
     ///
     /// @return false if the user cancels or saving fails
     bool MayClose();
+
+    /// Whether there is something to save: changes, or a cell that is being edited.
+    bool CanSave() const;
 
     bool isModified() const { return m_modified; }
     QString const& path() const { return m_path; }
@@ -55,6 +59,7 @@ public:
 
 Q_SIGNALS:
     void modifiedChanged(bool modified);
+    void canSaveChanged(bool canSave);
     void messageReported(QString const& text);
 
 private:
@@ -67,11 +72,14 @@ private:
     void addValue();
     void remove();
     void setModified(bool modified);
+    void updateCanSave();
     void checkNames(QTreeWidgetItem* item);
     void editLongValueSoon();
     void editLongValue();
     QTreeWidgetItem* addItem(QTreeWidgetItem* section, QString const& key, QString const& value);
-    QString uniqueName(QTreeWidgetItem* section, QString const& base) const;
+    void addNamed(QTreeWidgetItem* section, QString const& base, QString const& value);
+    QStringList namesBeside(QTreeWidgetItem* item) const;
+    QString nameProblem(QTreeWidgetItem* item, QString const& name) const;
     bool confirmLosses();
     bool confirmOverwrite();
     bool ask(QString const& text, QString const& details, QString const& acceptText);
@@ -83,6 +91,7 @@ private:
     int m_fileLossCount = 0;
     QDateTime m_read; ///< modification time of the file when it was read
     bool m_modified = false;
+    bool m_isEditing = false;
     bool m_filling = false;
     bool m_hasBackup = false;
     bool m_editingLongValue = false;

@@ -23,10 +23,10 @@ namespace {
 
 constexpr int PieceLength = 1000;
 
-// The symbol for a newline, or another one if the value contains it.
+// A symbol for a newline that the value does not contain; first those that most fonts have.
 QChar FreeMark(QString const& value)
 {
-    for (ushort candidate : {0x2424, 0x21b5, 0x240a, 0x00b6}) {
+    for (ushort candidate : {0x21b5, 0x00b6, 0x240a, 0x2424}) {
         if (!value.contains(QChar(candidate)))
             return QChar(candidate);
     }
