@@ -135,7 +135,7 @@ void TakeDialogs(MainWindow& window, Camera const& camera)
     const QString own = Home + "velocor.cfg";
     ReportDialog about("About Velocor",
                        "Velocor " VELOCOR_VERSION
-                       "\nThe start-up program of the Tork family. MIT licence.",
+                       "\nThe startup program of the Tork family. MIT license.",
                        SystemReport::Facts(own), false, &window);
     about.show();
     camera.take(about, "about");
