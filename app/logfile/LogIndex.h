@@ -61,9 +61,6 @@ public:
     /// The number of lines in the file.
     size_t size() const { return m_starts.size(); }
 
-    /// The number of runs with entries in the file, at most 64: later ones are not distinguished.
-    size_t runs() const { return m_runs.size(); }
-
     /// Whether any entry has an elapsed time.
     bool hasElapsed() const { return m_hasElapsed; }
 

@@ -13,7 +13,7 @@ class QXmlSimpleReader;
 /// The reader calls itself once per open element and per open group of a content model, compares
 /// each entity that is declared with all others, puts each in as often as it is named, and copies
 /// and compares namespace prefixes: a hundred kilobytes of any of these could exhaust the stack,
-/// take minutes or fill the memory, before a content handler hears of it. The guard follows what
+/// take minutes or fill the memory, before a content handler is called. The guard follows what
 /// the reader reads and ends the document where it goes beyond a limit of TorkXmlLimits.h; within
 /// them the reader gets exactly what a plain QXmlInputSource would give it.
 ///
@@ -60,8 +60,9 @@ private:
     QScopedPointer<Watcher> m_watcher;
     bool m_isOver = false; ///< whether a limit was passed
 
-    // What the device gave last, walked through here instead of by Qt's own next(). For the goal
-    // "load, against QSettings"; tests/plain/tst_PlainGuard.cpp compares the two.
+    // What was last read from the device, walked through here instead of by Qt's own next(). For
+    // the goal "load, against QSettings" in docs/performance.md; tests/plain/tst_PlainGuard.cpp
+    // compares the two.
     QString m_fetched;
     QChar const* m_next = nullptr;
     QChar const* m_end = nullptr;

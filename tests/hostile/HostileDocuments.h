@@ -94,13 +94,13 @@ inline void longEntity(QIODevice& file, int length)
     file.write("</k></s></r>");
 }
 
-/// An entity that stands for itself.
+/// An entity that references itself.
 inline void endlessEntity(QIODevice& file, int)
 {
     writeValue(file, "<!DOCTYPE r [<!ENTITY e \"<a>&e;</a>\">]>", "&e;");
 }
 
-/// Entities that each stand for the next one.
+/// Entities that each reference the next one.
 inline void entityChain(QIODevice& file, int count)
 {
     file.write("<!DOCTYPE r [");

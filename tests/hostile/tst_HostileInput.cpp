@@ -207,7 +207,7 @@ void tst_HostileInput::addStructures(char const* reader, bool readsTypes)
     add(reader, "ten generations of element entities", elementBomb, 10, skipsTypes);
     add(reader, "ten generations of entities in an attribute", attributeBomb, 10, skipsTypes);
     add(reader, "an entity of 100,000 characters named as often", longEntity, 100000, skipsTypes);
-    add(reader, "an entity that stands for itself", endlessEntity, 0, skipsTypes);
+    add(reader, "an entity that references itself", endlessEntity, 0, skipsTypes);
     add(reader, "200 entities behind one another", entityChain, 200, true);
     add(reader, "100,000 entities behind one another", entityChain, 100000, skipsTypes);
     add(reader, "999 entities with names of 1000 characters", longEntityNames, 1000, true);

@@ -8,11 +8,11 @@
 #include "app/window/settings/ValueDialog.h"
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
+#include "app/window/widgets/TextDialog.h"
 #include "common/config/TorkConfigText.h"
 
 #include <QFile>
 #include <QFileInfo>
-#include <QFontDatabase>
 #include <QHBoxLayout>
 #include <QHeaderView>
 #include <QMessageBox>
@@ -166,9 +166,7 @@ QWidget* SettingsEditor::makeTextPage()
 {
     m_text = new QPlainTextEdit;
     m_text->setReadOnly(true);
-    m_text->setTabChangesFocus(true);
-    m_text->setLineWrapMode(QPlainTextEdit::NoWrap);
-    m_text->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
+    ShowUnwrapped(m_text);
     m_text->setAccessibleName(tr("File text"));
     m_text->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
     return m_text;
