@@ -21,7 +21,7 @@ void Publish(char const* property, QString const& path)
 
 QString& StoredProductName()
 {
-    static QString name = Velocor::EmptyText;
+    static QString name = Velocor::EmptyText();
     return name;
 }
 

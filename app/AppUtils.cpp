@@ -116,7 +116,7 @@ bool AppUtils::UpdateMRUList(QString const& file, QString& list, int maxCount, M
         return false;
 
     // Also without entries it must not be null.
-    list = Velocor::EmptyText +
+    list = Velocor::EmptyText() +
            QStringList(entries.mid(0, qMax(0, maxCount))).join(Velocor::MruSeparator);
     return true;
 }

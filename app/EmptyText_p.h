@@ -7,8 +7,11 @@
 
 namespace Velocor {
 
-/// The empty text that is not null, for what the frame hands out: callers keep it in settings, and
+/// The empty text that is not null, for what the frame returns: callers keep it in settings, and
 /// TorkConfigFile::WriteItem() refuses a null text and would keep the old one.
-constexpr QLatin1String EmptyText("", 0);
+inline QString EmptyText()
+{
+    return QStringLiteral(""); // clazy:exclude=empty-qstringliteral
+}
 
 } // namespace Velocor

@@ -8,5 +8,5 @@
 LaunchOption::LaunchOption(QString const& optionName, QString const& longForm,
                            QString const& shortForm, qint32 arguments, QString const& text)
     : name(optionName), longName(longForm), shortName(shortForm), argCount(arguments),
-      description(text), value(Velocor::EmptyText)
+      description(text), value(Velocor::EmptyText())
 {}

@@ -79,7 +79,7 @@ bool ApplyAll(LaunchOptionParser& parser, rapidxml::xml_document<char> const& do
 
 } // namespace
 
-LaunchOptionParser::LaunchOptionParser() : errorText(Velocor::EmptyText) {}
+LaunchOptionParser::LaunchOptionParser() : errorText(Velocor::EmptyText()) {}
 
 LaunchOptionParser::~LaunchOptionParser()
 {

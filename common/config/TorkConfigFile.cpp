@@ -46,8 +46,8 @@ TorkConfigFile::TorkConfigFile(QString const& fileName)
 
 TorkConfigFile::TorkConfigFile(QString const& fileName, QString const& rootElementName)
     : m_fileName(fileName), m_rootElementName(rootElementName),
-      m_sections(new TorkOrderedHash<TorkConfigFileSection*>), m_currentElement(TorkEmptyText),
-      m_lastError(TorkEmptyText), m_screensSectionName(QStringLiteral("ApplicationScreens"))
+      m_sections(new TorkOrderedHash<TorkConfigFileSection*>), m_currentElement(TorkEmptyText()),
+      m_lastError(TorkEmptyText()), m_screensSectionName(QStringLiteral("ApplicationScreens"))
 {}
 
 TorkConfigFile::~TorkConfigFile()
@@ -87,7 +87,7 @@ bool TorkConfigFile::Load()
         return false;
     }
 
-    m_lastError = TorkEmptyText;
+    m_lastError = TorkEmptyText();
     Clear();
     const bool parsed = parseFile();
     if (!parsed)
@@ -124,7 +124,7 @@ bool TorkConfigFile::parse(QIODevice* device, TorkConfigFileDocHandler& handler,
 {
     m_atRoot = false;
     m_expectingValue = false;
-    m_currentElement = TorkEmptyText;
+    m_currentElement = TorkEmptyText();
 
     TorkXmlGuard source(device);
     QXmlSimpleReader reader;
@@ -261,7 +261,7 @@ bool TorkConfigFile::ReadItem(QString const& section, QString const& key, QStrin
         value = *stored;
         return true;
     }
-    value = defaultValue.isEmpty() ? QString(TorkEmptyText) : defaultValue;
+    value = defaultValue.isEmpty() ? TorkEmptyText() : defaultValue;
     return false;
 }
 
@@ -301,7 +301,7 @@ bool TorkConfigFile::StartElement(QString& name)
 
 bool TorkConfigFile::EndElement(QString&)
 {
-    m_currentElement = TorkEmptyText;
+    m_currentElement = TorkEmptyText();
     return true;
 }
 

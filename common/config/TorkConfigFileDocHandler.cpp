@@ -21,8 +21,8 @@ QString Unshared(QString const& text)
 TorkConfigFileDocHandler::TorkConfigFileDocHandler() : TorkConfigFileDocHandler(nullptr) {}
 
 TorkConfigFileDocHandler::TorkConfigFileDocHandler(TorkConfigFile* file)
-    : m_file(file), m_lastOpenedElement(TorkEmptyText), m_content(TorkEmptyText),
-      m_lastClosedElement(TorkEmptyText)
+    : m_file(file), m_lastOpenedElement(TorkEmptyText()), m_content(TorkEmptyText()),
+      m_lastClosedElement(TorkEmptyText())
 {}
 
 TorkConfigFileDocHandler::~TorkConfigFileDocHandler() = default;

@@ -333,6 +333,6 @@ bool TorkConfigFile::SaveAtomically()
         m_lastError = QObject::tr("%1 was written in place, as it cannot be replaced: %2")
                           .arg(m_fileName, outcome.inPlaceBecause);
     else
-        m_lastError = TorkEmptyText;
+        m_lastError = TorkEmptyText();
     return outcome.failure.isEmpty();
 }

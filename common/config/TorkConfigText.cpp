@@ -64,8 +64,7 @@ using Encoder = QString (*)(QString const&);
 QString Decoded(Encoder encode, QLatin1Char escape, QString const& encoded, bool* ok)
 {
     // The escape character alone is the empty text.
-    const QString text =
-        encoded == escape ? QString(TorkEmptyText) : TorkUnescaped(escape, encoded);
+    const QString text = encoded == escape ? TorkEmptyText() : TorkUnescaped(escape, encoded);
     const bool isEncoding = encode(text) == encoded;
     if (ok)
         *ok = isEncoding;

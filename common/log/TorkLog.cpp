@@ -10,7 +10,7 @@
 #include "common/log/TorkLogStamp_p.h"
 #include "common/log/TorkLogWriter_p.h"
 
-TorkLog::TorkLog() : TorkLog(QString(TorkEmptyText)) {}
+TorkLog::TorkLog() : TorkLog(TorkEmptyText()) {}
 
 TorkLog::TorkLog(QString const& path)
     : QObject(nullptr), m_writer(std::make_unique<TorkLogWriter>()),
@@ -30,7 +30,7 @@ TorkLog::~TorkLog()
 
 void TorkLog::clear()
 {
-    const QString empty = TorkEmptyText;
+    const QString empty = TorkEmptyText();
     TorkLogLock lock(m_mutex);
 
     m_path = empty;

@@ -31,7 +31,7 @@ QString SeverityText(int severity)
     case TorkLog::Fatal:
         return QObject::tr("Fatal");
     default:
-        return QString(TorkEmptyText);
+        return TorkEmptyText();
     }
 }
 

@@ -13,6 +13,6 @@ TorkErrorDictionary::~TorkErrorDictionary() = default;
 
 bool TorkErrorDictionary::decode(int, QString& text)
 {
-    text = TorkEmptyText;
+    text = TorkEmptyText();
     return false;
 }

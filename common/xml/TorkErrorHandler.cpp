@@ -8,7 +8,7 @@
 #include <QDebug>
 #include <QXmlParseException>
 
-TorkErrorHandler::TorkErrorHandler(TorkLog* log) : m_log(log), m_errorText(TorkEmptyText) {}
+TorkErrorHandler::TorkErrorHandler(TorkLog* log) : m_log(log), m_errorText(TorkEmptyText()) {}
 
 TorkErrorHandler::~TorkErrorHandler() = default;
 

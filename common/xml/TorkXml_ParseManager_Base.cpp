@@ -12,7 +12,7 @@
 
 #include <QDebug>
 
-TorkXml_ParseManager_Base::TorkXml_ParseManager_Base() : m_currentElement(TorkEmptyText) {}
+TorkXml_ParseManager_Base::TorkXml_ParseManager_Base() : m_currentElement(TorkEmptyText()) {}
 
 TorkXml_ParseManager_Base::~TorkXml_ParseManager_Base()
 {
@@ -178,7 +178,7 @@ bool TorkXml_ParseManager_Base::PopElement()
         return false;
 
     m_elements.removeLast();
-    m_currentElement = m_elements.isEmpty() ? QString(TorkEmptyText) : m_elements.last();
+    m_currentElement = m_elements.isEmpty() ? TorkEmptyText() : m_elements.last();
     return true;
 }
 

@@ -7,12 +7,12 @@
 #include "common/xml/TorkXml_ParseManager_Base.h"
 
 TorkXml_ParseState_Base::TorkXml_ParseState_Base()
-    : TorkXml_ParseState_Base(QString(TorkEmptyText), nullptr)
+    : TorkXml_ParseState_Base(TorkEmptyText(), nullptr)
 {}
 
 TorkXml_ParseState_Base::TorkXml_ParseState_Base(QString const& element,
                                                  TorkXml_ParseManager_Base* manager)
-    : m_element(element), m_manager(manager), m_auxiliaryText(TorkEmptyText)
+    : m_element(element), m_manager(manager), m_auxiliaryText(TorkEmptyText())
 {}
 
 TorkXml_ParseState_Base::~TorkXml_ParseState_Base() = default;
