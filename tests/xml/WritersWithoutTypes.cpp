@@ -68,13 +68,13 @@ QStringList UseOneOf(WritersWithoutTypes::Overrides overrides,
 
 } // namespace
 
-QStringList WritersWithoutTypes::WithStream(Overrides overrides, QString& text,
+QStringList WritersWithoutTypes::withStream(Overrides overrides, QString& text,
                                             std::function<void(TorkXmlStream&)> const& use)
 {
     return UseOneOf<TorkXmlStream>(overrides, use, &text, QIODevice::WriteOnly);
 }
 
-QStringList WritersWithoutTypes::WithFile(Overrides overrides, QString const& path,
+QStringList WritersWithoutTypes::withFile(Overrides overrides, QString const& path,
                                           std::function<void(TorkXmlFile&)> const& use)
 {
     const std::function<void(TorkXmlFile&)> useOpen = [&use](TorkXmlFile& writer) {

@@ -20,11 +20,11 @@ enum class Overrides { Nothing, Write, ElementValue };
 /// Calls `use` with a subclass of TorkXmlStream that writes to `text`.
 ///
 /// @return the calls that reached the subclass, each as the operation and its text
-QStringList WithStream(Overrides overrides, QString& text,
+QStringList withStream(Overrides overrides, QString& text,
                        std::function<void(TorkXmlStream&)> const& use);
 
 /// The same with a subclass of TorkXmlFile and a file of this name, which is opened.
-QStringList WithFile(Overrides overrides, QString const& path,
+QStringList withFile(Overrides overrides, QString const& path,
                      std::function<void(TorkXmlFile&)> const& use);
 
 } // namespace WritersWithoutTypes

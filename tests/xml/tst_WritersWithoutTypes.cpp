@@ -63,7 +63,7 @@ void tst_WritersWithoutTypes::stream()
     QFETCH(Overrides, overrides);
     QString text;
     const QStringList calls =
-        WritersWithoutTypes::WithStream(overrides, text, WriteDocument<TorkXmlStream>);
+        WritersWithoutTypes::withStream(overrides, text, WriteDocument<TorkXmlStream>);
     QCOMPARE(text, Document);
     QTEST(calls, "calls");
 }
@@ -74,7 +74,7 @@ void tst_WritersWithoutTypes::file()
     const QTemporaryDir folder;
     const QString path = folder.filePath("written.xml");
     const QStringList calls =
-        WritersWithoutTypes::WithFile(overrides, path, WriteDocument<TorkXmlFile>);
+        WritersWithoutTypes::withFile(overrides, path, WriteDocument<TorkXmlFile>);
     QCOMPARE(QString::fromLatin1(TestFiles::read(path)), Document);
     QTEST(calls, "calls");
 }

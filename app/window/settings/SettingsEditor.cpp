@@ -100,7 +100,8 @@ SettingsEditor::SettingsEditor(QWidget* parent)
     setFocusProxy(m_tree);
 }
 
-// If a cell is being edited, deleting the tree emits a signal.
+// If a cell is being edited, deleting the tree emits a signal. Qt would disconnect it only after
+// the children are deleted, when this object is no more than a QObject.
 SettingsEditor::~SettingsEditor()
 {
     disconnect(m_tree, nullptr, this, nullptr);
