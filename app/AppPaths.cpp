@@ -4,6 +4,7 @@
 #include "app/AppPaths.h"
 
 #include "app/AppUtils.h"
+#include "app/EmptyText_p.h"
 #include "app/LaunchOptionParser.h"
 
 #include <QCoreApplication>
@@ -20,7 +21,7 @@ void Publish(char const* property, QString const& path)
 
 QString& StoredProductName()
 {
-    static QString name = QLatin1String("");
+    static QString name = Velocor::EmptyText();
     return name;
 }
 

@@ -3,6 +3,9 @@
 
 #include "app/AppUtils.h"
 
+#include "app/EmptyText_p.h"
+#include "app/MruSeparator_p.h"
+
 #include <QAction>
 #include <QCoreApplication>
 #include <QListWidget>
@@ -12,11 +15,9 @@
 
 namespace {
 
-constexpr QLatin1Char Separator('|');
-
 QStringList Entries(QString const& list)
 {
-    return list.split(Separator);
+    return list.split(Velocor::MruSeparator);
 }
 
 QString Location(QStandardPaths::StandardLocation location)
@@ -114,8 +115,9 @@ bool AppUtils::UpdateMRUList(QString const& file, QString& list, int maxCount, M
     if (!Update(entries, file, op))
         return false;
 
-    // Empty, never null: TorkConfigFile rejects null strings and would keep the old list.
-    list = QLatin1String("") + QStringList(entries.mid(0, qMax(0, maxCount))).join(Separator);
+    // Also without entries it must not be null.
+    list = Velocor::EmptyText() +
+           QStringList(entries.mid(0, qMax(0, maxCount))).join(Velocor::MruSeparator);
     return true;
 }
 

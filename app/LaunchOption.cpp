@@ -3,8 +3,10 @@
 
 #include "app/LaunchOption.h"
 
+#include "app/EmptyText_p.h"
+
 LaunchOption::LaunchOption(QString const& optionName, QString const& longForm,
                            QString const& shortForm, qint32 arguments, QString const& text)
     : name(optionName), longName(longForm), shortName(shortForm), argCount(arguments),
-      description(text), value(QLatin1String(""))
+      description(text), value(Velocor::EmptyText())
 {}

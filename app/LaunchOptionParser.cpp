@@ -3,6 +3,7 @@
 
 #include "app/LaunchOptionParser.h"
 
+#include "app/EmptyText_p.h"
 #include "app/XmlNesting_p.h"
 #include "common/xml/TorkXmlLimits.h"
 
@@ -78,7 +79,7 @@ bool ApplyAll(LaunchOptionParser& parser, rapidxml::xml_document<char> const& do
 
 } // namespace
 
-LaunchOptionParser::LaunchOptionParser() : errorText(QLatin1String("")) {}
+LaunchOptionParser::LaunchOptionParser() : errorText(Velocor::EmptyText()) {}
 
 LaunchOptionParser::~LaunchOptionParser()
 {

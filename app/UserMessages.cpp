@@ -6,7 +6,6 @@
 #include <QCoreApplication>
 #include <QDebug>
 #include <QMessageBox>
-#include <QMessageLogger>
 #include <QVariant>
 
 namespace {
@@ -29,7 +28,7 @@ void CriticalMessage(QWidget* parent, QString const& text, bool show)
     const QString shown = text; // the original may change or be deleted while the box is open
     if (show)
         QMessageBox::critical(parent, Caption(), shown, QMessageBox::Ok, QMessageBox::NoButton);
-    QMessageLogger(nullptr, 0, nullptr).critical() << OnOneLine(shown);
+    qCritical() << OnOneLine(shown);
 }
 
 void WarningMessage(QWidget* parent, QString const& text, bool show)
@@ -37,7 +36,7 @@ void WarningMessage(QWidget* parent, QString const& text, bool show)
     const QString shown = text;
     if (show)
         QMessageBox::warning(parent, Caption(), shown, QMessageBox::Ok, QMessageBox::NoButton);
-    QMessageLogger(nullptr, 0, nullptr).warning() << OnOneLine(shown);
+    qWarning() << OnOneLine(shown);
 }
 
 void DebugMessage(QWidget* parent, QString const& text, bool show)
@@ -45,7 +44,7 @@ void DebugMessage(QWidget* parent, QString const& text, bool show)
     const QString shown = text;
     if (show)
         QMessageBox::information(parent, Caption(), shown, QMessageBox::Ok, QMessageBox::NoButton);
-    QMessageLogger(nullptr, 0, nullptr).debug() << OnOneLine(shown);
+    qDebug() << OnOneLine(shown);
 }
 
 QString& StripFormatting(QString& text)

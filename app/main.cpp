@@ -13,7 +13,6 @@
 #include <QApplication>
 #include <QDebug>
 #include <QFile>
-#include <QMessageLogger>
 
 namespace {
 
@@ -52,7 +51,7 @@ int main(int argc, char** argv)
     Velocor::MainWindow window;
     window.show();
 
-    QMessageLogger(nullptr, 0, nullptr).debug() << "app.exec() starting";
+    qDebug() << "app.exec() starting";
     PrintLogFileIfScreenless();
     return QApplication::exec();
 }

@@ -25,12 +25,15 @@ target_compile_definitions(velocor_build INTERFACE
 
 # velocor_product: additional rules for the sources of app/ and common/. No implicit conversion
 # guesses the encoding of a string, "signals" and "emit" stay free for the applications that include
-# the headers, and a chain of + allocates once.
+# the headers, and a chain of + allocates once. Messages name no source file, line or function, in
+# debug builds either: what an installed handler or QT_MESSAGE_PATTERN shows would be the folder
+# that the library was built in.
 add_library(velocor_product INTERFACE)
 target_link_libraries(velocor_product INTERFACE velocor_build)
 target_compile_definitions(velocor_product INTERFACE
     QT_NO_CAST_FROM_ASCII
     QT_NO_KEYWORDS
+    QT_NO_MESSAGELOGCONTEXT
     QT_NO_URL_CAST_FROM_STRING
     QT_USE_QSTRINGBUILDER)
 

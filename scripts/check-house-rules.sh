@@ -69,6 +69,31 @@ qt_keywords() {
         search -nHE '^\s*(signals|(public|protected|private) slots):|\bemit [A-Za-z]'
 }
 
+# QString const&, as in CONTRIBUTING.md.
+const_before_the_type() {
+    tracked 'app/*.cpp' 'app/*.h' 'common/*.cpp' 'common/*.h' |
+        search -nHP '\bconst [\w:]+(<[^<>;]*>)? ?[&*]'
+}
+
+exceptions() {
+    tracked 'app/*.cpp' 'app/*.h' 'common/*.cpp' 'common/*.h' | search -nHP '^(?!\s*//).*\bthrow\b'
+}
+
+private_headers_in_public_ones() {
+    tracked ':(glob)app/*.h' 'common/*.h' ':!*_p.h' | search -nHE '^\s*#\s*include.*_p\.h"'
+}
+
+# The words are split so that the check does not find itself.
+british_spelling() {
+    local stems='behav''iour|organ''is|initial''is|serial''is|recogn''is|optim''is|normal''is|sanit''is'
+    tracked ':!LICENSES/*' | search -nHIiE "\\b(un|de|re)?($stems)|\\b(lic""ence|cen""tre|neigh""bour|fav""our)"
+}
+
+# Except where CONTRIBUTING.md forbids it.
+other_words_for_qt() {
+    tracked ':!CONTRIBUTING.md' | search -nHIi 'tool''kit'
+}
+
 # The framework links Qt Widgets, so the compiler would let the rooms below the window use it.
 widgets_below_the_window() {
     tracked 'app/logfile/*' 'app/settingsfile/*' 'app/runninglog/*' |
@@ -91,17 +116,24 @@ guessing_widgets() {
 }
 
 # Headers that are installed, of more than 20 lines, in which fewer than 60 % of the lines that are not
-# blank are comments. Not in order yet:
-# - TorkXml_ParseManager_Base.h, TorkXmlGuard.h: their limits are being revised, their comments with them
+# blank are comments.
 undocumented_headers() {
     local file
-    tracked ':(glob)app/*.h' 'common/*.h' ':!*_p.h' \
-        ':!common/xml/TorkXml_ParseManager_Base.h' ':!common/xml/TorkXmlGuard.h' |
+    tracked ':(glob)app/*.h' 'common/*.h' ':!*_p.h' |
         while IFS= read -r -d '' file; do
             awk -v file="$file" 'NF { lines++ } /^ *\/\// { comments++ }
                 END { if (NR > 20 && comments < 0.6 * lines)
                     printf "%s: %d of %d lines\n", file, comments, lines }' "$file"
         done
+}
+
+# CMakeLists.txt has the version; only the lists of releases name it again.
+unlisted_release() {
+    local version
+    version=$(sed -n 's/^ *VERSION \([0-9.]*\)$/\1/p' CMakeLists.txt | head -n 1)
+    grep -qF "<release version=\"$version\"" packaging/linux/org.tork.velocor.metainfo.xml ||
+        echo "packaging/linux/org.tork.velocor.metainfo.xml: no release $version"
+    grep -qF "## [$version]" CHANGELOG.md || echo "CHANGELOG.md: no release $version"
 }
 
 # docs/deliberate-oddities.md names rows as `tst_Class::function(row)`, or without the row. A name may
@@ -133,10 +165,16 @@ rule "a machine-specific path" machine_paths
 rule "does not match docs/architecture.md" scripts/check-rooms.py
 rule "a signal that starts with a capital letter" capital_signals
 rule "a Qt keyword instead of Q_SIGNALS, Q_SLOTS or Q_EMIT" qt_keywords
+rule "const before the type of a reference or pointer" const_before_the_type
+rule "an exception" exceptions
+rule "an installed header that includes a private one" private_headers_in_public_ones
+rule "British spelling" british_spelling
+rule "another word for Qt" other_words_for_qt
 rule "widgets used below the window" widgets_below_the_window
 rule "a tool tip that does not come from PlainToolTip()" bare_tool_tips
 rule "a widget that guesses its text format; see app/window/widgets/PlainText.h" guessing_widgets
 rule "an installed header with less than 60 % comment lines" undocumented_headers
+rule "a version that is not among the releases" unlisted_release
 rule "an oddity whose test row does not exist" rows_without_test
 
 [ "$violations" -eq 0 ] || exit 1

@@ -74,9 +74,6 @@ public:
     /// The number of lines in the file.
     size_t size() const { return m_starts.size(); }
 
-    /// The number of runs with entries in the file, at most 64: later ones are not distinguished.
-    size_t runs() const { return m_runs.size(); }
-
     /// Whether the file was seen growing at its end, so that all of its lines are of one run.
     bool isOneRun() const { return m_isOneRun; }
 

@@ -32,7 +32,7 @@ QString RootName()
 // The store rejects null strings; an empty one is found by the comparison after saving.
 QString NotNull(QString const& text)
 {
-    return text.isNull() ? QString(QLatin1String("")) : text;
+    return QLatin1String("") + text;
 }
 
 // The settings file as the log reads it, but without writing log entries. Only a regular file:

@@ -61,9 +61,9 @@ void Fill(TorkConfigFile& store, SettingsDocument const& document)
     for (SettingsDocument::Section const& section : document.sections) {
         if (!store.HasSection(section.name)) // one that is replaced would be nobody's
             store.AppendSection(new TorkConfigFileSection(section.name.toUtf8().constData()));
+        // The store rejects null strings; the sum is never one.
         for (SettingsDocument::Item const& item : section.items)
-            store.WriteItem(section.name, item.key,
-                            item.value.isNull() ? QString(QLatin1String("")) : item.value);
+            store.WriteItem(section.name, item.key, QLatin1String("") + item.value);
     }
 }
 

@@ -72,7 +72,8 @@ MainWindow::MainWindow(QWidget* parent)
     restoreFirstState();
 }
 
-// Deleting an open window hides it, which ends cell editing and makes the tabs send signals.
+// Deleting an open window hides it, which ends cell editing and makes the tabs send signals. Qt
+// would disconnect them only after that, when this object is no more than a QWidget.
 MainWindow::~MainWindow()
 {
     if (m_tabs)

@@ -4,6 +4,7 @@
 #include "app/window/RecentFiles.h"
 
 #include "app/AppUtils.h"
+#include "app/MruSeparator_p.h"
 #include "app/window/widgets/PlainText.h"
 
 #include <QAction>
@@ -14,8 +15,6 @@ namespace Velocor {
 
 namespace {
 
-constexpr QLatin1Char Separator('|');
-
 constexpr int MaximumNameLength = 100; // characters
 
 // The empty list reads as one empty entry, which would stay in the list forever. A path that is too
@@ -25,14 +24,14 @@ QString UsableEntries(QString const& list)
     QStringList entries;
     int start = 0;
     while (start < list.size() && entries.size() < RecentFiles::MaximumFiles) {
-        int end = list.indexOf(Separator, start);
+        int end = list.indexOf(MruSeparator, start);
         if (end < 0)
             end = list.size();
         if (end > start && end - start <= RecentFiles::MaximumPathLength)
             entries.append(list.mid(start, end - start));
         start = end + 1;
     }
-    return entries.join(Separator);
+    return entries.join(MruSeparator);
 }
 
 // "&" would mark a mnemonic, and a tab would start the shortcut column.
@@ -64,7 +63,7 @@ void RecentFiles::SetList(QString const& list)
 
 void RecentFiles::Add(QString const& path)
 {
-    if (path.contains(Separator) || path.size() > MaximumPathLength)
+    if (path.contains(MruSeparator) || path.size() > MaximumPathLength)
         return;
     AppUtils::AddToMRUList(path, m_list, MaximumFiles);
     SetList(m_list);
@@ -72,7 +71,7 @@ void RecentFiles::Add(QString const& path)
 
 bool RecentFiles::Contains(QString const& path) const
 {
-    return m_list.split(Separator).contains(path);
+    return m_list.split(MruSeparator).contains(path);
 }
 
 void RecentFiles::Remove(QString const& path)

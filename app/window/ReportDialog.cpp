@@ -4,20 +4,20 @@
 #include "app/window/ReportDialog.h"
 
 #include "app/window/widgets/PlainText.h"
+#include "app/window/widgets/TextDialog.h"
 
 #include <QClipboard>
 #include <QCoreApplication>
 #include <QDialogButtonBox>
 #include <QFileDialog>
 #include <QFileInfo>
-#include <QFontDatabase>
 #include <QGuiApplication>
+#include <QHBoxLayout>
 #include <QIcon>
 #include <QLabel>
 #include <QPlainTextEdit>
 #include <QPushButton>
 #include <QSaveFile>
-#include <QVBoxLayout>
 #include <QVariant>
 
 namespace Velocor {
@@ -28,9 +28,7 @@ ReportDialog::ReportDialog(QString const& title, QString const& heading, QString
 {
     setWindowTitle(title);
     m_text->setReadOnly(true);
-    m_text->setTabChangesFocus(true);
-    m_text->setLineWrapMode(QPlainTextEdit::NoWrap);
-    m_text->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
+    ShowUnwrapped(m_text);
     m_text->setAccessibleName(title);
     m_text->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
 
@@ -52,17 +50,7 @@ ReportDialog::ReportDialog(QString const& title, QString const& heading, QString
         QPushButton* save = buttons->addButton(tr("&Save..."), QDialogButtonBox::ActionRole);
         connect(save, &QPushButton::clicked, this, &ReportDialog::chooseFile);
     }
-    connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
-    const QList<QAbstractButton*> all = buttons->buttons();
-    for (QAbstractButton* button : all)
-        button->setIcon(QIcon());
-
-    auto* layout = new QVBoxLayout(this);
-    layout->setSpacing(10);
-    layout->addLayout(top);
-    layout->addWidget(m_text, 1);
-    layout->addWidget(buttons);
-    resize(680, 480);
+    LayOutTextDialog(this, top, m_text, buttons);
 }
 
 void ReportDialog::Copy()

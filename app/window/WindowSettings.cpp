@@ -4,6 +4,7 @@
 #include "app/window/WindowSettings.h"
 
 #include "app/settingsfile/SettingsFileReader.h"
+#include "common/config/TorkConfigEscapes_p.h"
 #include "common/config/TorkConfigText.h"
 
 #include <QDir>
@@ -52,22 +53,6 @@ QRect NormalGeometry(QWidget const* window)
 {
     const QRect normal = window->normalGeometry();
     return normal.isValid() ? normal : window->geometry();
-}
-
-// Decodes values of earlier versions, which escaped fewer characters.
-QString Unescaped(QString const& text)
-{
-    QString plain;
-    for (int i = 0; i < text.length(); ++i) {
-        bool converted = false;
-        ushort code = 0;
-        if (text.midRef(i, 2) == QLatin1String("\\u"))
-            code = text.midRef(i + 2, 4).toUShort(&converted, 16);
-        plain += converted ? QChar(code) : text.at(i);
-        if (converted)
-            i += 5;
-    }
-    return plain;
 }
 
 } // namespace
@@ -194,7 +179,8 @@ QString WindowSettings::Text(QString const& key)
     m_file.ReadItem(Section(), key, none, value);
     bool isEncoded = false;
     const QString text = TorkConfigText::DecodeValue(value, &isEncoded);
-    return isEncoded ? text : Unescaped(value);
+    // Earlier versions escaped fewer characters.
+    return isEncoded ? text : TorkUnescaped(QLatin1Char('\\'), value);
 }
 
 void WindowSettings::SetText(QString const& key, QString const& value)

@@ -5,6 +5,7 @@
 
 #include "common/config/TorkConfigFileDocHandler.h"
 #include "common/config/TorkOrderedHash_p.h"
+#include "common/log/TorkEmptyText_p.h"
 #include "common/log/TorkLog.h"
 #include "common/xml/TorkErrorHandler.h"
 #include "common/xml/TorkXmlGuard.h"
@@ -26,6 +27,7 @@ void TraceToLog(QString const& message)
 }
 
 // Checked first: almost no name has a space, and QString::remove() copies even if there is none.
+// For the goal "typed reads" in docs/performance.md; tests/plain/tst_PlainNumbers.cpp compares.
 bool HasSpace(QString const& name)
 {
     return std::find(name.begin(), name.end(), QLatin1Char(' ')) != name.end();
@@ -44,8 +46,8 @@ TorkConfigFile::TorkConfigFile(QString const& fileName)
 
 TorkConfigFile::TorkConfigFile(QString const& fileName, QString const& rootElementName)
     : m_fileName(fileName), m_rootElementName(rootElementName),
-      m_sections(new TorkOrderedHash<TorkConfigFileSection*>), m_currentElement(QLatin1String("")),
-      m_lastError(QLatin1String("")), m_screensSectionName(QStringLiteral("ApplicationScreens"))
+      m_sections(new TorkOrderedHash<TorkConfigFileSection*>), m_currentElement(TorkEmptyText()),
+      m_lastError(TorkEmptyText()), m_screensSectionName(QStringLiteral("ApplicationScreens"))
 {}
 
 TorkConfigFile::~TorkConfigFile()
@@ -85,7 +87,7 @@ bool TorkConfigFile::Load()
         return false;
     }
 
-    m_lastError = QLatin1String("");
+    m_lastError = TorkEmptyText();
     Clear();
     const bool parsed = parseFile();
     if (!parsed)
@@ -122,7 +124,7 @@ bool TorkConfigFile::parse(QIODevice* device, TorkConfigFileDocHandler& handler,
 {
     m_atRoot = false;
     m_expectingValue = false;
-    m_currentElement = QLatin1String("");
+    m_currentElement = TorkEmptyText();
 
     TorkXmlGuard source(device);
     QXmlSimpleReader reader;
@@ -239,7 +241,7 @@ QStringList TorkConfigFile::keyList(QString const& section)
 
 QString const* TorkConfigFile::findValue(QString const& section, QString const& key)
 {
-    // Names without spaces are not copied: typed reads are frequent.
+    // Names without spaces are not copied, see HasSpace().
     if (HasSpace(section) || HasSpace(key))
         return findCleaned(WithoutSpaces(section), WithoutSpaces(key));
     return findCleaned(section, key);
@@ -259,7 +261,7 @@ bool TorkConfigFile::ReadItem(QString const& section, QString const& key, QStrin
         value = *stored;
         return true;
     }
-    value = defaultValue.isEmpty() ? QString(QLatin1String("")) : defaultValue;
+    value = defaultValue.isEmpty() ? TorkEmptyText() : defaultValue;
     return false;
 }
 
@@ -299,8 +301,7 @@ bool TorkConfigFile::StartElement(QString& name)
 
 bool TorkConfigFile::EndElement(QString&)
 {
-    // A literal, so that nothing is allocated for each element.
-    m_currentElement = QStringLiteral(""); // clazy:exclude=empty-qstringliteral
+    m_currentElement = TorkEmptyText();
     return true;
 }
 

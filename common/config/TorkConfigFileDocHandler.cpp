@@ -4,11 +4,13 @@
 #include "common/config/TorkConfigFileDocHandler.h"
 
 #include "common/config/TorkConfigFile.h"
+#include "common/log/TorkEmptyText_p.h"
 
 namespace {
 
 // The reader fills the same text again for the next element. Sharing it would make the reader
-// allocate a new one each time, with room to grow, which a load pays for with every key and value.
+// allocate a new one, with room to grow, for each key and value. For the goal "load, against
+// QSettings" in docs/performance.md; tests/plain/tst_PlainLoad.cpp compares the loaded values.
 QString Unshared(QString const& text)
 {
     return text.isNull() ? text : QString(text.constData(), text.length());
@@ -19,8 +21,8 @@ QString Unshared(QString const& text)
 TorkConfigFileDocHandler::TorkConfigFileDocHandler() : TorkConfigFileDocHandler(nullptr) {}
 
 TorkConfigFileDocHandler::TorkConfigFileDocHandler(TorkConfigFile* file)
-    : m_file(file), m_lastOpenedElement(QLatin1String("")), m_content(QLatin1String("")),
-      m_lastClosedElement(QLatin1String(""))
+    : m_file(file), m_lastOpenedElement(TorkEmptyText()), m_content(TorkEmptyText()),
+      m_lastClosedElement(TorkEmptyText())
 {}
 
 TorkConfigFileDocHandler::~TorkConfigFileDocHandler() = default;

@@ -13,6 +13,8 @@
 
 #include "common/config/TorkConfigFile.h"
 
+#include "common/log/TorkEmptyText_p.h"
+
 #include <QFile>
 #include <QObject>
 #include <QSaveFile>
@@ -331,6 +333,6 @@ bool TorkConfigFile::SaveAtomically()
         m_lastError = QObject::tr("%1 was written in place, as it cannot be replaced: %2")
                           .arg(m_fileName, outcome.inPlaceBecause);
     else
-        m_lastError = QLatin1String("");
+        m_lastError = TorkEmptyText();
     return outcome.failure.isEmpty();
 }

@@ -7,6 +7,7 @@
 
 #include "common/config/TorkConfigFileSection.h"
 #include "common/config/TorkOrderedHash_p.h"
+#include "common/log/TorkLatin1_p.h"
 
 #include <QFile>
 
@@ -56,12 +57,9 @@ char* Copy(char* to, QLatin1String text)
     return std::copy(text.begin(), text.end(), to);
 }
 
-// Converts like QString::toLatin1().
 char* Copy(char* to, QString const& text)
 {
-    return std::transform(text.constBegin(), text.constEnd(), to, [](QChar character) {
-        return character.unicode() > 0xff ? '?' : static_cast<char>(character.unicode());
-    });
+    return std::transform(text.utf16(), text.utf16() + text.length(), to, TorkToLatin1);
 }
 
 // Appends all pieces after reserving space once, without a temporary byte array for each.
@@ -87,13 +85,13 @@ QString FormattedItem(QString const& key, QString const& value)
     return line.arg(key).arg(Filtered(value)).arg(key); // clazy:exclude=qstring-arg
 }
 
-// Converts like QString::toLatin1() and notes what the characters need. Characters that share only
-// the low byte with a special one are noted too, which only costs time.
+// Copies a text and notes what its characters need. Characters that share only
+// the low byte with a special one are noted too, so their line is formatted again in vain.
 char* CopyNoting(char* to, QString const& text, uchar& needs)
 {
     for (QChar character : text) {
         const ushort unit = character.unicode();
-        *to++ = unit > 0xff ? '?' : static_cast<char>(unit);
+        *to++ = TorkToLatin1(unit);
         needs |= NeedsOnLine.of[unit & 0xff];
     }
     return to;
@@ -101,7 +99,8 @@ char* CopyNoting(char* to, QString const& text, uchar& needs)
 
 // Appends the line of FormattedItem(), without its temporary strings: this is the inner loop of a
 // save. Written as if key and value had no special characters; if one turns up, the line is
-// formatted again. tests/plain/tst_PlainSave.cpp compares the two.
+// formatted again. For the goal "save, against pugixml" in docs/performance.md;
+// tests/plain/tst_PlainSave.cpp compares the two.
 void AppendItem(QByteArray& xml, QString const& key, QString const& value)
 {
     const int end = xml.size();

@@ -44,9 +44,9 @@ QDesktopWidget* Desktop()
     return haveApplication ? QApplication::desktop() : nullptr;
 }
 
-// Same result as QString::toInt(). Plain short numbers, which almost all are, are parsed here, as
-// Qt's locale-aware conversion dominates a typed read. tests/plain/tst_PlainNumbers.cpp compares
-// the two.
+// Same result as QString::toInt(). Plain short numbers, which almost all are, are parsed here,
+// without Qt's locale-aware conversion. For the goal "typed reads" in docs/performance.md;
+// tests/plain/tst_PlainNumbers.cpp compares the two.
 int ToInt(QString const& text, bool* converted)
 {
     QChar const* const characters = text.constData();

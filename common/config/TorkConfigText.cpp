@@ -3,6 +3,9 @@
 
 #include "common/config/TorkConfigText.h"
 
+#include "common/config/TorkConfigEscapes_p.h"
+#include "common/log/TorkEmptyText_p.h"
+
 namespace {
 
 constexpr QLatin1Char ValueEscape('\\');
@@ -55,31 +58,13 @@ QString Escaped(QLatin1Char escape, QChar character)
     return escape + QStringLiteral("u%1").arg(character.unicode(), HexDigits, 16, QLatin1Char('0'));
 }
 
-// Leaves everything that does not look like an escape unchanged.
-QString Unescaped(QLatin1Char escape, QString const& encoded)
-{
-    if (encoded == escape)
-        return QString(QLatin1String(""));
-
-    QString text;
-    for (int i = 0; i < encoded.length(); ++i) {
-        bool isHex = false;
-        ushort unit = 0;
-        if (encoded.at(i) == escape && encoded.midRef(i + 1, 1) == QLatin1String("u"))
-            unit = encoded.midRef(i + 2, HexDigits).toUShort(&isHex, 16);
-        text += isHex ? QChar(unit) : encoded.at(i);
-        if (isHex)
-            i += 1 + HexDigits;
-    }
-    return text;
-}
-
 using Encoder = QString (*)(QString const&);
 
 // Each text has exactly one encoding; anything else that looks like one was not encoded here.
 QString Decoded(Encoder encode, QLatin1Char escape, QString const& encoded, bool* ok)
 {
-    const QString text = Unescaped(escape, encoded);
+    // The escape character alone is the empty text.
+    const QString text = encoded == escape ? TorkEmptyText() : TorkUnescaped(escape, encoded);
     const bool isEncoding = encode(text) == encoded;
     if (ok)
         *ok = isEncoding;
@@ -87,6 +72,21 @@ QString Decoded(Encoder encode, QLatin1Char escape, QString const& encoded, bool
 }
 
 } // namespace
+
+QString TorkUnescaped(QLatin1Char escape, QString const& text)
+{
+    QString unescaped;
+    for (int i = 0; i < text.length(); ++i) {
+        bool isHex = false;
+        ushort unit = 0;
+        if (text.at(i) == escape && text.midRef(i + 1, 1) == QLatin1String("u"))
+            unit = text.midRef(i + 2, HexDigits).toUShort(&isHex, 16);
+        unescaped += isHex ? QChar(unit) : text.at(i);
+        if (isHex)
+            i += 1 + HexDigits;
+    }
+    return unescaped;
+}
 
 bool TorkConfigText::IsPlainValue(QString const& text)
 {

@@ -12,9 +12,10 @@
 
 /// A hash table with text keys that iterates in insertion order.
 ///
-/// The plain way is a QHash next to a list, but it allocates a node for each key, which dominates
-/// loading a large file. Here the entries are in one array, and a second array indexes them.
-/// tests/plain/tst_PlainTable.cpp compares it with the plain way.
+/// The plain way is a QHash next to a list, which allocates a node for each key. Here the entries
+/// are in one array, and a second array indexes them. For the goals "load, against QSettings" and
+/// "typed reads" in docs/performance.md; tests/plain/tst_PlainTable.cpp compares it with the plain
+/// way.
 ///
 /// Keys match exactly and are unique. One thread at a time. Not installed: no public header needs
 /// it.
@@ -79,7 +80,7 @@ private:
 
     uint hashOf(QString const& key) const { return qHash(key, m_seed); }
 
-    // Qt's comparison does more than test for equality, and every lookup compares.
+    // Qt's comparison also determines an order, which a lookup, as in "typed reads", does not need.
     static bool isSame(QString const& a, QString const& b)
     {
         const size_t bytes = static_cast<size_t>(a.length()) * sizeof(QChar);

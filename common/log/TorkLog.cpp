@@ -5,11 +5,12 @@
 
 #include "common/log/TorkLog.h"
 
+#include "common/log/TorkEmptyText_p.h"
 #include "common/log/TorkLogLock_p.h"
 #include "common/log/TorkLogStamp_p.h"
 #include "common/log/TorkLogWriter_p.h"
 
-TorkLog::TorkLog() : TorkLog(QString(QLatin1String(""))) {}
+TorkLog::TorkLog() : TorkLog(TorkEmptyText()) {}
 
 TorkLog::TorkLog(QString const& path)
     : QObject(nullptr), m_writer(std::make_unique<TorkLogWriter>()),
@@ -29,7 +30,7 @@ TorkLog::~TorkLog()
 
 void TorkLog::clear()
 {
-    const QString empty = QLatin1String("");
+    const QString empty = TorkEmptyText();
     TorkLogLock lock(m_mutex);
 
     m_path = empty;

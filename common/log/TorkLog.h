@@ -273,6 +273,10 @@ public:
 
 private:
     // The files. The caller holds m_mutex, except for makeLogDirectory(), which needs no lock.
+    //
+    // inLogDirectory() joins the log directory and a name with a slash, unless the directory ends
+    // in one or is empty.
+    QString inLogDirectory(QString const& name) const;
     QString currentFileName() const;
     QString currentFilePath() const;
     QFileInfo currentFile() const;
@@ -280,7 +284,7 @@ private:
     bool openFile(QString const& fileName);
     bool locate(int length);
     void shiftOldFiles(QString const& directory) const;
-    void pruneOldFiles(QString const& directory, qint64 highest) const;
+    void pruneOldFiles(qint64 highest) const;
 
     // Entries. These lock m_mutex only where they must, so that threads format in parallel. The
     // caller of echo() holds it.

@@ -5,12 +5,13 @@
 
 #include "common/log/TorkLog.h"
 
+#include "common/log/TorkEmptyText_p.h"
+#include "common/log/TorkLatin1_p.h"
 #include "common/log/TorkLogLock_p.h"
 #include "common/log/TorkLogStamp_p.h"
 #include "common/log/TorkLogWriter_p.h"
 
 #include <QDebug>
-#include <QMessageLogger>
 
 #include <algorithm>
 
@@ -30,7 +31,7 @@ QString SeverityText(int severity)
     case TorkLog::Fatal:
         return QObject::tr("Fatal");
     default:
-        return QString(QLatin1String(""));
+        return TorkEmptyText();
     }
 }
 
@@ -42,14 +43,6 @@ ushort const* Units(QString const& text)
 void Append(TorkLogLine& line, QString const& text)
 {
     line.append(Units(text), text.length());
-}
-
-// Converts like QString::toLatin1(), without allocating.
-void ToLatin1(char* bytes, ushort const* text, int length)
-{
-    std::transform(text, text + length, bytes, [](ushort character) {
-        return character > 0xff ? '?' : static_cast<char>(character);
-    });
 }
 
 } // namespace
@@ -94,7 +87,7 @@ void TorkLog::write(QString const& line)
 void TorkLog::writeLine(ushort const* line, int length)
 {
     QVarLengthArray<char, 512> bytes(length);
-    ToLatin1(bytes.data(), line, length);
+    std::transform(line, line + length, bytes.data(), TorkToLatin1);
 
     TorkLogLock lock(m_mutex);
     m_writing = 1;
@@ -115,7 +108,7 @@ void TorkLog::writeLine(ushort const* line, int length)
 void TorkLog::echo(QString const& line) const
 {
     qInstallMessageHandler(TorkLog_MessageHandler);
-    QMessageLogger(nullptr, 0, nullptr).debug() << line;
+    qDebug() << line;
 }
 
 // Returns the time of day of `now`.

@@ -109,13 +109,13 @@ void Copy(QString const& from, QString const& to)
         copy.setAutoRemove(false);
 }
 
-// Removes what Copy() to number 1 of the log `name` leaves when the program is killed.
-void RemoveUnfinishedCopies(QString const& directory, QString const& name)
+// Removes what Copy() to number 1 of the log leaves when the program is killed.
+void RemoveUnfinishedCopies(QFileInfo const& log)
 {
-    const QString start = name + QLatin1String(".1");
+    const QString start = log.fileName() + QLatin1String(".1");
     const int length = PartName(start).length();
     const QStringList files =
-        EntriesWithExtension(directory, start, QDir::Files | QDir::Hidden | QDir::NoSymLinks);
+        EntriesWithExtension(log.path(), start, QDir::Files | QDir::Hidden | QDir::NoSymLinks);
     for (QString const& file : files) {
         const QStringRef random = file.midRef(start.length() + 1, 6);
         const bool isRandom = std::all_of(random.begin(), random.end(), [](QChar letter) {
@@ -123,7 +123,7 @@ void RemoveUnfinishedCopies(QString const& directory, QString const& name)
                    (letter >= QLatin1Char('A') && letter <= QLatin1Char('Z'));
         });
         if (file.length() == length && file.endsWith(QLatin1String(".part")) && isRandom)
-            QFile::remove(QDir(directory).filePath(file));
+            QFile::remove(log.dir().filePath(file));
     }
 }
 
@@ -135,10 +135,15 @@ QString TorkLog::currentFileName() const
                                      : m_filePrefix + QLatin1Char('.') + m_fileExtension;
 }
 
-QString TorkLog::currentFilePath() const
+QString TorkLog::inLogDirectory(QString const& name) const
 {
     const QString separator = EndsInSlash(m_path) ? QString() : QStringLiteral("/");
-    return m_path + separator + currentFileName();
+    return m_path + separator + name;
+}
+
+QString TorkLog::currentFilePath() const
+{
+    return inLogDirectory(currentFileName());
 }
 
 QString& TorkLog::fileSpec(bool all)
@@ -240,13 +245,15 @@ bool TorkLog::locate(int length)
 
 void TorkLog::deleteOldFiles()
 {
+    // Of "/" nothing is left, which lists the working directory instead: the names found there
+    // decide what is shifted, and up to which number files are removed. Kept for compatibility.
     QString directory = m_path;
     if (EndsInSlash(directory))
         directory.chop(1);
     shiftOldFiles(directory);
 
     const QString current = currentFilePath();
-    RemoveUnfinishedCopies(directory, currentFileName());
+    RemoveUnfinishedCopies(QFileInfo(current));
     Copy(current, current + QLatin1String(".1"));
     QFile::remove(current);
 }
@@ -273,24 +280,23 @@ void TorkLog::shiftOldFiles(QString const& directory) const
     }
 
     if (numbered.lastKey() >= static_cast<int>(m_maxLogFiles.load()))
-        pruneOldFiles(directory, qint64(numbered.lastKey()) + 1);
+        pruneOldFiles(qint64(numbered.lastKey()) + 1);
 }
 
 // Removes everything named like an older file, from `highest` down to the first above the limit,
 // even a pipe or a dangling link. Iterates over existing names: a stray file with a huge number
 // must not cost a billion attempts.
-void TorkLog::pruneOldFiles(QString const& directory, qint64 highest) const
+void TorkLog::pruneOldFiles(qint64 highest) const
 {
     const qint64 lowest = qint64(static_cast<int>(m_maxLogFiles.load())) + 1;
-    const QString name = currentFileName();
-    const QString path = currentFilePath();
+    const QFileInfo current(currentFilePath());
 
     const QDir::Filters all = QDir::AllEntries | QDir::System | QDir::NoDotAndDotDot;
-    const QStringList files = EntriesWithExtension(directory, name, all);
+    const QStringList files = EntriesWithExtension(current.path(), current.fileName(), all);
     for (QString const& file : files) {
-        const QString number = file.mid(name.length() + 1);
+        const QString number = file.mid(current.fileName().length() + 1);
         const qint64 value = number.toLongLong();
         if (number == QString::number(value) && value >= lowest && value <= highest)
-            QFile::remove(path + QLatin1Char('.') + number);
+            QFile::remove(current.filePath() + QLatin1Char('.') + number);
     }
 }

@@ -127,8 +127,7 @@ TorkLog* TorkLog::initialize(QString const& path, QString const& prefix,
 
 TorkLog* TorkLog::initialize(QString const& prefix)
 {
-    const QString byDefault = QLatin1String("");
-    return initialize(byDefault, prefix, byDefault, true);
+    return initialize(QString(), prefix, QString(), true);
 }
 
 void TorkLog::shutdown()

@@ -12,10 +12,11 @@ thread_local bool t_holdsLock = false;
 using Clock = std::chrono::steady_clock;
 using std::chrono::microseconds;
 
-// An entry holds the lock for about a microsecond, much less than a thread needs to fall asleep
-// and wake up again: trying for a moment first halves the cost of an entry with two threads. The
-// pauses between the tries leave the lock to whoever has it: without them it changes hands for
-// every entry, and all that belongs to the file moves to the other processor each time.
+// An entry holds the lock for less time than a thread needs to fall asleep and wake up again, so a
+// thread tries for a moment before it sleeps. The pauses between the tries leave the lock to its
+// owner: without them it would change hands with every entry, and the file's data would move to
+// another processor each time. For the goals "entry, 2 and 4 threads" in docs/performance.md; there
+// is no result to compare, tests/reliability/tst_Load.cpp checks that no entry is lost.
 constexpr microseconds Pause(1);
 constexpr microseconds Moment(40);
 
@@ -58,7 +59,7 @@ bool TorkLogLock::isHeldHere()
 
 QtMessageHandler TorkLog_DefaultMessageHandler()
 {
-    // Installing a handler returns the one before it, and behind no handler is the default one.
+    // Installing a handler returns the previous one, and after nullptr that is the default one.
     static const QtMessageHandler handler = [] {
         const QtMessageHandler installed = qInstallMessageHandler(nullptr);
         return qInstallMessageHandler(installed);

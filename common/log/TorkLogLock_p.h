@@ -8,7 +8,7 @@
 
 /// Holds a log's lock for a scope. For the log's own sources.
 ///
-/// The lock is not recursive, and the toolkit warns by itself in some file operations; while this
+/// The lock is not recursive, and Qt itself logs warnings in some file operations; while this
 /// thread holds the lock, TorkLog_MessageHandler() keeps such messages out of the log.
 class TorkLogLock
 {
@@ -26,5 +26,5 @@ private:
     QMutex& m_mutex;
 };
 
-/// The message handler that the toolkit uses where no other is installed. Any thread.
+/// The message handler that Qt uses if no other is installed. Any thread.
 QtMessageHandler TorkLog_DefaultMessageHandler();

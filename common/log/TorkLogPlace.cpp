@@ -17,7 +17,7 @@ namespace {
 
 bool IsLogType(struct stat const& status)
 {
-    // A directory is left to QFile, which knows what to say about it.
+    // A directory is left to QFile, whose error text says what is wrong.
     return S_ISREG(status.st_mode) || S_ISCHR(status.st_mode) || S_ISDIR(status.st_mode);
 }
 

@@ -35,8 +35,9 @@ qint64 Position(QFileDevice const& file);
 /// Whether the system will write next at the end of this open regular file.
 bool IsAtEnd(QFileDevice const& file);
 
-/// The size of this open file, 0 if the system cannot tell. Asks for nothing else, because asking
-/// for the times as well, as QFile::size() does, makes the next write more expensive.
+/// The size of this open file, 0 if the system cannot tell. Asks for nothing else: after a request
+/// for the times, as in QFile::size(), the next write has to update them. For the goal "entry,
+/// 1 thread" in docs/performance.md; tests/plain/tst_PlainLogFiles.cpp compares the files.
 qint64 Size(QFileDevice const& file);
 
 /// Makes other programs' calls of this function on the same file fail until LetOthersIn(). Never

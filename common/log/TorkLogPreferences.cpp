@@ -47,13 +47,9 @@ QString ReadText(TorkConfigFile& settings, QString const& key, QString defaultVa
 bool TorkLog::setPreferencesFileName(QString const& name)
 {
     QString chosen = name.isEmpty() ? QStringLiteral("logsettings.cfg") : name;
-    if (!chosen.contains(QLatin1Char('/'))) {
-        const QString directory = path();
-        const bool endsInSlash = directory.lastIndexOf(QLatin1Char('/')) == directory.length() - 1;
-        const QString separator = endsInSlash ? QString() : QStringLiteral("/");
-        chosen = directory + separator + chosen;
-    }
     TorkLogLock lock(m_mutex);
+    if (!chosen.contains(QLatin1Char('/')))
+        chosen = inLogDirectory(chosen);
     m_preferencesFileName = std::move(chosen);
     return true;
 }

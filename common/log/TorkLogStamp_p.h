@@ -8,15 +8,18 @@
 #include <QVarLengthArray>
 #include <QtGlobal>
 
-/// The text of an entry while it is built: on the stack, as allocating memory costs as much as
-/// filling it.
+/// The text of an entry while it is built, on the stack: for the goal "entry, 1 thread" in
+/// docs/performance.md. tests/plain/tst_PlainLogFiles.cpp compares entries with plain strings.
 using TorkLogLine = QVarLengthArray<ushort, 512>;
 
 /// The local time of an entry, and its time stamp. For the log's own sources.
 ///
-/// Many entries share a millisecond, and Qt's formatting costs more than all the rest of an entry.
-/// So each thread keeps what Qt said until the millisecond, the format or the time zone (`TZ`)
-/// changes. `now` is always what QDateTime::currentMSecsSinceEpoch() returned. Any thread.
+/// Many entries share a millisecond, so each thread keeps what Qt formatted until the millisecond,
+/// the format or the time zone (`TZ`) changes. For the goals "entry, 1 thread" and "off" in
+/// docs/performance.md; tests/plain/tst_PlainStamps.cpp compares with Qt's formatting of each
+/// entry.
+///
+/// `now` is always what QDateTime::currentMSecsSinceEpoch() returned. Any thread.
 ///
 /// The functions return the local time of day of `now`, in milliseconds since midnight.
 namespace TorkLogStamp {

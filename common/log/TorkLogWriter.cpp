@@ -13,9 +13,9 @@ QString TorkLogWriter::open(QString const& fileName)
     m_file.setFileName(fileName);
     m_followsEnd = false;
     m_appends = false;
-    // Checked before, so that nobody who waits for a pipe is disturbed, and after, as the name may
-    // have come to mean another file.
-    // Neither appending nor truncating: entries go over the old content from its start on.
+    // Checked before opening, so that the other end of a pipe is not disturbed, and after it, as
+    // the name may refer to another file by then. Neither appending nor truncating: entries
+    // overwrite the old content from its start.
     const bool mayBeLog = TorkLogPlace::MayBeLog(fileName);
     const bool opened = mayBeLog && m_file.open(QIODevice::ReadWrite | QIODevice::Text);
     if (mayBeLog && !opened)
@@ -55,7 +55,9 @@ QFile* TorkLogWriter::handOut()
 void TorkLogWriter::write(char const* bytes, int length, qint64 limit)
 {
     // Past the file object, which would copy the entry into its buffer and out again. The file
-    // object gets only what the system does not take.
+    // object gets only what the system does not take. For the goal "entry, 1 thread" in
+    // docs/performance.md; tests/plain/tst_PlainLogFiles.cpp compares the files with those of a log
+    // that writes through the file object.
     const bool isPlaced = place(length, limit);
     const int written = isPlaced ? TorkLogPlace::Write(m_file, bytes, length) : 0;
     if (isPlaced && written < length)
@@ -80,6 +82,7 @@ bool TorkLogWriter::place(int length, qint64 limit)
         return false;
     }
 
+    // Usual, and without the system calls below: for the same goal, compared by the same test.
     if (m_appends && TorkLogPlace::IsAtEnd(m_file))
         return true;
 
@@ -107,8 +110,8 @@ bool TorkLogWriter::findPlace(int length, qint64 limit)
     return m_file.flush();
 }
 
-// Tells the file object where the system will write next, which it does not learn from what is
-// written past it or by another process after fork().
+// Moves the file object to where the system will write next. It does not notice what is written
+// past it, or by another process after fork().
 void TorkLogWriter::takePosition()
 {
     const qint64 position = TorkLogPlace::Position(m_file);

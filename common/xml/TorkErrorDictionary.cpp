@@ -3,6 +3,8 @@
 
 #include "common/xml/TorkErrorDictionary.h"
 
+#include "common/log/TorkEmptyText_p.h"
+
 TorkErrorDictionary::TorkErrorDictionary(QString const& name, unsigned int baseErrorCode)
     : QObject(nullptr), m_name(name), m_baseErrorCode(baseErrorCode)
 {}
@@ -11,6 +13,6 @@ TorkErrorDictionary::~TorkErrorDictionary() = default;
 
 bool TorkErrorDictionary::decode(int, QString& text)
 {
-    text = QLatin1String("");
+    text = TorkEmptyText();
     return false;
 }

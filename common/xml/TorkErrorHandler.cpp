@@ -3,17 +3,18 @@
 
 #include "common/xml/TorkErrorHandler.h"
 
+#include "common/log/TorkEmptyText_p.h"
+
 #include <QDebug>
-#include <QMessageLogger>
 #include <QXmlParseException>
 
-TorkErrorHandler::TorkErrorHandler(TorkLog* log) : m_log(log), m_errorText(QLatin1String("")) {}
+TorkErrorHandler::TorkErrorHandler(TorkLog* log) : m_log(log), m_errorText(TorkEmptyText()) {}
 
 TorkErrorHandler::~TorkErrorHandler() = default;
 
 bool TorkErrorHandler::warning(QXmlParseException const& exception)
 {
-    QMessageLogger(nullptr, 0, nullptr).warning() << format(exception);
+    qWarning() << format(exception);
     return true;
 }
 
@@ -21,15 +22,14 @@ bool TorkErrorHandler::warning(QXmlParseException const& exception)
 bool TorkErrorHandler::error(QXmlParseException const& exception)
 {
     format(exception);
-    QMessageLogger(nullptr, 0, nullptr).critical() << "TorkErrorHandler::error " << m_errorText;
+    qCritical() << "TorkErrorHandler::error " << m_errorText;
     return true;
 }
 
 bool TorkErrorHandler::fatalError(QXmlParseException const& exception)
 {
     format(exception);
-    QMessageLogger(nullptr, 0, nullptr).critical()
-        << "TorkErrorHandler::fatalError: " << m_errorText;
+    qCritical() << "TorkErrorHandler::fatalError: " << m_errorText;
     return false;
 }
 

@@ -13,6 +13,10 @@
 ///
 /// The writers share no base class, so the rules are here once, as templates on the writer. Each
 /// piece goes through the writer's virtual operations, so that a subclass sees it.
+///
+/// Fast paths are NeedsCData(), AppendAll(), the buffer in WriteTag() and the branch without
+/// placeholders in CollectAttribute(). They are for the goal "document, against the floor" in
+/// docs/performance.md, and tests/plain/tst_PlainWriters.cpp compares them with plain strings.
 namespace TorkXmlFormat {
 
 /// If the pending attributes and the next one reach this many characters, a new line starts.
@@ -29,8 +33,8 @@ inline qint32 Lowered(qint32 level, int indent)
     return static_cast<qint32>(static_cast<quint32>(level) - static_cast<quint32>(indent));
 }
 
-// The backslash is included, so that paths stand out; the apostrophe is not. No early return, so
-// that compilers can vectorize the loop.
+// The backslash is included, so that paths are easy to see; the apostrophe is not. No early return,
+// so that compilers can vectorize the loop.
 inline bool NeedsCData(QString const& value)
 {
     ushort found = 0;
@@ -140,7 +144,7 @@ int EndOfTag(Writer& writer, TorkXmlLayout& layout, QString const& name, QLatin1
              int indent)
 {
     if (name.isEmpty()) {
-        layout.pending = QLatin1String("");
+        layout.pending.resize(0);
         return TorkXmlResult::EmptyName;
     }
 
@@ -148,7 +152,7 @@ int EndOfTag(Writer& writer, TorkXmlLayout& layout, QString const& name, QLatin1
     layout.pending += end;
     if (WritePending(writer, layout) < 0)
         return TorkXmlResult::WriteFailed;
-    layout.pending = QLatin1String("");
+    layout.pending.resize(0);
     return TorkXmlResult::Success;
 }
 

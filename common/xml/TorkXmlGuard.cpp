@@ -9,8 +9,8 @@
 #include <QXmlParseException>
 #include <QXmlSimpleReader>
 
-// Stands in for the reader's error handler from the end that the guard made until the reader tells
-// of it, to name the limit instead.
+// Replaces the reader's error handler from the end that the guard made until the reader reports it,
+// to name the limit instead.
 class TorkXmlGuard::Watcher : public QXmlErrorHandler
 {
 public:
@@ -65,14 +65,16 @@ QChar TorkXmlGuard::next()
     return m_next != m_end && m_watcher->passes(*m_next) ? *m_next++ : takeNext();
 }
 
-// The few characters of a document that mean something to the guard.
+// For the few characters of a document that mean something to the guard. Not inlined, so that
+// next() stays small: for the goal "load, against QSettings" in docs/performance.md, compared by
+// tests/plain/tst_PlainGuard.cpp.
 Q_NEVER_INLINE QChar TorkXmlGuard::takeNext()
 {
     if (m_next == m_end)
         return fetchNext();
 
     const QChar character = *m_next++;
-    // As a character of the text it would be taken for a sign of the source's.
+    // As a character of the text, the reader would take it for the source's own end of data.
     if (character == QChar(EndOfData))
         return QChar(EndOfDocument);
     if (character == QChar(EndOfDocument) || m_watcher->read(character))
@@ -83,8 +85,8 @@ Q_NEVER_INLINE QChar TorkXmlGuard::takeNext()
     return QChar(EndOfDocument);
 }
 
-// Tells once that what was fetched is used up, for a reader that wants to come back later, and
-// fetches more when it is asked again.
+// Returns EndOfData once when the fetched text is used up, for a reader that parses incrementally,
+// and fetches more when it is called again.
 QChar TorkXmlGuard::fetchNext()
 {
     if (m_isOver)

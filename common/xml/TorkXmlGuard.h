@@ -13,15 +13,16 @@ class QXmlSimpleReader;
 /// The reader calls itself once per open element and per open group of a content model, compares
 /// each entity that is declared with all others, puts each in as often as it is named, and copies
 /// and compares namespace prefixes: a hundred kilobytes of any of these could exhaust the stack,
-/// take minutes or fill the memory, before a content handler hears of it. The guard follows what
+/// take minutes or fill the memory, before a content handler is called. The guard follows what
 /// the reader reads and ends the document where it goes beyond a limit of TorkXmlLimits.h; within
 /// them the reader gets exactly what a plain QXmlInputSource would give it.
 ///
-/// The parse then fails as that of a malformed document does. The reader's error handler is told of
-/// one fatal error whose message names the limit; there is no other sign.
+/// The parse then fails as that of a malformed document does: parse() returns false, and the
+/// reader's error handler receives one fatal error whose message names the limit. The content
+/// handler has received everything before that place, so discard what it built.
 ///
-/// What an entity resolver puts in place of external entities is not watched. One parse, one
-/// thread.
+/// What an entity resolver puts in place of external entities is not watched. Make a guard for each
+/// parse: what it has counted is never reset. One thread.
 ///
 ///     QFile file(path);
 ///     TorkXmlGuard source(&file);
@@ -33,14 +34,22 @@ class TorkXmlGuard : public QXmlInputSource
 {
 public:
     /// Reads from a device, which is not owned and must outlive the guard.
+    ///
+    /// @param device  opened by the guard if it is closed; one that cannot be read is an empty
+    ///                document, so the parse fails
     explicit TorkXmlGuard(QIODevice* device);
+
+    /// Leaves the device open and the reader as it is.
     ~TorkXmlGuard() override;
 
-    /// Has the reader's error handler, also one that is set later, told which limit was passed.
-    /// Without this it is told of an unexpected end of the file. The reader must outlive the parse.
+    /// Makes the reader's error handler, even one that is set later, receive the limit that was
+    /// exceeded. Without this it receives an unexpected end of the file. Call it before parse().
+    ///
+    /// @param reader  not owned; must outlive the parse
     void Watch(QXmlSimpleReader& reader);
 
-    /// The next character; from the one that goes beyond a limit on, the end of the document.
+    /// For the reader: the next character of the document. From the first that exceeds a limit on,
+    /// it is always QXmlInputSource::EndOfDocument.
     QChar next() override;
 
 private:
@@ -51,8 +60,9 @@ private:
     QScopedPointer<Watcher> m_watcher;
     bool m_isOver = false; ///< whether a limit was passed
 
-    // What the device gave last, walked through here instead of by Qt's own next(): loading
-    // settings would fall behind its peers without it.
+    // What was last read from the device, walked through here instead of by Qt's own next(). For
+    // the goal "load, against QSettings" in docs/performance.md; tests/plain/tst_PlainGuard.cpp
+    // compares the two.
     QString m_fetched;
     QChar const* m_next = nullptr;
     QChar const* m_end = nullptr;

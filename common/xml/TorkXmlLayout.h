@@ -24,7 +24,7 @@ struct TorkXmlLayout
 
     /// The attributes of the open start tag, and its closing characters, until they are written.
     /// Each begins with a space, except after a line break; nothing in it is escaped.
-    QString pending = QLatin1String("");
+    QString pending;
 
     /// A buffer that is kept from tag to tag, so that writing one does not allocate. Empty while a
     /// tag is being written, as an overridden Write() may call the writer again.

@@ -27,7 +27,7 @@ bool IsPredefined(QString const& name)
            name == QLatin1String("quot");
 }
 
-// What a reference "#65" or "#x41" stands for. The reader takes the lower 16 bits, too.
+// The character of a reference "#65" or "#x41": the lower 16 bits, as in the reader.
 QChar CharacterOf(QString const& reference)
 {
     const bool isHex = reference.startsWith(QLatin1String("#x"));
@@ -36,7 +36,7 @@ QChar CharacterOf(QString const& reference)
     return QChar(static_cast<ushort>(code));
 }
 
-// A text in quotes must not end where the text of an entity holds one.
+// A text in quotes must not end at a quote in the text of an entity.
 QString WithoutQuotes(QString text)
 {
     return text.replace(QLatin1Char('"'), QLatin1String("&quot;"))
@@ -240,7 +240,7 @@ void TorkXmlLexer::takeTag(QChar character)
             openReference(character, m_state);
         }
         break;
-    default: // behind the slash of an empty element
+    default: // after the slash of an empty element
         m_state = State::Content;
     }
 }

@@ -11,8 +11,7 @@
 #include <QVarLengthArray>
 #include <QVector>
 
-/// Follows a document character by character and tells as soon as it goes beyond a limit. For
-/// TorkXmlGuard.
+/// Follows a document character by character and reports when it exceeds a limit. For TorkXmlGuard.
 ///
 /// It sees what Qt's QXmlSimpleReader sees, the texts of entities included, which the reader takes
 /// from a stack of its own and not from the input source. It checks no syntax: where a document is
@@ -35,8 +34,9 @@ public:
     TorkXmlLexer() = default;
     explicit TorkXmlLexer(Limits const& limits) : m_limits(limits) {}
 
-    /// Whether this character, as the next one, changes nothing: most of a document does not, and
-    /// need not be read.
+    /// Whether reading this character next would change nothing, as for most of a document; then
+    /// read() need not be called. For the goal "load, against QSettings" in docs/performance.md;
+    /// tests/plain/tst_PlainGuard.cpp compares with a guard that reads every character.
     bool passes(QChar character) const
     {
         const ushort unit = character.unicode();
@@ -49,7 +49,7 @@ public:
     /// @return false if the document goes beyond a limit with it
     bool read(QChar character);
 
-    /// The limit that was passed, in words; empty if none was.
+    /// A text that names the exceeded limit; empty if none was.
     QString const& reason() const { return m_reason; }
 
 private:
@@ -95,7 +95,7 @@ private:
         QString value;
     };
 
-    // Of a tag it is made for each element, so it asks for no memory.
+    // Built for each tag, so usually without allocating.
     using Name = QVarLengthArray<QChar, 64>;
 
     struct Text

@@ -24,13 +24,14 @@ constexpr int TorkXmlMaximumDepth = 1000;
 constexpr int TorkXmlMaximumEntities = 1000;
 
 /// The most characters in the names and texts of all entities that a document type declares, where
-/// TorkXmlGuard watches. A parameter entity that is named in a text counts as what it stands for.
+/// TorkXmlGuard watches. A parameter entity that is referenced in a text counts as its replacement
+/// text.
 ///
 /// Qt's reader searches each text for each name, so a thousand long ones would take it many
 /// seconds.
 constexpr int TorkXmlMaximumEntityCharacters = 1024 * 1024;
 
-/// The most characters that all references to declared entities may stand for, where TorkXmlGuard
+/// The most characters that all references to declared entities may expand to, where TorkXmlGuard
 /// watches.
 ///
 /// Otherwise a file of 100 KB, half of it one entity and half of it references to that, would take
@@ -38,9 +39,9 @@ constexpr int TorkXmlMaximumEntityCharacters = 1024 * 1024;
 constexpr int TorkXmlMaximumExpansion = 16 * 1024 * 1024;
 
 /// The most characters of entities that may be read again for their references, where TorkXmlGuard
-/// watches: the references in an entity and what each of them stands for both count.
+/// watches: the references in an entity and what each of them expands to both count.
 ///
-/// Entities that name each other and stand for nothing would take hours without it.
+/// Entities that reference each other and expand to nothing would take hours without it.
 constexpr int TorkXmlMaximumReplacement = 2 * TorkXmlMaximumExpansion;
 
 /// The most namespace prefixes in force at one place: those that open elements declare, or use

@@ -3,6 +3,7 @@
 
 #include "common/xml/TorkXml_ParseManager_Base.h"
 
+#include "common/log/TorkEmptyText_p.h"
 #include "common/log/TorkLog.h"
 #include "common/xml/TorkXmlLimits.h"
 #include "common/xml/TorkXmlPrefixes_p.h"
@@ -10,9 +11,8 @@
 #include "common/xml/TorkXml_ParseState_Base.h"
 
 #include <QDebug>
-#include <QMessageLogger>
 
-TorkXml_ParseManager_Base::TorkXml_ParseManager_Base() : m_currentElement(QLatin1String("")) {}
+TorkXml_ParseManager_Base::TorkXml_ParseManager_Base() : m_currentElement(TorkEmptyText()) {}
 
 TorkXml_ParseManager_Base::~TorkXml_ParseManager_Base()
 {
@@ -36,8 +36,8 @@ bool TorkXml_ParseManager_Base::startPrefixMapping(QString const& prefix, QStrin
     return true;
 }
 
-// The reader tells of each prefix that is no longer in force, declared or not, but not of one that
-// an outer element still declares.
+// The reader reports each prefix that is no longer in force, declared or not, but not one that an
+// outer element still declares.
 bool TorkXml_ParseManager_Base::endPrefixMapping(QString const& prefix)
 {
     removePrefix(prefix);
@@ -59,7 +59,7 @@ void TorkXml_ParseManager_Base::removePrefix(QString const& prefix)
         m_prefixWeight -= TorkXmlPrefixes::weight(prefix);
 }
 
-// Nobody else need ever tell the end of a prefix that was not declared.
+// The reader need not report the end of a prefix that was not declared, so endElement() ends it.
 void TorkXml_ParseManager_Base::usePrefix(QString const& prefix)
 {
     if (addPrefix(prefix))
@@ -178,7 +178,7 @@ bool TorkXml_ParseManager_Base::PopElement()
         return false;
 
     m_elements.removeLast();
-    m_currentElement = m_elements.isEmpty() ? QString(QLatin1String("")) : m_elements.last();
+    m_currentElement = m_elements.isEmpty() ? TorkEmptyText() : m_elements.last();
     return true;
 }
 
@@ -202,7 +202,7 @@ void TorkXml_ParseManager_Base::AppendError(QString const& text)
 {
     m_errors.append(text);
     if (TorkLog::m_gLog)
-        QMessageLogger(nullptr, 0, nullptr).warning() << text;
+        qWarning() << text;
 }
 
 void TorkXml_ParseManager_Base::AppendError(QString const& text, int code)

@@ -3,15 +3,16 @@
 
 #include "common/xml/TorkXml_ParseState_Base.h"
 
+#include "common/log/TorkEmptyText_p.h"
 #include "common/xml/TorkXml_ParseManager_Base.h"
 
 TorkXml_ParseState_Base::TorkXml_ParseState_Base()
-    : TorkXml_ParseState_Base(QString(QLatin1String("")), nullptr)
+    : TorkXml_ParseState_Base(TorkEmptyText(), nullptr)
 {}
 
 TorkXml_ParseState_Base::TorkXml_ParseState_Base(QString const& element,
                                                  TorkXml_ParseManager_Base* manager)
-    : m_element(element), m_manager(manager), m_auxiliaryText(QLatin1String(""))
+    : m_element(element), m_manager(manager), m_auxiliaryText(TorkEmptyText())
 {}
 
 TorkXml_ParseState_Base::~TorkXml_ParseState_Base() = default;

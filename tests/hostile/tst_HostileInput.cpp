@@ -197,23 +197,23 @@ void tst_HostileInput::addStructures(char const* reader, bool readsTypes)
 {
     using namespace HostileDocuments;
     const bool skipsTypes = !readsTypes;
-    add(reader, "a million elements inside each other", nestedElements, 1000000, false);
-    add(reader, "a million open elements", openElements, 1000000, false);
-    add(reader, "1000 groups inside each other", nestedGroups, 1000, true);
-    add(reader, "1001 groups inside each other", nestedGroups, 1001, skipsTypes);
-    add(reader, "a million groups inside each other", nestedGroups, 1000000, skipsTypes);
-    add(reader, "a million groups from an entity", groupsFromEntity, 1000000, skipsTypes);
-    add(reader, "ten generations of text entities", textBomb, 10, skipsTypes);
-    add(reader, "ten generations of element entities", elementBomb, 10, skipsTypes);
-    add(reader, "ten generations of entities in an attribute", attributeBomb, 10, skipsTypes);
-    add(reader, "an entity of 100,000 characters named as often", longEntity, 100000, skipsTypes);
-    add(reader, "an entity that stands for itself", endlessEntity, 0, skipsTypes);
-    add(reader, "200 entities behind one another", entityChain, 200, true);
-    add(reader, "100,000 entities behind one another", entityChain, 100000, skipsTypes);
-    add(reader, "999 entities with names of 1000 characters", longEntityNames, 1000, true);
-    add(reader, "999 entities with names of 10,000 characters", longEntityNames, 10000, skipsTypes);
-    add(reader, "999 entities of 1000 characters", longEntityTexts, 1000, true);
-    add(reader, "999 entities of 4000 characters", longEntityTexts, 4000, skipsTypes);
+    add(reader, "a million elements inside each other", NestedElements, 1000000, false);
+    add(reader, "a million open elements", OpenElements, 1000000, false);
+    add(reader, "1000 groups inside each other", NestedGroups, 1000, true);
+    add(reader, "1001 groups inside each other", NestedGroups, 1001, skipsTypes);
+    add(reader, "a million groups inside each other", NestedGroups, 1000000, skipsTypes);
+    add(reader, "a million groups from an entity", GroupsFromEntity, 1000000, skipsTypes);
+    add(reader, "ten generations of text entities", TextBomb, 10, skipsTypes);
+    add(reader, "ten generations of element entities", ElementBomb, 10, skipsTypes);
+    add(reader, "ten generations of entities in an attribute", AttributeBomb, 10, skipsTypes);
+    add(reader, "an entity of 100,000 characters named as often", LongEntity, 100000, skipsTypes);
+    add(reader, "an entity that references itself", EndlessEntity, 0, skipsTypes);
+    add(reader, "200 entities one after another", EntityChain, 200, true);
+    add(reader, "100,000 entities one after another", EntityChain, 100000, skipsTypes);
+    add(reader, "999 entities with names of 1000 characters", LongEntityNames, 1000, true);
+    add(reader, "999 entities with names of 10,000 characters", LongEntityNames, 10000, skipsTypes);
+    add(reader, "999 entities of 1000 characters", LongEntityTexts, 1000, true);
+    add(reader, "999 entities of 4000 characters", LongEntityTexts, 4000, skipsTypes);
     addNamespaces(reader, skipsTypes);
 }
 
@@ -221,24 +221,24 @@ void tst_HostileInput::addStructures(char const* reader, bool readsTypes)
 void tst_HostileInput::addNamespaces(char const* reader, bool skipsThem)
 {
     using namespace HostileDocuments;
-    add(reader, "an office document of 40 prefixes", officeDocument, 20000, true);
-    add(reader, "256 declarations in one tag", declarationsInOneTag, 256, true);
-    add(reader, "100,000 declarations in one tag", declarationsInOneTag, 100000, skipsThem);
-    add(reader, "2000 declarations and 4000 children", declarationsAndChildren, 2000, skipsThem);
-    add(reader, "60,000 declarations and 120,000 children", declarationsAndChildren, 60000,
+    add(reader, "an office document of 40 prefixes", OfficeDocument, 20000, true);
+    add(reader, "256 declarations in one tag", DeclarationsInOneTag, 256, true);
+    add(reader, "100,000 declarations in one tag", DeclarationsInOneTag, 100000, skipsThem);
+    add(reader, "2000 declarations and 4000 children", DeclarationsAndChildren, 2000, skipsThem);
+    add(reader, "60,000 declarations and 120,000 children", DeclarationsAndChildren, 60000,
         skipsThem);
     add(reader, "5000 declarations and 5000 children that declare one",
-        declarationsAndDeclaringChildren, 5000, skipsThem);
-    add(reader, "20,000 declarations and 900 levels that declare one", declarationsAndDepth, 20000,
+        DeclarationsAndDeclaringChildren, 5000, skipsThem);
+    add(reader, "20,000 declarations and 900 levels that declare one", DeclarationsAndDepth, 20000,
         skipsThem);
-    add(reader, "no declarations and 900 levels that declare one", declarationsAndDepth, 0,
+    add(reader, "no declarations and 900 levels that declare one", DeclarationsAndDepth, 0,
         skipsThem);
-    add(reader, "2000 prefixes that nothing declares", usedPrefixes, 2000, skipsThem);
-    add(reader, "4095 elements below 256 declarations", mostPrefixes, 4095, true);
-    add(reader, "4096 elements below 256 declarations", mostPrefixes, 4096, skipsThem);
-    add(reader, "250,000 elements below 256 declarations", mostPrefixes, 250000, skipsThem);
-    add(reader, "250,000 elements below 64 declarations", elementsBelowPrefixes, 64, skipsThem);
-    add(reader, "four million elements from entities below 64 declarations", entitiesBelowPrefixes,
+    add(reader, "2000 prefixes that nothing declares", UsedPrefixes, 2000, skipsThem);
+    add(reader, "4095 elements below 256 declarations", MostPrefixes, 4095, true);
+    add(reader, "4096 elements below 256 declarations", MostPrefixes, 4096, skipsThem);
+    add(reader, "250,000 elements below 256 declarations", MostPrefixes, 250000, skipsThem);
+    add(reader, "250,000 elements below 64 declarations", ElementsBelowPrefixes, 64, skipsThem);
+    add(reader, "four million elements from entities below 64 declarations", EntitiesBelowPrefixes,
         64, skipsThem);
 }
 
@@ -256,23 +256,23 @@ void tst_HostileInput::tellsTheLimit_data()
     QTest::addColumn<QString>("reason");
 
     using namespace HostileDocuments;
-    QTest::newRow("elements") << &nestedElements << 1001
+    QTest::newRow("elements") << &NestedElements << 1001
                               << "More than 1000 elements are inside each other.";
-    QTest::newRow("groups") << &nestedGroups << 1001
+    QTest::newRow("groups") << &NestedGroups << 1001
                             << "More than 1000 groups are inside each other in a document type.";
-    QTest::newRow("entities") << &entityChain << 1000 << "More than 1000 entities are declared.";
+    QTest::newRow("entities") << &EntityChain << 1000 << "More than 1000 entities are declared.";
     QTest::newRow("characters of entities")
-        << &longEntity << 5000 << "References to entities stand for more than 16777216 characters.";
-    QTest::newRow("prefixes") << &declarationsInOneTag << 257
+        << &LongEntity << 5000 << "References to entities stand for more than 16777216 characters.";
+    QTest::newRow("prefixes") << &DeclarationsInOneTag << 257
                               << "More than 256 namespace prefixes are in force.";
     QTest::newRow("elements below prefixes")
-        << &mostPrefixes << 4096
+        << &MostPrefixes << 4096
         << "More than 268435456 comparisons of namespace prefixes are needed.";
     QTest::newRow("elements from entities below prefixes")
-        << &entitiesBelowPrefixes << 64
+        << &EntitiesBelowPrefixes << 64
         << "More than 268435456 comparisons of namespace prefixes are needed.";
     QTest::newRow("long entities")
-        << &longEntityTexts << 4000 << "More than 1048576 characters of entities are declared.";
+        << &LongEntityTexts << 4000 << "More than 1048576 characters of entities are declared.";
 }
 
 // The store in the log, the settings editor in its document.
@@ -304,13 +304,13 @@ void tst_HostileInput::read_data()
     addStructures("launch data", false);
     addNamespaces("parse manager by itself", false);
     using namespace HostileDocuments;
-    addSize("names of 1 MB", longNames, 1000000);
-    addSize("100,000 attributes", manyAttributes, 100000);
-    addSize("a value of 2 MB", longValue, 2000000);
-    addSize("100,000 keys", manyKeys, 100000);
+    addSize("names of 1 MB", LongNames, 1000000);
+    addSize("100,000 attributes", ManyAttributes, 100000);
+    addSize("a value of 2 MB", LongValue, 2000000);
+    addSize("100,000 keys", ManyKeys, 100000);
     if (AllSizes()) {
-        addSize("a value of 200 MB", longValue, 200000000);
-        addSize("ten million keys", manyKeys, 10000000);
+        addSize("a value of 200 MB", LongValue, 200000000);
+        addSize("ten million keys", ManyKeys, 10000000);
     }
 }
 

@@ -10,7 +10,12 @@
 
 #include <QtTest>
 
+#include <fcntl.h>
 #include <unistd.h>
+
+#ifdef Q_OS_LINUX
+#include <sched.h>
+#endif
 
 using namespace LogFileTest;
 
@@ -28,6 +33,8 @@ private slots:
     void rotationWithoutFinalSlash();
     void rotationInOddDirectories_data();
     void rotationInOddDirectories();
+    void rotationInTheRootDirectory_data();
+    void rotationInTheRootDirectory();
     void onlyOwnFiles_data();
     void onlyOwnFiles();
     void neighborsAloneAreNotTheLog_data();
@@ -219,6 +226,101 @@ void tst_TorkLogRotation::rotationInOddDirectories()
     log.write(QStringLiteral("new\n"));
     QCOMPARE(TestFiles::listing(logs),
              QStringList({"app.log: new\n", "app.log.1: old", "app.log.2: a"}));
+}
+
+namespace {
+
+// Makes a folder the root directory of this process while it lives.
+class RootDirectory
+{
+    Q_DISABLE_COPY(RootDirectory)
+
+public:
+    explicit RootDirectory(QString const& folder) : m_before(::open("/", O_RDONLY | O_DIRECTORY))
+    {
+        const QByteArray path = QFile::encodeName(folder);
+        m_isInForce =
+            chroot(path.constData()) == 0 || (isolated() && chroot(path.constData()) == 0);
+    }
+
+    ~RootDirectory()
+    {
+        if (m_isInForce && (fchdir(m_before) != 0 || chroot(".") != 0))
+            qFatal("cannot return to the root directory");
+        ::close(m_before);
+    }
+
+    bool isInForce() const { return m_isInForce; }
+
+private:
+    // Whether this process has become one that may change its root directory.
+    static bool isolated()
+    {
+#ifdef Q_OS_LINUX
+        return unshare(CLONE_NEWUSER) == 0;
+#else
+        return false;
+#endif
+    }
+
+    int m_before;
+    bool m_isInForce = false;
+};
+
+int rotatesInRoot(QStringList const& arguments)
+{
+    const RootDirectory root(arguments.at(0));
+    if (!root.isInForce() || !QDir::setCurrent("/work"))
+        return ChildProcess::skipped;
+
+    TorkLog log("/");
+    TestFiles::write("/settings.cfg", LogFolder::settingsText({{"filePrefix", "app"}}));
+    log.setPreferencesFileName("/settings.cfg");
+    log.loadPreferences();
+    QFile::remove("/settings.cfg");
+    log.deleteOldFiles();
+    return 0;
+}
+
+} // namespace
+
+// Without its slash "/" is the working directory: the names there decide which files of the root
+// directory are shifted and up to which number they are removed. Nothing there is changed.
+void tst_TorkLogRotation::rotationInTheRootDirectory_data()
+{
+    QTest::addColumn<QStringList>("before");
+    QTest::addColumn<QStringList>("after");
+
+    const auto row = [](char const* name, QStringList const& before, QStringList const& after) {
+        QTest::newRow(name) << before << TestFiles::sorted(after);
+    };
+    row("no older files", {"app.log: c", "work/"}, {"app.log.1: c", "work/"});
+    row("an older file is not found", {"app.log: c", "app.log.2: b", "work/"},
+        {"app.log.1: c", "app.log.2: b", "work/"});
+    row("a name in the working directory shifts",
+        {"app.log: c", "app.log.2: b", "work/", "work/app.log.2: w"},
+        {"app.log.1: c", "app.log.3: b", "work/", "work/app.log.2: w"});
+    row("a number in the working directory removes up to it",
+        {"app.log: c", "app.log.11: k", "work/", "work/app.log.12: w"},
+        {"app.log.1: c", "work/", "work/app.log.12: w"});
+    row("unfinished copy", {"app.log: c", "app.log.1.aBcXyZ.part: half", "work/"},
+        {"app.log.1: c", "work/"});
+    row("unfinished copy in the working directory stays",
+        {"app.log: c", "work/", "work/app.log.1.aBcXyZ.part: half"},
+        {"app.log.1: c", "work/", "work/app.log.1.aBcXyZ.part: half"});
+}
+
+void tst_TorkLogRotation::rotationInTheRootDirectory()
+{
+    QFETCH(QStringList, before);
+    LogFolder folder;
+    populate(folder.logs(), before);
+
+    const ChildProcess::Result child = ChildProcess::run("rotates in root", {folder.logs()});
+    if (child.wasSkipped())
+        QSKIP("This user may not change the root directory.");
+    QVERIFY2(child.ended(), child.report());
+    QTEST(folder.listing(), "after");
 }
 
 // The neighbors match what Qt's wildcards would take for the log's own files, and more.
@@ -469,7 +571,8 @@ void tst_TorkLogRotation::pipesInPlaceOfFiles()
 
 int main(int argc, char** argv)
 {
-    return ChildProcess::main<tst_TorkLogRotation>(argc, argv, {{"rotates", rotates}});
+    return ChildProcess::main<tst_TorkLogRotation>(
+        argc, argv, {{"rotates", rotates}, {"rotates in root", rotatesInRoot}});
 }
 
 #include "tst_TorkLogRotation.moc"

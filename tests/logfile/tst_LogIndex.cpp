@@ -174,7 +174,6 @@ void tst_LogIndex::slices()
     LogIndex index;
     Pass(index, file, slice);
     QCOMPARE(Texts(index, file), TextsOf(file));
-    QCOMPARE(index.runs(), size_t(2));
 }
 
 void tst_LogIndex::threeRuns()
@@ -191,7 +190,7 @@ void tst_LogIndex::threeRuns()
     QVERIFY(rows.indexOf(Lines(first).last()) > 0);
 }
 
-// Beyond a number of runs the order is no longer determined, but every line is still there.
+// Lines after the 64th run count as part of it, and every line is still there.
 void tst_LogIndex::manyRuns()
 {
     QByteArray file;
@@ -200,9 +199,10 @@ void tst_LogIndex::manyRuns()
                                  QString::number(i));
     LogIndex index;
     Pass(index, file, 4096);
-    QVERIFY(index.runs() <= 64);
     QCOMPARE(index.size(), size_t(2000));
-    QCOMPARE(index.Rows(LogFilter()).size(), size_t(2002));
+    const QStringList rows = Texts(index, file).replaceInStrings("torn: ", "");
+    QCOMPARE(rows.size(), 2002);
+    QCOMPARE(rows.mid(1, 2000 - 2 * 63), Lines(file).mid(2 * 63));
 }
 
 void tst_LogIndex::dateFormats_data()
@@ -361,7 +361,7 @@ void tst_LogIndex::growthAtTheEndMakesOneRun()
                       entry("02:10:01.000", "Error", "winter");
     LogIndex index;
     Pass(index, file, 4096);
-    QCOMPARE(index.runs(), size_t(2));
+    QCOMPARE(Texts(index, file).first(), QString("[earlier]"));
     file += entry("02:10:02.000", "Trace", "more");
     Pass(index, file, 4096);
     QCOMPARE(Texts(index, file), Lines(file));

@@ -21,8 +21,8 @@ namespace {
 struct Piece
 {
     QByteArray text;
-    qint64 inEntity = 0;  // the characters it stands for as a part of an entity
-    qint64 inContent = 0; // those that its references stand for
+    qint64 inEntity = 0;  // the characters it expands to as a part of an entity
+    qint64 inContent = 0; // those that its references expand to
     int depth = 0;        // of the elements in it
     bool hasMarkup = false;
     int elements = 0;

@@ -136,7 +136,7 @@ void tst_TorkXmlGuard::parse_data()
         << false;
     QTest::newRow("entity with brackets") << Document(Entity("e", "(a"), "&e;") << true;
 
-    QTest::newRow("groups enough to exhaust a stack behind the address of the document type")
+    QTest::newRow("groups enough to exhaust a stack after the address of the document type")
         << "<!DOCTYPE r SYSTEM 'a><![CDATA[' [" + Groups(1000000) + "]><r/>" << false;
 
     const QByteArray brackets = QByteArray("(").repeated(5000);
@@ -153,7 +153,7 @@ void tst_TorkXmlGuard::parse_data()
     for (char const* hiding :
          {"<!-- ] > ' -->", "<?a ] > ' ?>", "<!ENTITY e \"]>'\">", "<!ATTLIST r a CDATA ']>\"'>",
           "<!ENTITY e SYSTEM \"]>'\">", "<!NOTATION n PUBLIC ']>'>"}) {
-        QTest::addRow("groups enough to exhaust a stack behind %s", hiding)
+        QTest::addRow("groups enough to exhaust a stack after %s", hiding)
             << Document(hiding + Groups(1000000), "") << false;
     }
 
@@ -294,7 +294,7 @@ void tst_TorkXmlGuard::namesTheLimit_data()
         << Document(Entity("e", "<a>&e;</a>"), "&e;") << "recursive entities";
 }
 
-// The error handler is told once, and is the reader's again behind.
+// The error handler is called once, and is the reader's again afterwards.
 void tst_TorkXmlGuard::namesTheLimit()
 {
     QFETCH(QByteArray, document);
@@ -322,7 +322,7 @@ void tst_TorkXmlGuard::tellsWithoutBeingWatched()
     QCOMPARE(handler.errors, QStringList("unexpected end of file"));
 }
 
-// The reader asks for more in portions of a kilobyte, so what lies across their ends counts too.
+// The reader fetches a kilobyte at a time, so what crosses the end of one counts too.
 void tst_TorkXmlGuard::textIsUntouched()
 {
     QString expected;
@@ -362,7 +362,7 @@ void tst_TorkXmlGuard::readsWhatAPlainSourceReads_data()
         << QByteArray("<!DOCTYPE r [<!--\xef\xbf\xbe-->]><r>a</r>");
     QTest::newRow("a zero in the text") << QByteArray("<r>a\0b</r>", 10);
     QTest::newRow("cut short") << text.toUtf8().left(2001);
-    QTest::newRow("text behind the root") << QByteArray("<r>a</r>b");
+    QTest::newRow("text after the root") << QByteArray("<r>a</r>b");
     QTest::newRow("line ends of all kinds") << QByteArray("<r>a\r\nb\rc\n\n\rd</r>");
 }
 

@@ -54,15 +54,6 @@ LogPanel::LogPanel(QWidget* parent)
     setFocusProxy(m_view);
 }
 
-// The model and the view send signals while they are deleted.
-LogPanel::~LogPanel()
-{
-    disconnect(m_view->selectionModel(), nullptr, this, nullptr);
-    disconnect(m_view, nullptr, this, nullptr);
-    disconnect(m_model, nullptr, this, nullptr);
-    disconnect(m_model, nullptr, m_view, nullptr);
-}
-
 void LogPanel::makeControls()
 {
     auto* files = new FileBox;

@@ -29,7 +29,6 @@ class LogPanel : public QWidget
 
 public:
     explicit LogPanel(QWidget* parent = nullptr);
-    ~LogPanel() override;
 
     /// Shows a log file.
     ///

@@ -5,6 +5,7 @@
 
 #include "app/logfile/LogSeverities.h"
 #include "app/window/widgets/PlainText.h"
+#include "app/window/widgets/TextDialog.h"
 
 #include <QCheckBox>
 #include <QDateTime>
@@ -33,9 +34,7 @@ LogSettingsDialog::LogSettingsDialog(QWidget* parent)
     for (QLineEdit* field : {m_elapsedPrefix, m_dateFormat, m_filePrefix})
         connect(field, &QLineEdit::textChanged, this, &LogSettingsDialog::check);
     connect(m_elapsed, &QCheckBox::toggled, this, &LogSettingsDialog::check);
-    const QList<QAbstractButton*> buttons = m_buttons->buttons();
-    for (QAbstractButton* button : buttons)
-        button->setIcon(QIcon());
+    RemoveButtonIcons(m_buttons);
     connect(m_buttons, &QDialogButtonBox::accepted, this, &LogSettingsDialog::accept);
     connect(m_buttons, &QDialogButtonBox::rejected, this, &LogSettingsDialog::reject);
     check();

@@ -8,11 +8,11 @@
 #include "app/window/settings/ValueDialog.h"
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
+#include "app/window/widgets/TextDialog.h"
 #include "common/config/TorkConfigText.h"
 
 #include <QFile>
 #include <QFileInfo>
-#include <QFontDatabase>
 #include <QHBoxLayout>
 #include <QHeaderView>
 #include <QMessageBox>
@@ -119,7 +119,8 @@ SettingsEditor::SettingsEditor(QWidget* parent)
     setFocusProxy(m_tree);
 }
 
-// If a cell is being edited, deleting the tree ends that and emits a signal.
+// If a cell is being edited, deleting the tree emits a signal. Qt would disconnect it only after
+// the children are deleted, when this object is no more than a QObject.
 SettingsEditor::~SettingsEditor()
 {
     disconnect(m_tree, nullptr, this, nullptr);
@@ -192,9 +193,7 @@ QWidget* SettingsEditor::makeTextPage()
 {
     m_text = new QPlainTextEdit;
     m_text->setReadOnly(true);
-    m_text->setTabChangesFocus(true);
-    m_text->setLineWrapMode(QPlainTextEdit::NoWrap);
-    m_text->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
+    ShowUnwrapped(m_text);
     m_text->setAccessibleName(tr("File text"));
     m_text->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
     return m_text;

@@ -5,17 +5,15 @@
 
 #include "app/window/widgets/FileSizeText.h"
 #include "app/window/widgets/PlainText.h"
+#include "app/window/widgets/TextDialog.h"
 
 #include <QDialogButtonBox>
-#include <QFontDatabase>
-#include <QIcon>
+#include <QHBoxLayout>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QMimeData>
 #include <QPlainTextEdit>
-#include <QPushButton>
 #include <QTextDocument>
-#include <QVBoxLayout>
 
 namespace Velocor {
 
@@ -126,26 +124,16 @@ ValueDialog::ValueDialog(QString const& name, QString const& value, QWidget* par
                         "it cannot be edited here.");
     QLabel* label = NewPlainLabel(heading);
     label->setWordWrap(true);
-    m_text->setLineWrapMode(QPlainTextEdit::NoWrap);
-    m_text->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
-    m_text->setTabChangesFocus(true);
+    ShowUnwrapped(m_text);
     m_text->setAccessibleName(QObject::tr("Value"));
     m_text->setPlainText(m_mark.isNull() ? value : SplitLines(value, m_mark));
     m_text->document()->setModified(false);
 
     auto* buttons = new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel);
     connect(buttons, &QDialogButtonBox::accepted, this, &QDialog::accept);
-    connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
-    const QList<QAbstractButton*> all = buttons->buttons();
-    for (QAbstractButton* button : all)
-        button->setIcon(QIcon());
-
-    auto* layout = new QVBoxLayout(this);
-    layout->setSpacing(10);
-    layout->addWidget(label);
-    layout->addWidget(m_text, 1);
-    layout->addWidget(buttons);
-    resize(680, 480);
+    auto* top = new QHBoxLayout;
+    top->addWidget(label);
+    LayOutTextDialog(this, top, m_text, buttons);
 }
 
 bool ValueDialog::isModified() const
