@@ -260,6 +260,16 @@ void TorkLog::shiftOldFiles(QString const& directory) const
         if (number != -1)
             numbered.insert(number, file);
     }
+    // A folder that cannot be listed, for lack of memory or descriptors, is not one without older
+    // files: number 1 would be in the way of the current file, which would then be lost.
+    const QString start = currentFileName() + QLatin1Char('.');
+    const auto name = [&start](int number) -> QString {
+        return start + QString::number(number);
+    };
+    if (files.isEmpty() && !start.startsWith(QLatin1Char('.'))) {
+        for (int number = 1; QFileInfo(m_path + name(number)).isFile(); ++number)
+            numbered.insert(number, name(number));
+    }
     if (numbered.isEmpty() || numbered.lastKey() < 0)
         return;
 
@@ -293,4 +303,7 @@ void TorkLog::pruneOldFiles(QString const& directory, qint64 highest) const
         if (number == QString::number(value) && value >= lowest && value <= highest)
             QFile::remove(path + QLatin1Char('.') + number);
     }
+    // Not listed again; each rotation adds only one.
+    if (files.isEmpty())
+        QFile::remove(path + QLatin1Char('.') + QString::number(highest));
 }
