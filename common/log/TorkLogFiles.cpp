@@ -24,6 +24,7 @@
 #include <algorithm>
 
 #ifdef Q_OS_UNIX
+#include <fcntl.h>
 #include <unistd.h>
 #endif
 
@@ -79,6 +80,22 @@ bool SyncToDisk(QFileDevice& file)
     return true;
 }
 
+// The names of the files in it: a disk may otherwise remove the current file before its copy has a
+// name, if the power fails.
+void SyncToDisk(QString const& directory)
+{
+#ifdef Q_OS_UNIX
+    const int folder =
+        ::open(QFile::encodeName(directory).constData(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    if (folder == -1)
+        return;
+    ::fsync(folder);
+    ::close(folder);
+#else
+    Q_UNUSED(directory)
+#endif
+}
+
 // Until it is complete, a copy has no name or, if the file system does not support unnamed files,
 // one that says what it belongs to and does not end in a number: app.log.1.aBcDeF.part.
 QString PartName(QString const& to)
@@ -105,8 +122,10 @@ void Copy(QString const& from, QString const& to)
     }
     const bool isWhole = source.error() == QFileDevice::NoError && SyncToDisk(copy);
     copy.setPermissions(source.permissions());
-    if (isWhole && copy.rename(to))
+    if (isWhole && copy.rename(to)) {
         copy.setAutoRemove(false);
+        SyncToDisk(QFileInfo(to).path());
+    }
 }
 
 // Removes what Copy() to number 1 of the log `name` leaves when the program is killed.

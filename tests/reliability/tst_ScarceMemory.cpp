@@ -857,10 +857,8 @@ void tst_ScarceMemory::start()
                                  QByteArray::number(status) + "\n" + program.report +
                                  program.output;
         QVERIFY2(status != -1, ("hung: " + where).constData());
-        const bool isCrash =
-            program.report.startsWith("crash ") || program.report.startsWith("endless ");
-        const QByteArray library =
-            isCrash ? program.report.trimmed().split(' ').last() : QByteArray();
+        static const QRegularExpression crash("(?:crash|endless) (\\S+)");
+        const QString library = crash.match(QString::fromLocal8Bit(program.report)).captured(1);
         QVERIFY2(library != "velocor" && library != "?", where.constData());
         QVERIFY2(status == 0 || status == Program::CrashExit + SIGABRT || !library.isEmpty(),
                  where.constData());
@@ -870,7 +868,7 @@ void tst_ScarceMemory::start()
         ++s_starts;
         s_endedStarts += status != 0;
         if (!library.isEmpty())
-            ++s_crashedStarts[QString::fromLocal8Bit(library)];
+            ++s_crashedStarts[library];
     }
     QVERIFY(failed > count / stride / 2);
 }
