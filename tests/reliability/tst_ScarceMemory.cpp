@@ -848,7 +848,7 @@ void tst_ScarceMemory::start()
     const long count = plentiful.report.mid(6).trimmed().toLong();
     QVERIFY2(count > 10000, plentiful.report.constData());
 
-    const int stride = Figures::wanted("VELOCOR_START_SHORTAGES", 4001);
+    const int stride = Figures::wanted("VELOCOR_START_SHORTAGES", 8001);
     int failed = 0;
     for (long step = 1; step <= count; step += stride) {
         Program program;
