@@ -129,7 +129,7 @@ bool LaunchOptionParser::ParseOptions(QString& text)
         const auto document = std::make_unique<rapidxml::xml_document<char>>();
         document->parse<rapidxml::parse_default>(xml.data());
         return ApplyAll(*this, *document);
-    } catch (std::exception const&) {
-        return false;
+    } catch (rapidxml::parse_error const&) {
+        return false; // memory that runs out is no failure of the file: it ends the program
     }
 }

@@ -32,7 +32,7 @@ if [ "${1:-}" != --no-run ]; then
         exit 1
     }
     # The figures of the proofs.
-    sed -En 's/^[0-9]+: ((hostile input|faults|sudden death|load|memory|trust)[a-z ]*: )/\1/p' \
+    sed -En 's/^[0-9]+: ((hostile input|faults|sudden death|load|memory|trust|life)[a-z ]*: )/\1/p' \
         "$build/tests.txt"
     grep '% tests passed' "$build/tests.txt"
 fi

@@ -24,6 +24,7 @@
 #include <algorithm>
 
 #ifdef Q_OS_UNIX
+#include <fcntl.h>
 #include <unistd.h>
 #endif
 
@@ -79,6 +80,22 @@ bool SyncToDisk(QFileDevice& file)
     return true;
 }
 
+// The names of the files in it: a disk may otherwise remove the current file before its copy has a
+// name, if the power fails.
+void SyncToDisk(QString const& directory)
+{
+#ifdef Q_OS_UNIX
+    const int folder =
+        ::open(QFile::encodeName(directory).constData(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    if (folder == -1)
+        return;
+    ::fsync(folder);
+    ::close(folder);
+#else
+    Q_UNUSED(directory)
+#endif
+}
+
 // Until it is complete, a copy has no name or, if the file system does not support unnamed files,
 // one that says what it belongs to and does not end in a number: app.log.1.aBcDeF.part.
 QString PartName(QString const& to)
@@ -105,8 +122,10 @@ void Copy(QString const& from, QString const& to)
     }
     const bool isWhole = source.error() == QFileDevice::NoError && SyncToDisk(copy);
     copy.setPermissions(source.permissions());
-    if (isWhole && copy.rename(to))
+    if (isWhole && copy.rename(to)) {
         copy.setAutoRemove(false);
+        SyncToDisk(QFileInfo(to).path());
+    }
 }
 
 // Removes what Copy() to number 1 of the log leaves when the program is killed.
@@ -267,6 +286,16 @@ void TorkLog::shiftOldFiles(QString const& directory) const
         if (number != -1)
             numbered.insert(number, file);
     }
+    // A folder that cannot be listed, for lack of memory or descriptors, is not one without older
+    // files: number 1 would be in the way of the current file, which would then be lost.
+    const QString start = currentFileName() + QLatin1Char('.');
+    const auto name = [&start](int number) -> QString {
+        return start + QString::number(number);
+    };
+    if (files.isEmpty() && !start.startsWith(QLatin1Char('.'))) {
+        for (int number = 1; QFileInfo(m_path + name(number)).isFile(); ++number)
+            numbered.insert(number, name(number));
+    }
     if (numbered.isEmpty() || numbered.lastKey() < 0)
         return;
 
@@ -299,4 +328,7 @@ void TorkLog::pruneOldFiles(qint64 highest) const
         if (number == QString::number(value) && value >= lowest && value <= highest)
             QFile::remove(current.filePath() + QLatin1Char('.') + number);
     }
+    // Not listed again; each rotation adds only one.
+    if (files.isEmpty())
+        QFile::remove(path + QLatin1Char('.') + QString::number(highest));
 }
