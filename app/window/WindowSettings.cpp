@@ -100,7 +100,8 @@ QString WindowSettings::Load()
 QString WindowSettings::renameDamagedFile()
 {
     for (int number = 1; number < 1000; ++number) {
-        const QString name = QStringLiteral("%1.damaged-%2").arg(m_fileName).arg(number);
+        // Not by arg(): a product or user whose name holds "%1" would get the number there.
+        const QString name = m_fileName + QLatin1String(".damaged-") + QString::number(number);
         if (QFile::exists(name))
             continue;
         if (!QFile::rename(m_fileName, name))

@@ -33,6 +33,7 @@ private slots:
     void numbers();
     void loadLogsNothing();
     void damagedFile();
+    void damagedFileOfAnOddProduct();
     void damagedTwice();
     void damagedFileThatCannotBeMoved();
     void geometry_data();
@@ -160,6 +161,16 @@ void tst_WindowState::damagedFile()
     QVERIFY(!QFile::exists(test.settingsFile()));
     QCOMPARE(settings.Save(), QString());
     QVERIFY(QFile::exists(test.settingsFile()));
+}
+
+void tst_WindowState::damagedFileOfAnOddProduct()
+{
+    const WindowTest test;
+    const QString folder = test.folder() + "100%1 %2/";
+    QVERIFY(TestFiles::write(folder + "velocor.cfg", "damaged"));
+    WindowSettings settings(folder);
+    QVERIFY(settings.Load().contains("velocor.cfg.damaged-1"));
+    QCOMPARE(TestFiles::read(folder + "velocor.cfg.damaged-1"), QByteArray("damaged"));
 }
 
 void tst_WindowState::damagedTwice()
