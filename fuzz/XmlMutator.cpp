@@ -57,7 +57,7 @@ std::string XmlMutator::name()
 
 std::string XmlMutator::text(int depth)
 {
-    switch (Below(7)) {
+    switch (Below(8)) {
     case 0:
         return "&e" + std::to_string(Below(4)) + ";";
     case 1:
@@ -65,7 +65,9 @@ std::string XmlMutator::text(int depth)
     case 2:
         return "<![CDATA[" + pick({"", "x", "]]", "<a>", "&e0;"}) + "]]>";
     case 3:
-        return pick({" ", "\n", "\r\n", "\t", "%1", "yes", "12", "-1", "4294967296"});
+        return pick({" ", "\n", "\r\n", "\t"});
+    case 4:
+        return pick({"%1", "%L2", "]]&gt;", "\xC3\x96", "yes", "12", "-1", "4294967296"});
     default:
         return depth > 0 ? piece(depth - 1) : std::string("t");
     }

@@ -76,13 +76,27 @@ fuzz() {
     return $status
 }
 
-# Keeps the fewest inputs that reach the same code, however often. A fuzzer also tries what it sees
-# the program compare, so an input may name a folder of this machine; such a one is not kept.
+# Adds to the first folder the fewest inputs of the corpus that reach what it does not reach itself.
+merge() {
+    local name=$1 into=$2
+    shift 2
+    "$build/fuzz/fuzz_$name" -set_cover_merge=1 "$@" -max_len="$(longest "$name")" "$into" \
+        "$root/fuzz/corpus/$name" "$build/corpus/$name" >>"$build/$name.txt" 2>&1
+}
+
+# Keeps what reaches all the code, and up to 150 of those that reach it another number of times.
+# A fuzzer also tries what it sees the program compare, so an input may contain the name of
+# a folder of this machine; such an input is not kept.
 keep() {
-    local name=$1 kept=$TMPDIR/kept-$1 file
+    local name=$1 kept=$TMPDIR/kept-$1 more=$TMPDIR/more-$1 file
     cp -r "$root/fuzz/seeds/$name" "$kept"
-    "$build/fuzz/fuzz_$name" -set_cover_merge=1 -use_counters=0 -max_len="$(longest "$name")" \
-        "$kept" "$root/fuzz/corpus/$name" "$build/corpus/$name" >"$build/$name.txt" 2>&1
+    merge "$name" "$kept" -use_counters=0
+    cp -r "$kept" "$more"
+    merge "$name" "$more"
+    for file in "$more"/*; do
+        [ "$(find "$kept" -type f | wc -l)" -lt 150 ] || break
+        cp "$file" "$kept"
+    done
     for file in "$root/fuzz/seeds/$name"/*; do
         rm "$kept/$(basename "$file")"
     done
@@ -95,7 +109,7 @@ for name in "${names[@]}"; do
     mkdir -p "$build/corpus/$name" "$root/fuzz/corpus/$name"
 done
 export root build
-export -f fuzz keep dictionary longest stat_of
+export -f fuzz keep merge dictionary longest stat_of
 
 # The fuzzers' files are in memory if possible, and are removed even after a crash.
 mkdir -p "$build/failed"
