@@ -5,6 +5,7 @@
 // store promises, survives saving and loading again.
 
 #include "FuzzInput.h"
+#include "XmlMutator.h"
 
 #include "common/config/TorkConfigFile.h"
 #include "common/config/TorkConfigFileSection.h"
@@ -98,6 +99,12 @@ extern "C" int LLVMFuzzerInitialize(int*, char***)
 {
     SilenceMessages();
     return 0;
+}
+
+extern "C" size_t LLVMFuzzerCustomMutator(uint8_t* data, size_t size, size_t maximum,
+                                          unsigned int seed)
+{
+    return MutateDocument(data, size, maximum, seed, {"VelocorSettings", "Section", "key"});
 }
 
 extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)

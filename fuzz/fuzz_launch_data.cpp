@@ -4,6 +4,7 @@
 // The launch data file: any text either fails or sets options, and never crashes the program.
 
 #include "FuzzInput.h"
+#include "XmlMutator.h"
 
 #include "app/LaunchOptionParser.h"
 
@@ -23,6 +24,12 @@ extern "C" int LLVMFuzzerInitialize(int*, char***)
 {
     std::setlocale(LC_ALL, ""); // as an application does: the text is converted to its encoding
     return 0;
+}
+
+extern "C" size_t LLVMFuzzerCustomMutator(uint8_t* data, size_t size, size_t maximum,
+                                          unsigned int seed)
+{
+    return MutateDocument(data, size, maximum, seed, {"arg", "key", "organization", "product"});
 }
 
 extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)

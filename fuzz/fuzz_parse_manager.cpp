@@ -5,6 +5,7 @@
 // state is lost, none is deleted twice, and no document crashes the manager.
 
 #include "FuzzInput.h"
+#include "XmlMutator.h"
 
 #include "common/xml/TorkXml_FlushUnknownElement.h"
 #include "common/xml/TorkXml_ParseManager_Base.h"
@@ -118,6 +119,26 @@ extern "C" int LLVMFuzzerInitialize(int*, char***)
 {
     SilenceMessages();
     return 0;
+}
+
+// The moods and the document are mutated separately, so that neither runs into the other.
+extern "C" size_t LLVMFuzzerCustomMutator(uint8_t* data, size_t size, size_t maximum,
+                                          unsigned int seed)
+{
+    const size_t moodCount = size < 1 ? 0 : qMin<size_t>(data[0], size - 1);
+    const std::string all(reinterpret_cast<char*>(data), size);
+    std::string moods = all.substr(qMin<size_t>(1, size), moodCount);
+    std::string document = all.substr(qMin(1 + moodCount, size));
+
+    XmlMutator mutator(seed);
+    if (mutator.Below(4) == 0) {
+        moods.resize(255);
+        moods.resize(LLVMFuzzerMutate(reinterpret_cast<uint8_t*>(&moods[0]), moodCount, 255));
+    }
+    if (moods.size() + 1 < maximum)
+        document = mutator.Mutate(document, maximum - moods.size() - 1);
+    const std::string mutated = static_cast<char>(moods.size()) + moods + document;
+    return mutated.copy(reinterpret_cast<char*>(data), maximum);
 }
 
 extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)

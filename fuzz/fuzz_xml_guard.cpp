@@ -5,6 +5,7 @@
 // with a plain source, including errors and their positions.
 
 #include "FuzzInput.h"
+#include "XmlMutator.h"
 
 #include "common/xml/TorkXmlGuard.h"
 #include "xml/XmlEvents.h"
@@ -29,6 +30,12 @@ extern "C" int LLVMFuzzerInitialize(int*, char***)
 {
     SilenceMessages();
     return 0;
+}
+
+extern "C" size_t LLVMFuzzerCustomMutator(uint8_t* data, size_t size, size_t maximum,
+                                          unsigned int seed)
+{
+    return MutateDocument(data, size, maximum, seed);
 }
 
 extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)

@@ -77,15 +77,26 @@ QString WindowSettings::Load()
 
     for (SettingsDocument::Section const& section : document.sections) {
         for (SettingsDocument::Item const& item : section.items)
-            m_file.WriteItem(section.name, item.key, item.value);
+            take(section.name, item.key, item.value);
     }
     return QString();
+}
+
+// A text that the store does not give back would damage the file when it is saved. Only what was
+// edited by hand has such names, and they are none of the window's.
+void WindowSettings::take(QString const& section, QString const& key, QString const& value)
+{
+    if (!TorkConfigText::IsPlainName(section) || !TorkConfigText::IsPlainName(key))
+        return;
+    const bool isPlain = TorkConfigText::IsPlainValue(value);
+    m_file.WriteItem(section, key, isPlain ? value : TorkConfigText::EncodeValue(Unescaped(value)));
 }
 
 QString WindowSettings::renameDamagedFile()
 {
     for (int number = 1; number < 1000; ++number) {
-        const QString name = QStringLiteral("%1.damaged-%2").arg(m_fileName).arg(number);
+        // Not by arg(): a product or user whose name holds "%1" would get the number there.
+        const QString name = m_fileName + QLatin1String(".damaged-") + QString::number(number);
         if (QFile::exists(name))
             continue;
         if (!QFile::rename(m_fileName, name))

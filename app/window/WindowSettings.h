@@ -58,6 +58,7 @@ public:
 
 private:
     QString renameDamagedFile();
+    void take(QString const& section, QString const& key, QString const& value);
 
     QString m_fileName;
     TorkConfigFile m_file;

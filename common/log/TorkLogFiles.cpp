@@ -305,7 +305,10 @@ void TorkLog::shiftOldFiles(QString const& directory) const
     for (auto number = numbers.crbegin(); number != numbers.crend() && *number >= 1; ++number) {
         QString const& file = numbered[*number];
         const QString next = QString::number(qint64(*number) + 1);
-        QFile::rename(m_path + file, m_path + BeforeLastDot(file) + QLatin1Char('.') + next);
+        const QString to = m_path + BeforeLastDot(file) + QLatin1Char('.') + next;
+        // A link without a target does not count as existing: Qt would copy the file to there.
+        if (!QFileInfo(to).isSymLink())
+            QFile::rename(m_path + file, to);
     }
 
     if (numbered.lastKey() >= static_cast<int>(m_maxLogFiles.load()))

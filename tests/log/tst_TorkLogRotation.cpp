@@ -44,6 +44,7 @@ private slots:
     void hiddenNames();
     void pruningGoesByName_data();
     void pruningGoesByName();
+    void linkWithoutTargetInTheWay();
     void unfinishedCopies_data();
     void unfinishedCopies();
 
@@ -483,6 +484,20 @@ void tst_TorkLogRotation::pruningGoesByName()
 
     log.deleteOldFiles();
     QTEST(namesIn(folder.logs()), "after");
+}
+
+// Such a link does not count as existing, and what is copied "to" it ends up at its target.
+void tst_TorkLogRotation::linkWithoutTargetInTheWay()
+{
+    LogFolder folder;
+    for (char const* entry : {"app.log.1: a", "app.log.2 -> nowhere"})
+        make(folder.logs(), entry);
+    TorkLog log;
+    folder.prepare(log, "app");
+
+    log.deleteOldFiles();
+    QCOMPARE(namesIn(folder.logs()), QStringList({"app.log.1", "app.log.2"}));
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log.1"), QByteArray("a"));
 }
 
 void tst_TorkLogRotation::unfinishedCopies_data()

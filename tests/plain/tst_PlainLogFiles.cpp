@@ -114,7 +114,9 @@ public:
                 if (!numbered.contains(i))
                     continue;
                 const QString cut = numbered[i].left(numbered[i].lastIndexOf('.'));
-                QFile::rename(path + numbered[i], path + cut + '.' + QString::number(i + 1));
+                const QString to = path + cut + '.' + QString::number(i + 1);
+                if (!QFileInfo(to).isSymLink()) // QFile would copy to where it points
+                    QFile::rename(path + numbered[i], to);
             }
             for (int i = highest + 1; highest >= maxFiles && i >= maxFiles + 1; --i)
                 QFile::remove(fullName() + '.' + QString::number(i));

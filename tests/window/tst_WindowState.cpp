@@ -35,7 +35,10 @@ private slots:
     void numbers_data();
     void numbers();
     void loadLogsNothing();
+    void oddItemsDoNotDamageTheFile_data();
+    void oddItemsDoNotDamageTheFile();
     void damagedFile();
+    void damagedFileOfAnOddProduct();
     void damagedTwice();
     void damagedFileThatCannotBeMoved();
     void geometry_data();
@@ -153,6 +156,33 @@ void tst_WindowState::loadLogsNothing()
     QVERIFY(!QFile::exists(test.logFile()));
 }
 
+void tst_WindowState::oddItemsDoNotDamageTheFile_data()
+{
+    QTest::addColumn<QByteArray>("items");
+    QTest::newRow("placeholder") << QByteArray("<Other><x>%1</x></Other>");
+    QTest::newRow("placeholder in an item of the window")
+        << QByteArray("<MainWindow><panes>%1</panes></MainWindow>");
+    QTest::newRow("end of CDATA") << QByteArray("<Other><x>y]]&gt;z</x></Other>");
+    QTest::newRow("section beyond ASCII") << QByteArray("<\xC3\x96><x>y</x></\xC3\x96>");
+    QTest::newRow("key beyond ASCII") << QByteArray("<Other><\xC3\x96>y</\xC3\x96></Other>");
+}
+
+void tst_WindowState::oddItemsDoNotDamageTheFile()
+{
+    QFETCH(QByteArray, items);
+    const WindowTest test;
+    const QByteArray flag = "<MainWindow><placesShown>yes</placesShown></MainWindow>";
+    QVERIFY(TestFiles::write(test.settingsFile(),
+                             "<VelocorSettings>" + items + flag + "</VelocorSettings>"));
+    WindowSettings settings(test.folder() + "data/");
+    QCOMPARE(settings.Load(), QString());
+    QCOMPARE(settings.Save(), QString());
+
+    WindowSettings again(test.folder() + "data/");
+    QCOMPARE(again.Load(), QString());
+    QVERIFY(again.Flag("placesShown", false));
+}
+
 void tst_WindowState::damagedFile()
 {
     const WindowTest test;
@@ -165,6 +195,16 @@ void tst_WindowState::damagedFile()
     QVERIFY(!QFile::exists(test.settingsFile()));
     QCOMPARE(settings.Save(), QString());
     QVERIFY(QFile::exists(test.settingsFile()));
+}
+
+void tst_WindowState::damagedFileOfAnOddProduct()
+{
+    const WindowTest test;
+    const QString folder = test.folder() + "100%1 %2/";
+    QVERIFY(TestFiles::write(folder + "velocor.cfg", "damaged"));
+    WindowSettings settings(folder);
+    QVERIFY(settings.Load().contains("velocor.cfg.damaged-1"));
+    QCOMPARE(TestFiles::read(folder + "velocor.cfg.damaged-1"), QByteArray("damaged"));
 }
 
 void tst_WindowState::damagedTwice()
