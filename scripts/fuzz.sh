@@ -13,10 +13,10 @@ set -euo pipefail
 
 root=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd -P)
 build=$root/build/fuzz
-export limit=-runs=20000
+export limit=-runs=20000 least=20000 # the least number of inputs
 case "${1:-}" in
---runs) limit=-runs=$2 && shift 2 ;;
---seconds) limit=-max_total_time=$2 && shift 2 ;;
+--runs) limit=-runs=$2 least=$2 && shift 2 ;;
+--seconds) limit=-max_total_time=$2 least=1 && shift 2 ;;
 esac
 
 "$root/scripts/install-packages.sh" build fuzz
@@ -24,8 +24,9 @@ esac
 
 names=("$@")
 if [ ${#names[@]} -eq 0 ]; then
-    for seeds in "$root"/fuzz/seeds/*; do
-        names+=("$(basename "$seeds")")
+    for source in "$root"/fuzz/fuzz_*.cpp; do
+        name=$(basename "$source" .cpp)
+        names+=("${name#fuzz_}")
     done
 fi
 
@@ -46,7 +47,8 @@ fuzz() {
     mkdir -p "$corpus"
     if "$build/fuzz/fuzz_$name" "$limit" -max_len=4096 -rss_limit_mb=2048 -timeout=20 \
         -dict="$root/fuzz/$(dictionary "$name")" -artifact_prefix="$build/failed/$name-" \
-        -print_final_stats=1 "$corpus" "$root/fuzz/seeds/$name" >"$build/$name.txt" 2>&1; then
+        -print_final_stats=1 "$corpus" "$root/fuzz/seeds/$name" >"$build/$name.txt" 2>&1 &&
+        [ "$(stat_of "$name" number_of_executed_units)" -ge "$least" ]; then
         echo "fuzz $name: $(stat_of "$name" number_of_executed_units) inputs," \
             "$(stat_of "$name" peak_rss_mb) MB at most, no failure"
     else
