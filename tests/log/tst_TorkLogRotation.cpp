@@ -394,6 +394,11 @@ void tst_TorkLogRotation::unfinishedCopies_data()
     QTest::addColumn<bool>("stays");
 
     QTest::newRow("copy to number 1") << "app.log.1.aBcXyZ.part: half" << false;
+    QTest::newRow("first and last letters") << "app.log.1.aAzZaZ.part: half" << false;
+    for (char const* sign : {"`", "{", "@", "["}) {
+        QTest::addRow("next to the letters, %s", sign)
+            << QString("app.log.1.aBc%1yZ.part: x").arg(sign) << true;
+    }
     QTest::newRow("name of another kind") << "app.log.1.part: x" << true;
     QTest::newRow("digits") << "app.log.1.aBc1yZ.part: x" << true;
     QTest::newRow("five letters") << "app.log.1.aBcXy.part: x" << true;
