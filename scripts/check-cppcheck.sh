@@ -11,6 +11,7 @@ sources=()
 while IFS= read -r -d '' file; do
     sources+=("$file")
 done < <(git ls-files -z --cached --others --exclude-standard 'app/*.cpp' 'common/*.cpp')
+[ ${#sources[@]} -gt 0 ] # git may refuse to list another user's files
 
 # Disabled for all sources:
 #   useStlAlgorithm: a loop of two lines reads better than most algorithms

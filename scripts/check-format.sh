@@ -19,6 +19,7 @@ files=()
 while IFS= read -r -d '' file; do
     files+=("$file")
 done < <(git ls-files -z --cached --others --exclude-standard '*.cpp' '*.h')
+[ ${#files[@]} -gt 0 ] # git may refuse to list another user's files
 
 clang-format-14 "${action[@]}" "${files[@]}"
 echo "format: ${#files[@]} files follow .clang-format"

@@ -18,6 +18,7 @@ sources=()
 while IFS= read -r -d '' file; do
     sources+=("$file")
 done < <(git ls-files -z --cached --others --exclude-standard 'app/*.cpp' 'common/*.cpp')
+[ ${#sources[@]} -gt 0 ] # git may refuse to list another user's files
 
 # The language is given because the compile commands of build/dev leave it to the compiler's default.
 # The number of warnings in Qt's own headers, one line per file, is filtered out as noise.

@@ -17,12 +17,12 @@ set -euo pipefail
 
 root=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd -P)
 build=$root/build/fuzz
-export limit=-runs=20000
+export limit=-runs=20000 least=20000 # the least number of inputs
 work=fuzz
 case "${1:-}" in
---runs) limit=-runs=$2 && shift 2 ;;
---million) limit=-runs=1000000 && shift ;;
---seconds) limit=-max_total_time=$2 && shift 2 ;;
+--runs) limit=-runs=$2 least=$2 && shift 2 ;;
+--million) limit=-runs=1000000 least=1000000 && shift ;;
+--seconds) limit=-max_total_time=$2 least=1 && shift 2 ;;
 --keep) work=keep && shift ;;
 esac
 
@@ -31,8 +31,9 @@ esac
 
 names=("$@")
 if [ ${#names[@]} -eq 0 ]; then
-    for seeds in "$root"/fuzz/seeds/*; do
-        names+=("$(basename "$seeds")")
+    for source in "$root"/fuzz/fuzz_*.cpp; do
+        name=$(basename "$source" .cpp)
+        names+=("${name#fuzz_}")
     done
 fi
 
@@ -66,6 +67,7 @@ fuzz() {
         -dict="$root/fuzz/$(dictionary "$name")" -artifact_prefix="$build/failed/$name-" \
         -print_final_stats=1 "$build/corpus/$name" "$root/fuzz/corpus/$name" \
         "$root/fuzz/seeds/$name" >"$build/$name.txt" 2>&1 || status=1
+    [ "$(stat_of "$name" number_of_executed_units || echo 0)" -ge "$least" ] || status=1
     if [ $status -ne 0 ]; then
         tail -n 60 "$build/$name.txt"
         verdict=FAILED

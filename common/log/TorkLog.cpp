@@ -107,6 +107,6 @@ void TorkLog::setFilePrefix(QString const& prefix)
 void TorkLog::setDateTimeFormat(QString const& format)
 {
     static std::atomic<quint64> generations{0};
-    m_dateTimeFormat = format;
+    m_dateTimeFormat = QString(format); // moved, so that ThreadSanitizer sees the old text freed
     m_formatGeneration = ++generations; // unique across all logs, as the cached stamps are shared
 }

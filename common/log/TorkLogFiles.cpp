@@ -22,6 +22,7 @@
 #include <QTemporaryFile>
 
 #include <algorithm>
+#include <utility>
 
 #ifdef Q_OS_UNIX
 #include <fcntl.h>
@@ -205,10 +206,11 @@ bool TorkLog::close()
 
 bool TorkLog::openFile(QString const& fileName)
 {
-    const QString reason = m_writer->open(fileName);
-    if (!reason.isNull())
-        m_errorString = reason;
-    return reason.isNull();
+    QString reason = m_writer->open(fileName);
+    if (reason.isNull())
+        return true;
+    m_errorString = std::move(reason); // ThreadSanitizer sees the old text freed
+    return false;
 }
 
 // Empty for a hidden file: QDir::Files does not list those, so the log never checks their size.

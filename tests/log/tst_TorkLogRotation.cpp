@@ -401,8 +401,8 @@ void tst_TorkLogRotation::neighborsAloneAreNotTheLog()
     QCOMPARE(folder.listing(), TestFiles::sorted(own + untouched));
 }
 
-// A listing without hidden files never shows such a log: its size is never checked, and its
-// numbered files are not recognized.
+// A listing of the directory shows neither hidden files nor those of a subfolder: the size of such
+// a log is never checked, and its numbered files are not recognized.
 void tst_TorkLogRotation::hiddenNames_data()
 {
     QTest::addColumn<QString>("prefix");
@@ -417,6 +417,11 @@ void tst_TorkLogRotation::hiddenNames_data()
         << ".app" << true << QStringList({".app.log.1: a", ".app.log.12: l"});
     QTest::newRow("rotated, empty prefix")
         << "" << true << QStringList({".log.1: a", ".log.12: l"});
+    QTest::newRow("full, in a subfolder")
+        << "sub/app" << false
+        << QStringList({"sub/", "sub/app.log: new\n%1", "sub/app.log.1: a", "sub/app.log.12: l"});
+    QTest::newRow("rotated, in a subfolder")
+        << "sub/app" << true << QStringList({"sub/", "sub/app.log.1: a", "sub/app.log.12: l"});
 }
 
 void tst_TorkLogRotation::hiddenNames()
@@ -506,6 +511,11 @@ void tst_TorkLogRotation::unfinishedCopies_data()
     QTest::addColumn<bool>("stays");
 
     QTest::newRow("copy to number 1") << "app.log.1.aBcXyZ.part: half" << false;
+    QTest::newRow("first and last letters") << "app.log.1.aAzZaZ.part: half" << false;
+    for (char const* sign : {"`", "{", "@", "["}) {
+        QTest::addRow("next to the letters, %s", sign)
+            << QString("app.log.1.aBc%1yZ.part: x").arg(sign) << true;
+    }
     QTest::newRow("name of another kind") << "app.log.1.part: x" << true;
     QTest::newRow("digits") << "app.log.1.aBc1yZ.part: x" << true;
     QTest::newRow("five letters") << "app.log.1.aBcXy.part: x" << true;

@@ -6,6 +6,7 @@
 #include "support/ChildProcess.h"
 
 #include <QDebug>
+#include <QMap>
 #include <QRegularExpression>
 #include <QtTest>
 
@@ -31,6 +32,9 @@ private slots:
     void rotationUnderWay();
     void settingsChangedMeanwhile();
     void everythingElseMeanwhile();
+    void oneOperationMeanwhile_data();
+    void oneOperationMeanwhile();
+    void logsOfTheirOwn();
     void severitiesAreNotExchanged();
     void echo();
     void shutdownMeanwhile();
@@ -239,6 +243,204 @@ void tst_TorkLogThreads::everythingElseMeanwhile()
     found.sort();
     expected.sort();
     QCOMPARE(found, expected);
+}
+
+namespace {
+
+// Longer than a stamp that is kept, so that every entry reads the format.
+QString longFormat(QChar letter)
+{
+    return "'" + QString(80, letter) + "'";
+}
+
+QString prefixOf(LogFolder const& folder, QChar letter)
+{
+    return folder.root() + letter + '/';
+}
+
+LogFolder::Settings settingsOf(QChar letter)
+{
+    return {{"dateTimeFormat", longFormat(letter)},
+            {"elapsedTimePrefix", QString(80, letter)},
+            {"filePrefix", QString(80, letter)},
+            {"logElapsedTime", "yes"},
+            {"maxLogFiles", letter == 'a' ? "3" : "4"},
+            {"maxLogFileSize", letter == 'a' ? "3000" : "4000"}};
+}
+
+void dropMessage(QtMsgType, QMessageLogContext const&, QString const&) {}
+
+} // namespace
+
+// In a thread that does nothing else: with a second locked operation it would always be in step
+// with the others, and ThreadSanitizer would not see that the first one forgot the lock.
+void tst_TorkLogThreads::oneOperationMeanwhile_data()
+{
+    QTest::addColumn<QString>("operation");
+
+    for (char const* operation :
+         {"errorString", "path", "currentLogFile", "preferencesFileName", "dateTimeFormat",
+          "elapsedTimePrefix", "filePrefix", "maxLogFiles", "maxLogFileSize", "havePreferencesFile",
+          "savePreferences", "setOutputPath", "setPreferencesFileName", "setLogElapsedTime",
+          "setEnable", "open", "close", "entry", "ready line"})
+        QTest::newRow(operation) << operation;
+}
+
+// The settings alternate between those of a and those of b: everything is of one of the two.
+void tst_TorkLogThreads::oneOperationMeanwhile()
+{
+    QFETCH(QString, operation);
+    LogFolder folder;
+    for (char letter : {'a', 'b'}) {
+        QVERIFY(TestFiles::write(prefixOf(folder, letter) + "settings",
+                                 LogFolder::settingsText(settingsOf(letter))));
+    }
+    TorkLog log(prefixOf(folder, 'a'));
+    log.setPreferencesFileName(prefixOf(folder, 'a') + "settings");
+    QVERIFY(log.loadPreferences());
+    const QString notAFile = folder.root();
+    QVERIFY(!log.open(notAFile));
+    const QString reason = log.errorString();
+    QVERIFY(!reason.isEmpty());
+    qInstallMessageHandler(dropMessage); // a load tells about itself
+
+    using Operation = std::function<QString()>;
+    const auto done = [] {
+        return QString();
+    };
+    const QMap<QString, Operation> operations = {
+        {"errorString",
+         [&] {
+             return log.errorString();
+         }},
+        {"path",
+         [&] {
+             return log.path();
+         }},
+        {"currentLogFile",
+         [&] {
+             return log.currentLogFile();
+         }},
+        {"preferencesFileName",
+         [&] {
+             return log.preferencesFileName();
+         }},
+        {"dateTimeFormat",
+         [&] {
+             return log.dateTimeFormat();
+         }},
+        {"elapsedTimePrefix",
+         [&] {
+             return log.elapsedTimePrefix();
+         }},
+        {"filePrefix",
+         [&] {
+             return log.filePrefix();
+         }},
+        {"maxLogFiles",
+         [&] {
+             return QString::number(log.maxLogFiles());
+         }},
+        {"maxLogFileSize",
+         [&] {
+             return QString::number(log.maxLogFileSize());
+         }},
+        {"havePreferencesFile",
+         [&] {
+             return log.havePreferencesFile() ? QString() : "none";
+         }},
+        {"savePreferences",
+         [&] {
+             return log.savePreferences() ? done() : "not saved";
+         }},
+        {"setOutputPath",
+         [&] {
+             return log.setOutputPath(prefixOf(folder, 'b')), done();
+         }},
+        {"setPreferencesFileName",
+         [&] {
+             log.setPreferencesFileName(prefixOf(folder, 'b') + "settings");
+             return done();
+         }},
+        {"setLogElapsedTime",
+         [&] {
+             return log.setLogElapsedTime(true), done();
+         }},
+        {"setEnable",
+         [&] {
+             return log.setEnable(true), done();
+         }},
+        {"open",
+         [&] {
+             return log.open(notAFile) ? "opened" : done();
+         }},
+        {"close",
+         [&] {
+             return log.close(), done();
+         }},
+        {"entry",
+         [&] {
+             return log.trace("entry"), done();
+         }},
+        {"ready line",
+         [&] {
+             return log.write(QStringLiteral("line\n")), done();
+         }},
+    };
+    QStringList expected = {QString(), reason};
+    for (char letter : {'a', 'b'}) {
+        const QString own = prefixOf(folder, letter);
+        const LogFolder::Settings settings = settingsOf(letter);
+        for (char file : {'a', 'b'})
+            expected << own + settingsOf(file).value("filePrefix") + ".log";
+        expected << own << own + "settings";
+        expected += settings.values();
+    }
+
+    // What one thread lets go of, Qt's own code may free in another, which ThreadSanitizer cannot
+    // follow: all results stay until the end.
+    QStringList results;
+    std::atomic<int> rounds{40};
+    inThreads([&](int thread) {
+        for (int round = 0; rounds > 0 && thread < 6; ++round) {
+            const char letter = round % 2 ? 'b' : 'a';
+            if (thread == 0) {
+                results.append(operations[operation]());
+            } else if (thread == 1) {
+                log.setPreferencesFileName(prefixOf(folder, letter) + "settings");
+                log.loadPreferences();
+                --rounds;
+            } else if (thread == 2) {
+                log.setOutputPath(prefixOf(folder, letter));
+                log.open(notAFile);
+            } else if (thread == 3) {
+                log.close();
+            } else {
+                log.trace(QStringLiteral("entry"));
+            }
+        }
+    });
+    results.removeDuplicates();
+    for (QString const& result : results)
+        QVERIFY2(expected.contains(result), qPrintable(result));
+}
+
+// Logs that know nothing of one another share the stamps that a thread keeps.
+void tst_TorkLogThreads::logsOfTheirOwn()
+{
+    LogFolder folder;
+    std::atomic<int> wrong{0};
+    inThreads([&](int thread) {
+        const QString logs = folder.root() + QString::number(thread) + '/';
+        for (int round = 0; round < 50; ++round) {
+            TorkLog log(logs);
+            log.setEnable(true);
+            log.write(QStringLiteral("line\n"));
+            if (TestFiles::read(logs + ".log") != "line\n")
+                ++wrong;
+        }
+    });
+    QCOMPARE(wrong.load(), 0);
 }
 
 void tst_TorkLogThreads::severitiesAreNotExchanged()

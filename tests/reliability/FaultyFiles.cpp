@@ -19,6 +19,8 @@
 #include <dirent.h>
 #include <dlfcn.h>
 #include <fcntl.h>
+#include <sys/file.h>
+#include <sys/ioctl.h>
 #include <sys/sendfile.h>
 #include <sys/stat.h>
 #include <sys/syscall.h>
@@ -275,9 +277,10 @@ ssize_t sendfile(int to, int from, off_t* offset, size_t length) noexcept
 {
     ORIGINAL(sendfile);
     struct stat source = {};
-    const long position = syscall(SYS_lseek, from, 0, SEEK_CUR); // not counted
+    // The calls of this function itself are not counted.
+    const long position = syscall(SYS_lseek, from, 0, SEEK_CUR);
     size_t wanted = length;
-    if (Concerns(to) && position >= 0 && fstat(from, &source) == 0)
+    if (Concerns(to) && position >= 0 && syscall(SYS_fstat, from, &source) == 0)
         wanted = static_cast<size_t>(qMax<off_t>(0, source.st_size - position));
     const ssize_t allowed = Allowed("sendfile", to, wanted);
     return allowed < 0 ? -1 : original(to, from, offset, static_cast<size_t>(allowed));
@@ -361,10 +364,37 @@ int mkdir(char const* path, mode_t mode) noexcept
     return Fails("mkdir", path) ? -1 : original(path, mode);
 }
 
+// The C library opens and closes the descriptor of a directory past the calls above.
 DIR* opendir(char const* path)
 {
     ORIGINAL(opendir);
-    return Fails("opendir", path) ? nullptr : original(path);
+    if (Fails("opendir", path))
+        return nullptr;
+    DIR* const directory = original(path);
+    if (directory)
+        Remember(dirfd(directory), path);
+    return directory;
+}
+
+int closedir(DIR* directory)
+{
+    ORIGINAL(closedir);
+    const int descriptor = dirfd(directory);
+    if (Concerns(descriptor))
+        s_open[descriptor][0] = '\0';
+    return original(directory);
+}
+
+struct dirent* readdir(DIR* directory)
+{
+    ORIGINAL(readdir);
+    return Fails("readdir", dirfd(directory)) ? nullptr : original(directory);
+}
+
+struct dirent64* readdir64(DIR* directory)
+{
+    ORIGINAL(readdir64);
+    return Fails("readdir", dirfd(directory)) ? nullptr : original(directory);
 }
 
 int chmod(char const* path, mode_t mode) noexcept
@@ -379,6 +409,46 @@ int fchmod(int descriptor, mode_t mode) noexcept
     return Fails("fchmod", descriptor) ? -1 : original(descriptor, mode);
 }
 
+int fchown(int descriptor, uid_t user, gid_t group) noexcept
+{
+    ORIGINAL(fchown);
+    return Fails("fchown", descriptor) ? -1 : original(descriptor, user, group);
+}
+
+int flock(int descriptor, int operation) noexcept
+{
+    ORIGINAL(flock);
+    return Fails("flock", descriptor) ? -1 : original(descriptor, operation);
+}
+
+// The third argument of the next two is a number, a pointer or missing; as a pointer it is passed
+// on unchanged in each case.
+int fcntl(int descriptor, int command, ...)
+{
+    ORIGINAL(fcntl);
+    va_list arguments;
+    va_start(arguments, command);
+    void* const argument = va_arg(arguments, void*);
+    va_end(arguments);
+    return Fails("fcntl", descriptor) ? -1 : original(descriptor, command, argument);
+}
+
+int ioctl(int descriptor, unsigned long request, ...) noexcept
+{
+    ORIGINAL(ioctl);
+    va_list arguments;
+    va_start(arguments, request);
+    void* const argument = va_arg(arguments, void*);
+    va_end(arguments);
+    return Fails("ioctl", descriptor) ? -1 : original(descriptor, request, argument);
+}
+
+int rmdir(char const* path) noexcept
+{
+    ORIGINAL(rmdir);
+    return Fails("rmdir", path) ? -1 : original(path);
+}
+
 ssize_t readlink(char const* path, char* target, size_t size) noexcept
 {
     ORIGINAL(readlink);
@@ -389,6 +459,42 @@ int access(char const* path, int mode) noexcept
 {
     ORIGINAL(access);
     return Fails("access", path) ? -1 : original(path, mode);
+}
+
+int stat(char const* path, struct stat* status) noexcept
+{
+    ORIGINAL(stat);
+    return Fails("stat", path) ? -1 : original(path, status);
+}
+
+int lstat(char const* path, struct stat* status) noexcept
+{
+    ORIGINAL(lstat);
+    return Fails("stat", path) ? -1 : original(path, status);
+}
+
+int fstat(int descriptor, struct stat* status) noexcept
+{
+    ORIGINAL(fstat);
+    return Fails("stat", descriptor) ? -1 : original(descriptor, status);
+}
+
+int stat64(char const* path, struct stat64* status) noexcept
+{
+    ORIGINAL(stat64);
+    return Fails("stat", path) ? -1 : original(path, status);
+}
+
+int lstat64(char const* path, struct stat64* status) noexcept
+{
+    ORIGINAL(lstat64);
+    return Fails("stat", path) ? -1 : original(path, status);
+}
+
+int fstat64(int descriptor, struct stat64* status) noexcept
+{
+    ORIGINAL(fstat64);
+    return Fails("stat", descriptor) ? -1 : original(descriptor, status);
 }
 
 // Qt passes a descriptor with an empty path.

@@ -3,9 +3,11 @@
 
 // A library to be preloaded into an unchanged program (LD_PRELOAD): it records every file that the
 // program opens for writing, creates, moves or removes, and every program that it starts.
+// tst_FileRecorder checks each of its calls.
 //
 //     FILE_RECORDER  the file to record it in, a line "CALL PATH" each
 
+#include <array>
 #include <cerrno>
 #include <climits>
 #include <cstdarg>
@@ -40,7 +42,8 @@ void Note(char const* call, char const* path)
 
     const int kept = errno;
     char folder[PATH_MAX] = "";
-    if (path[0] != '/' && getcwd(folder, sizeof folder - 1))
+    const bool isPath = std::strcmp(call, "search") != 0 && std::strcmp(call, "shell") != 0;
+    if (isPath && path[0] != '/' && getcwd(folder, sizeof folder - 1))
         std::strcat(folder, "/");
     char line[2 * PATH_MAX + 32];
     const int length = std::snprintf(line, sizeof line, "%s %s%s\n", call, folder, path);
@@ -51,6 +54,15 @@ void Note(char const* call, char const* path)
         syscall(SYS_close, file);
     }
     errno = kept;
+}
+
+// A name without a slash is searched for in PATH.
+void NoteProgram(char const* file)
+{
+    if (std::strchr(file, '/'))
+        Note("start", file);
+    else
+        Note("search", file);
 }
 
 void NoteIfWriting(char const* path, int flags)
@@ -133,12 +145,82 @@ int mkdir(char const* path, mode_t mode) noexcept
     return original(path, mode);
 }
 
+int mkfifo(char const* path, mode_t mode) noexcept
+{
+    ORIGINAL(mkfifo);
+    Note("open", path);
+    return original(path, mode);
+}
+
+// What is created gets the rest of its name in the call.
+int mkstemp(char* path)
+{
+    ORIGINAL(mkstemp);
+    const int descriptor = original(path);
+    Note("open", path);
+    return descriptor;
+}
+
+int mkstemp64(char* path)
+{
+    ORIGINAL(mkstemp64);
+    const int descriptor = original(path);
+    Note("open", path);
+    return descriptor;
+}
+
+int mkostemp(char* path, int flags)
+{
+    ORIGINAL(mkostemp);
+    const int descriptor = original(path, flags);
+    Note("open", path);
+    return descriptor;
+}
+
+int mkostemp64(char* path, int flags)
+{
+    ORIGINAL(mkostemp64);
+    const int descriptor = original(path, flags);
+    Note("open", path);
+    return descriptor;
+}
+
+char* mkdtemp(char* path) noexcept
+{
+    ORIGINAL(mkdtemp);
+    char* const made = original(path);
+    Note("mkdir", path);
+    return made;
+}
+
+int truncate(char const* path, off_t length) noexcept
+{
+    ORIGINAL(truncate);
+    Note("open", path);
+    return original(path, length);
+}
+
+int truncate64(char const* path, off64_t length) noexcept
+{
+    ORIGINAL(truncate64);
+    Note("open", path);
+    return original(path, length);
+}
+
 int rename(char const* from, char const* to) noexcept
 {
     ORIGINAL(rename);
     Note("rename", from);
     Note("rename", to);
     return original(from, to);
+}
+
+int renameat(int fromFolder, char const* from, int toFolder, char const* to) noexcept
+{
+    ORIGINAL(renameat);
+    Note("rename", from);
+    Note("rename", to);
+    return original(fromFolder, from, toFolder, to);
 }
 
 int renameat2(int fromFolder, char const* from, int toFolder, char const* to,
@@ -178,6 +260,20 @@ int unlink(char const* path) noexcept
     return original(path);
 }
 
+int unlinkat(int folder, char const* path, int flags) noexcept
+{
+    ORIGINAL(unlinkat);
+    Note("remove", path);
+    return original(folder, path, flags);
+}
+
+int remove(char const* path) noexcept
+{
+    ORIGINAL(remove);
+    Note("remove", path);
+    return original(path);
+}
+
 int rmdir(char const* path) noexcept
 {
     ORIGINAL(rmdir);
@@ -190,6 +286,13 @@ int chmod(char const* path, mode_t mode) noexcept
     ORIGINAL(chmod);
     Note("chmod", path);
     return original(path, mode);
+}
+
+int chown(char const* path, uid_t user, gid_t group) noexcept
+{
+    ORIGINAL(chown);
+    Note("chmod", path);
+    return original(path, user, group);
 }
 
 int execve(char const* path, char* const arguments[], char* const environment[]) noexcept
@@ -209,8 +312,44 @@ int execv(char const* path, char* const arguments[]) noexcept
 int execvp(char const* file, char* const arguments[]) noexcept
 {
     ORIGINAL(execvp);
-    Note("start", file);
+    NoteProgram(file);
     return original(file, arguments);
+}
+
+int execvpe(char const* file, char* const arguments[], char* const environment[]) noexcept
+{
+    ORIGINAL(execvpe);
+    NoteProgram(file);
+    return original(file, arguments, environment);
+}
+
+// The lists of arguments end with a null pointer; the C library would start the program past the
+// functions above.
+#define EXEC_LIST(start)                                                                           \
+    std::array<char*, 1000> arguments = {const_cast<char*>(first)};                                \
+    va_list list;                                                                                  \
+    va_start(list, first);                                                                         \
+    for (size_t i = 1; i < arguments.size() && arguments[i - 1]; ++i)                              \
+        arguments[i] = va_arg(list, char*);                                                        \
+    start;                                                                                         \
+    va_end(list);
+
+int execl(char const* path, char const* first, ...) noexcept
+{
+    EXEC_LIST(execv(path, arguments.data()))
+    return -1;
+}
+
+int execlp(char const* file, char const* first, ...) noexcept
+{
+    EXEC_LIST(execvp(file, arguments.data()))
+    return -1;
+}
+
+int execle(char const* path, char const* first, ...) noexcept
+{
+    EXEC_LIST(execve(path, arguments.data(), va_arg(list, char* const*)))
+    return -1;
 }
 
 int posix_spawn(pid_t* process, char const* path, posix_spawn_file_actions_t const* actions,
@@ -227,7 +366,7 @@ int posix_spawnp(pid_t* process, char const* file, posix_spawn_file_actions_t co
                  char* const environment[])
 {
     ORIGINAL(posix_spawnp);
-    Note("start", file);
+    NoteProgram(file);
     return original(process, file, actions, attributes, arguments, environment);
 }
 

@@ -14,6 +14,10 @@
 #include <QTextStream>
 #include <QtTest>
 
+#include <ctime>
+#include <fcntl.h>
+#include <sys/stat.h>
+
 using namespace Velocor;
 
 class tst_RunningLog : public QObject
@@ -31,6 +35,7 @@ private slots:
     void instances();
     void instancesLeaveNothing();
     void instanceLeftBehind();
+    void locksOfAnotherComputer();
     void health();
     void healthDirectoryInTheWay();
 };
@@ -39,6 +44,13 @@ private slots:
 static QString runningFolder(TestRun const& test)
 {
     return test.folder() + "data/running-app.log";
+}
+
+static bool makeWeeksOld(QString const& path)
+{
+    const timespec weeksAgo = {time(nullptr) - 30 * 24 * 3600, 0};
+    const timespec times[] = {weeksAgo, weeksAgo};
+    return utimensat(AT_FDCWD, QFile::encodeName(path).constData(), times, 0) == 0;
 }
 
 void tst_RunningLog::preferences()
@@ -200,6 +212,26 @@ void tst_RunningLog::instanceLeftBehind()
     other.kill();
     other.waitForFinished();
     QCOMPARE(own.Others(), QList<qint64>());
+}
+
+// In a home folder on the network. Nobody here can tell whether that program still runs: it may not
+// have touched its lock for weeks.
+void tst_RunningLog::locksOfAnotherComputer()
+{
+    const TestRun test;
+    const qint64 own = QCoreApplication::applicationPid();
+    const QByteArray another = "\nvelocor\nanother-computer\n";
+    for (qint64 process : {own, own + 1}) {
+        const QString lock = runningFolder(test) + QString("/%1.lock").arg(process);
+        QVERIFY(TestFiles::write(lock, QByteArray::number(process) + another));
+        QVERIFY(makeWeeksOld(lock));
+    }
+    const QStringList before = TestFiles::listing(runningFolder(test));
+    {
+        const InstanceList instances(runningFolder(test));
+        QCOMPARE(instances.Others(), QList<qint64>({own + 1}));
+    }
+    QCOMPARE(TestFiles::listing(runningFolder(test)), before);
 }
 
 void tst_RunningLog::health()

@@ -8,6 +8,7 @@
 #include "app/window/FileTabs.h"
 #include "app/window/PlacesPanel.h"
 #include "app/window/ReportDialog.h"
+#include "app/window/SystemReport.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/widgets/NoticeBar.h"
 
@@ -63,6 +64,7 @@ private slots:
     void recentFiles();
     void forgetsMissingFile();
     void dropsFiles();
+    void dropsOnlyTheFirstFiles();
 
     void about();
     void saveReport();
@@ -289,6 +291,28 @@ void tst_MainWindow::dropsFiles()
     QVERIFY(!textEnter.isAccepted());
 }
 
+// A whole folder that was selected by mistake does not open hundreds of tabs.
+void tst_MainWindow::dropsOnlyTheFirstFiles()
+{
+    const WindowTest test;
+    QList<QUrl> urls;
+    for (int i = 0; i < 22; ++i) {
+        const QString file = test.folder() + QString("%1.log").arg(i, 2, 10, QChar('0'));
+        QVERIFY(TestFiles::write(file, "x\n"));
+        urls.append(QUrl::fromLocalFile(file));
+    }
+    const auto window = WindowTest::show();
+    QMimeData files;
+    files.setUrls(urls);
+    QDragEnterEvent enter(QPoint(50, 50), Qt::CopyAction, &files, Qt::LeftButton, Qt::NoModifier);
+    QCoreApplication::sendEvent(window.get(), &enter);
+    QDropEvent drop(QPoint(50, 50), Qt::CopyAction, &files, Qt::LeftButton, Qt::NoModifier);
+    QCoreApplication::sendEvent(window.get(), &drop);
+    auto const* tabs = window->findChild<FileTabs*>();
+    QCOMPARE(tabs->count(), 21); // and the log of the program
+    QCOMPARE(tabs->tabText(20), QString("19.log"));
+}
+
 void tst_MainWindow::about()
 {
     const WindowTest test;
@@ -307,9 +331,11 @@ void tst_MainWindow::about()
              qPrintable(copied));
 }
 
+// Nothing of a long one is missing: neither on the screen nor in the file nor in the clipboard.
 void tst_MainWindow::saveReport()
 {
-    const QByteArray log = run(5, QTime(9, 0), "x");
+    const QByteArray log =
+        run(SystemReport::TailLines, QTime(9, 0), QByteArray(900, 'x').constData());
     const WindowTest test(log);
     const auto window = WindowTest::show();
     const QString file = test.folder() + "report.txt";
@@ -323,14 +349,17 @@ void tst_MainWindow::saveReport()
             QTest::keyClick(name, Qt::Key_Return);
         });
         const QList<QPushButton*> buttons = dialog->findChildren<QPushButton*>();
-        for (QPushButton* button : buttons) {
-            if (button->text().remove('&') == "Save...")
-                Click(button);
+        for (char const* caption : {"Copy", "Save..."}) {
+            for (QPushButton* button : buttons) {
+                if (button->text().remove('&') == caption)
+                    Click(button);
+            }
         }
     });
     QTest::keyClick(window.get(), Qt::Key_R, Qt::ControlModifier | Qt::ShiftModifier);
     QTRY_VERIFY_WITH_TIMEOUT(QFile::exists(file), Patience);
     QVERIFY(TestFiles::read(file).endsWith(log));
+    QCOMPARE(QGuiApplication::clipboard()->text().toUtf8(), TestFiles::read(file));
     const ReportDialog dialog("T", "H", "text", true);
     QVERIFY(!dialog.SaveTo(test.folder() + "no/such/file").isEmpty());
 }

@@ -186,6 +186,15 @@ void tst_TorkXmlGuard::parse_data()
         << Document(half, QByteArray("&e;").repeated(1024)) << true;
     QTest::newRow("one reference more")
         << Document(half, QByteArray("&e;").repeated(1025)) << false;
+    // Long references that stand for nothing, so that only what is read again counts.
+    const QByteArray nothing(1022, 'n');
+    const QByteArray readAgain =
+        Entity(nothing, "") + Entity("x", "x") + Entity("e", ('&' + nothing + ';').repeated(512));
+    const QByteArray allReadAgain =
+        QByteArray("&e;").repeated(TorkXmlMaximumReplacement / (512 * 1024));
+    QTest::newRow("as much read again as allowed") << Document(readAgain, allReadAgain) << true;
+    QTest::newRow("one character more read again")
+        << Document(readAgain, allReadAgain + "&x;") << false;
     QTest::newRow("references without an entity")
         << QByteArray("<r>" + QByteArray("&amp;").repeated(100000) + "</r>") << true;
     const QByteArray names = Entity("e", "x") + Entity("f", "&e;");
