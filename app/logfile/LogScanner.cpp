@@ -66,14 +66,10 @@ void LogScanner::SetFilter(int request, LogFilter const& filter)
         readFromStart();
 }
 
+// What else is known of the file is not used before the next read has replaced it.
 void LogScanner::startOver()
 {
     m_index = LogIndex(m_parser, m_filter);
-    m_rows = std::make_shared<LogRows>();
-    m_head.clear();
-    m_anchor.clear();
-    m_size = 0;
-    m_modified = QDateTime();
     m_complete = false;
 }
 

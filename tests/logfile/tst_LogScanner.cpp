@@ -106,7 +106,8 @@ QByteArray Long(char const* first, char const* middle, char const* last)
     QByteArray text;
     int second = 0;
     for (char const* word : {first, "b", middle, "d", last})
-        text += entry(QTime(9, 0, second++).toString("hh:mm:ss.zzz"), "Trace", word + padding + word);
+        text +=
+            entry(QTime(9, 0, second++).toString("hh:mm:ss.zzz"), "Trace", word + padding + word);
     return text;
 }
 
@@ -135,11 +136,13 @@ private slots:
     void obsoleteOpenReadsNothing();
     void pollWithoutAFile();
     void cancelledRead();
+    void cancelledSecondRead();
     void cancelledPoll();
     void filters_data();
     void filters();
     void obsoleteFilter_data();
     void obsoleteFilter();
+    void sameTextReadsNothing();
     void obsoleteFilterOfAMissingFile();
 
 private:
@@ -409,6 +412,11 @@ void tst_LogScanner::obsoleteOpenReadsNothing()
     QCOMPARE(reader.polls, 1);
     reader.Open(2);
     QCOMPARE(reader.updates.size(), 1);
+
+    QVERIFY(QFile::remove(m_file)); // that is not reported for it either
+    reader.scanner.SetCurrentRequest(4);
+    reader.Open(3, LogFilter(), false);
+    QCOMPARE(reader.updates.size(), 1);
 }
 
 void tst_LogScanner::pollWithoutAFile()
@@ -437,6 +445,26 @@ void tst_LogScanner::cancelledRead()
     reader.scanner.Poll();
     QCOMPARE(reader.updates.size(), 1);
     QVERIFY(reader.updates.last().isReset);
+    QCOMPARE(reader.updates.last().lines, size_t(1));
+}
+
+// The file looks unchanged, but not all of it has been read for the later request.
+void tst_LogScanner::cancelledSecondRead()
+{
+    QVERIFY(TestFiles::write(m_file, QByteArray(3 << 20, 'x') + '\n'));
+    QVERIFY(SetTime(m_file, QDateTime::currentDateTime().addSecs(-3600)));
+    Reader reader(m_file);
+    reader.Open(1);
+    QCOMPARE(reader.updates.size(), 1);
+    reader.onProgress = [&](int) {
+        reader.scanner.SetCurrentRequest(3);
+    };
+    reader.Open(2);
+    reader.onProgress = nullptr;
+    QCOMPARE(reader.updates.size(), 1);
+    reader.scanner.SetCurrentRequest(2);
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 2);
     QCOMPARE(reader.updates.last().lines, size_t(1));
 }
 
@@ -549,6 +577,23 @@ void tst_LogScanner::obsoleteFilter()
     reader.scanner.Poll();
     QCOMPARE(reader.updates.size(), 3);
     QCOMPARE(reader.Rows(), QStringList(Lines(run(6, QTime(9, 0), "x")).at(1)));
+}
+
+// Filters of the same text do without the file, even if one of them is superseded.
+void tst_LogScanner::sameTextReadsNothing()
+{
+    QVERIFY(TestFiles::write(m_file, run(6, QTime(9, 0), "x")));
+    Reader reader(m_file);
+    reader.Open(1);
+    QVERIFY(QFile::remove(m_file));
+    LogFilter filter;
+    filter.SetSeverity(LogEntry::Trace, false);
+    reader.scanner.SetCurrentRequest(3);
+    reader.SetFilter(2, filter, false);
+    reader.SetFilter(3, filter);
+    QCOMPARE(reader.updates.size(), 2);
+    QVERIFY(reader.updates.last().exists);
+    QCOMPARE(reader.updates.last().rows->size(), size_t(1));
 }
 
 void tst_LogScanner::obsoleteFilterOfAMissingFile()
