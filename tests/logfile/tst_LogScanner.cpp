@@ -129,6 +129,7 @@ private slots:
     void oneUpdateForManyChanges();
     void missingFiles_data();
     void missingFiles();
+    void fileComesBack();
     void noRegularFile_data();
     void noRegularFile();
     void sizeIsUnknown();
@@ -207,6 +208,13 @@ void tst_LogScanner::changes_data()
     QTest::newRow("a newer run overwrites an older one")
         << writtenOver(older, run(3, QTime(9, 0), "n"))
         << writtenOver(older, run(6, QTime(9, 0), "n")) << false;
+    const QByteArray longRun = run(30000, QTime(1, 0), "older", true); // more than one slice
+    QTest::newRow("a newer run overwrites a long older one")
+        << writtenOver(longRun, run(3, QTime(9, 0), "n"))
+        << writtenOver(longRun, run(6, QTime(9, 0), "n")) << false;
+    QTest::newRow("an older run loses its end")
+        << writtenOver(older, run(3, QTime(9, 0), "n"))
+        << writtenOver(older.left(older.size() - 100), run(3, QTime(9, 0), "n")) << true;
 }
 
 // Both in place and by putting another file there.
@@ -332,6 +340,22 @@ void tst_LogScanner::missingFiles()
     QVERIFY(reader.updates.last().isReset && reader.updates.last().exists);
     QCOMPARE(reader.Rows(), Lines(text));
     QCOMPARE(reader.polls, 3);
+}
+
+// By its size and time it is what was read, but that is no longer known.
+void tst_LogScanner::fileComesBack()
+{
+    QVERIFY(TestFiles::write(m_file, run(5, QTime(9, 0), "x")));
+    QVERIFY(SetTime(m_file, QDateTime::currentDateTime().addSecs(-3600)));
+    Reader reader(m_file);
+    reader.Open(1);
+    QVERIFY(QFile::rename(m_file, m_file + ".away"));
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.last().rows->size(), size_t(0));
+    QVERIFY(QFile::rename(m_file + ".away", m_file));
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 3);
+    QCOMPARE(reader.updates.last().rows->size(), size_t(5));
 }
 
 void tst_LogScanner::noRegularFile_data()
