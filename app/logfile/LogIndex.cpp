@@ -20,8 +20,7 @@ constexpr size_t MaximumReread = 1000;
 // Concurrent threads may write their entries in a different order than they stamped them.
 constexpr qint64 Tolerance = 20; // milliseconds
 
-// Twelve hours, in the units of LogTimeReader keys.
-constexpr qint64 HalfADay = qint64(12) * 60 * 61 * 1000;
+constexpr qint64 HalfADay = qint64(12) * 60 * 60 * 1000; // milliseconds
 
 template <class T>
 void MoveTail(std::vector<T>& from, size_t first, std::vector<T>& to)

@@ -15,6 +15,8 @@ namespace Velocor {
 
 namespace {
 
+constexpr int MinuteLength = 60000; // milliseconds
+
 // Letters of any language: anything above ASCII may be one.
 bool IsWordCharacter(char c)
 {
@@ -221,10 +223,11 @@ LogTimeReader::Stamp LogTimeReader::Read(char const* text, int length) const
     qint64 key = number[Year] + number[ShortYear];
     key = key * 13 + number[Month];
     key = key * 32 + number[Day];
-    key = key * 25 + number[Hour] + number[HalfDay];
+    key = key * 24 + number[Hour] + number[HalfDay];
     key = key * 60 + number[Minute];
-    key = key * 61 + number[Second];
-    stamp.key = key * 1000 + number[Fraction];
+    // A leap second counts as the end of its minute.
+    const int milliseconds = number[Second] * 1000 + number[Fraction];
+    stamp.key = key * MinuteLength + std::min(milliseconds, MinuteLength - 1);
     return stamp;
 }
 
