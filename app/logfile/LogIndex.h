@@ -38,7 +38,8 @@ public:
     explicit LogIndex(LogLineParser const& parser = LogLineParser(),
                       LogFilter const& filter = LogFilter());
 
-    /// Starts a pass over the file.
+    /// Starts a pass over the file. If the file has grown after an earlier run, start with a new
+    /// index instead: see Feed().
     ///
     /// @return the offset to read the file from: 0 in the first pass
     qint64 Begin();

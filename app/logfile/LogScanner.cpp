@@ -164,6 +164,10 @@ void LogScanner::Poll()
     } else if (opened && (!m_complete || !m_exists || !isSameFile(file))) {
         readFromStart();
     } else if (opened) {
+        // The index takes the lines after the newest run for known: that run overwrites them. They
+        // are not if the file grows after them, as it does if the clock was set back.
+        if (file.size() > m_size && m_index.runs() > 1)
+            m_index = LogIndex(m_parser, m_filter);
         m_complete = false; // until the pass is over
         if (readFrom(file, m_index.Begin()))
             report(false);

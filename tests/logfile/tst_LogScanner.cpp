@@ -212,6 +212,14 @@ void tst_LogScanner::changes_data()
     QTest::newRow("a newer run overwrites a long older one")
         << writtenOver(longRun, run(3, QTime(9, 0), "n"))
         << writtenOver(longRun, run(6, QTime(9, 0), "n")) << false;
+    QTest::newRow("a line takes the place of one as long")
+        << writtenOver(run(20, QTime(17, 0), "a", true), run(3, QTime(9, 0), "b"))
+        << writtenOver(run(20, QTime(17, 0), "a", true), run(4, QTime(9, 0), "b")) << false;
+    const QByteArray setBack = run(5, QTime(9, 0), "x") + run(3, QTime(8, 0), "x");
+    QTest::newRow("grows after the clock was set back")
+        << setBack << QByteArray(setBack + entry("08:00:07.000", "Trace", "x")) << false;
+    QTest::newRow("an incomplete line is completed after the clock was set back")
+        << setBack.left(setBack.size() - 9) << setBack << false;
     QTest::newRow("an older run loses its end")
         << writtenOver(older, run(3, QTime(9, 0), "n"))
         << writtenOver(older.left(older.size() - 100), run(3, QTime(9, 0), "n")) << true;
@@ -440,7 +448,9 @@ void tst_LogScanner::obsoleteOpenReadsNothing()
     QVERIFY(QFile::remove(m_file)); // that is not reported for it either
     reader.scanner.SetCurrentRequest(4);
     reader.Open(3, LogFilter(), false);
+    reader.scanner.Poll();
     QCOMPARE(reader.updates.size(), 1);
+    QCOMPARE(reader.polls, 2);
 }
 
 void tst_LogScanner::pollWithoutAFile()
