@@ -283,6 +283,12 @@ void tst_TorkXmlGuard::namesTheLimit_data()
     QTest::newRow("elements") << Nested(1001) << "More than 1000 elements are inside each other.";
     QTest::newRow("groups") << Document(Groups(1001), "")
                             << "More than 1000 groups are inside each other in a document type.";
+    for (char const* bracket : {"&#40;", "&#x28;"}) {
+        QTest::addRow("groups from references %s", bracket)
+            << Document("<!ENTITY % p '<!ELEMENT r " + QByteArray(bracket).repeated(1001) + "'>%p;",
+                        "")
+            << "More than 1000 groups are inside each other in a document type.";
+    }
     QTest::newRow("entities") << Document(Entities(1001), "")
                               << "More than 1000 entities are declared.";
     QTest::newRow("long entities")
