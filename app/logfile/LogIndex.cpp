@@ -21,13 +21,12 @@ constexpr size_t MaximumReread = 1000;
 // Concurrent threads may write their entries in a different order than they stamped them.
 constexpr qint64 Tolerance = 20; // milliseconds
 
-// In the units of LogTimeReader keys, whose minutes have 61 seconds.
-constexpr qint64 Hour = qint64(60) * 61 * 1000;
-constexpr qint64 HalfADay = 12 * Hour;
+constexpr qint64 Minute = 60 * 1000; // milliseconds
+constexpr qint64 HalfADay = 12 * 60 * Minute;
 
 // The most that the end of daylight saving time sets a clock back; and a minute, because stamps may
 // be given in minutes.
-constexpr qint64 ClockChange = Hour + qint64(61) * 1000;
+constexpr qint64 ClockChange = 61 * Minute;
 
 template <class T>
 void MoveTail(std::vector<T>& from, size_t first, std::vector<T>& to)

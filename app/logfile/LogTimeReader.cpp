@@ -15,6 +15,8 @@ namespace Velocor {
 
 namespace {
 
+constexpr int MinuteLength = 60000; // milliseconds
+
 // Letters of any language: anything above ASCII may be one.
 bool IsWordCharacter(char c)
 {
@@ -71,7 +73,7 @@ LogTimeReader::LogTimeReader(QString const& format) : m_fractionOfSecond(WritesF
         found[token.field] = true;
     m_hasDate = (found[Year] || found[ShortYear]) && found[Month] && found[Day];
     m_hasTime = found[Hour] && found[Minute];
-    m_resolution = found[Fraction] ? 1 : found[Second] ? 1000 : 61 * 1000;
+    m_resolution = found[Fraction] ? 1 : found[Second] ? 1000 : MinuteLength;
 }
 
 void LogTimeReader::parseFormat(QString const& format)
@@ -222,10 +224,11 @@ LogTimeReader::Stamp LogTimeReader::Read(char const* text, int length) const
     qint64 key = number[Year] + number[ShortYear];
     key = key * 13 + number[Month];
     key = key * 32 + number[Day];
-    key = key * 25 + number[Hour] + number[HalfDay];
+    key = key * 24 + number[Hour] + number[HalfDay];
     key = key * 60 + number[Minute];
-    key = key * 61 + number[Second];
-    stamp.key = key * 1000 + number[Fraction];
+    // A leap second counts as the end of its minute.
+    const int milliseconds = number[Second] * 1000 + number[Fraction];
+    stamp.key = key * MinuteLength + std::min(milliseconds, MinuteLength - 1);
     return stamp;
 }
 

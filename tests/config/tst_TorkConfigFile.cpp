@@ -68,6 +68,10 @@ private slots:
     void appendSectionTwice();
     void appendSectionThatWasPushedOut_data();
     void appendSectionThatWasPushedOut();
+    void appendSectionAndTheCurrentOne_data();
+    void appendSectionAndTheCurrentOne();
+    void currentSectionOf_data();
+    void currentSectionOf();
     void appendNoSection();
     void appendSectionKeepsBlanksInTheName();
     void clearForgetsAllSections();
@@ -337,6 +341,88 @@ void tst_TorkConfigFile::appendSectionThatWasPushedOut()
     QCOMPARE(secondDeleted, 0);
 }
 
+void tst_TorkConfigFile::appendSectionAndTheCurrentOne_data()
+{
+    QTest::addColumn<QString>("current");
+    QTest::addColumn<bool>("isHeld");
+    QTest::addColumn<bool>("isReplaced");
+
+    QTest::newRow("the current one is pushed out and deleted") << "One" << false << true;
+    QTest::newRow("the current one is pushed out to its holder") << "One" << true << true;
+    QTest::newRow("another is current") << "Two" << false << false;
+}
+
+// A current section that is pushed out would otherwise be one that is deleted.
+void tst_TorkConfigFile::appendSectionAndTheCurrentOne()
+{
+    QFETCH(QString, current);
+    QFETCH(bool, isHeld);
+    QFETCH(bool, isReplaced);
+    TorkConfigFile file{QString()};
+    file.WriteItem("Two", "k", "v");
+    file.WriteItem("One", "k", "v");
+    const std::unique_ptr<TorkConfigFileSection> held(isHeld ? file.FindSection("One") : nullptr);
+    QVERIFY(file.HasSection(current));
+    TorkConfigFileSection const* const before = file.CurrentSection();
+
+    auto* section = new TorkConfigFileSection("One");
+    file.AppendSection(section);
+    QVERIFY(file.CurrentSection() == (isReplaced ? section : before));
+    QCOMPARE(file.CurrentSection()->name(), current);
+    QCOMPARE(file.CurrentSection()->keyList(), isReplaced ? QStringList() : QStringList("k"));
+}
+
+void tst_TorkConfigFile::currentSectionOf_data()
+{
+    QTest::addColumn<StoreTest::Setup>("call");
+    QTest::addColumn<QString>("current"); // "" for none
+
+    using Setup = StoreTest::Setup;
+    const auto row = [](char const* name, Setup const& call, char const* current) {
+        QTest::newRow(name) << call << QString(current);
+    };
+    row("nothing", Setup([](TorkConfigFile&) {}), "Two");
+    row("HasSection", Setup([](TorkConfigFile& file) { file.HasSection("One"); }), "One");
+    row("HasSection of none", Setup([](TorkConfigFile& file) { file.HasSection("No"); }), "Two");
+    row("FindSection", Setup([](TorkConfigFile& file) { file.FindSection("One"); }), "One");
+    row("keyList", Setup([](TorkConfigFile& file) { file.keyList("One"); }), "One");
+    row("keyList of none", Setup([](TorkConfigFile& file) { file.keyList("No"); }), "Two");
+    row("ClearSection", Setup([](TorkConfigFile& file) { file.ClearSection("One"); }), "One");
+    row("ReadItem of a missing key", Setup([](TorkConfigFile& file) {
+            QString none;
+            QString value;
+            file.ReadItem("One", "no", none, value);
+        }),
+        "One");
+    row("ReadInt", Setup([](TorkConfigFile& file) {
+            int value = 0;
+            file.ReadInt("One", "k", 0, value);
+        }),
+        "One");
+    row("WriteItem", Setup([](TorkConfigFile& file) { file.WriteItem("One", "l", "w"); }), "One");
+    row("WriteItem of a null value",
+        Setup([](TorkConfigFile& file) { file.WriteItem("One", "l", QString()); }), "Two");
+    row("WriteItem in a new section",
+        Setup([](TorkConfigFile& file) { file.WriteItem("New", "l", "w"); }), "New");
+    row("AppendSection",
+        Setup([](TorkConfigFile& file) { file.AppendSection(new TorkConfigFileSection("New")); }),
+        "Two");
+    row("ToXml", Setup([](TorkConfigFile& file) { file.ToXml(); }), "Two");
+    row("Clear", Setup([](TorkConfigFile& file) { file.Clear(); }), "");
+}
+
+void tst_TorkConfigFile::currentSectionOf()
+{
+    QFETCH(StoreTest::Setup, call);
+    TorkConfigFile file{QString()};
+    QVERIFY(!file.CurrentSection());
+    file.WriteItem("One", "k", "v");
+    file.WriteItem("Two", "k", "v");
+    call(file);
+    TorkConfigFileSection const* const current = file.CurrentSection();
+    QTEST(current ? current->name() : QString(""), "current");
+}
+
 void tst_TorkConfigFile::appendNoSection()
 {
     TorkConfigFile file{QString()};
@@ -405,7 +491,9 @@ void tst_TorkConfigFile::clearSection()
     file.WriteItem("MySection", "k", "v");
     file.WriteItem("Other", "k", "v");
 
+    TorkConfigFileSection* const section = file.FindSection("MySection");
     file.ClearSection(name);
+    QVERIFY(file.FindSection("MySection") == section); // emptied, not replaced
     QTEST(ConfigContents::of(file, {"MySection", "Other", name}), "expected");
 }
 

@@ -5,6 +5,7 @@
 
 #include "common/config/TorkConfigFile.h"
 
+#include <QBuffer>
 #include <QXmlInputSource>
 #include <QXmlSimpleReader>
 #include <QtTest>
@@ -70,6 +71,10 @@ private slots:
     void readerWithoutFile_data();
     void readerWithoutFile();
     void fileOutsideItsLoadStaysAsItIs();
+    void watchesALoad_data();
+    void watchesALoad();
+    void nullTextIsNoValue();
+    void stepsAfterALoad();
 };
 
 void tst_TorkConfigFileDocHandler::startsEmpty_data()
@@ -246,6 +251,132 @@ void tst_TorkConfigFileDocHandler::fileOutsideItsLoadStaysAsItIs()
     QVERIFY(!file.HasSection("s"));
     QVERIFY(!file.HasSection("r"));
     QCOMPARE(file.keyList("current"), QStringList{"a"});
+}
+
+void tst_TorkConfigFileDocHandler::watchesALoad_data()
+{
+    QTest::addColumn<QByteArray>("document");
+    QTest::addColumn<QStringList>("expected");
+
+    // After each event: what came, the depth, "S" after a start tag, "V" if a value is expected.
+    QTest::newRow("value") << QByteArray("<r><s><k>v</k></s></r>")
+                           << QStringList{"document 0", "r 1 S", "s 2 S", "k 3 SV",
+                                          "text 3",     "/k 2",  "/s 1",  "/r 0"};
+    QTest::newRow("item without text")
+        << QByteArray("<r><s><k/></s><t/></r>")
+        << QStringList{"document 0", "r 1 S", "s 2 S", "k 3 SV", "/k 2 V",
+                       "/s 1 V",     "t 2 S", "/t 1",  "/r 0"};
+    QTest::newRow("deeper in an item without text")
+        << QByteArray("<r><s><k><d>v</d></k></s></r>")
+        << QStringList{"document 0", "r 1 S", "s 2 S", "k 3 SV", "d 4 SV",
+                       "text 4",     "/d 3",  "/k 2",  "/s 1",   "/r 0"};
+    QTest::newRow("two texts") << QByteArray("<r><s><k>v<!-- -->w</k></s></r>")
+                               << QStringList{"document 0", "r 1 S", "s 2 S", "k 3 SV", "text 3",
+                                              "text 3",     "/k 2",  "/s 1",  "/r 0"};
+    QTest::newRow("named like the root element")
+        << QByteArray("<r><s><VelocorSettings>v</VelocorSettings></s></r>")
+        << QStringList{"document 0",         "r 1 S", "s 2 S", "VelocorSettings 3 S", "text 3",
+                       "/VelocorSettings 2", "/s 1",  "/r 0"};
+    QTest::newRow("broken") << QByteArray("<r><s><k>")
+                            << QStringList{"document 0", "r 1 S", "s 2 S", "k 3 SV"};
+}
+
+// The second load starts like the first, wherever that ended.
+void tst_TorkConfigFileDocHandler::watchesALoad()
+{
+    class Watching : public TorkConfigFileDocHandler
+    {
+    public:
+        explicit Watching(TorkConfigFile& file) : TorkConfigFileDocHandler(&file), m_file(file) {}
+
+        bool startDocument() override
+        {
+            note("document");
+            return TorkConfigFileDocHandler::startDocument();
+        }
+
+        bool startElement(QString const& uri, QString const& name, QString const& qName,
+                          QXmlAttributes const& attributes) override
+        {
+            const bool goesOn =
+                TorkConfigFileDocHandler::startElement(uri, name, qName, attributes);
+            note(name);
+            return goesOn;
+        }
+
+        bool endElement(QString const& uri, QString const& name, QString const& qName) override
+        {
+            const bool goesOn = TorkConfigFileDocHandler::endElement(uri, name, qName);
+            note('/' + name);
+            return goesOn;
+        }
+
+        bool characters(QString const& text) override
+        {
+            const bool goesOn = TorkConfigFileDocHandler::characters(text);
+            note("text");
+            return goesOn;
+        }
+
+        QStringList seen;
+
+    private:
+        void note(QString const& what)
+        {
+            const QString flags =
+                QString(isAtStartTag() ? "S" : "") + (m_file.IsExpectingValue() ? "V" : "");
+            seen.append(QString("%1 %2 %3").arg(what).arg(depth()).arg(flags).trimmed());
+        }
+
+        TorkConfigFile& m_file;
+    };
+
+    QFETCH(QByteArray, document);
+    TorkConfigFile file{QString()};
+    for (int i = 0; i < 2; ++i) {
+        QBuffer buffer(&document);
+        Watching handler(file);
+        file.LoadFrom(&buffer, handler);
+        QTEST(handler.seen, "expected");
+    }
+}
+
+// A text that is null is no value, and empties nothing.
+void tst_TorkConfigFileDocHandler::nullTextIsNoValue()
+{
+    class NullTexts : public TorkConfigFileDocHandler
+    {
+    public:
+        using TorkConfigFileDocHandler::TorkConfigFileDocHandler;
+        bool characters(QString const&) override
+        {
+            return TorkConfigFileDocHandler::characters(QString());
+        }
+    };
+
+    TorkConfigFile file{QString()};
+    QByteArray document("<r><s><k>v</k></s></r>");
+    QBuffer buffer(&document);
+    NullTexts handler(&file);
+    QVERIFY(file.LoadFrom(&buffer, handler));
+    QVERIFY(file.HasSection("s"));
+    QCOMPARE(file.keyList("s"), QStringList());
+}
+
+// Also if its handler is still there and would say where the load stopped.
+void tst_TorkConfigFileDocHandler::stepsAfterALoad()
+{
+    TorkConfigFile file{QString()};
+    TorkConfigFileDocHandler handler(&file);
+    QByteArray document("<r><s>");
+    QBuffer buffer(&document);
+    QVERIFY(!file.LoadFrom(&buffer, handler));
+    QCOMPARE(handler.depth(), 2);
+
+    QString name("New");
+    QVERIFY(file.StartElement(name));
+    QVERIFY(!file.HasSection("New"));
+    QCOMPARE(file.sectionList(), QStringList("s"));
 }
 
 QTEST_APPLESS_MAIN(tst_TorkConfigFileDocHandler)

@@ -257,6 +257,10 @@ void tst_TorkConfigFileLoad::rootElementName_data()
     QTest::newRow("another") << QByteArray("<Whatever><s><k>v</k></s></Whatever>") << "s{k=[v]}";
     QTest::newRow("other letter case")
         << QByteArray("<velocorsettings><s><k>v</k></s></velocorsettings>") << "s{k=[v]}";
+    QTest::newRow("section in another letter case")
+        << QByteArray("<VelocorSettings><velocorsettings><k>v</k></velocorsettings>"
+                      "</VelocorSettings>")
+        << "velocorsettings{k=[v]}";
     QTest::newRow("section named like the document's own root element")
         << QByteArray("<r><r><k>v</k></r></r>") << "r{k=[v]}";
 

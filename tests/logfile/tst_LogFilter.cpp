@@ -13,6 +13,10 @@ class tst_LogFilter : public QObject
 
 private slots:
     void filter();
+    void text_data();
+    void text();
+    void errors();
+    void sameText();
 };
 
 void tst_LogFilter::filter()
@@ -44,6 +48,64 @@ void tst_LogFilter::filter()
     QVERIFY(!other.HasSameText(filter));
     QVERIFY(other.SetText("n*", true, false));
     QVERIFY(other.HasSameText(filter));
+}
+
+void tst_LogFilter::text_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<bool>("isExpression");
+    QTest::addColumn<bool>("caseSensitive");
+    QTest::addColumn<QString>("line");
+    QTest::addColumn<bool>("matches");
+    QTest::addColumn<int>("rangeCount");
+
+    QTest::newRow("no text") << "" << false << true << "any" << true << 0;
+    QTest::newRow("no expression") << "" << true << true << "any" << true << 0;
+    QTest::newRow("at the start") << "a" << false << true << "abc" << true << 1;
+    QTest::newRow("at the end") << "c" << false << true << "abc" << true << 1;
+    QTest::newRow("nowhere") << "d" << false << true << "abc" << false << 0;
+    QTest::newRow("another case") << "A" << false << true << "abca" << false << 0;
+    QTest::newRow("any case") << "A" << false << false << "abca" << true << 2;
+    QTest::newRow("expression of another case") << "A." << true << true << "abac" << false << 0;
+    QTest::newRow("expression of any case") << "A." << true << false << "abac" << true << 2;
+    QTest::newRow("a dot as text") << "." << false << true << "a.b" << true << 1;
+    QTest::newRow("a dot as text, nowhere") << "." << false << true << "ab" << false << 0;
+    QTest::newRow("a dot as expression") << "." << true << true << "ab" << true << 2;
+    QTest::newRow("a bracket as text") << "(" << false << true << "a(b" << true << 1;
+}
+
+void tst_LogFilter::text()
+{
+    QFETCH(QString, text);
+    QFETCH(bool, isExpression);
+    QFETCH(bool, caseSensitive);
+    QFETCH(QString, line);
+    LogFilter filter;
+    QVERIFY(filter.SetText(text, isExpression, caseSensitive));
+    QTEST(filter.Matches(line), "matches");
+    QTEST(filter.Ranges(line).size(), "rangeCount");
+}
+
+void tst_LogFilter::errors()
+{
+    QCOMPARE(LogFilter::ErrorOf("a(b)"), QString());
+    const QString told = LogFilter::ErrorOf("a(");
+    QVERIFY2(told.endsWith(" at character 3"), qPrintable(told));
+}
+
+// The same letters are another filter as an expression, or in another case.
+void tst_LogFilter::sameText()
+{
+    LogFilter plain;
+    LogFilter expression;
+    LogFilter anyCase;
+    LogFilter hiding;
+    QVERIFY(plain.SetText("a", false, true) && expression.SetText("a", true, true));
+    QVERIFY(anyCase.SetText("a", false, false) && hiding.SetText("a", false, true));
+    hiding.SetSeverity(LogEntry::Trace, false);
+    QVERIFY(!plain.HasSameText(expression));
+    QVERIFY(!plain.HasSameText(anyCase));
+    QVERIFY(plain.HasSameText(hiding));
 }
 
 QTEST_GUILESS_MAIN(tst_LogFilter)

@@ -19,6 +19,8 @@ private slots:
     void readsWhatQtWrites();
     void order_data();
     void order();
+    void difference_data();
+    void difference();
     void hasDate_data();
     void hasDate();
 };
@@ -134,6 +136,37 @@ void tst_LogTimeReader::order()
     const qint64 first = reader.Read(earlier.constData(), earlier.size()).key;
     QVERIFY(first >= 0);
     QVERIFY(first < reader.Read(later.constData(), later.size()).key);
+}
+
+void tst_LogTimeReader::difference_data()
+{
+    QTest::addColumn<QByteArray>("earlier");
+    QTest::addColumn<QByteArray>("later");
+    QTest::addColumn<int>("milliseconds");
+
+    QTest::newRow("a millisecond")
+        << QByteArray("2025-01-30 10:20:30.122") << QByteArray("2025-01-30 10:20:30.123") << 1;
+    QTest::newRow("a minute's end")
+        << QByteArray("2025-01-30 10:20:59.999") << QByteArray("2025-01-30 10:21:00.000") << 1;
+    QTest::newRow("an hour's end")
+        << QByteArray("2025-01-30 10:59:59.999") << QByteArray("2025-01-30 11:00:00.000") << 1;
+    QTest::newRow("midnight") << QByteArray("2025-01-30 23:59:59.999")
+                              << QByteArray("2025-01-31 00:00:00.000") << 1;
+    QTest::newRow("a day") << QByteArray("2025-01-30 10:20:30.000")
+                           << QByteArray("2025-01-31 10:20:30.000") << 86400000;
+    QTest::newRow("the start of a leap second")
+        << QByteArray("2025-01-30 10:59:59.999") << QByteArray("2025-01-30 10:59:60.000") << 0;
+}
+
+// Entries of threads that overtake each other are told from older ones by a few milliseconds.
+void tst_LogTimeReader::difference()
+{
+    QFETCH(QByteArray, earlier);
+    QFETCH(QByteArray, later);
+    QFETCH(int, milliseconds);
+    const LogTimeReader reader("yyyy-MM-dd hh:mm:ss.z");
+    const qint64 first = reader.Read(earlier.constData(), earlier.size()).key;
+    QCOMPARE(reader.Read(later.constData(), later.size()).key - first, qint64(milliseconds));
 }
 
 void tst_LogTimeReader::hasDate_data()

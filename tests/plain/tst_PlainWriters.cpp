@@ -547,11 +547,23 @@ void tst_PlainWriters::sameAsPlain()
     qInstallMessageHandler(nullptr);
 }
 
+// As WritersWithoutTypes puts them down.
+QStringList CallsWithoutTypes(QStringList calls)
+{
+    for (QString& call : calls) {
+        call.replace(0, call.indexOf('('),
+                     call.startsWith("write(") ? "Write" : "WriteElementValue");
+        call.chop(2);
+        call.replace(call.indexOf('('), 1, ' ');
+    }
+    return calls;
+}
+
 void tst_PlainWriters::sameWithoutTypes()
 {
     using WritersWithoutTypes::Overrides;
     Dice dice(Rounds::seed() + 1);
-    const int count = Rounds::count(1000, 20000);
+    const int count = Rounds::count(1000, 100000);
     for (int i = 0; i < count; ++i) {
         const Steps steps = Sequence(dice);
         const auto overrides = Overrides(dice.below(3));
@@ -576,7 +588,7 @@ void tst_PlainWriters::sameWithoutTypes()
         const Outcome expected = plain(steps, kind, true);
         QCOMPARE(codes, expected.codes);
         QCOMPARE(bytes, expected.bytes);
-        QCOMPARE(calls.size(), expected.calls.size());
+        QCOMPARE(calls, CallsWithoutTypes(expected.calls));
         ++m_sequences;
         m_calls += steps.size();
     }

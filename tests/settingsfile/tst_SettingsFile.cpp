@@ -58,6 +58,10 @@ private slots:
     void losses();
     void lossesOfNames_data();
     void lossesOfNames();
+    void reasons_data();
+    void reasons();
+    void manyLosses_data();
+    void manyLosses();
     void lossesWriteNoFile();
     void sameValues_data();
     void sameValues();
@@ -96,6 +100,8 @@ void tst_SettingsFile::read_data()
         "Line 2: a second section \"S\", merged with the first");
     row("text in a section", "<S>text<a>1</a></S>", "[S] a=1", 1,
         "Line 2: the text \"text\" outside any value");
+    row("long text in a section", "<S>  0123456789 123456789 <a>1</a></S>", "[S] a=1", 1,
+        "Line 2: the text \"0123456789 123456789\" outside any value");
     row("instruction", "<?do it?><S><a>1</a></S>", "[S] a=1", 1,
         "Line 2: the processing instruction \"do\"");
     row("section name beyond ASCII", "<\xC3\xA9><a>1</a></\xC3\xA9>", "[\xEF\xBF\xBD] a=1", 1,
@@ -182,6 +188,10 @@ void tst_SettingsFile::errors()
 void tst_SettingsFile::unreadable()
 {
     const QTemporaryDir folder;
+    QCOMPARE(SettingsFileReader::Read(folder.path()).error, QString("Is a folder"));
+    QCOMPARE(SettingsFileReader::Read(folder.filePath("missing.cfg")).error,
+             QString("No such file or directory"));
+    QCOMPARE(SettingsFileReader::Read("/dev/null").error, QString("Not a regular file"));
     for (QString const& path : {folder.filePath("missing.cfg"), folder.path()}) {
         const SettingsDocument document = SettingsFileReader::Read(path);
         QVERIFY(!document.isReadable);
@@ -271,6 +281,49 @@ void tst_SettingsFile::lossesOfNames()
     document.rootName = "Root";
     document.SetValue(section, key, "v");
     QTEST(SettingsFileWriter::Losses(document), "expected");
+}
+
+void tst_SettingsFile::reasons_data()
+{
+    QTest::addColumn<QString>("value");
+    QTest::addColumn<QString>("reason");
+
+    QTest::newRow("end of CDATA") << "a]]>"
+                                  << "a value with \"]]>\" makes the file unreadable";
+    QTest::newRow("first letter outside Latin-1")
+        << QString(QChar(0x100)) << "characters outside Latin-1 become \"?\"";
+    QTest::newRow("last letter of Latin-1")
+        << QString(QChar(0xff)) << "the value would change when read back";
+    QTest::newRow("first letter outside ASCII")
+        << QString(QChar(0x80)) << "the value would change when read back";
+    QTest::newRow("empty") << ""
+                           << "empty values are not saved";
+    QTest::newRow("null") << QString() << "empty values are not saved";
+    QTest::newRow("placeholder and brackets") << "]]%1"
+                                              << "the value would change when read back";
+}
+
+void tst_SettingsFile::reasons()
+{
+    QFETCH(QString, value);
+    QFETCH(QString, reason);
+    QCOMPARE(SettingsFileWriter::Losses(OneValue(value)), QStringList("S / k: " + reason));
+}
+
+void tst_SettingsFile::manyLosses_data()
+{
+    QTest::addColumn<int>("count");
+    QTest::newRow("as many as are listed") << int(SettingsFileReader::MaximumLosses);
+    QTest::newRow("one more") << int(SettingsFileReader::MaximumLosses) + 1;
+}
+
+void tst_SettingsFile::manyLosses()
+{
+    QFETCH(int, count);
+    const SettingsDocument document =
+        SettingsFileReader::ReadBytes("<R>" + QByteArray("<!--c-->").repeated(count) + "</R>");
+    QCOMPARE(document.lossCount, count);
+    QCOMPARE(document.losses.size(), int(SettingsFileReader::MaximumLosses));
 }
 
 // Neither in the settings folder nor in the temporary one.

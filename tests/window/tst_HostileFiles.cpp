@@ -38,6 +38,7 @@
 #include <atomic>
 #include <cerrno>
 #include <thread>
+#include <utility>
 
 #include <fcntl.h>
 #include <sys/socket.h>
@@ -200,7 +201,10 @@ private slots:
     void valueDialog();
     void valueDialogMark_data();
     void valueDialogMark();
-    void valueDialogUntouched();
+    void otherLineBreaks_data();
+    void otherLineBreaks();
+    void dialogOfOtherLineBreaks_data();
+    void dialogOfOtherLineBreaks();
     void valueDialogPastes();
 
     void reportEndsWithTheLastLine();
@@ -705,15 +709,130 @@ void tst_HostileFiles::valueDialogMark()
     QVERIFY2(heading.contains("only " + mark + " marks"), qPrintable(heading));
 }
 
-// Qt's editor takes each of these for a line break.
-void tst_HostileFiles::valueDialogUntouched()
+void tst_HostileFiles::otherLineBreaks_data()
 {
-    for (int length : {1, Velocor::ValueDialog::MaximumLineLength + 1}) {
-        const QString value = QString(length, 'x') + "\ra\r\nb" + QChar(QChar::ParagraphSeparator);
-        Velocor::ValueDialog dialog("name", value);
+    QTest::addColumn<QString>("lineBreak");
+    QTest::addColumn<int>("length");
+    QTest::addColumn<bool>("inDialog");
+
+    const std::pair<char const*, QString> breaks[] = {
+        {"CR", "\r"},
+        {"CRLF", "\r\n"},
+        {"U+2028", QChar(QChar::LineSeparator)},
+        {"U+2029", QChar(QChar::ParagraphSeparator)},
+    };
+    for (auto const& lineBreak : breaks) {
+        const auto row = [&](char const* where, int length, bool inDialog) {
+            QTest::addRow("%s in %s", lineBreak.first, where)
+                << lineBreak.second << length << inDialog;
+        };
+        row("a short value", 1, false);
+        row("a value of many lines", 1001, true);
+        row("a long line", Velocor::ValueDialog::MaximumLineLength + 1, true);
+    }
+}
+
+// Qt's text widget takes each of these for a line feed, so what it shows cannot be edited. A short
+// value is edited in its cell, which keeps them.
+void tst_HostileFiles::otherLineBreaks()
+{
+    QFETCH(QString, lineBreak);
+    QFETCH(int, length);
+    QFETCH(bool, inDialog);
+    const WindowTest test;
+    const QString value = QString(length, 'x') + lineBreak + 'b';
+    const QString file = test.folder() + "some.cfg";
+    const QByteArray content = WithValue(value.toUtf8());
+    QVERIFY(TestFiles::write(file, content));
+    SettingsEditor editor;
+    editor.Open(file);
+    editor.resize(700, 500);
+    editor.show();
+    const auto stored = [&] {
+        return editor.document().Value("S", "long", "");
+    };
+    QVERIFY(stored() == value);
+
+    auto* tree = editor.findChild<QTreeWidget*>();
+    tree->setFocus();
+    tree->setCurrentItem(tree->topLevelItem(0)->child(0), 1);
+    int shown = 0;
+    if (inDialog) {
+        WindowTest::whenShown<QDialog>([&](QDialog* dialog) {
+            auto* text = dialog->findChild<QPlainTextEdit*>();
+            const QString label = dialog->findChild<QLabel*>()->text();
+            QVERIFY2(label.contains("it cannot be edited here"), qPrintable(label));
+            QVERIFY(text->isReadOnly());
+            QGuiApplication::clipboard()->setText("pasted");
+            text->setFocus();
+            QTest::keyClick(text, Qt::Key_A, Qt::ControlModifier);
+            QTest::keyClicks(text, "z");
+            for (Qt::Key key : {Qt::Key_Return, Qt::Key_Backspace, Qt::Key_Delete})
+                QTest::keyClick(text, key);
+            for (Qt::Key key : {Qt::Key_V, Qt::Key_X})
+                QTest::keyClick(text, key, Qt::ControlModifier);
+            if (dialog->isVisible()) { // unless Enter went on to OK
+                QTest::keyClick(dialog, Qt::Key_Tab);
+                QTest::keyClick(dialog->focusWidget(), Qt::Key_Return);
+            }
+            ++shown;
+        });
+        QTest::keyClick(tree, Qt::Key_F2);
+        QTRY_COMPARE_WITH_TIMEOUT(shown, 1, Patience);
+        QTRY_VERIFY(!QApplication::activeModalWidget());
+    } else {
+        QTest::keyClick(tree, Qt::Key_F2);
+        QTRY_VERIFY(tree->findChild<QLineEdit*>());
+        QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
+        QTRY_VERIFY(!tree->findChild<QLineEdit*>());
+    }
+    QTest::qWait(50);
+    QVERIFY(stored() == value);
+    QVERIFY(!editor.isModified());
+    QVERIFY(TestFiles::read(file) == content);
+
+    if (!inDialog) {
+        QTest::keyClick(tree, Qt::Key_F2);
+        QTRY_VERIFY(tree->findChild<QLineEdit*>());
+        QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_End);
+        QTest::keyClicks(tree->findChild<QLineEdit*>(), "!");
+        QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
+        QTRY_VERIFY(stored() == value + '!');
+    }
+}
+
+void tst_HostileFiles::dialogOfOtherLineBreaks_data()
+{
+    QTest::addColumn<QString>("value");
+    QTest::addColumn<bool>("isReadOnly");
+
+    QTest::newRow("empty") << "" << false;
+    QTest::newRow("line feed") << "a\nb" << false;
+    QTest::newRow("CR alone") << "\r" << true;
+    QTest::newRow("CR at the end") << "a\r" << true;
+    QTest::newRow("CRLF") << "a\r\nb" << true;
+    QTest::newRow("U+2028") << QString("a") + QChar(QChar::LineSeparator) << true;
+    QTest::newRow("U+2029") << QChar(QChar::ParagraphSeparator) + QString("a") << true;
+    QTest::newRow("next line") << QString("a") + QChar(0x85) + 'b' << false;
+    QTest::newRow("form feed") << "a\fb" << false;
+}
+
+// What a widget turns into something else is never returned.
+void tst_HostileFiles::dialogOfOtherLineBreaks()
+{
+    QFETCH(QString, value);
+    QFETCH(bool, isReadOnly);
+    for (QString const& start : {QString(), QString(ValueDialog::MaximumLineLength + 1, 'x')}) {
+        Velocor::ValueDialog dialog("name", start + value);
         dialog.show();
+        auto* text = dialog.findChild<QPlainTextEdit*>();
+        QCOMPARE(text->isReadOnly(), isReadOnly);
         QVERIFY(!dialog.isModified());
-        QVERIFY(dialog.value() == value);
+        QVERIFY(dialog.value() == start + value);
+        QTest::keyClick(text, Qt::Key_Home, Qt::ControlModifier);
+        QTest::keyClicks(text, "z");
+        QCOMPARE(dialog.isModified(), !isReadOnly);
+        QVERIFY(dialog.value() == (isReadOnly ? QString() : QString("z")) + start + value);
     }
 }
 

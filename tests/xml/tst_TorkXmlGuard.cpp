@@ -129,6 +129,11 @@ void tst_TorkXmlGuard::parse_data()
                         QByteArray("&#40;").repeated(TorkXmlMaximumDepth + 1) + "'>%p;",
                     "")
         << false;
+    QTest::newRow("one group more from brackets as hexadecimal references")
+        << Document("<!ENTITY % p '<!ELEMENT r " +
+                        QByteArray("&#x28;").repeated(TorkXmlMaximumDepth + 1) + "'>%p;",
+                    "")
+        << false;
     QTest::newRow("groups begun in a parameter entity and continued in another")
         << Document("<!ENTITY % p '<!ELEMENT r " + QByteArray("(").repeated(600) +
                         "'><!ENTITY % q '" + QByteArray("(").repeated(600) + "'>%p;%q;",
@@ -142,6 +147,8 @@ void tst_TorkXmlGuard::parse_data()
     const QByteArray brackets = QByteArray("(").repeated(5000);
     QTest::newRow("brackets in a comment")
         << Document("<!--" + brackets + "-->" + Groups(1), "") << true;
+    QTest::newRow("brackets in a comment that seems to end")
+        << Document("<!-- -> <!ELEMENT r " + brackets + "-->", "") << true;
     QTest::newRow("brackets in an instruction")
         << Document("<?a " + brackets + "?>" + Groups(1), "") << true;
     QTest::newRow("brackets in the value of an entity")
@@ -225,6 +232,10 @@ void tst_TorkXmlGuard::parse_data()
         << "<r" + Declarations(TorkXmlMaximumPrefixes) + "/>" << true;
     QTest::newRow("one prefix more")
         << "<r" + Declarations(TorkXmlMaximumPrefixes + 1) + "/>" << false;
+    for (char const* space : {"\t", "\n", "\r\n"}) {
+        QTest::addRow("one prefix more, after %s", QByteArray(space).toHex().constData())
+            << "<r" + Declarations(TorkXmlMaximumPrefixes + 1).replace(" ", space) + "/>" << false;
+    }
     QTest::newRow("one prefix more that nothing declares")
         << "<r" + Declarations(TorkXmlMaximumPrefixes) + "><q:a/></r>" << false;
     QTest::newRow("one prefix more in an attribute")
@@ -281,6 +292,12 @@ void tst_TorkXmlGuard::namesTheLimit_data()
     QTest::newRow("elements") << Nested(1001) << "More than 1000 elements are inside each other.";
     QTest::newRow("groups") << Document(Groups(1001), "")
                             << "More than 1000 groups are inside each other in a document type.";
+    for (char const* bracket : {"&#40;", "&#x28;"}) {
+        QTest::addRow("groups from references %s", bracket)
+            << Document("<!ENTITY % p '<!ELEMENT r " + QByteArray(bracket).repeated(1001) + "'>%p;",
+                        "")
+            << "More than 1000 groups are inside each other in a document type.";
+    }
     QTest::newRow("entities") << Document(Entities(1001), "")
                               << "More than 1000 entities are declared.";
     QTest::newRow("long entities")

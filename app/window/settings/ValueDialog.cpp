@@ -83,7 +83,7 @@ protected:
     void keyPressEvent(QKeyEvent* event) override
     {
         const bool isBreak = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
-        if (isBreak && !m_mark.isNull())
+        if (isBreak && !m_mark.isNull() && !isReadOnly())
             insertPlainText(QString(m_mark) + QLatin1Char('\n'));
         else
             QPlainTextEdit::keyPressEvent(event);

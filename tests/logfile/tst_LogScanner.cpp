@@ -1,0 +1,647 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// The scanner over real files that change between two polls. It runs in the test's own thread, so
+// nothing here waits.
+
+#include "app/logfile/LogScanner.h"
+#include "support/DemoLog.h"
+#include "support/TestFiles.h"
+
+#include <QTemporaryDir>
+#include <QtTest>
+
+#include <functional>
+
+#include <sys/stat.h>
+
+using namespace Velocor;
+
+using DemoLog::entry;
+using DemoLog::run;
+using DemoLog::writtenOver;
+
+namespace {
+
+using Change = std::function<bool(QString const&)>;
+
+// Reads a file and keeps what the scanner reports.
+class Reader
+{
+public:
+    explicit Reader(QString const& path) : m_path(path)
+    {
+        QObject::connect(&scanner, &LogScanner::updated,
+                         [this](LogUpdate const& update) { updates.append(update); });
+        QObject::connect(&scanner, &LogScanner::progressed, [this](int request, int percent) {
+            progress.append(qMakePair(request, percent));
+            if (onProgress)
+                onProgress(percent);
+        });
+        QObject::connect(&scanner, &LogScanner::polled, [this] { ++polls; });
+    }
+
+    void Open(int request, LogFilter const& filter = LogFilter(), bool isCurrent = true)
+    {
+        if (isCurrent)
+            scanner.SetCurrentRequest(request);
+        scanner.Open(request, m_path, LogLineParser(), filter);
+    }
+
+    void SetFilter(int request, LogFilter const& filter, bool isCurrent = true)
+    {
+        if (isCurrent)
+            scanner.SetCurrentRequest(request);
+        scanner.SetFilter(request, filter);
+    }
+
+    // The rows of the last update, as the lines of the file that they start at.
+    QStringList Rows() const
+    {
+        QStringList rows;
+        const QByteArray file = TestFiles::read(m_path);
+        for (qint64 start : updates.last().rows->starts) {
+            const int at = static_cast<int>(start);
+            rows.append(at < 0 ? QString("[heading]")
+                               : QString(file.mid(at, file.indexOf('\n', at) - at)));
+        }
+        return rows;
+    }
+
+    LogScanner scanner;
+    QVector<LogUpdate> updates;
+    QVector<QPair<int, int>> progress;
+    std::function<void(int)> onProgress;
+    int polls = 0;
+
+private:
+    QString m_path;
+};
+
+QStringList Lines(QByteArray const& text)
+{
+    QStringList lines = QString(text).split('\n');
+    lines.removeLast();
+    return lines;
+}
+
+bool SetTime(QString const& path, QDateTime const& time)
+{
+    QFile file(path);
+    return file.open(QIODevice::ReadWrite) &&
+           file.setFileTime(time, QFileDevice::FileModificationTime);
+}
+
+LogFilter With(QString const& text)
+{
+    LogFilter filter;
+    filter.SetText(text, false, true);
+    return filter;
+}
+
+// Five entries of a run, longer than what the scanner compares at each end of a file.
+QByteArray Long(char const* first, char const* middle, char const* last)
+{
+    const QString padding(300, 'p');
+    QByteArray text;
+    int second = 0;
+    for (char const* word : {first, "b", middle, "d", last})
+        text +=
+            entry(QTime(9, 0, second++).toString("hh:mm:ss.zzz"), "Trace", word + padding + word);
+    return text;
+}
+
+} // namespace
+
+Q_DECLARE_METATYPE(Change)
+
+class tst_LogScanner : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void init();
+    void reportsWhatItRead();
+    void changes_data();
+    void changes();
+    void unchangedFiles_data();
+    void unchangedFiles();
+    void oneUpdateForManyChanges();
+    void missingFiles_data();
+    void missingFiles();
+    void fileComesBack();
+    void noRegularFile_data();
+    void noRegularFile();
+    void sizeIsUnknown();
+    void progress();
+    void obsoleteOpenReadsNothing();
+    void pollWithoutAFile();
+    void cancelledRead();
+    void cancelledSecondRead();
+    void cancelledPoll();
+    void filters_data();
+    void filters();
+    void obsoleteFilter_data();
+    void obsoleteFilter();
+    void sameTextReadsNothing();
+    void obsoleteFilterOfAMissingFile();
+
+private:
+    std::unique_ptr<QTemporaryDir> m_folder;
+    QString m_file;
+};
+
+void tst_LogScanner::init()
+{
+    m_folder = std::make_unique<QTemporaryDir>();
+    m_file = m_folder->filePath("app.log");
+}
+
+void tst_LogScanner::reportsWhatItRead()
+{
+    const QByteArray text = "2025-03-03 09:02:11.031 Warning dT:[250] hello\nmore\n";
+    QVERIFY(TestFiles::write(m_file, text));
+    Reader reader(m_file);
+    reader.Open(3);
+    QCOMPARE(reader.updates.size(), 1);
+    LogUpdate const& update = reader.updates.first();
+    QCOMPARE(update.request, 3);
+    QVERIFY(update.isReset && update.exists && update.hasElapsed);
+    QCOMPARE(update.error, QString());
+    QCOMPARE(update.lines, size_t(2));
+    QCOMPARE(reader.Rows(), Lines(text));
+    QCOMPARE(reader.polls, 0);
+}
+
+void tst_LogScanner::changes_data()
+{
+    QTest::addColumn<QByteArray>("before");
+    QTest::addColumn<QByteArray>("after");
+    QTest::addColumn<bool>("isReset");
+
+    const QByteArray five = run(5, QTime(9, 0), "x");
+    QTest::newRow("grows") << five << run(8, QTime(9, 0), "x") << false;
+    QTest::newRow("an incomplete line is completed")
+        << QByteArray(five + "2025-03-03 09:00:05.000 Tra")
+        << QByteArray(five + entry("09:00:05.000", "Trace", "x 5")) << false;
+    QTest::newRow("another end of an incomplete line")
+        << QByteArray(five + "2025-03-03 09:00:05.000 Tra")
+        << QByteArray(five + "2025-03-03 09:00:05.000 Error y\n") << false;
+    QTest::newRow("shrinks to nothing") << five << QByteArray() << true;
+    QTest::newRow("shrinks by a line") << five << run(4, QTime(9, 0), "x") << true;
+    QTest::newRow("shrinks by a byte") << five << five.left(five.size() - 1) << true;
+    QTest::newRow("another of the same size") << five << run(5, QTime(9, 0), "y") << true;
+    QTest::newRow("another that is longer") << five << run(9, QTime(10, 0), "y") << true;
+    QTest::newRow("another that begins with the same line")
+        << five << QByteArray(run(1, QTime(9, 0), "x") + run(6, QTime(10, 0), "y")) << true;
+    QTest::newRow("a line is put in front") << five << QByteArray("first\n" + five) << true;
+    QTest::newRow("starts differently and ends the same way")
+        << Long("a", "c", "e") << Long("A", "c", "e") + "new\n"
+        << true;
+    QTest::newRow("starts the same way and ends differently")
+        << Long("a", "c", "e") << Long("a", "c", "E") + "new\n"
+        << true;
+    QTest::newRow("starts with a part of what it was")
+        << five << five.left(30) + five.mid(30).toUpper() + "new\n"
+        << true;
+    const QByteArray older = run(20, QTime(17, 0), "older", true);
+    QTest::newRow("a newer run overwrites an older one")
+        << writtenOver(older, run(3, QTime(9, 0), "n"))
+        << writtenOver(older, run(6, QTime(9, 0), "n")) << false;
+    const QByteArray longRun = run(30000, QTime(1, 0), "older", true); // more than one slice
+    QTest::newRow("a newer run overwrites a long older one")
+        << writtenOver(longRun, run(3, QTime(9, 0), "n"))
+        << writtenOver(longRun, run(6, QTime(9, 0), "n")) << false;
+    QTest::newRow("a line takes the place of one as long")
+        << writtenOver(run(20, QTime(17, 0), "a", true), run(3, QTime(9, 0), "b"))
+        << writtenOver(run(20, QTime(17, 0), "a", true), run(4, QTime(9, 0), "b")) << false;
+    const QByteArray setBack = run(5, QTime(9, 0), "x") + run(3, QTime(8, 0), "x");
+    QTest::newRow("grows after the clock was set back")
+        << setBack << QByteArray(setBack + entry("08:00:07.000", "Trace", "x")) << false;
+    QTest::newRow("an incomplete line is completed after the clock was set back")
+        << setBack.left(setBack.size() - 9) << setBack << false;
+    QTest::newRow("an older run loses its end")
+        << writtenOver(older, run(3, QTime(9, 0), "n"))
+        << writtenOver(older.left(older.size() - 100), run(3, QTime(9, 0), "n")) << true;
+}
+
+// Both in place and by putting another file there.
+void tst_LogScanner::changes()
+{
+    QFETCH(QByteArray, before);
+    QFETCH(QByteArray, after);
+    for (bool byRename : {false, true}) {
+        QVERIFY(TestFiles::write(m_file, before));
+        Reader reader(m_file);
+        reader.Open(1);
+        const size_t rowsBefore = reader.updates.last().rows->size();
+        if (byRename) {
+            QVERIFY(TestFiles::write(m_file + ".new", after));
+            QVERIFY(QFile::remove(m_file) && QFile::rename(m_file + ".new", m_file));
+        } else {
+            QVERIFY(TestFiles::write(m_file, after));
+        }
+        reader.scanner.Poll();
+        QCOMPARE(reader.polls, 1);
+        QCOMPARE(reader.updates.size(), 2);
+        QTEST(reader.updates.last().isReset, "isReset");
+        Reader fresh(m_file);
+        fresh.Open(1);
+        QCOMPARE(reader.Rows(), fresh.Rows());
+        QCOMPARE(reader.updates.last().lines, fresh.updates.last().lines);
+        QCOMPARE(reader.updates.last().request, 1);
+        if (!reader.updates.last().isReset) {
+            LogUpdate const& update = reader.updates.last();
+            QVERIFY(update.rows->size() + update.removed >= rowsBefore);
+            QVERIFY(update.inserted + update.removed + update.changedTail > 0 ||
+                    update.rows->size() > rowsBefore);
+        }
+    }
+}
+
+void tst_LogScanner::unchangedFiles_data()
+{
+    QTest::addColumn<int>("secondsAgo");
+    QTest::addColumn<int>("later");
+    QTest::addColumn<bool>("isShorter");
+    QTest::addColumn<bool>("isNoticed");
+
+    QTest::newRow("changed again within the same tick of the clock") << 0 << 0 << false << true;
+    QTest::newRow("by its size and time the same, long ago") << 3600 << 0 << false << false;
+    QTest::newRow("by its size and time the same, in the future") << -3600 << 0 << false << false;
+    QTest::newRow("of another time, long ago") << 3600 << 60 << false << true;
+    QTest::newRow("of an earlier time") << 3600 << -60 << false << true;
+    QTest::newRow("of another size, long ago") << 3600 << 0 << true << true;
+}
+
+// A file is read again if its size or time is another, or if its time is too recent to tell.
+void tst_LogScanner::unchangedFiles()
+{
+    QFETCH(int, secondsAgo);
+    QFETCH(int, later);
+    QFETCH(bool, isShorter);
+    QFETCH(bool, isNoticed);
+    const QDateTime time = QDateTime::currentDateTime().addSecs(-secondsAgo);
+    QVERIFY(TestFiles::write(m_file, run(5, QTime(9, 0), "x")));
+    QVERIFY(SetTime(m_file, time));
+    Reader reader(m_file);
+    reader.Open(1);
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 1);
+
+    const QByteArray after = run(isShorter ? 4 : 5, QTime(9, 0), "y");
+    QVERIFY(TestFiles::write(m_file, after));
+    QVERIFY(SetTime(m_file, time.addSecs(later)));
+    reader.scanner.Poll();
+    QCOMPARE(reader.polls, 2);
+    QCOMPARE(reader.updates.size(), isNoticed ? 2 : 1);
+    if (isNoticed)
+        QCOMPARE(reader.Rows(), Lines(after));
+}
+
+void tst_LogScanner::oneUpdateForManyChanges()
+{
+    QVERIFY(TestFiles::write(m_file, run(2, QTime(9, 0), "x")));
+    Reader reader(m_file);
+    reader.Open(1);
+    for (int i = 3; i < 9; ++i)
+        QVERIFY(TestFiles::write(m_file, run(i, QTime(9, 0), "x")));
+    for (int i = 0; i < 3; ++i)
+        reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 2);
+    QCOMPARE(reader.polls, 3);
+    QCOMPARE(reader.Rows(), Lines(run(8, QTime(9, 0), "x")));
+}
+
+void tst_LogScanner::missingFiles_data()
+{
+    QTest::addColumn<bool>("existsFirst");
+    QTest::newRow("missing from the start") << false;
+    QTest::newRow("removed") << true;
+}
+
+void tst_LogScanner::missingFiles()
+{
+    QFETCH(bool, existsFirst);
+    if (existsFirst)
+        QVERIFY(TestFiles::write(m_file, run(5, QTime(9, 0), "old")));
+    Reader reader(m_file);
+    reader.Open(7);
+    QFile::remove(m_file);
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), existsFirst ? 2 : 1);
+    QVERIFY(reader.updates.last().isReset && !reader.updates.last().exists);
+    QCOMPARE(reader.updates.last().rows->size(), size_t(0));
+    QCOMPARE(reader.updates.last().lines, size_t(0));
+    QCOMPARE(reader.updates.last().error, QString()); // a missing file is none
+    QCOMPARE(reader.updates.last().request, 7);
+
+    // That is told once, and the file when it is there again.
+    const int before = reader.updates.size();
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), before);
+    const QByteArray text = run(2, QTime(9, 0), "new");
+    QVERIFY(TestFiles::write(m_file, text));
+    QVERIFY(SetTime(m_file, QDateTime::currentDateTime().addSecs(-3600)));
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), before + 1);
+    QVERIFY(reader.updates.last().isReset && reader.updates.last().exists);
+    QCOMPARE(reader.Rows(), Lines(text));
+    QCOMPARE(reader.polls, 3);
+}
+
+// By its size and time it is what was read, but that is no longer known.
+void tst_LogScanner::fileComesBack()
+{
+    QVERIFY(TestFiles::write(m_file, run(5, QTime(9, 0), "x")));
+    QVERIFY(SetTime(m_file, QDateTime::currentDateTime().addSecs(-3600)));
+    Reader reader(m_file);
+    reader.Open(1);
+    QVERIFY(QFile::rename(m_file, m_file + ".away"));
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.last().rows->size(), size_t(0));
+    QVERIFY(QFile::rename(m_file + ".away", m_file));
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 3);
+    QCOMPARE(reader.updates.last().rows->size(), size_t(5));
+}
+
+void tst_LogScanner::noRegularFile_data()
+{
+    QTest::addColumn<Change>("put");
+
+    QTest::newRow("a pipe") << Change(
+        [](QString const& path) { return mkfifo(QFile::encodeName(path).constData(), 0600) == 0; });
+    QTest::newRow("a folder") << Change([](QString const& path) { return QDir().mkpath(path); });
+    QTest::newRow("a device") << Change(
+        [](QString const& path) { return QFile::link("/dev/zero", path); });
+}
+
+// Opened, or put in the place of a file that is open. Opening a pipe would wait for a writer.
+void tst_LogScanner::noRegularFile()
+{
+    QFETCH(Change, put);
+    QVERIFY(put(m_file));
+    Reader reader(m_file);
+    reader.Open(1);
+    QCOMPARE(reader.updates.size(), 1);
+    QVERIFY(!reader.updates.last().exists);
+    QCOMPARE(reader.updates.last().error, QString("Not a regular file"));
+
+    const QString other = m_folder->filePath("other.log");
+    QVERIFY(TestFiles::write(other, run(5, QTime(9, 0), "x")));
+    Reader second(other);
+    second.Open(1);
+    QVERIFY(QFile::remove(other) && put(other));
+    second.scanner.Poll();
+    QCOMPARE(second.updates.size(), 2);
+    QVERIFY(!second.updates.last().exists);
+    QCOMPARE(second.updates.last().error, QString("Not a regular file"));
+    QCOMPARE(second.updates.last().rows->size(), size_t(0));
+
+    // The error is gone with its cause.
+    QVERIFY(QFile::remove(other) || QDir().rmdir(other));
+    QVERIFY(TestFiles::write(other, run(3, QTime(9, 0), "x")));
+    second.scanner.Poll();
+    QCOMPARE(second.updates.last().error, QString());
+    QCOMPARE(second.updates.last().rows->size(), size_t(3));
+}
+
+// Files of the system are regular files without a size.
+void tst_LogScanner::sizeIsUnknown()
+{
+    const QString path = "/proc/self/status";
+    if (QFileInfo(path).size() != 0 || !QFileInfo(path).isFile())
+        QSKIP("no such file here");
+    Reader reader(path);
+    reader.Open(1);
+    QVERIFY(reader.updates.last().exists);
+    QVERIFY(reader.updates.last().lines > 5);
+}
+
+void tst_LogScanner::progress()
+{
+    // Twenty slices and one byte: progress is reported from ten percent to ten percent.
+    QVERIFY(TestFiles::write(m_file, QByteArray((20 << 20) + 1, 'x')));
+    Reader reader(m_file);
+    reader.Open(4);
+    QVector<QPair<int, int>> expected;
+    for (int percent : {14, 24, 34, 44, 54, 64, 74, 84, 94})
+        expected.append(qMakePair(4, percent));
+    QCOMPARE(reader.progress, expected);
+    QCOMPARE(reader.updates.last().lines, size_t(1));
+}
+
+void tst_LogScanner::obsoleteOpenReadsNothing()
+{
+    QVERIFY(TestFiles::write(m_file, run(5, QTime(9, 0), "x")));
+    Reader reader(m_file);
+    reader.scanner.SetCurrentRequest(2);
+    reader.Open(1, LogFilter(), false);
+    QCOMPARE(reader.updates.size(), 0);
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 0);
+    QCOMPARE(reader.polls, 1);
+    reader.Open(2);
+    QCOMPARE(reader.updates.size(), 1);
+
+    QVERIFY(QFile::remove(m_file)); // that is not reported for it either
+    reader.scanner.SetCurrentRequest(4);
+    reader.Open(3, LogFilter(), false);
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 1);
+    QCOMPARE(reader.polls, 2);
+}
+
+void tst_LogScanner::pollWithoutAFile()
+{
+    Reader reader(m_file);
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 0);
+    QCOMPARE(reader.polls, 1);
+}
+
+// A request that is superseded while its file is read is never answered.
+void tst_LogScanner::cancelledRead()
+{
+    QVERIFY(TestFiles::write(m_file, QByteArray(3 << 20, 'x') + '\n'));
+    Reader reader(m_file);
+    reader.onProgress = [&](int) {
+        reader.scanner.SetCurrentRequest(2);
+    };
+    reader.Open(1);
+    QCOMPARE(reader.progress.size(), 1);
+    QCOMPARE(reader.updates.size(), 0);
+    reader.onProgress = nullptr;
+
+    // If it becomes current again, the next poll reads the whole file.
+    reader.scanner.SetCurrentRequest(1);
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 1);
+    QVERIFY(reader.updates.last().isReset);
+    QCOMPARE(reader.updates.last().lines, size_t(1));
+}
+
+// The file looks unchanged, but not all of it has been read for the later request.
+void tst_LogScanner::cancelledSecondRead()
+{
+    QVERIFY(TestFiles::write(m_file, QByteArray(3 << 20, 'x') + '\n'));
+    QVERIFY(SetTime(m_file, QDateTime::currentDateTime().addSecs(-3600)));
+    Reader reader(m_file);
+    reader.Open(1);
+    QCOMPARE(reader.updates.size(), 1);
+    reader.onProgress = [&](int) {
+        reader.scanner.SetCurrentRequest(3);
+    };
+    reader.Open(2);
+    reader.onProgress = nullptr;
+    QCOMPARE(reader.updates.size(), 1);
+    reader.scanner.SetCurrentRequest(2);
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 2);
+    QCOMPARE(reader.updates.last().lines, size_t(1));
+}
+
+void tst_LogScanner::cancelledPoll()
+{
+    const QByteArray start = run(5, QTime(9, 0), "x");
+    QVERIFY(TestFiles::write(m_file, start));
+    Reader reader(m_file);
+    reader.Open(1);
+    QVERIFY(TestFiles::write(m_file, start + QByteArray(3 << 20, 'x') + '\n'));
+    QVERIFY(SetTime(m_file, QDateTime::currentDateTime().addSecs(-3600)));
+    reader.onProgress = [&](int) {
+        reader.scanner.SetCurrentRequest(2);
+    };
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 1);
+    QCOMPARE(reader.polls, 1);
+    reader.onProgress = nullptr;
+
+    reader.SetFilter(2, LogFilter());
+    QCOMPARE(reader.updates.size(), 2);
+    QCOMPARE(reader.updates.last().lines, size_t(6));
+    QCOMPARE(reader.updates.last().request, 2);
+}
+
+void tst_LogScanner::filters_data()
+{
+    QTest::addColumn<QString>("first");
+    QTest::addColumn<QString>("second");
+    QTest::addColumn<bool>("hidesTraces");
+    QTest::addColumn<QStringList>("rows");
+
+    const QStringList all = Lines(run(6, QTime(9, 0), "x"));
+    QTest::newRow("the same") << ""
+                              << "" << false << all;
+    QTest::newRow("another text") << ""
+                                  << "x 3" << false << QStringList(all.at(3));
+    QTest::newRow("no text any more") << "x 3"
+                                      << "" << false << all;
+    QTest::newRow("another severity") << ""
+                                      << "" << true << QStringList(all.at(5));
+    QTest::newRow("another severity, same text") << "x 3"
+                                                 << "x 3" << true << QStringList();
+    QTest::newRow("both") << "x 3"
+                          << "x 5" << true << QStringList(all.at(5));
+}
+
+// A filter is answered with all rows, even if they are the same, and later lines are filtered too.
+void tst_LogScanner::filters()
+{
+    QFETCH(QString, first);
+    QFETCH(QString, second);
+    QFETCH(bool, hidesTraces);
+    QVERIFY(TestFiles::write(m_file, run(6, QTime(9, 0), "x")));
+    Reader reader(m_file);
+    reader.Open(1, With(first));
+    LogFilter filter = With(second);
+    filter.SetSeverity(LogEntry::Trace, !hidesTraces);
+    reader.SetFilter(2, filter);
+    QCOMPARE(reader.updates.size(), 2);
+    QVERIFY(reader.updates.last().isReset);
+    QCOMPARE(reader.updates.last().request, 2);
+    QTEST(reader.Rows(), "rows");
+
+    QVERIFY(TestFiles::write(m_file, run(6, QTime(9, 0), "x") +
+                                         entry("10:00:00.000", "Error", "x 3 x 5 later")));
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 3);
+    QVERIFY(!reader.updates.last().isReset);
+    QVERIFY(reader.Rows().last().endsWith("later"));
+}
+
+void tst_LogScanner::obsoleteFilter_data()
+{
+    QTest::addColumn<QString>("obsolete");
+    QTest::addColumn<QString>("last");
+    QTest::addColumn<QStringList>("rows");
+
+    const QStringList all = Lines(run(6, QTime(9, 0), "x"));
+    QTest::newRow("its text comes again") << "x 3"
+                                          << "x 3" << QStringList(all.at(3));
+    QTest::newRow("another text follows") << "x 3"
+                                          << "x 4" << QStringList(all.at(4));
+    QTest::newRow("the text before it comes again") << "x 3"
+                                                    << "" << all;
+    QTest::newRow("no text at all") << ""
+                                    << "" << all;
+}
+
+// Nothing is searched for a filter that is already superseded.
+void tst_LogScanner::obsoleteFilter()
+{
+    QFETCH(QString, obsolete);
+    QFETCH(QString, last);
+    QVERIFY(TestFiles::write(m_file, run(6, QTime(9, 0), "x")));
+    QVERIFY(SetTime(m_file, QDateTime::currentDateTime().addSecs(-3600)));
+    Reader reader(m_file);
+    reader.Open(1);
+    reader.scanner.SetCurrentRequest(3);
+    reader.SetFilter(2, With(obsolete), false);
+    QCOMPARE(reader.updates.size(), 1);
+    reader.SetFilter(3, With(last));
+    QCOMPARE(reader.updates.size(), 2);
+    QTEST(reader.Rows(), "rows");
+
+    // The next poll makes up for one that is never superseded after all.
+    reader.scanner.SetCurrentRequest(5);
+    reader.SetFilter(4, With("x 1"), false);
+    reader.scanner.SetCurrentRequest(4);
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 3);
+    QCOMPARE(reader.Rows(), QStringList(Lines(run(6, QTime(9, 0), "x")).at(1)));
+}
+
+// Filters of the same text do without the file, even if one of them is superseded.
+void tst_LogScanner::sameTextReadsNothing()
+{
+    QVERIFY(TestFiles::write(m_file, run(6, QTime(9, 0), "x")));
+    Reader reader(m_file);
+    reader.Open(1);
+    QVERIFY(QFile::remove(m_file));
+    LogFilter filter;
+    filter.SetSeverity(LogEntry::Trace, false);
+    reader.scanner.SetCurrentRequest(3);
+    reader.SetFilter(2, filter, false);
+    reader.SetFilter(3, filter);
+    QCOMPARE(reader.updates.size(), 2);
+    QVERIFY(reader.updates.last().exists);
+    QCOMPARE(reader.updates.last().rows->size(), size_t(1));
+}
+
+void tst_LogScanner::obsoleteFilterOfAMissingFile()
+{
+    Reader reader(m_file);
+    reader.Open(1);
+    reader.scanner.SetCurrentRequest(3);
+    reader.SetFilter(2, With("x"), false);
+    reader.scanner.SetCurrentRequest(2);
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 2);
+    QVERIFY(!reader.updates.last().exists);
+    QCOMPARE(reader.updates.last().request, 2);
+}
+
+QTEST_GUILESS_MAIN(tst_LogScanner)
+#include "tst_LogScanner.moc"
