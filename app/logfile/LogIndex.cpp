@@ -20,8 +20,7 @@ constexpr size_t MaximumReread = 1000;
 // Concurrent threads may write their entries in a different order than they stamped them.
 constexpr qint64 Tolerance = 20; // milliseconds
 
-// Twelve hours, in the units of LogTimeReader keys.
-constexpr qint64 HalfADay = qint64(12) * 60 * 61 * 1000;
+constexpr qint64 HalfADay = qint64(12) * 60 * 60 * 1000; // milliseconds
 
 template <class T>
 void MoveTail(std::vector<T>& from, size_t first, std::vector<T>& to)
@@ -65,10 +64,6 @@ void LogIndex::forgetFrom(size_t line)
     if (line == 0) {
         m_runs[0] = Run();
         m_newestIsTimed = false;
-    } else if (m_newestIsTimed && m_newestLastTimed >= line) {
-        // The incomplete line that is read again was the timed one.
-        m_newestLastTimed = line - 1;
-        m_newestLastTime = m_runs[0].firstTime;
     }
     m_runHasTimed = m_newestIsTimed;
     m_lastTimed = m_newestLastTimed;
@@ -173,7 +168,7 @@ bool LogIndex::addLine(char const* line, int length, bool complete)
     }
     m_marks.push_back(markOf(parts, line, std::min(length, LineLimit)));
     m_starts.push_back(m_lineStart);
-    if (parts.timeKey >= 0)
+    if (parts.timeKey >= 0 && complete) // an incomplete line is read again
         noteTime(parts);
     return true;
 }
@@ -215,6 +210,8 @@ bool LogIndex::joinKnownLines(qint64 start)
         return false;
 
     const auto first = static_cast<size_t>(found - m_knownStarts.begin());
+    if (!(m_knownMarks[first] & LogRows::Timed))
+        return false; // the rest of an entry was there: this one is new, by a clock set back
     const size_t joint = m_starts.size();
     AppendTail(m_starts, m_knownStarts, first);
     AppendTail(m_marks, m_knownMarks, first);

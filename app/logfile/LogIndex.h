@@ -24,7 +24,9 @@ namespace Velocor {
 ///
 /// A seam is where an entry is older than both the previous entry and the first entry of its run.
 /// As the newest run writes more entries, its seam moves; Begin() returns to the last entry before
-/// it, and Feed() stops as soon as it reaches a known line.
+/// it, and Feed() stops as soon as it reaches a known line. So all passes must be over one file
+/// that only its newest run changes, and that does not grow while older runs are left in it;
+/// otherwise use a new index.
 ///
 /// Pure: the caller supplies the bytes. One thread at a time.
 ///

@@ -168,14 +168,33 @@ void LogScanner::Poll()
     } else if (opened && (!m_complete || !m_exists || !isSameFile(file))) {
         readFromStart();
     } else if (opened) {
-        m_complete = false; // until the pass is over
-        if (readFrom(file, m_index.Begin()))
-            report(false);
+        readOn(file);
     }
     Q_EMIT polled(); // NOLINT(readability-misleading-indentation): Q_EMIT is empty
 }
 
-void LogScanner::report(bool isReset)
+// Reads what is new. Growth while older runs are left, or a change without anything new, is by
+// entries that the index takes for those of an older run, and is found by reading everything again.
+void LogScanner::readOn(QFile& file)
+{
+    m_complete = false; // until the pass is over
+    const QDateTime modified = m_modified;
+    const bool hasGrown = file.size() != m_size;
+    if (hasGrown && m_index.runs() > 1)
+        m_index = LogIndex(m_parser, m_filter);
+    if (!readFrom(file, m_index.Begin()) || report(false))
+        return;
+
+    if (!hasGrown && m_modified != modified) {
+        m_complete = false;
+        m_index = LogIndex(m_parser, m_filter);
+        if (readFrom(file, m_index.Begin()))
+            report(false);
+    }
+}
+
+// Returns whether anything is new.
+bool LogScanner::report(bool isReset)
 {
     LogUpdate update;
     update.request = m_request;
@@ -183,14 +202,17 @@ void LogScanner::report(bool isReset)
     if (!isReset)
         update.Compare(*m_rows);
     const bool nothingNew = !update.isReset && update.removed == 0 && update.inserted == 0 &&
-                            update.changedTail == 0 && update.rows->size() == m_rows->size();
+                            update.changedTail == 0 && update.rows->size() == m_rows->size() &&
+                            m_index.size() == m_lines;
     m_rows = update.rows;
+    m_lines = m_index.size();
     update.exists = m_exists;
     update.error = m_error;
-    update.lines = m_index.size();
+    update.lines = m_lines;
     update.hasElapsed = m_index.hasElapsed();
     if (!nothingNew)
         Q_EMIT updated(update);
+    return !nothingNew;
 }
 
 } // namespace Velocor

@@ -11,6 +11,7 @@
 #include <QString>
 
 #include <atomic>
+#include <memory>
 
 class QFile;
 
@@ -55,11 +56,12 @@ private:
     bool isCurrentRequest() const { return m_currentRequest == m_request; }
     void readFromStart();
     bool readFrom(QFile& file, qint64 offset);
+    void readOn(QFile& file);
     bool looksUnchanged() const;
     bool isSameFile(QFile& file) const;
     void noteFile(QFile& file);
     void reportMissing();
-    void report(bool isReset);
+    bool report(bool isReset);
     void startOver();
 
     std::atomic<int> m_currentRequest{0};
@@ -78,6 +80,7 @@ private:
     QByteArray m_head;
     QByteArray m_anchor;
     qint64 m_anchorEnd = 0;
+    size_t m_lines = 0; // as reported
 };
 
 } // namespace Velocor
