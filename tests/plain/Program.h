@@ -101,20 +101,21 @@ public:
         return result;
     }
 
-    /// How the step reads. `text` is only called when the program is printed.
+    /// How the step reads; what it does next is appended. `text` is only called when the program is
+    /// printed.
     template <class Text>
     void tell(Text text)
     {
         if (m_isTold)
-            m_told = text();
+            m_told.append(text());
     }
-    QString const& told() const { return m_told; }
+    QString told() const { return m_told.isEmpty() ? "(nothing)" : m_told.join("; "); }
 
 private:
     Step m_step;
     bool m_isTold;
     int m_drawn = 0;
-    QString m_told = QStringLiteral("(nothing)");
+    QStringList m_told;
 };
 
 /// A text as it is written in a program.

@@ -545,7 +545,7 @@ private:
             same("ReadColor()", m_store.ReadColor(section, item, color), plain.size() == 3);
             QColor expected(1, 2, 3, 4);
             if (plain.size() == 3)
-                expected = QColor(plain[0], plain[1], plain[2]);
+                expected.setRgb(plain[0], plain[1], plain[2]);
             same("value", color.name(QColor::HexArgb), expected.name(QColor::HexArgb));
             same("valid", color.isValid(), expected.isValid());
             break;
