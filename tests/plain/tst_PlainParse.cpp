@@ -27,8 +27,8 @@ private slots:
 namespace {
 
 // What a state does depends on names alone: a state "unknowing" knows no child, every state handles
-// a child "inplace" itself, gives "other" to a state with another name, and skips a child "skipped".
-// At its end, "pushes" pushes another state, and "leaves" takes itself off the stack.
+// a child "inplace" itself, gives "other" to a state with another name, and skips a child
+// "skipped". At its end, "pushes" pushes another state, and "leaves" takes itself off the stack.
 class State : public TorkXml_ParseState_Base
 {
 public:
@@ -253,8 +253,9 @@ protected:
 
     QString name()
     {
-        static char const* const names[] = {"a", "b", "a", "b", "inplace", "unknowing", "skipped",
-                                            "other", "pushes", "leaves", "renamed"};
+        static char const* const names[] = {"a",       "b",         "a",       "b",
+                                            "inplace", "unknowing", "skipped", "other",
+                                            "pushes",  "leaves",    "renamed"};
         return m_draws->oneOf(names);
     }
 
@@ -342,8 +343,8 @@ private:
                 m_plain.remove(m_plain.states.size() - 1);
         } else {
             tell("PushState(new State(#))", element);
-            same("PushState()",
-                 m_manager->PushState(new State(element, m_manager.get(), m_events)), true);
+            same("PushState()", m_manager->PushState(new State(element, m_manager.get(), m_events)),
+                 true);
             m_plain.states.append({element, false});
         }
     }

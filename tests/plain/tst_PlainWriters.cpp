@@ -347,8 +347,10 @@ public:
 
     int indent()
     {
-        static const QVector<int> rare = {-1, 0, 2, 3, -5, 40, 700};
-        return chance(75) ? 1 : oneOf(rare);
+        static const QVector<int> rare = {-1, 0, 2, 3, -5, 40};
+        if (chance(75))
+            return 1;
+        return below(500) == 499 ? 700 : oneOf(rare); // indentation as deep is slow
     }
 
     Step step()
