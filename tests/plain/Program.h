@@ -14,10 +14,16 @@
 #include <QtTest>
 
 #include <algorithm>
+#include <csignal>
 #include <cstdio>
 #include <optional>
 #include <utility>
 #include <vector>
+
+#ifdef Q_OS_UNIX
+#include <sys/wait.h>
+#include <unistd.h>
+#endif
 
 /// Random programs of calls, run on a component and on its plain model, and the shortest program
 /// that tells the two apart.
@@ -44,6 +50,9 @@
 /// out. On a failure, everything is left out without which the two still differ, and the remaining
 /// arguments become as simple as they can be: so let the simplest choice be the one for a draw of
 /// 0.
+///
+/// A program that crashes prints its seed. With that and `VELOCOR_FORK=1` each program runs in a
+/// child process, and the shortest that crashes is found, too.
 namespace Program {
 
 /// One step: a number from which its draws derive, and which of its draws are 0 instead.
@@ -71,7 +80,9 @@ inline quint64 mixed(quint64 number)
 class Draws
 {
 public:
-    explicit Draws(Step const& step, bool isTold = false) : m_step(step), m_isTold(isTold) {}
+    enum Telling { Silent, Kept, Printed };
+
+    explicit Draws(Step const& step, Telling telling = Silent) : m_step(step), m_telling(telling) {}
 
     /// A number from 0 to `limit` - 1.
     int below(int limit)
@@ -106,14 +117,22 @@ public:
     template <class Text>
     void tell(Text text)
     {
-        if (m_isTold)
+        if (m_telling == Kept)
             m_told.append(text());
+        else if (m_telling == Printed)
+            print(text());
     }
     QString told() const { return m_told.isEmpty() ? "(nothing)" : m_told.join("; "); }
 
 private:
+    static void print(QString const& text)
+    {
+        std::printf("    %s\n", qPrintable(text));
+        std::fflush(stdout);
+    }
+
     Step m_step;
-    bool m_isTold;
+    Telling m_telling;
     int m_drawn = 0;
     QStringList m_told;
 };
@@ -197,11 +216,11 @@ struct Failure
 ///
 /// @return the difference; empty if there is none
 template <class APair>
-QString run(Steps& steps, QStringList* told = nullptr)
+QString run(Steps& steps, Draws::Telling telling = Draws::Silent, QStringList* told = nullptr)
 {
     APair pair;
     for (size_t i = 0; i < steps.size(); ++i) {
-        Draws draws(steps[i], told != nullptr);
+        Draws draws(steps[i], telling);
         pair.perform(draws);
         if (told)
             told->append(draws.told());
@@ -214,6 +233,71 @@ QString run(Steps& steps, QStringList* told = nullptr)
     return pair.difference();
 }
 
+/// Whether each program runs in a child process.
+inline bool usesChildren()
+{
+    return qEnvironmentVariableIsSet("VELOCOR_FORK");
+}
+
+/// The same in a child process, which may crash.
+///
+/// @return whether the two differ or the child did not come to its end
+template <class APair>
+bool failsInChild(Steps steps, Draws::Telling telling = Draws::Silent)
+{
+#ifdef Q_OS_UNIX
+    std::fflush(stdout);
+    const pid_t child = ::fork();
+    if (child == 0) {
+        for (int number : {SIGSEGV, SIGABRT, SIGFPE})
+            std::signal(number, SIG_DFL);
+        ::_exit(run<APair>(steps, telling).isEmpty() ? 0 : 1);
+    }
+    int status = -1;
+    ::waitpid(child, &status, 0);
+    return status != 0;
+#else
+    return !run<APair>(steps, telling).isEmpty();
+#endif
+}
+
+/// Says which program crashed, then leaves the crash to the handler that was there.
+class CrashNote
+{
+public:
+    CrashNote()
+    {
+        s_this = this;
+        for (int number : {SIGSEGV, SIGABRT, SIGFPE})
+            m_before.append(qMakePair(number, std::signal(number, note)));
+    }
+    ~CrashNote() { restore(); }
+    Q_DISABLE_COPY(CrashNote)
+
+    static inline quint32 seed = 0;
+
+private:
+    static void note(int number)
+    {
+        std::printf("VELOCOR_SEED=%u makes the program that crashed the first; VELOCOR_FORK=1 "
+                    "shortens it.\n",
+                    seed);
+        std::fflush(stdout);
+        s_this->restore();
+        std::raise(number);
+    }
+
+    void restore()
+    {
+        for (auto const& handler : m_before)
+            std::signal(handler.first, handler.second);
+        m_before.clear();
+    }
+
+    static inline CrashNote* s_this = nullptr;
+    QVector<QPair<int, void (*)(int)>> m_before;
+};
+
 /// Leaves out what a failing program does not need to fail: first halves of it, then ever smaller
 /// pieces down to single steps, then arguments.
 template <class APair>
@@ -223,40 +307,53 @@ Failure shortened(Steps steps)
     failure.length = int(steps.size());
     const auto stillFails = [&](Steps candidate) {
         ++failure.runs;
-        if (run<APair>(candidate).isEmpty())
+        const bool fails =
+            usesChildren() ? failsInChild<APair>(candidate) : !run<APair>(candidate).isEmpty();
+        if (!fails)
             return false;
         steps = candidate;
         return true;
     };
 
-    stillFails(steps);
-    size_t piece = std::max<size_t>(1, steps.size() / 2);
-    for (bool isDone = false; !isDone;) {
-        bool leftOut = false;
-        for (size_t at = 0; at < steps.size() && steps.size() > 1;) {
-            Steps candidate = steps;
-            const auto begin = candidate.begin() + std::ptrdiff_t(at);
-            const size_t count = std::min(piece, steps.size() - at);
-            candidate.erase(begin, begin + std::ptrdiff_t(count));
-            if (!candidate.empty() && stillFails(candidate))
-                leftOut = true;
-            else
-                at += piece;
+    const auto leaveOut = [&] {
+        size_t piece = std::max<size_t>(1, steps.size() / 2);
+        for (bool isDone = false; !isDone;) {
+            bool leftOut = false;
+            for (size_t at = 0; at < steps.size() && steps.size() > 1;) {
+                Steps candidate = steps;
+                const auto begin = candidate.begin() + std::ptrdiff_t(at);
+                const size_t count = std::min(piece, steps.size() - at);
+                candidate.erase(begin, begin + std::ptrdiff_t(count));
+                if (!candidate.empty() && stillFails(candidate))
+                    leftOut = true;
+                else
+                    at += piece;
+            }
+            isDone = piece == 1 && !leftOut;
+            if (!leftOut || piece > steps.size())
+                piece = std::max<size_t>(1, std::min(piece, steps.size()) / 2);
         }
-        isDone = piece == 1 && !leftOut;
-        if (!leftOut || piece > steps.size())
-            piece = std::max<size_t>(1, std::min(piece, steps.size()) / 2);
-    }
-    for (size_t at = 0; at < steps.size(); ++at) {
-        for (int draw = 0; draw < MaximumZeros && at < steps.size(); ++draw) {
-            Steps candidate = steps;
-            candidate[at].zeros |= quint64(1) << unsigned(draw);
-            stillFails(candidate);
+    };
+    const auto simplify = [&] {
+        for (size_t at = 0; at < steps.size(); ++at) {
+            for (int draw = 0; draw < MaximumZeros && at < steps.size(); ++draw) {
+                Steps candidate = steps;
+                candidate[at].zeros |= quint64(1) << unsigned(draw);
+                stillFails(candidate);
+            }
         }
-    }
+    };
 
-    failure.difference = run<APair>(steps, &failure.told);
+    stillFails(steps);
+    leaveOut();
+    simplify();
+    leaveOut(); // what simpler steps do not need
+
     failure.steps = steps;
+    if (usesChildren())
+        failure.difference = "in a child process";
+    else
+        failure.difference = run<APair>(steps, Draws::Kept, &failure.told);
     return failure;
 }
 
@@ -282,7 +379,8 @@ std::optional<Failure> search(quint32 seed, int count, int length, quint32& prog
         Steps steps = made(seed + programs, length);
         done += int(steps.size());
         const Steps whole = steps;
-        if (!run<APair>(steps).isEmpty())
+        CrashNote::seed = seed + programs;
+        if (usesChildren() ? failsInChild<APair>(steps) : !run<APair>(steps).isEmpty())
             return shortened<APair>(whole);
     }
     return std::nullopt;
@@ -297,6 +395,7 @@ template <class APair>
 void compare(char const* name, int count, int length)
 {
     quint32 programs = 0;
+    const CrashNote note;
     const std::optional<Failure> failure = search<APair>(Rounds::seed(), count, length, programs);
     if (failure) {
         std::printf(
@@ -305,6 +404,8 @@ void compare(char const* name, int count, int length)
             name, Rounds::seed() + programs, failure->length, failure->runs,
             qPrintable(failure->told.join("\n    ")), qPrintable(failure->difference));
         std::fflush(stdout);
+        if (usesChildren())
+            failsInChild<APair>(failure->steps, Draws::Printed);
     } else {
         std::printf("plain %s: %d steps in %u programs, each with the outcome of the plain model\n",
                     name, count, programs);

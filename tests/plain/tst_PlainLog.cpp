@@ -365,6 +365,7 @@ public:
         qInstallMessageHandler(DropMessage); // the echo of an earlier program replaced it
         StandardError::only().redirect(true);
         QDir().mkpath(Root() + "logs");
+        m_plain.disk.folders.insert(Root().chopped(1));
         m_plain.disk.makeFolder(Root() + "logs");
         m_plain.lastEntryTime = time();
         m_log.setOutputPath(Root() + "logs/");
@@ -395,60 +396,35 @@ public:
     void perform(Program::Draws& draws)
     {
         m_draws = &draws;
-        switch (draws.below(24)) {
-        case 0:
-        case 1:
-        case 2:
-        case 3:
-        case 4:
+        const int kind = draws.below(48);
+        if (kind < 8)
             writeLine();
-            break;
-        case 5:
-        case 6:
-        case 7:
-        case 8:
+        else if (kind < 16)
             writeEntry();
-            break;
-        case 9:
-        case 10:
-            tell("log.close()");
-            same("close()", m_log.close(), m_plain.close());
-            break;
-        case 11:
+        else if (kind < 20)
+            close();
+        else if (kind == 20)
             rotate();
-            break;
-        case 12:
-        case 13:
-        case 14:
+        else if (kind < 26)
             putFile();
-            break;
-        case 15:
+        else if (kind < 32)
             change();
-            break;
-        case 16:
+        else if (kind < 34)
             changePath();
-            break;
-        case 17:
+        else if (kind < 37)
             load();
-            break;
-        case 18:
+        else if (kind < 39)
             save();
-            break;
-        case 19:
+        else if (kind < 43)
             advance();
-            break;
-        case 20:
+        else if (kind < 45)
             open();
-            break;
-        case 21:
+        else if (kind == 45)
             nameSettings();
-            break;
-        case 22:
+        else if (kind == 46)
             clear();
-            break;
-        default:
-            compareGetters();
-        }
+        else
+            look();
         same("enabled()", m_log.enabled(), m_plain.settings.enabled);
         same("maxLogFiles()", m_log.maxLogFiles(), m_plain.settings.maxFiles);
         same("maxLogFileSize()", m_log.maxLogFileSize(), m_plain.settings.maxSize);
@@ -507,8 +483,10 @@ private:
     {
         static const QString letters = QString::fromUtf8("aab cäÿ日\t\"%aab cäÿ日\t\"%\n");
         static int const lengths[] = {5, 5, 12, 40, 120, 300};
-        const int length = m_draws->oneOf(lengths);
         const bool isComplete = !m_draws->once(5);
+        if (m_draws->once(2)) // often as long as another one
+            return m_draws->text("a", 4) + (isComplete ? "\n" : "");
+        const int length = m_draws->oneOf(lengths);
         return m_draws->text(letters, length) + (isComplete ? "\n" : "");
     }
 
@@ -541,10 +519,20 @@ private:
         m_plain.write(severity, message, QDateTime::currentMSecsSinceEpoch());
     }
 
+    void close()
+    {
+        tell("log.close()");
+        same("close()", m_log.close(), m_plain.close());
+    }
+
+    void look()
+    {
+        tell("the getters");
+        compareGetters();
+    }
+
     void rotate()
     {
-        if (m_draws->once(2))
-            return;
         tell("log.deleteOldFiles()");
         m_log.deleteOldFiles();
         m_plain.deleteOldFiles();
@@ -563,8 +551,11 @@ private:
         QByteArray bytes;
         for (int lines = m_draws->below(6); lines > 0; --lines)
             bytes += line().toLatin1();
-        if (name == m_plain.openName || !m_plain.disk.folders.contains(PlainDisk::folderOf(name)))
+        const QString folder = PlainDisk::folderOf(name);
+        const bool isThere = m_plain.disk.folders.contains(folder);
+        if (name == m_plain.openName || (!isThere && !m_draws->once(2)))
             return;
+        m_plain.disk.makeFolder(folder);
         tell("file # = #", name, bytes);
         m_plain.disk.files.remove(name);
         m_plain.disk.write(name, bytes);
@@ -638,7 +629,7 @@ private:
         };
         add("filePrefix", m_draws->oneOf(prefixes), 8);
         add("maxLogFiles", m_draws->oneOf(counts), 4);
-        add("maxLogFileSize", m_draws->oneOf(sizes), 4);
+        add("maxLogFileSize", m_draws->once(3) ? nearSize() : m_draws->oneOf(sizes), 4);
         add("dateTimeFormat", m_draws->oneOf(formats), 2);
         add("elapsedTimePrefix", m_draws->oneOf(elapsed), 2);
         add("loggingEnabled", m_draws->once(4) ? m_draws->oneOf(switches) : "yes", 2);
@@ -664,6 +655,13 @@ private:
              name, bytes);
         same("havePreferencesFile()", m_log.havePreferencesFile(), isThere);
         same("loadPreferences()", m_log.loadPreferences(), isThere && isWhole);
+    }
+
+    // With room for a short line, or just not.
+    QString nearSize()
+    {
+        const PlainDisk::File file = m_plain.disk.files.value(m_plain.fullName());
+        return QString::number((file ? file->size() : 10) + 1 + m_draws->below(8));
     }
 
     void save()
@@ -725,7 +723,6 @@ private:
 
     void compareGetters()
     {
-        tell("getters");
         PlainSettings const& plain = m_plain.settings;
         same("path()", m_log.path(), plain.path.isNull() ? QString("") : plain.path);
         same("logElapsedTime()", m_log.logElapsedTime(), plain.elapsed);

@@ -118,7 +118,8 @@ public:
             int end = file.indexOf('\n', at);
             if (end < 0)
                 end = file.size();
-            lines.push_back(parsed(file.mid(at, end - at), readsTimes));
+            const bool hasReturn = end > at && file[end - 1] == '\r';
+            lines.push_back(parsed(file.mid(at, end - at - hasReturn), readsTimes));
             lines.back().start = at;
             at = end + 1;
         }
@@ -289,14 +290,9 @@ protected:
 
     QByteArray otherLine()
     {
-        static char const* const lines[] = {"it goes on\n",
-                                            "\n",
-                                            " Error at the start\n",
-                                            "5 Error not timed\n",
-                                            "no number Error\n",
-                                            "Error\n",
-                                            "x\r\n",
-                                            "end of "};
+        static char const* const lines[] = {
+            "it goes on\n",      "\n",      " Error at the start\n", "5 Error not timed\n",
+            "no number Error\n", "Error\n", "7 Error\r\n",           "end of "};
         return m_draws->oneOf(lines);
     }
 
@@ -582,10 +578,11 @@ private:
         poll();
     }
 
-    // Another file, with other bytes.
+    // Another file, with other bytes, perhaps only after its first lines.
     void replace()
     {
-        m_file.clear();
+        const bool keepsStart = m_draws->once(2) && m_position == m_file.size();
+        m_file.truncate(keepsStart ? m_file.lastIndexOf('\n', 400) + 1 : 0);
         for (int lines = m_draws->below(6); lines > 0; --lines)
             m_file += entry();
         m_position = m_file.size();

@@ -350,6 +350,7 @@ private:
         return m_draws->once(30) ? QString() : QString::fromUtf8(m_draws->oneOf(keys));
     }
 
+    // Of windows, some that end just at the edges of the usual desktop of 800 by 600.
     QString value()
     {
         static char const* const values[] = {"v",
@@ -388,6 +389,13 @@ private:
                                              "-50,10,300,100",
                                              "9000,10,5,5",
                                              "0,0,9999,9999",
+                                             "400,10,400,300",
+                                             "100,300,320,300",
+                                             "0,0,800,600",
+                                             "0,0,801,601",
+                                             "-1,-1,799,599",
+                                             "1:",
+                                             "1/",
                                              "1,2,x,4",
                                              "%1",
                                              "%2 %3",

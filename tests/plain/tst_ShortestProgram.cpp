@@ -17,6 +17,7 @@ private slots:
     void shortest_data();
     void shortest();
     void argumentsAreAsSimpleAsTheyCanBe();
+    void crash();
     void nothingToFind();
     void sameProgramForTheSameNumber();
     void failsTheTest();
@@ -89,6 +90,23 @@ public:
     void finish() {}
 };
 
+// Crashes at step 2 after step 1.
+class Crashing : public Program::Pair
+{
+public:
+    void perform(Program::Draws& draws)
+    {
+        const int kind = draws.below(10);
+        if (kind == 2 && m_isArmed)
+            std::raise(SIGSEGV);
+        m_isArmed = m_isArmed || kind == 1;
+    }
+    void finish() {}
+
+private:
+    bool m_isArmed = false;
+};
+
 using Search = std::optional<Program::Failure> (*)();
 
 template <class APair>
@@ -145,6 +163,19 @@ void tst_ShortestProgram::argumentsAreAsSimpleAsTheyCanBe()
     QVERIFY2(step.startsWith("take(0, ") && step.endsWith(", )"), qPrintable(step));
     QVERIFY(step.section(", ", 1, 1).toInt() > 500);
     QCOMPARE(failure->difference, QString("large: true\nplain: false"));
+}
+
+void tst_ShortestProgram::crash()
+{
+#ifdef Q_OS_UNIX
+    qputenv("VELOCOR_FORK", "1");
+    const std::optional<Program::Failure> failure = Found<Crashing>();
+    qunsetenv("VELOCOR_FORK");
+    QVERIFY(failure);
+    QCOMPARE(failure->steps.size(), size_t(2));
+#else
+    QSKIP("There are no child processes.");
+#endif
 }
 
 void tst_ShortestProgram::nothingToFind()
