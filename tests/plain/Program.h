@@ -142,8 +142,8 @@ inline QString quoted(QString const& text)
 {
     if (text.isNull())
         return QStringLiteral("QString()");
-    if (text.length() > 200)
-        return quoted(text.left(100)) + QStringLiteral("... of %1").arg(text.length());
+    if (text.length() > 500)
+        return quoted(text.left(200)) + QStringLiteral("... of %1").arg(text.length());
     QString result = QStringLiteral("\"");
     for (QChar letter : text) {
         if (letter == '\n')
@@ -196,6 +196,24 @@ protected:
         if (m_difference.isEmpty() && !(real == plain))
             m_difference = QStringLiteral("%1: %2\nplain: %3")
                                .arg(QLatin1String(what), quoted(real), quoted(plain));
+    }
+
+    // Without what is in both.
+    void same(char const* what, QStringList const& real, QStringList const& plain)
+    {
+        if (!m_difference.isEmpty() || real == plain)
+            return;
+        const auto without = [](QStringList texts, QStringList const& others) {
+            for (QString const& other : others)
+                texts.removeOne(other);
+            return texts;
+        };
+        const QStringList onlyReal = without(real, plain);
+        const QStringList onlyPlain = without(plain, real);
+        const bool isOrder = onlyReal.isEmpty() && onlyPlain.isEmpty();
+        m_difference = QStringLiteral("%1: %2\nplain: %3")
+                           .arg(QLatin1String(what), quoted(isOrder ? real : onlyReal),
+                                quoted(isOrder ? plain : onlyPlain));
     }
 
 private:

@@ -629,7 +629,8 @@ private:
         };
         add("filePrefix", m_draws->oneOf(prefixes), 8);
         add("maxLogFiles", m_draws->oneOf(counts), 4);
-        add("maxLogFileSize", m_draws->once(3) ? nearSize() : m_draws->oneOf(sizes), 4);
+        add("maxLogFileSize",
+            m_draws->once(3) ? nearSize(stored.value("filePrefix")) : m_draws->oneOf(sizes), 4);
         add("dateTimeFormat", m_draws->oneOf(formats), 2);
         add("elapsedTimePrefix", m_draws->oneOf(elapsed), 2);
         add("loggingEnabled", m_draws->once(4) ? m_draws->oneOf(switches) : "yes", 2);
@@ -658,9 +659,10 @@ private:
     }
 
     // With room for a short line, or just not.
-    QString nearSize()
+    QString nearSize(QString const& prefix)
     {
-        const PlainDisk::File file = m_plain.disk.files.value(m_plain.fullName());
+        const PlainDisk::File file =
+            m_plain.disk.files.value(m_plain.settings.path + prefix + ".log");
         return QString::number((file ? file->size() : 10) + 1 + m_draws->below(8));
     }
 

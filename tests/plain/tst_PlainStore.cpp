@@ -339,7 +339,7 @@ private:
                                             "n:B",
                                             "?",
                                             "x%1"};
-        return QString::fromUtf8(m_draws->oneOf(names));
+        return m_draws->once(2) ? QString::fromUtf8(m_draws->oneOf(names)) : "A";
     }
 
     QString key()
@@ -347,6 +347,8 @@ private:
         static char const* const keys[] = {"k",        "l",     "m",  "k", "K",
                                            "my key",   "mykey", "",   "A", "VelocorSettings",
                                            "\xC3\xA9", "a%1",   "n:k"};
+        if (!m_draws->once(2))
+            return "k";
         return m_draws->once(30) ? QString() : QString::fromUtf8(m_draws->oneOf(keys));
     }
 

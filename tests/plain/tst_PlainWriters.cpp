@@ -350,7 +350,7 @@ public:
         static const QVector<int> rare = {-1, 0, 2, 3, -5, 40};
         if (chance(75))
             return 1;
-        return below(500) == 499 ? 700 : oneOf(rare); // indentation as deep is slow
+        return below(500) == 499 ? 1100 : oneOf(rare); // indentation as deep is slow
     }
 
     Step step()
