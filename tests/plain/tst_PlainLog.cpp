@@ -374,6 +374,13 @@ public:
         m_plain.settings.enabled = true;
         m_log.setPreferencesFileName("app.cfg");
         m_plain.settings.fileName = Root() + "logs/app.cfg";
+
+        const QString name = m_plain.settings.fileName;
+        TestFiles::write(name, "<LogSettings><config><filePrefix>app</filePrefix></config>"
+                               "</LogSettings>");
+        same("loadPreferences()", m_log.loadPreferences(), true);
+        m_plain.load({{"filePrefix", "app"}});
+        QFile::remove(name);
     }
 
     ~Logs()
