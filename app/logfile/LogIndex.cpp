@@ -70,10 +70,6 @@ void LogIndex::forgetFrom(size_t line)
     if (line == 0) {
         m_runs[0] = Run();
         m_newestIsTimed = false;
-    } else if (m_newestIsTimed && m_newestLastTimed >= line) {
-        // The incomplete line that is read again was the timed one.
-        m_newestLastTimed = line - 1;
-        m_newestLastTime = m_runs[0].firstTime;
     }
     m_runHasTimed = m_newestIsTimed;
     m_lastTimed = m_newestLastTimed;
@@ -216,7 +212,7 @@ bool LogIndex::addLine(char const* line, int length, bool complete)
         joinRuns();
     m_marks.push_back(markOf(parts, line, std::min(length, LineLimit)));
     m_starts.push_back(m_lineStart);
-    if (parts.timeKey >= 0)
+    if (parts.timeKey >= 0 && complete) // an incomplete line is read again
         noteTime(parts);
     return true;
 }

@@ -220,11 +220,13 @@ void LogScanner::report(bool isReset)
     if (!isReset)
         update.Compare(*m_rows);
     const bool nothingNew = !update.isReset && update.removed == 0 && update.inserted == 0 &&
-                            update.changedTail == 0 && update.rows->size() == m_rows->size();
+                            update.changedTail == 0 && update.rows->size() == m_rows->size() &&
+                            m_index.size() == m_lines;
     m_rows = update.rows;
+    m_lines = m_index.size();
     update.exists = m_exists;
     update.error = m_error;
-    update.lines = m_index.size();
+    update.lines = m_lines;
     update.hasElapsed = m_index.hasElapsed();
     update.slowLine = m_index.slowLine();
     if (!nothingNew)

@@ -11,6 +11,7 @@
 #include <QString>
 
 #include <atomic>
+#include <memory>
 
 class QFile;
 
@@ -82,6 +83,7 @@ private:
     QByteArray m_anchor;
     qint64 m_anchorEnd = 0;
     QByteArray m_tail;
+    size_t m_lines = 0; // as reported
 };
 
 } // namespace Velocor

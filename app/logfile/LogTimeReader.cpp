@@ -24,6 +24,17 @@ bool IsWordCharacter(char c)
     return (byte >= 'a' && byte <= 'z') || (byte >= 'A' && byte <= 'Z') || byte >= 0x80;
 }
 
+// Consecutive days have consecutive numbers, never negative; the year starts in March, so that its
+// last month is the one whose length varies. Any of the fields may be missing and then is 0.
+qint64 DayOf(int year, int month, int day)
+{
+    const bool isBeforeMarch = month <= 2;
+    const qint64 years = year + (isBeforeMarch ? 0 : 1);
+    const int months = month + (isBeforeMarch ? 9 : -3);
+    const qint64 leapDays = (years + 399) / 4 - (years + 399) / 100 + (years + 399) / 400;
+    return 365 * years + leapDays + (153 * months + 2) / 5 + day;
+}
+
 // One-digit milliseconds: "5" means half a second in newer Qt versions, 5 ms in older ones.
 bool WritesFractions()
 {
@@ -221,14 +232,11 @@ LogTimeReader::Stamp LogTimeReader::Read(char const* text, int length) const
     if (!m_hasTime)
         return stamp;
     int const* number = values.number;
-    qint64 key = number[Year] + number[ShortYear];
-    key = key * 13 + number[Month];
-    key = key * 32 + number[Day];
+    qint64 key = DayOf(number[Year] + number[ShortYear], number[Month], number[Day]);
     key = key * 24 + number[Hour] + number[HalfDay];
     key = key * 60 + number[Minute];
-    // A leap second counts as the end of its minute.
-    const int milliseconds = number[Second] * 1000 + number[Fraction];
-    stamp.key = key * MinuteLength + std::min(milliseconds, MinuteLength - 1);
+    key = key * 60 + number[Second];
+    stamp.key = key * 1000 + number[Fraction];
     return stamp;
 }
 

@@ -26,8 +26,7 @@ public:
     struct Stamp
     {
         int length = -1; ///< length in bytes; -1 if there is no time stamp
-        qint64 key = -1; ///< increases with time; milliseconds within a month; -1 if the format
-                         ///< has no time of day
+        qint64 key = -1; ///< in milliseconds; -1 if the format has no time of day
     };
 
     /// @param format  a date format as QDateTime::toString() understands it

@@ -89,7 +89,9 @@ void WindowSettings::take(QString const& section, QString const& key, QString co
     if (!TorkConfigText::IsPlainName(section) || !TorkConfigText::IsPlainName(key))
         return;
     const bool isPlain = TorkConfigText::IsPlainValue(value);
-    m_file.WriteItem(section, key, isPlain ? value : TorkConfigText::EncodeValue(Unescaped(value)));
+    m_file.WriteItem(
+        section, key,
+        isPlain ? value : TorkConfigText::EncodeValue(TorkUnescaped(QLatin1Char('\\'), value)));
 }
 
 QString WindowSettings::renameDamagedFile()

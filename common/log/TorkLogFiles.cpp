@@ -335,5 +335,5 @@ void TorkLog::pruneOldFiles(qint64 highest) const
     }
     // Not listed again; each rotation adds only one.
     if (files.isEmpty())
-        QFile::remove(path + QLatin1Char('.') + QString::number(highest));
+        QFile::remove(current.filePath() + QLatin1Char('.') + QString::number(highest));
 }

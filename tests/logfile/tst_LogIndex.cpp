@@ -87,6 +87,8 @@ private slots:
     void growthAtTheEndMakesOneRun();
     void readsOnlyWhatIsNew();
     void incompleteLastLine();
+    void incompleteEntryCountsOnce();
+    void olderEntryOverATornOne();
     void anyBytes();
 };
 
@@ -148,6 +150,11 @@ void tst_LogIndex::order_data()
                                entry("09:00:00.009", "Trace", "c");
     QTest::newRow("entries of threads that overtake each other are no seam")
         << threads << Lines(threads);
+
+    const QByteArray minute = entry("09:01:00.000", "Trace", "a") +
+                              entry("09:01:00.005", "Trace", "b") +
+                              entry("09:00:59.990", "Trace", "c");
+    QTest::newRow("nor are they at a full minute") << minute << Lines(minute);
 }
 
 void tst_LogIndex::order()
@@ -406,6 +413,33 @@ void tst_LogIndex::incompleteLastLine()
         Pass(index, whole.left(length), 4096);
         QCOMPARE(Texts(index, whole.left(length)), TextsOf(whole.left(length)));
     }
+}
+
+// An entry without a date, over a stamp with one, shows which entries the run counts.
+void tst_LogIndex::incompleteEntryCountsOnce()
+{
+    const QByteArray start("2025-03-03 09:00:00.000 Trace a\n");
+    const LogLineParser parser({"hh:mm"}, {});
+    LogIndex index(parser);
+    Pass(index, start + "09:01 Trace b", 4096);
+    const QByteArray file = start + "2025-03-03 09:01:00.000 Trace c\n";
+    Pass(index, file, 4096);
+    QCOMPARE(Texts(index, file), Lines(file));
+}
+
+// The clock was set back, and the entry begins where the rest of a torn one did.
+void tst_LogIndex::olderEntryOverATornOne()
+{
+    const QByteArray newer = entry("09:00:00.000", "Trace", "a");
+    const QByteArray older = entry("17:00:00.000", "Trace", QString(60, 'x'), true) +
+                             entry("17:00:01.000", "Trace", "b", true);
+    const QByteArray file = writtenOver(older, newer);
+    LogIndex index;
+    Pass(index, file, 4096);
+    const QByteArray after =
+        writtenOver(file, newer + entry("08:00:00.000", "Trace", QString(20, 'y')));
+    Pass(index, after, 4096);
+    QCOMPARE(Texts(index, after), TextsOf(after));
 }
 
 void tst_LogIndex::anyBytes()

@@ -11,16 +11,22 @@
 
 /// How many rounds a comparison with the plain version runs, and from which seed.
 ///
-/// `VELOCOR_PLAIN=full` selects the full size, as ./check does, with a new seed in every run. The
-/// usual size always has the same seed: a change is judged by what it changes, not by luck.
-/// `VELOCOR_SEED` selects a seed, or a new one if it is `new`. Every run prints its seed, so that a
-/// failure can be reproduced.
+/// `VELOCOR_PLAIN=full` selects the full size, as ./check does, with a new seed in every run, and
+/// `VELOCOR_PLAIN=long` that of ./check --long. The usual size always has the same seed: a change
+/// is judged by what it changes, not by luck. `VELOCOR_SEED` selects a seed, or a new one if it is
+/// `new`. Every run prints its seed, so that a failure can be reproduced.
 namespace Rounds {
 
-/// Whether the full size was requested.
+/// Whether the longest size was requested.
+inline bool isLong()
+{
+    return qgetenv("VELOCOR_PLAIN") == "long";
+}
+
+/// Whether at least the full size was requested.
 inline bool isFull()
 {
-    return qgetenv("VELOCOR_PLAIN") == "full";
+    return isLong() || qgetenv("VELOCOR_PLAIN") == "full";
 }
 
 /// The number of rounds: `usual` takes about a second, `full` is the documented size.
@@ -29,8 +35,14 @@ inline int count(int usual, int full)
     return isFull() ? full : usual;
 }
 
-/// The seed of this process: the one requested or, if there is none, a new one at full size and
-/// always the same otherwise. It is printed.
+/// The same with a number of its own for the longest size.
+inline int count(int usual, int full, int longest)
+{
+    return isLong() ? longest : count(usual, full);
+}
+
+/// The seed of this process: the one requested or, if there is none, a new one from the full size
+/// on and always the same otherwise. It is printed.
 inline quint32 seed()
 {
     static const quint32 chosen = [] {

@@ -2,18 +2,17 @@
 // SPDX-License-Identifier: MIT
 
 // The log beside a plain one, which does with Qt's files and lists just what a log file's life is
-// made of, through the same random life of a log directory: after each step both have left the
-// same.
+// made of, through the same random life of a log directory, with links, pipes, forks, other writers
+// and holders of the file: both leave the same. tst_PlainLog compares more calls, without files.
 
 #include "common/log/TorkLog.h"
-#include "plain/Rounds.h"
+#include "plain/Program.h"
 #include "support/TestFiles.h"
 
 #include <QTemporaryDir>
 #include <QTextStream>
 #include <QtTest>
 
-#include <cstdio>
 #include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -37,7 +36,7 @@ class PlainLog
 {
 public:
     QString path;
-    QString prefix;
+    QString prefix = "app";
     int maxFiles = 10;
     quint32 maxSize = 1000000;
     QString errorString = QLatin1String("");
@@ -217,19 +216,17 @@ QStringList listing(QString const& folder)
 }
 
 // Both logs in folders of their own, which are treated alike.
-class Life
+class Life : public Program::Pair
 {
 public:
-    explicit Life(quint32 seed) : m_random(seed)
+    Life()
     {
         for (QString const& root : m_roots)
             QDir().mkpath(root + "logs");
         m_log.setEnable(true);
-        changePath(m_roots, "logs/");
-        changeSettings();
-        const int older = upTo(5);
-        for (int i = 0; i < older; ++i)
-            makeOdd();
+        m_log.setOutputPath(m_roots[0] + "logs/");
+        m_plain.path = m_roots[1] + "logs/";
+        loadSettings();
     }
     ~Life()
     {
@@ -239,17 +236,19 @@ public:
 
     Q_DISABLE_COPY(Life)
 
-    void step()
+    void perform(Program::Draws& draws)
     {
-        switch (upTo(19)) {
+        m_draws = &draws;
+        switch (upTo(20)) {
         case 0:
             note("close");
-            m_isSame = m_log.close() == m_plain.close();
+            same("close()", m_log.close(), m_plain.close());
             break;
         case 1:
             interfere();
             break;
         case 2:
+        case 19:
             makeOdd();
             break;
         case 3:
@@ -272,7 +271,7 @@ public:
             break;
         case 9:
             if (upTo(3) == 0)
-                changePath(m_roots, pick({"logs/", "logs", "new/", "new", "a/b/c/", "logs//"}));
+                changePath(pick({"logs/", "logs", "new/", "new", "a/b/c/", "logs//"}));
             break;
         case 10:
             if (upTo(8) == 0)
@@ -283,26 +282,19 @@ public:
         }
     }
 
-    // Empty if both have left the same.
-    QString difference() const
+    void finish()
     {
-        const QStringList left = listing(m_roots[0]);
-        const QStringList right = listing(m_roots[1]);
-        const QString reason = m_log.errorString();
-        if (m_isSame && left == right && reason == m_plain.errorString)
-            return QString();
-
-        QStringList report({"steps:"});
-        report += m_steps;
-        report += QStringList({"the log:", reason}) + left;
-        report += QStringList({"the plain one:", m_plain.errorString}) + right;
-        return report.replaceInStrings("\n", "\\n").join('\n');
+        same("files", listing(m_roots[0]), listing(m_roots[1]));
+        same("errorString()", m_log.errorString(), m_plain.errorString);
     }
 
 private:
-    int upTo(int limit) { return static_cast<int>(m_random() % static_cast<quint32>(limit)); }
+    int upTo(int limit) { return m_draws->below(limit); }
     QString pick(QStringList const& texts) { return texts.at(upTo(texts.size())); }
-    void note(QString const& step) { m_steps.append(step); }
+    void note(QString const& step)
+    {
+        m_draws->tell([&] { return Program::quoted(step); });
+    }
 
     QString line()
     {
@@ -360,7 +352,7 @@ private:
             if (kind == 0)
                 QDir().mkpath(root + name);
             else if (kind == 1)
-                m_isSame = m_isSame && mkfifo(path.constData(), 0600) == 0;
+                same("mkfifo()", mkfifo(path.constData(), 0600), 0);
             else if (kind == 2)
                 QFile::link("nowhere", root + name);
             else if (kind == 3)
@@ -379,6 +371,11 @@ private:
                  .arg(m_plain.prefix)
                  .arg(m_plain.maxFiles)
                  .arg(m_plain.maxSize));
+        loadSettings();
+    }
+
+    void loadSettings()
+    {
         const QString file = m_folder.path() + "/settings.cfg";
         TestFiles::write(file, QString("<LogSettings><config><filePrefix>%1</filePrefix>"
                                        "<maxLogFiles>%2</maxLogFiles>"
@@ -388,7 +385,7 @@ private:
                                    .arg(m_plain.maxSize)
                                    .toUtf8());
         m_log.setPreferencesFileName(file);
-        m_isSame = m_isSame && m_log.loadPreferences();
+        same("loadPreferences()", m_log.loadPreferences(), true);
     }
 
     // A child writes and ends, then the parent goes on.
@@ -407,7 +404,8 @@ private:
             _exit(0);
         }
         int status = 0;
-        m_isSame = m_isSame && waitpid(child, &status, 0) == child && status == 0;
+        same("waitpid()", waitpid(child, &status, 0), child);
+        same("status", status, 0);
     }
 
     void handOut()
@@ -416,7 +414,7 @@ private:
         note("hand out for " + text);
         m_file = m_log.locateLogFile(text);
         m_plainFile = m_plain.locateLogFile(text);
-        m_isSame = m_isSame && !m_file == !m_plainFile;
+        same("no file", !m_file, !m_plainFile);
     }
 
     void useHandedOut()
@@ -444,11 +442,11 @@ private:
         m_plain.deleteOldFiles();
     }
 
-    void changePath(QStringList const& roots, QString const& path)
+    void changePath(QString const& path)
     {
         note("path " + path);
-        m_log.setOutputPath(roots[0] + path);
-        m_plain.path = roots[1] + path;
+        m_log.setOutputPath(m_roots[0] + path);
+        m_plain.path = m_roots[1] + path;
     }
 
     void removeFolders()
@@ -460,9 +458,7 @@ private:
 
     QTemporaryDir m_folder;
     const QStringList m_roots{m_folder.path() + "/a/", m_folder.path() + "/b/"};
-    std::mt19937 m_random;
-    QStringList m_steps;
-    bool m_isSame = true;
+    Program::Draws* m_draws = nullptr;
     TorkLog m_log;
     PlainLog m_plain;
     QFile* m_file = nullptr;
@@ -486,32 +482,12 @@ void tst_PlainLogFiles::cleanupTestCase()
 
 void tst_PlainLogFiles::lives()
 {
-    const int count = Rounds::count(60, 10000);
-    const quint32 seed = Rounds::seed();
-    qint64 steps = 0;
-    for (int number = 0; number < count; ++number) {
-        Life life(seed + static_cast<quint32>(number));
-        for (int i = 0; i < 25; ++i, ++steps) {
-            life.step();
-            const QString difference = life.difference();
-            if (difference.isEmpty())
-                continue;
-            std::printf("%s\n", qPrintable(difference)); // too long for the message
-            QFAIL(qPrintable(QString("This life has VELOCOR_SEED=%1.")
-                                 .arg(seed + static_cast<quint32>(number))));
-        }
-    }
-    std::printf("plain log files: %d lives of a log directory, %lld steps, each the same as with "
-                "plain file operations\n",
-                count, static_cast<long long>(steps));
+    Program::compare<Life>("log files", Rounds::count(1500, 250000), 50);
 }
 
 int main(int argc, char** argv)
 {
-    // Thousands of small folders: not on the disk where there is a folder in memory.
-    if (!qEnvironmentVariableIsSet("TMPDIR") && QFileInfo("/dev/shm").isWritable())
-        qputenv("TMPDIR", "/dev/shm");
-
+    Program::useMemoryForFiles();
     QCoreApplication application(argc, argv);
     tst_PlainLogFiles test;
     return QTest::qExec(&test, argc, argv);

@@ -8,7 +8,7 @@
 
 #include "common/xml/TorkXmlFile.h"
 #include "common/xml/TorkXmlStream.h"
-#include "plain/Rounds.h"
+#include "plain/Program.h"
 #include "support/TestFiles.h"
 #include "xml/WriterSteps.h"
 #include "xml/WritersWithoutTypes.h"
@@ -18,7 +18,6 @@
 #include <QtTest>
 
 #include <cstdio>
-#include <random>
 
 namespace {
 
@@ -319,10 +318,10 @@ private:
 class Dice
 {
 public:
-    explicit Dice(quint32 seed) : m_engine(seed) {}
+    explicit Dice(Program::Draws& draws) : m_draws(draws) {}
 
-    int below(int end) { return int(m_engine() % uint(end)); }
-    bool chance(int percent) { return below(100) < percent; }
+    int below(int end) { return m_draws.below(end); }
+    bool chance(int percent) { return below(100) >= 100 - percent; }
 
     template <class List>
     auto oneOf(List const& list)
@@ -340,7 +339,7 @@ public:
         if (chance(8))
             return chance(50) ? QString() : QString("");
         QString all;
-        const int length = chance(5) ? 60 : 1 + below(isName ? 2 : 6);
+        const int length = chance(3) ? 60 : 1 + below(isName ? 2 : 6);
         for (int i = 0; i < length; ++i)
             all += chance(10) ? QString(QChar(oneOf(wide))) : oneOf(pieces);
         return all;
@@ -349,13 +348,19 @@ public:
     int indent()
     {
         static const QVector<int> rare = {-1, 0, 2, 3, -5, 40};
-        return chance(75) ? 1 : oneOf(rare);
+        if (chance(75))
+            return 1;
+        return below(500) == 499 ? 1100 : oneOf(rare); // indentation as deep is slow
     }
 
     Step step()
     {
-        const auto operation = Step::Operation(below(Step::CurrentIndent + 1));
-        return {operation, text(true), text(false), indent(), 0};
+        const auto operation = Step::Operation(below(Step::Text + 1));
+        const int levels = indent();
+        const QString name = text(true);
+        if (operation == Step::Text && chance(30))
+            return {operation, name, "<!-- " + text(false) + " -->\n", levels, 0};
+        return {operation, name, text(false), levels, 0};
     }
 
     Kind kind(bool isFile)
@@ -377,13 +382,32 @@ public:
     }
 
 private:
-    std::mt19937 m_engine;
+    Program::Draws& m_draws;
 };
+
+// How a call reads in a program.
+QString Told(Step const& step)
+{
+    static const QStringList names(
+        {"WriteElementOpen(name, indent)", "WriteElementClose(name, indent)",
+         "WriteElementCloseAndEnd(name, indent)", "WriteElementStart(name, indent)",
+         "WriteElementEnd(name, indent)", "WriteElement(name, value)", "WriteElementValue(value)",
+         "WriteAttribute(name, value)", "WriteCurrentIndent()", "Write(value)"});
+    const QString call = names.at(step.operation);
+    QStringList arguments;
+    if (call.contains("name"))
+        arguments.append(Program::quoted(step.name));
+    if (call.contains("value"))
+        arguments.append(Program::quoted(step.value));
+    if (call.contains("indent)"))
+        arguments.append(QString::number(step.indent));
+    return call.section('(', 0, 0) + "(" + arguments.join(", ") + ")";
+}
 
 // The outcome of a sequence.
 struct Outcome
 {
-    QVector<int> codes;
+    QVector<int> codes; // and the state of the stream at the end
     QStringList calls;
     QByteArray bytes;
 
@@ -401,15 +425,6 @@ QString Words(Outcome const& outcome)
     return words + "\n" + outcome.calls.join("\n") + "\n" + QString::fromLatin1(outcome.bytes);
 }
 
-// On a deep level every line is indented as deeply; the sequences are short enough for that.
-Steps Sequence(Dice& dice)
-{
-    Steps steps;
-    for (int left = 1 + dice.below(12); left > 0; --left)
-        steps.append(dice.step());
-    return steps;
-}
-
 template <class Writer>
 Outcome Written(Writer& writer, Steps const& steps, Kind const& kind)
 {
@@ -417,44 +432,50 @@ Outcome Written(Writer& writer, Steps const& steps, Kind const& kind)
     Outcome outcome;
     outcome.codes = Perform(writer, steps);
     writer.flush();
+    outcome.codes.append(writer.status());
     return outcome;
 }
 
-} // namespace
+enum Device { String, Bytes, IoDevice, FullDevice, CFile, NoDevice, DeviceCount };
 
-class tst_PlainWriters : public QObject
+// Takes a few bytes and then no more.
+class SmallDevice : public QIODevice
 {
-    Q_OBJECT
+public:
+    explicit SmallDevice(int size) : m_left(size) { open(QIODevice::WriteOnly); }
+    QByteArray taken;
 
-private slots:
-    void sameAsPlain();
-    void sameWithoutTypes();
-    void cleanupTestCase();
+protected:
+    qint64 readData(char*, qint64) override { return -1; }
+    qint64 writeData(char const* bytes, qint64 size) override
+    {
+        const int count = qMin(int(size), m_left);
+        taken.append(bytes, count);
+        m_left -= count;
+        return count == 0 && size > 0 ? -1 : count;
+    }
 
 private:
-    Outcome plain(Steps const& steps, Kind const& kind, bool hasDevice);
-    Outcome stream(int device, Steps const& steps, Kind const& kind);
-    Outcome base(int device, Steps const& steps, Kind const& kind);
-    Outcome file(Steps const& steps, Kind const& kind);
-
-    QTemporaryDir m_folder;
-    int m_sequences = 0;
-    int m_calls = 0;
+    int m_left;
 };
 
-enum Device { NoDevice, String, Bytes, IoDevice, CFile, DeviceCount };
+constexpr int SmallSize = 40;
 
-Outcome tst_PlainWriters::plain(Steps const& steps, Kind const& kind, bool hasDevice)
+Outcome Plain(int device, Steps const& steps, Kind const& kind)
 {
     QByteArray bytes;
-    QTextStream stream(&bytes, QIODevice::WriteOnly);
+    SmallDevice small(SmallSize);
+    QBuffer buffer(&bytes);
+    buffer.open(QIODevice::WriteOnly);
+    QTextStream stream(device == FullDevice ? static_cast<QIODevice*>(&small) : &buffer);
     stream.setFieldWidth(kind.fieldWidth);
-    PlainWriter writer(hasDevice ? &stream : nullptr, kind);
+    PlainWriter writer(device == NoDevice ? nullptr : &stream, kind);
     Outcome outcome;
     outcome.codes = Perform(writer, steps);
     stream.flush();
+    outcome.codes.append(stream.status());
     outcome.calls = writer.record.calls;
-    outcome.bytes = bytes;
+    outcome.bytes = device == FullDevice ? small.taken : bytes;
     return outcome;
 }
 
@@ -476,6 +497,10 @@ Outcome OnDevice(int device, QString const& path, Make const& make)
         QBuffer buffer(&bytes);
         buffer.open(QIODevice::WriteOnly);
         outcome = make(&buffer);
+    } else if (device == FullDevice) {
+        SmallDevice small(SmallSize);
+        outcome = make(&small);
+        bytes = small.taken;
     } else {
         FILE* file = std::fopen(QFile::encodeName(path).constData(), "wb");
         outcome = make(file, QIODevice::WriteOnly);
@@ -486,9 +511,11 @@ Outcome OnDevice(int device, QString const& path, Make const& make)
     return outcome;
 }
 
-Outcome tst_PlainWriters::stream(int device, Steps const& steps, Kind const& kind)
+QTemporaryDir* g_folder = nullptr;
+
+Outcome OfStream(int device, Steps const& steps, Kind const& kind)
 {
-    return OnDevice(device, m_folder.filePath("stream.xml"), [&](auto... arguments) {
+    return OnDevice(device, g_folder->filePath("stream.xml"), [&](auto... arguments) {
         Subclass<TorkXmlStream> writer(kind, arguments...);
         Outcome outcome = Written(writer, steps, kind);
         outcome.calls = writer.record.calls;
@@ -496,17 +523,17 @@ Outcome tst_PlainWriters::stream(int device, Steps const& steps, Kind const& kin
     });
 }
 
-Outcome tst_PlainWriters::base(int device, Steps const& steps, Kind const& kind)
+Outcome OfBase(int device, Steps const& steps, Kind const& kind)
 {
-    return OnDevice(device, m_folder.filePath("stream.xml"), [&](auto... arguments) {
+    return OnDevice(device, g_folder->filePath("stream.xml"), [&](auto... arguments) {
         TorkXmlStream writer(arguments...);
         return Written(writer, steps, kind);
     });
 }
 
-Outcome tst_PlainWriters::file(Steps const& steps, Kind const& kind)
+Outcome OfFile(Steps const& steps, Kind const& kind)
 {
-    const QString path = m_folder.filePath("file.xml");
+    const QString path = g_folder->filePath("file.xml");
     Outcome outcome;
     {
         Subclass<TorkXmlFile> writer(kind, path);
@@ -518,87 +545,156 @@ Outcome tst_PlainWriters::file(Steps const& steps, Kind const& kind)
     return outcome;
 }
 
-void tst_PlainWriters::sameAsPlain()
+// All calls on a writer of the last kind that was chosen.
+class Writers : public Program::Pair
 {
-    // Qt warns about each text that is written without a device.
-    qInstallMessageHandler([](QtMsgType, QMessageLogContext const&, QString const&) {});
-    Dice dice(Rounds::seed());
-    const int count = Rounds::count(4000, 100000);
-    for (int i = 0; i < count; ++i) {
-        const Steps steps = Sequence(dice);
-        const bool isFile = dice.chance(20);
-        const int device = dice.below(DeviceCount);
-        const Kind kind = dice.kind(isFile);
-        const Outcome expected = plain(steps, kind, isFile || device != NoDevice);
-        Outcome outcome;
-        if (isFile)
-            outcome = file(steps, kind);
-        else if (kind.overridden)
-            outcome = stream(device, steps, kind);
-        else
-            outcome = base(device, steps, kind);
-        ++m_sequences;
-        m_calls += steps.size();
-        if (!(outcome == expected)) {
-            qInstallMessageHandler(nullptr);
-            QCOMPARE(Words(outcome), Words(expected));
+public:
+    void perform(Program::Draws& draws)
+    {
+        Dice dice(draws);
+        if (dice.chance(90)) {
+            const Step step = dice.step();
+            draws.tell([&] { return Told(step); });
+            m_steps.append(step);
+            return;
         }
+        m_device = dice.below(DeviceCount);
+        m_kind = dice.kind(dice.chance(20));
+        draws.tell([&] {
+            return QString("the writer: device %1, file %2, overrides %3, Write() fails every %4, "
+                           "reenters every %5, codes %6 and %7, field width %8")
+                .arg(m_device)
+                .arg(m_kind.isFile)
+                .arg(m_kind.overridden)
+                .arg(m_kind.failEvery)
+                .arg(m_kind.returnEvery)
+                .arg(m_kind.indentCode)
+                .arg(m_kind.valueCode)
+                .arg(m_kind.fieldWidth);
+        });
     }
-    qInstallMessageHandler(nullptr);
-}
 
-// As WritersWithoutTypes puts them down.
-QStringList CallsWithoutTypes(QStringList calls)
-{
-    for (QString& call : calls) {
-        call.replace(0, call.indexOf('('),
-                     call.startsWith("write(") ? "Write" : "WriteElementValue");
-        call.chop(2);
-        call.replace(call.indexOf('('), 1, ' ');
+    void finish()
+    {
+        Outcome expected = Plain(m_kind.isFile ? int(IoDevice) : m_device, m_steps, m_kind);
+        Outcome outcome;
+        if (m_kind.isFile)
+            outcome = OfFile(m_steps, m_kind);
+        else if (m_kind.overridden)
+            outcome = OfStream(m_device, m_steps, m_kind);
+        else
+            outcome = OfBase(m_device, m_steps, m_kind);
+        if (m_device == String && !m_kind.isFile)
+            outcome.codes.last() = expected.codes.last() = 0; // only a codec misses half a letter
+        if (!(outcome == expected))
+            same("outcome", Words(outcome), Words(expected));
     }
-    return calls;
-}
 
-void tst_PlainWriters::sameWithoutTypes()
+private:
+    Steps m_steps;
+    int m_device = String;
+    Kind m_kind;
+};
+
+// The same from a file that is compiled without run-time type information.
+class WritersOfNoType : public Program::Pair
 {
-    using WritersWithoutTypes::Overrides;
-    Dice dice(Rounds::seed() + 1);
-    const int count = Rounds::count(1000, 100000);
-    for (int i = 0; i < count; ++i) {
-        const Steps steps = Sequence(dice);
-        const auto overrides = Overrides(dice.below(3));
-        Kind kind;
-        kind.isFile = dice.chance(30);
+public:
+    void perform(Program::Draws& draws)
+    {
+        Dice dice(draws);
+        if (dice.chance(90)) {
+            const Step step = dice.step();
+            draws.tell([&] { return Told(step); });
+            m_steps.append(step);
+            return;
+        }
+        m_overrides = WritersWithoutTypes::Overrides(dice.below(3));
+        m_kind.isFile = dice.chance(30);
+        draws.tell([&] {
+            return QString("the writer: overrides %1, file %2")
+                .arg(int(m_overrides))
+                .arg(m_kind.isFile);
+        });
+    }
 
+    void finish()
+    {
         QVector<int> codes;
         const auto use = [&](auto& writer) {
-            codes = Perform(writer, steps);
+            codes = Perform(writer, m_steps);
         };
         QString text;
-        const QString path = m_folder.filePath("without.xml");
-        const QStringList calls = kind.isFile
-                                      ? WritersWithoutTypes::withFile(overrides, path, use)
-                                      : WritersWithoutTypes::withStream(overrides, text, use);
-        const QByteArray bytes = kind.isFile ? TestFiles::read(path) : text.toLocal8Bit();
+        const QString path = g_folder->filePath("without.xml");
+        const QStringList calls = m_kind.isFile
+                                      ? WritersWithoutTypes::withFile(m_overrides, path, use)
+                                      : WritersWithoutTypes::withStream(m_overrides, text, use);
+        const QByteArray bytes = m_kind.isFile ? TestFiles::read(path) : text.toLocal8Bit();
 
-        if (overrides == Overrides::Write)
-            kind.overridden = Kind::Write;
-        else if (overrides == Overrides::ElementValue)
-            kind.overridden = Kind::Value;
-        const Outcome expected = plain(steps, kind, true);
-        QCOMPARE(codes, expected.codes);
-        QCOMPARE(bytes, expected.bytes);
-        QCOMPARE(calls, CallsWithoutTypes(expected.calls));
-        ++m_sequences;
-        m_calls += steps.size();
+        if (m_overrides == WritersWithoutTypes::Overrides::Write)
+            m_kind.overridden = Kind::Write;
+        else if (m_overrides == WritersWithoutTypes::Overrides::ElementValue)
+            m_kind.overridden = Kind::Value;
+        Outcome expected = Plain(IoDevice, m_steps, m_kind);
+        expected.codes.removeLast();
+        if (codes != expected.codes)
+            same("codes", Words({codes, {}, {}}), Words({expected.codes, {}, {}}));
+        same("bytes", bytes, expected.bytes);
+        same("calls", calls.size(), expected.calls.size());
     }
+
+private:
+    Steps m_steps;
+    WritersWithoutTypes::Overrides m_overrides = WritersWithoutTypes::Overrides(0);
+    Kind m_kind;
+};
+
+} // namespace
+
+class tst_PlainWriters : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void initTestCase();
+    void sameAsPlain();
+    void sameWithoutTypes();
+    void cleanupTestCase();
+
+private:
+    QTemporaryDir m_folder;
+    QtMessageHandler m_handler = nullptr;
+};
+
+// Qt warns about each text that is written without a device.
+void tst_PlainWriters::initTestCase()
+{
+    g_folder = &m_folder;
+    m_handler = qInstallMessageHandler([](QtMsgType, QMessageLogContext const&, QString const&) {});
 }
 
 void tst_PlainWriters::cleanupTestCase()
 {
-    std::printf("plain writers: %d sequences of %d calls, all as the plain writer has them\n",
-                m_sequences, m_calls);
+    qInstallMessageHandler(m_handler);
 }
 
-QTEST_GUILESS_MAIN(tst_PlainWriters)
+void tst_PlainWriters::sameAsPlain()
+{
+    Program::compare<Writers>("writers", Rounds::count(30000, 1000000, 10000000), 24);
+}
+
+void tst_PlainWriters::sameWithoutTypes()
+{
+    Program::compare<WritersOfNoType>("writers without types", Rounds::count(8000, 150000, 1000000),
+                                      24);
+}
+
+int main(int argc, char** argv)
+{
+    Program::useMemoryForFiles();
+    QCoreApplication application(argc, argv);
+    tst_PlainWriters test;
+    return QTest::qExec(&test, argc, argv);
+}
+
 #include "tst_PlainWriters.moc"

@@ -22,7 +22,8 @@ struct Step
         Element,
         ElementValue,
         Attribute,
-        CurrentIndent
+        CurrentIndent,
+        Text
     };
 
     Operation operation;
@@ -120,6 +121,8 @@ int Perform(Writer& writer, Step const& step)
         return writer.WriteAttribute(step.name, step.value);
     case Step::CurrentIndent:
         return writer.WriteCurrentIndent();
+    case Step::Text:
+        return writer.Write(step.value);
     }
     return -1;
 }

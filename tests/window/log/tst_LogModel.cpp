@@ -91,6 +91,9 @@ private slots:
     void nothingOpen();
     void grows();
     void newestRunWritesOverTheOlder();
+    void clockSetBack();
+    void clockSetBackOverOlderEntries();
+    void hiddenLinesCount();
     void changes_data();
     void changes();
     void missingFile();
@@ -256,6 +259,53 @@ void tst_LogModel::newestRunWritesOverTheOlder()
     QCOMPARE(messages.at(messages.indexOf("This run") - 1), QString("x 19"));
     QCOMPARE(counter.resets, 0);
     QVERIFY(counter.right);
+}
+
+// Its entries look like those of an older run, but are new.
+void tst_LogModel::clockSetBack()
+{
+    LogModel model;
+    QByteArray log = run(3, QTime(9, 0), "x") + run(2, QTime(8, 0), "y");
+    open(model, log);
+    QCOMPARE(model.rowCount(), 7); // with headings
+    RowCounter counter(model);
+    log += run(3, QTime(8, 0), "y").mid(run(2, QTime(8, 0), "y").size());
+    QVERIFY(TestFiles::write(m_file, log));
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(model),
+                              QStringList({"Earlier"}) + Numbered("y", 0, 3) +
+                                  QStringList({"This run"}) + Numbered("x", 0, 3),
+                              Patience);
+    QVERIFY(counter.right);
+    QCOMPARE(counter.resets, 0);
+}
+
+// The size of the file and the newest run stay the same.
+void tst_LogModel::clockSetBackOverOlderEntries()
+{
+    LogModel model;
+    const QByteArray older = run(6, QTime(17, 0), "x", true);
+    const QByteArray start = run(2, QTime(9, 0), "n");
+    const QByteArray back = run(3, QTime(8, 0), "n");
+    const int first = back.indexOf('\n') + 1;
+    open(model, writtenOver(older, start + back.left(first)));
+    QVERIFY(WriteAt(m_file, start.size() + first, back.mid(first)));
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(model),
+                              QStringList({"Earlier", "x 5"}) + Numbered("n", 0, 3) +
+                                  QStringList({"This run"}) + Numbered("n", 0, 2),
+                              Patience);
+}
+
+void tst_LogModel::hiddenLinesCount()
+{
+    LogModel model;
+    open(model, run(3, QTime(9, 0), "x"));
+    LogFilter filter;
+    filter.SetText("nowhere", false, false);
+    model.SetFilter(filter);
+    QTRY_COMPARE_WITH_TIMEOUT(model.rowCount(), 0, Patience);
+    QVERIFY(TestFiles::write(m_file, run(5, QTime(9, 0), "x")));
+    QTRY_COMPARE_WITH_TIMEOUT(model.state().lines, size_t(5), Patience);
+    QCOMPARE(model.rowCount(), 0);
 }
 
 void tst_LogModel::changes_data()
