@@ -35,10 +35,11 @@ WORK = ROOT / "build/mutants"
 COPY = WORK / "source"
 ACCEPTED = ROOT / "tests/mutants-accepted.txt"
 GOALS = {"common": 97, "app": 95}  # percent
-# The folders whose sources are changed, and those below tests/ whose tests may notice.
+# The folders whose sources are changed, and the tests, or their folders, that may notice.
+PROOFS = " tst_Faults tst_SystemLimits tst_SuddenDeath tst_Load"
 ROOMS = {
-    "common/config": "config plain reliability",
-    "common/log": "log plain reliability",
+    "common/config": "config plain" + PROOFS,
+    "common/log": "log plain" + PROOFS,
     "common/xml": "xml config plain hostile",
     "app/logfile": "logfile window/log window",
     "app/settingsfile": "settingsfile plain hostile window",
@@ -83,7 +84,7 @@ def configure(build, sanitizer=""):
             "-DCMAKE_CXX_COMPILER=clang++-14", "-DCMAKE_CXX_FLAGS_DEBUG=-O0 -g0",
             f"-DCMAKE_CXX_FLAGS=-w -include {ROOT}/scripts/Mutant.h", "-DVELOCOR_PRECOMPILE=ON",
             "-DCMAKE_EXPORT_COMPILE_COMMANDS=ON", f"-DVELOCOR_SANITIZE={sanitizer}",
-            f"-DCMAKE_DISABLE_PRECOMPILE_HEADERS={'ON' if sanitizer else 'OFF'}")
+            f"-DCMAKE_DISABLE_PRECOMPILE_HEADERS={'ON' if sanitizer else 'OFF'}", stdout=subprocess.DEVNULL)
 
 
 def find(name):
@@ -134,7 +135,8 @@ def build_all(sources):
     for name, _, changed in found:
         update(COPY / name, changed)
     folders = {f for name in sources for f in ROOMS[os.path.dirname(name)].split()}
-    run("ninja", "-C", WORK / "plain", "--quiet", *(f"tests/{folder}/all" for folder in sorted(folders)))
+    run("ninja", "-C", WORK / "plain", "--quiet",
+        *(f if f.startswith("tst_") else f"tests/{f}/all" for f in sorted(folders)))
     return [mutant for _, mutants, _ in found for mutant in mutants], digest(*(changed for *_, changed in found))
 
 
