@@ -82,7 +82,7 @@ def configure(build, sanitizer=""):
     if not (WORK / build / "build.ninja").exists():
         run("cmake", "-S", COPY, "-B", WORK / build, "-G", "Ninja", "-DCMAKE_BUILD_TYPE=Debug",
             "-DCMAKE_CXX_COMPILER=clang++-14", "-DCMAKE_CXX_FLAGS_DEBUG=-O0 -g0",
-            f"-DCMAKE_CXX_FLAGS=-w -include {ROOT}/scripts/Mutant.h", "-DVELOCOR_PRECOMPILE=ON",
+            f"-DCMAKE_CXX_FLAGS=-w -include {COPY}/scripts/Mutant.h", "-DVELOCOR_PRECOMPILE=ON",
             "-DCMAKE_EXPORT_COMPILE_COMMANDS=ON", f"-DVELOCOR_SANITIZE={sanitizer}",
             f"-DCMAKE_DISABLE_PRECOMPILE_HEADERS={'ON' if sanitizer else 'OFF'}", stdout=subprocess.DEVNULL)
 
@@ -148,7 +148,7 @@ def tests(build):
     for test in json.loads(listed)["tests"]:
         properties = {p["name"]: p["value"] for p in test["properties"]}
         variables = dict(v.split("=", 1) for v in properties.get("ENVIRONMENT", []))
-        if test["name"].startswith("tst_") and pathlib.Path(test["command"][-1]).exists():
+        if test["name"].startswith("tst_") and pathlib.Path(test.get("command", ["-"])[-1]).exists():
             found[test["name"]] = (test["command"][-1], variables)
     return found
 
@@ -215,7 +215,7 @@ def in_parallel(desks, work, items, say=lambda done, count: None):
     return results
 
 
-def record(build, desks, sources):
+def record(build, desks, sources, pattern):
     """For each test function of a build, how long it takes and which mutants it reaches."""
     def functions(desk, item):
         name, test = item
@@ -241,7 +241,7 @@ def record(build, desks, sources):
             kept.write_text(json.dumps(found))
         return name, test, json.loads(kept.read_text()), kept.name
 
-    found = in_parallel(desks, functions, sorted(tests(build).items()))
+    found = in_parallel(desks, functions, sorted(i for i in tests(build).items() if re.match(pattern, i[0])))
     reaching = {}
     for name, test, times, _ in found:
         for function, (seconds, numbers) in times.items():
@@ -250,13 +250,12 @@ def record(build, desks, sources):
     return reaching, digest(*(kept for *_, kept in found))
 
 
-def notice(desk, number, reaching, pattern):
+def notice(desk, number, reaching):
     """The test that notices a mutant, if any: quick functions of a program run in one process."""
     runs = {}
     for seconds, name, test, function in sorted(reaching.get(number, []), key=lambda r: r[0]):
-        if re.match(pattern, name):
-            own = function if seconds > 0.5 else ""
-            runs.setdefault((name, own), (test, []))[1].append((seconds, function))
+        own = function if seconds > 0.5 else ""
+        runs.setdefault((name, own), (test, []))[1].append((seconds, function))
     for (name, _), (test, found) in sorted(runs.items(), key=lambda r: sum(s for s, _ in r[1][1])):
         limit = 10 + 6 * sum(seconds for seconds, _ in found)
         why = desk.run(test, [function for _, function in found], limit, VELOCOR_MUTANT=str(number))
@@ -271,16 +270,16 @@ def accepted():
     return set(blocks)
 
 
-def try_all(mutants, sources, desks):
+def try_all(mutants, sources, desks, tests_wanted):
     """Runs the mutants whose result is not known yet; returns the results of all."""
     kept, known = WORK / "results.jsonl", {}
     if kept.exists():
         known = {r["key"]: r for r in map(json.loads, kept.read_text().splitlines())}
-    reaching, state = record("plain", desks, sources)
+    reaching, state = record("plain", desks, sources, tests_wanted)
     lock, started, out = threading.Lock(), time.monotonic(), kept.open("a")
 
     def one(desk, mutant):
-        why = notice(desk, mutant["id"], reaching, "")
+        why = notice(desk, mutant["id"], reaching)
         result = {"key": mutant["key"], "by": why, "state": state, "reached": mutant["id"] in reaching}
         with lock:
             out.write(json.dumps(result) + "\n")
@@ -302,8 +301,8 @@ def try_all(mutants, sources, desks):
         if names:
             configure(build, sanitizer)
             run("ninja", "-C", WORK / build, "--quiet", *sorted(names))
-            sanitized, _ = record(build, desks, sources)
-            for mutant, why in zip(left, in_parallel(desks, lambda desk, m: notice(desk, m["id"], sanitized, pattern), left)):
+            sanitized, _ = record(build, desks, sources, f"({'|'.join(names)})$")
+            for mutant, why in zip(left, in_parallel(desks, lambda desk, m: notice(desk, m["id"], sanitized), left)):
                 known[mutant["key"]]["by"] = why and f"{why} with the {sanitizer} sanitizer"
     return known
 
@@ -352,6 +351,7 @@ def main():
     parser.add_argument("files", nargs="*", help="sources; all by default")
     parser.add_argument("--sample", type=int, help="only as many, 25 a source, chosen by the seed")
     parser.add_argument("--seed", type=int, default=1)
+    parser.add_argument("--tests", default="", help="a pattern: only these tests")
     parser.add_argument("--jobs", type=int, default=os.cpu_count())
     options = parser.parse_args()
 
@@ -373,7 +373,7 @@ def main():
         mutants = [m for name in sources for m in some([m for m in mutants if m["file"] == name], chance)]
     desks = [Desk(number) for number in range(options.jobs)]
     try:
-        known = try_all(mutants, digest_of_sources, desks)
+        known = try_all(mutants, digest_of_sources, desks, options.tests)
     finally:
         for desk in desks:
             desk.server.terminate()
