@@ -31,7 +31,7 @@ struct VelocorMutants
             return;
         const size_t size = size_t(1) << 17;
         const long start =
-            syscall(SYS_mmap, nullptr, size, PROT_READ | PROT_WRITE, MAP_SHARED, file, 0);
+            syscall(SYS_mmap, nullptr, size, PROT_READ | PROT_WRITE, MAP_SHARED, file, 0L);
         if (start != -1)
             reached = reinterpret_cast<std::atomic<char>*>(start);
         syscall(SYS_close, file);
