@@ -10,6 +10,7 @@ under the thread sanitizer as well, dropped deletions under the address sanitize
 build/mutants; results are kept there, so an interrupted run continues where it stopped.
 """
 import argparse
+import collections
 import concurrent.futures
 import contextlib
 import hashlib
@@ -51,6 +52,7 @@ OTHER_SCREENS = "800x600|double_scale"
 SANITIZERS = {"lock": ("tsan", "thread", "tst_(TorkLog|Load)"), "delete": ("asan", "address", "tst_")}
 NUMBERS = 1000  # reserved for each source
 PER_SOURCE = 25  # in a sample
+NOTICED = collections.Counter()
 
 
 def run(*command, **options):
@@ -171,10 +173,12 @@ class Desk:
         program, variables = test
         shutil.rmtree(self.folder, ignore_errors=True)
         (self.folder / "tmp").mkdir(parents=True)
+        (self.folder / "tmp").chmod(0o1777)  # some tests change the user
         home = variables["HOME"]
         own = {k: v.replace(home, str(self.folder / "home")) for k, v in variables.items()}
         (self.folder / "home").mkdir()
-        environment = {**os.environ, **own, "DISPLAY": self.display, "TMPDIR": str(self.folder / "tmp"), **more}
+        environment = {**os.environ, **own, "DISPLAY": self.display, "TMPDIR": str(self.folder / "tmp"),
+                       "QTEST_DISABLE_STACK_DUMP": "1", **more}
         output = self.folder / "output"
         command = ["prlimit", "--core=0", "--fsize=4294967296:", program, *functions]
         with output.open("wb") as out:
@@ -256,10 +260,14 @@ def notice(desk, number, reaching):
     for seconds, name, test, function in sorted(reaching.get(number, []), key=lambda r: r[0]):
         own = function if seconds > 0.5 else ""
         runs.setdefault((name, own), (test, []))[1].append((seconds, function))
-    for (name, _), (test, found) in sorted(runs.items(), key=lambda r: sum(s for s, _ in r[1][1])):
+    def cost(entry):  # less for a test that noticed others
+        return sum(seconds for seconds, _ in entry[1][1]) / (1 + NOTICED[entry[0]])
+
+    for (name, own), (test, found) in sorted(runs.items(), key=cost):
         limit = 10 + 6 * sum(seconds for seconds, _ in found)
         why = desk.run(test, [function for _, function in found], limit, VELOCOR_MUTANT=str(number))
         if why:
+            NOTICED[name, own] += 1
             return f"{name} {why}"
     return None
 
