@@ -13,6 +13,7 @@ import argparse
 import collections
 import concurrent.futures
 import contextlib
+import fcntl
 import hashlib
 import json
 import multiprocessing
@@ -172,11 +173,11 @@ class Desk:
         """Runs functions of a test until one fails; returns why it failed, or nothing."""
         program, variables = test
         shutil.rmtree(self.folder, ignore_errors=True)
-        (self.folder / "tmp").mkdir(parents=True)
+        (self.folder / "tmp").mkdir(parents=True, exist_ok=True)
         (self.folder / "tmp").chmod(0o1777)  # some tests change the user
         home = variables["HOME"]
         own = {k: v.replace(home, str(self.folder / "home")) for k, v in variables.items()}
-        (self.folder / "home").mkdir()
+        (self.folder / "home").mkdir(exist_ok=True)
         environment = {**os.environ, **own, "DISPLAY": self.display, "TMPDIR": str(self.folder / "tmp"),
                        "QTEST_DISABLE_STACK_DUMP": "1", **more}
         output = self.folder / "output"
@@ -213,9 +214,13 @@ def in_parallel(desks, work, items, say=lambda done, count: None):
 
     results = []
     with concurrent.futures.ThreadPoolExecutor(len(desks)) as pool:
-        for result in pool.map(one, items):
-            results.append(result)
-            say(len(results), len(items))
+        try:
+            for result in pool.map(one, items):
+                results.append(result)
+                say(len(results), len(items))
+        except BaseException:
+            pool.shutdown(cancel_futures=True)
+            raise
     return results
 
 
@@ -366,6 +371,9 @@ def main():
     wrong = [name for name in options.files if name not in targets()]
     if wrong:
         parser.error(f"not among the sources that are changed: {', '.join(wrong)}")
+    WORK.mkdir(parents=True, exist_ok=True)
+    alone = (WORK / "lock").open("w")
+    fcntl.flock(alone, fcntl.LOCK_EX)
     sources = options.files or targets()
     chance = random.Random(options.seed)
     if options.sample:
