@@ -160,7 +160,7 @@ class Finder:
             if re.search("flush|sync", cursor.spelling, re.I):
                 self.add("flush", start, end, "true")
             self.swap(cursor)
-        elif cursor.kind == K.INTEGER_LITERAL and text:
+        elif cursor.kind == K.INTEGER_LITERAL and text[:1].isdigit():  # not in a macro
             number = re.fullmatch(r"(\d+)(\w*)", text)
             for step in (1, -1):
                 self.add("constant", start, end,
