@@ -179,7 +179,7 @@ class Finder:
                 self.add("constant", start, end, f"({text} - 1)")
 
     def swap(self, call):
-        if call.spelling in ("min", "max"):
+        if call.spelling in ("min", "max", "swap"):  # their order does not matter
             return
         arguments = [a for a in call.get_arguments() if a is not None and a.extent.end.offset > a.extent.start.offset]
         for a, b in zip(arguments, arguments[1:]):

@@ -23,6 +23,7 @@ private slots:
     void regular_data();
     void regular();
     void appending();
+    void appendingWithoutOtherFlags();
     void appendingOfAClosedFile();
     void sizePositionAndEnd();
     void writesTheBytes();
@@ -121,6 +122,18 @@ void tst_TorkLogPlace::appending()
     QCOMPARE(::fcntl(file.handle(), F_GETFL), before);
 }
 
+void tst_TorkLogPlace::appendingWithoutOtherFlags()
+{
+    int ends[2];
+    QCOMPARE(pipe(ends), 0);
+    QFile file;
+    QVERIFY(file.open(ends[0], QIODevice::ReadOnly, QFileDevice::AutoCloseHandle));
+    QCOMPARE(::fcntl(ends[0], F_GETFL), 0);
+    TorkLogPlace::SetAppending(file, true);
+    QCOMPARE(::fcntl(ends[0], F_GETFL), O_APPEND);
+    ::close(ends[1]);
+}
+
 void tst_TorkLogPlace::appendingOfAClosedFile()
 {
     QFile closed("nowhere");
@@ -167,6 +180,7 @@ void tst_TorkLogPlace::closedFileHasNoSizeAndTakesNothing()
     QFile closed("nowhere");
     QCOMPARE(TorkLogPlace::Size(closed), qint64(0));
     QCOMPARE(TorkLogPlace::Position(closed), qint64(-1));
+    QVERIFY(!TorkLogPlace::IsAtEnd(closed));
     QCOMPARE(TorkLogPlace::Write(closed, "12345", 3), 0);
 }
 

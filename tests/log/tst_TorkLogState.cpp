@@ -33,8 +33,12 @@ private slots:
     void stampKeptAtMidnight_data();
     void stampKeptAtMidnight();
     void copyHasItsPermissionsAndAllBytes();
-    void oddNamesDoNotPrune_data();
-    void oddNamesDoNotPrune();
+    void oddNamesAndPruning_data();
+    void oddNamesAndPruning();
+    void nameOfAFileThatIsContinued();
+    void echoHasNoLineNumber();
+    void waitsForTheMessage_data();
+    void waitsForTheMessage();
 };
 
 struct FileSpec
@@ -265,30 +269,125 @@ void tst_TorkLogState::copyHasItsPermissionsAndAllBytes()
     QCOMPARE(copy.readAll(), text);
 }
 
-// With a limit of 0, names without a number of their own do not count as older files, so nothing is
-// pruned for them: number 1, a link without a target here, stays.
-void tst_TorkLogState::oddNamesDoNotPrune_data()
+// Number 1 is a link without a target here, which is no older file but is pruned like one, up to
+// one above the highest number.
+void tst_TorkLogState::oddNamesAndPruning_data()
 {
     QTest::addColumn<QString>("name");
+    QTest::addColumn<QString>("limit");
+    QTest::addColumn<QString>("link");
+    QTest::addColumn<bool>("linkStays");
 
-    QTest::newRow("letters") << "app.log.old";
-    QTest::newRow("negative") << "app.log.-1";
-    QTest::newRow("more negative") << "app.log.-2";
+    const auto row = [](char const* name, char const* file, char const* limit, char const* link,
+                        bool stays) {
+        QTest::newRow(name) << QString::fromLatin1(file) << QString::fromLatin1(limit)
+                            << QString::fromLatin1(link) << stays;
+    };
+    row("letters are no number", "app.log.old", "0", "app.log.1", true);
+    row("minus one is no number", "app.log.-1", "0", "app.log.1", true);
+    row("nor is minus two", "app.log.-2", "0", "app.log.1", true);
+    row("zero is one", "app.log.0", "0", "app.log.1", false);
+    row("one above the highest", "app.log.1", "1", "app.log.2", false);
+    row("two above the highest", "app.log.1", "1", "app.log.3", true);
 }
 
-void tst_TorkLogState::oddNamesDoNotPrune()
+void tst_TorkLogState::oddNamesAndPruning()
 {
     QFETCH(QString, name);
+    QFETCH(QString, limit);
+    QFETCH(QString, link);
     LogFolder folder;
     QVERIFY(TestFiles::write(folder.logs() + name, "odd"));
-    QVERIFY(QFile::link("nowhere", folder.logs() + "app.log.1"));
+    QVERIFY(QFile::link("nowhere", folder.logs() + link));
     TorkLog log;
     log.setOutputPath(folder.logs());
-    folder.configure(log, {{"filePrefix", "app"}, {"maxLogFiles", "0"}});
+    folder.configure(log, {{"filePrefix", "app"}, {"maxLogFiles", limit}});
     log.deleteOldFiles();
 
-    QVERIFY(QFileInfo(folder.logs() + "app.log.1").isSymLink());
-    QVERIFY(QFile::exists(folder.logs() + name));
+    QTEST(QFileInfo(folder.logs() + link).isSymLink(), "linkStays");
+}
+
+// Whoever keeps the reference that newLogFileName() returned sees which file is in use.
+void tst_TorkLogState::nameOfAFileThatIsContinued()
+{
+    LogFolder folder;
+    QVERIFY(TestFiles::write(folder.logs() + "app.log", "old\n"));
+    TorkLog log;
+    folder.prepare(log, "app");
+    QString const& name = log.newLogFileName();
+    log.setOutputPath("/elsewhere/");
+    log.newLogFileName();
+    log.setOutputPath(folder.logs());
+    QCOMPARE(name, QString("/elsewhere/app.log"));
+
+    log.trace("entry");
+    QCOMPARE(name, folder.logs() + "app.log");
+}
+
+// A line of the log has no place in a source.
+void tst_TorkLogState::echoHasNoLineNumber()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    log.setLogPipeToConsole(true);
+    QFile output(folder.root() + "output");
+    QVERIFY(output.open(QIODevice::ReadWrite));
+
+    qSetMessagePattern("line %{line}");
+    const int before = dup(STDERR_FILENO);
+    dup2(output.handle(), STDERR_FILENO);
+    log.write("text\n");
+    dup2(before, STDERR_FILENO);
+    ::close(before);
+    qSetMessagePattern("%{if-category}%{category}: %{endif}%{message}");
+    qInstallMessageHandler(nullptr);
+
+    QCOMPARE(output.readAll(), QByteArray("line 0\n"));
+}
+
+// Otherwise the log would be deleted under a message that another thread writes.
+void tst_TorkLogState::waitsForTheMessage_data()
+{
+    QTest::addColumn<bool>("shutsDown");
+
+    QTest::newRow("shutdown") << true;
+    QTest::newRow("initialize") << false;
+}
+
+void tst_TorkLogState::waitsForTheMessage()
+{
+    QFETCH(bool, shutsDown);
+    LogFolder folder;
+    TorkLog::initialize(folder.logs(), "app", folder.settingsFile(), true);
+    qWarning("the file is open");
+
+    std::atomic<bool> isWriting{false};
+    std::atomic<bool> mayGoOn{false};
+    s_beforeWriting = [&] {
+        isWriting = true;
+        while (!mayGoOn)
+            std::this_thread::yield();
+    };
+    std::thread writer([] { qWarning("message"); });
+    while (!isWriting)
+        std::this_thread::yield();
+    std::atomic<bool> isDone{false};
+    std::thread other([&] {
+        if (shutsDown)
+            TorkLog::shutdown();
+        else
+            TorkLog::initialize(folder.logs(), "app", folder.settingsFile(), true);
+        isDone = true;
+    });
+    std::this_thread::sleep_for(std::chrono::milliseconds(50));
+    const bool waited = !isDone;
+    mayGoOn = true;
+    writer.join();
+    other.join();
+    s_beforeWriting = nullptr;
+    TorkLog::shutdown();
+    QVERIFY(waited);
 }
 
 QTEST_GUILESS_MAIN(tst_TorkLogState)
