@@ -317,6 +317,8 @@ def try_all(mutants, sources, desks, tests_wanted):
             sanitized, _ = record(build, desks, sources, f"({'|'.join(names)})$")
             for mutant, why in zip(left, in_parallel(desks, lambda desk, m: notice(desk, m["id"], sanitized), left)):
                 known[mutant["key"]]["by"] = why and f"{why} with the {sanitizer} sanitizer"
+                out.write(json.dumps(known[mutant["key"]]) + "\n")
+    out.close()
     return known
 
 
