@@ -30,7 +30,8 @@ import sys
 import threading
 import time
 
-import mutations
+sys.dont_write_bytecode = True  # no files of its own in the checkout
+import mutations  # noqa: E402
 
 ROOT = pathlib.Path(__file__).resolve().parent.parent
 WORK = ROOT / "build/mutants"
