@@ -12,8 +12,10 @@
 #include <atomic>
 #include <chrono>
 #include <dlfcn.h>
+#include <fcntl.h>
 #include <functional>
 #include <sys/syscall.h>
+#include <sys/wait.h>
 #include <thread>
 #include <unistd.h>
 
@@ -36,6 +38,7 @@ private slots:
     void oddNamesAndPruning_data();
     void oddNamesAndPruning();
     void nameOfAFileThatIsContinued();
+    void lockOfTheFileEndsWithTheEntry();
     void echoHasNoLineNumber();
     void waitsForTheMessage_data();
     void waitsForTheMessage();
@@ -322,6 +325,27 @@ void tst_TorkLogState::nameOfAFileThatIsContinued()
 
     log.trace("entry");
     QCOMPARE(name, folder.logs() + "app.log");
+}
+
+// Another program that writes to the file would otherwise take it for busy from then on.
+void tst_TorkLogState::lockOfTheFileEndsWithTheEntry()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    log.trace("first");
+
+    const QByteArray name = QFile::encodeName(folder.logs() + "app.log");
+    const pid_t other = fork();
+    if (other == 0) {
+        struct flock wanted = {};
+        wanted.l_type = F_WRLCK;
+        const bool asked = ::fcntl(::open(name.constData(), O_RDWR), F_GETLK, &wanted) == 0;
+        _exit(asked && wanted.l_type == F_UNLCK ? 0 : 1);
+    }
+    int status = -1;
+    QCOMPARE(waitpid(other, &status, 0), other);
+    QCOMPARE(status, 0);
 }
 
 // A line of the log has no place in a source.
