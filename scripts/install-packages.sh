@@ -33,7 +33,7 @@ packages_of() {
         ;;
     */fuzz) echo clang-14 libclang-rt-14-dev ;;
     */package) echo dpkg-dev desktop-file-utils appstream man-db ;;
-    */check) echo clazy cppcheck gcovr valgrind python3 ;;
+    */check) echo clazy cppcheck gcovr valgrind python3 python3-clang-14 ;;
     */lint) echo git clang-format-14 clang-tidy-14 shellcheck ;;
     *)
         say "unknown group: $1"

@@ -82,12 +82,17 @@ qint64 LogIndex::resumeOffset() const
     return resume < m_starts.size() ? m_starts[resume] : m_position;
 }
 
+qint64 LogIndex::completeOffset() const
+{
+    return m_lastIsComplete || m_starts.empty() ? m_position : m_starts.back();
+}
+
 qint64 LogIndex::Begin()
 {
     const bool isFirst = m_starts.empty();
     const bool hasSeam = m_runs.size() > 1;
     m_formerEnd = m_position;
-    m_knownEnd = m_lastIsComplete || isFirst ? m_position : m_starts.back();
+    m_knownEnd = completeOffset();
     m_knownSeam = hasSeam ? m_starts[m_runs[1].firstLine] : -1;
     m_isSeamUnchanged = false;
     m_hasMoved = false;

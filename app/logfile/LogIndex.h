@@ -64,6 +64,9 @@ public:
     /// Ends the pass at the end of the file; a last line without a line end counts as a line.
     void End();
 
+    /// Where the last complete line ends; after it the file may still change.
+    qint64 completeOffset() const;
+
     /// The lines that match a filter, whose text must be that of the filter the index was made
     /// with.
     LogRows Rows(LogFilter const& filter) const;

@@ -169,7 +169,7 @@ void LogScanner::noteFile(QFile& file)
     m_head = BytesAt(file, 0, std::min<qint64>(HeadSize, m_anchorEnd));
     const qint64 start = std::max<qint64>(0, m_anchorEnd - AnchorSize);
     m_anchor = BytesAt(file, start, m_anchorEnd - start);
-    const qint64 end = m_index.nextOffset();
+    const qint64 end = m_index.completeOffset();
     m_tail = BytesAt(file, std::max<qint64>(0, end - TailSize), std::min<qint64>(end, TailSize));
 }
 
@@ -177,7 +177,7 @@ bool LogScanner::isSameFile(QFile& file) const
 {
     if (file.size() < m_size || !BytesAt(file, 0, HeadSize).startsWith(m_head))
         return false;
-    const qint64 end = m_index.nextOffset();
+    const qint64 end = m_index.completeOffset();
     return BytesAt(file, m_anchorEnd - m_anchor.size(), m_anchor.size()) == m_anchor &&
            BytesAt(file, end - m_tail.size(), m_tail.size()) == m_tail;
 }

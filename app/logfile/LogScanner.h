@@ -21,9 +21,9 @@ namespace Velocor {
 ///
 /// The file is read in slices through an ordinary handle: with a mapped file, the program would
 /// crash if the file were truncated. The file is identified by its first bytes, by those before the
-/// position where reading resumes, and by its last; if any have changed, it is another file or
-/// another run and is read from the start. So it is if the file was modified and nothing new is
-/// found where it is expected.
+/// position where reading resumes, and by those of its last complete lines; if any have changed, it
+/// is another file or another run and is read from the start. So it is if the file was modified and
+/// nothing new is found where it is expected.
 ///
 /// Requests are numbered; SetCurrentRequest() with a later number cancels work on an earlier one.
 /// SetCurrentRequest() may be called from any thread, everything else only from the scanner's.

@@ -294,7 +294,8 @@ void TorkLog::shiftOldFiles(QString const& directory) const
     const auto name = [&start](int number) -> QString {
         return start + QString::number(number);
     };
-    if (files.isEmpty() && !start.startsWith(QLatin1Char('.'))) {
+    const bool isListed = !start.startsWith(QLatin1Char('.')) && !start.contains(QLatin1Char('/'));
+    if (files.isEmpty() && isListed) {
         for (int number = 1; QFileInfo(m_path + name(number)).isFile(); ++number)
             numbered.insert(number, name(number));
     }

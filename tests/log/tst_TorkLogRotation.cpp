@@ -518,6 +518,12 @@ void tst_TorkLogRotation::unfinishedCopies_data()
     }
     QTest::newRow("name of another kind") << "app.log.1.part: x" << true;
     QTest::newRow("digits") << "app.log.1.aBc1yZ.part: x" << true;
+    QTest::newRow("letters at the ends") << "app.log.1.azAZzA.part: half" << false;
+    QTest::newRow("a digit at the end") << "app.log.1.aBcXy1.part: x" << true;
+    QTest::newRow("before a") << "app.log.1.aBcXy`.part: x" << true;
+    QTest::newRow("after z") << "app.log.1.aBcXy{.part: x" << true;
+    QTest::newRow("before A") << "app.log.1.aBcXy@.part: x" << true;
+    QTest::newRow("after Z") << "app.log.1.aBcXy[.part: x" << true;
     QTest::newRow("five letters") << "app.log.1.aBcXy.part: x" << true;
     QTest::newRow("seven letters") << "app.log.1.aBcXyZz.part: x" << true;
     QTest::newRow("of another number") << "app.log.2.aBcXyZ.part: x" << true;

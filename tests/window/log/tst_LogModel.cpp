@@ -261,20 +261,18 @@ void tst_LogModel::newestRunWritesOverTheOlder()
     QVERIFY(counter.right);
 }
 
-// Its entries look like those of an older run, but are new.
+// By an hour, as at the end of daylight saving time.
 void tst_LogModel::clockSetBack()
 {
     LogModel model;
     QByteArray log = run(3, QTime(9, 0), "x") + run(2, QTime(8, 0), "y");
     open(model, log);
-    QCOMPARE(model.rowCount(), 7); // with headings
+    QCOMPARE(model.rowCount(), 5); // without headings
     RowCounter counter(model);
     log += run(3, QTime(8, 0), "y").mid(run(2, QTime(8, 0), "y").size());
     QVERIFY(TestFiles::write(m_file, log));
     QTRY_COMPARE_WITH_TIMEOUT(Messages(model),
-                              QStringList({"Earlier"}) + Numbered("y", 0, 3) +
-                                  QStringList({"This run"}) + Numbered("x", 0, 3),
-                              Patience);
+                              QStringList(Numbered("x", 0, 3) + Numbered("y", 0, 3)), Patience);
     QVERIFY(counter.right);
     QCOMPARE(counter.resets, 0);
 }
@@ -290,8 +288,8 @@ void tst_LogModel::clockSetBackOverOlderEntries()
     open(model, writtenOver(older, start + back.left(first)));
     QVERIFY(WriteAt(m_file, start.size() + first, back.mid(first)));
     QTRY_COMPARE_WITH_TIMEOUT(Messages(model),
-                              QStringList({"Earlier", "x 5"}) + Numbered("n", 0, 3) +
-                                  QStringList({"This run"}) + Numbered("n", 0, 2),
+                              QStringList({"Earlier", "x 5", "This run"}) + Numbered("n", 0, 2) +
+                                  Numbered("n", 0, 3),
                               Patience);
 }
 

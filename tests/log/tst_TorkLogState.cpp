@@ -1,0 +1,421 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "common/log/TorkLog.h"
+#include "common/log/TorkLogLock_p.h"
+#include "log/LogFolder.h"
+#include "support/PrivateField.h"
+#include "support/TestClock.h"
+
+#include <QtTest>
+
+#include <atomic>
+#include <chrono>
+#include <dlfcn.h>
+#include <fcntl.h>
+#include <functional>
+#include <sys/syscall.h>
+#include <sys/wait.h>
+#include <thread>
+#include <unistd.h>
+
+// What a log keeps in its members beyond what it returns, and what its operations lock.
+class tst_TorkLogState : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void cleanup();
+
+    void firstLogFindsTheHandlerOfQt();
+    void clearEmptiesBuffersAndSwitches();
+    void isWritingWhileALineIsWritten();
+    void waitsForTheLock_data();
+    void waitsForTheLock();
+    void stampKeptAtMidnight_data();
+    void stampKeptAtMidnight();
+    void copyHasItsPermissionsAndAllBytes();
+    void oddNamesAndPruning_data();
+    void oddNamesAndPruning();
+    void nameOfAFileThatIsContinued();
+    void lockOfTheFileEndsWithTheEntry();
+    void echoHasNoLineNumber();
+    void waitsForTheMessage_data();
+    void waitsForTheMessage();
+};
+
+struct FileSpec
+{
+    using Field = QString TorkLog::*;
+    friend Field privateField(FileSpec);
+};
+template struct PrivateField<FileSpec, &TorkLog::m_fileSpec>;
+
+struct LogFileName
+{
+    using Field = QString TorkLog::*;
+    friend Field privateField(LogFileName);
+};
+template struct PrivateField<LogFileName, &TorkLog::m_logFileName>;
+
+struct SeverityName
+{
+    using Field = QString TorkLog::*;
+    friend Field privateField(SeverityName);
+};
+template struct PrivateField<SeverityName, &TorkLog::m_severityName>;
+
+struct ConsoleKey
+{
+    using Field = QString TorkLog::*;
+    friend Field privateField(ConsoleKey);
+};
+template struct PrivateField<ConsoleKey, &TorkLog::m_outputToConsoleKey>;
+
+struct Console
+{
+    using Field = bool TorkLog::*;
+    friend Field privateField(Console);
+};
+template struct PrivateField<Console, &TorkLog::m_outputToConsole>;
+
+struct Writing
+{
+    using Field = int TorkLog::*;
+    friend Field privateField(Writing);
+};
+template struct PrivateField<Writing, &TorkLog::m_writing>;
+
+struct Mutex
+{
+    using Field = QMutex TorkLog::*;
+    friend Field privateField(Mutex);
+};
+template struct PrivateField<Mutex, &TorkLog::m_mutex>;
+
+namespace {
+
+int s_installedHandlers = 0;
+std::function<void()> s_beforeWriting;
+
+} // namespace
+
+// In place of the C library's: what a log looks like while it writes.
+extern "C" ssize_t write(int file, void const* bytes, size_t count)
+{
+    if (s_beforeWriting)
+        s_beforeWriting();
+    return syscall(SYS_write, file, bytes, count);
+}
+
+// In place of Qt's, which it calls: how often a handler is installed.
+QtMessageHandler qInstallMessageHandler(QtMessageHandler handler)
+{
+    using Install = QtMessageHandler (*)(QtMessageHandler);
+    static const auto install = reinterpret_cast<Install>(dlsym(
+        RTLD_NEXT, "_Z22qInstallMessageHandlerPFv9QtMsgTypeRK18QMessageLogContextRK7QStringE"));
+    ++s_installedHandlers;
+    return install(handler);
+}
+
+void tst_TorkLogState::cleanup()
+{
+    s_beforeWriting = nullptr;
+    TestClock::release();
+}
+
+// Later other threads may run, whose messages would miss the handler for a moment.
+void tst_TorkLogState::firstLogFindsTheHandlerOfQt()
+{
+    s_installedHandlers = 0;
+    TorkLog log(QStringLiteral("/x/"));
+    QCOMPARE(s_installedHandlers, 2);
+    TorkLog_DefaultMessageHandler();
+    QCOMPARE(s_installedHandlers, 2);
+}
+
+void tst_TorkLogState::clearEmptiesBuffersAndSwitches()
+{
+    TorkLog log;
+    QCOMPARE(log.*privateField(Console()), false);
+    QCOMPARE(log.*privateField(ConsoleKey()), QString("outputToConsole"));
+    QCOMPARE(log.*privateField(Writing()), 0);
+
+    log.*privateField(FileSpec()) = "x";
+    log.*privateField(LogFileName()) = "x";
+    log.*privateField(SeverityName()) = "x";
+    log.*privateField(ConsoleKey()) = "x";
+    log.*privateField(Console()) = true;
+    log.*privateField(Writing()) = 2;
+    log.clear();
+
+    for (QString const& text : {log.*privateField(FileSpec()), log.*privateField(LogFileName()),
+                                log.*privateField(SeverityName())}) {
+        QVERIFY(text.isEmpty());
+        QVERIFY(!text.isNull());
+    }
+    QCOMPARE(log.*privateField(ConsoleKey()), QString("outputToConsole"));
+    QCOMPARE(log.*privateField(Console()), false);
+    QCOMPARE(log.*privateField(Writing()), 0);
+}
+
+void tst_TorkLogState::isWritingWhileALineIsWritten()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    log.write("first\n");
+
+    QList<int> seen;
+    s_beforeWriting = [&] {
+        seen.append(log.*privateField(Writing()));
+    };
+    log.write("second\n");
+    s_beforeWriting = nullptr;
+
+    QCOMPARE(seen, QList<int>{1});
+    QCOMPARE(log.*privateField(Writing()), 0);
+}
+
+// Whoever needs the lock waits while another thread has it. If one did not, a slow machine might
+// not show it, but no machine fails one that does.
+void tst_TorkLogState::waitsForTheLock_data()
+{
+    using Operation = std::function<void(TorkLog&)>;
+    QTest::addColumn<Operation>("operation");
+
+    const auto row = [](char const* name, Operation const& operation) {
+        QTest::newRow(name) << operation;
+    };
+    row("clear", [](TorkLog& log) { log.clear(); });
+    row("setOutputPath", [](TorkLog& log) { log.setOutputPath("/x/"); });
+    row("path", [](TorkLog& log) { log.path(); });
+    row("errorString", [](TorkLog& log) { log.errorString(); });
+    row("fileSpec", [](TorkLog& log) { log.fileSpec(true); });
+    row("newLogFileName", [](TorkLog& log) { log.newLogFileName(); });
+    row("currentLogFile", [](TorkLog& log) { log.currentLogFile(); });
+    row("open", [](TorkLog& log) { log.open("/"); });
+    row("close", [](TorkLog& log) { log.close(); });
+    row("entry", [](TorkLog& log) { log.trace("entry"); });
+    row("ready line", [](TorkLog& log) { log.write("line\n"); });
+    row("setPreferencesFileName", [](TorkLog& log) { log.setPreferencesFileName("/x/y"); });
+    row("preferencesFileName", [](TorkLog& log) { log.preferencesFileName(); });
+    row("dateTimeFormat", [](TorkLog& log) { log.dateTimeFormat(); });
+    row("elapsedTimePrefix", [](TorkLog& log) { log.elapsedTimePrefix(); });
+    row("filePrefix", [](TorkLog& log) { log.filePrefix(); });
+}
+Q_DECLARE_METATYPE(std::function<void(TorkLog&)>)
+
+void tst_TorkLogState::waitsForTheLock()
+{
+    QFETCH(std::function<void(TorkLog&)>, operation);
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+
+    QMutex& mutex = log.*privateField(Mutex());
+    std::atomic<bool> isDone{false};
+    mutex.lock();
+    std::thread other([&] {
+        operation(log);
+        isDone = true;
+    });
+    std::this_thread::sleep_for(std::chrono::milliseconds(50));
+    const bool waited = !isDone;
+    mutex.unlock();
+    other.join();
+    QVERIFY(waited);
+}
+
+// Midnight is a time of day like any other: a stamp that is kept is written once.
+void tst_TorkLogState::stampKeptAtMidnight_data()
+{
+    QTest::addColumn<QTime>("time");
+
+    QTest::newRow("midnight") << QTime(0, 0, 0, 0);
+    QTest::newRow("a millisecond later") << QTime(0, 0, 0, 1);
+}
+
+void tst_TorkLogState::stampKeptAtMidnight()
+{
+    QFETCH(QTime, time);
+    TestClock::set(QDateTime(QDate(2021, 3, 4), time));
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+
+    log.trace("first");
+    log.trace("second");
+    log.trace("third");
+    QCOMPARE(folder.listing(),
+             QStringList("app.log: T Trace first\nT Trace second\nT Trace third\n"));
+}
+
+void tst_TorkLogState::copyHasItsPermissionsAndAllBytes()
+{
+    LogFolder folder;
+    const QString current = folder.logs() + "app.log";
+    const QByteArray text = QByteArray(3 << 16, 'x') + "\n";
+    QVERIFY(TestFiles::write(current, text));
+    const QFileDevice::Permissions odd = QFileDevice::ReadOwner | QFileDevice::ReadUser |
+                                         QFileDevice::WriteOwner | QFileDevice::WriteUser |
+                                         QFileDevice::ReadGroup;
+    QVERIFY(QFile::setPermissions(current, odd));
+
+    TorkLog log;
+    folder.prepare(log, "app", 2048);
+    log.deleteOldFiles();
+
+    QFile copy(current + ".1");
+    QCOMPARE(copy.permissions(), odd);
+    QVERIFY(copy.open(QIODevice::ReadOnly));
+    QCOMPARE(copy.readAll(), text);
+}
+
+// Number 1 is a link without a target here, which is no older file but is pruned like one, up to
+// one above the highest number.
+void tst_TorkLogState::oddNamesAndPruning_data()
+{
+    QTest::addColumn<QString>("name");
+    QTest::addColumn<QString>("limit");
+    QTest::addColumn<QString>("link");
+    QTest::addColumn<bool>("linkStays");
+
+    const auto row = [](char const* name, char const* file, char const* limit, char const* link,
+                        bool stays) {
+        QTest::newRow(name) << QString::fromLatin1(file) << QString::fromLatin1(limit)
+                            << QString::fromLatin1(link) << stays;
+    };
+    row("letters are no number", "app.log.old", "0", "app.log.1", true);
+    row("minus one is no number", "app.log.-1", "0", "app.log.1", true);
+    row("nor is minus two", "app.log.-2", "0", "app.log.1", true);
+    row("zero is one", "app.log.0", "0", "app.log.1", false);
+    row("one above the highest", "app.log.1", "1", "app.log.2", false);
+    row("two above the highest", "app.log.1", "1", "app.log.3", true);
+}
+
+void tst_TorkLogState::oddNamesAndPruning()
+{
+    QFETCH(QString, name);
+    QFETCH(QString, limit);
+    QFETCH(QString, link);
+    LogFolder folder;
+    QVERIFY(TestFiles::write(folder.logs() + name, "odd"));
+    QVERIFY(QFile::link("nowhere", folder.logs() + link));
+    TorkLog log;
+    log.setOutputPath(folder.logs());
+    folder.configure(log, {{"filePrefix", "app"}, {"maxLogFiles", limit}});
+    log.deleteOldFiles();
+
+    QTEST(QFileInfo(folder.logs() + link).isSymLink(), "linkStays");
+}
+
+// Whoever keeps the reference that newLogFileName() returned sees which file is in use.
+void tst_TorkLogState::nameOfAFileThatIsContinued()
+{
+    LogFolder folder;
+    QVERIFY(TestFiles::write(folder.logs() + "app.log", "old\n"));
+    TorkLog log;
+    folder.prepare(log, "app");
+    QString const& name = log.newLogFileName();
+    log.setOutputPath("/elsewhere/");
+    log.newLogFileName();
+    log.setOutputPath(folder.logs());
+    QCOMPARE(name, QString("/elsewhere/app.log"));
+
+    log.trace("entry");
+    QCOMPARE(name, folder.logs() + "app.log");
+}
+
+// Another program that writes to the file would otherwise take it for busy from then on.
+void tst_TorkLogState::lockOfTheFileEndsWithTheEntry()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    log.trace("first");
+
+    const QByteArray name = QFile::encodeName(folder.logs() + "app.log");
+    const pid_t other = fork();
+    if (other == 0) {
+        struct flock wanted = {};
+        wanted.l_type = F_WRLCK;
+        const bool asked = ::fcntl(::open(name.constData(), O_RDWR), F_GETLK, &wanted) == 0;
+        _exit(asked && wanted.l_type == F_UNLCK ? 0 : 1);
+    }
+    int status = -1;
+    QCOMPARE(waitpid(other, &status, 0), other);
+    QCOMPARE(status, 0);
+}
+
+// A line of the log has no place in a source.
+void tst_TorkLogState::echoHasNoLineNumber()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+    log.setLogPipeToConsole(true);
+    QFile output(folder.root() + "output");
+    QVERIFY(output.open(QIODevice::ReadWrite));
+
+    qSetMessagePattern("line %{line}");
+    const int before = dup(STDERR_FILENO);
+    dup2(output.handle(), STDERR_FILENO);
+    log.write("text\n");
+    dup2(before, STDERR_FILENO);
+    ::close(before);
+    qSetMessagePattern("%{if-category}%{category}: %{endif}%{message}");
+    qInstallMessageHandler(nullptr);
+
+    QFile written(output.fileName());
+    QVERIFY(written.open(QIODevice::ReadOnly));
+    QCOMPARE(written.readAll(), QByteArray("line 0\n"));
+}
+
+// Otherwise the log would be deleted under a message that another thread writes.
+void tst_TorkLogState::waitsForTheMessage_data()
+{
+    QTest::addColumn<bool>("shutsDown");
+
+    QTest::newRow("shutdown") << true;
+    QTest::newRow("initialize") << false;
+}
+
+void tst_TorkLogState::waitsForTheMessage()
+{
+    QFETCH(bool, shutsDown);
+    LogFolder folder;
+    TorkLog::initialize(folder.logs(), "app", folder.settingsFile(), true);
+    qWarning("the file is open");
+
+    std::atomic<bool> isWriting{false};
+    std::atomic<bool> mayGoOn{false};
+    s_beforeWriting = [&] {
+        isWriting = true;
+        while (!mayGoOn)
+            std::this_thread::yield();
+    };
+    std::thread writer([] { qWarning("message"); });
+    while (!isWriting)
+        std::this_thread::yield();
+    std::atomic<bool> isDone{false};
+    std::thread other([&] {
+        if (shutsDown)
+            TorkLog::shutdown();
+        else
+            TorkLog::initialize(folder.logs(), "app", folder.settingsFile(), true);
+        isDone = true;
+    });
+    std::this_thread::sleep_for(std::chrono::milliseconds(50));
+    const bool waited = !isDone;
+    mayGoOn = true;
+    writer.join();
+    other.join();
+    s_beforeWriting = nullptr;
+    TorkLog::shutdown();
+    QVERIFY(waited);
+}
+
+QTEST_GUILESS_MAIN(tst_TorkLogState)
+
+#include "tst_TorkLogState.moc"
