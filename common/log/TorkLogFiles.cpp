@@ -296,7 +296,8 @@ void TorkLog::shiftOldFiles(QString const& directory) const
     };
     const bool isListed = !start.startsWith(QLatin1Char('.')) && !start.contains(QLatin1Char('/'));
     if (files.isEmpty() && isListed) {
-        for (int number = 1; QFileInfo(m_path + name(number)).isFile(); ++number)
+        const QDir listed(directory);
+        for (int number = 1; QFileInfo(listed.filePath(name(number))).isFile(); ++number)
             numbered.insert(number, name(number));
     }
     if (numbered.isEmpty() || numbered.lastKey() < 0)
