@@ -97,6 +97,15 @@ void SyncToDisk(QString const& directory)
 #endif
 }
 
+// A link without a target is in the way although it does not count as existing: Qt would create the
+// target instead of the older file, or not copy the current one, which would then be lost.
+void RemoveDeadLink(QString const& path)
+{
+    const QFileInfo info(path);
+    if (info.isSymLink() && !info.exists())
+        QFile::remove(path);
+}
+
 // Until it is complete, a copy has no name or, if the file system does not support unnamed files,
 // one that says what it belongs to and does not end in a number: app.log.1.aBcDeF.part.
 QString PartName(QString const& to)
@@ -123,6 +132,8 @@ void Copy(QString const& from, QString const& to)
     }
     const bool isWhole = source.error() == QFileDevice::NoError && SyncToDisk(copy);
     copy.setPermissions(source.permissions());
+    if (isWhole)
+        RemoveDeadLink(to);
     if (isWhole && copy.rename(to)) {
         copy.setAutoRemove(false);
         SyncToDisk(QFileInfo(to).path());
@@ -310,9 +321,8 @@ void TorkLog::shiftOldFiles(QString const& directory) const
         QString const& file = numbered[*number];
         const QString next = QString::number(qint64(*number) + 1);
         const QString to = m_path + BeforeLastDot(file) + QLatin1Char('.') + next;
-        // A link without a target does not count as existing: Qt would copy the file to there.
-        if (!QFileInfo(to).isSymLink())
-            QFile::rename(m_path + file, to);
+        RemoveDeadLink(to);
+        QFile::rename(m_path + file, to);
     }
 
     if (numbered.lastKey() >= static_cast<int>(m_maxLogFiles.load()))

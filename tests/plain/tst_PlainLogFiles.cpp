@@ -114,18 +114,26 @@ public:
                     continue;
                 const QString cut = numbered[i].left(numbered[i].lastIndexOf('.'));
                 const QString to = path + cut + '.' + QString::number(i + 1);
-                if (!QFileInfo(to).isSymLink()) // QFile would copy to where it points
-                    QFile::rename(path + numbered[i], to);
+                removeDeadLink(to);
+                QFile::rename(path + numbered[i], to);
             }
             for (int i = highest + 1; highest >= maxFiles && i >= maxFiles + 1; --i)
                 QFile::remove(fullName() + '.' + QString::number(i));
         }
-        if (QFileInfo(fullName()).isFile()) // a pipe would be waited for
+        if (QFileInfo(fullName()).isFile()) { // a pipe would be waited for
+            removeDeadLink(fullName() + ".1");
             QFile::copy(fullName(), fullName() + ".1");
+        }
         QFile::remove(fullName());
     }
 
 private:
+    static void removeDeadLink(QString const& path)
+    {
+        if (QFileInfo(path).isSymLink() && !QFileInfo::exists(path))
+            QFile::remove(path);
+    }
+
     // The file object does not know where another process has moved it after fork().
     qint64 position() const { return lseek(m_file.handle(), 0, SEEK_CUR); }
 
