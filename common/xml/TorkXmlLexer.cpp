@@ -264,24 +264,24 @@ void TorkXmlLexer::addPrefix(Name const& name, bool isAttribute)
         return;
 
     const QString prefix =
-        TorkXmlPrefixes::ofName(QString(name.constData(), name.size()), isAttribute);
+        TorkXmlPrefixes::OfName(QString(name.constData(), name.size()), isAttribute);
     if (prefix.isEmpty() || m_prefixSet.contains(prefix))
         return;
     m_prefixSet.insert(prefix);
     m_prefixes.append(prefix);
-    m_prefixWeight += TorkXmlPrefixes::weight(prefix);
+    m_prefixWeight += TorkXmlPrefixes::Weight(prefix);
     if (m_prefixWeight > m_limits.prefixes)
-        refuse(TorkXmlPrefixes::tooMany(m_limits.prefixes));
+        refuse(TorkXmlPrefixes::TooMany(m_limits.prefixes));
 }
 
 void TorkXmlLexer::startElement()
 {
     m_elements.append(m_beforeTag);
     if (m_elements.size() > m_limits.depth)
-        refuse(TorkXmlPrefixes::tooDeep(m_limits.depth));
-    m_prefixComparisons += TorkXmlPrefixes::comparisons(m_prefixWeight);
+        refuse(TorkXmlPrefixes::TooDeep(m_limits.depth));
+    m_prefixComparisons += TorkXmlPrefixes::Comparisons(m_prefixWeight);
     if (m_prefixComparisons > m_limits.prefixComparisons)
-        refuse(TorkXmlPrefixes::tooManyComparisons(m_limits.prefixComparisons));
+        refuse(TorkXmlPrefixes::TooManyComparisons(m_limits.prefixComparisons));
 }
 
 void TorkXmlLexer::endElement()

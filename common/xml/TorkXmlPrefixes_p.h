@@ -9,13 +9,13 @@
 namespace TorkXmlPrefixes {
 
 /// What a prefix counts: the reader compares prefixes character by character.
-inline int weight(QString const& prefix)
+inline int Weight(QString const& prefix)
 {
     return 1 + prefix.length() / 16;
 }
 
 /// What an element with this weight in force counts: the reader compares each with all others.
-inline qint64 comparisons(int weight)
+inline qint64 Comparisons(int weight)
 {
     return qint64(weight) * weight;
 }
@@ -23,7 +23,7 @@ inline qint64 comparisons(int weight)
 /// The prefix that an element or attribute of this name puts in force; empty if it does not. An
 /// attribute "xmlns:p" declares p, and a prefix that nothing declares is kept by the reader as
 /// well.
-inline QString ofName(QString const& name, bool isAttribute)
+inline QString OfName(QString const& name, bool isAttribute)
 {
     const int colon = name.indexOf(QLatin1Char(':'));
     if (colon < 0)
@@ -32,17 +32,17 @@ inline QString ofName(QString const& name, bool isAttribute)
     return isAttribute && prefix == QLatin1String("xmlns") ? name.mid(colon + 1) : prefix;
 }
 
-inline QString tooMany(int limit)
+inline QString TooMany(int limit)
 {
     return QStringLiteral("More than %1 namespace prefixes are in force.").arg(limit);
 }
 
-inline QString tooManyComparisons(qint64 limit)
+inline QString TooManyComparisons(qint64 limit)
 {
     return QStringLiteral("More than %1 comparisons of namespace prefixes are needed.").arg(limit);
 }
 
-inline QString tooDeep(int limit)
+inline QString TooDeep(int limit)
 {
     return QStringLiteral("More than %1 elements are inside each other.").arg(limit);
 }

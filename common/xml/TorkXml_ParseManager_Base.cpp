@@ -49,14 +49,14 @@ bool TorkXml_ParseManager_Base::addPrefix(QString const& prefix)
     if (prefix.isEmpty() || m_prefixes.contains(prefix))
         return false;
     m_prefixes.insert(prefix);
-    m_prefixWeight += TorkXmlPrefixes::weight(prefix);
+    m_prefixWeight += TorkXmlPrefixes::Weight(prefix);
     return true;
 }
 
 void TorkXml_ParseManager_Base::removePrefix(QString const& prefix)
 {
     if (m_prefixes.remove(prefix))
-        m_prefixWeight -= TorkXmlPrefixes::weight(prefix);
+        m_prefixWeight -= TorkXmlPrefixes::Weight(prefix);
 }
 
 // The reader need not report the end of a prefix that was not declared, so endElement() ends it.
@@ -70,17 +70,17 @@ void TorkXml_ParseManager_Base::usePrefix(QString const& prefix)
 bool TorkXml_ParseManager_Base::isWithinLimits(QString const& qName,
                                                QXmlAttributes const& attributes)
 {
-    usePrefix(TorkXmlPrefixes::ofName(qName, false));
+    usePrefix(TorkXmlPrefixes::OfName(qName, false));
     for (int i = 0; i < attributes.count(); ++i)
-        usePrefix(TorkXmlPrefixes::ofName(attributes.qName(i), true));
+        usePrefix(TorkXmlPrefixes::OfName(attributes.qName(i), true));
 
-    m_prefixComparisons += TorkXmlPrefixes::comparisons(m_prefixWeight);
+    m_prefixComparisons += TorkXmlPrefixes::Comparisons(m_prefixWeight);
     if (m_elements.size() > TorkXmlMaximumDepth)
-        AppendError(TorkXmlPrefixes::tooDeep(TorkXmlMaximumDepth));
+        AppendError(TorkXmlPrefixes::TooDeep(TorkXmlMaximumDepth));
     else if (m_prefixWeight > TorkXmlMaximumPrefixes)
-        AppendError(TorkXmlPrefixes::tooMany(TorkXmlMaximumPrefixes));
+        AppendError(TorkXmlPrefixes::TooMany(TorkXmlMaximumPrefixes));
     else if (m_prefixComparisons > TorkXmlMaximumPrefixComparisons)
-        AppendError(TorkXmlPrefixes::tooManyComparisons(TorkXmlMaximumPrefixComparisons));
+        AppendError(TorkXmlPrefixes::TooManyComparisons(TorkXmlMaximumPrefixComparisons));
     else
         return true;
     return false;
