@@ -377,7 +377,6 @@ void tst_TorkConfigFile::currentSectionOf_data()
     QTest::addColumn<StoreTest::Setup>("call");
     QTest::addColumn<QString>("current"); // "" for none
 
-    using Setup = StoreTest::Setup;
     const auto row = [](char const* name, Setup const& call, char const* current) {
         QTest::newRow(name) << call << QString(current);
     };
