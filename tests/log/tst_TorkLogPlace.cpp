@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 
 #include "common/log/TorkLogPlace_p.h"
+#include "support/ForkedChild.h"
 #include "support/TestFiles.h"
 
 #include <QTemporaryDir>
@@ -45,7 +46,7 @@ short lockSeenByOther(QString const& name)
         wanted.l_type = F_RDLCK;
         wanted.l_len = 1;
         const bool asked = ::fcntl(file, F_GETLK, &wanted) == 0;
-        _exit(asked ? wanted.l_type : 99);
+        endForkedChild(asked ? wanted.l_type : 99);
     }
     int status = 0;
     waitpid(child, &status, 0);
@@ -221,7 +222,7 @@ void tst_TorkLogPlace::othersKeepUsOut()
         const char locked = ::fcntl(own, F_SETLK, &whole) == 0 ? 'y' : 'n';
         char end = 0;
         const bool told = ::write(isLocked[1], &locked, 1) == 1 && ::read(mayEnd[0], &end, 1) == 1;
-        _exit(told ? 0 : 1);
+        endForkedChild(told ? 0 : 1);
     }
     char locked = 0;
     QCOMPARE(::read(isLocked[0], &locked, 1), ssize_t(1));

@@ -4,6 +4,7 @@
 #include "common/log/TorkLog.h"
 #include "common/log/TorkLogLock_p.h"
 #include "log/LogFolder.h"
+#include "support/ForkedChild.h"
 #include "support/PrivateField.h"
 #include "support/TestClock.h"
 
@@ -341,7 +342,7 @@ void tst_TorkLogState::lockOfTheFileEndsWithTheEntry()
         struct flock wanted = {};
         wanted.l_type = F_WRLCK;
         const bool asked = ::fcntl(::open(name.constData(), O_RDWR), F_GETLK, &wanted) == 0;
-        _exit(asked && wanted.l_type == F_UNLCK ? 0 : 1);
+        endForkedChild(asked && wanted.l_type == F_UNLCK ? 0 : 1);
     }
     int status = -1;
     QCOMPARE(waitpid(other, &status, 0), other);

@@ -759,8 +759,8 @@ private:
             "<VelocorSettings><A><k></k> <l/>text<m> </m></A></VelocorSettings>",
             "<VelocorSettings><A><k>v</k><l>cut",
             "<VelocorSettings><A><k>v</k></B></VelocorSettings>",
-            "<r><VelocorSettings><k>v</k></VelocorSettings><A><VelocorSettings>v"
-            "</VelocorSettings></A></r>",
+            ("<r><VelocorSettings><k>v</k></VelocorSettings><A><VelocorSettings>v"
+             "</VelocorSettings></A></r>"),
             "<r><A><k>a<!-- c -->b</k><l><![CDATA[x&y]]></l></A></r>",
             "<r><n:A><n:k>v</n:k></n:A><\xC3\xA9><k>v</k></\xC3\xA9></r>",
             "",
