@@ -217,7 +217,7 @@ QStringList Texts(QVector<int> const& numbers)
 // One edge of a window: its position, its extent and the desktop's.
 void Fit(int& position, int& extent, int desktop, int minimum, bool keepsMinimum)
 {
-    int end = position + extent;
+    qint64 end = qint64(position) + extent;
     if (extent < 0)
         extent = minimum;
     if (extent > desktop)
@@ -235,7 +235,7 @@ void Fit(int& position, int& extent, int desktop, int minimum, bool keepsMinimum
         end = desktop - 1;
         position = qMax(0, desktop - 1 - qMax(extent, minimum));
     }
-    extent = end - position;
+    extent = static_cast<int>(end - position);
 }
 
 class Stores : public Program::Pair

@@ -9,6 +9,7 @@
 #include "common/xml/TorkXmlFile.h"
 #include "common/xml/TorkXmlStream.h"
 #include "plain/Program.h"
+#include "support/Sanitizers.h"
 #include "support/TestFiles.h"
 #include "xml/WriterSteps.h"
 #include "xml/WritersWithoutTypes.h"
@@ -685,6 +686,9 @@ void tst_PlainWriters::sameAsPlain()
 
 void tst_PlainWriters::sameWithoutTypes()
 {
+#ifdef TEST_UNDER_ADDRESS_SANITIZER
+    QSKIP("that build checks types by run-time type information");
+#endif
     Program::compare<WritersOfNoType>("writers without types", Rounds::count(8000, 150000, 1000000),
                                       24);
 }

@@ -433,7 +433,7 @@ double Luminance(QColor const& color)
 
 double Contrast(QColor const& a, QColor const& b)
 {
-    const auto both = std::minmax(Luminance(a), Luminance(b));
+    const auto both = std::minmax({Luminance(a), Luminance(b)});
     return (both.second + 0.05) / (both.first + 0.05);
 }
 
