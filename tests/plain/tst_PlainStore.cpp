@@ -227,7 +227,7 @@ void Fit(int& position, int& extent, int desktop, int minimum, bool keepsMinimum
         end = extent;
     }
     if (extent < minimum) {
-        end = position + minimum;
+        end = qint64(position) + minimum;
         if (keepsMinimum)
             extent = minimum;
     }
