@@ -217,7 +217,7 @@ QStringList Texts(QVector<int> const& numbers)
 // One edge of a window: its position, its extent and the desktop's.
 void Fit(int& position, int& extent, int desktop, int minimum, bool keepsMinimum)
 {
-    qint64 end = qint64(position) + extent;
+    int end = static_cast<int>(qint64(position) + extent); // wraps, as stored numbers may be any
     if (extent < 0)
         extent = minimum;
     if (extent > desktop)
@@ -227,7 +227,7 @@ void Fit(int& position, int& extent, int desktop, int minimum, bool keepsMinimum
         end = extent;
     }
     if (extent < minimum) {
-        end = qint64(position) + minimum;
+        end = static_cast<int>(qint64(position) + minimum);
         if (keepsMinimum)
             extent = minimum;
     }
@@ -235,7 +235,7 @@ void Fit(int& position, int& extent, int desktop, int minimum, bool keepsMinimum
         end = desktop - 1;
         position = qMax(0, desktop - 1 - qMax(extent, minimum));
     }
-    extent = static_cast<int>(end - position);
+    extent = static_cast<int>(qint64(end) - position);
 }
 
 class Stores : public Program::Pair
