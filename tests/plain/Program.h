@@ -190,6 +190,19 @@ public:
     QString const& difference() const { return m_difference; }
 
 protected:
+    /// Tells the step: a call in which each # stands for an argument. m_draws is set by then.
+    template <class... Arguments>
+    void tell(char const* call, Arguments const&... arguments)
+    {
+        m_draws->tell([&] {
+            QString text = QString::fromUtf8(call);
+            const QStringList values({quoted(arguments)...});
+            for (QString const& value : values)
+                text = text.replace(text.indexOf('#'), 1, value);
+            return text;
+        });
+    }
+
     template <class Value>
     void same(char const* what, Value const& real, Value const& plain)
     {
@@ -215,6 +228,8 @@ protected:
                            .arg(QLatin1String(what), quoted(isOrder ? real : onlyReal),
                                 quoted(isOrder ? plain : onlyPlain));
     }
+
+    Draws* m_draws = nullptr;
 
 private:
     QString m_difference;

@@ -755,7 +755,6 @@ private:
     }();
     PlainLog m_plain;
     TorkLog m_log;
-    Program::Draws* m_draws = nullptr;
 };
 
 } // namespace

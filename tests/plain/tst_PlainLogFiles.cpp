@@ -466,7 +466,6 @@ private:
 
     QTemporaryDir m_folder;
     const QStringList m_roots{m_folder.path() + "/a/", m_folder.path() + "/b/"};
-    Program::Draws* m_draws = nullptr;
     TorkLog m_log;
     PlainLog m_plain;
     QFile* m_file = nullptr;

@@ -252,18 +252,6 @@ bool IsSame(LogRows const& left, LogRows const& right)
 class Written : public Program::Pair
 {
 protected:
-    template <class... Arguments>
-    void tell(char const* call, Arguments const&... arguments)
-    {
-        m_draws->tell([&] {
-            QString text(call);
-            QStringList values({Program::quoted(arguments)...});
-            for (QString const& value : values)
-                text = text.replace(text.indexOf('#'), 1, value);
-            return text;
-        });
-    }
-
     // Any moment of 2025, to the millisecond.
     QByteArray stamp() const
     {
@@ -374,7 +362,6 @@ protected:
     int m_number = 0;
     bool m_readsTimes = false;
     LogFilter m_filter;
-    Program::Draws* m_draws = nullptr;
 };
 
 class Indexes : public Written

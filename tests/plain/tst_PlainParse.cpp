@@ -239,18 +239,6 @@ public:
     }
 
 protected:
-    template <class... Arguments>
-    void tell(char const* call, Arguments const&... arguments)
-    {
-        m_draws->tell([&] {
-            QString text(call);
-            QStringList values({Program::quoted(arguments)...});
-            for (QString const& value : values)
-                text = text.replace(text.indexOf('#'), 1, value);
-            return text;
-        });
-    }
-
     QString name()
     {
         static char const* const names[] = {"a",       "b",         "a",       "b",
@@ -276,7 +264,6 @@ protected:
         return result;
     }
 
-    Program::Draws* m_draws = nullptr;
     QStringList m_events;
     PlainManager m_plain;
 

@@ -306,18 +306,6 @@ private:
         PlainStore::Section plain;
     };
 
-    template <class... Arguments>
-    void tell(char const* call, Arguments const&... arguments)
-    {
-        m_draws->tell([&] {
-            QString text(call);
-            QStringList values({Program::quoted(arguments)...});
-            for (QString const& value : values)
-                text = text.replace(text.indexOf('#'), 1, value);
-            return text;
-        });
-    }
-
     QString name()
     {
         static char const* const names[] = {"A",
@@ -873,7 +861,6 @@ private:
     QString m_fileName = "x.cfg";
     QMap<QString, QByteArray> m_files;
     int m_messages = 0;
-    Program::Draws* m_draws = nullptr;
 };
 
 } // namespace
