@@ -58,12 +58,7 @@ private:
     QString m_workingDirectory;
 };
 
-struct Extension
-{
-    using Field = QString TorkLog::*;
-    friend Field privateField(Extension);
-};
-template struct PrivateField<Extension, &TorkLog::m_fileExtension>;
+PRIVATE_FIELD(Extension, TorkLog, QString, m_fileExtension);
 
 namespace {
 

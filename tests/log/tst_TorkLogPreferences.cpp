@@ -50,12 +50,7 @@ private:
     QString m_workingDirectory;
 };
 
-struct PreferencesFileName
-{
-    using Field = QString TorkLog::*;
-    friend Field privateField(PreferencesFileName);
-};
-template struct PrivateField<PreferencesFileName, &TorkLog::m_preferencesFileName>;
+PRIVATE_FIELD(PreferencesFileName, TorkLog, QString, m_preferencesFileName);
 
 void tst_TorkLogPreferences::init()
 {

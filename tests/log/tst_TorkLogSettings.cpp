@@ -39,19 +39,8 @@ private slots:
     void enumerationsTakeAnyNumber();
 };
 
-struct Spare
-{
-    using Field = QString TorkLog::*;
-    friend Field privateField(Spare);
-};
-template struct PrivateField<Spare, &TorkLog::m_spare>;
-
-struct PreferencesFileName
-{
-    using Field = QString TorkLog::*;
-    friend Field privateField(PreferencesFileName);
-};
-template struct PrivateField<PreferencesFileName, &TorkLog::m_preferencesFileName>;
+PRIVATE_FIELD(Spare, TorkLog, QString, m_spare);
+PRIVATE_FIELD(PreferencesFileName, TorkLog, QString, m_preferencesFileName);
 
 void tst_TorkLogSettings::cleanup()
 {

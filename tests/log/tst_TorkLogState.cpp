@@ -45,54 +45,13 @@ private slots:
     void waitsForTheMessage();
 };
 
-struct FileSpec
-{
-    using Field = QString TorkLog::*;
-    friend Field privateField(FileSpec);
-};
-template struct PrivateField<FileSpec, &TorkLog::m_fileSpec>;
-
-struct LogFileName
-{
-    using Field = QString TorkLog::*;
-    friend Field privateField(LogFileName);
-};
-template struct PrivateField<LogFileName, &TorkLog::m_logFileName>;
-
-struct SeverityName
-{
-    using Field = QString TorkLog::*;
-    friend Field privateField(SeverityName);
-};
-template struct PrivateField<SeverityName, &TorkLog::m_severityName>;
-
-struct ConsoleKey
-{
-    using Field = QString TorkLog::*;
-    friend Field privateField(ConsoleKey);
-};
-template struct PrivateField<ConsoleKey, &TorkLog::m_outputToConsoleKey>;
-
-struct Console
-{
-    using Field = bool TorkLog::*;
-    friend Field privateField(Console);
-};
-template struct PrivateField<Console, &TorkLog::m_outputToConsole>;
-
-struct Writing
-{
-    using Field = int TorkLog::*;
-    friend Field privateField(Writing);
-};
-template struct PrivateField<Writing, &TorkLog::m_writing>;
-
-struct Mutex
-{
-    using Field = QMutex TorkLog::*;
-    friend Field privateField(Mutex);
-};
-template struct PrivateField<Mutex, &TorkLog::m_mutex>;
+PRIVATE_FIELD(FileSpec, TorkLog, QString, m_fileSpec);
+PRIVATE_FIELD(LogFileName, TorkLog, QString, m_logFileName);
+PRIVATE_FIELD(SeverityName, TorkLog, QString, m_severityName);
+PRIVATE_FIELD(ConsoleKey, TorkLog, QString, m_outputToConsoleKey);
+PRIVATE_FIELD(Console, TorkLog, bool, m_outputToConsole);
+PRIVATE_FIELD(Writing, TorkLog, int, m_writing);
+PRIVATE_FIELD(Mutex, TorkLog, QMutex, m_mutex);
 
 namespace {
 

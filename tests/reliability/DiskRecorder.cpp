@@ -5,6 +5,7 @@
 // call these.
 
 #include "reliability/DiskRecorder.h"
+#include "support/NextFunction.h"
 
 #include <QFile>
 
@@ -16,7 +17,6 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
-#include <dlfcn.h>
 #include <fcntl.h>
 #include <sys/mman.h>
 #include <sys/stat.h>
@@ -57,17 +57,6 @@ bool s_isOn = false;
 
 constexpr int Descriptors = 1024;
 bool s_isWatched[Descriptors];
-
-template <class Function>
-Function Original(Function, char const* name)
-{
-    void* found = dlsym(RTLD_NEXT, name);
-    if (!found)
-        std::abort();
-    return reinterpret_cast<Function>(found);
-}
-
-#define ORIGINAL(name) static const auto original = Original(&::name, #name)
 
 // The path below the folder; null for others.
 char const* Below(char const* path)

@@ -5,6 +5,7 @@
 // its file operations. Each one either fails as requested or forwards the call.
 
 #include "reliability/FaultyFiles.h"
+#include "support/NextFunction.h"
 
 #include <QFile>
 
@@ -14,10 +15,8 @@
 #include <climits>
 #include <cstdarg>
 #include <cstdio>
-#include <cstdlib>
 #include <cstring>
 #include <dirent.h>
-#include <dlfcn.h>
 #include <fcntl.h>
 #include <sys/file.h>
 #include <sys/ioctl.h>
@@ -47,17 +46,6 @@ char s_path[PATH_MAX];
 // The path below the folder, by its descriptor; empty for others.
 constexpr int Descriptors = 4096;
 std::array<std::array<char, 256>, Descriptors> s_open;
-
-template <class Function>
-Function Original(Function, char const* name)
-{
-    void* found = dlsym(RTLD_NEXT, name);
-    if (!found)
-        std::abort();
-    return reinterpret_cast<Function>(found);
-}
-
-#define ORIGINAL(name) static const auto original = Original(&::name, #name)
 
 bool Concerns(char const* path)
 {

@@ -7,6 +7,8 @@
 //
 //     FILE_RECORDER  the file to record it in, a line "CALL PATH" each
 
+#include "support/NextFunction.h"
+
 #include <array>
 #include <cerrno>
 #include <climits>
@@ -14,7 +16,6 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
-#include <dlfcn.h>
 #include <fcntl.h>
 #include <spawn.h>
 #include <sys/stat.h>
@@ -22,17 +23,6 @@
 #include <unistd.h>
 
 namespace {
-
-template <class Function>
-Function Original(Function, char const* name)
-{
-    void* found = dlsym(RTLD_NEXT, name);
-    if (!found)
-        std::abort();
-    return reinterpret_cast<Function>(found);
-}
-
-#define ORIGINAL(name) static const auto original = Original(&::name, #name)
 
 void Note(char const* call, char const* path)
 {

@@ -13,6 +13,7 @@
 
 #include "reliability/CrashSite.h"
 #include "reliability/ScarceMemory.h"
+#include "support/NextFunction.h"
 
 #include <array>
 #include <atomic>
@@ -21,7 +22,6 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
-#include <dlfcn.h>
 #include <fcntl.h>
 #include <poll.h>
 #include <string>
@@ -94,22 +94,13 @@ void NoteWait()
     ::kill(::getpid(), SIGTERM);
 }
 
-template <class Function>
-Function Original(Function, char const* name)
-{
-    void* found = dlsym(RTLD_NEXT, name);
-    if (!found)
-        std::abort();
-    return reinterpret_cast<Function>(found);
-}
-
 } // namespace
 
 extern "C" {
 
 int poll(pollfd* files, nfds_t count, int limit)
 {
-    static const auto original = Original(&::poll, "poll");
+    ORIGINAL(poll);
     if (limit != 0)
         NoteWait();
     return original(files, count, limit);
@@ -117,7 +108,7 @@ int poll(pollfd* files, nfds_t count, int limit)
 
 int ppoll(pollfd* files, nfds_t count, timespec const* limit, sigset_t const* mask)
 {
-    static const auto original = Original(&::ppoll, "ppoll");
+    ORIGINAL(ppoll);
     if (!limit || limit->tv_sec != 0 || limit->tv_nsec != 0)
         NoteWait();
     return original(files, count, limit, mask);

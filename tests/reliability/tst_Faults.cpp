@@ -9,6 +9,7 @@
 #include "log/LogFolder.h"
 #include "reliability/FaultyFiles.h"
 #include "reliability/Figures.h"
+#include "reliability/SampleConfiguration.h"
 
 #include <QtTest>
 
@@ -449,35 +450,13 @@ void tst_Faults::settingsLoaded()
     QCOMPARE(missing({"access", "open", "read", "stat"}), QStringList());
 }
 
-namespace {
-
-const QByteArray oldConfiguration = "<VelocorSettings>\n<a>\n<b>1</b>\n</a>\n</VelocorSettings>\n";
-const QByteArray newConfiguration =
-    "<VelocorSettings>\n<a>\n<b>2</b>\n<c><![CDATA[x & y]]></c>\n</a>\n</VelocorSettings>\n";
-
-void fill(TorkConfigFile& configuration)
-{
-    configuration.WriteItem("a", "b", "2");
-    configuration.WriteItem("a", "c", "x & y");
-}
-
-QString value(TorkConfigFile& configuration, QString const& key)
-{
-    QString none;
-    QString found;
-    configuration.ReadItem("a", key, none, found);
-    return found;
-}
-
-} // namespace
-
 void tst_Faults::configurationSaved()
 {
     for (int step = 1;; ++step, ++s_steps) {
         Scene scene;
-        TestFiles::write(scene.configuration(), oldConfiguration);
+        TestFiles::write(scene.configuration(), SampleConfiguration::oldBytes);
         TorkConfigFile configuration(scene.configuration());
-        fill(configuration);
+        SampleConfiguration::fill(configuration);
 
         scene.failAt(step);
         CHECK(configuration.Save());
@@ -485,17 +464,17 @@ void tst_Faults::configurationSaved()
 
         const QByteArray left = TestFiles::read(scene.configuration());
         if (configuration.m_lastError.isEmpty()) {
-            CHECK(newConfiguration.startsWith(left));
+            CHECK(SampleConfiguration::newBytes.startsWith(left));
         } else {
             CHECK(configuration.m_lastError == "Unable to open file: " + scene.configuration());
             CHECK(scene.files.reached());
         }
         CHECK(configuration.Save());
-        CHECK(TestFiles::read(scene.configuration()) == newConfiguration);
+        CHECK(TestFiles::read(scene.configuration()) == SampleConfiguration::newBytes);
         CHECK(scene.othersAreUntouched());
         m_calls.append(scene.files.call());
         if (!scene.files.reached()) {
-            CHECK(left == newConfiguration);
+            CHECK(left == SampleConfiguration::newBytes);
             break;
         }
     }
@@ -510,20 +489,20 @@ void tst_Faults::configurationReplaced()
     QStringList failedSyncs;
     for (int step = 1;; ++step, ++s_steps) {
         Scene scene;
-        TestFiles::write(scene.configuration(), oldConfiguration);
+        TestFiles::write(scene.configuration(), SampleConfiguration::oldBytes);
         QFile::setPermissions(scene.configuration(),
                               QFile::ReadOwner | QFile::WriteOwner | QFile::ReadGroup);
         const QString link = scene.folder.root() + "link.cfg";
         CHECK(QFile::link(scene.configuration(), link));
         TorkConfigFile configuration(link);
-        fill(configuration);
+        SampleConfiguration::fill(configuration);
 
         scene.failAt(step);
         const bool saved = configuration.SaveAtomically();
         scene.files.mend();
 
         const QByteArray left = TestFiles::read(scene.configuration());
-        CHECK(left == (saved ? newConfiguration : oldConfiguration));
+        CHECK(left == (saved ? SampleConfiguration::newBytes : SampleConfiguration::oldBytes));
         CHECK(saved || configuration.m_lastError.startsWith("Unable to save " + link + ": "));
         const bool isAgain =
             error == EINTR && QStringList({"open", "write", "fsync"}).contains(scene.files.call());
@@ -538,7 +517,7 @@ void tst_Faults::configurationReplaced()
         CHECK(QFileInfo(link).isSymLink());
         CHECK(configuration.SaveAtomically());
         CHECK(configuration.m_lastError.isEmpty());
-        CHECK(TestFiles::read(scene.configuration()) == newConfiguration);
+        CHECK(TestFiles::read(scene.configuration()) == SampleConfiguration::newBytes);
         CHECK(!QFile::exists(scene.configuration() + ".saving"));
         CHECK(QFileInfo(link).isSymLink());
         CHECK(scene.othersAreUntouched());
@@ -562,7 +541,7 @@ void tst_Faults::configurationLoaded()
     const QString notParsed = "ConfigFile - Could not parse the input file.";
     for (int step = 1;; ++step, ++s_steps) {
         Scene scene;
-        TestFiles::write(scene.configuration(), newConfiguration);
+        TestFiles::write(scene.configuration(), SampleConfiguration::newBytes);
         TorkConfigFile configuration(scene.configuration());
         configuration.WriteItem("a", "b", "unsaved");
 
@@ -571,14 +550,16 @@ void tst_Faults::configurationLoaded()
         scene.files.mend();
 
         if (loaded)
-            CHECK(value(configuration, "b") == "2" && value(configuration, "c") == "x & y");
+            CHECK(SampleConfiguration::value(configuration, "b") == "2" &&
+                  SampleConfiguration::value(configuration, "c") == "x & y");
         else if (configuration.m_lastError == notFound)
-            CHECK(value(configuration, "b") == "unsaved");
+            CHECK(SampleConfiguration::value(configuration, "b") == "unsaved");
         else
             CHECK(configuration.m_lastError == notParsed);
         CHECK(configuration.Load());
-        CHECK(value(configuration, "b") == "2" && value(configuration, "c") == "x & y");
-        CHECK(TestFiles::read(scene.configuration()) == newConfiguration);
+        CHECK(SampleConfiguration::value(configuration, "b") == "2" &&
+              SampleConfiguration::value(configuration, "c") == "x & y");
+        CHECK(TestFiles::read(scene.configuration()) == SampleConfiguration::newBytes);
         CHECK(scene.othersAreUntouched());
         m_calls.append(scene.files.call());
         if (!scene.files.reached()) {
@@ -592,25 +573,25 @@ void tst_Faults::configurationLoaded()
 // What fit is there, and nothing is reported: a save reports only a file that does not open.
 void tst_Faults::diskFullAtEveryByteOfASave()
 {
-    for (int step = 0; step <= newConfiguration.size(); ++step, ++s_bytes) {
+    for (int step = 0; step <= SampleConfiguration::newBytes.size(); ++step, ++s_bytes) {
         Scene scene;
-        TestFiles::write(scene.configuration(), oldConfiguration);
+        TestFiles::write(scene.configuration(), SampleConfiguration::oldBytes);
         TorkConfigFile configuration(scene.configuration());
-        fill(configuration);
+        SampleConfiguration::fill(configuration);
 
         scene.files.limitBytes(step);
         CHECK(configuration.Save());
         scene.files.mend();
 
         CHECK(configuration.m_lastError.isEmpty());
-        CHECK(TestFiles::read(scene.configuration()) == newConfiguration.left(step));
-        CHECK(scene.files.reached() == (step < newConfiguration.size()));
+        CHECK(TestFiles::read(scene.configuration()) == SampleConfiguration::newBytes.left(step));
+        CHECK(scene.files.reached() == (step < SampleConfiguration::newBytes.size()));
 
         TorkConfigFile loaded(scene.configuration());
-        CHECK(loaded.Load() == (step >= newConfiguration.size() - 1));
+        CHECK(loaded.Load() == (step >= SampleConfiguration::newBytes.size() - 1));
         CHECK(configuration.Save());
         CHECK(loaded.Load());
-        CHECK(value(loaded, "c") == "x & y");
+        CHECK(SampleConfiguration::value(loaded, "c") == "x & y");
         CHECK(scene.othersAreUntouched());
     }
 }
@@ -618,21 +599,21 @@ void tst_Faults::diskFullAtEveryByteOfASave()
 // There is no room for another file next to it, so it stays the old one.
 void tst_Faults::diskFullAtEveryByteOfAReplacement()
 {
-    for (int step = 0; step <= newConfiguration.size(); ++step, ++s_bytes) {
+    for (int step = 0; step <= SampleConfiguration::newBytes.size(); ++step, ++s_bytes) {
         Scene scene;
-        TestFiles::write(scene.configuration(), oldConfiguration);
+        TestFiles::write(scene.configuration(), SampleConfiguration::oldBytes);
         TorkConfigFile configuration(scene.configuration());
-        fill(configuration);
+        SampleConfiguration::fill(configuration);
 
         scene.files.limitBytes(step);
         const bool saved = configuration.SaveAtomically();
         scene.files.mend();
 
-        CHECK(saved == (step == newConfiguration.size()));
+        CHECK(saved == (step == SampleConfiguration::newBytes.size()));
         CHECK(scene.files.reached() != saved);
         CHECK(configuration.m_lastError.isEmpty() == saved);
         CHECK(TestFiles::read(scene.configuration()) ==
-              (saved ? newConfiguration : oldConfiguration));
+              (saved ? SampleConfiguration::newBytes : SampleConfiguration::oldBytes));
         CHECK(!QFile::exists(scene.configuration() + ".saving"));
         CHECK(scene.othersAreUntouched());
     }

@@ -20,6 +20,7 @@
 #include "log/LogFolder.h"
 #include "reliability/CrashSite.h"
 #include "reliability/Figures.h"
+#include "reliability/SampleConfiguration.h"
 #include "reliability/ScarceMemory.h"
 #include "support/ProcessLimits.h"
 
@@ -148,27 +149,9 @@ QString configurationFile(LogFolder const& folder)
     return folder.root() + "viewer.cfg";
 }
 
-const QByteArray oldConfiguration = "<VelocorSettings>\n<a>\n<b>1</b>\n</a>\n</VelocorSettings>\n";
-const QByteArray newConfiguration =
-    "<VelocorSettings>\n<a>\n<b>2</b>\n<c><![CDATA[x & y]]></c>\n</a>\n</VelocorSettings>\n";
-
 void makeConfiguration(LogFolder const& folder)
 {
-    TestFiles::write(configurationFile(folder), oldConfiguration);
-}
-
-void fill(TorkConfigFile& configuration)
-{
-    configuration.WriteItem("a", "b", "2");
-    configuration.WriteItem("a", "c", "x & y");
-}
-
-QString value(TorkConfigFile& configuration, QString const& key)
-{
-    QString none;
-    QString found;
-    configuration.ReadItem("a", key, none, found);
-    return found;
+    TestFiles::write(configurationFile(folder), SampleConfiguration::oldBytes);
 }
 
 // A document and the states that read it.
@@ -389,20 +372,20 @@ void settingsLoaded(LogFolder const& folder, int step, bool lasts)
 
 void configurationLoaded(LogFolder const& folder, int step, bool lasts)
 {
-    TestFiles::write(configurationFile(folder), newConfiguration);
+    TestFiles::write(configurationFile(folder), SampleConfiguration::newBytes);
     TorkConfigFile configuration(configurationFile(folder));
     startShortage(step, lasts);
     const bool isLoaded = configuration.Load();
     endShortage();
     REQUIRE(isLoaded);
-    REQUIRE(value(configuration, "b") == "2");
-    REQUIRE(value(configuration, "c") == "x & y");
+    REQUIRE(SampleConfiguration::value(configuration, "b") == "2");
+    REQUIRE(SampleConfiguration::value(configuration, "c") == "x & y");
 }
 
 // A file that does not parse is not taken for an empty one, nor for one that does.
 void damagedConfigurationLoaded(LogFolder const& folder, int step, bool lasts)
 {
-    TestFiles::write(configurationFile(folder), newConfiguration.left(50));
+    TestFiles::write(configurationFile(folder), SampleConfiguration::newBytes.left(50));
     TorkConfigFile configuration(configurationFile(folder));
     startShortage(step, lasts);
     const bool isLoaded = configuration.Load();
@@ -415,21 +398,21 @@ void configurationSaved(LogFolder const& folder, int step, bool lasts)
 {
     TorkConfigFile configuration(configurationFile(folder));
     startShortage(step, lasts);
-    fill(configuration);
+    SampleConfiguration::fill(configuration);
     configuration.Save();
     endShortage();
-    REQUIRE(TestFiles::read(configurationFile(folder)) == newConfiguration);
+    REQUIRE(TestFiles::read(configurationFile(folder)) == SampleConfiguration::newBytes);
 }
 
 void configurationReplaced(LogFolder const& folder, int step, bool lasts)
 {
     TorkConfigFile configuration(configurationFile(folder));
-    fill(configuration);
+    SampleConfiguration::fill(configuration);
     startShortage(step, lasts);
     const bool isSaved = configuration.SaveAtomically();
     endShortage();
     REQUIRE(isSaved);
-    REQUIRE(TestFiles::read(configurationFile(folder)) == newConfiguration);
+    REQUIRE(TestFiles::read(configurationFile(folder)) == SampleConfiguration::newBytes);
 }
 
 QString s_readDocument; // with enough memory
@@ -529,7 +512,7 @@ QString olderFilesAreThere(LogFolder const& folder)
 QString beginsAsSaved(LogFolder const& folder)
 {
     const QByteArray left = TestFiles::read(configurationFile(folder));
-    return left == oldConfiguration || newConfiguration.startsWith(left)
+    return left == SampleConfiguration::oldBytes || SampleConfiguration::newBytes.startsWith(left)
                ? QString()
                : "neither old nor new: " + QString::fromLatin1(left);
 }
@@ -538,8 +521,8 @@ QString isOldOrNew(LogFolder const& folder)
 {
     const QByteArray left = TestFiles::read(configurationFile(folder));
     TorkConfigFile configuration(configurationFile(folder));
-    fill(configuration);
-    if (left != oldConfiguration && left != newConfiguration)
+    SampleConfiguration::fill(configuration);
+    if (left != SampleConfiguration::oldBytes && left != SampleConfiguration::newBytes)
         return "neither old nor new: " + QString::fromLatin1(left);
     return configuration.SaveAtomically() ? QString() : configuration.m_lastError;
 }
@@ -737,14 +720,14 @@ public:
             QDir(m_folder.root()).mkdir(name);
         QFile::setPermissions(m_folder.root() + "run",
                               QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
-        TestFiles::write(data() + "velocor.cfg", oldConfiguration);
+        TestFiles::write(data() + "velocor.cfg", SampleConfiguration::oldBytes);
         TestFiles::write(
             data() + "logs/logsettings.cfg",
             LogFolder::settingsText({{"filePrefix", "velocor"}, {"maxLogFileSize", "100"}}));
         // Beyond the limit that holds before the settings are loaded, so that it is rotated.
         TestFiles::write(data() + "logs/velocor.log", full + QByteArray(1000000, 'c'));
         TestFiles::write(data() + "logs/velocor.log.1", older[0]);
-        TestFiles::write(m_folder.root() + "data/other/other.cfg", oldConfiguration);
+        TestFiles::write(m_folder.root() + "data/other/other.cfg", SampleConfiguration::oldBytes);
     }
 
     // The status of the process; -1 if it hangs.
@@ -790,9 +773,10 @@ public:
         if (!has("velocor.log.1", older[0]) && !has("velocor.log.2", older[0]))
             return "an older log file is lost";
         TorkConfigFile settings(data() + "velocor.cfg");
-        if (!settings.Load() || value(settings, "b") != "1")
+        if (!settings.Load() || SampleConfiguration::value(settings, "b") != "1")
             return "the settings are lost: " + settings.m_lastError;
-        if (TestFiles::read(m_folder.root() + "data/other/other.cfg") != oldConfiguration)
+        if (TestFiles::read(m_folder.root() + "data/other/other.cfg") !=
+            SampleConfiguration::oldBytes)
             return "settings of another program are changed";
 
         static const QRegularExpression mayBeThere(

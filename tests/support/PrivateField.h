@@ -7,8 +7,7 @@
 ///
 /// Explicit instantiations may name private members; this relies on nothing else.
 ///
-///     struct Extension { using Field = QString TorkLog::*; friend Field privateField(Extension);
-///     }; template struct PrivateField<Extension, &TorkLog::m_fileExtension>;
+///     PRIVATE_FIELD(Extension, TorkLog, QString, m_fileExtension);
 ///
 ///     log.*privateField(Extension()) = "txt";
 template <class Tag, typename Tag::Field Member>
@@ -16,3 +15,11 @@ struct PrivateField
 {
     friend typename Tag::Field privateField(Tag) { return Member; }
 };
+
+#define PRIVATE_FIELD(Tag, Class, Type, Member)                                                    \
+    struct Tag                                                                                     \
+    {                                                                                              \
+        using Field = Type Class::*;                                                               \
+        friend Field privateField(Tag);                                                            \
+    };                                                                                             \
+    template struct PrivateField<Tag, &Class::Member>
