@@ -122,8 +122,8 @@ def find(name):
     return name, *json.loads(kept.read_text())
 
 
-def build_all(sources):
-    """Copies the tree, with all mutants in the given sources, and builds its tests."""
+def copy(sources):
+    """Copies the tree; the given sources, which are changed later, only if they are missing."""
     names = run("git", "ls-files", "-z", "--cached", "--others", "--exclude-standard", cwd=ROOT,
                 capture_output=True).stdout.split("\0")
     for name in names:
@@ -134,6 +134,11 @@ def build_all(sources):
         if not (COPY / name).exists() or name not in sources:
             update(COPY / name, (ROOT / name).read_text("latin-1"))
     configure("plain")
+
+
+def build_all(sources):
+    """Copies the tree, with all mutants in the given sources, and builds its tests."""
+    copy(sources)
     with multiprocessing.Pool() as pool:
         found = pool.map(find, sources, chunksize=1)
     for name, _, changed in found:
@@ -380,7 +385,7 @@ def main():
     sources = options.files or targets()
     chance = random.Random(options.seed)
     if options.sample:
-        configure("plain")
+        copy(sources)
         sources = some_sources(sources, options.sample, chance)
     mutants, digest_of_sources = build_all(sources)
     seen = {}
