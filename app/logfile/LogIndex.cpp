@@ -89,18 +89,18 @@ qint64 LogIndex::completeOffset() const
 
 qint64 LogIndex::Begin()
 {
-    const bool isFirst = m_starts.empty();
     const bool hasSeam = m_runs.size() > 1;
     m_formerEnd = m_position;
     m_knownEnd = completeOffset();
     m_knownSeam = hasSeam ? m_starts[m_runs[1].firstLine] : -1;
     m_isSeamUnchanged = false;
     m_hasMoved = false;
-    // What follows a file that was read to its end was added to it, however old it looks.
-    if (m_isOneRun || (!isFirst && !hasSeam))
+    // What follows a run that was read to its end was added to it, however old it looks. Without a
+    // time, the run that was read may not be the one that goes on.
+    if (m_isOneRun || (m_newestIsTimed && !hasSeam))
         m_seamLimit = 0;
     else
-        m_seamLimit = isFirst ? std::numeric_limits<qint64>::max() : m_knownEnd;
+        m_seamLimit = hasSeam ? m_knownEnd : std::numeric_limits<qint64>::max();
 
     m_position = resumeOffset();
     const size_t resume = resumeLine();
@@ -172,6 +172,7 @@ void LogIndex::End()
     m_knownMarks.clear();
     if (m_lineIsPartial)
         addLine(m_partialLine.constData(), m_partialLine.size(), false);
+    m_hasLostSeam = m_knownSeam >= 0 && m_runs.size() == 1 && !m_isOneRun;
 }
 
 bool LogIndex::isMatched(char const* line, int length)

@@ -83,6 +83,11 @@ public:
     /// Whether the last pass found the seam in another place, or that it was none.
     bool hasMoved() const { return m_hasMoved; }
 
+    /// Whether the last pass found no seam, although there had been one. Either the newest run has
+    /// overwritten all earlier ones, or it has changed what follows it in a way that a pass over
+    /// the new lines cannot recognize: the file should be read from the start by a new index.
+    bool hasLostSeam() const { return m_hasLostSeam; }
+
     /// The number of the first line, starting at 1, that the filter's expression takes too long
     /// for; 0 if there is none. With such a line the text is no longer searched for, and all lines
     /// match.
@@ -134,6 +139,7 @@ private:
 
     bool m_isOneRun = false;
     bool m_hasMoved = false;
+    bool m_hasLostSeam = false;
 
     // The current pass.
     qint64 m_seamLimit = 0; // no seam from here on

@@ -147,7 +147,7 @@ bool LogScanner::feed(QByteArray const& slice, qint64 count)
 }
 
 // Reads what the file has got since the last pass. A modification without anything new where the
-// index expects it was made elsewhere.
+// index expects it was made elsewhere; then, and without the seam that there was, it starts over.
 void LogScanner::readChanges(QFile& file)
 {
     const QDateTime modified = m_modified;
@@ -156,7 +156,7 @@ void LogScanner::readChanges(QFile& file)
     if (!readFrom(file))
         return;
     const bool isNew = m_index.hasMoved() || m_index.nextOffset() != end;
-    if (!isNew && m_modified != modified)
+    if ((!isNew && m_modified != modified) || m_index.hasLostSeam())
         readFromStart(false);
     else
         report(false);

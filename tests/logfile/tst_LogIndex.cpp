@@ -89,6 +89,8 @@ private slots:
     void incompleteLastLine();
     void incompleteEntryCountsOnce();
     void olderEntryOverATornOne();
+    void restartOfARunWithoutTimes();
+    void lostSeam();
     void anyBytes();
 };
 
@@ -440,6 +442,31 @@ void tst_LogIndex::olderEntryOverATornOne()
         writtenOver(file, newer + entry("08:00:00.000", "Trace", QString(20, 'y')));
     Pass(index, after, 4096);
     QCOMPARE(Texts(index, after), TextsOf(after));
+}
+
+// Between two passes over the file it got another run, which begins with the same bytes.
+void tst_LogIndex::restartOfARunWithoutTimes()
+{
+    const QByteArray start("it goes on\n");
+    LogIndex index;
+    Pass(index, start, 4096);
+    const QByteArray file =
+        writtenOver(start + run(6, QTime(17, 0), "older", true), start + run(2, QTime(9, 0), "n"));
+    Pass(index, file, 4096);
+    QCOMPARE(Texts(index, file), TextsOf(file));
+    QCOMPARE(Texts(index, file).first(), QString("[earlier]"));
+}
+
+// The newest run ends exactly where an entry begins that was in the middle of a line before.
+void tst_LogIndex::lostSeam()
+{
+    const QByteArray newer = run(2, QTime(9, 0), "n");
+    const QByteArray older = run(3, QTime(17, 0), "older", true);
+    LogIndex index;
+    Pass(index, newer + "rest\nend of " + older, 4096);
+    QVERIFY(!index.hasLostSeam());
+    Pass(index, newer + "going on\nok\n" + older, 4096);
+    QVERIFY(index.hasLostSeam());
 }
 
 void tst_LogIndex::anyBytes()

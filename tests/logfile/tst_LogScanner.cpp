@@ -126,6 +126,7 @@ private slots:
     void changes();
     void unchangedFiles_data();
     void unchangedFiles();
+    void seamLostWithinATick();
     void oneUpdateForManyChanges();
     void missingFiles_data();
     void missingFiles();
@@ -297,6 +298,25 @@ void tst_LogScanner::unchangedFiles()
     QCOMPARE(reader.updates.size(), isNoticed ? 2 : 1);
     if (isNoticed)
         QCOMPARE(reader.Rows(), Lines(after));
+}
+
+// The newest run ends exactly where an entry begins that was the end of a line before. Neither size
+// nor time of the file tell.
+void tst_LogScanner::seamLostWithinATick()
+{
+    const QByteArray newer = run(2, QTime(9, 0), "n");
+    const QByteArray older = run(20, QTime(17, 0), "older", true);
+    const QDateTime time = QDateTime::currentDateTime();
+    QVERIFY(TestFiles::write(m_file, newer + "rest\nend of " + older));
+    QVERIFY(SetTime(m_file, time));
+    Reader reader(m_file);
+    reader.Open(1);
+    QVERIFY(TestFiles::write(m_file, newer + "going on\nok\n" + older));
+    QVERIFY(SetTime(m_file, time));
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 2);
+    QCOMPARE(reader.Rows(), QStringList({"[heading]", "ok"}) + Lines(older) +
+                                QStringList("[heading]") + Lines(newer) + QStringList("going on"));
 }
 
 void tst_LogScanner::oneUpdateForManyChanges()

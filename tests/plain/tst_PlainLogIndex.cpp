@@ -107,11 +107,17 @@ PlainLine const& parsed(QByteArray const& text, bool readsTimes)
     return *line;
 }
 
-// The whole file, split and sorted out again.
+// The whole file, split and sorted out again. It may be told which entries were seen after the
+// newest run: by where they start, with their text.
 class PlainIndex
 {
 public:
-    PlainIndex(QByteArray const& file, bool readsTimes, LogFilter const& filter)
+    using Entries = QHash<int, QByteArray>;
+
+    PlainIndex() = default;
+
+    PlainIndex(QByteArray const& file, bool readsTimes, LogFilter const& filter,
+               Entries const& known = Entries())
     {
         std::vector<PlainLine> lines;
         for (int at = 0; at < file.size();) {
@@ -128,9 +134,11 @@ public:
         std::vector<Row> untimed; // since the last entry with a time
         for (PlainLine const& line : lines) {
             hasElapsed = hasElapsed || line.hasElapsed;
-            if (isOlder(line))
+            if (isOlder(line, known.value(line.start) == line.text))
                 beginRun();
             Run& run = runs.back();
+            if (runs.size() > 1 && line.isTimed)
+                older.insert(line.start, line.text);
             Row row{line.start, LogEntry::None};
             if (line.isEntry)
                 row.mark = quint8(line.severity);
@@ -156,6 +164,7 @@ public:
     LogRows rows;
     size_t lineCount = 0;
     bool hasElapsed = false;
+    Entries older; // the entries with a time after the newest run
 
 private:
     struct Row
@@ -174,7 +183,7 @@ private:
         size_t afterTimed = 0; // where the rows after the last one with a time begin
     };
 
-    bool isOlder(PlainLine const& line) const
+    bool isOlder(PlainLine const& line, bool isKnown) const
     {
         Run const& run = runs.back();
         if (!line.isTimed || run.timed == 0 || runs.size() >= 64)
@@ -185,7 +194,7 @@ private:
         const bool isMidnight = !run.hasDate && run.lastTime - line.time > 12 * 3600 * 1000;
         const bool isFarBack = line.time < run.lastTime - 61 * 60 * 1000;
         return line.time < std::min(run.firstTime, run.lastTime) - 20 && !isMidnight &&
-               (followsRest || isFarBack);
+               (followsRest || isFarBack || (isKnown && runs.size() == 1));
     }
 
     // With what is left of an entry that was written over.
@@ -272,6 +281,9 @@ protected:
         static char const* const elapsed[] = {"", "", "", "dT:[12] ", "dT:[-5]", "dT:[x] "};
         m_time += steps[m_draws->below(m_isDated ? 6 : 5)]; // half a day back is midnight
         m_latest = qMax(m_latest, m_time);
+        if (!m_hasEntries)
+            m_first = m_time;
+        m_hasEntries = true;
         const QString severity = SeverityNames.value(m_draws->below(6)); // the last has no name
         const QString message = m_draws->text("abc xX1", m_draws->once(4) ? 60 : 8);
         return stamp() + ' ' + severity.toLatin1() + ' ' + m_draws->oneOf(elapsed) +
@@ -305,17 +317,19 @@ protected:
         m_time = m_latest + m_draws->oneOf(steps);
         tell("a new run, at #", stamp());
         m_position = 0;
+        m_hasEntries = false;
         if (m_isTurnedBack)
             m_file.clear();
         m_isTurnedBack = false;
     }
 
-    // Only where nothing older is left.
+    // Only where nothing older is left, and not to a time that could be that of an earlier run: who
+    // has seen the file grow knows that it is not, but a fresh pass does not.
     void turnBack()
     {
         static qint64 const steps[] = {1, 19};
-        const qint64 step = qMin(m_time, m_draws->oneOf(steps));
-        if (m_position != m_file.size())
+        const qint64 step = m_draws->oneOf(steps);
+        if (m_position != m_file.size() || m_time - step < m_first - 20)
             return;
         m_time -= step;
         m_isTurnedBack = true;
@@ -357,6 +371,8 @@ protected:
     int m_position = 0;
     qint64 m_time = 8 * 3600000; // since the first day
     qint64 m_latest = m_time;
+    bool m_hasEntries = false; // of this run
+    qint64 m_first = 0;        // the time of the first of them
     bool m_isTurnedBack = false;
     bool m_isDated = true;
     int m_number = 0;
@@ -401,7 +417,20 @@ private:
         const int slice = 1 + m_draws->below(m_draws->once(4) ? 20 : 500);
         tell("a pass, # bytes at a time", slice);
         if (!isSameFile())
-            m_index = LogIndex(parser(m_readsTimes), m_filter);
+            forget();
+        read(slice);
+        if (m_index.hasLostSeam()) {
+            forget();
+            read(slice);
+        }
+        m_passed = m_file;
+        m_known = m_older;
+        m_older = PlainIndex(m_passed, m_readsTimes, m_filter, m_known).older;
+        compare(m_filter);
+    }
+
+    void read(int slice)
+    {
         qint64 offset = m_index.Begin();
         while (offset < m_file.size()) {
             const QByteArray bytes = m_file.mid(int(offset), slice);
@@ -409,8 +438,6 @@ private:
             offset = goesOn ? offset + bytes.size() : m_index.nextOffset();
         }
         m_index.End();
-        m_passed = m_file;
-        compare(m_filter);
     }
 
     // Whether the index can go on, by what a scanner looks at.
@@ -421,9 +448,16 @@ private:
                m_file.mid(tail).startsWith(m_passed.mid(tail));
     }
 
+    void forget()
+    {
+        m_index = LogIndex(parser(m_readsTimes), m_filter);
+        m_known.clear();
+        m_older.clear();
+    }
+
     void compare(LogFilter const& filter)
     {
-        const PlainIndex plain(m_passed, m_readsTimes, filter);
+        const PlainIndex plain(m_passed, m_readsTimes, filter, m_known);
         const LogRows rows = m_index.Rows(filter);
         if (!IsSame(rows, plain.rows))
             same("rows", Text(rows), Text(plain.rows));
@@ -445,12 +479,14 @@ private:
     {
         m_readsTimes = m_draws->once(2);
         m_filter = filter();
-        m_index = LogIndex(parser(m_readsTimes), m_filter);
+        forget();
         m_passed.clear();
     }
 
     LogIndex m_index;
     QByteArray m_passed;
+    PlainIndex::Entries m_known; // before the last pass
+    PlainIndex::Entries m_older; // after it
 };
 
 QTemporaryDir* g_folder = nullptr;
@@ -524,9 +560,15 @@ private:
     {
         if (!m_isOpen)
             return;
-        const PlainIndex plain(m_exists ? m_file : QByteArray(), m_readsTimes, m_filter);
-        if (!IsSame(*m_rows, plain.rows))
+        // What the scanner knows about the order depends on when it had to read from the start.
+        const QByteArray file = m_exists ? m_file : QByteArray();
+        const PlainIndex fresh(file, m_readsTimes, m_filter);
+        PlainIndex plain(file, m_readsTimes, m_filter, m_known);
+        if (IsSame(*m_rows, fresh.rows))
+            plain = fresh;
+        else if (!IsSame(*m_rows, plain.rows))
             same("rows", Text(*m_rows), Text(plain.rows));
+        m_known = plain.older;
         same("exists", m_update.exists, m_exists);
         same("error", m_update.error, QString());
         same("lines", m_update.lines, plain.lineCount);
@@ -615,6 +657,7 @@ private:
     const QString m_path;
     LogScanner m_scanner;
     LogUpdate m_update;
+    PlainIndex::Entries m_known; // perhaps, to the scanner
     std::shared_ptr<LogRows const> m_rows = std::make_shared<LogRows>();
     bool m_exists = false;
     bool m_isOpen = false;
