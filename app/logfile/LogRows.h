@@ -23,6 +23,7 @@ struct LogRows
 
     /// The mark of a row: a LogEntry::Severity and these flags.
     static constexpr quint8 SeverityMask = 0x07;
+    static_assert(LogEntry::None <= SeverityMask, "a mark has no room for another severity");
     static constexpr quint8 Continued = 0x08; ///< not an entry; has the severity of the entry above
     static constexpr quint8 Torn = 0x10;      ///< its first part was overwritten
     static constexpr quint8 Timed = 0x20;     ///< its time is known

@@ -447,7 +447,7 @@ void tst_WindowState::severityIcons()
     light.setColor(QPalette::Base, Qt::white);
     QVERIFY(SeverityIcons::IsDark(dark) && !SeverityIcons::IsDark(light));
     QVERIFY(SeverityIcons::Icon(LogEntry::None, light).isNull());
-    for (int i = LogEntry::Trace; i <= LogEntry::Fatal; ++i) {
+    for (int i = LogEntry::Trace; i < LogEntry::None; ++i) {
         const auto severity = static_cast<LogEntry::Severity>(i);
         const auto image = [&](QPalette const& palette) {
             return SeverityIcons::Icon(severity, palette).pixmap(16).toImage();
