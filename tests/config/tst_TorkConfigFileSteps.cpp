@@ -235,13 +235,15 @@ void tst_TorkConfigFileSteps::otherProgram_data()
     QTest::addColumn<int>("step");
     QTest::addColumn<bool>("begins"); // a save of its own; otherwise it only removes the file
     QTest::addColumn<QString>("outcome");
+    QTest::addColumn<int>("failing"); // the status that cannot be asked for; 0: none
 
     const auto row = [](char const* name, bool leftover, QByteArray const& call, int step,
-                        bool begins, QString const& outcome) {
-        QTest::newRow(name) << leftover << call << step << begins << outcome;
+                        bool begins, QString const& outcome, int failing = 0) {
+        QTest::newRow(name) << leftover << call << step << begins << outcome << failing;
     };
     row("takes the new file for a leftover", false, "flock", 1, false, replaced);
     row("puts its own in the new file's place", false, "flock", 1, true, unable(EAGAIN));
+    row("puts its own there, status unknown", false, "flock", 1, true, unable(EAGAIN), 2);
     row("removes the leftover before it is found", true, "stat", 2, false, replaced);
     row("removes the leftover before it is open", true, "open", 3, false, replaced);
     row("removes the leftover before it is locked", true, "flock", 1, false, replaced);
@@ -256,6 +258,7 @@ void tst_TorkConfigFileSteps::otherProgram()
     QFETCH(int, step);
     QFETCH(bool, begins);
     QFETCH(QString, outcome);
+    QFETCH(int, failing);
     const QByteArray saving = QFile::encodeName(path() + ".saving");
     QVERIFY(TestFiles::write(path(), oldBytes));
     if (leftover)
@@ -269,9 +272,13 @@ void tst_TorkConfigFileSteps::otherProgram()
         if (begins)
             other = beginOtherSave(saving);
     });
+    if (failing)
+        files.failAt(failing, FaultyFiles::Once, EIO, "stat");
     const QString result = saved(path());
+    files.mend();
 
     QVERIFY(!begins || other != -1);
+    QVERIFY(failing == 0 || files.reached());
     QCOMPARE(result, outcome);
     QCOMPARE(TestFiles::read(path()), begins ? oldBytes : newBytes);
     QCOMPARE(TestFiles::listing(m_folder->path()).filter(".saving"),
