@@ -3,6 +3,7 @@
 
 #include "common/log/TorkLog.h"
 #include "common/log/TorkLogLock_p.h"
+#include "log/LogAtATime.h"
 #include "log/LogFolder.h"
 #include "support/ForkedChild.h"
 #include "support/PrivateField.h"
@@ -35,6 +36,8 @@ private slots:
     void waitsForTheLock();
     void stampKeptAtMidnight_data();
     void stampKeptAtMidnight();
+    void stampsMadeInAMoment_data();
+    void stampsMadeInAMoment();
     void copyHasItsPermissionsAndAllBytes();
     void oddNamesAndPruning_data();
     void oddNamesAndPruning();
@@ -97,6 +100,7 @@ template struct PrivateField<Mutex, &TorkLog::m_mutex>;
 namespace {
 
 int s_installedHandlers = 0;
+int s_stampsMade = 0;
 std::function<void()> s_beforeWriting;
 
 } // namespace
@@ -117,6 +121,16 @@ QtMessageHandler qInstallMessageHandler(QtMessageHandler handler)
         RTLD_NEXT, "_Z22qInstallMessageHandlerPFv9QtMsgTypeRK18QMessageLogContextRK7QStringE"));
     ++s_installedHandlers;
     return install(handler);
+}
+
+// In place of Qt's, which it calls: how often a stamp is made.
+QString QDateTime::toString(QString const& format) const
+{
+    using ToString = QString (*)(QDateTime const*, QString const&);
+    static const auto original =
+        reinterpret_cast<ToString>(dlsym(RTLD_NEXT, "_ZNK9QDateTime8toStringERK7QString"));
+    ++s_stampsMade;
+    return original(this, format);
 }
 
 void tst_TorkLogState::cleanup()
@@ -250,6 +264,50 @@ void tst_TorkLogState::stampKeptAtMidnight()
     log.trace("third");
     QCOMPARE(folder.listing(),
              QStringList("app.log: T Trace first\nT Trace second\nT Trace third\n"));
+}
+
+// Qt takes long for one. Only unusually long ones and those in unusually long time zones are made
+// for each entry.
+void tst_TorkLogState::stampsMadeInAMoment_data()
+{
+    QTest::addColumn<int>("stampLength");
+    QTest::addColumn<QByteArray>("zone"); // null: TZ is not set
+    QTest::addColumn<int>("made");        // for two entries
+
+    const auto row = [](char const* name, int length, QByteArray const& zone, int made) {
+        QTest::newRow(name) << length << zone << made;
+    };
+    const QByteArray longest = ":" + QByteArray(63, 'x');
+    row("usual", 23, QByteArray(), 1);
+    row("time zone", 23, "UTC", 1);
+    row("empty time zone", 23, "", 1);
+    row("longest stamp that is kept", 64, "UTC", 1);
+    row("longer stamp", 65, "UTC", 2);
+    row("longest time zone that is kept", 23, longest, 1);
+    row("longer time zone", 23, longest + 'x', 2);
+}
+
+void tst_TorkLogState::stampsMadeInAMoment()
+{
+    QFETCH(int, stampLength);
+    QFETCH(QByteArray, zone);
+    QFETCH(int, made);
+    const QByteArray before = qgetenv("TZ");
+    LogAtATime::setZone(zone);
+    TestClock::set(QDateTime(QDate(2023, 9, 30), QTime(9, 59, 8, 5)));
+    LogFolder folder;
+    TorkLog log;
+    log.setOutputPath(folder.logs());
+    const QString format = '\'' + QString(stampLength, '.') + '\'';
+    folder.configure(log, {{"dateTimeFormat", format}, {"filePrefix", "app"}});
+
+    s_stampsMade = 0;
+    log.trace("x");
+    log.trace("x");
+    LogAtATime::setZone(before);
+    QCOMPARE(s_stampsMade, made);
+    const QByteArray entry = QByteArray(stampLength, '.') + " Trace x\n";
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), entry + entry);
 }
 
 void tst_TorkLogState::copyHasItsPermissionsAndAllBytes()
