@@ -34,6 +34,8 @@ private slots:
     void isWritingWhileALineIsWritten();
     void waitsForTheLock_data();
     void waitsForTheLock();
+    void prefixChangedWhileTheEntryWaits();
+    void qtIsReadyBeforeTheFirstFork();
     void stampKeptAtMidnight_data();
     void stampKeptAtMidnight();
     void stampsMadeInAMoment_data();
@@ -90,6 +92,13 @@ struct Writing
 };
 template struct PrivateField<Writing, &TorkLog::m_writing>;
 
+struct Prefix
+{
+    using Field = QString TorkLog::*;
+    friend Field privateField(Prefix);
+};
+template struct PrivateField<Prefix, &TorkLog::m_elapsedTimePrefix>;
+
 struct Mutex
 {
     using Field = QMutex TorkLog::*;
@@ -101,6 +110,7 @@ namespace {
 
 int s_installedHandlers = 0;
 int s_stampsMade = 0;
+int s_categoriesAskedFor = 0;
 std::function<void()> s_beforeWriting;
 
 } // namespace
@@ -131,6 +141,16 @@ QString QDateTime::toString(QString const& format) const
         reinterpret_cast<ToString>(dlsym(RTLD_NEXT, "_ZNK9QDateTime8toStringERK7QString"));
     ++s_stampsMade;
     return original(this, format);
+}
+
+// In place of Qt's, which it calls: how often the category of usual messages is asked for.
+QLoggingCategory* QLoggingCategory::defaultCategory()
+{
+    using Category = QLoggingCategory* (*)();
+    static const auto original =
+        reinterpret_cast<Category>(dlsym(RTLD_NEXT, "_ZN16QLoggingCategory15defaultCategoryEv"));
+    ++s_categoriesAskedFor;
+    return original();
 }
 
 void tst_TorkLogState::cleanup()
@@ -240,6 +260,46 @@ void tst_TorkLogState::waitsForTheLock()
     mutex.unlock();
     other.join();
     QVERIFY(waited);
+}
+
+// A thread that has its stamp still needs the prefix, and waits for it.
+void tst_TorkLogState::prefixChangedWhileTheEntryWaits()
+{
+    TestClock::set(QDateTime(QDate(2023, 9, 30), QTime(9, 59, 8, 5)));
+    LogFolder folder;
+    TorkLog log;
+    log.setOutputPath(folder.logs());
+    folder.configure(log, {{"filePrefix", "app"}, {"logElapsedTime", "yes"}});
+
+    std::atomic<bool> hasStamp{false};
+    std::atomic<bool> isLocked{false};
+    std::thread other([&] {
+        log.trace("first");
+        hasStamp = true;
+        while (!isLocked)
+            std::this_thread::yield();
+        log.trace("second");
+    });
+    while (!hasStamp)
+        std::this_thread::yield();
+    QMutex& mutex = log.*privateField(Mutex());
+    mutex.lock();
+    isLocked = true;
+    std::this_thread::sleep_for(std::chrono::milliseconds(50));
+    log.*privateField(Prefix()) = "later:";
+    mutex.unlock();
+    other.join();
+    QVERIFY(TestFiles::read(folder.logs() + "app.log").endsWith("T Trace later:[0] second\n"));
+}
+
+// Qt makes it under a lock that a child of fork() would inherit.
+void tst_TorkLogState::qtIsReadyBeforeTheFirstFork()
+{
+    LogFolder folder;
+    s_categoriesAskedFor = 0;
+    TorkLog::initialize(folder.logs(), "app", folder.settingsFile(), false);
+    QVERIFY(s_categoriesAskedFor > 0);
+    TorkLog::shutdown();
 }
 
 // Midnight is a time of day like any other: a stamp that is kept is written once.
