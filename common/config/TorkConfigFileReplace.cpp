@@ -15,6 +15,7 @@
 
 #include "common/log/TorkEmptyText_p.h"
 
+#include <QDeadlineTimer>
 #include <QFile>
 #include <QObject>
 #include <QSaveFile>
@@ -74,29 +75,31 @@ public:
         return FailureOf(m_descriptor);
     }
 
-    // Releases the lock too, even if a child process has inherited it.
-    void Close()
-    {
-        if (m_descriptor == -1)
-            return;
-        ::flock(m_descriptor, LOCK_UN);
-        ::close(m_descriptor);
-        m_descriptor = -1;
-    }
-
     // False if another process or thread holds the lock. Without lock support in the file system,
     // it always succeeds.
     bool Lock() const
     {
-        const int result = Uninterrupted([&] { return ::flock(m_descriptor, LOCK_EX | LOCK_NB); });
-        return result == 0 || errno != EWOULDBLOCK;
+        return FailureOf(Uninterrupted([&] { return ::flock(m_descriptor, LOCK_EX | LOCK_NB); })) !=
+               EWOULDBLOCK;
     }
 
     int Number() const { return m_descriptor; }
 
 private:
+    void Close() const
+    {
+        if (m_descriptor != -1)
+            ::close(m_descriptor);
+    }
+
     int m_descriptor = -1;
 };
+
+// The folder that a path is in, with its slash; empty for the current one.
+QByteArray FolderOf(QByteArray const& path)
+{
+    return path.left(path.lastIndexOf('/') + 1);
+}
 
 // Resolves all symbolic links. The links themselves are kept; the target of a dangling one is
 // created later.
@@ -111,7 +114,7 @@ Failure Follow(QByteArray& path)
         if (length == sizeof target)
             return ENAMETOOLONG;
         const QByteArray next(target, static_cast<int>(length));
-        path = next.startsWith('/') ? next : path.left(path.lastIndexOf('/') + 1) + next;
+        path = next.startsWith('/') ? next : FolderOf(path) + next;
     }
     return ELOOP;
 }
@@ -164,51 +167,47 @@ Failure KeepRights(int descriptor, struct stat const& old)
     const uid_t anyUser = static_cast<uid_t>(-1);
     if (file.st_gid != old.st_gid && ::fchown(descriptor, anyUser, old.st_gid) == -1)
         mode &= ~static_cast<mode_t>(S_IRWXG) | ((mode & S_IRWXO) << 3U);
-    const bool keepsOwner =
-        file.st_uid == old.st_uid || ::fchown(descriptor, old.st_uid, anyGroup) == 0;
-    Q_UNUSED(keepsOwner) // if not, this user owns the file from now on
+    if (file.st_uid != old.st_uid) // if that fails, this user owns the file from now on
+        FailureOf(::fchown(descriptor, old.st_uid, anyGroup));
     return FailureOf(::fchmod(descriptor, mode));
 }
 
 // Removes the leftover of a save that was killed.
 //
-// @return EEXIST if another save is still writing it
+// @return EEXIST if another save is still writing it, ENOENT if it is gone by now
 Failure RemoveLeftover(QByteArray const& path)
 {
     struct stat status = {};
     if (::lstat(path, &status) == -1)
-        return errno == ENOENT ? Done : errno;
+        return errno;
 
     Descriptor leftover; // locked until it is removed
     if (S_ISREG(status.st_mode)) {
         const Failure failure = leftover.Open(path, O_RDONLY | O_NOFOLLOW | O_NONBLOCK);
-        if (failure == ENOENT)
-            return Done;
         if (failure)
             return failure;
         if (!leftover.Lock() || !HasName(leftover.Number(), path))
             return EEXIST;
     }
-    const Failure failure = FailureOf(::unlink(path));
-    return failure == ENOENT ? Done : failure;
+    return FailureOf(::unlink(path));
 }
 
 // Creates a file of this name and locks it. Waits a second for another save of the same file.
 Failure Create(Descriptor& file, QByteArray const& path, mode_t mode)
 {
-    for (int attempt = 0; attempt < 100; ++attempt) {
+    const QDeadlineTimer end(1000);
+    while (!end.hasExpired()) {
         Failure failure = file.Open(path, O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW, mode);
-        if (!failure) {
-            if (file.Lock() && HasName(file.Number(), path))
-                return Done;
-            failure = EEXIST; // another save took it for a leftover before it was locked
-        } else if (failure == EEXIST) {
-            failure = RemoveLeftover(path);
-        }
+        // Before it is locked, another save may take it for a leftover.
+        if (!failure && file.Lock() && HasName(file.Number(), path))
+            return Done;
         if (failure && failure != EEXIST)
             return failure;
-        if (failure)
-            QThread::msleep(10);
+
+        failure = RemoveLeftover(path);
+        if (failure && failure != EEXIST && failure != ENOENT)
+            return failure;
+        QThread::msleep(10);
     }
     return EAGAIN;
 }
@@ -217,9 +216,8 @@ Failure Create(Descriptor& file, QByteArray const& path, mode_t mode)
 // not an error.
 void SyncFolderOf(QByteArray const& path)
 {
-    const int slash = path.lastIndexOf('/');
     Descriptor folder;
-    if (!folder.Open(slash < 0 ? QByteArray(".") : path.left(slash + 1), O_RDONLY | O_DIRECTORY))
+    if (!folder.Open(FolderOf(path) + ".", O_RDONLY | O_DIRECTORY))
         Sync(folder.Number());
 }
 

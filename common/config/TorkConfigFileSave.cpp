@@ -41,8 +41,8 @@ constexpr Needs NeedsOnLine = MakeNeeds();
 bool HasMarkup(QString const& text)
 {
     return std::any_of(text.begin(), text.end(), [](QChar character) {
-        const ushort unit = character.unicode();
-        return unit <= 0xff && NeedsOnLine.of[unit] == Wrapping;
+        const char latin1 = TorkToLatin1(character.unicode()); // no markup beyond Latin-1
+        return NeedsOnLine.of[static_cast<uchar>(latin1)] == Wrapping;
     });
 }
 
@@ -154,7 +154,6 @@ bool TorkConfigFile::Save()
         return true;
     }
     file.write(xml);
-    file.close();
     return true;
 }
 

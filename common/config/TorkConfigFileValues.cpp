@@ -106,7 +106,7 @@ bool TorkConfigFile::ReadInt(QString const& section, QString const& key, int def
 {
     QString const* text = findValue(section, key);
     bool converted = false;
-    const int number = text ? ToInt(*text, &converted) : 0;
+    const int number = text ? ToInt(*text, &converted) : defaultValue;
     value = converted ? number : defaultValue;
     return converted;
 }

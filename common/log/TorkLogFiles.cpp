@@ -45,11 +45,8 @@ QString BeforeLastDot(QString const& fileName)
 // The number of an older file: what follows the last dot; -1 if that is not a number.
 int LogFileNumber(QString const& fileName)
 {
-    const int dot = fileName.lastIndexOf(QLatin1Char('.'));
-    if (dot == -1)
-        return -1;
-
     bool converted = false;
+    const int dot = fileName.lastIndexOf(QLatin1Char('.'));
     const int number = fileName.midRef(dot + 1).toInt(&converted);
     return converted ? number : -1;
 }

@@ -61,7 +61,8 @@ void Keep(QDateTime const& time, qint64 now, QByteArray const& zone)
     kept.isSet = zone.size() <= Capacity;
     kept.now = now;
     kept.zoneLength = LengthOf(zone);
-    std::copy_n(zone.cbegin(), kept.isSet ? zone.size() : 0, kept.zone);
+    if (kept.isSet)
+        std::copy(zone.cbegin(), zone.cend(), kept.zone);
     kept.timeOfDay = time.time().msecsSinceStartOfDay();
     kept.generation = 0;
 }

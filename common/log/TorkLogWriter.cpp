@@ -11,7 +11,6 @@ QString TorkLogWriter::open(QString const& fileName)
 {
     close();
     m_file.setFileName(fileName);
-    m_followsEnd = false;
     m_appends = false;
     // Checked before opening, so that the other end of a pipe is not disturbed, and after it, as
     // the name may refer to another file by then. Neither appending nor truncating: entries
@@ -36,7 +35,6 @@ bool TorkLogWriter::close()
     if (!m_file.isOpen())
         return false;
 
-    m_file.flush();
     m_file.close();
     return true;
 }
@@ -44,8 +42,11 @@ bool TorkLogWriter::close()
 QFile* TorkLogWriter::handOut()
 {
     if (m_file.isOpen() && m_followsEnd) {
+        // Text that waits for room on the disk goes to its place, not over what follows it.
+        const bool isWritten = m_file.flush();
         TorkLogPlace::SetAppending(m_file, false);
-        takePosition();
+        if (isWritten)
+            takePosition();
     }
     m_handedOut = true;
     m_followsEnd = false;
@@ -77,7 +78,6 @@ bool TorkLogWriter::place(int length, qint64 limit)
 {
     // Text that waits for room on the disk has its place, and this entry follows it.
     if (!m_followsEnd || !m_file.flush()) {
-        m_appends = false;
         trim(length, limit);
         return false;
     }
@@ -114,14 +114,12 @@ bool TorkLogWriter::findPlace(int length, qint64 limit)
 // past it, or by another process after fork().
 void TorkLogWriter::takePosition()
 {
-    const qint64 position = TorkLogPlace::Position(m_file);
-    if (position >= 0 && position != m_file.pos())
-        m_file.seek(position);
+    m_file.seek(TorkLogPlace::Position(m_file));
 }
 
 void TorkLogWriter::trim(int length, qint64 limit)
 {
-    if (limit != NoLimit && !fits(m_file.size(), length, limit))
+    if (!fits(m_file.size(), length, limit))
         cut(length);
 }
 

@@ -5,6 +5,7 @@
 
 #include "ConfigContents.h"
 #include "StoreTest.h"
+#include "support/PrivateField.h"
 #include "support/TestFiles.h"
 
 #include <QDir>
@@ -23,6 +24,8 @@ using namespace StoreTest;
 
 static_assert(std::has_virtual_destructor<TorkConfigFile>::value,
               "applications derive from the store and delete it through this class");
+
+PRIVATE_FIELD(KnownOutside, TorkConfigFile, QSet<TorkConfigFileSection*>, m_knownOutside);
 
 namespace {
 
@@ -75,6 +78,7 @@ private slots:
     void appendNoSection();
     void appendSectionKeepsBlanksInTheName();
     void clearForgetsAllSections();
+    void clearForgetsWhatCallersHold();
     void clearSection_data();
     void clearSection();
     void keyList_data();
@@ -467,6 +471,17 @@ void tst_TorkConfigFile::clearForgetsAllSections()
 
     file.WriteItem("Two", "new", "w");
     QCOMPARE(ConfigContents::of(file, {"One", "Two"}), QString("Two{new=[w]}"));
+}
+
+// A new section at the address of an old one would count as held by a caller, and leak.
+void tst_TorkConfigFile::clearForgetsWhatCallersHold()
+{
+    TorkConfigFile file{QString()};
+    file.WriteItem("One", "k", "v");
+    QVERIFY(file.FindSection(QStringLiteral("One")));
+    QCOMPARE((file.*privateField(KnownOutside())).size(), 1);
+    file.Clear();
+    QCOMPARE((file.*privateField(KnownOutside())).size(), 0);
 }
 
 void tst_TorkConfigFile::clearSection_data()

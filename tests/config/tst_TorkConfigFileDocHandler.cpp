@@ -4,6 +4,7 @@
 #include "common/config/TorkConfigFileDocHandler.h"
 
 #include "common/config/TorkConfigFile.h"
+#include "support/PrivateField.h"
 
 #include <QBuffer>
 #include <QXmlInputSource>
@@ -15,6 +16,8 @@
 
 static_assert(std::is_convertible<TorkConfigFileDocHandler*, QXmlDefaultHandler*>::value,
               "the reader takes it for all its handlers");
+
+PRIVATE_FIELD(IgnorableWhitespace, TorkConfigFileDocHandler, int, m_ignorableWhitespaceCount);
 
 namespace {
 
@@ -74,7 +77,9 @@ private slots:
     void watchesALoad_data();
     void watchesALoad();
     void nullTextIsNoValue();
+    void countsIgnorableWhitespace();
     void stepsAfterALoad();
+    void stepsAfterALoadThatEndsInAnItem();
 };
 
 void tst_TorkConfigFileDocHandler::startsEmpty_data()
@@ -364,6 +369,14 @@ void tst_TorkConfigFileDocHandler::nullTextIsNoValue()
 }
 
 // Also if its handler is still there and would say where the load stopped.
+void tst_TorkConfigFileDocHandler::countsIgnorableWhitespace()
+{
+    TorkConfigFileDocHandler handler;
+    handler.ignorableWhitespace(" \n");
+    handler.ignorableWhitespace("\t");
+    QCOMPARE(handler.*privateField(IgnorableWhitespace()), 3);
+}
+
 void tst_TorkConfigFileDocHandler::stepsAfterALoad()
 {
     TorkConfigFile file{QString()};
@@ -377,6 +390,21 @@ void tst_TorkConfigFileDocHandler::stepsAfterALoad()
     QVERIFY(file.StartElement(name));
     QVERIFY(!file.HasSection("New"));
     QCOMPARE(file.sectionList(), QStringList("s"));
+}
+
+// Outside a load an element has no depth, so the item still waits for its value.
+void tst_TorkConfigFileDocHandler::stepsAfterALoadThatEndsInAnItem()
+{
+    TorkConfigFile file{QString()};
+    TorkConfigFileDocHandler handler(&file);
+    QByteArray document("<r><s><k>");
+    QBuffer buffer(&document);
+    QVERIFY(!file.LoadFrom(&buffer, handler));
+    QVERIFY(file.IsExpectingValue());
+
+    QString name("new");
+    QVERIFY(file.StartElement(name));
+    QVERIFY(file.IsExpectingValue());
 }
 
 QTEST_APPLESS_MAIN(tst_TorkConfigFileDocHandler)

@@ -33,6 +33,7 @@ private slots:
     void shortFileName();
     void nulInFileName();
     void noDescriptorIsLeft();
+    void noDescriptorIsLeftWithoutInput();
 
     void newFileFollowsTheMask_data();
     void newFileFollowsTheMask();
@@ -40,9 +41,13 @@ private slots:
     void permissionsAreKept();
     void ownerAndGroupAreKept();
     void lostGroupGetsNoRights();
+    void ownGroupIsKept();
 
     void linkStays_data();
     void linkStays();
+    void manyLinks_data();
+    void manyLinks();
+    void longLink();
     void linkToItself();
     void hardLinkKeepsTheOldFile();
 
@@ -222,6 +227,14 @@ void tst_TorkConfigFileReplace::noDescriptorIsLeft()
     QCOMPARE(next(), before);
 }
 
+// The first file is then 0.
+void tst_TorkConfigFileReplace::noDescriptorIsLeftWithoutInput()
+{
+    const ChildProcess::Result child = ChildProcess::run("without input", {path()});
+    QVERIFY2(child.ended(), child.report());
+    QCOMPARE(child.output, QByteArray("true 0"));
+}
+
 void tst_TorkConfigFileReplace::newFileFollowsTheMask_data()
 {
     QTest::addColumn<unsigned>("mask");
@@ -285,6 +298,27 @@ int savesAsOrdinaryUser(QStringList const& arguments)
     return 0;
 }
 
+// Belongs to another group, too.
+int savesAsMember(QStringList const& arguments)
+{
+    const gid_t group = 23456;
+    if (setgroups(1, &group) != 0 || setgid(65534) != 0 || setuid(65534) != 0)
+        return ChildProcess::skipped;
+    ProcessLimits::allowTracing();
+    const Saved saved = SaveNew(arguments.at(0));
+    std::printf("%s", qPrintable((saved.result ? "true " : "false ") + saved.error));
+    return 0;
+}
+
+int savesWithoutInput(QStringList const& arguments)
+{
+    ::close(STDIN_FILENO);
+    const Saved saved = SaveNew(arguments.at(0));
+    const int next = ::open("/dev/null", O_RDONLY);
+    std::printf("%s%d", saved.result ? "true " : "false ", next);
+    return 0;
+}
+
 int savesBeyondFileSize(QStringList const& arguments)
 {
     if (!ProcessLimits::limitFileSize(10))
@@ -303,13 +337,15 @@ int saves(QStringList const& arguments)
 
 } // namespace
 
-#define RUN_AS_ORDINARY_USER(child)                                                                \
+#define RUN_AS_OTHER_USER(child, name)                                                             \
     if (geteuid() != 0)                                                                            \
         QSKIP("Only root can set this up.");                                                       \
-    const ChildProcess::Result child = ChildProcess::run("ordinary", {path()});                    \
+    const ChildProcess::Result child = ChildProcess::run(name, {path()});                          \
     if (child.wasSkipped())                                                                        \
         QSKIP("This process cannot become another user.");                                         \
     QVERIFY2(child.ended(), child.report())
+
+#define RUN_AS_ORDINARY_USER(child) RUN_AS_OTHER_USER(child, "ordinary")
 
 // The user owns file and folder, but belongs only to its own group.
 void tst_TorkConfigFileReplace::lostGroupGetsNoRights()
@@ -325,6 +361,22 @@ void tst_TorkConfigFileReplace::lostGroupGetsNoRights()
     QCOMPARE(TestFiles::read(path()), newBytes);
     QCOMPARE(StatusOf(path()).st_gid, gid_t(65534));
     QCOMPARE(ModeOf(path()), 0644U);
+}
+
+// The user may give it to a group that is not its first one.
+void tst_TorkConfigFileReplace::ownGroupIsKept()
+{
+    QVERIFY(TestFiles::write(path(), oldBytes));
+    QVERIFY(SetMode(path(), 0660));
+    if (geteuid() == 0) {
+        QVERIFY(::chown(QFile::encodeName(path()), 65534, 23456) == 0);
+        QVERIFY(::chown(QFile::encodeName(m_folder->path()), 65534, 65534) == 0);
+    }
+    RUN_AS_OTHER_USER(child, "member");
+    QCOMPARE(child.output, QByteArray("true "));
+    QCOMPARE(TestFiles::read(path()), newBytes);
+    QCOMPARE(StatusOf(path()).st_gid, gid_t(23456));
+    QCOMPARE(ModeOf(path()), 0660U);
 }
 
 void tst_TorkConfigFileReplace::linkStays_data()
@@ -383,6 +435,46 @@ void tst_TorkConfigFileReplace::linkStays()
     QCOMPARE(TestFiles::read(path(file)), newBytes);
     QVERIFY(!isThere || ModeOf(path(file)) == 0600);
     QVERIFY(TestFiles::listing(m_folder->path()).filter(".saving").isEmpty());
+}
+
+// As many as the system follows.
+void tst_TorkConfigFileReplace::manyLinks_data()
+{
+    QTest::addColumn<int>("links");
+    QTest::addColumn<bool>("result");
+    QTest::newRow("forty") << 40 << true;
+    QTest::newRow("one more") << 41 << false;
+}
+
+void tst_TorkConfigFileReplace::manyLinks()
+{
+    QFETCH(int, links);
+    QFETCH(bool, result);
+    QVERIFY(TestFiles::write(path("0"), oldBytes));
+    for (int link = 1; link <= links; ++link)
+        QVERIFY(::symlink(QByteArray::number(link - 1),
+                          QFile::encodeName(path(QString::number(link)))) == 0);
+    const QString last = path(QString::number(links));
+    const Saved saved = SaveNew(last);
+    QCOMPARE(saved.result, result);
+    QCOMPARE(saved.error, result ? QString() : Unable(last, ELOOP));
+    QCOMPARE(TestFiles::read(path("0")), result ? newBytes : oldBytes);
+}
+
+// The longest that the system allows; there is no room for the new file's name.
+void tst_TorkConfigFileReplace::longLink()
+{
+    const int longest = 4095;
+    QByteArray target = QFile::encodeName(m_folder->path());
+    while (target.size() < longest - 10)
+        target += "/.";
+    target += QByteArray(longest - 8 - target.size(), '/') + "real.cfg";
+    QVERIFY(TestFiles::write(path("real.cfg"), oldBytes));
+    QVERIFY(::symlink(target, QFile::encodeName(path())) == 0);
+    const Saved saved = SaveNew(path());
+    QCOMPARE(saved.error, InPlace(path(), ENAMETOOLONG));
+    QVERIFY(saved.result);
+    QCOMPARE(TestFiles::read(path("real.cfg")), newBytes);
 }
 
 void tst_TorkConfigFileReplace::linkToItself()
@@ -655,9 +747,12 @@ void tst_TorkConfigFileReplace::manySavesAtOnce()
 
 int main(int argc, char** argv)
 {
-    return ChildProcess::main<tst_TorkConfigFileReplace>(
-        argc, argv,
-        {{"ordinary", savesAsOrdinaryUser}, {"limited", savesBeyondFileSize}, {"save", saves}});
+    return ChildProcess::main<tst_TorkConfigFileReplace>(argc, argv,
+                                                         {{"ordinary", savesAsOrdinaryUser},
+                                                          {"member", savesAsMember},
+                                                          {"without input", savesWithoutInput},
+                                                          {"limited", savesBeyondFileSize},
+                                                          {"save", saves}});
 }
 
 #include "tst_TorkConfigFileReplace.moc"

@@ -46,6 +46,7 @@ private slots:
     void pruningGoesByName();
     void linkWithoutTargetInTheWay_data();
     void linkWithoutTargetInTheWay();
+    void linkToAFolderInTheWay();
     void unfinishedCopies_data();
     void unfinishedCopies();
 
@@ -520,6 +521,20 @@ void tst_TorkLogRotation::linkWithoutTargetInTheWay()
     QCOMPARE(folder.listing(), after);
     for (QString const& file : namesIn(folder.logs()))
         QVERIFY(!QFileInfo(folder.logs() + file).isSymLink());
+}
+
+// Only a link without a target gives way.
+void tst_TorkLogRotation::linkToAFolderInTheWay()
+{
+    LogFolder folder;
+    for (char const* entry : {"app.log: c", "app.log.1: a", "app.log.2 -> ."})
+        make(folder.logs(), entry);
+    TorkLog log;
+    folder.prepare(log, "app");
+
+    log.deleteOldFiles();
+    QVERIFY(QFileInfo(folder.logs() + "app.log.2").isSymLink());
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log.1"), QByteArray("a"));
 }
 
 void tst_TorkLogRotation::unfinishedCopies_data()

@@ -31,6 +31,7 @@ private slots:
     void forkedProcesses_data();
     void forkedProcesses();
     void forkWhileOtherThreadsLog();
+    void childOfAChild();
     void cutDownByAnotherLog();
     void twoProcesses();
     void anotherProgramAtWork();
@@ -174,6 +175,26 @@ int forksWhileOtherThreadsLog(QStringList const& arguments)
     return failed;
 }
 
+int forksTwice(QStringList const& arguments)
+{
+    TorkLog::initialize(arguments.at(0), "app", QString(), true);
+    qDebug("<parent>");
+    const pid_t child = fork();
+    if (child == 0) {
+        const pid_t grandchild = fork();
+        if (grandchild == 0)
+            logInChild(2);
+        int status = 0;
+        if (waitpid(grandchild, &status, 0) != grandchild || status != 0)
+            _exit(1);
+        logInChild(1);
+    }
+    int status = 0;
+    const bool isWell = waitpid(child, &status, 0) == child && status == 0;
+    TorkLog::shutdown();
+    return isWell ? 0 : 1;
+}
+
 int writesAlone(QStringList const& arguments)
 {
     TorkLog log(arguments.at(0));
@@ -219,6 +240,18 @@ void tst_TorkLogSharing::forkedProcesses()
         ChildProcess::run("parent and child", {folder.logs(), limit, handedOut});
     QVERIFY2(child.ended(), child.report());
     QCOMPARE(wrongLines(TestFiles::read(folder.logs() + ".log"), "pc"), QStringList());
+}
+
+// The first child's locks are new, and may be locked and released again.
+void tst_TorkLogSharing::childOfAChild()
+{
+    LogFolder folder;
+    const ChildProcess::Result child = ChildProcess::run("forks twice", {folder.logs()});
+    QVERIFY2(child.ended(), child.report());
+    const QByteArray log = TestFiles::read(folder.logs() + "app.log");
+    for (char const* entry : {"<parent>", "<child 2 entry>", "<child 2 message>", "<child 1 entry>",
+                              "<child 1 message>"})
+        QCOMPARE(log.count(entry), 1);
 }
 
 // A child has only the thread that forked it: nobody there would release what others had locked.
@@ -310,6 +343,7 @@ int main(int argc, char** argv)
     return ChildProcess::main<tst_TorkLogSharing>(argc, argv,
                                                   {{"parent and child", writesInParentAndChild},
                                                    {"forks", forksWhileOtherThreadsLog},
+                                                   {"forks twice", forksTwice},
                                                    {"alone", writesAlone},
                                                    {"once", writesOnce}});
 }

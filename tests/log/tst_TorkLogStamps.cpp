@@ -359,6 +359,10 @@ void tst_TorkLogStamps::stampInTheUsersLanguage_data()
         << QByteArray("ar_EG") << names << QByteArray("Tuesday 2 March|Tuesday 3 August");
     QTest::newRow("text beyond Latin-1 in the format")
         << QByteArray("de_DE") << QString::fromUtf8("'€' MMMM") << QByteArray("? March|? August");
+    QTest::newRow("last letter of Latin-1") << QByteArray("de_DE") << QString::fromUtf8("'ÿ' MMMM")
+                                            << QByteArray("\xFF M\xE4rz|\xFF August");
+    QTest::newRow("first letter beyond Latin-1")
+        << QByteArray("de_DE") << QString::fromUtf8("'Ā' MMMM") << QByteArray("? March|? August");
     QTest::newRow("no moment in the format")
         << QByteArray("fa_IR") << "'at'" << QByteArray("at|at");
 }

@@ -3,6 +3,7 @@
 
 #include "common/log/TorkLog.h"
 #include "common/log/TorkLogLock_p.h"
+#include "log/LogAtATime.h"
 #include "log/LogFolder.h"
 #include "support/ForkedChild.h"
 #include "support/PrivateField.h"
@@ -33,8 +34,12 @@ private slots:
     void isWritingWhileALineIsWritten();
     void waitsForTheLock_data();
     void waitsForTheLock();
+    void prefixChangedWhileTheEntryWaits();
+    void qtIsReadyBeforeTheFirstFork();
     void stampKeptAtMidnight_data();
     void stampKeptAtMidnight();
+    void stampsMadeInAMoment_data();
+    void stampsMadeInAMoment();
     void copyHasItsPermissionsAndAllBytes();
     void oddNamesAndPruning_data();
     void oddNamesAndPruning();
@@ -51,11 +56,14 @@ PRIVATE_FIELD(SeverityName, TorkLog, QString, m_severityName);
 PRIVATE_FIELD(ConsoleKey, TorkLog, QString, m_outputToConsoleKey);
 PRIVATE_FIELD(Console, TorkLog, bool, m_outputToConsole);
 PRIVATE_FIELD(Writing, TorkLog, int, m_writing);
+PRIVATE_FIELD(Prefix, TorkLog, QString, m_elapsedTimePrefix);
 PRIVATE_FIELD(Mutex, TorkLog, QMutex, m_mutex);
 
 namespace {
 
 int s_installedHandlers = 0;
+int s_stampsMade = 0;
+int s_categoriesAskedFor = 0;
 std::function<void()> s_beforeWriting;
 
 } // namespace
@@ -76,6 +84,26 @@ QtMessageHandler qInstallMessageHandler(QtMessageHandler handler)
         RTLD_NEXT, "_Z22qInstallMessageHandlerPFv9QtMsgTypeRK18QMessageLogContextRK7QStringE"));
     ++s_installedHandlers;
     return install(handler);
+}
+
+// In place of Qt's, which it calls: how often a stamp is made.
+QString QDateTime::toString(QString const& format) const
+{
+    using ToString = QString (*)(QDateTime const*, QString const&);
+    static const auto original =
+        reinterpret_cast<ToString>(dlsym(RTLD_NEXT, "_ZNK9QDateTime8toStringERK7QString"));
+    ++s_stampsMade;
+    return original(this, format);
+}
+
+// In place of Qt's, which it calls: how often the category of usual messages is asked for.
+QLoggingCategory* QLoggingCategory::defaultCategory()
+{
+    using Category = QLoggingCategory* (*)();
+    static const auto original =
+        reinterpret_cast<Category>(dlsym(RTLD_NEXT, "_ZN16QLoggingCategory15defaultCategoryEv"));
+    ++s_categoriesAskedFor;
+    return original();
 }
 
 void tst_TorkLogState::cleanup()
@@ -187,6 +215,46 @@ void tst_TorkLogState::waitsForTheLock()
     QVERIFY(waited);
 }
 
+// A thread that has its stamp still needs the prefix, and waits for it.
+void tst_TorkLogState::prefixChangedWhileTheEntryWaits()
+{
+    TestClock::set(QDateTime(QDate(2023, 9, 30), QTime(9, 59, 8, 5)));
+    LogFolder folder;
+    TorkLog log;
+    log.setOutputPath(folder.logs());
+    folder.configure(log, {{"filePrefix", "app"}, {"logElapsedTime", "yes"}});
+
+    std::atomic<bool> hasStamp{false};
+    std::atomic<bool> isLocked{false};
+    std::thread other([&] {
+        log.trace("first");
+        hasStamp = true;
+        while (!isLocked)
+            std::this_thread::yield();
+        log.trace("second");
+    });
+    while (!hasStamp)
+        std::this_thread::yield();
+    QMutex& mutex = log.*privateField(Mutex());
+    mutex.lock();
+    isLocked = true;
+    std::this_thread::sleep_for(std::chrono::milliseconds(50));
+    log.*privateField(Prefix()) = "later:";
+    mutex.unlock();
+    other.join();
+    QVERIFY(TestFiles::read(folder.logs() + "app.log").endsWith("T Trace later:[0] second\n"));
+}
+
+// Qt makes it under a lock that a child of fork() would inherit.
+void tst_TorkLogState::qtIsReadyBeforeTheFirstFork()
+{
+    LogFolder folder;
+    s_categoriesAskedFor = 0;
+    TorkLog::initialize(folder.logs(), "app", folder.settingsFile(), false);
+    QVERIFY(s_categoriesAskedFor > 0);
+    TorkLog::shutdown();
+}
+
 // Midnight is a time of day like any other: a stamp that is kept is written once.
 void tst_TorkLogState::stampKeptAtMidnight_data()
 {
@@ -209,6 +277,50 @@ void tst_TorkLogState::stampKeptAtMidnight()
     log.trace("third");
     QCOMPARE(folder.listing(),
              QStringList("app.log: T Trace first\nT Trace second\nT Trace third\n"));
+}
+
+// Qt takes long for one. Only unusually long ones and those in unusually long time zones are made
+// for each entry.
+void tst_TorkLogState::stampsMadeInAMoment_data()
+{
+    QTest::addColumn<int>("stampLength");
+    QTest::addColumn<QByteArray>("zone"); // null: TZ is not set
+    QTest::addColumn<int>("made");        // for two entries
+
+    const auto row = [](char const* name, int length, QByteArray const& zone, int made) {
+        QTest::newRow(name) << length << zone << made;
+    };
+    const QByteArray longest = ":" + QByteArray(63, 'x');
+    row("usual", 23, QByteArray(), 1);
+    row("time zone", 23, "UTC", 1);
+    row("empty time zone", 23, "", 1);
+    row("longest stamp that is kept", 64, "UTC", 1);
+    row("longer stamp", 65, "UTC", 2);
+    row("longest time zone that is kept", 23, longest, 1);
+    row("longer time zone", 23, longest + 'x', 2);
+}
+
+void tst_TorkLogState::stampsMadeInAMoment()
+{
+    QFETCH(int, stampLength);
+    QFETCH(QByteArray, zone);
+    QFETCH(int, made);
+    const QByteArray before = qgetenv("TZ");
+    LogAtATime::setZone(zone);
+    TestClock::set(QDateTime(QDate(2023, 9, 30), QTime(9, 59, 8, 5)));
+    LogFolder folder;
+    TorkLog log;
+    log.setOutputPath(folder.logs());
+    const QString format = '\'' + QString(stampLength, '.') + '\'';
+    folder.configure(log, {{"dateTimeFormat", format}, {"filePrefix", "app"}});
+
+    s_stampsMade = 0;
+    log.trace("x");
+    log.trace("x");
+    LogAtATime::setZone(before);
+    QCOMPARE(s_stampsMade, made);
+    const QByteArray entry = QByteArray(stampLength, '.') + " Trace x\n";
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), entry + entry);
 }
 
 void tst_TorkLogState::copyHasItsPermissionsAndAllBytes()

@@ -37,7 +37,11 @@ int s_step;
 int s_count;
 bool s_lasts;
 int s_error;
+char const* s_name; // null: calls of any name
 qint64 s_room;
+char const* s_awaited;
+int s_toAwait;
+std::function<void()>* s_action;
 bool s_reached;
 bool s_strayed;
 char const* s_call = "";
@@ -83,10 +87,23 @@ bool IsDue()
     return s_count == s_step || (s_lasts && s_count > s_step);
 }
 
+void ActBefore(char const* call)
+{
+    if (!s_awaited || std::strcmp(call, s_awaited) != 0 || --s_toAwait > 0)
+        return;
+    s_awaited = nullptr;
+    const Fault fault = s_fault.exchange(Fault::None);
+    (*s_action)();
+    s_fault = fault;
+}
+
 // Whether the call is to fail; if so, errno is set.
 bool Fails(char const* call, char const* path)
 {
-    if (s_fault != Fault::Error || !Concerns(path) || !IsDue())
+    if (!Concerns(path))
+        return false;
+    ActBefore(call);
+    if (s_fault != Fault::Error || (s_name && std::strcmp(call, s_name) != 0) || !IsDue())
         return false;
     Note(call, path);
     errno = s_error;
@@ -135,8 +152,9 @@ mode_t ModeOf(int flags, va_list arguments)
     return creates ? va_arg(arguments, mode_t) : 0;
 }
 
-void Start(Fault fault, int step, bool lasts, int error)
+void Start(Fault fault, int step, bool lasts, int error, char const* name = nullptr)
 {
+    s_name = name;
     s_step = step;
     s_lasts = lasts;
     s_error = error;
@@ -158,12 +176,23 @@ FaultyFiles::FaultyFiles(QString const& folder)
 FaultyFiles::~FaultyFiles()
 {
     mend();
+    s_awaited = nullptr;
+    delete s_action;
+    s_action = nullptr;
     s_folder[0] = '\0';
 }
 
-void FaultyFiles::failAt(int step, Duration duration, int error)
+void FaultyFiles::failAt(int step, Duration duration, int error, char const* call)
 {
-    Start(Fault::Error, step, duration == FromThereOn, error);
+    Start(Fault::Error, step, duration == FromThereOn, error, call);
+}
+
+void FaultyFiles::before(char const* call, int step, std::function<void()> const& action)
+{
+    delete s_action;
+    s_action = new std::function<void()>(action);
+    s_toAwait = step;
+    s_awaited = call;
 }
 
 void FaultyFiles::cutShortAt(int step)

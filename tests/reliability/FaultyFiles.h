@@ -6,6 +6,8 @@
 #include <QString>
 #include <QtGlobal>
 
+#include <functional>
+
 /// Makes the system's file calls fail on request, in programs that are built with FaultyFiles.cpp.
 ///
 /// It is between Qt and the C library and counts the calls that concern one folder. Calls on
@@ -30,7 +32,14 @@ public:
     Q_DISABLE_COPY(FaultyFiles)
 
     /// From now on counts the calls; the one numbered `step`, from 1, fails with this error.
-    void failAt(int step, Duration duration, int error);
+    ///
+    /// @param call  counts only those of this name in the C library; null for all. All calls that
+    ///              ask for the status of a file are named "stat".
+    void failAt(int step, Duration duration, int error, char const* call = nullptr);
+
+    /// Does something, once, right before the call numbered `step`, from 1, of this name, as
+    /// another program might. The file calls of `action` itself are not counted.
+    void before(char const* call, int step, std::function<void()> const& action);
 
     /// The same for the calls that write: that one accepts only the first half of its bytes.
     void cutShortAt(int step);
