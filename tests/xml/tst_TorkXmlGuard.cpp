@@ -124,21 +124,26 @@ void tst_TorkXmlGuard::parse_data()
         << Document("<!ENTITY % p '" + Groups(TorkXmlMaximumDepth) + "'>%p;", "") << true;
     QTest::newRow("one group more from a parameter entity")
         << Document("<!ENTITY % p '" + Groups(TorkXmlMaximumDepth + 1) + "'>%p;", "") << false;
-    QTest::newRow("one group more from brackets as references")
-        << Document("<!ENTITY % p '<!ELEMENT r " +
-                        QByteArray("&#40;").repeated(TorkXmlMaximumDepth + 1) + "'>%p;",
-                    "")
-        << false;
-    QTest::newRow("one group more from brackets as hexadecimal references")
-        << Document("<!ENTITY % p '<!ELEMENT r " +
-                        QByteArray("&#x28;").repeated(TorkXmlMaximumDepth + 1) + "'>%p;",
-                    "")
-        << false;
-    QTest::newRow("groups begun in a parameter entity and continued in another")
-        << Document("<!ENTITY % p '<!ELEMENT r " + QByteArray("(").repeated(600) +
-                        "'><!ENTITY % q '" + QByteArray("(").repeated(600) + "'>%p;%q;",
-                    "")
-        << false;
+    for (QByteArray const& bracket : {QByteArray("&#40;"), QByteArray("&#x28;")}) {
+        const auto groups = [&](int levels) {
+            return Document("<!ENTITY % p '<!ELEMENT r " + bracket.repeated(levels) + "a" +
+                                QByteArray(")").repeated(levels) + ">'>%p;",
+                            "");
+        };
+        QTest::addRow("as many groups as allowed from references %s", bracket.constData())
+            << groups(TorkXmlMaximumDepth) << true;
+        QTest::addRow("one group more from references %s", bracket.constData())
+            << groups(TorkXmlMaximumDepth + 1) << false;
+    }
+    const auto inTwoParts = [](int first, int second) {
+        return Document("<!ENTITY % p '<!ELEMENT r " + QByteArray("(").repeated(first) + "'>%p;" +
+                            QByteArray("(").repeated(second) + "a" +
+                            QByteArray(")").repeated(first + second) + ">",
+                        "");
+    };
+    QTest::newRow("as many groups as allowed, begun in a parameter entity")
+        << inTwoParts(500, 500) << true;
+    QTest::newRow("one group more, begun in a parameter entity") << inTwoParts(500, 501) << false;
     QTest::newRow("entity with brackets") << Document(Entity("e", "(a"), "&e;") << true;
 
     QTest::newRow("groups enough to exhaust a stack after the address of the document type")
