@@ -309,7 +309,8 @@ private:
                 all = all + Literal("<!--" + hidden(inEntity) + "-->", true);
                 break;
             case 2:
-                all = all + Literal("<![CDATA[" + hidden(inEntity) + "]]>", true);
+                all = all +
+                      Literal("<![CDATA[" + hidden(inEntity).replace("]]>", "]] >") + "]]>", true);
                 break;
             case 3:
                 all = all + Literal("<?t " + hidden(inEntity) + "?>", true);

@@ -323,6 +323,14 @@ void tst_TorkXmlGuard::namesTheLimit_data()
     QTest::newRow("malformed within the limits") << QByteArray("<r>") << "unexpected end of file";
     QTest::newRow("an entity that names itself")
         << Document(Entity("e", "<a>&e;</a>"), "&e;") << "recursive entities";
+    // The reader takes it for one once more texts are open than entities are declared, and one.
+    QTest::newRow("an entity that names itself, with as many elements as allowed")
+        << Document(Entities(997) + Entity("f", "<a>&f;</a>"), "&f;") << "recursive entities";
+    QTest::newRow("an entity that names itself, with one element more")
+        << Document(Entities(998) + Entity("f", "<a>&f;</a>"), "&f;")
+        << "More than 1000 elements are inside each other.";
+    QTest::newRow("a parameter entity that names itself")
+        << Document("<!ENTITY % p '<!--c-->&#37;p;'>%p;", "") << "recursive entities";
 }
 
 // The error handler is called once, and is the reader's again afterwards.
