@@ -13,6 +13,7 @@
 
 #include <QProcess>
 #include <QRegularExpression>
+#include <QStorageInfo>
 #include <QTextStream>
 #include <QtTest>
 
@@ -42,6 +43,7 @@ private slots:
     void filePrefix_data();
     void filePrefix();
     void instances();
+    void instanceStays();
     void instancesOfAnotherLog();
     void instancesAreLocksOnly();
     void instancesLeaveNothing();
@@ -51,6 +53,7 @@ private slots:
     void healthDirectoryInTheWay();
     void healthReadOnly();
     void healthFullDisk();
+    void healthWithoutALimit();
 };
 
 // Where the window looks for other programs.
@@ -114,6 +117,7 @@ void tst_RunningLog::preferencesInEffect()
     QCOMPARE(preferences.echo, false);
 
     QVERIFY(log->savePreferences());
+    log->setMaxLogFileSize(0); // takes 2048
     log->setEnable(false);
     log->setLogElapsedTime(true);
     log->setLogPipeToConsole(true);
@@ -126,6 +130,7 @@ void tst_RunningLog::preferencesInEffect()
     log->setLogElapsedTime(false);
     log->setLogPipeToConsole(false);
     QVERIFY(log->loadPreferences());
+    QCOMPARE(log->maxLogFileSize(), 2048U);
     QCOMPARE(log->enabled(), false);
     QCOMPARE(log->logElapsedTime(), true);
     QCOMPARE(log->logPipeToConsole(), true);
@@ -334,6 +339,18 @@ void tst_RunningLog::instances()
     QCOMPARE(health.Check(), QString());
 }
 
+// However often it looks for others.
+void tst_RunningLog::instanceStays()
+{
+    const TestRun test;
+    LogHealth health;
+    for (int i = 0; i < 3; ++i) {
+        QCOMPARE(health.Check(), QString());
+        QCOMPARE(QDir(runningFolder(test)).entryList(QDir::Files),
+                 QStringList(QString("%1.lock").arg(QCoreApplication::applicationPid())));
+    }
+}
+
 // A program whose log gets another name leaves those that share the first one.
 void tst_RunningLog::instancesOfAnotherLog()
 {
@@ -461,6 +478,18 @@ void tst_RunningLog::healthFullDisk()
     QCOMPARE(health.Check(), QString("Cannot write the log: the disk is full"));
     QVERIFY(disk.makeRoom());
     QCOMPARE(health.Check(), QString());
+}
+
+// Not every file system says how large it is; one in memory may have no limit.
+void tst_RunningLog::healthWithoutALimit()
+{
+    const TestRun test;
+    TorkLog::shutdown();
+    TorkLog::initialize("/proc/", "app", QString(), true);
+    if (QStorageInfo("/proc").bytesTotal() != 0)
+        QSKIP("This file system has a size.");
+    QCOMPARE(RunningLog::FileName(), QString("/proc/app.log"));
+    QCOMPARE(LogHealth().Check(), QString());
 }
 
 // Started with "--hold FOLDER" this is another program that shares a log, until its input ends;

@@ -72,6 +72,7 @@ private slots:
     void saveFails();
     void savesNothingInPlaceOfAFile_data();
     void savesNothingInPlaceOfAFile();
+    void savedIncompletely();
     void fullDisk();
     void backup();
     void noBackup();
@@ -151,6 +152,8 @@ void tst_SettingsFile::lossTexts_data()
          "Line 1: the value of \"a\", starting at \"" + digits.left(20) + "\""});
     row("value after a comment", "<R><S><a><!--c-->v</a></S></R>", {"Line 1: the comment \"c\""});
     row("text after an element in an item", "<R><S><a>v<d/>w</a></S></R>",
+        {"Line 1: the nesting of the element \"d\"", "Line 1: the text \"w\" outside any value"});
+    row("text in an element in an item", "<R><S><a>v<d>w</d></a></S></R>",
         {"Line 1: the nesting of the element \"d\"", "Line 1: the text \"w\" outside any value"});
     row("text between items", "<R><S><a>v</a>w<b>1</b></S></R>",
         {"Line 1: the text \"w\" outside any value"});
@@ -468,7 +471,8 @@ void tst_SettingsFile::save()
     document.SetValue("config", "x", "<");
     document.sections.append(SettingsDocument::Section{"Empty", {}});
     QString error;
-    QVERIFY2(SettingsFileWriter::Save(path, document, &error), qPrintable(error));
+    QVERIFY(SettingsFileWriter::Save(path, document, &error));
+    QCOMPARE(error, QString());
     QCOMPARE(TestFiles::read(path),
              QByteArray("<LogSettings>\n<config>\n<filePrefix>app</filePrefix>\n"
                         "<x><![CDATA[<]]></x>\n</config>\n<Empty>\n</Empty>\n</LogSettings>\n"));
@@ -496,6 +500,20 @@ void tst_SettingsFile::savesNothingInPlaceOfAFile()
     QString error;
     QVERIFY(!SettingsFileWriter::Save(path, OneValue("v"), &error));
     QCOMPARE(error, QString("Not a regular file"));
+}
+
+// As from a full disk that did not tell.
+void tst_SettingsFile::savedIncompletely()
+{
+    const QTemporaryDir folder;
+    SettingsDocument twice = OneValue("v");
+    twice.sections.append(twice.sections.first());
+    for (SettingsDocument const& document : {OneValue("]]>"), twice}) {
+        QString error;
+        QVERIFY(!SettingsFileWriter::Save(folder.filePath("x.cfg"), document, &error));
+        QCOMPARE(error, QString("The file was written, but does not read back completely. "
+                                "The disk may be full."));
+    }
 }
 
 void tst_SettingsFile::fullDisk()
