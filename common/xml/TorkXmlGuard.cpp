@@ -36,8 +36,7 @@ public:
         m_reader->setErrorHandler(m_errorHandler);
         return m_errorHandler &&
                m_errorHandler->fatalError(QXmlParseException(
-                   m_lexer.reason(), exception.columnNumber(), exception.lineNumber(),
-                   exception.publicId(), exception.systemId()));
+                   m_lexer.reason(), exception.columnNumber(), exception.lineNumber()));
     }
 
 private:

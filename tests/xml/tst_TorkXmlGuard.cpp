@@ -25,11 +25,15 @@ public:
     bool fatalError(QXmlParseException const& exception) override
     {
         errors += exception.message();
+        line = exception.lineNumber();
+        column = exception.columnNumber();
         return false;
     }
 
     QString all;
     QStringList errors;
+    int line = 0;
+    int column = 0;
 };
 
 // A document with this internal subset and this text.
@@ -90,6 +94,7 @@ private slots:
     void parse();
     void namesTheLimit_data();
     void namesTheLimit();
+    void tellsThePlace();
     void tellsWithoutBeingWatched();
     void textIsUntouched();
     void readsWhatAPlainSourceReads_data();
@@ -347,6 +352,20 @@ void tst_TorkXmlGuard::namesTheLimit()
     QCOMPARE(handler.errors.size(), 1);
     QTEST(handler.errors.first(), "reason");
     QVERIFY(reader.errorHandler() == static_cast<QXmlErrorHandler*>(&handler));
+}
+
+void tst_TorkXmlGuard::tellsThePlace()
+{
+    QByteArray document = Nested(1000).replace("<a></a>", "<a>\n\n  <b></b></a>");
+    QBuffer buffer(&document);
+    TorkXmlGuard source(&buffer);
+    QXmlSimpleReader reader;
+    source.Watch(reader);
+    Text handler;
+    reader.setErrorHandler(&handler);
+    QVERIFY(!reader.parse(source));
+    QCOMPARE(handler.line, 3);
+    QCOMPARE(handler.column, 5);
 }
 
 void tst_TorkXmlGuard::tellsWithoutBeingWatched()

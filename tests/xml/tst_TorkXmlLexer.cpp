@@ -114,6 +114,7 @@ void tst_TorkXmlLexer::counts_data()
     row("one element", "<r/>", Depth, 1);
     row("elements inside each other", "<r><a><b></b><b/></a></r>", Depth, 3);
     row("elements side by side", "<r><a></a><a/><a></a><a/></r>", Depth, 2);
+    row("elements after an end tag", "<r><a></a><a><b/></a></r>", Depth, 3);
     row("end tag with a space", "<r><a></a ><a></a\n></r>", Depth, 2);
     row("empty element with a space", "<r><a /><a b='' /></r>", Depth, 2);
     row("elements in a comment", "<r><!--<a><b>--></r>", Depth, 1);
