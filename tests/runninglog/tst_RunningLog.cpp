@@ -457,7 +457,10 @@ void tst_RunningLog::healthReadOnly()
     const QFile::Permissions forAll = QFile::ReadOwner | QFile::ReadGroup | QFile::ReadOther;
     const QFile::Permissions toEnter = QFile::ExeOwner | QFile::ExeGroup | QFile::ExeOther;
     QVERIFY(QFile::setPermissions(test.logFile(), forAll));
-    QVERIFY(QFile::setPermissions(test.folder(), forAll | toEnter | QFile::WriteOwner));
+    for (char const* folder : {"", "data", "data/logs"}) {
+        QVERIFY(
+            QFile::setPermissions(test.folder() + folder, forAll | toEnter | QFile::WriteOwner));
+    }
     QProcess other;
     other.start(QCoreApplication::applicationFilePath(), {"--health", test.folder()});
     QVERIFY(other.waitForFinished());
