@@ -71,7 +71,8 @@ class Finder:
 
     def body(self, body, value):
         at = body.extent.start.offset + 1
-        if self.text[at:body.extent.end.offset].strip() not in ("}", "return false;}", "return {};}"):
+        whole = re.sub(r"\s*}$", "", self.text[at:body.extent.end.offset].strip())
+        if whole not in ("", "return false;", "return {};", "return nullptr;"):
             self.add("early return", at, at, f" return{value};", "insert")
         self.visit(body)
 

@@ -42,9 +42,9 @@ QString LogHealth::writingProblem()
     if (file.exists() && !usable)
         return QObject::tr("Cannot write the log: %1 is not writable").arg(file.filePath());
 
+    // Where there is no limit, both are 0.
     const QStorageInfo storage(file.path());
-    if (storage.isValid() && storage.isReady() && storage.bytesTotal() > 0 &&
-        storage.bytesAvailable() == 0)
+    if (storage.bytesTotal() > 0 && storage.bytesAvailable() == 0)
         return QObject::tr("Cannot write the log: the disk is full");
     return QString();
 }

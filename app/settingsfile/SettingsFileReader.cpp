@@ -53,8 +53,6 @@ void SettingsFileReader::read(QIODevice& device, SettingsDocument& document)
     TorkConfigFile store((QString()));
     SettingsFileReader reader(store, document);
     document.isParsed = store.LoadFrom(&device, reader);
-    if (!document.isParsed && document.error.isEmpty())
-        document.error = QObject::tr("not a configuration file");
 
     const QStringList names = store.sectionList();
     for (QString const& name : names) {
@@ -72,8 +70,7 @@ void SettingsFileReader::noteLoss(QString const& what)
     ++m_document.lossCount;
     if (m_document.losses.size() >= MaximumLosses)
         return;
-    const int line = m_locator ? m_locator->lineNumber() : 0;
-    m_document.losses.append(QObject::tr("Line %1: %2").arg(line).arg(what));
+    m_document.losses.append(QObject::tr("Line %1: %2").arg(m_locator->lineNumber()).arg(what));
 }
 
 bool SettingsFileReader::startElement(QString const& namespaceURI, QString const& localName,

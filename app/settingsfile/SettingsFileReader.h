@@ -52,8 +52,8 @@ private:
 
     TorkConfigFile& m_store;
     SettingsDocument& m_document;
-    QXmlLocator* m_locator = nullptr;
-    bool m_isAfterValue = false; // in the same item
+    QXmlLocator* m_locator = nullptr; // set before anything is read
+    bool m_isAfterValue = false;      // in the same item
 };
 
 } // namespace Velocor

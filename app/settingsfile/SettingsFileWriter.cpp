@@ -73,7 +73,6 @@ QStringList SettingsFileWriter::Losses(SettingsDocument const& document)
 {
     QStringList losses;
     SettingsDocument writable;
-    writable.rootName = document.rootName;
     for (SettingsDocument::Section const& section : document.sections) {
         const SettingsDocument::Section kept = WithoutLosses(section, losses);
         if (!TorkConfigText::IsPlainName(section.name))

@@ -5,13 +5,13 @@
 
 #include "common/xml/TorkXmlLexer_p.h"
 
-#include <QXmlErrorHandler>
+#include <QXmlDefaultHandler>
 #include <QXmlParseException>
 #include <QXmlSimpleReader>
 
 // Replaces the reader's error handler from the end that the guard made until the reader reports it,
 // to name the limit instead.
-class TorkXmlGuard::Watcher : public QXmlErrorHandler
+class TorkXmlGuard::Watcher : public QXmlDefaultHandler
 {
 public:
     bool passes(QChar character) const
@@ -31,19 +31,13 @@ public:
 
     void watch(QXmlSimpleReader& reader) { m_reader = &reader; }
 
-    bool warning(QXmlParseException const&) override { return true; }
-    bool error(QXmlParseException const&) override { return true; }
-
     bool fatalError(QXmlParseException const& exception) override
     {
         m_reader->setErrorHandler(m_errorHandler);
         return m_errorHandler &&
                m_errorHandler->fatalError(QXmlParseException(
-                   m_lexer.reason(), exception.columnNumber(), exception.lineNumber(),
-                   exception.publicId(), exception.systemId()));
+                   m_lexer.reason(), exception.columnNumber(), exception.lineNumber()));
     }
-
-    QString errorString() const override { return m_lexer.reason(); }
 
 private:
     TorkXmlLexer m_lexer;

@@ -82,7 +82,6 @@ void TorkXmlLexer::take(QChar character)
     case State::AttributeName:
     case State::BeforeValue:
     case State::AttributeValue:
-    case State::EmptyTag:
         takeTag(character);
         break;
     case State::EntityKeyword:
@@ -108,8 +107,6 @@ void TorkXmlLexer::take(QChar character)
         else
             m_reference += character;
         break;
-    case State::Lost:
-        break;
     default:
         takeMarkup(character);
     }
@@ -129,20 +126,12 @@ void TorkXmlLexer::takeMarkup(QChar character)
         m_state = character == QLatin1Char('N') ? State::EntityKeyword : State::Declaration;
         break;
     case State::CommentStart: // at its second dash
-        m_run = 0;
         m_state = State::Comment;
         break;
     case State::Comment:
         if (isEnd && m_run >= 2)
             m_state = outside();
         m_run = character == QLatin1Char('-') ? m_run + 1 : 0;
-        break;
-    case State::CDataStart:
-        if (++m_run == int(sizeof("CDATA["))) {
-            m_run = 0;
-            m_state = State::CData;
-            takeMarkup(character);
-        }
         break;
     case State::CData:
         if (isEnd && m_run >= 2)
@@ -152,7 +141,7 @@ void TorkXmlLexer::takeMarkup(QChar character)
     case State::Instruction:
         if (isEnd && m_run >= 1)
             m_state = outside();
-        m_run = character == QLatin1Char('?') ? 1 : 0;
+        m_run = int(character == QLatin1Char('?'));
         break;
     default:
         break;
@@ -161,7 +150,6 @@ void TorkXmlLexer::takeMarkup(QChar character)
 
 void TorkXmlLexer::afterLess(QChar character)
 {
-    m_run = 0;
     if (character == QLatin1Char('/')) {
         m_state = State::EndTag;
     } else if (character == QLatin1Char('!')) {
@@ -178,26 +166,24 @@ void TorkXmlLexer::afterLess(QChar character)
 
 void TorkXmlLexer::afterBang(QChar character)
 {
+    m_groups = 0;
     switch (character.unicode()) {
     case '-':
         m_state = State::CommentStart;
         break;
     case '[':
-        m_state = State::CDataStart;
+        m_state = State::CData; // "CDATA[" can be read as a part of it
         break;
     case 'D':
         m_state = State::DoctypeHead;
         break;
     case 'E':
-        m_groups = 0;
         m_state = State::BangE;
         break;
     case 'A':
-        m_groups = 0;
         m_state = State::AttributeList;
         break;
     default:
-        m_groups = 0;
         m_state = State::Declaration;
     }
 }
@@ -232,30 +218,24 @@ void TorkXmlLexer::takeTag(QChar character)
         if (IsQuote(character))
             openQuotes(character, State::AttributeValue, State::InTag);
         break;
-    case State::AttributeValue:
+    default: // in the value of an attribute
         if (character == m_quote) {
             m_state = State::InTag;
             addPrefix(m_name, true);
         } else if (character == QLatin1Char('&')) {
             openReference(character, m_state);
         }
-        break;
-    default: // after the slash of an empty element
-        m_state = State::Content;
     }
 }
 
 // The reader starts an element, and ends one that is empty, before it reads on.
 void TorkXmlLexer::openTag(QChar character)
 {
-    const bool isEmpty = character == QLatin1Char('/');
     addPrefix(m_tag, false);
     startElement();
     m_state = State::Content;
-    if (isEmpty) {
+    if (character == QLatin1Char('/'))
         endElement();
-        m_state = State::EmptyTag;
-    }
 }
 
 void TorkXmlLexer::addPrefix(Name const& name, bool isAttribute)
@@ -482,9 +462,9 @@ void TorkXmlLexer::replace(Kind kind)
         refuse(QStringLiteral("References make more than %1 characters of entities be read again.")
                    .arg(m_limits.replacement));
 
-    // From here on the reader takes them for entities that name themselves, and stops.
+    // The reader takes them for entities that name themselves, and stops here.
     if (m_texts.size() > std::max(m_generalCount, m_parameterCount) + 1)
-        lose();
+        m_texts.clear();
 }
 
 // Counts what is read from entities, but for the references in it that are put in themselves.
@@ -500,11 +480,5 @@ void TorkXmlLexer::refuse(QString const& reason)
 {
     if (m_reason.isEmpty())
         m_reason = reason;
-    lose();
-}
-
-void TorkXmlLexer::lose()
-{
     m_texts.clear();
-    m_state = State::Lost;
 }

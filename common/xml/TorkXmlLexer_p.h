@@ -60,7 +60,6 @@ private:
         BangE,   // "<!E" was read
         CommentStart,
         Comment,
-        CDataStart,
         CData,
         Instruction,
         TagName,
@@ -68,7 +67,6 @@ private:
         AttributeName,
         BeforeValue,
         AttributeValue,
-        EmptyTag,
         EndTag,
         Reference,
         DoctypeHead,
@@ -83,8 +81,7 @@ private:
         EntityName,
         BeforeEntityValue,
         EntityValue,
-        ExternalEntity,
-        Lost // where the reader has stopped
+        ExternalEntity
     };
 
     enum class Kind { General, Parameter, External };
@@ -134,7 +131,6 @@ private:
     void replace(Kind kind);
     void standsFor(int characters);
     void refuse(QString const& reason);
-    void lose();
 
     Limits m_limits;
     QString m_reason;

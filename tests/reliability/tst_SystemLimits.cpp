@@ -10,6 +10,7 @@
 #include "reliability/Figures.h"
 #include "support/ChildProcess.h"
 #include "support/ProcessLimits.h"
+#include "support/SmallDisk.h"
 
 #include <QtTest>
 
@@ -38,39 +39,6 @@ void write(TorkLog& log, QByteArray const& line)
 {
     log.write(QString::fromLatin1(line));
 }
-
-// A small file system in a folder, mounted while it lives.
-class SmallDisk
-{
-public:
-    explicit SmallDisk(QString const& path)
-        : isMounted(QProcess::execute("mount", {"-t", "tmpfs", "-o", "size=64k", "tmpfs", path}) ==
-                    0),
-          m_path(path)
-    {}
-    ~SmallDisk()
-    {
-        if (isMounted)
-            QProcess::execute("umount", {m_path});
-    }
-    Q_DISABLE_COPY(SmallDisk)
-
-    bool fill() const
-    {
-        QFile filler(m_path + "filler");
-        if (!filler.open(QIODevice::WriteOnly | QIODevice::Unbuffered))
-            return false;
-        while (filler.write(QByteArray(4096, 'f')) == 4096) {}
-        return true;
-    }
-
-    bool makeRoom() const { return QFile::remove(m_path + "filler"); }
-
-    const bool isMounted;
-
-private:
-    QString m_path;
-};
 
 } // namespace
 

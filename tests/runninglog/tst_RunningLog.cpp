@@ -7,10 +7,13 @@
 #include "app/runninglog/LogHealth.h"
 #include "app/runninglog/LogPreferences.h"
 #include "app/runninglog/RunningLog.h"
+#include "support/ProcessLimits.h"
+#include "support/SmallDisk.h"
 #include "support/TestRun.h"
 
 #include <QProcess>
 #include <QRegularExpression>
+#include <QStorageInfo>
 #include <QTextStream>
 #include <QtTest>
 
@@ -26,18 +29,31 @@ class tst_RunningLog : public QObject
 
 private slots:
     void preferences();
-    void preferencesManyFiles();
+    void preferencesInEffect();
+    void numberOfFiles_data();
+    void numberOfFiles();
     void preferencesCannotBeSaved();
+    void preferencesThatDoNotReadBack();
+    void pipeInPlaceOfPreferences();
+    void withoutALog();
     void preferencesInAnotherFile();
     void fileNameIsTheOpenOne();
     void isKept_data();
     void isKept();
+    void filePrefix_data();
+    void filePrefix();
     void instances();
+    void instanceStays();
+    void instancesOfAnotherLog();
+    void instancesAreLocksOnly();
     void instancesLeaveNothing();
     void instanceLeftBehind();
     void locksOfAnotherComputer();
     void health();
     void healthDirectoryInTheWay();
+    void healthReadOnly();
+    void healthFullDisk();
+    void healthWithoutALimit();
 };
 
 // Where the window looks for other programs.
@@ -90,16 +106,74 @@ void tst_RunningLog::preferences()
     QCOMPARE(RunningLog::ElapsedPrefix(), QString("t="));
 }
 
-// The log's setter takes a number above 100 down to 100 first.
-void tst_RunningLog::preferencesManyFiles()
+// Those of the running log, whatever the settings file says.
+void tst_RunningLog::preferencesInEffect()
 {
     const TestRun test;
-    TorkLog::logger()->setMaxLogFiles(500);
+    TorkLog* log = TorkLog::logger();
     LogPreferences preferences = LogPreferences::Read();
-    QCOMPARE(preferences.maxFiles, 500);
-    preferences.maxFiles = 30;
+    QCOMPARE(preferences.enabled, true);
+    QCOMPARE(preferences.elapsedTime, false);
+    QCOMPARE(preferences.echo, false);
+
+    QVERIFY(log->savePreferences());
+    log->setMaxLogFileSize(0); // takes 2048
+    log->setEnable(false);
+    log->setLogElapsedTime(true);
+    log->setLogPipeToConsole(true);
+    preferences = LogPreferences::Read();
+    QCOMPARE(preferences.enabled, false);
+    QCOMPARE(preferences.elapsedTime, true);
+    QCOMPARE(preferences.echo, true);
     QCOMPARE(preferences.Apply(), QString());
-    QCOMPARE(TorkLog::logger()->maxLogFiles(), 30U);
+    log->setEnable(true);
+    log->setLogElapsedTime(false);
+    log->setLogPipeToConsole(false);
+    QVERIFY(log->loadPreferences());
+    QCOMPARE(log->maxLogFileSize(), 2048U);
+    QCOMPARE(log->enabled(), false);
+    QCOMPARE(log->logElapsedTime(), true);
+    QCOMPARE(log->logPipeToConsole(), true);
+
+    preferences.enabled = true;
+    preferences.elapsedTime = false;
+    preferences.echo = false;
+    QCOMPARE(preferences.Apply(), QString());
+    QCOMPARE(log->enabled(), true);
+    QCOMPARE(log->logElapsedTime(), false);
+    QCOMPARE(log->logPipeToConsole(), false);
+}
+
+void tst_RunningLog::numberOfFiles_data()
+{
+    QTest::addColumn<uint>("inEffect");
+    QTest::addColumn<int>("shown");
+    QTest::addColumn<int>("chosen");
+    QTest::addColumn<uint>("expected");
+    QTest::newRow("more than the setter takes at once") << 500U << 500 << 30 << 30U;
+    QTest::newRow("one more than the setter takes") << 101U << 101 << 99 << 99U;
+    QTest::newRow("more than are shown") << 4294967295U << 1000000 << 2 << 2U;
+    QTest::newRow("as many as are shown") << 1000000U << 1000000 << 2 << 2U;
+    QTest::newRow("one less than are shown") << 999999U << 999999 << 2 << 2U;
+    QTest::newRow("one") << 10U << 10 << 1 << 1U;
+    QTest::newRow("none is one") << 10U << 10 << 0 << 1U;
+    QTest::newRow("less than none is one") << 10U << 10 << -1 << 1U;
+}
+
+// The log's setter takes a number above 100 down to 100 first.
+void tst_RunningLog::numberOfFiles()
+{
+    QFETCH(uint, inEffect);
+    QFETCH(int, chosen);
+    const TestRun test;
+    TorkLog::logger()->setMaxLogFiles(inEffect);
+    LogPreferences preferences = LogPreferences::Read();
+    QTEST(preferences.maxFiles, "shown");
+    preferences.maxFiles = chosen;
+    QCOMPARE(preferences.Apply(), QString());
+    QTEST(TorkLog::logger()->maxLogFiles(), "expected");
+    QVERIFY(TorkLog::logger()->loadPreferences());
+    QTEST(TorkLog::logger()->maxLogFiles(), "expected");
 }
 
 void tst_RunningLog::preferencesCannotBeSaved()
@@ -121,6 +195,45 @@ void tst_RunningLog::preferencesCannotBeSaved()
     QCOMPARE(log->logElapsedTime(), false);
     QCOMPARE(log->logPipeToConsole(), false);
     QCOMPARE(log->maxLogFiles(), 10U);
+}
+
+// The dialog refuses such a text. Were it saved, the log would find its settings damaged.
+void tst_RunningLog::preferencesThatDoNotReadBack()
+{
+    const TestRun test;
+    LogPreferences preferences = LogPreferences::Read();
+    preferences.maxFiles = 7;
+    for (char const* text : {"]]>", ""}) {
+        preferences.dateFormat = text;
+        QCOMPARE(preferences.Apply(), "The settings file " + LogPreferences::FileName() +
+                                          " is incomplete after saving.");
+        QCOMPARE(TorkLog::logger()->maxLogFiles(), 10U);
+    }
+}
+
+// Opening it would wait for somebody who writes to it.
+void tst_RunningLog::pipeInPlaceOfPreferences()
+{
+    const TestRun test;
+    const QString file = LogPreferences::FileName();
+    QFile::remove(file);
+    QVERIFY(QDir().mkpath(QFileInfo(file).path()));
+    QCOMPARE(mkfifo(QFile::encodeName(file).constData(), 0600), 0);
+    QCOMPARE(LogPreferences::Read().filePrefix, QString("app"));
+}
+
+void tst_RunningLog::withoutALog()
+{
+    const TestRun test;
+    TorkLog::shutdown();
+    QCOMPARE(LogPreferences::FileName(), QString());
+    const LogPreferences preferences = LogPreferences::Read();
+    QCOMPARE(preferences.enabled, true);
+    QCOMPARE(preferences.maxFiles, 10);
+    QCOMPARE(preferences.filePrefix, QString());
+    QCOMPARE(preferences.dateFormat, QString("yyyy-MM-dd hh:mm:ss.z"));
+    QCOMPARE(preferences.elapsedPrefix, QString("dT:"));
+    QCOMPARE(preferences.Apply(), QString("There is no log."));
 }
 
 void tst_RunningLog::preferencesInAnotherFile()
@@ -164,6 +277,10 @@ void tst_RunningLog::isKept_data()
     QTest::newRow("percent") << "%" << true;
     QTest::newRow("umlaut") << QString::fromUtf8("\xC3\xA4") << false;
     QTest::newRow("line feed") << "a\nb" << false;
+    QTest::newRow("last control character") << QString(QChar(0x1f)) << false;
+    QTest::newRow("blank") << " " << true;
+    QTest::newRow("last letter of ASCII") << "~" << true;
+    QTest::newRow("delete") << QString(QChar(0x7f)) << false;
 }
 
 void tst_RunningLog::isKept()
@@ -172,23 +289,94 @@ void tst_RunningLog::isKept()
     QTEST(LogPreferences::IsStorable(text), "expected");
 }
 
+void tst_RunningLog::filePrefix_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<bool>("expected");
+    QTest::newRow("plain") << "app" << true;
+    QTest::newRow("hidden") << ".app" << true;
+    QTest::newRow("three dots") << "..." << true;
+    QTest::newRow("empty") << "" << false;
+    QTest::newRow("this folder") << "." << false;
+    QTest::newRow("the folder above") << ".." << false;
+    QTest::newRow("in a folder") << "a/b" << false;
+    QTest::newRow("line feed") << "a\nb" << false;
+}
+
+void tst_RunningLog::filePrefix()
+{
+    QFETCH(QString, text);
+    QTEST(LogPreferences::IsValidFilePrefix(text), "expected");
+}
+
 void tst_RunningLog::instances()
 {
     const TestRun test;
     const InstanceList own(runningFolder(test));
     QCOMPARE(own.Others(), QList<qint64>());
 
-    QProcess other;
-    other.start(QCoreApplication::applicationFilePath(), {"--hold", runningFolder(test)});
-    QVERIFY(other.waitForReadyRead(20000));
-    QCOMPARE(own.Others(), QList<qint64>({other.processId()}));
+    QProcess first;
+    first.start(QCoreApplication::applicationFilePath(), {"--hold", runningFolder(test)});
+    QVERIFY(first.waitForReadyRead(20000));
+    QCOMPARE(own.Others(), QList<qint64>({first.processId()}));
     LogHealth health;
-    const QString told = health.Check();
-    QVERIFY2(told.contains(QString::number(other.processId())), qPrintable(told));
+    QCOMPARE(health.Check(), QString("Another running program writes to the same log (process %1)")
+                                 .arg(first.processId()));
 
-    other.closeWriteChannel();
-    QVERIFY(other.waitForFinished());
+    QProcess second;
+    second.start(QCoreApplication::applicationFilePath(), {"--hold", runningFolder(test)});
+    QVERIFY(second.waitForReadyRead(20000));
+    QStringList both = {QString::number(first.processId()), QString::number(second.processId())};
+    both.sort();
+    QCOMPARE(health.Check(),
+             "Other running programs write to the same log (processes " + both.join(", ") + ")");
+
+    for (QProcess* other : {&first, &second}) {
+        other->closeWriteChannel();
+        QVERIFY(other->waitForFinished());
+    }
     QCOMPARE(own.Others(), QList<qint64>());
+    QCOMPARE(health.Check(), QString());
+}
+
+// However often it looks for others.
+void tst_RunningLog::instanceStays()
+{
+    const TestRun test;
+    LogHealth health;
+    for (int i = 0; i < 3; ++i) {
+        QCOMPARE(health.Check(), QString());
+        QCOMPARE(QDir(runningFolder(test)).entryList(QDir::Files),
+                 QStringList(QString("%1.lock").arg(QCoreApplication::applicationPid())));
+    }
+}
+
+// A program whose log gets another name leaves those that share the first one.
+void tst_RunningLog::instancesOfAnotherLog()
+{
+    const TestRun test;
+    LogHealth health;
+    QCOMPARE(health.Check(), QString());
+    QVERIFY(QFile::exists(runningFolder(test)));
+    TorkLog::shutdown();
+    TorkLog::initialize(test.folder() + "data/logs/", "other", QString(), true);
+    QCOMPARE(health.Check(), QString());
+    QVERIFY(!QFile::exists(runningFolder(test)));
+    QVERIFY(QFile::exists(test.folder() + "data/running-other.log"));
+}
+
+void tst_RunningLog::instancesAreLocksOnly()
+{
+    const TestRun test;
+    const InstanceList own(runningFolder(test));
+    QVERIFY(TestFiles::write(runningFolder(test) + "/1.txt", "1\nvelocor\nelsewhere\n"));
+    QVERIFY(QDir().mkpath(runningFolder(test) + "/2.lock"));
+    const QString pipe = runningFolder(test) + "/3.lock"; // opening it would wait
+    QCOMPARE(mkfifo(QFile::encodeName(pipe).constData(), 0600), 0);
+    QVERIFY(QFile::link("/dev/null", runningFolder(test) + "/4.lock"));
+    const QStringList before = QDir(runningFolder(test)).entryList(QDir::AllEntries | QDir::System);
+    QCOMPARE(own.Others(), QList<qint64>());
+    QCOMPARE(QDir(runningFolder(test)).entryList(QDir::AllEntries | QDir::System), before);
 }
 
 void tst_RunningLog::instancesLeaveNothing()
@@ -251,22 +439,80 @@ void tst_RunningLog::healthDirectoryInTheWay()
 {
     const TestRun test;
     QVERIFY(QDir().mkpath(test.logFile()));
-    TorkLog::logger()->trace("lost");
     LogHealth health;
-    QVERIFY2(health.Check().startsWith("Cannot write the log: "), qPrintable(health.Check()));
+    QCOMPARE(health.Check(), "Cannot write the log: " + test.logFile() + " is not writable");
+    TorkLog::logger()->trace("lost");
+    const QString error = TorkLog::logger()->errorString();
+    QVERIFY(!error.isEmpty());
+    QCOMPARE(health.Check(), "Cannot write the log: " + error);
     QVERIFY(QDir(test.logFile()).removeRecursively());
     TorkLog::logger()->trace("kept");
+    QVERIFY(!TorkLog::logger()->errorString().isEmpty());
     QCOMPARE(health.Check(), QString());
 }
 
-// Started with "--hold FILE" this is another program that shares a log, until its input ends.
+void tst_RunningLog::healthReadOnly()
+{
+    const TestRun test("old\n");
+    const QFile::Permissions forAll = QFile::ReadOwner | QFile::ReadGroup | QFile::ReadOther;
+    const QFile::Permissions toEnter = QFile::ExeOwner | QFile::ExeGroup | QFile::ExeOther;
+    QVERIFY(QFile::setPermissions(test.logFile(), forAll));
+    for (char const* folder : {"", "data", "data/logs"}) {
+        QVERIFY(
+            QFile::setPermissions(test.folder() + folder, forAll | toEnter | QFile::WriteOwner));
+    }
+    QProcess other;
+    other.start(QCoreApplication::applicationFilePath(), {"--health", test.folder()});
+    QVERIFY(other.waitForFinished());
+    QCOMPARE(QString(other.readAll()),
+             "Cannot write the log: " + test.logFile() + " is not writable");
+}
+
+void tst_RunningLog::healthFullDisk()
+{
+    const TestRun test;
+    QVERIFY(QDir().mkpath(test.folder() + "data/logs"));
+    const SmallDisk disk(test.folder() + "data/logs/");
+    if (!disk.isMounted)
+        QSKIP("No file system can be mounted here.");
+    LogHealth health;
+    QCOMPARE(health.Check(), QString());
+    QVERIFY(disk.fill());
+    QCOMPARE(health.Check(), QString("Cannot write the log: the disk is full"));
+    QVERIFY(disk.makeRoom());
+    QCOMPARE(health.Check(), QString());
+}
+
+// Not every file system says how large it is; one in memory may have no limit.
+void tst_RunningLog::healthWithoutALimit()
+{
+    const TestRun test;
+    TorkLog::shutdown();
+    TorkLog::initialize("/proc/", "app", QString(), true);
+    if (QStorageInfo("/proc").bytesTotal() != 0)
+        QSKIP("This file system has a size.");
+    QCOMPARE(RunningLog::FileName(), QString("/proc/app.log"));
+    QCOMPARE(LogHealth().Check(), QString());
+}
+
+// Started with "--hold FOLDER" this is another program that shares a log, until its input ends;
+// with
+// "--health FOLDER" one of an ordinary user, who shows the health of the log there.
 int main(int argc, char** argv)
 {
     QCoreApplication application(argc, argv);
+    const QString folder = application.arguments().value(2);
     if (application.arguments().value(1) == "--hold") {
-        const InstanceList instances(application.arguments().value(2));
+        const InstanceList instances(folder);
         QTextStream(stdout) << "held\n" << flush;
         QTextStream(stdin).readAll();
+        return 0;
+    }
+    if (application.arguments().value(1) == "--health") {
+        application.setProperty("DataPath", folder + "data/");
+        TorkLog::initialize(folder + "data/logs/", "app", QString(), true);
+        if (ProcessLimits::becomeOrdinaryUser())
+            QTextStream(stdout) << LogHealth().Check();
         return 0;
     }
     tst_RunningLog test;

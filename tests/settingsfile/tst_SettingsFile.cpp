@@ -47,6 +47,8 @@ class tst_SettingsFile : public QObject
 private slots:
     void read_data();
     void read();
+    void lossTexts_data();
+    void lossTexts();
     void readsWhatTheStoreReads_data();
     void readsWhatTheStoreReads();
     void errors_data();
@@ -68,8 +70,12 @@ private slots:
     void valueByName();
     void save();
     void saveFails();
+    void savesNothingInPlaceOfAFile_data();
+    void savesNothingInPlaceOfAFile();
+    void savedIncompletely();
     void fullDisk();
     void backup();
+    void noBackup();
 };
 
 void tst_SettingsFile::read_data()
@@ -125,6 +131,72 @@ void tst_SettingsFile::read()
     QTEST(document.lossCount, "lossCount");
 }
 
+void tst_SettingsFile::lossTexts_data()
+{
+    QTest::addColumn<QByteArray>("document");
+    QTest::addColumn<QStringList>("losses");
+
+    const auto row = [](char const* name, QByteArray const& document, QStringList const& losses) {
+        QTest::newRow(name) << document << losses;
+    };
+    const QByteArray digits = "0123456789012345678901234567890123456789";
+    row("document type", "<!DOCTYPE T><R><S><a>1</a></S></R>", {"Line 1: the document type \"T\""});
+    row("long comment on two lines", "<R>\n<!--  0\n1 " + digits + "--></R>",
+        {"Line 3: the comment \"0 1 " + digits.left(36) + "\""});
+    row("instruction after the root", "<R/>\n\n<?do it?>",
+        {"Line 3: the processing instruction \"do\""});
+    row("long text outside any value", "<R>" + digits + "</R>",
+        {"Line 1: the text \"" + digits.left(20) + "\" outside any value"});
+    row("rest of a value after a comment", "<R><S><a>v<!--c-->" + digits + "</a></S></R>",
+        {"Line 1: the comment \"c\"",
+         "Line 1: the value of \"a\", starting at \"" + digits.left(20) + "\""});
+    row("value after a comment", "<R><S><a><!--c-->v</a></S></R>", {"Line 1: the comment \"c\""});
+    row("text after an element in an item", "<R><S><a>v<d/>w</a></S></R>",
+        {"Line 1: the nesting of the element \"d\"", "Line 1: the text \"w\" outside any value"});
+    row("text in an element in an item", "<R><S><a>v<d>w</d></a></S></R>",
+        {"Line 1: the nesting of the element \"d\"", "Line 1: the text \"w\" outside any value"});
+    row("text between items", "<R><S><a>v</a>w<b>1</b></S></R>",
+        {"Line 1: the text \"w\" outside any value"});
+    row("text between sections", "<R><S><a>v</a></S>w<T><b>1</b></T></R>",
+        {"Line 1: the text \"w\" outside any value"});
+    row("deeply nested value", "<R><S><a><d><e>v</e></d></a></S></R>",
+        {"Line 1: the nesting of the element \"d\"", "Line 1: the nesting of the element \"e\""});
+    row("value outside any section", "<R>\n<R>\n<k>v</k></R></R>",
+        {"Line 2: the element \"R\", which has the same name as the root element",
+         "Line 3: \"k\", which is outside any section"});
+    row("section named like the root after another", "<R><S><a>1</a></S><R><k>v</k></R></R>",
+        {"Line 1: the element \"R\", which has the same name as the root element"});
+    row("item named like the root", "<R><S><R>v</R></S></R>",
+        {"Line 1: the element \"R\", which has the same name as the root element",
+         "Line 1: the text \"v\" outside any value"});
+    row("empty section", "<R><S/></R>", {});
+    row("empty sections of one name", "<R><S/><S/></R>",
+        {"Line 1: a second section \"S\", merged with the first"});
+    row("empty item with a comment", "<R><S><a><!--c--></a></S></R>",
+        {"Line 1: the comment \"c\"", "Line 1: the empty item \"a\""});
+    row("empty element in an item", "<R><S><a><b/></a></S></R>",
+        {"Line 1: the nesting of the element \"b\""});
+    row("attributes", "<R x='1'><S y='2'><a n:z='3' w='4'>v</a></S></R>",
+        {"Line 1: the attribute \"x\" of \"R\"", "Line 1: the attribute \"y\" of \"S\"",
+         "Line 1: the attribute \"n:z\" of \"a\"", "Line 1: the attribute \"w\" of \"a\""});
+    row("key thrice", "<R><S><a>1</a><a>2</a><a>3</a></S></R>",
+        {"Line 1: the first value of \"a\", replaced by a second one",
+         "Line 1: the first value of \"a\", replaced by a second one"});
+    row("declaration and comment", "<?xml version='1.0'?>\n<!--c--><R/>",
+        {"Line 1: the XML declaration", "Line 2: the comment \"c\""});
+}
+
+// What saving the file would lose, for the user: each loss with its line.
+void tst_SettingsFile::lossTexts()
+{
+    QFETCH(QByteArray, document);
+    const SettingsDocument read = SettingsFileReader::ReadBytes(document);
+    QVERIFY2(read.isParsed, qPrintable(read.error));
+    QFETCH(QStringList, losses);
+    QCOMPARE(read.losses.join('\n'), losses.join('\n'));
+    QCOMPARE(read.lossCount, read.losses.size());
+}
+
 void tst_SettingsFile::readsWhatTheStoreReads_data()
 {
     QTest::addColumn<QByteArray>("inside");
@@ -166,12 +238,17 @@ void tst_SettingsFile::errors_data()
 {
     QTest::addColumn<QByteArray>("text");
     QTest::addColumn<int>("line");
-    QTest::newRow("empty") << QByteArray("") << 1;
-    QTest::newRow("no XML") << QByteArray("a = 1\n") << 1;
-    QTest::newRow("cut off") << QByteArray("<R>\n<S>\n<a>1") << 3;
-    QTest::newRow("wrong end") << QByteArray("<R>\n<S>\n<a>1</b>\n</S>\n</R>\n") << 3;
-    QTest::newRow("two roots") << QByteArray("<R/>\n<R/>") << 2;
-    QTest::newRow("binary") << QByteArray("\x7f\x45\x4c\x46\0\1", 6) << 1;
+    QTest::addColumn<int>("column");
+    QTest::addColumn<QString>("error");
+    QTest::newRow("empty") << QByteArray("") << 1 << 1 << "unexpected end of file";
+    QTest::newRow("no XML") << QByteArray("a = 1\n") << 1 << 1
+                            << "error occurred while parsing element";
+    QTest::newRow("cut off") << QByteArray("<R>\n<S>\n<a>1") << 3 << 5 << "unexpected end of file";
+    QTest::newRow("wrong end") << QByteArray("<R>\n<S>\n<a>1</b>\n</S>\n</R>\n") << 3 << 8
+                               << "tag mismatch";
+    QTest::newRow("two roots") << QByteArray("<R/>\n<R/>") << 2 << 2 << "unexpected character";
+    QTest::newRow("binary") << QByteArray("\x7f\x45\x4c\x46\0\1", 6) << 1 << 1
+                            << "error occurred while parsing element";
 }
 
 void tst_SettingsFile::errors()
@@ -180,9 +257,9 @@ void tst_SettingsFile::errors()
     const SettingsDocument document = SettingsFileReader::ReadBytes(text);
     QVERIFY(document.isReadable);
     QVERIFY(!document.isParsed);
-    QVERIFY(!document.error.isEmpty());
+    QTEST(document.error, "error");
     QTEST(document.line, "line");
-    QVERIFY(document.column > 0);
+    QTEST(document.column, "column");
 }
 
 void tst_SettingsFile::unreadable()
@@ -216,7 +293,8 @@ void tst_SettingsFile::deepDocumentType()
     text += QByteArray(100000, '(') + "a" + QByteArray(100000, ')') + ">]><S/>";
     const SettingsDocument document = SettingsFileReader::ReadBytes(text);
     QVERIFY(!document.isParsed);
-    QVERIFY(!document.error.isEmpty());
+    QCOMPARE(document.error,
+             QString("More than 1000 groups are inside each other in a document type."));
 }
 
 void tst_SettingsFile::losses_data()
@@ -393,7 +471,8 @@ void tst_SettingsFile::save()
     document.SetValue("config", "x", "<");
     document.sections.append(SettingsDocument::Section{"Empty", {}});
     QString error;
-    QVERIFY2(SettingsFileWriter::Save(path, document, &error), qPrintable(error));
+    QVERIFY(SettingsFileWriter::Save(path, document, &error));
+    QCOMPARE(error, QString());
     QCOMPARE(TestFiles::read(path),
              QByteArray("<LogSettings>\n<config>\n<filePrefix>app</filePrefix>\n"
                         "<x><![CDATA[<]]></x>\n</config>\n<Empty>\n</Empty>\n</LogSettings>\n"));
@@ -406,6 +485,35 @@ void tst_SettingsFile::saveFails()
     QVERIFY(!SettingsFileWriter::Save(folder.filePath("no/x.cfg"), OneValue("v"), &error));
     QCOMPARE(error,
              "Unable to save " + folder.filePath("no/x.cfg") + ": No such file or directory");
+}
+
+void tst_SettingsFile::savesNothingInPlaceOfAFile_data()
+{
+    QTest::addColumn<QString>("path");
+    QTest::newRow("device") << "/dev/null";
+    QTest::newRow("folder") << QDir::tempPath();
+}
+
+void tst_SettingsFile::savesNothingInPlaceOfAFile()
+{
+    QFETCH(QString, path);
+    QString error;
+    QVERIFY(!SettingsFileWriter::Save(path, OneValue("v"), &error));
+    QCOMPARE(error, QString("Not a regular file"));
+}
+
+// As from a full disk that did not tell.
+void tst_SettingsFile::savedIncompletely()
+{
+    const QTemporaryDir folder;
+    SettingsDocument twice = OneValue("v");
+    twice.sections.append(twice.sections.first());
+    for (SettingsDocument const& document : {OneValue("]]>"), twice}) {
+        QString error;
+        QVERIFY(!SettingsFileWriter::Save(folder.filePath("x.cfg"), document, &error));
+        QCOMPARE(error, QString("The file was written, but does not read back completely. "
+                                "The disk may be full."));
+    }
 }
 
 void tst_SettingsFile::fullDisk()
@@ -429,16 +537,38 @@ void tst_SettingsFile::backup()
     const QString path = folder.filePath("x.cfg");
     QString error;
     QVERIFY(SettingsFileWriter::KeepBackup(path, &error)); // nothing to lose
-    QVERIFY(TestFiles::write(path, "one"));
-    QVERIFY(SettingsFileWriter::KeepBackup(path, &error));
-    QCOMPARE(TestFiles::read(path + ".bak"), QByteArray("one"));
-    QVERIFY(TestFiles::write(path, "two"));
-    QVERIFY(SettingsFileWriter::KeepBackup(path, &error));
-    QCOMPARE(TestFiles::read(path + ".bak"), QByteArray("two"));
-    QVERIFY(QFile::remove(path + ".bak"));
-    QVERIFY(QDir().mkpath(path + ".bak/in the way"));
+    QCOMPARE(TestFiles::listing(folder.path()), QStringList());
+    for (char const* content : {"one", "two"}) {
+        QVERIFY(TestFiles::write(path, content));
+        QVERIFY(SettingsFileWriter::KeepBackup(path, &error));
+        QCOMPARE(TestFiles::read(path + ".bak"), QByteArray(content));
+        QCOMPARE(TestFiles::read(path), QByteArray(content));
+    }
+    QCOMPARE(error, QString());
+}
+
+void tst_SettingsFile::noBackup()
+{
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("x.cfg");
+    const QString copy = path + ".bak";
+    QString error;
+    QVERIFY(QDir().mkpath(path));
     QVERIFY(!SettingsFileWriter::KeepBackup(path, &error));
-    QVERIFY(!error.isEmpty());
+    QCOMPARE(error, QString("Not a regular file"));
+    QVERIFY(QDir().rmdir(path));
+
+    QVERIFY(TestFiles::write(path, "one"));
+    QVERIFY(QDir().mkpath(copy + "/in the way"));
+    QVERIFY(!SettingsFileWriter::KeepBackup(path, &error));
+    QCOMPARE(error, "Cannot replace the file " + copy + ".");
+    QVERIFY(QDir(copy).removeRecursively());
+
+    // A link to nowhere is no file that could be removed, and nothing is copied over it.
+    QVERIFY(QFile::link(folder.filePath("nowhere/y"), copy));
+    QVERIFY(!SettingsFileWriter::KeepBackup(path, &error));
+    QCOMPARE(error, "Cannot create " + copy + " for output");
+    QCOMPARE(TestFiles::read(path), QByteArray("one"));
 }
 
 QTEST_GUILESS_MAIN(tst_SettingsFile)

@@ -95,6 +95,7 @@ private slots:
     void destroyedWhileOpen();
     void destroyedThroughItsBase();
     void destroyedAfterClose();
+    void destroyedWithTextAfterClose();
     void destroyedOnAnotherDevice();
 
     void diskFull_data();
@@ -492,6 +493,22 @@ void tst_TorkXmlFile::destroyedAfterClose()
     writer.reset();
 
     QCOMPARE(TestFiles::read(Path("out.xml")), QByteArray("<a>1</a>\n"));
+}
+
+// What was written after closing meets a file that is closed, but not one that is gone.
+void tst_TorkXmlFile::destroyedWithTextAfterClose()
+{
+    const MessageCapture messages;
+    {
+        TorkXmlFile writer(Path("out.xml"));
+        QVERIFY2(writer.open(QIODevice::WriteOnly), qPrintable(writer.errorString()));
+        writer.close();
+        writer.Write("late");
+        QCOMPARE(messages.texts(), QStringList());
+    }
+    QCOMPARE(messages.texts(), QStringList("warning: QIODevice::write (QFile, \"" +
+                                           Path("out.xml") + "\"): device not open"));
+    QCOMPARE(TestFiles::read(Path("out.xml")), QByteArray());
 }
 
 void tst_TorkXmlFile::destroyedOnAnotherDevice()

@@ -25,11 +25,15 @@ public:
     bool fatalError(QXmlParseException const& exception) override
     {
         errors += exception.message();
+        line = exception.lineNumber();
+        column = exception.columnNumber();
         return false;
     }
 
     QString all;
     QStringList errors;
+    int line = 0;
+    int column = 0;
 };
 
 // A document with this internal subset and this text.
@@ -90,6 +94,7 @@ private slots:
     void parse();
     void namesTheLimit_data();
     void namesTheLimit();
+    void tellsThePlace();
     void tellsWithoutBeingWatched();
     void textIsUntouched();
     void readsWhatAPlainSourceReads_data();
@@ -124,21 +129,26 @@ void tst_TorkXmlGuard::parse_data()
         << Document("<!ENTITY % p '" + Groups(TorkXmlMaximumDepth) + "'>%p;", "") << true;
     QTest::newRow("one group more from a parameter entity")
         << Document("<!ENTITY % p '" + Groups(TorkXmlMaximumDepth + 1) + "'>%p;", "") << false;
-    QTest::newRow("one group more from brackets as references")
-        << Document("<!ENTITY % p '<!ELEMENT r " +
-                        QByteArray("&#40;").repeated(TorkXmlMaximumDepth + 1) + "'>%p;",
-                    "")
-        << false;
-    QTest::newRow("one group more from brackets as hexadecimal references")
-        << Document("<!ENTITY % p '<!ELEMENT r " +
-                        QByteArray("&#x28;").repeated(TorkXmlMaximumDepth + 1) + "'>%p;",
-                    "")
-        << false;
-    QTest::newRow("groups begun in a parameter entity and continued in another")
-        << Document("<!ENTITY % p '<!ELEMENT r " + QByteArray("(").repeated(600) +
-                        "'><!ENTITY % q '" + QByteArray("(").repeated(600) + "'>%p;%q;",
-                    "")
-        << false;
+    for (QByteArray const& bracket : {QByteArray("&#40;"), QByteArray("&#x28;")}) {
+        const auto groups = [&](int levels) {
+            return Document("<!ENTITY % p '<!ELEMENT r " + bracket.repeated(levels) + "a" +
+                                QByteArray(")").repeated(levels) + ">'>%p;",
+                            "");
+        };
+        QTest::addRow("as many groups as allowed from references %s", bracket.constData())
+            << groups(TorkXmlMaximumDepth) << true;
+        QTest::addRow("one group more from references %s", bracket.constData())
+            << groups(TorkXmlMaximumDepth + 1) << false;
+    }
+    const auto inTwoParts = [](int first, int second) {
+        return Document("<!ENTITY % p '<!ELEMENT r " + QByteArray("(").repeated(first) + "'>%p;" +
+                            QByteArray("(").repeated(second) + "a" +
+                            QByteArray(")").repeated(first + second) + ">",
+                        "");
+    };
+    QTest::newRow("as many groups as allowed, begun in a parameter entity")
+        << inTwoParts(500, 500) << true;
+    QTest::newRow("one group more, begun in a parameter entity") << inTwoParts(500, 501) << false;
     QTest::newRow("entity with brackets") << Document(Entity("e", "(a"), "&e;") << true;
 
     QTest::newRow("groups enough to exhaust a stack after the address of the document type")
@@ -318,6 +328,14 @@ void tst_TorkXmlGuard::namesTheLimit_data()
     QTest::newRow("malformed within the limits") << QByteArray("<r>") << "unexpected end of file";
     QTest::newRow("an entity that names itself")
         << Document(Entity("e", "<a>&e;</a>"), "&e;") << "recursive entities";
+    // The reader takes it for one once more texts are open than entities are declared, and one.
+    QTest::newRow("an entity that names itself, with as many elements as allowed")
+        << Document(Entities(997) + Entity("f", "<a>&f;</a>"), "&f;") << "recursive entities";
+    QTest::newRow("an entity that names itself, with one element more")
+        << Document(Entities(998) + Entity("f", "<a>&f;</a>"), "&f;")
+        << "More than 1000 elements are inside each other.";
+    QTest::newRow("a parameter entity that names itself")
+        << Document("<!ENTITY % p '<!--c-->&#37;p;'>%p;", "") << "recursive entities";
 }
 
 // The error handler is called once, and is the reader's again afterwards.
@@ -334,6 +352,20 @@ void tst_TorkXmlGuard::namesTheLimit()
     QCOMPARE(handler.errors.size(), 1);
     QTEST(handler.errors.first(), "reason");
     QVERIFY(reader.errorHandler() == static_cast<QXmlErrorHandler*>(&handler));
+}
+
+void tst_TorkXmlGuard::tellsThePlace()
+{
+    QByteArray document = Nested(1000).replace("<a></a>", "<a>\n\n  <b></b></a>");
+    QBuffer buffer(&document);
+    TorkXmlGuard source(&buffer);
+    QXmlSimpleReader reader;
+    source.Watch(reader);
+    Text handler;
+    reader.setErrorHandler(&handler);
+    QVERIFY(!reader.parse(source));
+    QCOMPARE(handler.line, 3);
+    QCOMPARE(handler.column, 5);
 }
 
 void tst_TorkXmlGuard::tellsWithoutBeingWatched()

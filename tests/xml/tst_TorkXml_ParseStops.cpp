@@ -67,6 +67,8 @@ private slots:
     void prefixesThatAreOverDoNotCount();
     void usedPrefixesEndWithTheirElement();
     void usedPrefixesCountInTheirElement();
+    void elementsOfThePrefixXmlns();
+    void declarationsByHand();
     void deepDocuments_data();
     void deepDocuments();
     void largeDocument_data();
@@ -422,6 +424,10 @@ void tst_TorkXml_ParseStops::tooManyPrefixes_data()
         << "";
     QTest::newRow("one element more")
         << most + element.repeated(elementsBelowMost) + "</r>" << tooManyComparisons;
+    QTest::newRow("one comparison more")
+        << "<r xmlns:q='u'><a" + declarations(0, TorkXmlMaximumPrefixes - 1) + ">" +
+               element.repeated(elementsBelowMost - 1) + "</a></r>"
+        << tooManyComparisons;
     QTest::newRow("sixteen times as many elements below a quarter of them")
         << quarter + element.repeated(16 * elementsBelowMost - 1) + "</r>"
         << "";
@@ -475,6 +481,29 @@ void tst_TorkXml_ParseStops::usedPrefixesCountInTheirElement()
         QVERIFY(manager.endElement("", "b", QString("p%1:b").arg(i)));
     }
     QVERIFY(!manager.startElement("", "a", "q:a", QXmlAttributes()));
+}
+
+// An attribute "xmlns:p" declares a prefix, an element of that name uses the prefix "xmlns".
+void tst_TorkXml_ParseStops::elementsOfThePrefixXmlns()
+{
+    FlushingManager manager;
+    for (int i = 0; i < 2 * TorkXmlMaximumPrefixes; ++i) {
+        const QString name = QString("p%1").arg(i);
+        QVERIFY(manager.startElement("", name, "xmlns:" + name, QXmlAttributes()));
+    }
+}
+
+// Who drives a manager by hand need not tell of declarations that are among the attributes.
+void tst_TorkXml_ParseStops::declarationsByHand()
+{
+    QXmlAttributes attributes;
+    for (int i = 0; i < TorkXmlMaximumPrefixes; ++i)
+        attributes.append(QString("xmlns:p%1").arg(i), "", QString("p%1").arg(i), "u");
+    FlushingManager most;
+    QVERIFY(most.startElement("", "r", "r", attributes));
+    attributes.append("xmlns:q", "", "q", "u");
+    FlushingManager more;
+    QVERIFY(!more.startElement("", "r", "r", attributes));
 }
 
 void tst_TorkXml_ParseStops::deepDocuments_data()
