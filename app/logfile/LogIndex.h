@@ -127,6 +127,7 @@ private:
 
     std::vector<qint64> m_starts;
     std::vector<quint8> m_marks;
+    std::vector<quint16> m_checks;
     std::vector<Run> m_runs; // newest first, as in the file
     bool m_hasElapsed = false;
     size_t m_slowLine = 0;
@@ -158,6 +159,7 @@ private:
     bool m_isSeamUnchanged = false;
     std::vector<qint64> m_knownStarts;
     std::vector<quint8> m_knownMarks;
+    std::vector<quint16> m_knownChecks;
     std::vector<Run> m_knownRuns;
 };
 

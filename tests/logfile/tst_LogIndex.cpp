@@ -87,6 +87,7 @@ private slots:
     void growthAtTheEndMakesOneRun();
     void readsOnlyWhatIsNew();
     void incompleteLastLine();
+    void checks();
     void incompleteEntryCountsOnce();
     void olderEntryOverATornOne();
     void restartOfARunWithoutTimes();
@@ -405,6 +406,28 @@ void tst_LogIndex::readsOnlyWhatIsNew()
     QVERIFY(!second.Feed(rest.constData(), rest.size()));
     second.End();
     QCOMPARE(Texts(second, overwritten), TextsOf(overwritten));
+}
+
+// They cover what a line has in the file, and the last line as far as it was written.
+void tst_LogIndex::checks()
+{
+    const QByteArray longLine(LogRows::CheckedLength, 'x');
+    const QByteArray file = "a\nb\r\na\n\n" + longLine + "\r\n" + longLine + "yyy\nc";
+    LogIndex index;
+    Pass(index, file, 5);
+    const LogRows rows = index.Rows(LogFilter());
+    QCOMPARE(rows.size(), size_t(7));
+    for (size_t row = 0; row < rows.size(); ++row) {
+        const QByteArray text = file.mid(int(rows.starts[row])).split('\n').first();
+        const int length = text.endsWith('\r') ? text.size() - 1 : text.size();
+        QCOMPARE(rows.checks[row], LogRows::CheckOf(text.constData(), length));
+    }
+    QCOMPARE(rows.checks[0], rows.checks[2]);
+    QVERIFY(rows.checks[0] != rows.checks[1]);
+    QVERIFY(rows.checks[0] != rows.checks[3]);
+    QCOMPARE(rows.checks[4], rows.checks[5]); // only the start counts
+    QCOMPARE(rows.complete, qint64(file.size() - 1));
+    QCOMPARE(rows.end, qint64(file.size()));
 }
 
 void tst_LogIndex::incompleteLastLine()

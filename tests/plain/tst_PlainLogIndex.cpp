@@ -139,7 +139,8 @@ public:
             Run& run = runs.back();
             if (runs.size() > 1 && line.isTimed)
                 older.insert(line.start, line.text);
-            Row row{line.start, LogEntry::None};
+            Row row{line.start, LogEntry::None,
+                    LogRows::CheckOf(line.text.constData(), line.text.size())};
             if (line.isEntry)
                 row.mark = quint8(line.severity);
             else if (!run.rows.empty())
@@ -171,6 +172,7 @@ private:
     {
         qint64 start;
         quint8 mark;
+        quint16 check;
     };
 
     struct Run
@@ -219,6 +221,7 @@ private:
             if (rows.size() > 0) {
                 rows.starts.insert(rows.starts.begin(), LogRows::EarlierHeading);
                 rows.marks.insert(rows.marks.begin(), LogEntry::None);
+                rows.checks.insert(rows.checks.begin(), 0);
                 rows.earlier = rows.size();
                 rows.add(LogRows::NewestHeading, LogEntry::None);
             }
@@ -232,7 +235,7 @@ private:
             const auto severity = LogEntry::Severity(row.mark & LogRows::SeverityMask);
             if ((row.mark & LogRows::Unmatched) || !filter.Shows(severity))
                 continue;
-            rows.add(row.start, row.mark);
+            rows.add(row.start, row.mark, row.check);
             const bool isProblem = severity >= LogEntry::Warning && severity <= LogEntry::Fatal;
             rows.problems += isProblem && !(row.mark & LogRows::Continued);
         }
@@ -254,7 +257,8 @@ QString Text(LogRows const& rows)
 bool IsSame(LogRows const& left, LogRows const& right)
 {
     return left.starts == right.starts && left.marks == right.marks &&
-           left.earlier == right.earlier && left.problems == right.problems;
+           left.checks == right.checks && left.earlier == right.earlier &&
+           left.problems == right.problems;
 }
 
 // A file that a log writes, and what its reader has set.
@@ -583,7 +587,7 @@ private:
             LogRows shown;
             const auto add = [&](LogRows const& rows, size_t from, size_t to) {
                 for (size_t i = from; i < to; ++i)
-                    shown.add(rows.starts[i], rows.marks[i]);
+                    shown.add(rows.starts[i], rows.marks[i], rows.checks[i]);
             };
             add(before, 0, update.changeAt);
             add(after, update.changeAt, update.changeAt + update.inserted);

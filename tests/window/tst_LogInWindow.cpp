@@ -64,6 +64,7 @@ private slots:
     void filterByExpression();
     void filterBySeverity();
     void pauses();
+    void overwrittenWhilePaused();
     void copiesLines();
     void copiesFromTheMenu();
     void problems();
@@ -271,6 +272,48 @@ void tst_LogInWindow::pauses()
     QCOMPARE(Rows(*window), 2);
     QTest::keyClick(window.get(), Qt::Key_P, Qt::ControlModifier | Qt::ShiftModifier);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+}
+
+// The program is started again, and its log writes over the lines that are shown.
+void tst_LogInWindow::overwrittenWhilePaused()
+{
+    const QByteArray log = run(200, QTime(9, 0), "x");
+    const WindowTest test(log);
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 200, Patience);
+    LogView* view = View(*window);
+    view->setFocus();
+    QTest::keyClick(view, Qt::Key_P, Qt::ControlModifier | Qt::ShiftModifier);
+    QFile file(test.logFile());
+    QVERIFY(file.open(QIODevice::ReadWrite));
+    file.write(run(100, QTime(17, 0), "another"));
+    file.close();
+
+    auto const* pane = Child<QPlainTextEdit>(window.get(), "Full text of the current line");
+    const QStringList lines = QString(log).split('\n');
+    const QString gone = "This line is no longer in the file";
+    int seen = 0;
+    int goneRows = 0;
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::NoModifier, RowCentre(view, 199));
+    while (seen < 60 && view->currentIndex().row() != 0) {
+        QTest::keyClick(view, Qt::Key_PageUp);
+        QTest::qWait(1); // paint
+        const int row = view->currentIndex().row();
+        QVERIFY(pane->toPlainText() == lines[row] || pane->toPlainText() == gone);
+        QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
+        QCOMPARE(QGuiApplication::clipboard()->text(), pane->toPlainText() + '\n');
+        goneRows += pane->toPlainText() == gone;
+        ++seen;
+    }
+    QVERIFY(seen > 5);
+    QVERIFY(goneRows > 0 && goneRows < seen);
+
+    QTest::keyClick(view, Qt::Key_P, Qt::ControlModifier | Qt::ShiftModifier);
+    QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) != 200, Patience);
+    const LogModel* model = Panel(*window)->model();
+    QCOMPARE(model->index(Rows(*window) - 1, 3).data().toString(), QString("another 99"));
+    for (int row = 0; row < Rows(*window); ++row)
+        QVERIFY(!model->IsGone(row));
 }
 
 void tst_LogInWindow::copiesLines()

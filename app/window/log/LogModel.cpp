@@ -29,9 +29,14 @@ QString OnOneLine(QString text)
     return text;
 }
 
+QString GoneText()
+{
+    return LogModel::tr("This line is no longer in the file");
+}
+
 } // namespace
 
-LogModel::LogModel(QObject* parent) : QAbstractTableModel(parent), m_entries(1000)
+LogModel::LogModel(QObject* parent) : QAbstractTableModel(parent), m_lines(1000)
 {
     m_state.rows = std::make_shared<LogRows>();
     m_pollTimer.setInterval(PollInterval);
@@ -71,6 +76,7 @@ void LogModel::Open(QString const& path, LogLineParser const& parser, bool isCur
     m_path = path;
     m_parser = parser;
     m_isCurrent = isCurrent;
+    m_lines.clear();
     Reload();
 }
 
@@ -101,6 +107,7 @@ void LogModel::SetPaused(bool paused)
     m_paused = paused;
     if (paused) {
         m_pollTimer.stop();
+        openFile(); // so that a rotation does not take the lines away
     } else if (m_scanner) {
         m_pollTimer.start();
         poll();
@@ -121,11 +128,17 @@ void LogModel::take(LogUpdate const& update)
         return;
     const bool wasReading = m_reading;
     m_reading = false;
-    m_entries.clear();
-    if (update.isReset || wasReading)
+    if (m_paused && !wasReading) {
+        m_hasDropped = true;
+        return;
+    }
+    if (!m_paused)
+        m_lines.clear();
+    if (update.isReset || wasReading || m_hasDropped)
         reset(update);
-    else if (!m_paused)
+    else
         applyChange(update);
+    m_hasDropped = false;
     if (wasReading)
         Q_EMIT progressed(100);
     Q_EMIT refreshed();
@@ -205,47 +218,99 @@ bool LogModel::isHeading(int row) const
     return m_state.rows->starts[static_cast<size_t>(row)] < 0;
 }
 
+bool LogModel::openFile() const
+{
+    if (m_file.isOpen())
+        return true;
+    m_file.setFileName(m_path);
+    return QFileInfo(m_path).isFile() && m_file.open(QIODevice::ReadOnly | QIODevice::Unbuffered);
+}
+
+// Up to `limit` bytes of a line, without its line end. Null if the file cannot be read.
+QByteArray LogModel::readBytes(int row, qint64 limit) const
+{
+    LogRows const& rows = *m_state.rows;
+    const qint64 start = rows.starts[static_cast<size_t>(row)];
+    if (!openFile() || !m_file.seek(start))
+        return QByteArray();
+
+    // A last line may have got longer since.
+    const qint64 most = limit + 2; // with the line end
+    const qint64 length = start < rows.complete ? most : std::min(most, rows.end - start);
+    const qint64 first = std::min<qint64>(length, 1024);
+    QByteArray bytes = m_file.read(first);
+    int end = bytes.indexOf('\n');
+    if (end < 0 && bytes.size() == first && length > first) {
+        bytes += m_file.read(length - first);
+        end = bytes.indexOf('\n', static_cast<int>(first));
+    }
+    if (end >= 0)
+        bytes.truncate(end);
+    if (bytes.endsWith('\r'))
+        bytes.chop(1);
+    bytes.truncate(static_cast<int>(std::min<qint64>(limit, bytes.size())));
+    return bytes;
+}
+
+LogModel::Line LogModel::readLine(int row) const
+{
+    Line line;
+    const auto position = static_cast<size_t>(row);
+    line.start = readBytes(row, LogRows::CheckedLength);
+    line.check = m_state.rows->checks[position];
+    line.isTorn = m_state.rows->marks[position] & LogRows::Torn;
+    line.isGone = LogRows::CheckOf(line.start.constData(), line.start.size()) != line.check;
+    if (line.isGone)
+        line.entry.message = GoneText();
+    else if (line.isTorn)
+        line.entry.message = QString::fromLatin1(line.start);
+    else
+        line.entry = m_parser.Parse(line.start);
+    line.entry.message = OnOneLine(line.entry.message);
+    return line;
+}
+
+LogModel::Line const* LogModel::knownLine(int row) const
+{
+    const auto position = static_cast<size_t>(row);
+    Line const* known = m_lines.object(m_state.rows->starts[position]);
+    const bool isTorn = m_state.rows->marks[position] & LogRows::Torn;
+    return known && known->check == m_state.rows->checks[position] && known->isTorn == isTorn
+               ? known
+               : nullptr;
+}
+
+LogModel::Line const& LogModel::line(int row) const
+{
+    if (Line const* known = knownLine(row))
+        return *known;
+    auto* read = new Line(readLine(row));
+    m_lines.insert(m_state.rows->starts[static_cast<size_t>(row)], read);
+    return *read;
+}
+
+// What is known is not read again, because the line may be gone by now. But many lines that are not
+// shown must not take the place of those that are.
 QString LogModel::LineText(int row, int limit) const
 {
     if (row < 0 || row >= m_rowCount || isHeading(row))
         return QString();
-    if (!m_file.isOpen()) {
-        m_file.setFileName(m_path);
-        if (!QFileInfo(m_path).isFile() ||
-            !m_file.open(QIODevice::ReadOnly | QIODevice::Unbuffered))
-            return QString();
-    }
-    if (!m_file.seek(m_state.rows->starts[static_cast<size_t>(row)]))
-        return QString();
-
-    QByteArray line = m_file.read(std::min(limit, 1024));
-    int end = line.indexOf('\n');
-    if (end < 0 && line.size() == 1024 && limit > 1024) {
-        line += m_file.read(limit - 1024);
-        end = line.indexOf('\n');
-    }
-    if (end >= 0)
-        line.truncate(end);
-    if (line.endsWith('\r'))
-        line.chop(1);
-    return QString::fromLatin1(line);
+    Line const* known = knownLine(row);
+    const Line line = known ? *known : readLine(row);
+    if (line.isGone)
+        return line.entry.message;
+    if (line.start.size() < LogRows::CheckedLength || limit <= LogRows::CheckedLength)
+        return QString::fromLatin1(line.start.left(limit));
+    const QByteArray whole = readBytes(row, limit);
+    return whole.startsWith(line.start) ? QString::fromLatin1(whole) : GoneText();
 }
 
-LogEntry const& LogModel::entry(int row) const
+bool LogModel::IsGone(int row) const
 {
-    const qint64 start = m_state.rows->starts[static_cast<size_t>(row)];
-    if (LogEntry const* known = m_entries.object(start))
-        return *known;
-
-    auto* found = new LogEntry;
-    const QString line = LineText(row, ShownLimit);
-    if (m_state.rows->marks[static_cast<size_t>(row)] & LogRows::Torn)
-        found->message = line;
-    else
-        *found = m_parser.Parse(line.toLatin1());
-    found->message = OnOneLine(found->message);
-    m_entries.insert(start, found);
-    return *found;
+    if (row < 0 || row >= m_rowCount || isHeading(row))
+        return false;
+    Line const* known = knownLine(row);
+    return known ? known->isGone : readLine(row).isGone;
 }
 
 QString LogModel::headingText(int row) const

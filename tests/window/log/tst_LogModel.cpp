@@ -103,6 +103,10 @@ private slots:
     void earlierRuns();
     void findProblem();
     void pause();
+    void updateAfterThePause();
+    void overwritten_data();
+    void overwritten();
+    void rotatedWhilePaused();
     void heading_data();
     void heading();
     void longLines();
@@ -442,6 +446,110 @@ void tst_LogModel::pause()
     QCOMPARE(model.rowCount(), 2);
     model.SetPaused(false);
     QTRY_COMPARE_WITH_TIMEOUT(model.rowCount(), 4, Patience);
+}
+
+// An update that is on its way when the pause begins, and the next one, which only says what has
+// changed since.
+void tst_LogModel::updateAfterThePause()
+{
+    QByteArray newer = run(5, QTime(9, 0), "n");
+    LogModel model;
+    open(model, writtenOver(run(80, QTime(17, 0), "x", true), newer));
+    const int rows = model.rowCount();
+    RowCounter counter(model);
+    connect(&model, &LogModel::pollRequested, &counter, [&] { model.SetPaused(true); });
+    newer += entry("09:01:00.000", "Trace", QString(1000, 'n')); // over many lines
+    QVERIFY(WriteAt(m_file, 0, newer));
+    QTRY_VERIFY_WITH_TIMEOUT(model.isPaused(), Patience);
+    disconnect(&model, &LogModel::pollRequested, &counter, nullptr);
+    QTest::qWait(4 * LogModel::PollInterval);
+    QCOMPARE(model.rowCount(), rows);
+
+    newer += entry("09:01:01.000", "Trace", "last");
+    QVERIFY(WriteAt(m_file, 0, newer));
+    model.SetPaused(false);
+    QTRY_COMPARE_WITH_TIMEOUT(model.state().rows->size(), size_t(model.rowCount()), Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(model).last(), QString("last"), Patience);
+    LogModel fresh;
+    open(fresh, TestFiles::read(m_file));
+    QCOMPARE(Messages(model), Messages(fresh));
+    QVERIFY(counter.right);
+}
+
+void tst_LogModel::overwritten_data()
+{
+    QTest::addColumn<QByteArray>("over");
+    QTest::addColumn<int>("length"); // of the file, after that
+
+    const QByteArray other = run(30, QTime(10, 0), "another");
+    const auto row = [](char const* name, QByteArray const& over, int length) {
+        QTest::newRow(name) << over << length;
+    };
+    row("by lines of other lengths", other, 0);
+    row("by lines as long", run(30, QTime(10, 0), "y"), 0);
+    row("up to the middle of a line", other.left(other.size() - 9), 0);
+    row("up to the end of a line", QByteArray(run(1, QTime(9, 0), "x").size() - 1, 'y'), 0);
+    row("by line ends", QByteArray(1000, '\n'), 0);
+    row("by a line that goes on", QByteArray(1000, 'y'), 0);
+    row("and cut short", other, 1000);
+    row("by nothing, but cut in a line", "", 1000);
+}
+
+// Rows that were read before keep their lines. Others show their lines or are gone, while paused
+// and before the next update. What is in their places is never shown.
+void tst_LogModel::overwritten()
+{
+    QFETCH(QByteArray, over);
+    QFETCH(int, length);
+    const int lines = 100;
+    const int onScreen = 10;
+    QByteArray log = run(lines, QTime(9, 0), "x");
+    const QStringList before = QString(log).split('\n');
+    for (bool isPaused : {true, false}) {
+        LogModel model;
+        open(model, log);
+        QCOMPARE(model.rowCount(), lines);
+        for (int row = 0; row < onScreen; ++row)
+            QCOMPARE(model.index(row, 3).data().toString(), QString("x %1").arg(row));
+        model.SetPaused(isPaused);
+        QVERIFY(WriteAt(m_file, 0, over));
+        QVERIFY(length == 0 || QFile::resize(m_file, length));
+        if (isPaused)
+            QTest::qWait(2 * LogModel::PollInterval);
+
+        const QByteArray file = TestFiles::read(m_file);
+        for (int row = 0; row < lines; ++row) {
+            const QString line = model.LineText(row, LogIndex::LineLimit);
+            const QByteArray now = file.mid(int(model.LineStart(row)));
+            const bool isThere = now.startsWith(before[row].toLatin1() + '\n');
+            QCOMPARE(model.IsGone(row), row >= onScreen && !isThere);
+            const QString gone = "This line is no longer in the file";
+            QCOMPARE(line, model.IsGone(row) ? gone : before[row]);
+            QCOMPARE(model.index(row, 3).data().toString(),
+                     model.IsGone(row) ? gone : QString("x %1").arg(row));
+            QCOMPARE(model.index(row, 0).data().toString().isEmpty(), model.IsGone(row));
+        }
+        QVERIFY(model.IsGone(onScreen) || file.startsWith(before[0].toLatin1().left(9)) ||
+                over.size() < 100);
+        if (!isPaused)
+            continue;
+        model.SetPaused(false);
+        QTRY_VERIFY_WITH_TIMEOUT(!Messages(model).contains("This line is no longer in the file"),
+                                 Patience);
+    }
+}
+
+// The file that was read has got another name; no row was read before.
+void tst_LogModel::rotatedWhilePaused()
+{
+    LogModel model;
+    open(model, run(5, QTime(9, 0), "x"));
+    model.SetPaused(true);
+    QVERIFY(QFile::rename(m_file, m_file + ".1"));
+    QVERIFY(TestFiles::write(m_file, run(3, QTime(10, 0), "y")));
+    QCOMPARE(Messages(model), Numbered("x", 0, 5));
+    model.SetPaused(false);
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(model), Numbered("y", 0, 3), Patience);
 }
 
 void tst_LogModel::heading_data()
