@@ -357,6 +357,18 @@ void LogIndex::noteTime(LogLineParser::Parts const& parts)
     }
 }
 
+// Whether a line from the first one of an entry on matches the text.
+bool LogIndex::isEntryMatched(size_t first, size_t end) const
+{
+    size_t line = first;
+    while (m_slowLine == 0 && (m_marks[line] & LogRows::Unmatched)) {
+        ++line;
+        if (line == end || !(m_marks[line] & LogRows::Continued))
+            return false;
+    }
+    return true;
+}
+
 LogRows LogIndex::Rows(LogFilter const& filter) const
 {
     LogRows rows;
@@ -366,10 +378,18 @@ LogRows LogIndex::Rows(LogFilter const& filter) const
     const auto addRun = [&](size_t number) {
         const bool isLast = number + 1 == m_runs.size();
         const size_t end = isLast ? m_starts.size() : m_runs[number + 1].firstLine;
+        size_t entryEnd = 0; // at most
+        bool isMatched = false;
         for (size_t line = m_runs[number].firstLine; line < end; ++line) {
-            const quint8 mark = m_marks[line];
+            quint8 mark = m_marks[line];
+            if (!(mark & LogRows::Continued)) {
+                entryEnd = LogRows::BeginsEntry(mark) ? line + MaximumEntryLines : line + 1;
+                isMatched = isEntryMatched(line, std::min(entryEnd, end));
+            } else if (line >= entryEnd) {
+                mark |= LogRows::Alone;
+                isMatched = isEntryMatched(line, line + 1);
+            }
             const auto severity = static_cast<LogEntry::Severity>(mark & LogRows::SeverityMask);
-            const bool isMatched = m_slowLine > 0 || !(mark & LogRows::Unmatched);
             if (!isMatched || !filter.Shows(severity))
                 continue;
             rows.add(m_starts[line], mark, m_checks[line]);

@@ -68,7 +68,8 @@ public:
     qint64 completeOffset() const;
 
     /// The lines that match a filter, whose text must be that of the filter the index was made
-    /// with.
+    /// with. An entry is shown with all of its lines if one of them matches. Lines beyond
+    /// MaximumEntryLines, and lines that continue no entry, are shown or not by themselves.
     LogRows Rows(LogFilter const& filter) const;
 
     /// Where the next pass will begin. Everything before it is final.
@@ -96,6 +97,9 @@ public:
     /// Whether any entry has an elapsed time.
     bool hasElapsed() const { return m_hasElapsed; }
 
+    /// How many lines are shown or hidden together.
+    static constexpr size_t MaximumEntryLines = 1000;
+
     /// How far into a line the text filter looks, in bytes.
     static constexpr int LineLimit = 64 * 1024;
 
@@ -108,6 +112,7 @@ private:
         bool hasDate = false;
     };
 
+    bool isEntryMatched(size_t first, size_t end) const;
     size_t resumeLine() const;
     void forgetFrom(size_t line);
     bool addLine(char const* line, int length, bool complete);

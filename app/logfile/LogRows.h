@@ -29,7 +29,8 @@ struct LogRows
     static constexpr quint8 Continued = 0x08; ///< not an entry; has the severity of the entry above
     static constexpr quint8 Torn = 0x10;      ///< its first part was overwritten
     static constexpr quint8 Timed = 0x20;     ///< its time is known
-    static constexpr quint8 Unmatched = 0x40; ///< does not match the text filter
+    static constexpr quint8 Unmatched = 0x40; ///< does not match the text filter itself
+    static constexpr quint8 Alone = 0x80;     ///< continued, but not shown along with its entry
 
     std::vector<qint64> starts;
     std::vector<quint8> marks;
@@ -46,6 +47,14 @@ struct LogRows
         starts.push_back(start);
         marks.push_back(mark);
         checks.push_back(check);
+    }
+
+    /// Whether a line with this mark is the first one of an entry. The lines that follow it without
+    /// a stamp, those with the mark Continued, belong to the same entry.
+    static bool BeginsEntry(quint8 mark)
+    {
+        return !(mark & (Continued | Torn)) &&
+               ((mark & Timed) || (mark & SeverityMask) != LogEntry::None);
     }
 
     /// The start of a line that a check covers, in bytes.

@@ -65,6 +65,7 @@ private slots:
     void filterBySeverity();
     void pauses();
     void overwrittenWhilePaused();
+    void entriesOfSeveralLines();
     void copiesLines();
     void copiesFromTheMenu();
     void problems();
@@ -314,6 +315,43 @@ void tst_LogInWindow::overwrittenWhilePaused()
     QCOMPARE(model->index(Rows(*window) - 1, 3).data().toString(), QString("another 99"));
     for (int row = 0; row < Rows(*window); ++row)
         QVERIFY(!model->IsGone(row));
+}
+
+// Filter, detail pane, copy and the search for problems work on the entry, not on its line.
+void tst_LogInWindow::entriesOfSeveralLines()
+{
+    const QByteArray first =
+        entry("09:00:00.000", "Error", "request failed") + "  at one\n  at two\n";
+    const QByteArray second = entry("09:00:02.000", "Error", "once more") + "  at three\n";
+    const WindowTest test(first + entry("09:00:01.000", "Trace", "between") + second);
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 6, Patience);
+    LogView* view = View(*window);
+    auto const* pane = Child<QPlainTextEdit>(window.get(), "Full text of the current line");
+
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::NoModifier, RowCentre(view, 2));
+    QCOMPARE(pane->toPlainText() + '\n', QString(first));
+    QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
+    QCOMPARE(QGuiApplication::clipboard()->text(), QString(first));
+    QCOMPARE(window->statusBar()->currentMessage(), QString("3 lines copied"));
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::ShiftModifier, RowCentre(view, 4));
+    QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
+    QCOMPARE(QGuiApplication::clipboard()->text().toLatin1(), TestFiles::read(test.logFile()));
+
+    QTest::keyClick(view, Qt::Key_F8);
+    QCOMPARE(view->currentIndex().row(), 0); // from the second error around
+    QTest::keyClick(view, Qt::Key_Down);
+    QTest::keyClick(view, Qt::Key_F8);
+    QCOMPARE(view->currentIndex().row(), 4);
+    QTest::keyClick(view, Qt::Key_Down);
+    QTest::keyClick(view, Qt::Key_F8, Qt::ShiftModifier);
+    QCOMPARE(view->currentIndex().row(), 0);
+
+    auto* field = Child<QLineEdit>(window.get(), "Filter by text");
+    field->setFocus();
+    QTest::keyClicks(field, "at two");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
+    QCOMPARE(pane->toPlainText() + '\n', QString(first));
 }
 
 void tst_LogInWindow::copiesLines()

@@ -189,6 +189,8 @@ void LogModel::applyChange(LogUpdate const& update)
 int LogModel::FindProblem(int row, int step) const
 {
     LogRows const& rows = *m_state.rows;
+    if (row >= 0 && row < m_rowCount)
+        row = EntryRows(row).first;
     for (row += step; row >= 0 && row < m_rowCount; row += step) {
         const auto position = static_cast<size_t>(row);
         if (LogSeverities::IsProblem(rows.severity(position)) &&
@@ -303,6 +305,37 @@ QString LogModel::LineText(int row, int limit) const
         return QString::fromLatin1(line.start.left(limit));
     const QByteArray whole = readBytes(row, limit);
     return whole.startsWith(line.start) ? QString::fromLatin1(whole) : GoneText();
+}
+
+QPair<int, int> LogModel::EntryRows(int row) const
+{
+    std::vector<quint8> const& marks = m_state.rows->marks;
+    const auto continues = [&](int other) {
+        const quint8 mark = marks[static_cast<size_t>(other)];
+        return (mark & LogRows::Continued) && !(mark & LogRows::Alone);
+    };
+    int first = row;
+    while (first > 0 && continues(first))
+        --first;
+    int last = row;
+    while (last + 1 < m_rowCount && continues(last + 1))
+        ++last;
+    return qMakePair(first, last);
+}
+
+QString LogModel::EntryText(int row, int limit) const
+{
+    if (row < 0 || row >= m_rowCount)
+        return QString();
+    const QPair<int, int> rows = EntryRows(row);
+    QString text = LineText(rows.first, limit);
+    for (int next = rows.first + 1; next <= rows.second; ++next) {
+        const int left = limit - text.size() - 1;
+        if (left <= 0)
+            return text + QLatin1Char('\n') + tr("(%L1 more lines)").arg(rows.second - next + 1);
+        text += QLatin1Char('\n') + LineText(next, left);
+    }
+    return text;
 }
 
 bool LogModel::IsGone(int row) const

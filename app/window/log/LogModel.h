@@ -61,8 +61,8 @@ public:
     void SetPaused(bool paused);
     bool isPaused() const { return m_paused; }
 
-    /// The nearest row after (step 1) or before (step -1) `row` that is a warning or worse;
-    /// -1 if there is none.
+    /// The first row of the nearest entry after (step 1) or before (step -1) that of `row` that is
+    /// a warning or worse; -1 if there is none.
     int FindProblem(int row, int step) const;
 
     /// Where the line of a row starts in the file; negative for a heading.
@@ -77,6 +77,17 @@ public:
     ///
     /// @param limit  maximum number of bytes to read
     QString LineText(int row, int limit) const;
+
+    /// The first and the last row of the entry that a row belongs to: its first line and the lines
+    /// that follow without a stamp. Of a line that belongs to no entry, and of a heading, the row
+    /// itself.
+    QPair<int, int> EntryRows(int row) const;
+
+    /// The lines of the entry that a row belongs to, as LineText() gives them, with line ends
+    /// between them.
+    ///
+    /// @param limit  maximum number of bytes to read; if there is more, a last line says so
+    QString EntryText(int row, int limit) const;
 
     /// Whether the line of a row was in the file when the row was made, but is no longer there.
     bool IsGone(int row) const;

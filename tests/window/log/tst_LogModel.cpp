@@ -102,6 +102,7 @@ private slots:
     void filter();
     void earlierRuns();
     void findProblem();
+    void entries();
     void pause();
     void updateAfterThePause();
     void overwritten_data();
@@ -434,6 +435,31 @@ void tst_LogModel::findProblem()
     QCOMPARE(model.FindProblem(5, -1), 4);
     QCOMPARE(model.FindProblem(4, -1), 1);
     QCOMPARE(model.FindProblem(1, -1), -1);
+}
+
+void tst_LogModel::entries()
+{
+    LogModel model;
+    open(model, "before\nmore\n" + entry("09:00:00.000", "Error", "request") + "stack\ntrace\n" +
+                    entry("09:00:01.000", "Error", "single") + "tail");
+    const QList<QPair<int, int>> expected = {{0, 0}, {1, 1}, {2, 4}, {2, 4},
+                                             {2, 4}, {5, 6}, {5, 6}};
+    for (int row = 0; row < model.rowCount(); ++row)
+        QCOMPARE(model.EntryRows(row), expected[row]);
+    QCOMPARE(model.EntryText(1, 1000), QString("more"));
+    const QString request = "2025-03-03 09:00:00.000 Error request";
+    for (int row : {2, 3, 4})
+        QCOMPARE(model.EntryText(row, 1000), request + "\nstack\ntrace");
+    QCOMPARE(model.EntryText(6, 1000), QString("2025-03-03 09:00:01.000 Error single\ntail"));
+    QCOMPARE(model.EntryText(3, request.size() + 4), request + "\nsta\n(1 more lines)");
+    QCOMPARE(model.EntryText(3, 3), QString("202\n(2 more lines)"));
+    QCOMPARE(model.EntryText(7, 1000), QString());
+    QCOMPARE(model.EntryText(-1, 1000), QString());
+
+    // From any line of an entry to another one.
+    QCOMPARE(model.FindProblem(4, -1), -1);
+    QCOMPARE(model.FindProblem(6, -1), 2);
+    QCOMPARE(model.FindProblem(3, 1), 5);
 }
 
 void tst_LogModel::pause()
