@@ -100,8 +100,9 @@ public:
     /// How many lines are shown or hidden together.
     static constexpr size_t MaximumEntryLines = 1000;
 
-    /// How far into a line the text filter looks, in bytes.
-    static constexpr int LineLimit = 64 * 1024;
+    /// How far into a line the text filter looks, in bytes. Whoever shows or copies a line may
+    /// stop there, too: such a file is hardly a log.
+    static constexpr int LineLimit = 64 * 1024 * 1024;
 
 private:
     struct Run

@@ -81,6 +81,7 @@ private slots:
     void filter();
     void continuedLinesGoWithTheirEntry();
     void textFilter();
+    void textFilterOfLongLines();
     void textFilterOfEntries_data();
     void textFilterOfEntries();
     void longEntry();
@@ -312,14 +313,23 @@ void tst_LogIndex::textFilter()
     LogIndex index{LogLineParser(), filter};
     Pass(index, file, 100);
     QCOMPARE(Texts(index, file, filter).size(), 11);
+}
 
-    // A match past the limit of a very long line is not found; one before it is.
-    const QByteArray longLine = entry("09:00:00.000", "Trace", QString(LogIndex::LineLimit, 'x'));
-    LogFilter longFilter;
-    QVERIFY(longFilter.SetText("xxx", false, true));
-    LogIndex longIndex{LogLineParser(), longFilter};
-    Pass(longIndex, longLine, 1000);
-    QCOMPARE(longIndex.Rows(longFilter).size(), size_t(1));
+// Read in many pieces, and searched as a whole.
+void tst_LogIndex::textFilterOfLongLines()
+{
+    const QString text(3000000, 'x');
+    const QByteArray file = entry("09:00:00.000", "Trace", text + "needle") +
+                            entry("09:00:01.000", "Trace", text) +
+                            entry("09:00:02.000", "Trace", "needle" + text + "needle").trimmed();
+    LogFilter filter;
+    QVERIFY(filter.SetText("xneedle", false, true));
+    LogIndex index{LogLineParser(), filter};
+    Pass(index, file, 4099);
+    QCOMPARE(index.size(), size_t(3));
+    const LogRows rows = index.Rows(filter);
+    QCOMPARE(rows.size(), size_t(2));
+    QCOMPARE(rows.starts[1], qint64(file.lastIndexOf('\n') + 1));
 }
 
 void tst_LogIndex::textFilterOfEntries_data()

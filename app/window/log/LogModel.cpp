@@ -5,6 +5,7 @@
 
 #include "app/logfile/LogScanner.h"
 #include "app/logfile/LogSeverities.h"
+#include "app/window/widgets/FileSizeText.h"
 #include "app/window/widgets/PlainText.h"
 #include "app/window/widgets/SeverityIcons.h"
 
@@ -27,6 +28,17 @@ QString OnOneLine(QString text)
             c = QLatin1Char(' ');
     }
     return text;
+}
+
+// A longer line is measured no further: rows are read while they are painted.
+constexpr qint64 MeasuredLength = 4 * 1000 * 1000; // bytes
+
+// Follows what is shown of a line.
+QString Ellipsis(qint64 length)
+{
+    const QString size = FileSizeText(length);
+    return QChar(0x2026) + (length < MeasuredLength ? LogModel::tr(" (%1)").arg(size)
+                                                    : LogModel::tr(" (more than %1)").arg(size));
 }
 
 QString GoneText()
@@ -254,6 +266,29 @@ QByteArray LogModel::readBytes(int row, qint64 limit) const
     return bytes;
 }
 
+// The length of a line in bytes, or MeasuredLength if it has at least that.
+qint64 LogModel::lengthOf(int row) const
+{
+    LogRows const& rows = *m_state.rows;
+    const qint64 start = rows.starts[static_cast<size_t>(row)];
+    const qint64 most =
+        start < rows.complete ? MeasuredLength : std::min(MeasuredLength, rows.end - start);
+    qint64 length = 0;
+    bool hasReturn = false;
+    if (!openFile() || !m_file.seek(start))
+        return 0;
+    while (length < most) {
+        const QByteArray bytes = m_file.read(std::min<qint64>(most - length, 1 << 16));
+        const int found = bytes.indexOf('\n');
+        const int end = found < 0 ? bytes.size() : found;
+        hasReturn = end > 0 ? bytes[end - 1] == '\r' : hasReturn;
+        length += end;
+        if (found >= 0 || bytes.isEmpty())
+            break;
+    }
+    return hasReturn ? length - 1 : length;
+}
+
 LogModel::Line LogModel::readLine(int row) const
 {
     Line line;
@@ -269,6 +304,11 @@ LogModel::Line LogModel::readLine(int row) const
     else
         line.entry = m_parser.Parse(line.start);
     line.entry.message = OnOneLine(line.entry.message);
+    if (line.isGone || line.start.size() < LogRows::CheckedLength)
+        return line;
+    const qint64 length = lengthOf(row);
+    if (length > LogRows::CheckedLength)
+        line.entry.message += Ellipsis(length);
     return line;
 }
 
@@ -328,13 +368,15 @@ QString LogModel::EntryText(int row, int limit) const
     if (row < 0 || row >= m_rowCount)
         return QString();
     const QPair<int, int> rows = EntryRows(row);
-    QString text = LineText(rows.first, limit);
-    for (int next = rows.first + 1; next <= rows.second; ++next) {
-        const int left = limit - text.size() - 1;
-        if (left <= 0)
-            return text + QLatin1Char('\n') + tr("(%L1 more lines)").arg(rows.second - next + 1);
-        text += QLatin1Char('\n') + LineText(next, left);
+    QString text;
+    for (int next = rows.first; next <= rows.second; ++next) {
+        const int left = limit - text.size();
+        const QString line = LineText(next, left + 1);
+        text += line.left(left) + QLatin1Char('\n');
+        if (line.size() > left)
+            return text + tr("(only the first %1 are shown)").arg(FileSizeText(limit));
     }
+    text.chop(1);
     return text;
 }
 

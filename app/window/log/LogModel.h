@@ -86,7 +86,7 @@ public:
     /// The lines of the entry that a row belongs to, as LineText() gives them, with line ends
     /// between them.
     ///
-    /// @param limit  maximum number of bytes to read; if there is more, a last line says so
+    /// @param limit  maximum number of bytes to show; if there is more, a last line says so
     QString EntryText(int row, int limit) const;
 
     /// Whether the line of a row was in the file when the row was made, but is no longer there.
@@ -105,7 +105,7 @@ public:
     /// The interval between checks for changes, in milliseconds.
     static constexpr int PollInterval = 250;
 
-    /// The maximum length shown of a line, in bytes.
+    /// The maximum length that a row shows of a line, in bytes. The size of a longer one follows.
     static constexpr int ShownLimit = 4096;
 
 Q_SIGNALS:
@@ -140,6 +140,7 @@ private:
     bool isHeading(int row) const;
     bool openFile() const;
     QByteArray readBytes(int row, qint64 limit) const;
+    qint64 lengthOf(int row) const;
     Line readLine(int row) const;
     Line const* knownLine(int row) const;
     Line const& line(int row) const;

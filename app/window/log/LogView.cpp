@@ -261,7 +261,10 @@ int LogView::CopySelected()
         const QPair<int, int> entry = m_model->EntryRows(row);
         for (next = std::max(next, entry.first); next <= entry.second && count < MaximumCopiedLines;
              ++next) {
-            text += m_model->LineText(next, LogIndex::LineLimit) + QLatin1Char('\n');
+            const QString line = m_model->LineText(next, LogIndex::LineLimit + 1);
+            text += line.left(LogIndex::LineLimit);
+            text += line.size() > LogIndex::LineLimit ? QStringLiteral("\u2026\n")
+                                                      : QStringLiteral("\n");
             ++count;
         }
     }

@@ -110,6 +110,7 @@ private slots:
     void rotatedWhilePaused();
     void heading_data();
     void heading();
+    void longLines_data();
     void longLines();
     void controlCharacters();
     void withTheLogItself();
@@ -451,8 +452,10 @@ void tst_LogModel::entries()
     for (int row : {2, 3, 4})
         QCOMPARE(model.EntryText(row, 1000), request + "\nstack\ntrace");
     QCOMPARE(model.EntryText(6, 1000), QString("2025-03-03 09:00:01.000 Error single\ntail"));
-    QCOMPARE(model.EntryText(3, request.size() + 4), request + "\nsta\n(1 more lines)");
-    QCOMPARE(model.EntryText(3, 3), QString("202\n(2 more lines)"));
+    QCOMPARE(model.EntryText(3, request.size() + 4),
+             request + "\nsta\n(only the first 41 bytes are shown)");
+    QCOMPARE(model.EntryText(3, 3), QString("202\n(only the first 3 bytes are shown)"));
+    QCOMPARE(model.EntryText(3, request.size() + 12), request + "\nstack\ntrace");
     QCOMPARE(model.EntryText(7, 1000), QString());
     QCOMPARE(model.EntryText(-1, 1000), QString());
 
@@ -598,15 +601,39 @@ void tst_LogModel::heading()
     QCOMPARE(model.LineText(4, 100), QString());
 }
 
+// A row shows the start and says how long the line is; there is no such limit elsewhere.
+void tst_LogModel::longLines_data()
+{
+    QTest::addColumn<int>("length"); // of the line
+    QTest::addColumn<QString>("end");
+
+    QTest::newRow("as long as a row shows") << int(LogModel::ShownLimit) << "yz";
+    QTest::newRow("one byte more") << LogModel::ShownLimit + 1 << QString("yy\u2026 (4.1 kB)");
+    QTest::newRow("longer than a piece of the file") << 300000 << QString("yy\u2026 (300 kB)");
+    QTest::newRow("longer than a slice") << 1200000 << QString("yy\u2026 (1.2 MB)");
+    QTest::newRow("too long to measure") << 5000000 << QString("yy\u2026 (more than 4.0 MB)");
+}
+
 void tst_LogModel::longLines()
 {
-    const QString text(300000, 'y');
-    LogModel model;
-    open(model, entry("09:00:00.000", "Trace", text) + entry("09:00:01.000", "Trace", "next"));
-    QCOMPARE(model.rowCount(), 2);
-    QVERIFY(model.index(0, 3).data().toString().size() <= LogModel::ShownLimit);
-    QCOMPARE(model.LineText(0, 1 << 20).size(), 300000 + 30);
-    QCOMPARE(model.index(1, 3).data().toString(), QString("next"));
+    QFETCH(int, length);
+    QFETCH(QString, end);
+    const QByteArray empty = entry("09:00:00.000", "Trace", "");
+    const QByteArray line = empty.trimmed() + ' ' + QByteArray(length - empty.size(), 'y') + 'z';
+    QCOMPARE(line.size(), length);
+    for (QByteArray const& lineEnd : {QByteArray("\n"), QByteArray("\r\n")}) {
+        LogModel model;
+        open(model, line + lineEnd + entry("09:00:01.000", "Trace", "next") + line);
+        QCOMPARE(model.rowCount(), 3);
+        for (int row : {0, 2}) {
+            const QString shown = model.index(row, 3).data().toString();
+            QVERIFY2(shown.endsWith(end), qPrintable(shown.right(20)));
+            QVERIFY(shown.size() <= LogModel::ShownLimit);
+            QCOMPARE(model.LineText(row, LogIndex::LineLimit), QString(line));
+            QCOMPARE(model.EntryText(row, LogIndex::LineLimit), QString(line));
+        }
+        QCOMPARE(model.index(1, 3).data().toString(), QString("next"));
+    }
 }
 
 void tst_LogModel::controlCharacters()
