@@ -66,6 +66,7 @@ void LogIndex::forgetFrom(size_t line)
 {
     m_starts.resize(line);
     m_marks.resize(line);
+    m_checks.resize(line);
     m_runs.resize(1);
     if (line == 0) {
         m_runs[0] = Run();
@@ -120,6 +121,7 @@ void LogIndex::keepKnownLines()
     m_knownRuns.clear();
     m_knownStarts.clear();
     m_knownMarks.clear();
+    m_knownChecks.clear();
     if (m_runs.size() < 2)
         return;
 
@@ -129,9 +131,11 @@ void LogIndex::keepKnownLines()
         run.firstLine -= seam;
     MoveTail(m_starts, seam, m_knownStarts);
     MoveTail(m_marks, seam, m_knownMarks);
+    MoveTail(m_checks, seam, m_knownChecks);
     if (!m_lastIsComplete) {
         m_knownStarts.pop_back();
         m_knownMarks.pop_back();
+        m_knownChecks.pop_back();
     }
     while (m_knownRuns.size() > 1 && m_knownRuns.back().firstLine >= m_knownStarts.size())
         m_knownRuns.pop_back();
@@ -170,6 +174,7 @@ void LogIndex::End()
     m_knownRuns.clear();
     m_knownStarts.clear();
     m_knownMarks.clear();
+    m_knownChecks.clear();
     if (m_lineIsPartial)
         addLine(m_partialLine.constData(), m_partialLine.size(), false);
     m_hasLostSeam = m_knownSeam >= 0 && m_runs.size() == 1 && !m_isOneRun;
@@ -217,6 +222,7 @@ bool LogIndex::addLine(char const* line, int length, bool complete)
     if (m_isSeamUnchanged && m_lineStart >= m_formerEnd)
         joinRuns();
     m_marks.push_back(markOf(parts, line, std::min(length, LineLimit)));
+    m_checks.push_back(LogRows::CheckOf(line, length));
     m_starts.push_back(m_lineStart);
     if (parts.timeKey >= 0 && complete) // an incomplete line is read again
         noteTime(parts);
@@ -313,6 +319,7 @@ bool LogIndex::joinKnownLines(qint64 start)
     const size_t joint = m_starts.size();
     AppendTail(m_starts, m_knownStarts, first);
     AppendTail(m_marks, m_knownMarks, first);
+    AppendTail(m_checks, m_knownChecks, first);
     for (Run known : m_knownRuns) {
         if (known.firstLine <= first) {
             m_runs[1].firstTime = known.firstTime;
@@ -350,21 +357,42 @@ void LogIndex::noteTime(LogLineParser::Parts const& parts)
     }
 }
 
+// Whether a line from the first one of an entry on matches the text.
+bool LogIndex::isEntryMatched(size_t first, size_t end) const
+{
+    size_t line = first;
+    while (m_slowLine == 0 && (m_marks[line] & LogRows::Unmatched)) {
+        ++line;
+        if (line == end || !(m_marks[line] & LogRows::Continued))
+            return false;
+    }
+    return true;
+}
+
 LogRows LogIndex::Rows(LogFilter const& filter) const
 {
     LogRows rows;
     rows.starts.reserve(m_starts.size() + 2);
     rows.marks.reserve(m_starts.size() + 2);
+    rows.checks.reserve(m_starts.size() + 2);
     const auto addRun = [&](size_t number) {
         const bool isLast = number + 1 == m_runs.size();
         const size_t end = isLast ? m_starts.size() : m_runs[number + 1].firstLine;
+        size_t entryEnd = 0; // at most
+        bool isMatched = false;
         for (size_t line = m_runs[number].firstLine; line < end; ++line) {
-            const quint8 mark = m_marks[line];
+            quint8 mark = m_marks[line];
+            if (!(mark & LogRows::Continued)) {
+                entryEnd = LogRows::BeginsEntry(mark) ? line + MaximumEntryLines : line + 1;
+                isMatched = isEntryMatched(line, std::min(entryEnd, end));
+            } else if (line >= entryEnd) {
+                mark |= LogRows::Alone;
+                isMatched = isEntryMatched(line, line + 1);
+            }
             const auto severity = static_cast<LogEntry::Severity>(mark & LogRows::SeverityMask);
-            const bool isMatched = m_slowLine > 0 || !(mark & LogRows::Unmatched);
             if (!isMatched || !filter.Shows(severity))
                 continue;
-            rows.add(m_starts[line], mark);
+            rows.add(m_starts[line], mark, m_checks[line]);
             if (LogSeverities::IsProblem(severity) && !(mark & LogRows::Continued))
                 ++rows.problems;
         }
@@ -381,6 +409,8 @@ LogRows LogIndex::Rows(LogFilter const& filter) const
             rows.add(LogRows::NewestHeading, LogEntry::None);
     }
     addRun(0);
+    rows.complete = completeOffset();
+    rows.end = m_position;
     return rows;
 }
 

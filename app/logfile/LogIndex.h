@@ -68,7 +68,8 @@ public:
     qint64 completeOffset() const;
 
     /// The lines that match a filter, whose text must be that of the filter the index was made
-    /// with.
+    /// with. An entry is shown with all of its lines if one of them matches. Lines beyond
+    /// MaximumEntryLines, and lines that continue no entry, are shown or not by themselves.
     LogRows Rows(LogFilter const& filter) const;
 
     /// Where the next pass will begin. Everything before it is final.
@@ -96,8 +97,12 @@ public:
     /// Whether any entry has an elapsed time.
     bool hasElapsed() const { return m_hasElapsed; }
 
-    /// How far into a line the text filter looks, in bytes.
-    static constexpr int LineLimit = 64 * 1024;
+    /// How many lines are shown or hidden together.
+    static constexpr size_t MaximumEntryLines = 1000;
+
+    /// How far into a line the text filter looks, in bytes. Whoever shows or copies a line may
+    /// stop there, too: such a file is hardly a log.
+    static constexpr int LineLimit = 64 * 1024 * 1024;
 
 private:
     struct Run
@@ -108,6 +113,7 @@ private:
         bool hasDate = false;
     };
 
+    bool isEntryMatched(size_t first, size_t end) const;
     size_t resumeLine() const;
     void forgetFrom(size_t line);
     bool addLine(char const* line, int length, bool complete);
@@ -127,6 +133,7 @@ private:
 
     std::vector<qint64> m_starts;
     std::vector<quint8> m_marks;
+    std::vector<quint16> m_checks;
     std::vector<Run> m_runs; // newest first, as in the file
     bool m_hasElapsed = false;
     size_t m_slowLine = 0;
@@ -158,6 +165,7 @@ private:
     bool m_isSeamUnchanged = false;
     std::vector<qint64> m_knownStarts;
     std::vector<quint8> m_knownMarks;
+    std::vector<quint16> m_knownChecks;
     std::vector<Run> m_knownRuns;
 };
 

@@ -5,16 +5,19 @@
 
 #include "app/logfile/LogEntry.h"
 
+#include <QHashFunctions>
 #include <QtGlobal>
 
+#include <algorithm>
 #include <vector>
 
 namespace Velocor {
 
 /// The rows of the log view, oldest first: where each starts in the file, and what it is.
 ///
-/// The texts stay in the file, to keep memory use low. If there are entries of earlier runs, a
-/// heading row precedes them and another one precedes the newest run.
+/// The texts stay in the file, to keep memory use low. A check tells whether a line is still the
+/// one that was read when it is read again, because a log overwrites its file. If there are entries
+/// of earlier runs, a heading row precedes them and another one precedes the newest run.
 struct LogRows
 {
     /// Start values of the heading rows, which no line can have.
@@ -27,19 +30,45 @@ struct LogRows
     static constexpr quint8 Continued = 0x08; ///< not an entry; has the severity of the entry above
     static constexpr quint8 Torn = 0x10;      ///< its first part was overwritten
     static constexpr quint8 Timed = 0x20;     ///< its time is known
-    static constexpr quint8 Unmatched = 0x40; ///< does not match the text filter
+    static constexpr quint8 Unmatched = 0x40; ///< does not match the text filter itself
+    static constexpr quint8 Alone = 0x80;     ///< continued, but not shown along with its entry
 
     std::vector<qint64> starts;
     std::vector<quint8> marks;
-    size_t earlier = 0;  ///< rows of earlier runs, including their heading; 0 if none
-    size_t problems = 0; ///< entries that are warnings or worse
+    std::vector<quint16> checks; ///< see CheckOf(); 0 for headings
+    qint64 complete = 0;         ///< a line that starts here or later has no line end yet
+    qint64 end = 0;              ///< where the file ended
+    size_t earlier = 0;          ///< rows of earlier runs, including their heading; 0 if none
+    size_t problems = 0;         ///< entries that are warnings or worse
 
     size_t size() const { return starts.size(); }
 
-    void add(qint64 start, quint8 mark)
+    void add(qint64 start, quint8 mark, quint16 check = 0)
     {
         starts.push_back(start);
         marks.push_back(mark);
+        checks.push_back(check);
+    }
+
+    /// Whether a line with this mark is the first one of an entry. The lines that follow it without
+    /// a stamp, those with the mark Continued, belong to the same entry.
+    static bool BeginsEntry(quint8 mark)
+    {
+        return !(mark & (Continued | Torn)) &&
+               ((mark & Timed) || (mark & SeverityMask) != LogEntry::None);
+    }
+
+    /// The start of a line that a check covers, in bytes.
+    static constexpr int CheckedLength = 4096;
+
+    /// A number that differs for different lines, except for one pair in 65,536. Valid in this
+    /// process.
+    ///
+    /// @param line  without its line end
+    static quint16 CheckOf(char const* line, int length)
+    {
+        const auto checked = static_cast<size_t>(std::min(length, CheckedLength));
+        return static_cast<quint16>(qHashBits(line, checked));
     }
 
     LogEntry::Severity severity(size_t row) const

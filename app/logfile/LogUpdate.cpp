@@ -11,7 +11,7 @@ namespace {
 
 bool SameRow(LogRows const& a, size_t i, LogRows const& b, size_t j)
 {
-    return a.starts[i] == b.starts[j] && a.marks[i] == b.marks[j];
+    return a.starts[i] == b.starts[j] && a.marks[i] == b.marks[j] && a.checks[i] == b.checks[j];
 }
 
 } // namespace

@@ -129,10 +129,10 @@ LogRows RowsOf(QFile& file)
 QString LineAt(QFile& file, qint64 start)
 {
     file.seek(start);
-    QByteArray line = file.read(LogIndex::LineLimit + 1);
+    QByteArray line = file.read(SystemReport::LineLimit + 1);
     const int end = line.indexOf('\n');
-    const bool isCut = end < 0 && line.size() > LogIndex::LineLimit;
-    line.truncate(end < 0 ? int(LogIndex::LineLimit) : end);
+    const bool isCut = end < 0 && line.size() > SystemReport::LineLimit;
+    line.truncate(end < 0 ? int(SystemReport::LineLimit) : end);
     return QString::fromLatin1(line) + (isCut ? QString(QChar(0x2026)) : QString());
 }
 

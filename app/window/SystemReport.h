@@ -21,11 +21,14 @@ public:
     /// older ones follow in the file. The whole file is read to find them. If it has fewer lines,
     /// the last ones of the older files precede them.
     ///
-    /// Lines longer than LogIndex::LineLimit bytes are cut and end with an ellipsis.
+    /// Lines longer than LineLimit bytes are cut and end with an ellipsis.
     static QString LogTail(int lines);
 
     /// The facts and the end of the log, with headings.
     static QString Whole(QString const& settingsFile);
+
+    /// The longest line that LogTail() includes in full, in bytes.
+    static constexpr int LineLimit = 64 * 1024;
 
     /// The number of log lines in Whole().
     static constexpr int TailLines = 200;

@@ -81,12 +81,17 @@ private slots:
     void filter();
     void continuedLinesGoWithTheirEntry();
     void textFilter();
+    void textFilterOfLongLines();
+    void textFilterOfEntries_data();
+    void textFilterOfEntries();
+    void longEntry();
     void problems();
     void passesOverAWritingRun_data();
     void passesOverAWritingRun();
     void growthAtTheEndMakesOneRun();
     void readsOnlyWhatIsNew();
     void incompleteLastLine();
+    void checks();
     void incompleteEntryCountsOnce();
     void olderEntryOverATornOne();
     void restartOfARunWithoutTimes();
@@ -308,14 +313,86 @@ void tst_LogIndex::textFilter()
     LogIndex index{LogLineParser(), filter};
     Pass(index, file, 100);
     QCOMPARE(Texts(index, file, filter).size(), 11);
+}
 
-    // A match past the limit of a very long line is not found; one before it is.
-    const QByteArray longLine = entry("09:00:00.000", "Trace", QString(LogIndex::LineLimit, 'x'));
-    LogFilter longFilter;
-    QVERIFY(longFilter.SetText("xxx", false, true));
-    LogIndex longIndex{LogLineParser(), longFilter};
-    Pass(longIndex, longLine, 1000);
-    QCOMPARE(longIndex.Rows(longFilter).size(), size_t(1));
+// Read in many pieces, and searched as a whole.
+void tst_LogIndex::textFilterOfLongLines()
+{
+    const QString text(3000000, 'x');
+    const QByteArray file = entry("09:00:00.000", "Trace", text + "needle") +
+                            entry("09:00:01.000", "Trace", text) +
+                            entry("09:00:02.000", "Trace", "needle" + text + "needle").trimmed();
+    LogFilter filter;
+    QVERIFY(filter.SetText("xneedle", false, true));
+    LogIndex index{LogLineParser(), filter};
+    Pass(index, file, 4099);
+    QCOMPARE(index.size(), size_t(3));
+    const LogRows rows = index.Rows(filter);
+    QCOMPARE(rows.size(), size_t(2));
+    QCOMPARE(rows.starts[1], qint64(file.lastIndexOf('\n') + 1));
+}
+
+void tst_LogIndex::textFilterOfEntries_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QStringList>("rows"); // their last words
+
+    const auto row = [](char const* name, char const* text, QStringList const& rows) {
+        QTest::newRow(name) << QString(text) << rows;
+    };
+    row("a line before any entry is on its own", "before", {"before"});
+    row("so is a line that continues it", "more", {"more"});
+    row("the first line of an entry", "request", {"request", "stack", "trace"});
+    row("a line in an entry", "stack", {"request", "stack", "trace"});
+    row("the last line of an entry", "trace", {"request", "stack", "trace"});
+    row("two lines of an entry", "ac", {"request", "stack", "trace"});
+    row("an entry of one line", "single", {"single"});
+    row("an entry without a severity", "tail", {"plain", "tail"});
+    row("an entry without a time", "after", {"started", "after"});
+    row("several entries", "s", {"request", "stack", "trace", "single", "started", "after"});
+    row("nothing", "nowhere", {});
+}
+
+void tst_LogIndex::textFilterOfEntries()
+{
+    QFETCH(QString, text);
+    QFETCH(QStringList, rows);
+    const QByteArray file = "before\nmore\n" + entry("09:00:00.000", "Error", "a request") +
+                            " at stack\n trace\n" + entry("09:00:01.000", "Warning", "single") +
+                            entry("09:00:02.000", "", "plain") + "tail\n" +
+                            "7 Notification started\nafter\n";
+    LogFilter filter;
+    QVERIFY(filter.SetText(text, false, true));
+    LogIndex index{LogLineParser(), filter};
+    Pass(index, file, 10);
+    QStringList words;
+    const QStringList lines = Texts(index, file, filter);
+    for (QString const& line : lines)
+        words.append(line.section(' ', -1));
+    QCOMPARE(words, rows);
+}
+
+// Only its first lines are shown together; a file without any other stamp would be shown as a
+// whole.
+void tst_LogIndex::longEntry()
+{
+    const int lines = int(LogIndex::MaximumEntryLines) + 5;
+    QByteArray file = entry("09:00:00.000", "Error", "first");
+    for (int line = 2; line <= lines; ++line)
+        file += QByteArray::number(line) + "th\n";
+    LogFilter filter;
+    QVERIFY(filter.SetText("999th", false, true));
+    LogIndex index{LogLineParser(), filter};
+    Pass(index, file, 4096);
+    QCOMPARE(index.Rows(filter).size(), LogIndex::MaximumEntryLines);
+
+    QVERIFY(filter.SetText("1001th", false, true));
+    LogIndex other{LogLineParser(), filter};
+    Pass(other, file, 4096);
+    const LogRows rows = other.Rows(filter);
+    QCOMPARE(Texts(other, file, filter), QStringList("1001th"));
+    QCOMPARE(uint(rows.marks[0]), uint(LogEntry::Error | LogRows::Continued | LogRows::Alone));
+    QCOMPARE(rows.problems, size_t(0));
 }
 
 void tst_LogIndex::problems()
@@ -405,6 +482,28 @@ void tst_LogIndex::readsOnlyWhatIsNew()
     QVERIFY(!second.Feed(rest.constData(), rest.size()));
     second.End();
     QCOMPARE(Texts(second, overwritten), TextsOf(overwritten));
+}
+
+// They cover what a line has in the file, and the last line as far as it was written.
+void tst_LogIndex::checks()
+{
+    const QByteArray longLine(LogRows::CheckedLength, 'x');
+    const QByteArray file = "a\nb\r\na\n\n" + longLine + "\r\n" + longLine + "yyy\nc";
+    LogIndex index;
+    Pass(index, file, 5);
+    const LogRows rows = index.Rows(LogFilter());
+    QCOMPARE(rows.size(), size_t(7));
+    for (size_t row = 0; row < rows.size(); ++row) {
+        const QByteArray text = file.mid(int(rows.starts[row])).split('\n').first();
+        const int length = text.endsWith('\r') ? text.size() - 1 : text.size();
+        QCOMPARE(rows.checks[row], LogRows::CheckOf(text.constData(), length));
+    }
+    QCOMPARE(rows.checks[0], rows.checks[2]);
+    QVERIFY(rows.checks[0] != rows.checks[1]);
+    QVERIFY(rows.checks[0] != rows.checks[3]);
+    QCOMPARE(rows.checks[4], rows.checks[5]); // only the start counts
+    QCOMPARE(rows.complete, qint64(file.size() - 1));
+    QCOMPARE(rows.end, qint64(file.size()));
 }
 
 void tst_LogIndex::incompleteLastLine()

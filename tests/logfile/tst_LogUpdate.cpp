@@ -15,10 +15,8 @@ std::shared_ptr<LogRows> Rows(char const* earlier, char const* newest)
 {
     auto rows = std::make_shared<LogRows>();
     const QByteArray all = QByteArray(earlier) + newest;
-    for (char letter : all) {
-        rows->starts.push_back(letter);
-        rows->marks.push_back(0);
-    }
+    for (char letter : all)
+        rows->add(letter, 0);
     rows->earlier = qstrlen(earlier);
     return rows;
 }
@@ -33,6 +31,7 @@ private slots:
     void compare_data();
     void compare();
     void marksCount();
+    void checksCount();
 };
 
 // The numbers are: the position of the change, how many rows were removed and added there, and how
@@ -95,6 +94,18 @@ void tst_LogUpdate::marksCount()
     update.Compare(*Rows("", "xy"));
     QVERIFY(!update.isReset);
     QCOMPARE(update.changedTail, size_t(1));
+}
+
+// A line may take the place of one that is as long.
+void tst_LogUpdate::checksCount()
+{
+    LogUpdate update;
+    const auto after = Rows("", "xyz");
+    after->checks[1] = 1;
+    update.rows = after;
+    update.Compare(*Rows("", "xyz"));
+    QVERIFY(!update.isReset);
+    QCOMPARE(update.changedTail, size_t(2));
 }
 
 QTEST_APPLESS_MAIN(tst_LogUpdate)

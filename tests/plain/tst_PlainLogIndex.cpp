@@ -139,7 +139,8 @@ public:
             Run& run = runs.back();
             if (runs.size() > 1 && line.isTimed)
                 older.insert(line.start, line.text);
-            Row row{line.start, LogEntry::None};
+            Row row{line.start, LogEntry::None,
+                    LogRows::CheckOf(line.text.constData(), line.text.size()), line.isEntry};
             if (line.isEntry)
                 row.mark = quint8(line.severity);
             else if (!run.rows.empty())
@@ -171,6 +172,8 @@ private:
     {
         qint64 start;
         quint8 mark;
+        quint16 check;
+        bool isEntry;
     };
 
     struct Run
@@ -206,6 +209,7 @@ private:
             Row torn = run.rows.back();
             run.rows.pop_back();
             torn.mark = (torn.mark & LogRows::Unmatched) | LogRows::Torn | LogEntry::None;
+            torn.isEntry = false;
             next.rows.push_back(torn);
         }
         runs.push_back(next);
@@ -219,6 +223,7 @@ private:
             if (rows.size() > 0) {
                 rows.starts.insert(rows.starts.begin(), LogRows::EarlierHeading);
                 rows.marks.insert(rows.marks.begin(), LogEntry::None);
+                rows.checks.insert(rows.checks.begin(), 0);
                 rows.earlier = rows.size();
                 rows.add(LogRows::NewestHeading, LogEntry::None);
             }
@@ -226,15 +231,33 @@ private:
         add(runs.front(), filter);
     }
 
+    // An entry goes with the lines that continue it; other lines are on their own.
     void add(Run const& run, LogFilter const& filter)
     {
-        for (Row const& row : run.rows) {
-            const auto severity = LogEntry::Severity(row.mark & LogRows::SeverityMask);
-            if ((row.mark & LogRows::Unmatched) || !filter.Shows(severity))
-                continue;
-            rows.add(row.start, row.mark);
-            const bool isProblem = severity >= LogEntry::Warning && severity <= LogEntry::Fatal;
-            rows.problems += isProblem && !(row.mark & LogRows::Continued);
+        std::vector<std::vector<Row>> groups;
+        for (Row row : run.rows) {
+            const bool isContinued = row.mark & LogRows::Continued;
+            const bool hasEntry = !groups.empty() && groups.back().front().isEntry &&
+                                  groups.back().size() < LogIndex::MaximumEntryLines;
+            if (isContinued && !hasEntry)
+                row.mark |= LogRows::Alone;
+            if (isContinued && hasEntry)
+                groups.back().push_back(row);
+            else
+                groups.push_back({row});
+        }
+        for (std::vector<Row> const& group : groups) {
+            const bool isMatched = std::any_of(group.begin(), group.end(), [](Row const& row) {
+                return !(row.mark & LogRows::Unmatched);
+            });
+            for (Row const& row : group) {
+                const auto severity = LogEntry::Severity(row.mark & LogRows::SeverityMask);
+                if (!isMatched || !filter.Shows(severity))
+                    continue;
+                rows.add(row.start, row.mark, row.check);
+                const bool isProblem = severity >= LogEntry::Warning && severity <= LogEntry::Fatal;
+                rows.problems += isProblem && !(row.mark & LogRows::Continued);
+            }
         }
     }
 
@@ -254,7 +277,8 @@ QString Text(LogRows const& rows)
 bool IsSame(LogRows const& left, LogRows const& right)
 {
     return left.starts == right.starts && left.marks == right.marks &&
-           left.earlier == right.earlier && left.problems == right.problems;
+           left.checks == right.checks && left.earlier == right.earlier &&
+           left.problems == right.problems;
 }
 
 // A file that a log writes, and what its reader has set.
@@ -583,7 +607,7 @@ private:
             LogRows shown;
             const auto add = [&](LogRows const& rows, size_t from, size_t to) {
                 for (size_t i = from; i < to; ++i)
-                    shown.add(rows.starts[i], rows.marks[i]);
+                    shown.add(rows.starts[i], rows.marks[i], rows.checks[i]);
             };
             add(before, 0, update.changeAt);
             add(after, update.changeAt, update.changeAt + update.inserted);

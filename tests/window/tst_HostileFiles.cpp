@@ -881,7 +881,7 @@ void tst_HostileFiles::reportOfLongLines()
     const QStringList lines = SystemReport::LogTail(10).split('\n');
     QCOMPARE(lines.size(), 4);
     QCOMPARE(lines.at(0) + '\n', QString(whole));
-    QCOMPARE(lines.at(1), QString(cut.left(LogIndex::LineLimit)) + QChar(0x2026));
+    QCOMPARE(lines.at(1), QString(cut.left(SystemReport::LineLimit)) + QChar(0x2026));
     QCOMPARE(lines.at(2) + '\n', QString(last));
 }
 

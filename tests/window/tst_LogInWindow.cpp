@@ -64,6 +64,8 @@ private slots:
     void filterByExpression();
     void filterBySeverity();
     void pauses();
+    void overwrittenWhilePaused();
+    void entriesOfSeveralLines();
     void copiesLines();
     void copiesFromTheMenu();
     void problems();
@@ -273,6 +275,85 @@ void tst_LogInWindow::pauses()
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
 }
 
+// The program is started again, and its log writes over the lines that are shown.
+void tst_LogInWindow::overwrittenWhilePaused()
+{
+    const QByteArray log = run(200, QTime(9, 0), "x");
+    const WindowTest test(log);
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 200, Patience);
+    LogView* view = View(*window);
+    view->setFocus();
+    QTest::keyClick(view, Qt::Key_P, Qt::ControlModifier | Qt::ShiftModifier);
+    QFile file(test.logFile());
+    QVERIFY(file.open(QIODevice::ReadWrite));
+    file.write(run(100, QTime(17, 0), "another"));
+    file.close();
+
+    auto const* pane = Child<QPlainTextEdit>(window.get(), "Full text of the current line");
+    const QStringList lines = QString(log).split('\n');
+    const QString gone = "This line is no longer in the file";
+    int seen = 0;
+    int goneRows = 0;
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::NoModifier, RowCentre(view, 199));
+    while (seen < 60 && view->currentIndex().row() != 0) {
+        QTest::keyClick(view, Qt::Key_PageUp);
+        QTest::qWait(1); // paint
+        const int row = view->currentIndex().row();
+        QVERIFY(pane->toPlainText() == lines[row] || pane->toPlainText() == gone);
+        QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
+        QCOMPARE(QGuiApplication::clipboard()->text(), pane->toPlainText() + '\n');
+        goneRows += pane->toPlainText() == gone;
+        ++seen;
+    }
+    QVERIFY(seen > 5);
+    QVERIFY(goneRows > 0 && goneRows < seen);
+
+    QTest::keyClick(view, Qt::Key_P, Qt::ControlModifier | Qt::ShiftModifier);
+    QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) != 200, Patience);
+    const LogModel* model = Panel(*window)->model();
+    QCOMPARE(model->index(Rows(*window) - 1, 3).data().toString(), QString("another 99"));
+    for (int row = 0; row < Rows(*window); ++row)
+        QVERIFY(!model->IsGone(row));
+}
+
+// Filter, detail pane, copy and the search for problems work on the entry, not on its line.
+void tst_LogInWindow::entriesOfSeveralLines()
+{
+    const QByteArray first =
+        entry("09:00:00.000", "Error", "request failed") + "  at one\n  at two\n";
+    const QByteArray second = entry("09:00:02.000", "Error", "once more") + "  at three\n";
+    const WindowTest test(first + entry("09:00:01.000", "Trace", "between") + second);
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 6, Patience);
+    LogView* view = View(*window);
+    auto const* pane = Child<QPlainTextEdit>(window.get(), "Full text of the current line");
+
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::NoModifier, RowCentre(view, 2));
+    QCOMPARE(pane->toPlainText() + '\n', QString(first));
+    QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
+    QCOMPARE(QGuiApplication::clipboard()->text(), QString(first));
+    QCOMPARE(window->statusBar()->currentMessage(), QString("3 lines copied"));
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::ShiftModifier, RowCentre(view, 4));
+    QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
+    QCOMPARE(QGuiApplication::clipboard()->text().toLatin1(), TestFiles::read(test.logFile()));
+
+    QTest::keyClick(view, Qt::Key_F8);
+    QCOMPARE(view->currentIndex().row(), 0); // from the second error around
+    QTest::keyClick(view, Qt::Key_Down);
+    QTest::keyClick(view, Qt::Key_F8);
+    QCOMPARE(view->currentIndex().row(), 4);
+    QTest::keyClick(view, Qt::Key_Down);
+    QTest::keyClick(view, Qt::Key_F8, Qt::ShiftModifier);
+    QCOMPARE(view->currentIndex().row(), 0);
+
+    auto* field = Child<QLineEdit>(window.get(), "Filter by text");
+    field->setFocus();
+    QTest::keyClicks(field, "at two");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
+    QCOMPARE(pane->toPlainText() + '\n', QString(first));
+}
+
 void tst_LogInWindow::copiesLines()
 {
     const QByteArray log = run(20, QTime(9, 0), "x");
@@ -437,16 +518,20 @@ void tst_LogInWindow::slowExpression()
     QVERIFY(!error->isVisible());
 }
 
+// However long it is, all of it is in the pane and copied.
 void tst_LogInWindow::currentLine()
 {
-    const QString text(3000, 'y');
-    const WindowTest test(entry("09:00:00.000", "Trace", text + " end"));
+    const QByteArray log = entry("09:00:00.000", "Trace", QString(300000, 'y') + " end");
+    const WindowTest test(log);
     const auto window = WindowTest::show();
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
-    QTest::mouseClick(View(*window)->viewport(), Qt::LeftButton, Qt::NoModifier,
-                      RowCentre(View(*window), 0));
+    LogView* view = View(*window);
+    QVERIFY(view->model()->index(0, 3).data().toString().endsWith("yy\u2026 (300 kB)"));
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::NoModifier, RowCentre(view, 0));
     auto const* line = Child<QPlainTextEdit>(window.get(), "Full text of the current line");
-    QVERIFY(line->toPlainText().endsWith("yyy end"));
+    QCOMPARE(line->toPlainText() + '\n', QString(log));
+    QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
+    QCOMPARE(QGuiApplication::clipboard()->text(), QString(log));
 }
 
 void tst_LogInWindow::olderFiles()

@@ -5,6 +5,7 @@
 
 #include "app/logfile/LogScanner.h"
 #include "app/logfile/LogSeverities.h"
+#include "app/window/widgets/FileSizeText.h"
 #include "app/window/widgets/PlainText.h"
 #include "app/window/widgets/SeverityIcons.h"
 
@@ -29,9 +30,25 @@ QString OnOneLine(QString text)
     return text;
 }
 
+// A longer line is measured no further: rows are read while they are painted.
+constexpr qint64 MeasuredLength = 4 * 1000 * 1000; // bytes
+
+// Follows what is shown of a line.
+QString Ellipsis(qint64 length)
+{
+    const QString size = FileSizeText(length);
+    return QChar(0x2026) + (length < MeasuredLength ? LogModel::tr(" (%1)").arg(size)
+                                                    : LogModel::tr(" (more than %1)").arg(size));
+}
+
+QString GoneText()
+{
+    return LogModel::tr("This line is no longer in the file");
+}
+
 } // namespace
 
-LogModel::LogModel(QObject* parent) : QAbstractTableModel(parent), m_entries(1000)
+LogModel::LogModel(QObject* parent) : QAbstractTableModel(parent), m_lines(1000)
 {
     m_state.rows = std::make_shared<LogRows>();
     m_pollTimer.setInterval(PollInterval);
@@ -71,6 +88,7 @@ void LogModel::Open(QString const& path, LogLineParser const& parser, bool isCur
     m_path = path;
     m_parser = parser;
     m_isCurrent = isCurrent;
+    m_lines.clear();
     Reload();
 }
 
@@ -101,6 +119,7 @@ void LogModel::SetPaused(bool paused)
     m_paused = paused;
     if (paused) {
         m_pollTimer.stop();
+        openFile(); // so that a rotation does not take the lines away
     } else if (m_scanner) {
         m_pollTimer.start();
         poll();
@@ -121,11 +140,17 @@ void LogModel::take(LogUpdate const& update)
         return;
     const bool wasReading = m_reading;
     m_reading = false;
-    m_entries.clear();
-    if (update.isReset || wasReading)
+    if (m_paused && !wasReading) {
+        m_hasDropped = true;
+        return;
+    }
+    if (!m_paused)
+        m_lines.clear();
+    if (update.isReset || wasReading || m_hasDropped)
         reset(update);
-    else if (!m_paused)
+    else
         applyChange(update);
+    m_hasDropped = false;
     if (wasReading)
         Q_EMIT progressed(100);
     Q_EMIT refreshed();
@@ -176,6 +201,8 @@ void LogModel::applyChange(LogUpdate const& update)
 int LogModel::FindProblem(int row, int step) const
 {
     LogRows const& rows = *m_state.rows;
+    if (row >= 0 && row < m_rowCount)
+        row = EntryRows(row).first;
     for (row += step; row >= 0 && row < m_rowCount; row += step) {
         const auto position = static_cast<size_t>(row);
         if (LogSeverities::IsProblem(rows.severity(position)) &&
@@ -205,47 +232,160 @@ bool LogModel::isHeading(int row) const
     return m_state.rows->starts[static_cast<size_t>(row)] < 0;
 }
 
+bool LogModel::openFile() const
+{
+    if (m_file.isOpen())
+        return true;
+    m_file.setFileName(m_path);
+    return QFileInfo(m_path).isFile() && m_file.open(QIODevice::ReadOnly | QIODevice::Unbuffered);
+}
+
+// Up to `limit` bytes of a line, without its line end. Null if the file cannot be read.
+QByteArray LogModel::readBytes(int row, qint64 limit) const
+{
+    LogRows const& rows = *m_state.rows;
+    const qint64 start = rows.starts[static_cast<size_t>(row)];
+    if (!openFile() || !m_file.seek(start))
+        return QByteArray();
+
+    // A last line may have got longer since.
+    const qint64 most = limit + 2; // with the line end
+    const qint64 length = start < rows.complete ? most : std::min(most, rows.end - start);
+    const qint64 first = std::min<qint64>(length, 1024);
+    QByteArray bytes = m_file.read(first);
+    int end = bytes.indexOf('\n');
+    if (end < 0 && bytes.size() == first && length > first) {
+        bytes += m_file.read(length - first);
+        end = bytes.indexOf('\n', static_cast<int>(first));
+    }
+    if (end >= 0)
+        bytes.truncate(end);
+    if (bytes.endsWith('\r'))
+        bytes.chop(1);
+    bytes.truncate(static_cast<int>(std::min<qint64>(limit, bytes.size())));
+    return bytes;
+}
+
+// The length of a line in bytes, or MeasuredLength if it has at least that.
+qint64 LogModel::lengthOf(int row) const
+{
+    LogRows const& rows = *m_state.rows;
+    const qint64 start = rows.starts[static_cast<size_t>(row)];
+    const qint64 most =
+        start < rows.complete ? MeasuredLength : std::min(MeasuredLength, rows.end - start);
+    qint64 length = 0;
+    bool hasReturn = false;
+    if (!openFile() || !m_file.seek(start))
+        return 0;
+    while (length < most) {
+        const QByteArray bytes = m_file.read(std::min<qint64>(most - length, 1 << 16));
+        const int found = bytes.indexOf('\n');
+        const int end = found < 0 ? bytes.size() : found;
+        hasReturn = end > 0 ? bytes[end - 1] == '\r' : hasReturn;
+        length += end;
+        if (found >= 0 || bytes.isEmpty())
+            break;
+    }
+    return hasReturn ? length - 1 : length;
+}
+
+LogModel::Line LogModel::readLine(int row) const
+{
+    Line line;
+    const auto position = static_cast<size_t>(row);
+    line.start = readBytes(row, LogRows::CheckedLength);
+    line.check = m_state.rows->checks[position];
+    line.isTorn = m_state.rows->marks[position] & LogRows::Torn;
+    line.isGone = LogRows::CheckOf(line.start.constData(), line.start.size()) != line.check;
+    if (line.isGone)
+        line.entry.message = GoneText();
+    else if (line.isTorn)
+        line.entry.message = QString::fromLatin1(line.start);
+    else
+        line.entry = m_parser.Parse(line.start);
+    line.entry.message = OnOneLine(line.entry.message);
+    if (line.isGone || line.start.size() < LogRows::CheckedLength)
+        return line;
+    const qint64 length = lengthOf(row);
+    if (length > LogRows::CheckedLength)
+        line.entry.message += Ellipsis(length);
+    return line;
+}
+
+LogModel::Line const* LogModel::knownLine(int row) const
+{
+    const auto position = static_cast<size_t>(row);
+    Line const* known = m_lines.object(m_state.rows->starts[position]);
+    const bool isTorn = m_state.rows->marks[position] & LogRows::Torn;
+    return known && known->check == m_state.rows->checks[position] && known->isTorn == isTorn
+               ? known
+               : nullptr;
+}
+
+LogModel::Line const& LogModel::line(int row) const
+{
+    if (Line const* known = knownLine(row))
+        return *known;
+    auto* read = new Line(readLine(row));
+    m_lines.insert(m_state.rows->starts[static_cast<size_t>(row)], read);
+    return *read;
+}
+
+// What is known is not read again, because the line may be gone by now. But many lines that are not
+// shown must not take the place of those that are.
 QString LogModel::LineText(int row, int limit) const
 {
     if (row < 0 || row >= m_rowCount || isHeading(row))
         return QString();
-    if (!m_file.isOpen()) {
-        m_file.setFileName(m_path);
-        if (!QFileInfo(m_path).isFile() ||
-            !m_file.open(QIODevice::ReadOnly | QIODevice::Unbuffered))
-            return QString();
-    }
-    if (!m_file.seek(m_state.rows->starts[static_cast<size_t>(row)]))
-        return QString();
-
-    QByteArray line = m_file.read(std::min(limit, 1024));
-    int end = line.indexOf('\n');
-    if (end < 0 && line.size() == 1024 && limit > 1024) {
-        line += m_file.read(limit - 1024);
-        end = line.indexOf('\n');
-    }
-    if (end >= 0)
-        line.truncate(end);
-    if (line.endsWith('\r'))
-        line.chop(1);
-    return QString::fromLatin1(line);
+    Line const* known = knownLine(row);
+    const Line line = known ? *known : readLine(row);
+    if (line.isGone)
+        return line.entry.message;
+    if (line.start.size() < LogRows::CheckedLength || limit <= LogRows::CheckedLength)
+        return QString::fromLatin1(line.start.left(limit));
+    const QByteArray whole = readBytes(row, limit);
+    return whole.startsWith(line.start) ? QString::fromLatin1(whole) : GoneText();
 }
 
-LogEntry const& LogModel::entry(int row) const
+QPair<int, int> LogModel::EntryRows(int row) const
 {
-    const qint64 start = m_state.rows->starts[static_cast<size_t>(row)];
-    if (LogEntry const* known = m_entries.object(start))
-        return *known;
+    std::vector<quint8> const& marks = m_state.rows->marks;
+    const auto continues = [&](int other) {
+        const quint8 mark = marks[static_cast<size_t>(other)];
+        return (mark & LogRows::Continued) && !(mark & LogRows::Alone);
+    };
+    int first = row;
+    while (first > 0 && continues(first))
+        --first;
+    int last = row;
+    while (last + 1 < m_rowCount && continues(last + 1))
+        ++last;
+    return qMakePair(first, last);
+}
 
-    auto* found = new LogEntry;
-    const QString line = LineText(row, ShownLimit);
-    if (m_state.rows->marks[static_cast<size_t>(row)] & LogRows::Torn)
-        found->message = line;
-    else
-        *found = m_parser.Parse(line.toLatin1());
-    found->message = OnOneLine(found->message);
-    m_entries.insert(start, found);
-    return *found;
+QString LogModel::EntryText(int row, int limit) const
+{
+    if (row < 0 || row >= m_rowCount)
+        return QString();
+    const QPair<int, int> rows = EntryRows(row);
+    QString text;
+    for (int next = rows.first; next <= rows.second; ++next) {
+        const int left = limit - text.size();
+        const QString line = LineText(next, left + 1);
+        text += line.left(left) + QLatin1Char('\n');
+        if (line.size() > left)
+            return text + tr("(only the first %1 are shown)").arg(FileSizeText(limit));
+    }
+    text.chop(1);
+    return text;
+}
+
+bool LogModel::IsGone(int row) const
+{
+    if (row < 0 || row >= m_rowCount || isHeading(row))
+        return false;
+    Line const* known = knownLine(row);
+    return known ? known->isGone : readLine(row).isGone;
 }
 
 QString LogModel::headingText(int row) const

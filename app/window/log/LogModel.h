@@ -22,7 +22,9 @@ class LogScanner;
 /// first.
 ///
 /// Lines are read from the file when a view needs them; all searching is done by a LogScanner in
-/// another thread. Heading rows separate the runs. GUI thread.
+/// another thread. A line that is not in the file anymore, because the log has overwritten it, is
+/// shown as gone until the next update; what is in its place is not. Heading rows separate the
+/// runs. GUI thread.
 ///
 ///     LogModel model;
 ///     model.Open(TorkLog::logger()->newLogFileName(), LogLineParser());
@@ -54,12 +56,13 @@ public:
     void SetFilter(LogFilter const& filter);
     LogFilter const& filter() const { return m_filter; }
 
-    /// While the model is paused, it does not check for changes.
+    /// While the model is paused, it does not check for changes: its rows remain those of that
+    /// moment. Whether their lines are still in the file is found when they are read.
     void SetPaused(bool paused);
     bool isPaused() const { return m_paused; }
 
-    /// The nearest row after (step 1) or before (step -1) `row` that is a warning or worse;
-    /// -1 if there is none.
+    /// The first row of the nearest entry after (step 1) or before (step -1) that of `row` that is
+    /// a warning or worse; -1 if there is none.
     int FindProblem(int row, int step) const;
 
     /// Where the line of a row starts in the file; negative for a heading.
@@ -69,10 +72,25 @@ public:
     /// there are no lines.
     int RowNear(qint64 start) const;
 
-    /// The line of a row, as stored in the file, without its line end; empty for a heading.
+    /// The line of a row, as stored in the file, without its line end; empty for a heading. If the
+    /// line is gone, a sentence that says so.
     ///
     /// @param limit  maximum number of bytes to read
     QString LineText(int row, int limit) const;
+
+    /// The first and the last row of the entry that a row belongs to: its first line and the lines
+    /// that follow without a stamp. Of a line that belongs to no entry, and of a heading, the row
+    /// itself.
+    QPair<int, int> EntryRows(int row) const;
+
+    /// The lines of the entry that a row belongs to, as LineText() gives them, with line ends
+    /// between them.
+    ///
+    /// @param limit  maximum number of bytes to show; if there is more, a last line says so
+    QString EntryText(int row, int limit) const;
+
+    /// Whether the line of a row was in the file when the row was made, but is no longer there.
+    bool IsGone(int row) const;
 
     QString const& path() const { return m_path; }
     LogUpdate const& state() const { return m_state; }
@@ -87,7 +105,7 @@ public:
     /// The interval between checks for changes, in milliseconds.
     static constexpr int PollInterval = 250;
 
-    /// The maximum length shown of a line, in bytes.
+    /// The maximum length that a row shows of a line, in bytes. The size of a longer one follows.
     static constexpr int ShownLimit = 4096;
 
 Q_SIGNALS:
@@ -104,13 +122,29 @@ Q_SIGNALS:
     void pollRequested();
 
 private:
+    // What a row shows.
+    struct Line
+    {
+        LogEntry entry;
+        QByteArray start; // of the line, and all of it unless it is long
+        quint16 check = 0;
+        bool isTorn = false;
+        bool isGone = false;
+    };
+
     void startScanner();
     void take(LogUpdate const& update);
     void reset(LogUpdate const& update);
     void applyChange(LogUpdate const& update);
     void poll();
     bool isHeading(int row) const;
-    LogEntry const& entry(int row) const;
+    bool openFile() const;
+    QByteArray readBytes(int row, qint64 limit) const;
+    qint64 lengthOf(int row) const;
+    Line readLine(int row) const;
+    Line const* knownLine(int row) const;
+    Line const& line(int row) const;
+    LogEntry const& entry(int row) const { return line(row).entry; }
     QString headingText(int row) const;
     QString cellText(int row, int column) const;
     QString toolTip(int row, int column) const;
@@ -120,6 +154,7 @@ private:
     QTimer m_pollTimer;
     bool m_polling = false;
     bool m_paused = false;
+    bool m_hasDropped = false; // an update that arrived after the pause
     bool m_reading = false;
     bool m_isCurrent = false;
     int m_request = 0;
@@ -130,7 +165,7 @@ private:
     LogUpdate m_state;
     int m_rowCount = 0; // fewer than the rows of m_state only while a change is being signaled
     mutable QFile m_file;
-    mutable QCache<qint64, LogEntry> m_entries;
+    mutable QCache<qint64, Line> m_lines;
 };
 
 } // namespace Velocor

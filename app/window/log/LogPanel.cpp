@@ -297,7 +297,7 @@ void LogPanel::updatePlaceholder()
 void LogPanel::showCurrentLine()
 {
     const QModelIndex current = m_view->currentIndex();
-    m_line->setPlainText(current.isValid() ? m_model->LineText(current.row(), LogIndex::LineLimit)
+    m_line->setPlainText(current.isValid() ? m_model->EntryText(current.row(), LogIndex::LineLimit)
                                            : QString());
 }
 

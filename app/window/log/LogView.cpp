@@ -254,11 +254,19 @@ int LogView::CopySelected()
     const QList<int> rows = selectedRowNumbers();
     QString text;
     int count = 0;
+    int next = 0; // the lines before are copied
     for (int row : rows) {
         if (m_model->index(row, 0).data(LogModel::HeadingRole).toBool())
             continue;
-        text += m_model->LineText(row, LogIndex::LineLimit) + QLatin1Char('\n');
-        ++count;
+        const QPair<int, int> entry = m_model->EntryRows(row);
+        for (next = std::max(next, entry.first); next <= entry.second && count < MaximumCopiedLines;
+             ++next) {
+            const QString line = m_model->LineText(next, LogIndex::LineLimit + 1);
+            text += line.left(LogIndex::LineLimit);
+            text += line.size() > LogIndex::LineLimit ? QStringLiteral("\u2026\n")
+                                                      : QStringLiteral("\n");
+            ++count;
+        }
     }
     if (count > 0)
         QGuiApplication::clipboard()->setText(text);

@@ -102,9 +102,15 @@ private slots:
     void filter();
     void earlierRuns();
     void findProblem();
+    void entries();
     void pause();
+    void updateAfterThePause();
+    void overwritten_data();
+    void overwritten();
+    void rotatedWhilePaused();
     void heading_data();
     void heading();
+    void longLines_data();
     void longLines();
     void controlCharacters();
     void withTheLogItself();
@@ -432,6 +438,33 @@ void tst_LogModel::findProblem()
     QCOMPARE(model.FindProblem(1, -1), -1);
 }
 
+void tst_LogModel::entries()
+{
+    LogModel model;
+    open(model, "before\nmore\n" + entry("09:00:00.000", "Error", "request") + "stack\ntrace\n" +
+                    entry("09:00:01.000", "Error", "single") + "tail");
+    const QList<QPair<int, int>> expected = {{0, 0}, {1, 1}, {2, 4}, {2, 4},
+                                             {2, 4}, {5, 6}, {5, 6}};
+    for (int row = 0; row < model.rowCount(); ++row)
+        QCOMPARE(model.EntryRows(row), expected[row]);
+    QCOMPARE(model.EntryText(1, 1000), QString("more"));
+    const QString request = "2025-03-03 09:00:00.000 Error request";
+    for (int row : {2, 3, 4})
+        QCOMPARE(model.EntryText(row, 1000), request + "\nstack\ntrace");
+    QCOMPARE(model.EntryText(6, 1000), QString("2025-03-03 09:00:01.000 Error single\ntail"));
+    QCOMPARE(model.EntryText(3, request.size() + 4),
+             request + "\nsta\n(only the first 41 bytes are shown)");
+    QCOMPARE(model.EntryText(3, 3), QString("202\n(only the first 3 bytes are shown)"));
+    QCOMPARE(model.EntryText(3, request.size() + 12), request + "\nstack\ntrace");
+    QCOMPARE(model.EntryText(7, 1000), QString());
+    QCOMPARE(model.EntryText(-1, 1000), QString());
+
+    // From any line of an entry to another one.
+    QCOMPARE(model.FindProblem(4, -1), -1);
+    QCOMPARE(model.FindProblem(6, -1), 2);
+    QCOMPARE(model.FindProblem(3, 1), 5);
+}
+
 // A model beside it that is not paused shows the lines, twice, by which time the paused one would
 // have looked for them.
 void tst_LogModel::pause()
@@ -450,6 +483,110 @@ void tst_LogModel::pause()
     QCOMPARE(model.rowCount(), 2);
     model.SetPaused(false);
     QTRY_COMPARE_WITH_TIMEOUT(model.rowCount(), 4, Patience);
+}
+
+// An update that is on its way when the pause begins, and the next one, which only says what has
+// changed since.
+void tst_LogModel::updateAfterThePause()
+{
+    QByteArray newer = run(5, QTime(9, 0), "n");
+    LogModel model;
+    open(model, writtenOver(run(80, QTime(17, 0), "x", true), newer));
+    const int rows = model.rowCount();
+    RowCounter counter(model);
+    connect(&model, &LogModel::pollRequested, &counter, [&] { model.SetPaused(true); });
+    newer += entry("09:01:00.000", "Trace", QString(1000, 'n')); // over many lines
+    QVERIFY(WriteAt(m_file, 0, newer));
+    QTRY_VERIFY_WITH_TIMEOUT(model.isPaused(), Patience);
+    disconnect(&model, &LogModel::pollRequested, &counter, nullptr);
+    QTest::qWait(4 * LogModel::PollInterval);
+    QCOMPARE(model.rowCount(), rows);
+
+    newer += entry("09:01:01.000", "Trace", "last");
+    QVERIFY(WriteAt(m_file, 0, newer));
+    model.SetPaused(false);
+    QTRY_COMPARE_WITH_TIMEOUT(model.state().rows->size(), size_t(model.rowCount()), Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(model).last(), QString("last"), Patience);
+    LogModel fresh;
+    open(fresh, TestFiles::read(m_file));
+    QCOMPARE(Messages(model), Messages(fresh));
+    QVERIFY(counter.right);
+}
+
+void tst_LogModel::overwritten_data()
+{
+    QTest::addColumn<QByteArray>("over");
+    QTest::addColumn<int>("length"); // of the file, after that
+
+    const QByteArray other = run(30, QTime(10, 0), "another");
+    const auto row = [](char const* name, QByteArray const& over, int length) {
+        QTest::newRow(name) << over << length;
+    };
+    row("by lines of other lengths", other, 0);
+    row("by lines as long", run(30, QTime(10, 0), "y"), 0);
+    row("up to the middle of a line", other.left(other.size() - 9), 0);
+    row("up to the end of a line", QByteArray(run(1, QTime(9, 0), "x").size() - 1, 'y'), 0);
+    row("by line ends", QByteArray(1000, '\n'), 0);
+    row("by a line that goes on", QByteArray(1000, 'y'), 0);
+    row("and cut short", other, 1000);
+    row("by nothing, but cut in a line", "", 1000);
+}
+
+// Rows that were read before keep their lines. Others show their lines or are gone, while paused
+// and before the next update. What is in their places is never shown.
+void tst_LogModel::overwritten()
+{
+    QFETCH(QByteArray, over);
+    QFETCH(int, length);
+    const int lines = 100;
+    const int onScreen = 10;
+    QByteArray log = run(lines, QTime(9, 0), "x");
+    const QStringList before = QString(log).split('\n');
+    for (bool isPaused : {true, false}) {
+        LogModel model;
+        open(model, log);
+        QCOMPARE(model.rowCount(), lines);
+        for (int row = 0; row < onScreen; ++row)
+            QCOMPARE(model.index(row, 3).data().toString(), QString("x %1").arg(row));
+        model.SetPaused(isPaused);
+        QVERIFY(WriteAt(m_file, 0, over));
+        QVERIFY(length == 0 || QFile::resize(m_file, length));
+        if (isPaused)
+            QTest::qWait(2 * LogModel::PollInterval);
+
+        const QByteArray file = TestFiles::read(m_file);
+        for (int row = 0; row < lines; ++row) {
+            const QString line = model.LineText(row, LogIndex::LineLimit);
+            const QByteArray now = file.mid(int(model.LineStart(row)));
+            const bool isThere = now.startsWith(before[row].toLatin1() + '\n');
+            QCOMPARE(model.IsGone(row), row >= onScreen && !isThere);
+            const QString gone = "This line is no longer in the file";
+            QCOMPARE(line, model.IsGone(row) ? gone : before[row]);
+            QCOMPARE(model.index(row, 3).data().toString(),
+                     model.IsGone(row) ? gone : QString("x %1").arg(row));
+            QCOMPARE(model.index(row, 0).data().toString().isEmpty(), model.IsGone(row));
+        }
+        QVERIFY(model.IsGone(onScreen) || file.startsWith(before[0].toLatin1().left(9)) ||
+                over.size() < 100);
+        if (!isPaused)
+            continue;
+        model.SetPaused(false);
+        QTRY_VERIFY_WITH_TIMEOUT(!Messages(model).contains("This line is no longer in the file"),
+                                 Patience);
+    }
+}
+
+// The file that was read has got another name; no row was read before.
+void tst_LogModel::rotatedWhilePaused()
+{
+    LogModel model;
+    open(model, run(5, QTime(9, 0), "x"));
+    model.SetPaused(true);
+    QVERIFY(QFile::rename(m_file, m_file + ".1"));
+    QVERIFY(TestFiles::write(m_file, run(3, QTime(10, 0), "y")));
+    QCOMPARE(Messages(model), Numbered("x", 0, 5));
+    model.SetPaused(false);
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(model), Numbered("y", 0, 3), Patience);
 }
 
 void tst_LogModel::heading_data()
@@ -472,15 +609,39 @@ void tst_LogModel::heading()
     QCOMPARE(model.LineText(4, 100), QString());
 }
 
+// A row shows the start and says how long the line is; there is no such limit elsewhere.
+void tst_LogModel::longLines_data()
+{
+    QTest::addColumn<int>("length"); // of the line
+    QTest::addColumn<QString>("end");
+
+    QTest::newRow("as long as a row shows") << int(LogModel::ShownLimit) << "yz";
+    QTest::newRow("one byte more") << LogModel::ShownLimit + 1 << QString("yy\u2026 (4.1 kB)");
+    QTest::newRow("longer than a piece of the file") << 300000 << QString("yy\u2026 (300 kB)");
+    QTest::newRow("longer than a slice") << 1200000 << QString("yy\u2026 (1.2 MB)");
+    QTest::newRow("too long to measure") << 5000000 << QString("yy\u2026 (more than 4.0 MB)");
+}
+
 void tst_LogModel::longLines()
 {
-    const QString text(300000, 'y');
-    LogModel model;
-    open(model, entry("09:00:00.000", "Trace", text) + entry("09:00:01.000", "Trace", "next"));
-    QCOMPARE(model.rowCount(), 2);
-    QVERIFY(model.index(0, 3).data().toString().size() <= LogModel::ShownLimit);
-    QCOMPARE(model.LineText(0, 1 << 20).size(), 300000 + 30);
-    QCOMPARE(model.index(1, 3).data().toString(), QString("next"));
+    QFETCH(int, length);
+    QFETCH(QString, end);
+    const QByteArray empty = entry("09:00:00.000", "Trace", "");
+    const QByteArray line = empty.trimmed() + ' ' + QByteArray(length - empty.size(), 'y') + 'z';
+    QCOMPARE(line.size(), length);
+    for (QByteArray const& lineEnd : {QByteArray("\n"), QByteArray("\r\n")}) {
+        LogModel model;
+        open(model, line + lineEnd + entry("09:00:01.000", "Trace", "next") + line);
+        QCOMPARE(model.rowCount(), 3);
+        for (int row : {0, 2}) {
+            const QString shown = model.index(row, 3).data().toString();
+            QVERIFY2(shown.endsWith(end), qPrintable(shown.right(20)));
+            QVERIFY(shown.size() <= LogModel::ShownLimit);
+            QCOMPARE(model.LineText(row, LogIndex::LineLimit), QString(line));
+            QCOMPARE(model.EntryText(row, LogIndex::LineLimit), QString(line));
+        }
+        QCOMPARE(model.index(1, 3).data().toString(), QString("next"));
+    }
 }
 
 void tst_LogModel::controlCharacters()
