@@ -3,6 +3,7 @@
 
 #include "app/window/log/LogModel.h"
 
+#include "app/logfile/LogIndex.h"
 #include "app/logfile/LogScanner.h"
 #include "app/logfile/LogSeverities.h"
 #include "app/window/widgets/PlainText.h"
@@ -27,6 +28,16 @@ QString OnOneLine(QString text)
             c = QLatin1Char(' ');
     }
     return text;
+}
+
+// In JSON, time and severity may be anywhere in the line; the index looks as far.
+constexpr int PartsLimit = LogIndex::LineLimit;
+
+// The length of a line, which starts at a character, without its end; -1 if the end is missing.
+int EndOfLine(QByteArray const& line, LogLineEnd const& lineEnd)
+{
+    char const* const last = lineEnd.Find(line.constBegin(), line.constEnd(), 0, '\0');
+    return last ? static_cast<int>(last - line.constData()) + 1 - lineEnd.size() : -1;
 }
 
 } // namespace
@@ -70,6 +81,8 @@ void LogModel::Open(QString const& path, LogLineParser const& parser, bool isCur
 {
     m_path = path;
     m_parser = parser;
+    m_parser.SetChosenEncoding(m_chosenEncoding);
+    m_parser.SetOwn(isCurrent);
     m_isCurrent = isCurrent;
     Reload();
 }
@@ -84,6 +97,13 @@ void LogModel::Reload()
     Q_EMIT openRequested(m_request, m_path, m_parser, m_filter);
     if (!m_paused)
         m_pollTimer.start();
+}
+
+void LogModel::SetEncoding(LogEncoding encoding)
+{
+    m_chosenEncoding = encoding;
+    m_parser.SetChosenEncoding(encoding);
+    Reload();
 }
 
 void LogModel::SetFilter(LogFilter const& filter)
@@ -122,6 +142,7 @@ void LogModel::take(LogUpdate const& update)
     const bool wasReading = m_reading;
     m_reading = false;
     m_entries.clear();
+    m_parser.SetFileType(update.type);
     if (update.isReset || wasReading)
         reset(update);
     else if (!m_paused)
@@ -207,28 +228,33 @@ bool LogModel::isHeading(int row) const
 
 QString LogModel::LineText(int row, int limit) const
 {
+    return m_parser.Text(lineBytes(row, limit));
+}
+
+QByteArray LogModel::lineBytes(int row, int limit) const
+{
     if (row < 0 || row >= m_rowCount || isHeading(row))
-        return QString();
+        return QByteArray();
     if (!m_file.isOpen()) {
         m_file.setFileName(m_path);
         if (!QFileInfo(m_path).isFile() ||
             !m_file.open(QIODevice::ReadOnly | QIODevice::Unbuffered))
-            return QString();
+            return QByteArray();
     }
     if (!m_file.seek(m_state.rows->starts[static_cast<size_t>(row)]))
-        return QString();
+        return QByteArray();
 
+    const LogLineEnd lineEnd = m_parser.fileType().lineEnd();
     QByteArray line = m_file.read(std::min(limit, 1024));
-    int end = line.indexOf('\n');
+    int end = EndOfLine(line, lineEnd);
     if (end < 0 && line.size() == 1024 && limit > 1024) {
         line += m_file.read(limit - 1024);
-        end = line.indexOf('\n');
+        end = EndOfLine(line, lineEnd);
     }
     if (end >= 0)
         line.truncate(end);
-    if (line.endsWith('\r'))
-        line.chop(1);
-    return QString::fromLatin1(line);
+    line.truncate(m_parser.fileType().encoding.WithoutReturn(line.constData(), line.size()));
+    return line;
 }
 
 LogEntry const& LogModel::entry(int row) const
@@ -238,12 +264,12 @@ LogEntry const& LogModel::entry(int row) const
         return *known;
 
     auto* found = new LogEntry;
-    const QString line = LineText(row, ShownLimit);
     if (m_state.rows->marks[static_cast<size_t>(row)] & LogRows::Torn)
-        found->message = line;
+        found->message = LineText(row, ShownLimit);
     else
-        *found = m_parser.Parse(line.toLatin1());
-    found->message = OnOneLine(found->message);
+        *found =
+            m_parser.Parse(lineBytes(row, m_parser.fileType().isForeign ? PartsLimit : ShownLimit));
+    found->message = OnOneLine(found->message.left(ShownLimit));
     m_entries.insert(start, found);
     return *found;
 }

@@ -148,7 +148,11 @@ void LogView::rowsAboutToBeRemoved(QModelIndex const& parent, int first, int las
 void LogView::afterRefresh()
 {
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
-    setColumnHidden(LogModel::ElapsedColumn, !m_model->state().hasElapsed);
+    // An empty log may get anything.
+    LogUpdate const& state = m_model->state();
+    setColumnHidden(LogModel::TimeColumn, !state.hasTimes && state.lines > 0);
+    setColumnHidden(LogModel::SeverityColumn, !state.hasSeverities && state.lines > 0);
+    setColumnHidden(LogModel::ElapsedColumn, !state.hasElapsed);
     updateHeadings();
     restoreCurrent();
     if (m_following) {
@@ -183,7 +187,7 @@ void LogView::restoreCurrent()
                          m_model->LineText(row, LogModel::ShownLimit) != m_keptText;
     if (row < 0 || isOther || currentIndex().isValid())
         return;
-    const QModelIndex index = m_model->index(row, LogModel::TimeColumn);
+    const QModelIndex index = m_model->index(row, firstColumn());
     selectionModel()->setCurrentIndex(index, QItemSelectionModel::ClearAndSelect |
                                                  QItemSelectionModel::Rows);
     if (row + 1 < m_model->rowCount())
@@ -217,6 +221,15 @@ int LogView::rowBefore(int step) const
     return last < 0 ? m_model->rowCount() : last + 1;
 }
 
+// Qt does not scroll to hidden columns.
+int LogView::firstColumn() const
+{
+    int column = 0;
+    while (isColumnHidden(column))
+        ++column;
+    return column;
+}
+
 LogView::Jump LogView::GoToProblem(int step)
 {
     Jump jump = Jump::Ahead;
@@ -228,7 +241,7 @@ LogView::Jump LogView::GoToProblem(int step)
     if (row < 0)
         return Jump::None;
     // Whatever keys are held: Shift would extend the selection.
-    const QModelIndex index = m_model->index(row, LogModel::TimeColumn);
+    const QModelIndex index = m_model->index(row, firstColumn());
     selectionModel()->setCurrentIndex(index, QItemSelectionModel::ClearAndSelect |
                                                  QItemSelectionModel::Rows);
     scrollTo(index, PositionAtCenter);

@@ -72,6 +72,7 @@ private:
     void noteCurrent();
     void restoreCurrent();
     int rowBefore(int step) const;
+    int firstColumn() const;
     void setRowHeight();
     void updateHeadings();
     QList<int> selectedRowNumbers() const;
