@@ -75,6 +75,7 @@ private slots:
     void choosesEncoding();
     void emptyColumns_data();
     void emptyColumns();
+    void longStamps();
     void becomesForeign();
     void pauses();
     void copiesLines();
@@ -409,6 +410,26 @@ void tst_LogInWindow::emptyColumns()
     QCOMPARE(current.isValid(), !file.isEmpty());
     if (current.isValid())
         QVERIFY(view->viewport()->rect().intersects(view->visualRect(current)));
+}
+
+// Wide enough to be read; and as narrow as users make it.
+void tst_LogInWindow::longStamps()
+{
+    const WindowTest test(run(1, QTime(9, 0), "x"));
+    const QString path = test.folder() + "error.log";
+    const QByteArray line("[Sun Nov 22 14:03:02.123456 2026] [core:error] [pid 7] x\n");
+    QVERIFY(TestFiles::write(path, line));
+    const auto window = WindowTest::show();
+    window->OpenFile(path);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+    LogView* view = View(*window);
+    const QString stamp("Sun Nov 22 14:03:02.123456 2026");
+    const int needed = view->fontMetrics().boundingRect(stamp).width();
+    QTRY_VERIFY_WITH_TIMEOUT(view->columnWidth(LogModel::TimeColumn) > needed, Patience);
+    view->setColumnWidth(LogModel::TimeColumn, 50);
+    QVERIFY(TestFiles::write(path, line + line));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    QCOMPARE(view->columnWidth(LogModel::TimeColumn), 50);
 }
 
 // The first lines of a new file may not say yet what it is.

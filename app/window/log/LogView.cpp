@@ -153,6 +153,7 @@ void LogView::afterRefresh()
     setColumnHidden(LogModel::TimeColumn, !state.hasTimes && state.lines > 0);
     setColumnHidden(LogModel::SeverityColumn, !state.hasSeverities && state.lines > 0);
     setColumnHidden(LogModel::ElapsedColumn, !state.hasElapsed);
+    fitTimes();
     updateHeadings();
     restoreCurrent();
     if (m_following) {
@@ -194,6 +195,18 @@ void LogView::restoreCurrent()
         SetFollowing(false);
     updateGeometries(); // updates the scroll bar's range
     verticalScrollBar()->setValue(row - m_keptDistance);
+}
+
+// Other programs' stamps may be longer than the log's own. Once for a file, or users could not make
+// the column narrow.
+void LogView::fitTimes()
+{
+    LogUpdate const& state = m_model->state();
+    if (m_fittedPath == m_model->path() || !state.type.isForeign || !state.hasTimes)
+        return;
+    m_fittedPath = m_model->path();
+    const int width = sizeHintForColumn(LogModel::TimeColumn);
+    setColumnWidth(LogModel::TimeColumn, std::max(columnWidth(LogModel::TimeColumn), width));
 }
 
 // A heading spans all columns.
