@@ -138,6 +138,8 @@ void tst_ForeignLine::formats_data()
         "Nov 22 14:03:02", warning, "host app: warning: disk full");
     row("RFC 3164, a word of the message", "Nov 22 14:03:02 host kernel: Error reading x",
         "Nov 22 14:03:02", none, "host kernel: Error reading x");
+    row("RFC 3164, a severity further on", "Nov 22 14:03:02 host app[71]: ended with ERROR 7",
+        "Nov 22 14:03:02", none, "host app[71]: ended with ERROR 7");
     row("RFC 3164 with its priority", "<34>Oct 11 22:14:15 mymachine su: 'su root' failed",
         "Oct 11 22:14:15", fatal, "mymachine su: 'su root' failed");
     row("RFC 5424", "<165>1 2003-10-11T22:14:15.003Z host app - ID47 - x",
@@ -179,6 +181,10 @@ void tst_ForeignLine::formats_data()
     row("JSON of the journal", R"({"PRIORITY":"3","MESSAGE":"x","_PID":"71"})", "", error, "x");
     row("JSON of containers", R"({"log":"x\n","stream":"stderr","time":"2026-11-22T14:03:02.1Z"})",
         "2026-11-22T14:03:02.1Z", none, "x\n");
+    row("JSON, several times and messages",
+        R"({"date":"2026-11-20","timestamp":"2026-11-22 14:03:02","t":"09:00:00","event":"a",)"
+        R"("message":"b","text":"c","severity":"info","priority":"3"})",
+        "2026-11-22 14:03:02", note, "b");
     row("JSON without a message", R"({"level":"info","a":1})", "", note,
         R"({"level":"info","a":1})");
     row("JSON that is cut", R"({"level":"info","msg":"abc)", "", note,

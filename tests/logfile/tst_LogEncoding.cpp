@@ -10,6 +10,7 @@
 using namespace Velocor;
 
 Q_DECLARE_METATYPE(LogEncoding)
+Q_DECLARE_METATYPE(LogLineEnd)
 
 namespace {
 
@@ -196,8 +197,6 @@ void tst_LogEncoding::carriageReturn()
     QCOMPARE(length(LogEncoding::Utf16Be, QByteArray("\0a\r\0", 4)), 4);
     QCOMPARE(length(LogEncoding::Utf16Le, "\r"), 1);
 }
-
-Q_DECLARE_METATYPE(LogLineEnd)
 
 QTEST_GUILESS_MAIN(tst_LogEncoding)
 #include "tst_LogEncoding.moc"

@@ -68,6 +68,8 @@ private slots:
     void oneRun();
     void everyLine_data();
     void everyLine();
+    void filter_data();
+    void filter();
     void columns_data();
     void columns();
 };
@@ -223,6 +225,37 @@ void tst_LogFileType::everyLine()
     QFETCH(QStringList, rows);
     for (int piece = 1; piece < 20; ++piece)
         QCOMPARE(IndexOf(file, piece).rows, rows);
+}
+
+void tst_LogFileType::filter_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<int>("count");
+    QTest::newRow("a text") << "caf\u00e9" << 1;
+    QTest::newRow("another") << "cafe" << 0;
+    QTest::newRow("start of a line") << "^14:03:0[23]" << 2;
+    QTest::newRow("end of a line") << "[^ ]\u20ac$" << 1;
+    QTest::newRow("a whole line") << "^14:03:03 INFO x\u20ac$" << 1;
+}
+
+// Expressions see the text of a line without its end, in every encoding.
+void tst_LogFileType::filter()
+{
+    QFETCH(QString, text);
+    QFETCH(int, count);
+    const QString lines("14:03:02 INFO caf\u00e9 \u20ac\r\n14:03:03 INFO x\u20ac\r\n");
+    LogFilter filter;
+    QVERIFY(filter.SetText(text, true, true));
+    for (QByteArray const& file : {"\xEF\xBB\xBF" + lines.toUtf8(), lines.toUtf8(), Utf16Le(lines),
+                                   "\xFF\xFE" + Utf16Le(lines)}) {
+        LogLineParser parser;
+        parser.SetFileType(TypeOf(file));
+        LogIndex index(parser, filter);
+        index.Begin();
+        index.Feed(file.constData(), file.size());
+        index.End();
+        QCOMPARE(index.Rows(filter).size(), size_t(count));
+    }
 }
 
 void tst_LogFileType::columns_data()
