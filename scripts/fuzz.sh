@@ -40,6 +40,7 @@ fi
 dictionary() {
     case "$1" in
     config_text | config_values) echo values.dict ;;
+    foreign_log) echo foreign.dict ;;
     log_line) echo log.dict ;;
     *) echo xml.dict ;;
     esac
@@ -52,6 +53,7 @@ longest() {
     config_text) echo 64 ;;
     config_values | mru_list) echo 128 ;;
     error_handler | log_files | log_line | xml_writers) echo 256 ;;
+    foreign_log) echo 512 ;;
     config_load | start) echo 1024 ;;
     *) echo 4096 ;; # more than a thousand levels
     esac

@@ -9,7 +9,7 @@ namespace Velocor {
 
 namespace {
 
-constexpr unsigned AllSeverities = (1U << LogEntry::None) - 1;
+constexpr unsigned AllSeverities = (2U << LogEntry::None) - 1;
 
 // How many ways to match one text are tried. Some expressions have more ways than anybody can wait
 // for, and Qt knows no time limit.
@@ -30,16 +30,12 @@ LogFilter::LogFilter() : m_severities(AllSeverities) {}
 
 void LogFilter::SetSeverity(LogEntry::Severity severity, bool shown)
 {
-    if (severity == LogEntry::None)
-        return;
     const unsigned bit = 1U << severity;
     m_severities = shown ? m_severities | bit : m_severities & ~bit;
 }
 
 bool LogFilter::Shows(LogEntry::Severity severity) const
 {
-    if (severity == LogEntry::None)
-        return m_severities == AllSeverities;
     return m_severities & (1U << severity);
 }
 

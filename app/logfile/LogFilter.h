@@ -27,7 +27,7 @@ public:
     /// Shows everything.
     LogFilter();
 
-    /// Shows or hides one severity. Lines without one are shown only if all severities are.
+    /// Shows or hides one severity; None stands for lines without one.
     void SetSeverity(LogEntry::Severity severity, bool shown);
     bool Shows(LogEntry::Severity severity) const;
 

@@ -44,7 +44,8 @@ void AppendTail(std::vector<T>& to, std::vector<T> const& from, size_t first)
 } // namespace
 
 LogIndex::LogIndex(LogLineParser const& parser, LogFilter const& filter, bool isOneRun)
-    : m_parser(parser), m_filter(filter), m_isOneRun(isOneRun)
+    : m_parser(parser), m_filter(filter), m_lineEnd(parser.fileType().lineEnd()),
+      m_isOneRun(isOneRun || parser.fileType().isForeign)
 {
     m_runs.emplace_back();
 }
@@ -146,8 +147,8 @@ bool LogIndex::Feed(char const* bytes, int count)
     char const* at = bytes;
     char const* const end = bytes + count;
     while (at != end) {
-        const auto left = static_cast<size_t>(end - at);
-        auto const* lineEnd = static_cast<char const*>(std::memchr(at, '\n', left));
+        const char before = m_lineIsPartial && at == bytes ? m_lastByte : '\0';
+        char const* const lineEnd = m_lineEnd.Find(at, end, m_position + (at - bytes), before);
         const int length = static_cast<int>((lineEnd ? lineEnd : end) - at);
         if (lineEnd && !m_lineIsPartial) {
             if (!addLine(at, length, true))
@@ -165,6 +166,7 @@ bool LogIndex::Feed(char const* bytes, int count)
         m_partialLine.clear();
         m_lineIsPartial = false;
     }
+    m_lastByte = count > 0 ? end[-1] : m_lastByte;
     m_position += count;
     return true;
 }
@@ -184,7 +186,8 @@ bool LogIndex::isMatched(char const* line, int length)
 {
     if (!m_filter.hasText() || m_slowLine > 0)
         return true;
-    const LogFilter::Match match = m_filter.Find(QString::fromLatin1(line, length));
+    const LogFilter::Match match =
+        m_filter.Find(m_parser.fileType().encoding.narrowed().Decode(line, length));
     if (match == LogFilter::TooLong)
         m_slowLine = m_starts.size() + 1;
     return match == LogFilter::Yes;
@@ -208,10 +211,17 @@ quint8 LogIndex::markOf(LogLineParser::Parts const& parts, char const* line, int
 bool LogIndex::addLine(char const* line, int length, bool complete)
 {
     const qint64 end = m_lineStart + length + 1;
-    if (length > 0 && line[length - 1] == '\r')
-        --length;
-    const LogLineParser::Parts parts = m_parser.Find(line, std::min(length, LineLimit));
+    if (complete)
+        length = std::max(0, length + 1 - m_lineEnd.size());
+    LogEncoding const& encoding = m_parser.fileType().encoding;
+    length = encoding.WithoutReturn(line, length);
+    const quint16 check = LogRows::CheckOf(line, length);
+    QByteArray narrow;
+    encoding.Narrow(line, length, narrow);
+    const LogLineParser::Parts parts = m_parser.Find(line, std::min(length, PartsLimit));
     m_hasElapsed = m_hasElapsed || parts.elapsedLength > 0;
+    m_hasTimes = m_hasTimes || parts.timeLength > 0;
+    m_hasSeverities = m_hasSeverities || parts.severity != LogEntry::None;
     m_lastIsComplete = complete;
 
     if (isSeam(parts, end)) {
@@ -222,7 +232,7 @@ bool LogIndex::addLine(char const* line, int length, bool complete)
     if (m_isSeamUnchanged && m_lineStart >= m_formerEnd)
         joinRuns();
     m_marks.push_back(markOf(parts, line, std::min(length, LineLimit)));
-    m_checks.push_back(LogRows::CheckOf(line, length));
+    m_checks.push_back(check);
     m_starts.push_back(m_lineStart);
     if (parts.timeKey >= 0 && complete) // an incomplete line is read again
         noteTime(parts);

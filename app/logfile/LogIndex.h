@@ -43,7 +43,9 @@ namespace Velocor {
 class LogIndex
 {
 public:
-    /// @param isOneRun  whether all lines are known to be of one run, so that no seam is looked for
+    /// @param isOneRun  whether all lines are known to be of one run, so that no seam is looked
+    /// for;
+    ///                  so it is in other programs' files
     explicit LogIndex(LogLineParser const& parser = LogLineParser(),
                       LogFilter const& filter = LogFilter(), bool isOneRun = false);
 
@@ -97,12 +99,21 @@ public:
     /// Whether any entry has an elapsed time.
     bool hasElapsed() const { return m_hasElapsed; }
 
+    /// Whether any entry has a time stamp.
+    bool hasTimes() const { return m_hasTimes; }
+
+    /// Whether any entry has a severity.
+    bool hasSeverities() const { return m_hasSeverities; }
+
     /// How many lines are shown or hidden together.
     static constexpr size_t MaximumEntryLines = 1000;
 
     /// How far into a line the text filter looks, in bytes. Whoever shows or copies a line may
     /// stop there, too: such a file is hardly a log.
     static constexpr int LineLimit = 64 * 1024 * 1024;
+
+    /// How far into a line of another program times and severities are looked for, in bytes.
+    static constexpr int PartsLimit = 64 * 1024;
 
 private:
     struct Run
@@ -130,12 +141,15 @@ private:
 
     LogLineParser m_parser;
     LogFilter m_filter;
+    LogLineEnd m_lineEnd;
 
     std::vector<qint64> m_starts;
     std::vector<quint8> m_marks;
     std::vector<quint16> m_checks;
     std::vector<Run> m_runs; // newest first, as in the file
     bool m_hasElapsed = false;
+    bool m_hasTimes = false;
+    bool m_hasSeverities = false;
     size_t m_slowLine = 0;
     bool m_lastIsComplete = true;
 
@@ -154,6 +168,7 @@ private:
     qint64 m_lineStart = 0;
     QByteArray m_partialLine;
     bool m_lineIsPartial = false;
+    char m_lastByte = '\0'; // of a partial line
     bool m_runHasTimed = false;
     size_t m_lastTimed = 0;
     qint64 m_lastTime = -1;

@@ -4,6 +4,8 @@
 #include "app/logfile/LogLineParser.h"
 
 #include "app/logfile/AsciiDigit.h"
+#include "app/logfile/ForeignLine.h"
+#include "app/logfile/LogFields.h"
 #include "app/logfile/LogSeverities.h"
 
 #include <algorithm>
@@ -143,7 +145,7 @@ void LogLineParser::findElapsed(char const* line, int length, Parts& parts) cons
     }
 }
 
-LogLineParser::Parts LogLineParser::Find(char const* line, int length) const
+LogLineParser::Parts LogLineParser::FindOwn(char const* line, int length) const
 {
     Parts parts;
     length = std::min(length, SearchLimit);
@@ -152,16 +154,65 @@ LogLineParser::Parts LogLineParser::Find(char const* line, int length) const
     return parts;
 }
 
+LogLineParser::Parts LogLineParser::Find(char const* line, int length) const
+{
+    if (!m_type.isForeign)
+        return FindOwn(line, length);
+    const ForeignLine foreign = ForeignLine::Read(line, length, m_type.latest);
+    if (!foreign.isEntry)
+        return FindOwn(line, length);
+    Parts parts;
+    parts.isEntry = true;
+    parts.severity = foreign.severity;
+    parts.timeLength = foreign.time.length;
+    parts.timeKey = foreign.timeKey;
+    parts.hasDate = foreign.hasDate;
+    parts.resolution = foreign.resolution;
+    parts.message = foreign.message.start;
+    return parts;
+}
+
+QString LogLineParser::Text(QByteArray const& line) const
+{
+    return m_type.encoding.Decode(line.constData(), line.size());
+}
+
+bool LogLineParser::parseForeign(char const* line, int length, LogEntry& entry) const
+{
+    if (!m_type.isForeign)
+        return false;
+    const ForeignLine foreign = ForeignLine::Read(line, length, m_type.latest);
+    if (!foreign.isEntry)
+        return false;
+    const LogEncoding encoding = m_type.encoding.narrowed();
+    char const* const time = line + foreign.time.start;
+    entry.isEntry = true;
+    entry.severity = foreign.severity;
+    entry.time = foreign.isEpoch ? ForeignLine::EpochText(time, foreign.time.length)
+                                 : QString::fromLatin1(time, foreign.time.length);
+    entry.message = encoding.Decode(line + foreign.message.start, foreign.message.length);
+    if (foreign.isEscaped)
+        entry.message = LogField::Unescaped(entry.message);
+    return true;
+}
+
 LogEntry LogLineParser::Parse(QByteArray const& line) const
 {
-    const Parts parts = Find(line.constData(), line.size());
+    QByteArray buffer;
+    char const* text = line.constData();
+    int length = line.size();
+    m_type.encoding.Narrow(text, length, buffer);
+
     LogEntry entry;
+    if (parseForeign(text, length, entry))
+        return entry;
+    const Parts parts = FindOwn(text, length);
+    const LogEncoding encoding = m_type.encoding.narrowed();
     entry.isEntry = parts.isEntry;
     entry.severity = parts.severity;
-    entry.time = QString::fromLatin1(line.constData(), parts.timeLength);
-    entry.elapsed = QString::fromLatin1(line.constData() + parts.elapsed, parts.elapsedLength);
-    entry.message =
-        QString::fromLatin1(line.constData() + parts.message, line.size() - parts.message);
+    entry.time = encoding.Decode(text, parts.timeLength);
+    entry.elapsed = QString::fromLatin1(text + parts.elapsed, parts.elapsedLength);
+    entry.message = encoding.Decode(text + parts.message, length - parts.message);
     return entry;
 }
 

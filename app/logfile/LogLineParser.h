@@ -4,6 +4,7 @@
 #pragma once
 
 #include "app/logfile/LogEntry.h"
+#include "app/logfile/LogFileType.h"
 #include "app/logfile/LogTimeReader.h"
 
 #include <QByteArray>
@@ -18,7 +19,8 @@ namespace Velocor {
 ///
 /// The date format is a setting that may have changed while the file was being written, so the
 /// given formats are tried first; after that, any text with a digit counts as a time stamp if a
-/// severity name follows it. Pure; any thread. File format: docs/log-file.md.
+/// severity name follows it. In a file that is another program's, ForeignLine comes first.
+/// Pure; any thread. File format: docs/log-file.md.
 ///
 ///     LogLineParser parser({"yyyy-MM-dd hh:mm:ss.z"}, {"dT:"});
 ///     LogEntry entry = parser.Parse(line);
@@ -47,15 +49,34 @@ public:
     /// @param elapsedPrefixes  texts before the elapsed milliseconds, in the same way
     LogLineParser(QStringList const& dateFormats, QStringList const& elapsedPrefixes);
 
+    /// Sets the encoding that the user chose; Automatic, the default, leaves it to the file.
+    void SetChosenEncoding(LogEncoding encoding) { m_chosenEncoding = encoding; }
+    LogEncoding chosenEncoding() const { return m_chosenEncoding; }
+
+    /// Says that the file is known to be the log's own, whatever its lines look like.
+    void SetOwn(bool isOwn) { m_isOwn = isOwn; }
+    bool isOwn() const { return m_isOwn; }
+
+    /// Sets how the file is read. By default, lines are the log's own, in Latin-1.
+    void SetFileType(LogFileType const& type) { m_type = type; }
+    LogFileType const& fileType() const { return m_type; }
+
     /// Finds the parts of one line.
     ///
-    /// @param line  in Latin-1, without its line end; for very long lines the start is enough
+    /// @param line  as from LogEncoding::Narrow(), without its line end; for very long lines of the
+    ///              log's own the start is enough
     Parts Find(char const* line, int length) const;
 
-    /// Parses one line.
+    /// Finds the parts of a line of the log's own, whatever the file is.
+    Parts FindOwn(char const* line, int length) const;
+
+    /// Parses one line, as stored in the file.
     LogEntry Parse(QByteArray const& line) const;
 
-    /// The maximum length that Find() examines, in bytes.
+    /// The text of one line, as stored in the file.
+    QString Text(QByteArray const& line) const;
+
+    /// The maximum length of the log's own lines that Find() examines, in bytes.
     static constexpr int SearchLimit = 512;
 
 private:
@@ -69,10 +90,14 @@ private:
     bool findByFormat(char const* line, int length, Parts& parts) const;
     bool findByName(char const* line, int length, Parts& parts) const;
     void findElapsed(char const* line, int length, Parts& parts) const;
+    bool parseForeign(char const* line, int length, LogEntry& entry) const;
 
     std::vector<LogTimeReader> m_readers;
     std::vector<QByteArray> m_elapsedPrefixes;
     std::vector<Name> m_names;
+    LogEncoding m_chosenEncoding = LogEncoding::Automatic;
+    bool m_isOwn = false;
+    LogFileType m_type;
 };
 
 } // namespace Velocor

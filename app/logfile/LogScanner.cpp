@@ -93,6 +93,8 @@ void LogScanner::readFromStart(bool isOneRun)
     }
     m_exists = true;
     m_error.clear();
+    m_parser.SetFileType(typeOf(file));
+    m_index = LogIndex(m_parser, m_filter, isOneRun);
     if (readFrom(file))
         report(true);
 }
@@ -150,6 +152,10 @@ bool LogScanner::feed(QByteArray const& slice, qint64 count)
 // index expects it was made elsewhere; then, and without the seam that there was, it starts over.
 void LogScanner::readChanges(QFile& file)
 {
+    if (hasNewType(file)) {
+        readFromStart(false);
+        return;
+    }
     const QDateTime modified = m_modified;
     const qint64 end = m_index.nextOffset();
     m_complete = false; // until the pass is over
@@ -160,6 +166,20 @@ void LogScanner::readChanges(QFile& file)
         readFromStart(false);
     else
         report(false);
+}
+
+LogFileType LogScanner::typeOf(QFile& file) const
+{
+    const QByteArray head = BytesAt(file, 0, LogFileType::HeadSize);
+    return LogFileType::Of(head, m_parser, m_parser.chosenEncoding(),
+                           QFileInfo(m_path).lastModified().date());
+}
+
+// The first lines of a short file may not have said whose it is.
+bool LogScanner::hasNewType(QFile& file) const
+{
+    LogFileType const& known = m_parser.fileType();
+    return !known.isOwn && m_size < LogFileType::HeadSize && !typeOf(file).IsLike(known);
 }
 
 void LogScanner::noteFile(QFile& file)
@@ -228,6 +248,9 @@ void LogScanner::report(bool isReset)
     update.error = m_error;
     update.lines = m_lines;
     update.hasElapsed = m_index.hasElapsed();
+    update.hasTimes = m_index.hasTimes();
+    update.hasSeverities = m_index.hasSeverities();
+    update.type = m_parser.fileType();
     update.slowLine = m_index.slowLine();
     if (!nothingNew)
         Q_EMIT updated(update);

@@ -65,6 +65,8 @@ private:
     void reportMissing();
     void report(bool isReset);
     void startOver(bool isOneRun);
+    LogFileType typeOf(QFile& file) const;
+    bool hasNewType(QFile& file) const;
 
     std::atomic<int> m_currentRequest{0};
     int m_request = 0;

@@ -4,6 +4,7 @@
 #include "app/logfile/LogTimeReader.h"
 
 #include "app/logfile/AsciiDigit.h"
+#include "app/logfile/DayNumber.h"
 
 #include <QLocale>
 #include <QTime>
@@ -22,17 +23,6 @@ bool IsWordCharacter(char c)
 {
     const unsigned char byte = static_cast<unsigned char>(c);
     return (byte >= 'a' && byte <= 'z') || (byte >= 'A' && byte <= 'Z') || byte >= 0x80;
-}
-
-// Consecutive days have consecutive numbers, never negative; the year starts in March, so that its
-// last month is the one whose length varies. Any of the fields may be missing and then is 0.
-qint64 DayOf(int year, int month, int day)
-{
-    const bool isBeforeMarch = month <= 2;
-    const qint64 years = year + (isBeforeMarch ? 0 : 1);
-    const int months = month + (isBeforeMarch ? 9 : -3);
-    const qint64 leapDays = (years + 399) / 4 - (years + 399) / 100 + (years + 399) / 400;
-    return 365 * years + leapDays + (153 * months + 2) / 5 + day;
 }
 
 // One-digit milliseconds: "5" means half a second in newer Qt versions, 5 ms in older ones.
@@ -232,7 +222,7 @@ LogTimeReader::Stamp LogTimeReader::Read(char const* text, int length) const
     if (!m_hasTime)
         return stamp;
     int const* number = values.number;
-    qint64 key = DayOf(number[Year] + number[ShortYear], number[Month], number[Day]);
+    qint64 key = DayNumber(number[Year] + number[ShortYear], number[Month], number[Day]);
     key = key * 24 + number[Hour] + number[HalfDay];
     key = key * 60 + number[Minute];
     key = key * 60 + number[Second];

@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "app/logfile/LogFileType.h"
 #include "app/logfile/LogRows.h"
 
 #include <QMetaType>
@@ -31,6 +32,9 @@ struct LogUpdate
     size_t lines = 0;
     size_t slowLine = 0; ///< see LogIndex::slowLine()
     bool hasElapsed = false;
+    bool hasTimes = false;
+    bool hasSeverities = false;
+    LogFileType type; ///< how to read the lines
 
     /// Computes the numbers from the rows before and after.
     void Compare(LogRows const& before);

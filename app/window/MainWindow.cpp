@@ -21,6 +21,7 @@
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
 
+#include <QActionGroup>
 #include <QApplication>
 #include <QCloseEvent>
 #include <QDesktopWidget>
@@ -258,6 +259,28 @@ void MainWindow::makeViewMenu()
     m_logActions.append(addAction(menu, tr("&Reload"), QKeySequence(tr("F5")),
                                   tr("Reload the file"),
                                   [this] { m_tabs->currentLog()->Reload(); }));
+    makeEncodingMenu(menu->addMenu(tr("En&coding")));
+}
+
+void MainWindow::makeEncodingMenu(QMenu* menu)
+{
+    m_logActions.append(menu->menuAction());
+    m_encodings = new QActionGroup(menu);
+    const auto add = [&](QString const& text, QString const& statusTip, LogEncoding encoding) {
+        QAction* action = addSwitch(menu, text, QKeySequence(), statusTip, [this, encoding](bool) {
+            m_tabs->currentLog()->SetEncoding(encoding);
+        });
+        action->setData(encoding.kind());
+        m_encodings->addAction(action);
+    };
+    add(tr("&Automatic"), tr("Find out how the file is encoded"), LogEncoding::Automatic);
+    const auto addNamed = [&](QString const& text, LogEncoding encoding) {
+        add(text, tr("Read the file as %1").arg(QString(text).remove(QLatin1Char('&'))), encoding);
+    };
+    addNamed(tr("&Latin-1"), LogEncoding::Latin1);
+    addNamed(tr("&UTF-8"), LogEncoding::Utf8);
+    addNamed(tr("UTF-&16 LE"), LogEncoding::Utf16Le);
+    addNamed(tr("UTF-16 &BE"), LogEncoding::Utf16Be);
 }
 
 void MainWindow::makeHelpMenu()
@@ -352,6 +375,9 @@ void MainWindow::updateState()
     m_pause->setChecked(log->isPaused());
     m_follow->setChecked(log->isFollowing());
     m_earlierRuns->setChecked(log->showsEarlierRuns());
+    const QList<QAction*> encodings = m_encodings->actions();
+    for (QAction* action : encodings)
+        action->setChecked(action->data().toInt() == log->chosenEncoding().kind());
 }
 
 void MainWindow::showMessage(QString const& text)

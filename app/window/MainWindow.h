@@ -11,6 +11,7 @@
 #include <functional>
 #include <memory>
 
+class QActionGroup;
 class QMenu;
 class QSplitter;
 
@@ -60,6 +61,7 @@ private:
     void makeFileMenu();
     void makeEditMenu();
     void makeViewMenu();
+    void makeEncodingMenu(QMenu* menu);
     void makeHelpMenu();
     QAction* addAction(QMenu* menu, QString const& text, QKeySequence const& shortcut,
                        QString const& statusTip, std::function<void()> const& work);
@@ -101,6 +103,7 @@ private:
     QAction* m_earlierRuns = nullptr;
     QAction* m_pause = nullptr;
     QAction* m_follow = nullptr;
+    QActionGroup* m_encodings = nullptr;
     QList<QAction*> m_logActions; // those that need a log in the current tab
 
     std::unique_ptr<LogHealth> m_logHealth;

@@ -23,10 +23,11 @@ void tst_LogFilter::filter()
 {
     LogFilter filter;
     QVERIFY(filter.Shows(LogEntry::Trace) && filter.Shows(LogEntry::None));
-    filter.SetSeverity(LogEntry::None, false); // lines without a severity have no switch
-    QVERIFY(filter.Shows(LogEntry::None));
+    filter.SetSeverity(LogEntry::None, false);
+    QVERIFY(filter.Shows(LogEntry::Trace) && !filter.Shows(LogEntry::None));
     filter.SetSeverity(LogEntry::Trace, false);
-    QVERIFY(!filter.Shows(LogEntry::Trace) && !filter.Shows(LogEntry::None));
+    filter.SetSeverity(LogEntry::None, true);
+    QVERIFY(!filter.Shows(LogEntry::Trace) && filter.Shows(LogEntry::None));
     QVERIFY(filter.Shows(LogEntry::Fatal));
     filter.SetSeverity(LogEntry::Trace, true);
     QVERIFY(filter.Shows(LogEntry::Trace) && filter.Shows(LogEntry::None));

@@ -264,10 +264,12 @@ void tst_LogIndex::filter_data()
     QTest::newRow("all shown") << QList<int>()
                                << QStringList({"a", "b", "c", "d", "e", "more", "?"});
     QTest::newRow("no traces") << QList<int>({LogEntry::Trace})
-                               << QStringList({"b", "c", "d", "e", "more"});
-    QTest::newRow("problems only") << QList<int>({LogEntry::Trace, LogEntry::Notification})
-                                   << QStringList({"c", "d", "e", "more"});
-    QTest::newRow("none") << QList<int>({0, 1, 2, 3, 4}) << QStringList();
+                               << QStringList({"b", "c", "d", "e", "more", "?"});
+    QTest::newRow("problems only")
+        << QList<int>({LogEntry::Trace, LogEntry::Notification, LogEntry::None})
+        << QStringList({"c", "d", "e", "more"});
+    QTest::newRow("only what has no severity") << QList<int>({0, 1, 2, 3, 4}) << QStringList("?");
+    QTest::newRow("none") << QList<int>({0, 1, 2, 3, 4, 5}) << QStringList();
 }
 
 void tst_LogIndex::filter()

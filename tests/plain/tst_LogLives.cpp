@@ -38,7 +38,12 @@ public:
         save();
     }
 
-    LogLineParser parser() const { return LogLineParser({m_format}, {}); }
+    LogLineParser parser() const
+    {
+        LogLineParser parser({m_format}, {});
+        parser.SetOwn(true); // a torn line may look like another program's
+        return parser;
+    }
 
     // One event, and what it changes in the file.
     void step()

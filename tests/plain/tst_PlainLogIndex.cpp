@@ -388,7 +388,9 @@ protected:
 
     static LogLineParser parser(bool readsTimes)
     {
-        return readsTimes ? LogLineParser({"hh-mm-ss,z"}, {}) : LogLineParser();
+        LogLineParser parser = readsTimes ? LogLineParser({"hh-mm-ss,z"}, {}) : LogLineParser();
+        parser.SetOwn(true); // a torn line may look like another program's
+        return parser;
     }
 
     QByteArray m_file;

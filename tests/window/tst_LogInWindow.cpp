@@ -39,6 +39,13 @@ QPoint RowCentre(LogView* view, int row)
     return view->visualRect(view->model()->index(row, LogModel::MessageColumn)).center();
 }
 
+// QTest has keys only for ASCII.
+void Type(QWidget* widget, QString const& text)
+{
+    QKeyEvent press(QEvent::KeyPress, Qt::Key_unknown, Qt::NoModifier, text);
+    QApplication::sendEvent(widget, &press);
+}
+
 // A check box reacts to clicks on the box, not on the whole area of the widget.
 void ClickBox(QCheckBox* box)
 {
@@ -63,6 +70,13 @@ private slots:
     void filterByText();
     void filterByExpression();
     void filterBySeverity();
+    void otherPrograms();
+    void wideCharacters();
+    void choosesEncoding();
+    void emptyColumns_data();
+    void emptyColumns();
+    void longStamps();
+    void becomesForeign();
     void pauses();
     void overwrittenWhilePaused();
     void entriesOfSeveralLines();
@@ -250,15 +264,193 @@ void tst_LogInWindow::filterByExpression()
 void tst_LogInWindow::filterBySeverity()
 {
     const WindowTest test(entry("09:00:00.000", "Trace", "a") +
-                          entry("09:00:01.000", "Error", "b"));
+                          entry("09:00:01.000", "Error", "b") + entry("09:00:02.000", "", "c"));
     const auto window = WindowTest::show();
-    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
     Click(Child<QToolButton>(window.get(), "Show Trace"));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience); // the line without one stays
+    QTest::keyClick(window.get(), Qt::Key_6, Qt::ControlModifier);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+    QCOMPARE(View(*window)->model()->index(0, LogModel::MessageColumn).data().toString(),
+             QString("b"));
     QTest::keyClick(window.get(), Qt::Key_4, Qt::ControlModifier);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 0, Patience);
     QTest::keyClick(window.get(), Qt::Key_1, Qt::ControlModifier);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+}
+
+// With its times and severities, as one run; problems are found and lines copied as in any log.
+void tst_LogInWindow::otherPrograms()
+{
+    const WindowTest test(run(1, QTime(9, 0), "x"));
+    const QString path = test.folder() + "syslog";
+    QVERIFY(TestFiles::write(path, "Nov 22 14:03:02 host cron[7]: caf\xC3\xA9\n"
+                                   "Nov 22 14:03:03 host app[8]: ERROR disk full\n"
+                                   "    more about it\n"
+                                   "Jan  1 14:03:04 host cron[7]: x\n"));
+    const auto window = WindowTest::show();
+    window->OpenFile(path);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 4, Patience);
+    LogView* view = View(*window);
+    const auto text = [&](int row, int column) {
+        return view->model()->index(row, column).data().toString();
+    };
+    QCOMPARE(text(0, LogModel::TimeColumn), QString("Nov 22 14:03:02"));
+    QCOMPARE(text(0, LogModel::MessageColumn), QString("host cron[7]: caf\u00e9"));
+    QCOMPARE(text(1, LogModel::SeverityColumn), QString("Error"));
+    QVERIFY(!view->isColumnHidden(LogModel::TimeColumn));
+    QVERIFY(!view->isColumnHidden(LogModel::SeverityColumn));
+    QVERIFY(Child<QLabel>(window.get(), "Lines shown")->text().endsWith("1 problem"));
+
+    QTest::keyClick(window.get(), Qt::Key_F8);
+    QCOMPARE(view->currentIndex().row(), 1);
+    QTest::keyClick(window.get(), Qt::Key_6, Qt::ControlModifier);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience); // the error and what follows it
+    QTest::keyClick(window.get(), Qt::Key_6, Qt::ControlModifier);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 4, Patience);
+    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
+    Type(QApplication::focusWidget(), "caf\u00e9");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+}
+
+void tst_LogInWindow::wideCharacters()
+{
+    const WindowTest test(run(1, QTime(9, 0), "x"));
+    const QString path = test.folder() + "wide.log";
+    const QString text = "\ufeff2026-11-22 14:03:02 ERROR caf\u00e9 \u20ac\r\n"
+                         "2026-11-22 14:03:03 INFO \u0a0a\r\n";
+    const QByteArray bytes(reinterpret_cast<char const*>(text.utf16()), 2 * text.size());
+    QVERIFY(TestFiles::write(path, bytes));
+    const auto window = WindowTest::show();
+    window->OpenFile(path);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    LogView* view = View(*window);
+    const auto cell = [&](int row, int column) {
+        return view->model()->index(row, column).data().toString();
+    };
+    QCOMPARE(cell(0, LogModel::TimeColumn), QString("2026-11-22 14:03:02"));
+    QCOMPARE(cell(0, LogModel::SeverityColumn), QString("Error"));
+    QCOMPARE(cell(0, LogModel::MessageColumn), QString("caf\u00e9 \u20ac"));
+    QCOMPARE(cell(1, LogModel::MessageColumn), QString("\u0a0a"));
+
+    view->setFocus();
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::NoModifier, RowCentre(view, 0));
+    QCOMPARE(Child<QPlainTextEdit>(Panel(*window), "Full text of the current line")->toPlainText(),
+             QString("2026-11-22 14:03:02 ERROR caf\u00e9 \u20ac"));
+    QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
+    QCOMPARE(QGuiApplication::clipboard()->text(),
+             QString("2026-11-22 14:03:02 ERROR caf\u00e9 \u20ac\n"));
+    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
+    Type(QApplication::focusWidget(), "caf\u00e9");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+}
+
+void tst_LogInWindow::choosesEncoding()
+{
+    const WindowTest test(entry("09:00:00.000", "Trace", "caf\u00e9"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+    const auto message = [&] {
+        return View(*window)->model()->index(0, LogModel::MessageColumn).data().toString();
+    };
+    QCOMPARE(message(), QString("caf\u00e9"));
+    QVERIFY(Action(*window, "Automatic")->isChecked());
+    Action(*window, "UTF-8")->trigger();
+    QTRY_COMPARE_WITH_TIMEOUT(message(), "caf" + QString(QChar::ReplacementCharacter), Patience);
+    QVERIFY(Action(*window, "UTF-8")->isChecked() && !Action(*window, "Automatic")->isChecked());
+    for (char const* name : {"UTF-16 LE", "UTF-16 BE"}) {
+        Action(*window, name)->trigger();
+        QTRY_VERIFY_WITH_TIMEOUT(!message().contains("caf"), Patience);
+    }
+    Action(*window, "Latin-1")->trigger();
+    QTRY_COMPARE_WITH_TIMEOUT(message(), QString("caf\u00e9"), Patience);
+
+    // Each tab has its own.
+    const QString path = test.folder() + "other.log";
+    QVERIFY(TestFiles::write(path, "x\n"));
+    window->OpenFile(path);
+    QVERIFY(Action(*window, "Automatic")->isChecked() && !Action(*window, "Latin-1")->isChecked());
+}
+
+void tst_LogInWindow::emptyColumns_data()
+{
+    QTest::addColumn<QByteArray>("file");
+    QTest::addColumn<bool>("hasTimes");
+    QTest::addColumn<bool>("hasSeverities");
+    QTest::newRow("nothing at all") << QByteArray() << true << true;
+    QTest::newRow("text") << QByteArray("a\nb\n") << false << false;
+    QTest::newRow("times") << QByteArray("2026-11-22 14:03:02 a\n2026-11-22 14:03:03 b\n") << true
+                           << false;
+    QTest::newRow("severities") << QByteArray("[ERROR] a\n[INFO] b\n") << false << true;
+}
+
+// The current line can be reached with keys whichever columns are shown.
+void tst_LogInWindow::emptyColumns()
+{
+    QFETCH(QByteArray, file);
+    QFETCH(bool, hasTimes);
+    QFETCH(bool, hasSeverities);
+    const WindowTest test(run(1, QTime(9, 0), "x"));
+    const QString path = test.folder() + "other.log";
+    QByteArray more;
+    for (int i = 0; i < 100; ++i)
+        more += file;
+    QVERIFY(TestFiles::write(path, more));
+    const auto window = WindowTest::show();
+    window->OpenFile(path);
+    LogView* view = View(*window);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), more.count('\n'), Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(!view->isColumnHidden(LogModel::TimeColumn), hasTimes, Patience);
+    QCOMPARE(!view->isColumnHidden(LogModel::SeverityColumn), hasSeverities);
+    QVERIFY(!view->isColumnHidden(LogModel::MessageColumn));
+    if (!hasSeverities)
+        return;
+    QTest::keyClick(view, Qt::Key_Home, Qt::ControlModifier);
+    for (int i = 0; i < 60; ++i)
+        QTest::keyClick(window.get(), Qt::Key_F8);
+    const QModelIndex current = view->currentIndex();
+    QCOMPARE(current.isValid(), !file.isEmpty());
+    if (current.isValid())
+        QVERIFY(view->viewport()->rect().intersects(view->visualRect(current)));
+}
+
+// Wide enough to be read; and as narrow as users make it.
+void tst_LogInWindow::longStamps()
+{
+    const WindowTest test(run(1, QTime(9, 0), "x"));
+    const QString path = test.folder() + "error.log";
+    const QByteArray line("[Sun Nov 22 14:03:02.123456 2026] [core:error] [pid 7] x\n");
+    QVERIFY(TestFiles::write(path, line));
+    const auto window = WindowTest::show();
+    window->OpenFile(path);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+    LogView* view = View(*window);
+    const QString stamp("Sun Nov 22 14:03:02.123456 2026");
+    const int needed = view->fontMetrics().boundingRect(stamp).width();
+    QTRY_VERIFY_WITH_TIMEOUT(view->columnWidth(LogModel::TimeColumn) > needed, Patience);
+    view->setColumnWidth(LogModel::TimeColumn, 50);
+    QVERIFY(TestFiles::write(path, line + line));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    QCOMPARE(view->columnWidth(LogModel::TimeColumn), 50);
+}
+
+// The first lines of a new file may not say yet what it is.
+void tst_LogInWindow::becomesForeign()
+{
+    const WindowTest test(run(1, QTime(9, 0), "x"));
+    const QString path = test.folder() + "other.log";
+    QVERIFY(TestFiles::write(path, "starting\n2026-11-22 14:0"));
+    const auto window = WindowTest::show();
+    window->OpenFile(path);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    LogView* view = View(*window);
+    QTRY_VERIFY_WITH_TIMEOUT(view->isColumnHidden(LogModel::TimeColumn), Patience);
+    QVERIFY(TestFiles::write(path, "starting\n2026-11-22 14:03:02 WARN caf\xC3\xA9\n"));
+    QTRY_VERIFY_WITH_TIMEOUT(!view->isColumnHidden(LogModel::TimeColumn), Patience);
+    QCOMPARE(view->model()->index(1, LogModel::SeverityColumn).data().toString(),
+             QString("Warning"));
+    QCOMPARE(view->model()->index(1, LogModel::MessageColumn).data().toString(),
+             QString("caf\u00e9"));
 }
 
 void tst_LogInWindow::pauses()

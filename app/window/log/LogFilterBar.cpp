@@ -74,16 +74,17 @@ QCheckBox* LogFilterBar::makeOption(QString const& text, QString const& name,
 
 void LogFilterBar::addSeverities()
 {
-    for (int i = 0; i < LogEntry::None; ++i) {
-        const QString name = LogSeverities::Name(static_cast<LogEntry::Severity>(i));
+    for (int i = 0; i <= LogEntry::None; ++i) {
+        const bool isNone = i == LogEntry::None;
+        const QString name = isNone ? tr("Other") : LogSeverities::Name(LogEntry::Severity(i));
         auto* button = new QToolButton;
         button->setCheckable(true);
         button->setChecked(true);
         button->setFocusPolicy(Qt::TabFocus);
         button->setText(name);
         button->setAccessibleName(tr("Show %1").arg(name));
-        button->setToolTip(
-            PlainToolTip(tr("Show or hide %1 entries (Ctrl+%2)").arg(name).arg(i + 1)));
+        const QString what = isNone ? tr("lines without a severity") : tr("%1 entries").arg(name);
+        button->setToolTip(PlainToolTip(tr("Show or hide %1 (Ctrl+%2)").arg(what).arg(i + 1)));
         button->setShortcut(QKeySequence(Qt::CTRL | (Qt::Key_1 + i)));
         button->setToolButtonStyle(Qt::ToolButtonIconOnly);
         connect(button, &QToolButton::toggled, this, &LogFilterBar::apply);
@@ -128,7 +129,7 @@ void LogFilterBar::SetEarlierRuns(bool shown)
 
 void LogFilterBar::apply()
 {
-    if (m_severities.size() < LogEntry::None)
+    if (m_severities.size() <= LogEntry::None)
         return; // controls are not complete yet
     m_typing.stop();
     for (int i = 0; i < m_severities.size(); ++i)

@@ -15,7 +15,8 @@ class QToolButton;
 
 namespace Velocor {
 
-/// The filter controls of a log view: text, match options, and one button per severity.
+/// The filter controls of a log view: text, match options, one button per severity and one for
+/// lines without a severity.
 class LogFilterBar : public QWidget
 {
     Q_OBJECT

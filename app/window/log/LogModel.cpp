@@ -3,6 +3,7 @@
 
 #include "app/window/log/LogModel.h"
 
+#include "app/logfile/LogIndex.h"
 #include "app/logfile/LogScanner.h"
 #include "app/logfile/LogSeverities.h"
 #include "app/window/widgets/FileSizeText.h"
@@ -33,6 +34,9 @@ QString OnOneLine(QString text)
 // A longer line is measured no further: rows are read while they are painted.
 constexpr qint64 MeasuredLength = 4 * 1000 * 1000; // bytes
 
+// A carriage return and a line feed, of two bytes each.
+constexpr qint64 LongestLineEnd = 4; // bytes
+
 // Follows what is shown of a line.
 QString Ellipsis(qint64 length)
 {
@@ -44,6 +48,13 @@ QString Ellipsis(qint64 length)
 QString GoneText()
 {
     return LogModel::tr("This line is no longer in the file");
+}
+
+// The length of a line, which starts at a character, without its end; -1 if the end is missing.
+int EndOfLine(QByteArray const& line, LogLineEnd const& lineEnd)
+{
+    char const* const last = lineEnd.Find(line.constBegin(), line.constEnd(), 0, '\0');
+    return last ? static_cast<int>(last - line.constData()) + 1 - lineEnd.size() : -1;
 }
 
 } // namespace
@@ -87,6 +98,8 @@ void LogModel::Open(QString const& path, LogLineParser const& parser, bool isCur
 {
     m_path = path;
     m_parser = parser;
+    m_parser.SetChosenEncoding(m_chosenEncoding);
+    m_parser.SetOwn(isCurrent);
     m_isCurrent = isCurrent;
     m_lines.clear();
     Reload();
@@ -102,6 +115,13 @@ void LogModel::Reload()
     Q_EMIT openRequested(m_request, m_path, m_parser, m_filter);
     if (!m_paused)
         m_pollTimer.start();
+}
+
+void LogModel::SetEncoding(LogEncoding encoding)
+{
+    m_chosenEncoding = encoding;
+    m_parser.SetChosenEncoding(encoding);
+    Reload();
 }
 
 void LogModel::SetFilter(LogFilter const& filter)
@@ -144,8 +164,9 @@ void LogModel::take(LogUpdate const& update)
         m_hasDropped = true;
         return;
     }
-    if (!m_paused)
+    if (!m_paused || !update.type.IsLike(m_parser.fileType()))
         m_lines.clear();
+    m_parser.SetFileType(update.type);
     if (update.isReset || wasReading || m_hasDropped)
         reset(update);
     else
@@ -249,19 +270,19 @@ QByteArray LogModel::readBytes(int row, qint64 limit) const
         return QByteArray();
 
     // A last line may have got longer since.
-    const qint64 most = limit + 2; // with the line end
+    const qint64 most = limit + LongestLineEnd;
     const qint64 length = start < rows.complete ? most : std::min(most, rows.end - start);
     const qint64 first = std::min<qint64>(length, 1024);
+    const LogLineEnd lineEnd = m_parser.fileType().lineEnd();
     QByteArray bytes = m_file.read(first);
-    int end = bytes.indexOf('\n');
+    int end = EndOfLine(bytes, lineEnd);
     if (end < 0 && bytes.size() == first && length > first) {
         bytes += m_file.read(length - first);
-        end = bytes.indexOf('\n', static_cast<int>(first));
+        end = EndOfLine(bytes, lineEnd);
     }
     if (end >= 0)
         bytes.truncate(end);
-    if (bytes.endsWith('\r'))
-        bytes.chop(1);
+    bytes.truncate(m_parser.fileType().encoding.WithoutReturn(bytes.constData(), bytes.size()));
     bytes.truncate(static_cast<int>(std::min<qint64>(limit, bytes.size())));
     return bytes;
 }
@@ -273,42 +294,46 @@ qint64 LogModel::lengthOf(int row) const
     const qint64 start = rows.starts[static_cast<size_t>(row)];
     const qint64 most =
         start < rows.complete ? MeasuredLength : std::min(MeasuredLength, rows.end - start);
-    qint64 length = 0;
-    bool hasReturn = false;
     if (!openFile() || !m_file.seek(start))
         return 0;
+    const LogLineEnd lineEnd = m_parser.fileType().lineEnd();
+    qint64 length = 0;
+    char before = '\0';
     while (length < most) {
         const QByteArray bytes = m_file.read(std::min<qint64>(most - length, 1 << 16));
-        const int found = bytes.indexOf('\n');
-        const int end = found < 0 ? bytes.size() : found;
-        hasReturn = end > 0 ? bytes[end - 1] == '\r' : hasReturn;
-        length += end;
-        if (found >= 0 || bytes.isEmpty())
+        if (bytes.isEmpty())
             break;
+        char const* const last = lineEnd.Find(bytes.constBegin(), bytes.constEnd(), length, before);
+        if (last)
+            return length + (last - bytes.constBegin()) + 1 - lineEnd.size();
+        length += bytes.size();
+        before = bytes.back();
     }
-    return hasReturn ? length - 1 : length;
+    return length;
 }
 
 LogModel::Line LogModel::readLine(int row) const
 {
     Line line;
     const auto position = static_cast<size_t>(row);
-    line.start = readBytes(row, LogRows::CheckedLength);
+    const int limit = m_parser.fileType().isForeign ? LogIndex::PartsLimit : LogRows::CheckedLength;
+    QByteArray bytes = readBytes(row, limit + 1);
+    bool isCut = bytes.size() > limit;
+    bytes.truncate(limit);
+    line.start = bytes.left(LogRows::CheckedLength);
     line.check = m_state.rows->checks[position];
     line.isTorn = m_state.rows->marks[position] & LogRows::Torn;
     line.isGone = LogRows::CheckOf(line.start.constData(), line.start.size()) != line.check;
     if (line.isGone)
         line.entry.message = GoneText();
     else if (line.isTorn)
-        line.entry.message = QString::fromLatin1(line.start);
+        line.entry.message = m_parser.Text(line.start);
     else
-        line.entry = m_parser.Parse(line.start);
-    line.entry.message = OnOneLine(line.entry.message);
-    if (line.isGone || line.start.size() < LogRows::CheckedLength)
-        return line;
-    const qint64 length = lengthOf(row);
-    if (length > LogRows::CheckedLength)
-        line.entry.message += Ellipsis(length);
+        line.entry = m_parser.Parse(bytes);
+    isCut = isCut || line.entry.message.size() > ShownLimit;
+    line.entry.message = OnOneLine(line.entry.message.left(ShownLimit));
+    if (!line.isGone && isCut)
+        line.entry.message += Ellipsis(lengthOf(row));
     return line;
 }
 
@@ -342,9 +367,9 @@ QString LogModel::LineText(int row, int limit) const
     if (line.isGone)
         return line.entry.message;
     if (line.start.size() < LogRows::CheckedLength || limit <= LogRows::CheckedLength)
-        return QString::fromLatin1(line.start.left(limit));
+        return m_parser.Text(line.start.left(limit));
     const QByteArray whole = readBytes(row, limit);
-    return whole.startsWith(line.start) ? QString::fromLatin1(whole) : GoneText();
+    return whole.startsWith(line.start) ? m_parser.Text(whole) : GoneText();
 }
 
 QPair<int, int> LogModel::EntryRows(int row) const

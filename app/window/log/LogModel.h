@@ -46,11 +46,18 @@ public:
 
     /// Shows another file, or reloads the same one. Rows appear when they have been read.
     ///
-    /// @param isCurrent  whether the running program writes it; only affects the heading
+    /// @param isCurrent  whether the running program writes it: then it is read as the log's own
     void Open(QString const& path, LogLineParser const& parser, bool isCurrent);
 
     /// Reads the file again from the start.
     void Reload();
+
+    /// Reads the file again in another encoding; Automatic finds out which. Another file that is
+    /// opened afterwards is read in it, too.
+    void SetEncoding(LogEncoding encoding);
+
+    /// The encoding that was chosen; Automatic if none was.
+    LogEncoding chosenEncoding() const { return m_chosenEncoding; }
 
     /// Shows only the rows that match a filter.
     void SetFilter(LogFilter const& filter);
@@ -72,8 +79,8 @@ public:
     /// there are no lines.
     int RowNear(qint64 start) const;
 
-    /// The line of a row, as stored in the file, without its line end; empty for a heading. If the
-    /// line is gone, a sentence that says so.
+    /// The text of a row's line in the file, without its line end; empty for a heading. If the line
+    /// is gone, a sentence that says so.
     ///
     /// @param limit  maximum number of bytes to read
     QString LineText(int row, int limit) const;
@@ -161,6 +168,7 @@ private:
 
     QString m_path;
     LogLineParser m_parser;
+    LogEncoding m_chosenEncoding = LogEncoding::Automatic;
     LogFilter m_filter;
     LogUpdate m_state;
     int m_rowCount = 0; // fewer than the rows of m_state only while a change is being signaled

@@ -213,6 +213,17 @@ bool LogPanel::showsEarlierRuns() const
     return m_filterBar->filter().earlierRuns();
 }
 
+void LogPanel::SetEncoding(LogEncoding encoding)
+{
+    m_model->SetEncoding(encoding);
+    Q_EMIT stateChanged();
+}
+
+LogEncoding LogPanel::chosenEncoding() const
+{
+    return m_model->chosenEncoding();
+}
+
 void LogPanel::FocusFilter()
 {
     m_filterBar->FocusText();

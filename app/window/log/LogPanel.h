@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include "app/logfile/LogEncoding.h"
+
 #include <QList>
 #include <QString>
 #include <QWidget>
@@ -44,6 +46,10 @@ public:
     bool isFollowing() const;
     void SetEarlierRuns(bool shown);
     bool showsEarlierRuns() const;
+
+    /// Reads the file in another encoding; Automatic finds out which.
+    void SetEncoding(LogEncoding encoding);
+    LogEncoding chosenEncoding() const;
 
     void FocusFilter();
     void ClearFilter();

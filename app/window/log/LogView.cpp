@@ -148,7 +148,12 @@ void LogView::rowsAboutToBeRemoved(QModelIndex const& parent, int first, int las
 void LogView::afterRefresh()
 {
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
-    setColumnHidden(LogModel::ElapsedColumn, !m_model->state().hasElapsed);
+    // An empty log may get anything.
+    LogUpdate const& state = m_model->state();
+    setColumnHidden(LogModel::TimeColumn, !state.hasTimes && state.lines > 0);
+    setColumnHidden(LogModel::SeverityColumn, !state.hasSeverities && state.lines > 0);
+    setColumnHidden(LogModel::ElapsedColumn, !state.hasElapsed);
+    fitTimes();
     updateHeadings();
     restoreCurrent();
     if (m_following) {
@@ -183,13 +188,25 @@ void LogView::restoreCurrent()
                          m_model->LineText(row, LogModel::ShownLimit) != m_keptText;
     if (row < 0 || isOther || currentIndex().isValid())
         return;
-    const QModelIndex index = m_model->index(row, LogModel::TimeColumn);
+    const QModelIndex index = m_model->index(row, firstColumn());
     selectionModel()->setCurrentIndex(index, QItemSelectionModel::ClearAndSelect |
                                                  QItemSelectionModel::Rows);
     if (row + 1 < m_model->rowCount())
         SetFollowing(false);
     updateGeometries(); // updates the scroll bar's range
     verticalScrollBar()->setValue(row - m_keptDistance);
+}
+
+// Other programs' stamps may be longer than the log's own. Once for a file, or users could not make
+// the column narrow.
+void LogView::fitTimes()
+{
+    LogUpdate const& state = m_model->state();
+    if (m_fittedPath == m_model->path() || !state.type.isForeign || !state.hasTimes)
+        return;
+    m_fittedPath = m_model->path();
+    const int width = sizeHintForColumn(LogModel::TimeColumn);
+    setColumnWidth(LogModel::TimeColumn, std::max(columnWidth(LogModel::TimeColumn), width));
 }
 
 // A heading spans all columns.
@@ -217,6 +234,15 @@ int LogView::rowBefore(int step) const
     return last < 0 ? m_model->rowCount() : last + 1;
 }
 
+// Qt does not scroll to hidden columns.
+int LogView::firstColumn() const
+{
+    int column = 0;
+    while (isColumnHidden(column))
+        ++column;
+    return column;
+}
+
 LogView::Jump LogView::GoToProblem(int step)
 {
     Jump jump = Jump::Ahead;
@@ -228,7 +254,7 @@ LogView::Jump LogView::GoToProblem(int step)
     if (row < 0)
         return Jump::None;
     // Whatever keys are held: Shift would extend the selection.
-    const QModelIndex index = m_model->index(row, LogModel::TimeColumn);
+    const QModelIndex index = m_model->index(row, firstColumn());
     selectionModel()->setCurrentIndex(index, QItemSelectionModel::ClearAndSelect |
                                                  QItemSelectionModel::Rows);
     scrollTo(index, PositionAtCenter);

@@ -72,13 +72,16 @@ private:
     void noteCurrent();
     void restoreCurrent();
     int rowBefore(int step) const;
+    int firstColumn() const;
     void setRowHeight();
+    void fitTimes();
     void updateHeadings();
     QList<int> selectedRowNumbers() const;
 
     LogModel* m_model;
     LogDelegate* m_delegate;
     QString m_placeholder;
+    QString m_fittedPath;
     bool m_following = true;
     bool m_scrollingItself = false;
     int m_earlierRows = -1;

@@ -83,6 +83,9 @@ void Draw(QPainter& painter, LogEntry::Severity severity, QColor const& color, Q
         DrawMark(painter, mark, 4, 8.6);
         break;
     case LogEntry::None:
+        painter.setPen(QPen(color, 1.6, Qt::DotLine));
+        painter.setBrush(Qt::NoBrush);
+        painter.drawEllipse(QPointF(8, 8), 5.5, 5.5);
         break;
     }
 }

@@ -1,0 +1,368 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// Lines of other programs' logs, in the formats that they document.
+
+#include "app/logfile/ForeignLine.h"
+#include "app/logfile/LogLineParser.h"
+
+#include <QtTest>
+
+#include <random>
+
+using namespace Velocor;
+
+Q_DECLARE_METATYPE(LogEntry::Severity)
+
+namespace {
+
+LogLineParser ForeignParser()
+{
+    LogFileType type;
+    type.isForeign = true;
+    type.encoding = LogEncoding::Utf8;
+    type.latest = QDate(2026, 11, 25);
+    LogLineParser parser;
+    parser.SetFileType(type);
+    return parser;
+}
+
+} // namespace
+
+class tst_ForeignLine : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void formats_data();
+    void formats();
+    void severities_data();
+    void severities();
+    void noEntries_data();
+    void noEntries();
+    void keys_data();
+    void keys();
+    void epochs_data();
+    void epochs();
+    void anyBytes();
+};
+
+void tst_ForeignLine::formats_data()
+{
+    QTest::addColumn<QByteArray>("line");
+    QTest::addColumn<QString>("time");
+    QTest::addColumn<LogEntry::Severity>("severity");
+    QTest::addColumn<QString>("message");
+
+    const auto none = LogEntry::None;
+    const auto trace = LogEntry::Trace;
+    const auto note = LogEntry::Notification;
+    const auto warning = LogEntry::Warning;
+    const auto error = LogEntry::Error;
+    const auto fatal = LogEntry::Fatal;
+    const auto row = [](char const* name, QByteArray const& line, char const* time,
+                        LogEntry::Severity severity, char const* message) {
+        QTest::newRow(name) << line << QString(time) << severity << QString(message);
+    };
+
+    row("date, time, level", "2026-11-22 14:03:02 ERROR disk full", "2026-11-22 14:03:02", error,
+        "disk full");
+    row("milliseconds after a dot", "2026-11-22 14:03:02.123 INFO x", "2026-11-22 14:03:02.123",
+        note, "x");
+    row("milliseconds after a comma", "2026-11-22 14:03:02,123 DEBUG x", "2026-11-22 14:03:02,123",
+        trace, "x");
+    row("padded level", "2026-11-22 14:03:02.123  WARN 71 --- [main] a.B : x",
+        "2026-11-22 14:03:02.123", warning, "71 --- [main] a.B : x");
+    row("ISO 8601, UTC", "2026-11-22T14:03:02Z error: x", "2026-11-22T14:03:02Z", error, "x");
+    row("ISO 8601, offset", "2026-11-22T14:03:02.123456+01:00 host prog[7]: started",
+        "2026-11-22T14:03:02.123456+01:00", none, "host prog[7]: started");
+    row("ISO 8601, basic", "20261122T140302Z x", "20261122T140302Z", none, "x");
+    row("time zone by name", "2026-11-22 14:03:02.123 UTC [71] FATAL:  no such role",
+        "2026-11-22 14:03:02.123 UTC", fatal, "[71] FATAL:  no such role");
+    row("slashes", "2026/11/22 14:03:02 listening", "2026/11/22 14:03:02", none, "listening");
+    row("German date", "22.11.2026 14:03:02 WARNUNG x", "22.11.2026 14:03:02", none, "WARNUNG x");
+    row("time only", "14:03:02.5 [warn] x", "14:03:02.5", warning, "x");
+    row("time alone", "2026-11-22 14:03:02", "2026-11-22 14:03:02", none, "");
+
+    row("stamp and level in brackets", "[2026-11-22 14:03:02.123] [error] x",
+        "2026-11-22 14:03:02.123", error, "x");
+    row("a logger's name between them", "[2026-11-22 14:03:02.123] [net] [warning] x",
+        "2026-11-22 14:03:02.123", warning, "[net] [warning] x");
+    row("level within the stamp's brackets", "[2026-11-22T14:03:02Z WARN  net::io] x",
+        "2026-11-22T14:03:02Z", warning, "net::io] x");
+    row("a thread between them", "2026-11-22 14:03:02,123 [http thread 1] ERROR a.B - x",
+        "2026-11-22 14:03:02,123", error, "[http thread 1] ERROR a.B - x");
+    row("Python logging", "2026-11-22 14:03:02,123 - net.io - WARNING - slow",
+        "2026-11-22 14:03:02,123", warning, "net.io - WARNING - slow");
+    row("Python logging without a time", "CRITICAL:root:out of memory", "", fatal,
+        "root:out of memory");
+    row("level in brackets without a time", "[WARNING] 3 tests skipped", "", warning,
+        "3 tests skipped");
+    row("level before the stamp", "INFO 2026-11-22 14:03:02,123 x", "2026-11-22 14:03:02,123", note,
+        "x");
+    row("compiler", "error: linker failed", "", error, "linker failed");
+    row("Ruby", "W, [2026-11-22T14:03:02.123456 #71]  WARN -- : x", "2026-11-22T14:03:02.123456",
+        warning, "#71]  WARN -- : x");
+    row("letter and stamp", "E1122 14:03:02.123456 71 file.cc:12] x", "1122 14:03:02.123456", error,
+        "71 file.cc:12] x");
+    row("letter and stamp in brackets", "[I 2026-11-22 14:03:02.123 ServerApp] x",
+        "2026-11-22 14:03:02.123", note, "ServerApp] x");
+    row("letter and short date", "[E 261122 14:03:02 web:1] 500 GET /", "261122 14:03:02", error,
+        "web:1] 500 GET /");
+    row("Android", "11-22 14:03:02.123  1200  1203 E Camera: lost", "11-22 14:03:02.123", error,
+        "1200  1203 E Camera: lost");
+    row("Redis", "71:M 22 Nov 2026 14:03:02.123 * Ready", "22 Nov 2026 14:03:02.123", none,
+        "71:M 22 Nov 2026 14:03:02.123 * Ready");
+    row("MySQL", "2026-11-22T14:03:02.123456Z 0 [Warning] [MY-010068] [Server] x",
+        "2026-11-22T14:03:02.123456Z", warning, "0 [Warning] [MY-010068] [Server] x");
+    row("Go with slog text", "time=2026-11-22T14:03:02.123Z level=WARN msg=\"disk \\\"a\\\" slow\"",
+        "2026-11-22T14:03:02.123Z", warning, "disk \"a\" slow");
+
+    row("Apache", "[Sun Nov 22 14:03:02.123456 2026] [core:error] [pid 71:tid 1] AH00126: x",
+        "Sun Nov 22 14:03:02.123456 2026", error, "[pid 71:tid 1] AH00126: x");
+    row("Apache, older", "[Sun Nov 22 14:03:02 2026] [notice] x", "Sun Nov 22 14:03:02 2026", note,
+        "x");
+    row("nginx", "2026/11/22 14:03:02 [crit] 71#71: *1 x", "2026/11/22 14:03:02", fatal,
+        "71#71: *1 x");
+    row("access log", "127.0.0.1 - - [22/Nov/2026:14:03:02 +0000] \"GET / HTTP/1.1\" 200 5",
+        "22/Nov/2026:14:03:02 +0000", none,
+        "127.0.0.1 - - [22/Nov/2026:14:03:02 +0000] \"GET / HTTP/1.1\" 200 5");
+
+    row("RFC 3164", "Nov 22 14:03:02 host sshd[71]: Accepted key", "Nov 22 14:03:02", none,
+        "host sshd[71]: Accepted key");
+    row("RFC 3164, one digit", "Nov  2 14:03:02 host cron[71]: x", "Nov  2 14:03:02", none,
+        "host cron[71]: x");
+    row("RFC 3164, level after the tag", "Nov 22 14:03:02 host app[71]: ERROR disk full",
+        "Nov 22 14:03:02", error, "host app[71]: ERROR disk full");
+    row("RFC 3164, level with a colon", "Nov 22 14:03:02 host app: warning: disk full",
+        "Nov 22 14:03:02", warning, "host app: warning: disk full");
+    row("RFC 3164, a word of the message", "Nov 22 14:03:02 host kernel: Error reading x",
+        "Nov 22 14:03:02", none, "host kernel: Error reading x");
+    row("RFC 3164, a severity further on", "Nov 22 14:03:02 host app[71]: ended with ERROR 7",
+        "Nov 22 14:03:02", none, "host app[71]: ended with ERROR 7");
+    row("RFC 3164 with its priority", "<34>Oct 11 22:14:15 mymachine su: 'su root' failed",
+        "Oct 11 22:14:15", fatal, "mymachine su: 'su root' failed");
+    row("RFC 5424", "<165>1 2003-10-11T22:14:15.003Z host app - ID47 - x",
+        "2003-10-11T22:14:15.003Z", note, "host app - ID47 - x");
+    row("RFC 5424 without a time", "<11>1 - host app - - - x", "", error, "- host app - - - x");
+    row("journal, short-full", "Sun 2026-11-22 14:03:02 UTC host app[71]: x",
+        "Sun 2026-11-22 14:03:02 UTC", none, "host app[71]: x");
+    row("journal, short-monotonic", "[   12.345678] host app[71]: x", "12.345678", none,
+        "host app[71]: x");
+    row("kernel", "[    0.000000] Linux version 6.1", "0.000000", none, "Linux version 6.1");
+    row("kernel with its priority", "<4>[    1.250000] ACPI: x", "1.250000", warning, "ACPI: x");
+    row("kernel, decoded", "kern  :err   : [    1.250000] ata1: x", "1.250000", error, "ata1: x");
+    row("kernel, time of day", "[Sun Nov 22 14:03:02 2026] usb 1-1: x", "Sun Nov 22 14:03:02 2026",
+        none, "usb 1-1: x");
+    row("X server", "[    12.345] (EE) Failed to load module", "12.345", error,
+        "Failed to load module");
+    row("X server, information", "[    12.345] (**) Option x", "12.345", note, "Option x");
+
+    row("dpkg", "2026-11-22 14:03:02 status installed libc6:amd64 2.36", "2026-11-22 14:03:02",
+        none, "status installed libc6:amd64 2.36");
+    row("apt history", "Start-Date: 2026-11-22  14:03:02", "2026-11-22  14:03:02", none,
+        "Start-Date: 2026-11-22  14:03:02");
+    row("apt terminal", "Log started: 2026-11-22  14:03:02", "2026-11-22  14:03:02", none,
+        "Log started: 2026-11-22  14:03:02");
+    row("alternatives", "update-alternatives 2026-11-22 14:03:02: run with x",
+        "2026-11-22 14:03:02", none, "update-alternatives 2026-11-22 14:03:02: run with x");
+
+    row("JSON", R"({"time":"2026-11-22T14:03:02Z","level":"error","msg":"disk full"})",
+        "2026-11-22T14:03:02Z", error, "disk full");
+    row("JSON, level by number", R"({"level":50,"time":"14:03:02","pid":71,"msg":"x"})", "14:03:02",
+        error, "x");
+    row("JSON, syslog level", R"({"level":4,"short_message":"x"})", "", warning, "x");
+    row("JSON, escapes", R"({"message":"a\"b\\c\né\/\q","severity":"WARNING"})", "", warning,
+        "a\"b\\c\n\xC3\xA9/\\q");
+    row("JSON, nested objects do not count",
+        R"({"a":{"level":"fatal","b":["}"]},"level":"info","message":"x"})", "", note, "x");
+    row("JSON, blanks", R"({ "ts" : "2026-11-22 14:03:02" , "level" : "debug" , "msg" : "x" })",
+        "2026-11-22 14:03:02", trace, "x");
+    row("JSON of the journal", R"({"PRIORITY":"3","MESSAGE":"x","_PID":"71"})", "", error, "x");
+    row("JSON of containers", R"({"log":"x\n","stream":"stderr","time":"2026-11-22T14:03:02.1Z"})",
+        "2026-11-22T14:03:02.1Z", none, "x\n");
+    row("JSON, several times and messages",
+        R"({"date":"2026-11-20","timestamp":"2026-11-22 14:03:02","t":"09:00:00","event":"a",)"
+        R"("message":"b","text":"c","severity":"info","priority":"3"})",
+        "2026-11-22 14:03:02", note, "b");
+    row("JSON without a message", R"({"level":"info","a":1})", "", note,
+        R"({"level":"info","a":1})");
+    row("JSON that is cut", R"({"level":"info","msg":"abc)", "", note,
+        R"({"level":"info","msg":"abc)");
+    row("journal export", "__CURSOR=s=1\nPRIORITY=4\nMESSAGE=a\n_PID=7", "", warning, "a");
+    row("journal export, value with its size",
+        QByteArray("__CURSOR=s=1\nPRIORITY=2\nMESSAGE\n\x03\0\0\0\0\0\0\0a\nb\n_PID=7", 57), "",
+        fatal, "a\nb");
+}
+
+void tst_ForeignLine::formats()
+{
+    QFETCH(QByteArray, line);
+    const LogEntry entry = ForeignParser().Parse(line);
+    QVERIFY(entry.isEntry);
+    QTEST(entry.time, "time");
+    QTEST(entry.severity, "severity");
+    QTEST(entry.message, "message");
+
+    // What the index finds is what the table shows.
+    const LogLineParser::Parts parts = ForeignParser().Find(line.constData(), line.size());
+    QVERIFY(parts.isEntry);
+    QCOMPARE(parts.severity, entry.severity);
+    QCOMPARE(parts.timeLength > 0, !entry.time.isEmpty());
+    QCOMPARE(parts.timeKey >= 0, !entry.time.isEmpty());
+}
+
+void tst_ForeignLine::severities_data()
+{
+    QTest::addColumn<LogEntry::Severity>("severity");
+    const auto rows = [](LogEntry::Severity severity, QStringList const& names) {
+        for (QString const& name : names)
+            QTest::newRow(qPrintable(name)) << severity;
+    };
+    rows(LogEntry::Fatal, {"EMERG", "PANIC", "ALERT", "CRIT", "CRITICAL", "FATAL"});
+    rows(LogEntry::Error, {"ERROR", "ERR", "SEVERE"});
+    rows(LogEntry::Warning, {"WARNING", "WARN"});
+    rows(LogEntry::Notification, {"NOTICE", "INFO", "LOG"});
+    rows(LogEntry::Trace, {"DEBUG", "TRACE", "VERBOSE", "FINE", "FINEST"});
+    rows(LogEntry::None, {"INFOS", "XERROR", "GET", "ER"});
+}
+
+void tst_ForeignLine::severities()
+{
+    QFETCH(LogEntry::Severity, severity);
+    const QByteArray name(QTest::currentDataTag());
+    const LogLineParser parser = ForeignParser();
+    const QByteArray stamp("2026-11-22 14:03:02 ");
+    QCOMPARE(parser.Parse(stamp + name + " x").severity, severity);
+    QCOMPARE(parser.Parse(stamp + '[' + name.toLower() + "] x").severity, severity);
+    QCOMPARE(parser.Parse("{\"level\":\"" + name.toLower() + "\"}").severity, severity);
+}
+
+void tst_ForeignLine::noEntries_data()
+{
+    QTest::addColumn<QByteArray>("line");
+    const auto row = [](char const* name, char const* line) {
+        QTest::newRow(name) << QByteArray(line);
+    };
+    row("empty", "");
+    row("text", "and so on");
+    row("stack trace", "    at a.b.C.run(C.java:12)");
+    row("stack trace of Python", "  File \"a.py\", line 12, in f");
+    row("indented stamp of more than a blank", "    2026-11-22 14:03:02 x");
+    row("everyday word", "Note that this is text");
+    row("severity in small letters", "error in line 3");
+    row("list", "[1] a source");
+    row("list of letters", "[x] done");
+    row("impossible month", "2026-13-22 14:03:02 x");
+    row("impossible day", "2026-11-32 14:03:02 x");
+    row("impossible minute", "2026-11-22 14:63:02 x");
+    row("longer number", "2026-11-22 14:03:021 x");
+    row("a version", "10.2.2026 is no time");
+    row("priority out of range", "<192>x");
+    row("markup", "<b>x</b>");
+    row("empty JSON", "{}");
+    row("JSON without known members", "{\"a\":1}");
+    row("assignment", "a=1 b=2");
+}
+
+void tst_ForeignLine::noEntries()
+{
+    QFETCH(QByteArray, line);
+    const LogEntry entry = ForeignParser().Parse(line);
+    QVERIFY(!entry.isEntry);
+    QCOMPARE(entry.time, QString());
+    QCOMPARE(entry.severity, LogEntry::None);
+    QCOMPARE(entry.message, QString::fromUtf8(line));
+}
+
+// Which of two stamps is later, and by how much.
+void tst_ForeignLine::keys_data()
+{
+    QTest::addColumn<QByteArray>("earlier");
+    QTest::addColumn<QByteArray>("later");
+    QTest::addColumn<qint64>("difference");
+    const auto row = [](char const* name, char const* earlier, char const* later,
+                        qint64 difference) {
+        QTest::newRow(name) << QByteArray(earlier) << QByteArray(later) << difference;
+    };
+    const qint64 day = 24 * 60 * 60 * 1000;
+    row("milliseconds", "2026-11-22 14:03:02.1 x", "2026-11-22 14:03:02,123456 x", 23);
+    row("months", "2026-02-28 14:03:02 x", "2026-03-01 14:03:02 x", day);
+    row("months by name", "Feb 28 14:03:02 x", "Mar  1 14:03:02 x", day);
+    row("a year that is not written", "Dec 31 14:03:02 x", "Jan  1 14:03:02 x", day);
+    row("a few days ahead", "Nov 22 14:03:02 x", "Dec  2 14:03:02 x", 10 * day);
+    row("different formats", "Nov 22 14:03:02 x", "[Sun Nov 22 14:03:03.5 2026] x", 1500);
+    row("with the log's own", "2026-11-22 14:03:02.100 x", "2026-11-22T14:03:02.200 x", 100);
+    row("seconds since the start", "[    1.250000] x", "[   12.345] x", 11095);
+    row("compact", "I1122 14:03:02.000000 x", "E20261122 14:03:02.500 x", 500);
+}
+
+void tst_ForeignLine::keys()
+{
+    QFETCH(QByteArray, earlier);
+    QFETCH(QByteArray, later);
+    const LogLineParser parser = ForeignParser();
+    const qint64 first = parser.Find(earlier.constData(), earlier.size()).timeKey;
+    const qint64 second = parser.Find(later.constData(), later.size()).timeKey;
+    QVERIFY(first >= 0);
+    QTEST(second - first, "difference");
+}
+
+void tst_ForeignLine::epochs_data()
+{
+    QTest::addColumn<QByteArray>("line");
+    const auto row = [](char const* name, char const* line) {
+        QTest::newRow(name) << QByteArray(line);
+    };
+    row("seconds", R"({"ts":1795442582,"level":"info"})");
+    row("fraction", R"({"ts":1795442582.000123,"level":"info"})");
+    row("milliseconds", R"({"time":1795442582000,"level":30})");
+    row("microseconds", R"({"__REALTIME_TIMESTAMP":"1795442582000000","PRIORITY":"6"})");
+    row("nanoseconds", R"({"ts":1795442582000000000,"level":"info"})");
+    row("journal export", "__CURSOR=s=1\n__REALTIME_TIMESTAMP=1795442582000000\nPRIORITY=6");
+}
+
+void tst_ForeignLine::epochs()
+{
+    QFETCH(QByteArray, line);
+    const QDateTime time = QDateTime::fromMSecsSinceEpoch(1795442582000);
+    const LogEntry entry = ForeignParser().Parse(line);
+    QCOMPARE(entry.time, time.toString("yyyy-MM-dd hh:mm:ss.zzz"));
+    QCOMPARE(entry.severity, LogEntry::Notification);
+    const QByteArray written = time.toString("yyyy-MM-dd hh:mm:ss.zzz INFO x").toLatin1();
+    const LogLineParser parser = ForeignParser();
+    QCOMPARE(parser.Find(line.constData(), line.size()).timeKey,
+             parser.Find(written.constData(), written.size()).timeKey);
+}
+
+// No bytes are read beyond the line, and the parts are within it. Also meant for the sanitizers.
+void tst_ForeignLine::anyBytes()
+{
+    std::mt19937 random(1);
+    const QByteArray seeds[] = {
+        "<34>1 2026-11-22T14:03:02.123Z host app[71]: ERROR x",
+        "[Sun Nov 22 14:03:02.123456 2026] [core:error] (EE) x",
+        "kern  :err   : [    1.250000] W, [2026-11-22 14:03:02 x",
+        R"({"time":1795442582.5,"level":"er\"ror","a":{"b":[1]},"msg":"x\u00e9"})",
+        "time=2026-11-22T14:03:02.123Z level=WARN msg=\"disk \\\"a\\\" slow\"",
+        QByteArray("__CURSOR=s=1\nMESSAGE\n\x03\0\0\0\0\0\0\0a\nb\nPRIORITY=7", 54),
+    };
+    for (int i = 0; i < 60000; ++i) {
+        QByteArray line = seeds[random() % 6];
+        line.truncate(static_cast<int>(random() % static_cast<unsigned>(line.size() + 1)));
+        for (int change = static_cast<int>(random() % 4); change > 0 && !line.isEmpty(); --change)
+            line[static_cast<int>(random() % static_cast<unsigned>(line.size()))] =
+                static_cast<char>(random());
+        const std::vector<char> exact(line.begin(), line.end());
+        const ForeignLine found = ForeignLine::Read(exact.data(), line.size(), QDate(2026, 11, 22));
+        QVERIFY(found.time.start >= 0 && found.time.length >= 0);
+        QVERIFY(found.time.start + found.time.length <= line.size());
+        QVERIFY(found.message.start >= 0 && found.message.length >= 0);
+        QVERIFY(found.message.start + found.message.length <= line.size());
+        QVERIFY(found.isEntry || found.severity == LogEntry::None);
+        ForeignParser().Parse(line);
+    }
+}
+
+QTEST_GUILESS_MAIN(tst_ForeignLine)
+#include "tst_ForeignLine.moc"
