@@ -127,16 +127,6 @@ void LogEncoding::Narrow(char const*& line, int& length, QByteArray& buffer) con
     }
 }
 
-int LogEncoding::WithoutReturn(char const* line, int length) const
-{
-    const int unit = isWide() ? 2 : 1;
-    const int low = m_kind == Utf16Be ? 1 : 0;
-    char const* const last = line + length - unit;
-    const bool isReturn =
-        length >= unit && last[low] == '\r' && (unit == 1 || last[1 - low] == '\0');
-    return isReturn ? length - unit : length;
-}
-
 char const* LogLineEnd::Find(char const* at, char const* end, qint64 offset, char before) const
 {
     char const* const start = at;

@@ -45,7 +45,15 @@ public:
     void Narrow(char const*& line, int& length, QByteArray& buffer) const;
 
     /// The length of a line without a carriage return at its end, in bytes.
-    int WithoutReturn(char const* line, int length) const;
+    int WithoutReturn(char const* line, int length) const
+    {
+        const int unit = isWide() ? 2 : 1;
+        const int low = m_kind == Utf16Be ? 1 : 0;
+        char const* const last = line + length - unit;
+        const bool isReturn =
+            length >= unit && last[low] == '\r' && (unit == 1 || last[1 - low] == '\0');
+        return isReturn ? length - unit : length;
+    }
 
     /// The encoding of lines from Narrow().
     LogEncoding narrowed() const { return isWide() ? LogEncoding(Utf8) : *this; }

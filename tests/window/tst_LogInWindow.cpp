@@ -71,6 +71,7 @@ private slots:
     void filterByExpression();
     void filterBySeverity();
     void otherPrograms();
+    void journalExport();
     void wideCharacters();
     void choosesEncoding();
     void emptyColumns_data();
@@ -311,6 +312,31 @@ void tst_LogInWindow::otherPrograms()
     QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
     Type(QApplication::focusWidget(), "caf\u00e9");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+}
+
+// One row for an entry, which has many lines in the file.
+void tst_LogInWindow::journalExport()
+{
+    const WindowTest test(run(1, QTime(9, 0), "x"));
+    const QString path = test.folder() + "journal.export";
+    const QByteArray first("__CURSOR=s=1\n__REALTIME_TIMESTAMP=1795442582000000\nPRIORITY=3\n"
+                           "MESSAGE=disk full\n_PID=7");
+    QVERIFY(TestFiles::write(path, first + "\n\n__CURSOR=s=2\nMESSAGE=more\nPRIORITY=6\n\n"));
+    const auto window = WindowTest::show();
+    window->OpenFile(path);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    LogView* view = View(*window);
+    const auto text = [&](int row, int column) {
+        return view->model()->index(row, column).data().toString();
+    };
+    const QDateTime time = QDateTime::fromMSecsSinceEpoch(1795442582000);
+    QCOMPARE(text(0, LogModel::TimeColumn), time.toString("yyyy-MM-dd hh:mm:ss.zzz"));
+    QCOMPARE(text(0, LogModel::SeverityColumn), QString("Error"));
+    QCOMPARE(text(0, LogModel::MessageColumn), QString("disk full"));
+    QCOMPARE(text(1, LogModel::MessageColumn), QString("more"));
+    QTest::keyClick(window.get(), Qt::Key_F8);
+    QCOMPARE(Child<QPlainTextEdit>(Panel(*window), "Full text of the current line")->toPlainText(),
+             QString(first));
 }
 
 void tst_LogInWindow::wideCharacters()
