@@ -216,7 +216,17 @@ void MainWindow::makeEditMenu()
     addAction(menu, tr("Select &All"), QKeySequence::SelectAll, tr("Select all lines"),
               [this] { selectAll(); });
     menu->addSeparator();
-    m_logActions.append(addAction(menu, tr("&Filter"), QKeySequence::Find,
+    m_logActions.append(addAction(menu, tr("&Find"), QKeySequence::Find,
+                                  tr("Go to lines that contain a text, among the others"),
+                                  [this] { m_tabs->currentLog()->OpenFind(); }));
+    m_logActions.append(addAction(menu, tr("Find &Next"), QKeySequence(tr("F3")),
+                                  tr("Go to the next line found"),
+                                  [this] { m_tabs->currentLog()->FindNext(1); }));
+    m_logActions.append(addAction(menu, tr("Find Pre&vious"), QKeySequence(tr("Shift+F3")),
+                                  tr("Go to the previous line found"),
+                                  [this] { m_tabs->currentLog()->FindNext(-1); }));
+    menu->addSeparator();
+    m_logActions.append(addAction(menu, tr("F&ilter"), QKeySequence(tr("Ctrl+L")),
                                   tr("Show only lines that contain the filter text"),
                                   [this] { m_tabs->currentLog()->FocusFilter(); }));
     m_logActions.append(addAction(menu, tr("Clear Fi&lter"), QKeySequence(tr("Ctrl+Shift+F")),

@@ -193,7 +193,7 @@ void tst_LogInWindow::filterByText()
     const WindowTest test(run(30, QTime(9, 0), "Entry"));
     const auto window = WindowTest::show();
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 30, Patience);
-    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
+    QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);
     QVERIFY(Child<QLineEdit>(window.get(), "Filter by text")->hasFocus());
     QTest::keyClicks(QApplication::focusWidget(), "entry 2");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 11, Patience);
@@ -206,7 +206,7 @@ void tst_LogInWindow::filterByText()
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 30, Patience);
 
     // Marks are drawn in a color that is used nowhere else.
-    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
+    QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);
     QTest::keyClicks(QApplication::focusWidget(), "Entry 7");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
     LogView* view = View(*window);
@@ -230,7 +230,7 @@ void tst_LogInWindow::filterByExpression()
     const auto window = WindowTest::show();
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 30, Patience);
     ClickBox(Child<QCheckBox>(window.get(), "Regular expression"));
-    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
+    QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);
     QTest::keyClicks(QApplication::focusWidget(), "x (3|4)$");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
 

@@ -8,7 +8,6 @@
 
 #include <QApplication>
 #include <QPainter>
-#include <QTextLayout>
 
 namespace Velocor {
 
@@ -34,6 +33,27 @@ QTextCharFormat MarkFormat()
     format.setForeground(QColor(0x1a, 0x1a, 0x1a));
     format.setFontUnderline(true);
     return format;
+}
+
+// Dark text on light blue, which nobody mistakes for the yellow of the filter.
+QTextCharFormat FoundFormat()
+{
+    QTextCharFormat format;
+    format.setBackground(QColor(0x74, 0xe0, 0xef));
+    format.setForeground(QColor(0x1a, 0x1a, 0x1a));
+    return format;
+}
+
+void AddFormats(QVector<QTextLayout::FormatRange>& formats, QVector<QPair<int, int>> const& ranges,
+                QTextCharFormat const& format)
+{
+    for (QPair<int, int> const& range : ranges) {
+        QTextLayout::FormatRange added;
+        added.start = range.first;
+        added.length = range.second;
+        added.format = format;
+        formats.append(added);
+    }
 }
 
 } // namespace
@@ -70,12 +90,21 @@ void LogDelegate::paint(QPainter* painter, QStyleOptionViewItem const& option,
 
     // Not in the severity column, because the filter does not search translated names.
     const bool isMarkable = index.column() != LogModel::SeverityColumn;
-    const QVector<QPair<int, int>> ranges =
-        isMarkable ? m_filter.Ranges(cell.text) : QVector<QPair<int, int>>();
-    if (ranges.isEmpty())
+    const QVector<QTextLayout::FormatRange> formats =
+        isMarkable ? marks(cell.text) : QVector<QTextLayout::FormatRange>();
+    if (formats.isEmpty())
         StyleOf(cell)->drawControl(QStyle::CE_ItemViewItem, &cell, painter, cell.widget);
     else
-        paintMarked(painter, cell, ranges);
+        paintMarked(painter, cell, formats);
+}
+
+// Later formats are drawn over earlier ones.
+QVector<QTextLayout::FormatRange> LogDelegate::marks(QString const& text) const
+{
+    QVector<QTextLayout::FormatRange> formats;
+    AddFormats(formats, m_filter.Ranges(text), MarkFormat());
+    AddFormats(formats, m_found.Ranges(text), FoundFormat());
+    return formats;
 }
 
 void LogDelegate::paintHeading(QPainter* painter, QStyleOptionViewItem const& option)
@@ -98,7 +127,7 @@ void LogDelegate::paintHeading(QPainter* painter, QStyleOptionViewItem const& op
 }
 
 void LogDelegate::paintMarked(QPainter* painter, QStyleOptionViewItem const& option,
-                              QVector<QPair<int, int>> const& ranges) const
+                              QVector<QTextLayout::FormatRange> const& formats) const
 {
     QStyle const* style = StyleOf(option);
     QStyleOptionViewItem background = option;
@@ -108,15 +137,6 @@ void LogDelegate::paintMarked(QPainter* painter, QStyleOptionViewItem const& opt
     const QRect cell = style->subElementRect(QStyle::SE_ItemViewItemText, &option, option.widget);
     const int margin = style->pixelMetric(QStyle::PM_FocusFrameHMargin, nullptr, option.widget) + 1;
     const QRect area = cell.adjusted(margin, 0, -margin, 0);
-
-    QVector<QTextLayout::FormatRange> formats;
-    for (QPair<int, int> const& range : ranges) {
-        QTextLayout::FormatRange format;
-        format.start = range.first;
-        format.length = range.second;
-        format.format = MarkFormat();
-        formats.append(format);
-    }
 
     QTextLayout layout(option.text, option.font);
     QTextOption textOption(Qt::AlignLeft);

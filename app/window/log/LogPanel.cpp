@@ -6,9 +6,12 @@
 #include "app/logfile/LogFileList.h"
 #include "app/logfile/LogIndex.h"
 #include "app/window/log/LogFilterBar.h"
+#include "app/window/log/LogFindBar.h"
 #include "app/window/log/LogModel.h"
+#include "app/window/log/LogSearch.h"
 #include "app/window/log/LogView.h"
 #include "app/window/log/RunningLogParser.h"
+#include "app/window/log/TickScrollBar.h"
 #include "app/window/widgets/FileSizeText.h"
 #include "app/window/widgets/PlainText.h"
 
@@ -16,6 +19,7 @@
 #include <QComboBox>
 #include <QFileInfo>
 #include <QHBoxLayout>
+#include <QKeyEvent>
 #include <QLabel>
 #include <QLocale>
 #include <QPlainTextEdit>
@@ -45,7 +49,8 @@ public:
 
 LogPanel::LogPanel(QWidget* parent)
     : QWidget(parent), m_model(new LogModel(this)), m_view(new LogView(m_model)),
-      m_filterBar(new LogFilterBar), m_pause(new QCheckBox(tr("Pause"))),
+      m_filterBar(new LogFilterBar), m_findBar(new LogFindBar),
+      m_search(new LogSearch(m_model, this)), m_pause(new QCheckBox(tr("Pause"))),
       m_follow(new QCheckBox(tr("Follow newest"))), m_splitter(new QSplitter(Qt::Vertical))
 {
     makeControls();
@@ -90,9 +95,16 @@ void LogPanel::makeLayout()
     top->addWidget(m_pause);
     top->addWidget(m_follow);
 
+    auto* table = new QWidget;
+    auto* tableLayout = new QVBoxLayout(table);
+    tableLayout->setContentsMargins(0, 0, 0, 0);
+    tableLayout->setSpacing(6);
+    tableLayout->addWidget(m_view, 1);
+    tableLayout->addWidget(m_findBar);
+
     m_splitter->setAccessibleName(tr("Log entries and current line"));
     m_splitter->setChildrenCollapsible(false);
-    m_splitter->addWidget(m_view);
+    m_splitter->addWidget(table);
     m_splitter->addWidget(m_line);
     m_splitter->setStretchFactor(0, 1);
     m_line->setMinimumHeight(m_line->fontMetrics().lineSpacing() * 2 + 12);
@@ -115,12 +127,18 @@ void LogPanel::connectAll()
         m_model->SetFilter(m_filterBar->filter());
         m_view->UpdateMarks();
     });
+    connect(m_findBar, &LogFindBar::textChanged, this, &LogPanel::applyFind);
+    connect(m_findBar, &LogFindBar::stepRequested, this, &LogPanel::FindNext);
+    connect(m_findBar, &LogFindBar::closed, this, [this] { m_view->setFocus(); });
+    connect(m_search, &LogSearch::changed, this, &LogPanel::showFound);
     connect(m_view, &LogView::followingChanged, this, [this](bool following) {
         m_follow->setChecked(following);
         Q_EMIT stateChanged();
     });
     connect(m_view->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
             &LogPanel::showCurrentLine);
+    connect(m_view->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
+            &LogPanel::showFound);
     connect(m_model, &LogModel::refreshed, this, [this] {
         m_filterBar->ShowSlowLine(m_model->state().slowLine);
         updatePlaceholder();
@@ -221,6 +239,85 @@ void LogPanel::FocusFilter()
 void LogPanel::ClearFilter()
 {
     m_filterBar->Clear();
+}
+
+void LogPanel::OpenFind()
+{
+    m_findBar->Open();
+}
+
+void LogPanel::applyFind()
+{
+    const LogFilter text = m_findBar->text();
+    m_wantedStep = 0;
+    m_search->SetText(text);
+    m_view->SetFound(text);
+    showFound();
+}
+
+void LogPanel::FindNext(int step)
+{
+    if (m_findBar->isHidden() || !m_findBar->hasText()) {
+        const bool mayGoOn = m_findBar->hasText();
+        m_findBar->Open();
+        if (!mayGoOn)
+            return;
+    }
+    m_findBar->Apply();
+    m_wantedStep = step;
+    goToFound();
+    showFound();
+}
+
+// Keeps waiting while the next hit is not known yet.
+void LogPanel::goToFound()
+{
+    const int step = m_wantedStep;
+    if (step == 0)
+        return;
+    int row = -1;
+    const LogSearch::Answer answer = m_search->Next(m_view->StartRow(step), step, row);
+    if (answer == LogSearch::Answer::Unknown)
+        return;
+    m_wantedStep = 0;
+    if (answer == LogSearch::Answer::None) {
+        if (m_search->text().hasText() && m_search->slowLine() == 0)
+            Q_EMIT messageReported(tr("Not found"));
+        return;
+    }
+    m_view->GoToRow(row);
+    if (answer == LogSearch::Answer::Wrapped)
+        Q_EMIT messageReported(step > 0 ? tr("Continued from the top")
+                                        : tr("Continued from the bottom"));
+}
+
+void LogPanel::showFound()
+{
+    goToFound();
+    m_findBar->ShowSlowLine(m_search->slowLine());
+    m_view->ticks()->SetTicks(TickScrollBar::Found, m_search->hits());
+    const auto count = static_cast<int>(m_search->hits()->size());
+    const int number = m_search->NumberOf(m_view->currentIndex().row());
+    QString text;
+    if (!m_search->text().hasText() || m_search->slowLine() > 0)
+        text = QString();
+    else if (!m_search->isComplete() && m_search->percent() < 99)
+        text = tr("Searching: %1%").arg(m_search->percent());
+    else if (count == 0)
+        text = m_search->isComplete() ? tr("Not found") : QString();
+    else if (number > 0)
+        text = tr("%L1 of %L2").arg(number).arg(count);
+    else
+        text = count == 1 ? tr("1 line") : tr("%L1 lines").arg(count);
+    m_findBar->ShowCount(text);
+}
+
+void LogPanel::keyPressEvent(QKeyEvent* event)
+{
+    if (event->key() == Qt::Key_Escape && !m_findBar->isHidden())
+        m_findBar->Close();
+    else
+        QWidget::keyPressEvent(event);
 }
 
 void LogPanel::CopySelected()

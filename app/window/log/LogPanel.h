@@ -15,7 +15,9 @@ class QSplitter;
 namespace Velocor {
 
 class LogFilterBar;
+class LogFindBar;
 class LogModel;
+class LogSearch;
 class LogView;
 
 /// A log view with its controls: choice of older files, filter, table, and the text of the current
@@ -47,6 +49,14 @@ public:
 
     void FocusFilter();
     void ClearFilter();
+
+    /// Opens the find bar.
+    void OpenFind();
+
+    /// Goes to the next (step 1) or previous (step -1) line with the text to find, as soon as it is
+    /// found. Opens the find bar if there is no text yet.
+    void FindNext(int step);
+
     void CopySelected();
     void SelectAll();
 
@@ -75,6 +85,9 @@ Q_SIGNALS:
     /// A message for the status bar.
     void messageReported(QString const& text);
 
+protected:
+    void keyPressEvent(QKeyEvent* event) override;
+
 private:
     void makeControls();
     void makeLayout();
@@ -84,10 +97,15 @@ private:
     void showFile(QString const& path);
     void showCurrentLine();
     void updatePlaceholder();
+    void applyFind();
+    void showFound();
+    void goToFound();
 
     LogModel* m_model;
     LogView* m_view;
     LogFilterBar* m_filterBar;
+    LogFindBar* m_findBar;
+    LogSearch* m_search;
     QComboBox* m_files = nullptr;
     QCheckBox* m_pause;
     QCheckBox* m_follow;
@@ -95,6 +113,7 @@ private:
     QSplitter* m_splitter;
     QString m_currentPath; // the log of the running program; empty for other logs
     int m_percent = 100;
+    int m_wantedStep = 0; // to a hit that has not been found yet
 };
 
 } // namespace Velocor

@@ -8,7 +8,9 @@
 namespace Velocor {
 
 class LogDelegate;
+class LogFilter;
 class LogModel;
+class TickScrollBar;
 
 /// The table of a log: keeps its position while rows change, or follows the newest entry.
 ///
@@ -36,6 +38,20 @@ public:
     /// Goes to the next (step 1) or previous (step -1) warning or worse, from the current row or,
     /// without one, from the rows in view.
     Jump GoToProblem(int step);
+
+    /// Makes a row the only selected and the current one, and centers it. Unless it is the last
+    /// one, the view no longer follows the newest entry.
+    void GoToRow(int row);
+
+    /// The row to search from in a direction: the current one or, without one, the one outside of
+    /// the rows in view.
+    int StartRow(int step) const;
+
+    /// Highlights the matches of a text to find.
+    void SetFound(LogFilter const& found);
+
+    /// The vertical scroll bar.
+    TickScrollBar* ticks() const { return m_ticks; }
 
     /// Copies the selected lines, as stored in the file.
     ///
@@ -71,13 +87,13 @@ private:
     void afterRefresh();
     void noteCurrent();
     void restoreCurrent();
-    int rowBefore(int step) const;
     void setRowHeight();
     void updateHeadings();
     QList<int> selectedRowNumbers() const;
 
     LogModel* m_model;
     LogDelegate* m_delegate;
+    TickScrollBar* m_ticks;
     QString m_placeholder;
     bool m_following = true;
     bool m_scrollingItself = false;

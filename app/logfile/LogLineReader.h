@@ -1,0 +1,47 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include <QByteArray>
+#include <QFile>
+#include <QString>
+
+namespace Velocor {
+
+/// Reads lines of a log file by where they start, with a file handle of its own.
+///
+/// Lines that are asked for in the order of the file are read only once. One thread at a time.
+///
+///     LogLineReader reader;
+///     if (reader.Open(path))
+///         text = QString::fromLatin1(reader.Line(start));
+class LogLineReader
+{
+public:
+    /// Opens a file, and forgets what was read before.
+    ///
+    /// @return false if it cannot be read or is not a regular file
+    bool Open(QString const& path);
+
+    /// The line that starts there, without its line end; empty at the end of the file.
+    ///
+    /// @return refers to memory of the reader: valid until the next call
+    QByteArray Line(qint64 start);
+
+    /// Where the line after the last Line() starts; the end of the file after its last line.
+    qint64 nextStart() const { return m_next; }
+
+    /// How much of a line is read, in bytes.
+    static constexpr int LineLimit = 16 << 20;
+
+private:
+    bool readMore();
+
+    QFile m_file;
+    QByteArray m_bytes;
+    qint64 m_start = 0; // of the bytes in the file
+    qint64 m_next = 0;
+};
+
+} // namespace Velocor
