@@ -225,6 +225,9 @@ void MainWindow::makeEditMenu()
     m_logActions.append(addAction(menu, tr("Find Pre&vious"), QKeySequence(tr("Shift+F3")),
                                   tr("Go to the previous line found"),
                                   [this] { m_tabs->currentLog()->FindNext(-1); }));
+    m_logActions.append(addAction(menu, tr("&Go To..."), QKeySequence(tr("Ctrl+G")),
+                                  tr("Go to a line or to a time"),
+                                  [this] { m_tabs->currentLog()->AskGoTo(); }));
     menu->addSeparator();
     m_logActions.append(addAction(menu, tr("F&ilter"), QKeySequence(tr("Ctrl+L")),
                                   tr("Show only lines that contain the filter text"),

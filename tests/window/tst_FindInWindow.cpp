@@ -5,6 +5,7 @@
 
 #include "WindowParts.h"
 
+#include "app/window/log/GoToDialog.h"
 #include "app/window/log/LogFindBar.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogSearch.h"
@@ -12,9 +13,11 @@
 #include "app/window/log/TickScrollBar.h"
 
 #include <QCheckBox>
+#include <QDialogButtonBox>
 #include <QLabel>
 #include <QLineEdit>
 #include <QLoggingCategory>
+#include <QPushButton>
 #include <QStatusBar>
 #include <QToolButton>
 
@@ -66,6 +69,18 @@ void Type(MainWindow& window, char const* text)
     QTest::keyClicks(QApplication::focusWidget(), text);
 }
 
+void GoTo(MainWindow& window, char const* place)
+{
+    WindowTest::whenShown<GoToDialog>([place](GoToDialog* dialog) {
+        auto* field = Child<QLineEdit>(dialog, "Line or time");
+        QTest::keyClicks(field, place);
+        QTest::keyClick(field, Qt::Key_Return);
+    });
+    QTest::keyClick(&window, Qt::Key_G, Qt::ControlModifier);
+    window.activateWindow(); // no window manager does it
+    QVERIFY(QTest::qWaitForWindowActive(&window));
+}
+
 // `count` entries, every hundredth of which has the word "needle".
 QByteArray Needles(int count)
 {
@@ -102,6 +117,9 @@ private slots:
     void notFound();
     void outsideOfTheGuiThread();
     void jumpsWhenFound();
+    void goesToALine();
+    void goesToATime();
+    void goToSaysWhatIsWrong();
 };
 
 void tst_FindInWindow::initTestCase()
@@ -423,6 +441,81 @@ void tst_FindInWindow::jumpsWhenFound()
     QTest::keyClick(Field(*window), Qt::Key_Return, Qt::ShiftModifier);
     QTRY_COMPARE_WITH_TIMEOUT(View(*window)->currentIndex().row(), 99950, Patience);
     QTRY_COMPARE_WITH_TIMEOUT(Count(*window), QString("1,000 of 1,000"), Patience);
+}
+
+void tst_FindInWindow::goesToALine()
+{
+    const WindowTest test(Needles(300));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 300, Patience);
+    GoTo(*window, "120");
+    LogView* view = View(*window);
+    QTRY_COMPARE_WITH_TIMEOUT(view->currentIndex().row(), 119, Patience);
+    QCOMPARE(view->selectionModel()->selectedRows().size(), 1);
+    QVERIFY(view->rowAt(0) < 119 - 2);
+    QVERIFY(view->rowAt(view->viewport()->height() - 1) > 119 + 2);
+    QTRY_VERIFY(view->hasFocus());
+
+    // Lines are those of the file, not of the rows.
+    QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);
+    QTest::keyClicks(QApplication::focusWidget(), "needle");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
+    GoTo(*window, "151");
+    QTRY_COMPARE_WITH_TIMEOUT(view->currentIndex().row(), 1, Patience);
+    GoTo(*window, "290");
+    QTRY_COMPARE_WITH_TIMEOUT(view->currentIndex().row(), 2, Patience);
+    QVERIFY2(Status(*window).startsWith("The line is not shown"), qPrintable(Status(*window)));
+}
+
+void tst_FindInWindow::goesToATime()
+{
+    const WindowTest test(run(300, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 300, Patience);
+    LogView* view = View(*window);
+    GoTo(*window, "9:01");
+    QTRY_COMPARE_WITH_TIMEOUT(view->currentIndex().row(), 60, Patience);
+    GoTo(*window, "+90s");
+    QTRY_COMPARE_WITH_TIMEOUT(view->currentIndex().row(), 150, Patience);
+    GoTo(*window, "-2m");
+    QTRY_COMPARE_WITH_TIMEOUT(view->currentIndex().row(), 30, Patience);
+    GoTo(*window, "2025-03-03 09:04:10");
+    QTRY_COMPARE_WITH_TIMEOUT(view->currentIndex().row(), 250, Patience);
+    GoTo(*window, "10:00");
+    QTRY_COMPARE_WITH_TIMEOUT(view->currentIndex().row(), 299, Patience);
+    QCOMPARE(Status(*window), QString("The lines shown end before that"));
+}
+
+void tst_FindInWindow::goToSaysWhatIsWrong()
+{
+    const WindowTest test(run(3, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
+    WindowTest::whenShown<GoToDialog>([&](GoToDialog* dialog) {
+        auto* field = Child<QLineEdit>(dialog, "Line or time");
+        auto const* problem = Child<QLabel>(dialog, "Problem");
+        QAbstractButton* ok = dialog->findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Ok);
+        const auto check = [&](char const* typed, char const* error) {
+            field->selectAll();
+            QTest::keyClicks(field, typed);
+            QCOMPARE(problem->text(), QString(error));
+            QCOMPARE(ok->isEnabled(), *error == '\0');
+        };
+        QVERIFY(!ok->isEnabled());
+        QCOMPARE(problem->text(), QString());
+        check("14:63", "The minutes go up to 59.");
+        check("4", "The file has only 3 lines.");
+        check("+5m", "Select an entry first, from which to count.");
+        check("3", "");
+        check("14:03", "");
+        field->clear();
+        QVERIFY(!ok->isEnabled());
+        QTest::keyClick(field, Qt::Key_Return);
+        QVERIFY(dialog->isVisible());
+        QTest::keyClick(field, Qt::Key_Escape);
+    });
+    QTest::keyClick(window.get(), Qt::Key_G, Qt::ControlModifier);
+    QVERIFY(!View(*window)->currentIndex().isValid());
 }
 
 QTEST_MAIN(tst_FindInWindow)

@@ -75,6 +75,7 @@ public:
     QString LineText(int row, int limit) const;
 
     QString const& path() const { return m_path; }
+    LogLineParser const& parser() const { return m_parser; }
     LogUpdate const& state() const { return m_state; }
     bool isReading() const { return m_reading; }
 

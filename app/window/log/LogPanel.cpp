@@ -5,8 +5,10 @@
 
 #include "app/logfile/LogFileList.h"
 #include "app/logfile/LogIndex.h"
+#include "app/window/log/GoToDialog.h"
 #include "app/window/log/LogFilterBar.h"
 #include "app/window/log/LogFindBar.h"
+#include "app/window/log/LogGoTo.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogSearch.h"
 #include "app/window/log/LogView.h"
@@ -50,8 +52,9 @@ public:
 LogPanel::LogPanel(QWidget* parent)
     : QWidget(parent), m_model(new LogModel(this)), m_view(new LogView(m_model)),
       m_filterBar(new LogFilterBar), m_findBar(new LogFindBar),
-      m_search(new LogSearch(m_model, this)), m_pause(new QCheckBox(tr("Pause"))),
-      m_follow(new QCheckBox(tr("Follow newest"))), m_splitter(new QSplitter(Qt::Vertical))
+      m_search(new LogSearch(m_model, this)), m_goTo(new LogGoTo(m_model, this)),
+      m_pause(new QCheckBox(tr("Pause"))), m_follow(new QCheckBox(tr("Follow newest"))),
+      m_splitter(new QSplitter(Qt::Vertical))
 {
     makeControls();
     makeLayout();
@@ -130,6 +133,12 @@ void LogPanel::connectAll()
     connect(m_findBar, &LogFindBar::textChanged, this, &LogPanel::applyFind);
     connect(m_findBar, &LogFindBar::stepRequested, this, &LogPanel::FindNext);
     connect(m_findBar, &LogFindBar::closed, this, [this] { m_view->setFocus(); });
+    connect(m_goTo, &LogGoTo::arrived, this, [this](int row, QString const& message) {
+        if (row >= 0)
+            m_view->GoToRow(row);
+        if (!message.isEmpty())
+            Q_EMIT messageReported(message);
+    });
     connect(m_search, &LogSearch::changed, this, &LogPanel::showFound);
     connect(m_view, &LogView::followingChanged, this, [this](bool following) {
         m_follow->setChecked(following);
@@ -318,6 +327,16 @@ void LogPanel::keyPressEvent(QKeyEvent* event)
         m_findBar->Close();
     else
         QWidget::keyPressEvent(event);
+}
+
+void LogPanel::AskGoTo()
+{
+    const int current = m_view->currentIndex().row();
+    GoToDialog dialog(static_cast<qint64>(m_model->state().lines), current >= 0, this);
+    if (dialog.exec() != QDialog::Accepted)
+        return;
+    m_view->setFocus();
+    m_goTo->Find(dialog.place(), m_view->currentIndex().row());
 }
 
 void LogPanel::CopySelected()

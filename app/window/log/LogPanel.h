@@ -16,6 +16,7 @@ namespace Velocor {
 
 class LogFilterBar;
 class LogFindBar;
+class LogGoTo;
 class LogModel;
 class LogSearch;
 class LogView;
@@ -56,6 +57,9 @@ public:
     /// Goes to the next (step 1) or previous (step -1) line with the text to find, as soon as it is
     /// found. Opens the find bar if there is no text yet.
     void FindNext(int step);
+
+    /// Asks for a line number or a time, and goes there.
+    void AskGoTo();
 
     void CopySelected();
     void SelectAll();
@@ -106,6 +110,7 @@ private:
     LogFilterBar* m_filterBar;
     LogFindBar* m_findBar;
     LogSearch* m_search;
+    LogGoTo* m_goTo;
     QComboBox* m_files = nullptr;
     QCheckBox* m_pause;
     QCheckBox* m_follow;
