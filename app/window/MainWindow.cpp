@@ -59,7 +59,8 @@ QIcon WindowIcon()
 } // namespace
 
 MainWindow::MainWindow(QWidget* parent)
-    : QMainWindow(parent), m_settings(ApplicationProperty("DataPath")), m_splitter(new QSplitter),
+    : QMainWindow(parent), m_settings(ApplicationProperty("DataPath")),
+      m_marks(ApplicationProperty("DataPath")), m_splitter(new QSplitter),
       m_places(new PlacesPanel(m_settings.fileName()))
 {
     setWindowTitle(ApplicationProperty("caption"));
@@ -124,7 +125,7 @@ void MainWindow::makeTabs()
     m_notice = new NoticeBar;
     static_cast<QVBoxLayout*>(centralWidget()->layout())->insertWidget(0, m_notice);
     const QList<int> sizes = m_splitter->sizes();
-    m_tabs = new FileTabs;
+    m_tabs = new FileTabs(&m_marks);
     delete m_splitter->replaceWidget(1, m_tabs);
     m_tabs->show();
     m_splitter->setStretchFactor(1, 1);
@@ -267,6 +268,19 @@ void MainWindow::makeViewMenu()
     m_logActions.append(addAction(menu, tr("Pre&vious Problem"), QKeySequence(tr("Shift+F8")),
                                   tr("Go to the previous warning or error"),
                                   [this] { m_tabs->currentLog()->GoToProblem(-1); }));
+    menu->addSeparator();
+    m_logActions.append(addAction(menu, tr("&Mark"), QKeySequence(tr("Ctrl+M")),
+                                  tr("Mark the current line, or remove its mark"),
+                                  [this] { m_tabs->currentLog()->ToggleMark(); }));
+    m_logActions.append(addAction(menu, tr("N&ote..."), QKeySequence(tr("Ctrl+Shift+M")),
+                                  tr("Write a note on the current line"),
+                                  [this] { m_tabs->currentLog()->AskNote(); }));
+    m_logActions.append(addAction(menu, tr("Next Mar&k"), QKeySequence(tr("F2")),
+                                  tr("Go to the next marked line"),
+                                  [this] { m_tabs->currentLog()->GoToMark(1); }));
+    m_logActions.append(addAction(menu, tr("Previo&us Mark"), QKeySequence(tr("Shift+F2")),
+                                  tr("Go to the previous marked line"),
+                                  [this] { m_tabs->currentLog()->GoToMark(-1); }));
     menu->addSeparator();
     m_logActions.append(addAction(menu, tr("&Reload"), QKeySequence(tr("F5")),
                                   tr("Reload the file"),

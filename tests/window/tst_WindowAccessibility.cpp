@@ -9,6 +9,7 @@
 #include "app/window/ReportDialog.h"
 #include "app/window/log/GoToDialog.h"
 #include "app/window/log/LogSettingsDialog.h"
+#include "app/window/log/NoteDialog.h"
 
 #include <QAbstractButton>
 #include <QClipboard>
@@ -140,6 +141,8 @@ void tst_WindowAccessibility::namesInDialogs()
     QCOMPARE(NamelessControls(&report), QStringList());
     GoToDialog goTo(10, true, nullptr);
     QCOMPARE(NamelessControls(&goTo), QStringList());
+    NoteDialog note("text", nullptr);
+    QCOMPARE(NamelessControls(&note), QStringList());
 }
 
 // Every action that does something has a shortcut and a status tip, and no two share one.

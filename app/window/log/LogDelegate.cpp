@@ -4,6 +4,7 @@
 #include "app/window/log/LogDelegate.h"
 
 #include "app/window/log/LogModel.h"
+#include "app/window/log/TickScrollBar.h"
 #include "app/window/widgets/SeverityIcons.h"
 
 #include <QApplication>
@@ -12,6 +13,8 @@
 namespace Velocor {
 
 namespace {
+
+constexpr int MarkWidth = 4; // pixels
 
 QColor Blended(QColor const& a, QColor const& b, qreal share)
 {
@@ -74,6 +77,10 @@ void LogDelegate::initStyleOption(QStyleOptionViewItem* option, QModelIndex cons
     if (index.data(LogModel::EarlierRole).toBool())
         option->backgroundBrush = Blended(option->palette.color(QPalette::Base),
                                           option->palette.color(QPalette::Text), 0.045);
+    if (index.column() == LogModel::TimeColumn && index.data(LogModel::MarkedRole).toBool())
+        option->backgroundBrush =
+            Blended(option->palette.color(QPalette::Base),
+                    TickScrollBar::Color(TickScrollBar::Marked, option->palette), 0.2);
     if (index.column() == LogModel::SeverityColumn)
         option->palette.setColor(QPalette::Text, SeverityIcons::Color(severity, option->palette));
 }
@@ -96,6 +103,26 @@ void LogDelegate::paint(QPainter* painter, QStyleOptionViewItem const& option,
         StyleOf(cell)->drawControl(QStyle::CE_ItemViewItem, &cell, painter, cell.widget);
     else
         paintMarked(painter, cell, formats);
+    if (index.column() == LogModel::TimeColumn && index.data(LogModel::MarkedRole).toBool())
+        paintUserMark(painter, cell, !index.data(LogModel::NoteRole).toString().isEmpty());
+}
+
+// A bar at the edge of the row, and a folded corner if there is a note.
+void LogDelegate::paintUserMark(QPainter* painter, QStyleOptionViewItem const& option, bool hasNote)
+{
+    const QRect cell = option.rect;
+    const QColor color = TickScrollBar::Color(TickScrollBar::Marked, option.palette);
+    painter->save();
+    painter->fillRect(cell.left(), cell.top(), MarkWidth, cell.height(), color);
+    if (hasNote) {
+        const int size = cell.height() / 2;
+        const QPoint corner(cell.right() + 1, cell.top());
+        painter->setPen(Qt::NoPen);
+        painter->setBrush(color);
+        painter->drawPolygon(QPolygon(
+            QVector<QPoint>({corner, corner - QPoint(size, 0), corner + QPoint(0, size)})));
+    }
+    painter->restore();
 }
 
 // Later formats are drawn over earlier ones.

@@ -11,7 +11,7 @@
 namespace Velocor {
 
 /// Draws the cells of a log view: headings between runs, severity colors, and highlighted matches
-/// of the filter text and of the text to find.
+/// of the filter text and of the text to find, and the user's marks.
 class LogDelegate : public QStyledItemDelegate
 {
     Q_OBJECT
@@ -35,6 +35,7 @@ private:
     QVector<QTextLayout::FormatRange> marks(QString const& text) const;
     void paintMarked(QPainter* painter, QStyleOptionViewItem const& option,
                      QVector<QTextLayout::FormatRange> const& formats) const;
+    static void paintUserMark(QPainter* painter, QStyleOptionViewItem const& option, bool hasNote);
     static void paintHeading(QPainter* painter, QStyleOptionViewItem const& option);
 
     LogFilter m_filter;

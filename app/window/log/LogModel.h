@@ -11,6 +11,7 @@
 #include <QAbstractTableModel>
 #include <QCache>
 #include <QFile>
+#include <QHash>
 #include <QThread>
 #include <QTimer>
 
@@ -36,7 +37,9 @@ public:
     enum Role {
         SeverityRole = Qt::UserRole, ///< a LogEntry::Severity
         HeadingRole,                 ///< whether the row is a heading
-        EarlierRole                  ///< whether the row belongs to an earlier run
+        EarlierRole,                 ///< whether the row belongs to an earlier run
+        MarkedRole,                  ///< whether the user has marked the row
+        NoteRole                     ///< the user's note on it
     };
 
     explicit LogModel(QObject* parent = nullptr);
@@ -57,6 +60,9 @@ public:
     /// While the model is paused, it does not check for changes.
     void SetPaused(bool paused);
     bool isPaused() const { return m_paused; }
+
+    /// Sets the lines that the user has marked: where they start, and their notes.
+    void SetMarks(QHash<qint64, QString> const& marks);
 
     /// The nearest row after (step 1) or before (step -1) `row` that is a warning or worse;
     /// -1 if there is none.
@@ -130,6 +136,7 @@ private:
     LogFilter m_filter;
     LogUpdate m_state;
     int m_rowCount = 0; // fewer than the rows of m_state only while a change is being signaled
+    QHash<qint64, QString> m_marks;
     mutable QFile m_file;
     mutable QCache<qint64, LogEntry> m_entries;
 };

@@ -9,11 +9,14 @@
 #include "app/window/log/LogFilterBar.h"
 #include "app/window/log/LogFindBar.h"
 #include "app/window/log/LogGoTo.h"
+#include "app/window/log/LogMarks.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogSearch.h"
 #include "app/window/log/LogView.h"
+#include "app/window/log/NoteDialog.h"
 #include "app/window/log/RunningLogParser.h"
 #include "app/window/log/TickScrollBar.h"
+#include "app/window/widgets/ElidedLabel.h"
 #include "app/window/widgets/FileSizeText.h"
 #include "app/window/widgets/PlainText.h"
 
@@ -24,10 +27,12 @@
 #include <QKeyEvent>
 #include <QLabel>
 #include <QLocale>
+#include <QMenu>
 #include <QPlainTextEdit>
 #include <QSignalBlocker>
 #include <QSplitter>
 
+#include <algorithm>
 #include <functional>
 
 namespace Velocor {
@@ -53,8 +58,8 @@ LogPanel::LogPanel(QWidget* parent)
     : QWidget(parent), m_model(new LogModel(this)), m_view(new LogView(m_model)),
       m_filterBar(new LogFilterBar), m_findBar(new LogFindBar),
       m_search(new LogSearch(m_model, this)), m_goTo(new LogGoTo(m_model, this)),
-      m_pause(new QCheckBox(tr("Pause"))), m_follow(new QCheckBox(tr("Follow newest"))),
-      m_splitter(new QSplitter(Qt::Vertical))
+      m_marks(new LogMarks(m_model, this)), m_pause(new QCheckBox(tr("Pause"))),
+      m_follow(new QCheckBox(tr("Follow newest"))), m_splitter(new QSplitter(Qt::Vertical))
 {
     makeControls();
     makeLayout();
@@ -78,6 +83,11 @@ void LogPanel::makeControls()
         PlainToolTip(tr("Stop updating the view while logging continues (Ctrl+Shift+P)")));
     m_follow->setToolTip(PlainToolTip(tr("Scroll to new entries as they arrive (Ctrl+Shift+N)")));
     m_follow->setChecked(true);
+
+    m_note = new ElidedLabel(Qt::ElideRight);
+    m_note->setAccessibleName(tr("Note on the current line"));
+    m_note->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
+    m_note->hide();
 
     m_line = new QPlainTextEdit;
     m_line->setReadOnly(true);
@@ -105,10 +115,17 @@ void LogPanel::makeLayout()
     tableLayout->addWidget(m_view, 1);
     tableLayout->addWidget(m_findBar);
 
+    auto* current = new QWidget;
+    auto* currentLayout = new QVBoxLayout(current);
+    currentLayout->setContentsMargins(0, 0, 0, 0);
+    currentLayout->setSpacing(4);
+    currentLayout->addWidget(m_note);
+    currentLayout->addWidget(m_line, 1);
+
     m_splitter->setAccessibleName(tr("Log entries and current line"));
     m_splitter->setChildrenCollapsible(false);
     m_splitter->addWidget(table);
-    m_splitter->addWidget(m_line);
+    m_splitter->addWidget(current);
     m_splitter->setStretchFactor(0, 1);
     m_line->setMinimumHeight(m_line->fontMetrics().lineSpacing() * 2 + 12);
     m_splitter->setSizes({400, m_line->fontMetrics().lineSpacing() * 3 + 12});
@@ -139,6 +156,8 @@ void LogPanel::connectAll()
         if (!message.isEmpty())
             Q_EMIT messageReported(message);
     });
+    connect(m_marks, &LogMarks::changed, this, &LogPanel::showMarks);
+    connect(m_view, &LogView::menuRequested, this, &LogPanel::showMenu);
     connect(m_search, &LogSearch::changed, this, &LogPanel::showFound);
     connect(m_view, &LogView::followingChanged, this, [this](bool following) {
         m_follow->setChecked(following);
@@ -178,6 +197,7 @@ void LogPanel::showFile(QString const& path)
     m_files->setToolTip(PlainToolTip(path));
     m_files->setAccessibleDescription(path);
     m_model->Open(path, RunningLogParser(), path == m_currentPath);
+    m_marks->Load();
     updatePlaceholder();
 }
 
@@ -339,6 +359,73 @@ void LogPanel::AskGoTo()
     m_goTo->Find(dialog.place(), m_view->currentIndex().row());
 }
 
+void LogPanel::SetMarkStore(LogMarkStore* store)
+{
+    m_marks->SetStore(store);
+}
+
+void LogPanel::report(QString const& message)
+{
+    if (!message.isEmpty())
+        Q_EMIT messageReported(message);
+}
+
+void LogPanel::ToggleMark()
+{
+    report(m_marks->Toggle(m_view->currentIndex().row()));
+}
+
+void LogPanel::AskNote()
+{
+    const QPersistentModelIndex current = m_view->currentIndex();
+    if (!current.isValid()) {
+        report(tr("Select a line first"));
+        return;
+    }
+    NoteDialog dialog(m_marks->NoteOf(current.row()), this);
+    if (dialog.exec() == QDialog::Accepted)
+        report(m_marks->SetNote(current.row(), dialog.note()));
+}
+
+void LogPanel::GoToMark(int step)
+{
+    std::vector<int> const& rows = *m_marks->rows();
+    if (rows.empty()) {
+        report(tr("No marks in the lines shown"));
+        return;
+    }
+    const int from = m_view->StartRow(step);
+    const auto after = std::upper_bound(rows.begin(), rows.end(), from);
+    const auto before = std::lower_bound(rows.begin(), rows.end(), from);
+    const bool isAhead = step > 0 ? after != rows.end() : before != rows.begin();
+    if (step > 0)
+        m_view->GoToRow(isAhead ? *after : rows.front());
+    else
+        m_view->GoToRow(isAhead ? *(before - 1) : rows.back());
+    m_view->setFocus();
+    if (!isAhead)
+        report(step > 0 ? tr("Continued from the top") : tr("Continued from the bottom"));
+}
+
+void LogPanel::showMarks()
+{
+    m_view->ticks()->SetTicks(TickScrollBar::Marked, m_marks->rows());
+    m_view->viewport()->update();
+    showCurrentLine();
+}
+
+void LogPanel::showMenu(QPoint const& position)
+{
+    auto* menu = new QMenu(this);
+    menu->setAttribute(Qt::WA_DeleteOnClose);
+    menu->addAction(tr("&Copy"), this, &LogPanel::CopySelected);
+    menu->addSeparator();
+    const bool isMarked = m_marks->isMarked(m_view->currentIndex().row());
+    menu->addAction(isMarked ? tr("Remove &Mark") : tr("&Mark"), this, &LogPanel::ToggleMark);
+    menu->addAction(tr("&Note..."), this, &LogPanel::AskNote);
+    menu->popup(position);
+}
+
 void LogPanel::CopySelected()
 {
     const int count = m_view->CopySelected();
@@ -415,6 +502,10 @@ void LogPanel::showCurrentLine()
     const QModelIndex current = m_view->currentIndex();
     m_line->setPlainText(current.isValid() ? m_model->LineText(current.row(), LogIndex::LineLimit)
                                            : QString());
+    const QString note = m_marks->NoteOf(current.row());
+    m_note->setText(note.isEmpty() ? QString() : tr("Note: %1").arg(note));
+    m_note->setToolTip(PlainToolTip(note));
+    m_note->setVisible(!note.isEmpty());
 }
 
 QList<int> LogPanel::columnWidths() const

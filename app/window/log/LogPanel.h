@@ -10,13 +10,17 @@
 class QCheckBox;
 class QComboBox;
 class QPlainTextEdit;
+class QMenu;
 class QSplitter;
 
 namespace Velocor {
 
+class ElidedLabel;
 class LogFilterBar;
 class LogFindBar;
 class LogGoTo;
+class LogMarkStore;
+class LogMarks;
 class LogModel;
 class LogSearch;
 class LogView;
@@ -61,6 +65,20 @@ public:
     /// Asks for a line number or a time, and goes there.
     void AskGoTo();
 
+    /// Sets where the marks of log files are kept, before a file is opened.
+    ///
+    /// @param store  not owned
+    void SetMarkStore(LogMarkStore* store);
+
+    /// Marks the current line or removes its mark.
+    void ToggleMark();
+
+    /// Asks for a note on the current line.
+    void AskNote();
+
+    /// Goes to the next (step 1) or previous (step -1) marked line, or reports that there is none.
+    void GoToMark(int step);
+
     void CopySelected();
     void SelectAll();
 
@@ -104,6 +122,9 @@ private:
     void applyFind();
     void showFound();
     void goToFound();
+    void showMarks();
+    void showMenu(QPoint const& position);
+    void report(QString const& message);
 
     LogModel* m_model;
     LogView* m_view;
@@ -111,10 +132,12 @@ private:
     LogFindBar* m_findBar;
     LogSearch* m_search;
     LogGoTo* m_goTo;
+    LogMarks* m_marks;
     QComboBox* m_files = nullptr;
     QCheckBox* m_pause;
     QCheckBox* m_follow;
     QPlainTextEdit* m_line = nullptr;
+    ElidedLabel* m_note = nullptr;
     QSplitter* m_splitter;
     QString m_currentPath; // the log of the running program; empty for other logs
     int m_percent = 100;

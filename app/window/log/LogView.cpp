@@ -11,6 +11,7 @@
 
 #include <QAbstractButton>
 #include <QClipboard>
+#include <QContextMenuEvent>
 #include <QEvent>
 #include <QGuiApplication>
 #include <QHeaderView>
@@ -106,6 +107,15 @@ void LogView::focusInEvent(QFocusEvent* event)
     QTableView::focusInEvent(event);
     if (!hadCurrent)
         selectionModel()->clearCurrentIndex();
+}
+
+// The key opens the menu at the current row, not in the middle of the table.
+void LogView::contextMenuEvent(QContextMenuEvent* event)
+{
+    QPoint position = event->globalPos();
+    if (event->reason() == QContextMenuEvent::Keyboard && currentIndex().isValid())
+        position = viewport()->mapToGlobal(visualRect(currentIndex()).bottomLeft());
+    Q_EMIT menuRequested(position);
 }
 
 void LogView::SetFollowing(bool following)

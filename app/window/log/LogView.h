@@ -73,8 +73,12 @@ public:
 Q_SIGNALS:
     void followingChanged(bool following);
 
+    /// The menu of the table is wanted at a global position.
+    void menuRequested(QPoint const& position);
+
 protected:
     void paintEvent(QPaintEvent* event) override;
+    void contextMenuEvent(QContextMenuEvent* event) override;
     void changeEvent(QEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
     void focusInEvent(QFocusEvent* event) override;

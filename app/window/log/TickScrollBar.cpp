@@ -33,9 +33,9 @@ void TickScrollBar::SetRowCount(int count)
     update();
 }
 
-QColor TickScrollBar::color(Kind kind) const
+QColor TickScrollBar::Color(Kind kind, QPalette const& palette)
 {
-    const bool isDark = SeverityIcons::IsDark(palette());
+    const bool isDark = SeverityIcons::IsDark(palette);
     if (kind == Found)
         return QColor(isDark ? 0xff5fd9e8 : 0xff007a8c);
     return QColor(isDark ? 0xffd6a2ff : 0xff8a2be2);
@@ -56,7 +56,7 @@ void TickScrollBar::paintEvent(QPaintEvent* event)
     for (int kind = 0; kind < KindCount; ++kind) {
         if (!m_ticks[kind])
             continue;
-        const QColor tick = color(static_cast<Kind>(kind));
+        const QColor tick = Color(static_cast<Kind>(kind), palette());
         std::vector<int> const& rows = *m_ticks[kind];
         auto row = rows.begin();
         while (row != rows.end() && *row < m_rowCount) {

@@ -20,6 +20,9 @@ public:
 
     explicit TickScrollBar(QWidget* parent = nullptr);
 
+    /// The color of a kind of ticks, readable on the palette's background.
+    static QColor Color(Kind kind, QPalette const& palette);
+
     /// Sets the rows of one kind.
     ///
     /// @param rows  ascending
@@ -32,8 +35,6 @@ protected:
     void paintEvent(QPaintEvent* event) override;
 
 private:
-    QColor color(Kind kind) const;
-
     std::shared_ptr<std::vector<int> const> m_ticks[KindCount];
     int m_rowCount = 0;
 };
