@@ -6,6 +6,7 @@
 #include "app/logfile/LogEncoding.h"
 
 #include <QDate>
+#include <QMetaType>
 
 namespace Velocor {
 
@@ -48,3 +49,5 @@ struct LogFileType
 };
 
 } // namespace Velocor
+
+Q_DECLARE_METATYPE(Velocor::LogFileType)

@@ -32,7 +32,7 @@ QString TitleOf(QString const& path)
 
 } // namespace
 
-FileTabs::FileTabs(QWidget* parent) : QTabWidget(parent)
+FileTabs::FileTabs(LogMarkStore* marks, QWidget* parent) : QTabWidget(parent), m_marks(marks)
 {
     setDocumentMode(true);
     setTabBarAutoHide(true);
@@ -62,6 +62,7 @@ LogPanel* FileTabs::addLog(QString const& title, QString const& path)
     auto* panel = new LogPanel;
     const QString name = path.isEmpty() ? title : QFileInfo(path).fileName();
     panel->setAccessibleName(name);
+    panel->SetMarkStore(m_marks);
     connect(panel, &LogPanel::stateChanged, this, &FileTabs::stateChanged);
     connect(panel, &LogPanel::messageReported, this, &FileTabs::messageReported);
     if (!path.isEmpty())

@@ -8,6 +8,7 @@
 
 namespace Velocor {
 
+class LogMarkStore;
 class LogPanel;
 class SettingsEditor;
 
@@ -18,7 +19,9 @@ class FileTabs : public QTabWidget
 
 public:
     /// Creates the tab for the program's log, without reading it yet.
-    explicit FileTabs(QWidget* parent = nullptr);
+    ///
+    /// @param marks  where the marks of log files are kept; not owned; null: they are not
+    explicit FileTabs(LogMarkStore* marks = nullptr, QWidget* parent = nullptr);
 
     /// Shows a file in a new tab, or in its existing tab.
     ///
@@ -55,6 +58,7 @@ private:
     int positionOf(QString const& path) const;
     void addCloseButton(QWidget* page, QString const& name);
 
+    LogMarkStore* m_marks;
     LogPanel* m_ownLog;
 };
 

@@ -60,7 +60,8 @@ QIcon WindowIcon()
 } // namespace
 
 MainWindow::MainWindow(QWidget* parent)
-    : QMainWindow(parent), m_settings(ApplicationProperty("DataPath")), m_splitter(new QSplitter),
+    : QMainWindow(parent), m_settings(ApplicationProperty("DataPath")),
+      m_marks(ApplicationProperty("DataPath")), m_splitter(new QSplitter),
       m_places(new PlacesPanel(m_settings.fileName()))
 {
     setWindowTitle(ApplicationProperty("caption"));
@@ -125,7 +126,7 @@ void MainWindow::makeTabs()
     m_notice = new NoticeBar;
     static_cast<QVBoxLayout*>(centralWidget()->layout())->insertWidget(0, m_notice);
     const QList<int> sizes = m_splitter->sizes();
-    m_tabs = new FileTabs;
+    m_tabs = new FileTabs(&m_marks);
     delete m_splitter->replaceWidget(1, m_tabs);
     m_tabs->show();
     m_splitter->setStretchFactor(1, 1);
@@ -217,7 +218,20 @@ void MainWindow::makeEditMenu()
     addAction(menu, tr("Select &All"), QKeySequence::SelectAll, tr("Select all lines"),
               [this] { selectAll(); });
     menu->addSeparator();
-    m_logActions.append(addAction(menu, tr("&Filter"), QKeySequence::Find,
+    m_logActions.append(addAction(menu, tr("&Find"), QKeySequence::Find,
+                                  tr("Go to lines that contain a text, among the others"),
+                                  [this] { m_tabs->currentLog()->OpenFind(); }));
+    m_logActions.append(addAction(menu, tr("Find &Next"), QKeySequence(tr("F3")),
+                                  tr("Go to the next line found"),
+                                  [this] { m_tabs->currentLog()->FindNext(1); }));
+    m_logActions.append(addAction(menu, tr("Find Pre&vious"), QKeySequence(tr("Shift+F3")),
+                                  tr("Go to the previous line found"),
+                                  [this] { m_tabs->currentLog()->FindNext(-1); }));
+    m_logActions.append(addAction(menu, tr("&Go To..."), QKeySequence(tr("Ctrl+G")),
+                                  tr("Go to a line or to a time"),
+                                  [this] { m_tabs->currentLog()->AskGoTo(); }));
+    menu->addSeparator();
+    m_logActions.append(addAction(menu, tr("F&ilter"), QKeySequence(tr("Ctrl+L")),
                                   tr("Show only lines that contain the filter text"),
                                   [this] { m_tabs->currentLog()->FocusFilter(); }));
     m_logActions.append(addAction(menu, tr("Clear Fi&lter"), QKeySequence(tr("Ctrl+Shift+F")),
@@ -255,6 +269,19 @@ void MainWindow::makeViewMenu()
     m_logActions.append(addAction(menu, tr("Pre&vious Problem"), QKeySequence(tr("Shift+F8")),
                                   tr("Go to the previous warning or error"),
                                   [this] { m_tabs->currentLog()->GoToProblem(-1); }));
+    menu->addSeparator();
+    m_logActions.append(addAction(menu, tr("&Mark"), QKeySequence(tr("Ctrl+M")),
+                                  tr("Mark the current line, or remove its mark"),
+                                  [this] { m_tabs->currentLog()->ToggleMark(); }));
+    m_logActions.append(addAction(menu, tr("N&ote..."), QKeySequence(tr("Ctrl+Shift+M")),
+                                  tr("Write a note on the current line"),
+                                  [this] { m_tabs->currentLog()->AskNote(); }));
+    m_logActions.append(addAction(menu, tr("Next Mar&k"), QKeySequence(tr("F2")),
+                                  tr("Go to the next marked line"),
+                                  [this] { m_tabs->currentLog()->GoToMark(1); }));
+    m_logActions.append(addAction(menu, tr("Previo&us Mark"), QKeySequence(tr("Shift+F2")),
+                                  tr("Go to the previous marked line"),
+                                  [this] { m_tabs->currentLog()->GoToMark(-1); }));
     menu->addSeparator();
     m_logActions.append(addAction(menu, tr("&Reload"), QKeySequence(tr("F5")),
                                   tr("Reload the file"),

@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "app/window/MarksFile.h"
 #include "app/window/WindowSettings.h"
 
 #include <QMainWindow>
@@ -86,6 +87,7 @@ private:
     bool offerToForget(QString const& path);
 
     WindowSettings m_settings;
+    MarksFile m_marks;
     QString m_startupMessage; ///< about a damaged settings file
     NoticeBar* m_notice = nullptr;
     QSplitter* m_splitter;

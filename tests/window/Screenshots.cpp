@@ -8,6 +8,7 @@
 // The build target "screenshots" runs it on a virtual display and puts them into docs/images.
 
 #include "app/window/MainWindow.h"
+#include "app/window/log/LogFindBar.h"
 #include "app/window/log/LogPanel.h"
 #include "common/log/TorkLog.h"
 #include "support/DemoLog.h"
@@ -119,6 +120,18 @@ void TakeLogViews(MainWindow& window, Camera const& camera)
     filter->setText("index");
     camera.take(window, "filter");
     panel->ClearFilter();
+    table->clearSelection();
+
+    panel->GoToProblem(-1);
+    panel->ToggleMark();
+    panel->OpenFind();
+    panel->findChild<LogFindBar*>()->findChild<QLineEdit*>()->setText("saved");
+    panel->FindNext(-1);
+    camera.take(window, "find");
+    panel->FindNext(-1);
+    panel->GoToMark(1);
+    panel->ToggleMark();
+    panel->findChild<LogFindBar*>()->Close();
     table->clearSelection();
 }
 

@@ -210,7 +210,7 @@ void tst_LogInWindow::filterByText()
     const WindowTest test(run(30, QTime(9, 0), "Entry"));
     const auto window = WindowTest::show();
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 30, Patience);
-    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
+    QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);
     QVERIFY(Child<QLineEdit>(window.get(), "Filter by text")->hasFocus());
     QTest::keyClicks(QApplication::focusWidget(), "entry 2");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 11, Patience);
@@ -223,7 +223,7 @@ void tst_LogInWindow::filterByText()
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 30, Patience);
 
     // Marks are drawn in a color that is used nowhere else.
-    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
+    QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);
     QTest::keyClicks(QApplication::focusWidget(), "Entry 7");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
     LogView* view = View(*window);
@@ -247,7 +247,7 @@ void tst_LogInWindow::filterByExpression()
     const auto window = WindowTest::show();
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 30, Patience);
     ClickBox(Child<QCheckBox>(window.get(), "Regular expression"));
-    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
+    QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);
     QTest::keyClicks(QApplication::focusWidget(), "x (3|4)$");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
 
@@ -309,7 +309,7 @@ void tst_LogInWindow::otherPrograms()
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience); // the error and what follows it
     QTest::keyClick(window.get(), Qt::Key_6, Qt::ControlModifier);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 4, Patience);
-    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
+    QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);
     Type(QApplication::focusWidget(), "caf\u00e9");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
 }
@@ -366,7 +366,7 @@ void tst_LogInWindow::wideCharacters()
     QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
     QCOMPARE(QGuiApplication::clipboard()->text(),
              QString("2026-11-22 14:03:02 ERROR caf\u00e9 \u20ac\n"));
-    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
+    QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);
     Type(QApplication::focusWidget(), "caf\u00e9");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
 }

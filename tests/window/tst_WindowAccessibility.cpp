@@ -7,7 +7,9 @@
 
 #include "app/UserMessages.h"
 #include "app/window/ReportDialog.h"
+#include "app/window/log/GoToDialog.h"
 #include "app/window/log/LogSettingsDialog.h"
+#include "app/window/log/NoteDialog.h"
 
 #include <QAbstractButton>
 #include <QClipboard>
@@ -137,6 +139,10 @@ void tst_WindowAccessibility::namesInDialogs()
     QCOMPARE(NamelessControls(&settings), QStringList());
     ReportDialog report("Title", "Heading", "Text", true);
     QCOMPARE(NamelessControls(&report), QStringList());
+    GoToDialog goTo(10, true, nullptr);
+    QCOMPARE(NamelessControls(&goTo), QStringList());
+    NoteDialog note("text", nullptr);
+    QCOMPARE(NamelessControls(&note), QStringList());
 }
 
 // Every action that does something has a shortcut and a status tip, and no two share one. One of

@@ -4,15 +4,17 @@
 #include "app/window/log/LogDelegate.h"
 
 #include "app/window/log/LogModel.h"
+#include "app/window/log/TickScrollBar.h"
 #include "app/window/widgets/SeverityIcons.h"
 
 #include <QApplication>
 #include <QPainter>
-#include <QTextLayout>
 
 namespace Velocor {
 
 namespace {
+
+constexpr int MarkWidth = 4; // pixels
 
 QColor Blended(QColor const& a, QColor const& b, qreal share)
 {
@@ -36,6 +38,27 @@ QTextCharFormat MarkFormat()
     return format;
 }
 
+// Dark text on light blue, which nobody mistakes for the yellow of the filter.
+QTextCharFormat FoundFormat()
+{
+    QTextCharFormat format;
+    format.setBackground(QColor(0x74, 0xe0, 0xef));
+    format.setForeground(QColor(0x1a, 0x1a, 0x1a));
+    return format;
+}
+
+void AddFormats(QVector<QTextLayout::FormatRange>& formats, QVector<QPair<int, int>> const& ranges,
+                QTextCharFormat const& format)
+{
+    for (QPair<int, int> const& range : ranges) {
+        QTextLayout::FormatRange added;
+        added.start = range.first;
+        added.length = range.second;
+        added.format = format;
+        formats.append(added);
+    }
+}
+
 } // namespace
 
 LogDelegate::LogDelegate(QObject* parent) : QStyledItemDelegate(parent) {}
@@ -54,6 +77,10 @@ void LogDelegate::initStyleOption(QStyleOptionViewItem* option, QModelIndex cons
     if (index.data(LogModel::EarlierRole).toBool())
         option->backgroundBrush = Blended(option->palette.color(QPalette::Base),
                                           option->palette.color(QPalette::Text), 0.045);
+    if (index.column() == LogModel::TimeColumn && index.data(LogModel::MarkedRole).toBool())
+        option->backgroundBrush =
+            Blended(option->palette.color(QPalette::Base),
+                    TickScrollBar::Color(TickScrollBar::Marked, option->palette), 0.2);
     if (index.column() == LogModel::SeverityColumn)
         option->palette.setColor(QPalette::Text, SeverityIcons::Color(severity, option->palette));
 }
@@ -70,12 +97,41 @@ void LogDelegate::paint(QPainter* painter, QStyleOptionViewItem const& option,
 
     // Not in the severity column, because the filter does not search translated names.
     const bool isMarkable = index.column() != LogModel::SeverityColumn;
-    const QVector<QPair<int, int>> ranges =
-        isMarkable ? m_filter.Ranges(cell.text) : QVector<QPair<int, int>>();
-    if (ranges.isEmpty())
+    const QVector<QTextLayout::FormatRange> formats =
+        isMarkable ? marks(cell.text) : QVector<QTextLayout::FormatRange>();
+    if (formats.isEmpty())
         StyleOf(cell)->drawControl(QStyle::CE_ItemViewItem, &cell, painter, cell.widget);
     else
-        paintMarked(painter, cell, ranges);
+        paintMarked(painter, cell, formats);
+    if (index.column() == LogModel::TimeColumn && index.data(LogModel::MarkedRole).toBool())
+        paintUserMark(painter, cell, !index.data(LogModel::NoteRole).toString().isEmpty());
+}
+
+// A bar at the edge of the row, and a folded corner if there is a note.
+void LogDelegate::paintUserMark(QPainter* painter, QStyleOptionViewItem const& option, bool hasNote)
+{
+    const QRect cell = option.rect;
+    const QColor color = TickScrollBar::Color(TickScrollBar::Marked, option.palette);
+    painter->save();
+    painter->fillRect(cell.left(), cell.top(), MarkWidth, cell.height(), color);
+    if (hasNote) {
+        const int size = cell.height() / 2;
+        const QPoint corner(cell.right() + 1, cell.top());
+        painter->setPen(Qt::NoPen);
+        painter->setBrush(color);
+        painter->drawPolygon(QPolygon(
+            QVector<QPoint>({corner, corner - QPoint(size, 0), corner + QPoint(0, size)})));
+    }
+    painter->restore();
+}
+
+// Later formats are drawn over earlier ones.
+QVector<QTextLayout::FormatRange> LogDelegate::marks(QString const& text) const
+{
+    QVector<QTextLayout::FormatRange> formats;
+    AddFormats(formats, m_filter.Ranges(text), MarkFormat());
+    AddFormats(formats, m_found.Ranges(text), FoundFormat());
+    return formats;
 }
 
 void LogDelegate::paintHeading(QPainter* painter, QStyleOptionViewItem const& option)
@@ -98,7 +154,7 @@ void LogDelegate::paintHeading(QPainter* painter, QStyleOptionViewItem const& op
 }
 
 void LogDelegate::paintMarked(QPainter* painter, QStyleOptionViewItem const& option,
-                              QVector<QPair<int, int>> const& ranges) const
+                              QVector<QTextLayout::FormatRange> const& formats) const
 {
     QStyle const* style = StyleOf(option);
     QStyleOptionViewItem background = option;
@@ -108,15 +164,6 @@ void LogDelegate::paintMarked(QPainter* painter, QStyleOptionViewItem const& opt
     const QRect cell = style->subElementRect(QStyle::SE_ItemViewItemText, &option, option.widget);
     const int margin = style->pixelMetric(QStyle::PM_FocusFrameHMargin, nullptr, option.widget) + 1;
     const QRect area = cell.adjusted(margin, 0, -margin, 0);
-
-    QVector<QTextLayout::FormatRange> formats;
-    for (QPair<int, int> const& range : ranges) {
-        QTextLayout::FormatRange format;
-        format.start = range.first;
-        format.length = range.second;
-        format.format = MarkFormat();
-        formats.append(format);
-    }
 
     QTextLayout layout(option.text, option.font);
     QTextOption textOption(Qt::AlignLeft);

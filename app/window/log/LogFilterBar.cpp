@@ -29,7 +29,7 @@ LogFilterBar::LogFilterBar(QWidget* parent)
     m_text->setClearButtonEnabled(true);
     m_text->setAccessibleName(tr("Filter by text"));
     m_text->setAcceptDrops(false); // leave dropped files to the window
-    m_text->setToolTip(PlainToolTip(tr("Show only lines that contain this text (Ctrl+F)")));
+    m_text->setToolTip(PlainToolTip(tr("Show only lines that contain this text (Ctrl+L)")));
     m_error->setAccessibleName(tr("Filter error"));
     m_error->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
     m_error->setWordWrap(true);

@@ -219,6 +219,11 @@ void LogModel::applyChange(LogUpdate const& update)
     }
 }
 
+void LogModel::SetMarks(QHash<qint64, QString> const& marks)
+{
+    m_marks = marks;
+}
+
 int LogModel::FindProblem(int row, int step) const
 {
     LogRows const& rows = *m_state.rows;
@@ -442,6 +447,9 @@ QString LogModel::toolTip(int row, int column) const
 {
     if (isHeading(row))
         return QString();
+    const QString note = m_marks.value(LineStart(row));
+    if (!note.isEmpty() && column != MessageColumn)
+        return tr("Note: %1").arg(note);
     if (m_state.rows->marks[static_cast<size_t>(row)] & LogRows::Torn)
         return tr("Remainder of an entry that a later run overwrote");
     if (column != MessageColumn)
@@ -467,8 +475,11 @@ QVariant LogModel::data(QModelIndex const& index, int role) const
 
     switch (role) {
     case Qt::DisplayRole:
-    case Qt::AccessibleTextRole:
         return cellText(row, index.column());
+    case Qt::AccessibleTextRole:
+        return index.column() == TimeColumn && m_marks.contains(LineStart(row))
+                   ? tr("Marked: %1").arg(cellText(row, TimeColumn))
+                   : cellText(row, index.column());
     case Qt::DecorationRole:
         if (index.column() == SeverityColumn && !isHeading(row) && entry(row).isEntry)
             return SeverityIcons::Icon(entry(row).severity, QGuiApplication::palette());
@@ -484,6 +495,10 @@ QVariant LogModel::data(QModelIndex const& index, int role) const
         return isHeading(row);
     case EarlierRole:
         return static_cast<size_t>(row) < m_state.rows->earlier;
+    case MarkedRole:
+        return m_marks.contains(LineStart(row));
+    case NoteRole:
+        return m_marks.value(LineStart(row));
     default:
         return QVariant();
     }

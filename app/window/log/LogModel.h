@@ -11,6 +11,7 @@
 #include <QAbstractTableModel>
 #include <QCache>
 #include <QFile>
+#include <QHash>
 #include <QThread>
 #include <QTimer>
 
@@ -38,7 +39,9 @@ public:
     enum Role {
         SeverityRole = Qt::UserRole, ///< a LogEntry::Severity
         HeadingRole,                 ///< whether the row is a heading
-        EarlierRole                  ///< whether the row belongs to an earlier run
+        EarlierRole,                 ///< whether the row belongs to an earlier run
+        MarkedRole,                  ///< whether the user has marked the row
+        NoteRole                     ///< the user's note on it
     };
 
     explicit LogModel(QObject* parent = nullptr);
@@ -67,6 +70,9 @@ public:
     /// moment. Whether their lines are still in the file is found when they are read.
     void SetPaused(bool paused);
     bool isPaused() const { return m_paused; }
+
+    /// Sets the lines that the user has marked: where they start, and their notes.
+    void SetMarks(QHash<qint64, QString> const& marks);
 
     /// The first row of the nearest entry after (step 1) or before (step -1) that of `row` that is
     /// a warning or worse; -1 if there is none.
@@ -100,6 +106,7 @@ public:
     bool IsGone(int row) const;
 
     QString const& path() const { return m_path; }
+    LogLineParser const& parser() const { return m_parser; }
     LogUpdate const& state() const { return m_state; }
     bool isReading() const { return m_reading; }
 
@@ -172,6 +179,7 @@ private:
     LogFilter m_filter;
     LogUpdate m_state;
     int m_rowCount = 0; // fewer than the rows of m_state only while a change is being signaled
+    QHash<qint64, QString> m_marks;
     mutable QFile m_file;
     mutable QCache<qint64, Line> m_lines;
 };

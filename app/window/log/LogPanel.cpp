@@ -5,10 +5,18 @@
 
 #include "app/logfile/LogFileList.h"
 #include "app/logfile/LogIndex.h"
+#include "app/window/log/GoToDialog.h"
 #include "app/window/log/LogFilterBar.h"
+#include "app/window/log/LogFindBar.h"
+#include "app/window/log/LogGoTo.h"
+#include "app/window/log/LogMarks.h"
 #include "app/window/log/LogModel.h"
+#include "app/window/log/LogSearch.h"
 #include "app/window/log/LogView.h"
+#include "app/window/log/NoteDialog.h"
 #include "app/window/log/RunningLogParser.h"
+#include "app/window/log/TickScrollBar.h"
+#include "app/window/widgets/ElidedLabel.h"
 #include "app/window/widgets/FileSizeText.h"
 #include "app/window/widgets/PlainText.h"
 
@@ -16,12 +24,15 @@
 #include <QComboBox>
 #include <QFileInfo>
 #include <QHBoxLayout>
+#include <QKeyEvent>
 #include <QLabel>
 #include <QLocale>
+#include <QMenu>
 #include <QPlainTextEdit>
 #include <QSignalBlocker>
 #include <QSplitter>
 
+#include <algorithm>
 #include <functional>
 
 namespace Velocor {
@@ -45,7 +56,9 @@ public:
 
 LogPanel::LogPanel(QWidget* parent)
     : QWidget(parent), m_model(new LogModel(this)), m_view(new LogView(m_model)),
-      m_filterBar(new LogFilterBar), m_pause(new QCheckBox(tr("Pause"))),
+      m_filterBar(new LogFilterBar), m_findBar(new LogFindBar),
+      m_search(new LogSearch(m_model, this)), m_goTo(new LogGoTo(m_model, this)),
+      m_marks(new LogMarks(m_model, this)), m_pause(new QCheckBox(tr("Pause"))),
       m_follow(new QCheckBox(tr("Follow newest"))), m_splitter(new QSplitter(Qt::Vertical))
 {
     makeControls();
@@ -71,6 +84,11 @@ void LogPanel::makeControls()
     m_follow->setToolTip(PlainToolTip(tr("Scroll to new entries as they arrive (Ctrl+Shift+N)")));
     m_follow->setChecked(true);
 
+    m_note = new ElidedLabel(Qt::ElideRight);
+    m_note->setAccessibleName(tr("Note on the current line"));
+    m_note->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
+    m_note->hide();
+
     m_line = new QPlainTextEdit;
     m_line->setReadOnly(true);
     m_line->setTabChangesFocus(true);
@@ -90,10 +108,24 @@ void LogPanel::makeLayout()
     top->addWidget(m_pause);
     top->addWidget(m_follow);
 
+    auto* table = new QWidget;
+    auto* tableLayout = new QVBoxLayout(table);
+    tableLayout->setContentsMargins(0, 0, 0, 0);
+    tableLayout->setSpacing(6);
+    tableLayout->addWidget(m_view, 1);
+    tableLayout->addWidget(m_findBar);
+
+    auto* current = new QWidget;
+    auto* currentLayout = new QVBoxLayout(current);
+    currentLayout->setContentsMargins(0, 0, 0, 0);
+    currentLayout->setSpacing(4);
+    currentLayout->addWidget(m_note);
+    currentLayout->addWidget(m_line, 1);
+
     m_splitter->setAccessibleName(tr("Log entries and current line"));
     m_splitter->setChildrenCollapsible(false);
-    m_splitter->addWidget(m_view);
-    m_splitter->addWidget(m_line);
+    m_splitter->addWidget(table);
+    m_splitter->addWidget(current);
     m_splitter->setStretchFactor(0, 1);
     m_line->setMinimumHeight(m_line->fontMetrics().lineSpacing() * 2 + 12);
     m_splitter->setSizes({400, m_line->fontMetrics().lineSpacing() * 3 + 12});
@@ -115,12 +147,26 @@ void LogPanel::connectAll()
         m_model->SetFilter(m_filterBar->filter());
         m_view->UpdateMarks();
     });
+    connect(m_findBar, &LogFindBar::textChanged, this, &LogPanel::applyFind);
+    connect(m_findBar, &LogFindBar::stepRequested, this, &LogPanel::FindNext);
+    connect(m_findBar, &LogFindBar::closed, this, [this] { m_view->setFocus(); });
+    connect(m_goTo, &LogGoTo::arrived, this, [this](int row, QString const& message) {
+        if (row >= 0)
+            m_view->GoToRow(row);
+        if (!message.isEmpty())
+            Q_EMIT messageReported(message);
+    });
+    connect(m_marks, &LogMarks::changed, this, &LogPanel::showMarks);
+    connect(m_view, &LogView::menuRequested, this, &LogPanel::showMenu);
+    connect(m_search, &LogSearch::changed, this, &LogPanel::showFound);
     connect(m_view, &LogView::followingChanged, this, [this](bool following) {
         m_follow->setChecked(following);
         Q_EMIT stateChanged();
     });
     connect(m_view->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
             &LogPanel::showCurrentLine);
+    connect(m_view->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
+            &LogPanel::showFound);
     connect(m_model, &LogModel::refreshed, this, [this] {
         m_filterBar->ShowSlowLine(m_model->state().slowLine);
         updatePlaceholder();
@@ -151,6 +197,7 @@ void LogPanel::showFile(QString const& path)
     m_files->setToolTip(PlainToolTip(path));
     m_files->setAccessibleDescription(path);
     m_model->Open(path, RunningLogParser(), path == m_currentPath);
+    m_marks->Load();
     updatePlaceholder();
 }
 
@@ -234,6 +281,162 @@ void LogPanel::ClearFilter()
     m_filterBar->Clear();
 }
 
+void LogPanel::OpenFind()
+{
+    m_findBar->Open();
+}
+
+void LogPanel::applyFind()
+{
+    const LogFilter text = m_findBar->text();
+    m_wantedStep = 0;
+    m_search->SetText(text);
+    m_view->SetFound(text);
+    showFound();
+}
+
+void LogPanel::FindNext(int step)
+{
+    if (m_findBar->isHidden() || !m_findBar->hasText()) {
+        const bool mayGoOn = m_findBar->hasText();
+        m_findBar->Open();
+        if (!mayGoOn)
+            return;
+    }
+    m_findBar->Apply();
+    m_wantedStep = step;
+    goToFound();
+    showFound();
+}
+
+// Keeps waiting while the next hit is not known yet.
+void LogPanel::goToFound()
+{
+    const int step = m_wantedStep;
+    if (step == 0)
+        return;
+    int row = -1;
+    const LogSearch::Answer answer = m_search->Next(m_view->StartRow(step), step, row);
+    if (answer == LogSearch::Answer::Unknown)
+        return;
+    m_wantedStep = 0;
+    if (answer == LogSearch::Answer::None) {
+        if (m_search->text().hasText() && m_search->slowLine() == 0)
+            Q_EMIT messageReported(tr("Not found"));
+        return;
+    }
+    m_view->GoToRow(row);
+    if (answer == LogSearch::Answer::Wrapped)
+        Q_EMIT messageReported(step > 0 ? tr("Continued from the top")
+                                        : tr("Continued from the bottom"));
+}
+
+void LogPanel::showFound()
+{
+    goToFound();
+    m_findBar->ShowSlowLine(m_search->slowLine());
+    m_view->ticks()->SetTicks(TickScrollBar::Found, m_search->hits());
+    const auto count = static_cast<int>(m_search->hits()->size());
+    const int number = m_search->NumberOf(m_view->currentIndex().row());
+    QString text;
+    if (!m_search->text().hasText() || m_search->slowLine() > 0)
+        text = QString();
+    else if (!m_search->isComplete() && m_search->percent() < 99)
+        text = tr("Searching: %1%").arg(m_search->percent());
+    else if (count == 0)
+        text = m_search->isComplete() ? tr("Not found") : QString();
+    else if (number > 0)
+        text = tr("%L1 of %L2").arg(number).arg(count);
+    else
+        text = count == 1 ? tr("1 line") : tr("%L1 lines").arg(count);
+    m_findBar->ShowCount(text);
+}
+
+void LogPanel::keyPressEvent(QKeyEvent* event)
+{
+    if (event->key() == Qt::Key_Escape && !m_findBar->isHidden())
+        m_findBar->Close();
+    else
+        QWidget::keyPressEvent(event);
+}
+
+void LogPanel::AskGoTo()
+{
+    const int current = m_view->currentIndex().row();
+    GoToDialog dialog(static_cast<qint64>(m_model->state().lines), current >= 0, this);
+    if (dialog.exec() != QDialog::Accepted)
+        return;
+    m_view->setFocus();
+    m_goTo->Find(dialog.place(), m_view->currentIndex().row());
+}
+
+void LogPanel::SetMarkStore(LogMarkStore* store)
+{
+    m_marks->SetStore(store);
+}
+
+void LogPanel::report(QString const& message)
+{
+    if (!message.isEmpty())
+        Q_EMIT messageReported(message);
+}
+
+void LogPanel::ToggleMark()
+{
+    report(m_marks->Toggle(m_view->currentIndex().row()));
+}
+
+void LogPanel::AskNote()
+{
+    const QPersistentModelIndex current = m_view->currentIndex();
+    if (!current.isValid()) {
+        report(tr("Select a line first"));
+        return;
+    }
+    NoteDialog dialog(m_marks->NoteOf(current.row()), this);
+    if (dialog.exec() == QDialog::Accepted)
+        report(m_marks->SetNote(current.row(), dialog.note()));
+}
+
+void LogPanel::GoToMark(int step)
+{
+    std::vector<int> const& rows = *m_marks->rows();
+    if (rows.empty()) {
+        report(tr("No marks in the lines shown"));
+        return;
+    }
+    const int from = m_view->StartRow(step);
+    const auto after = std::upper_bound(rows.begin(), rows.end(), from);
+    const auto before = std::lower_bound(rows.begin(), rows.end(), from);
+    const bool isAhead = step > 0 ? after != rows.end() : before != rows.begin();
+    if (step > 0)
+        m_view->GoToRow(isAhead ? *after : rows.front());
+    else
+        m_view->GoToRow(isAhead ? *(before - 1) : rows.back());
+    m_view->setFocus();
+    if (!isAhead)
+        report(step > 0 ? tr("Continued from the top") : tr("Continued from the bottom"));
+}
+
+void LogPanel::showMarks()
+{
+    m_view->ticks()->SetTicks(TickScrollBar::Marked, m_marks->rows());
+    m_view->viewport()->update();
+    showCurrentLine();
+}
+
+void LogPanel::showMenu(QPoint const& position)
+{
+    auto* menu = new QMenu(this);
+    menu->setAttribute(Qt::WA_DeleteOnClose);
+    menu->addAction(tr("&Copy"), this, &LogPanel::CopySelected);
+    menu->addSeparator();
+    const bool isMarked = m_marks->isMarked(m_view->currentIndex().row());
+    menu->addAction(isMarked ? tr("Remove &Mark") : tr("&Mark"), this, &LogPanel::ToggleMark);
+    menu->addAction(tr("&Note..."), this, &LogPanel::AskNote);
+    menu->popup(position);
+}
+
 void LogPanel::CopySelected()
 {
     const int count = m_view->CopySelected();
@@ -310,6 +513,10 @@ void LogPanel::showCurrentLine()
     const QModelIndex current = m_view->currentIndex();
     m_line->setPlainText(current.isValid() ? m_model->EntryText(current.row(), LogIndex::LineLimit)
                                            : QString());
+    const QString note = m_marks->NoteOf(current.row());
+    m_note->setText(note.isEmpty() ? QString() : tr("Note: %1").arg(note));
+    m_note->setToolTip(PlainToolTip(note));
+    m_note->setVisible(!note.isEmpty());
 }
 
 QList<int> LogPanel::columnWidths() const

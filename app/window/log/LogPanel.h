@@ -12,12 +12,19 @@
 class QCheckBox;
 class QComboBox;
 class QPlainTextEdit;
+class QMenu;
 class QSplitter;
 
 namespace Velocor {
 
+class ElidedLabel;
 class LogFilterBar;
+class LogFindBar;
+class LogGoTo;
+class LogMarkStore;
+class LogMarks;
 class LogModel;
+class LogSearch;
 class LogView;
 
 /// A log view with its controls: choice of older files, filter, table, and the text of the current
@@ -53,6 +60,31 @@ public:
 
     void FocusFilter();
     void ClearFilter();
+
+    /// Opens the find bar.
+    void OpenFind();
+
+    /// Goes to the next (step 1) or previous (step -1) line with the text to find, as soon as it is
+    /// found. Opens the find bar if there is no text yet.
+    void FindNext(int step);
+
+    /// Asks for a line number or a time, and goes there.
+    void AskGoTo();
+
+    /// Sets where the marks of log files are kept, before a file is opened.
+    ///
+    /// @param store  not owned
+    void SetMarkStore(LogMarkStore* store);
+
+    /// Marks the current line or removes its mark.
+    void ToggleMark();
+
+    /// Asks for a note on the current line.
+    void AskNote();
+
+    /// Goes to the next (step 1) or previous (step -1) marked line, or reports that there is none.
+    void GoToMark(int step);
+
     void CopySelected();
     void SelectAll();
 
@@ -81,6 +113,9 @@ Q_SIGNALS:
     /// A message for the status bar.
     void messageReported(QString const& text);
 
+protected:
+    void keyPressEvent(QKeyEvent* event) override;
+
 private:
     void makeControls();
     void makeLayout();
@@ -90,17 +125,29 @@ private:
     void showFile(QString const& path);
     void showCurrentLine();
     void updatePlaceholder();
+    void applyFind();
+    void showFound();
+    void goToFound();
+    void showMarks();
+    void showMenu(QPoint const& position);
+    void report(QString const& message);
 
     LogModel* m_model;
     LogView* m_view;
     LogFilterBar* m_filterBar;
+    LogFindBar* m_findBar;
+    LogSearch* m_search;
+    LogGoTo* m_goTo;
+    LogMarks* m_marks;
     QComboBox* m_files = nullptr;
     QCheckBox* m_pause;
     QCheckBox* m_follow;
     QPlainTextEdit* m_line = nullptr;
+    ElidedLabel* m_note = nullptr;
     QSplitter* m_splitter;
     QString m_currentPath; // the log of the running program; empty for other logs
     int m_percent = 100;
+    int m_wantedStep = 0; // to a hit that has not been found yet
 };
 
 } // namespace Velocor

@@ -7,9 +7,11 @@
 #include "app/logfile/LogSeverities.h"
 #include "app/window/log/LogDelegate.h"
 #include "app/window/log/LogModel.h"
+#include "app/window/log/TickScrollBar.h"
 
 #include <QAbstractButton>
 #include <QClipboard>
+#include <QContextMenuEvent>
 #include <QEvent>
 #include <QGuiApplication>
 #include <QHeaderView>
@@ -22,7 +24,8 @@
 namespace Velocor {
 
 LogView::LogView(LogModel* model, QWidget* parent)
-    : QTableView(parent), m_model(model), m_delegate(new LogDelegate(this))
+    : QTableView(parent), m_model(model), m_delegate(new LogDelegate(this)),
+      m_ticks(new TickScrollBar(this))
 {
     setUp();
     setModel(model);
@@ -36,6 +39,7 @@ void LogView::setUp()
 {
     setAccessibleName(tr("Log entries"));
     setItemDelegate(m_delegate);
+    setVerticalScrollBar(m_ticks);
     setSelectionBehavior(SelectRows);
     setSelectionMode(ExtendedSelection);
     setEditTriggers(NoEditTriggers);
@@ -105,6 +109,15 @@ void LogView::focusInEvent(QFocusEvent* event)
         selectionModel()->clearCurrentIndex();
 }
 
+// The key opens the menu at the current row, not in the middle of the table.
+void LogView::contextMenuEvent(QContextMenuEvent* event)
+{
+    QPoint position = event->globalPos();
+    if (event->reason() == QContextMenuEvent::Keyboard && currentIndex().isValid())
+        position = viewport()->mapToGlobal(visualRect(currentIndex()).bottomLeft());
+    Q_EMIT menuRequested(position);
+}
+
 void LogView::SetFollowing(bool following)
 {
     if (following) {
@@ -155,6 +168,7 @@ void LogView::afterRefresh()
     setColumnHidden(LogModel::ElapsedColumn, !state.hasElapsed);
     fitTimes();
     updateHeadings();
+    m_ticks->SetRowCount(m_model->rowCount());
     restoreCurrent();
     if (m_following) {
         updateGeometries(); // updates the scroll bar's range
@@ -223,8 +237,7 @@ void LogView::updateHeadings()
     setSpan(earlier, 0, 1, LogModel::ColumnCount);
 }
 
-// The row to start from: the current one, or the one outside of the visible rows.
-int LogView::rowBefore(int step) const
+int LogView::StartRow(int step) const
 {
     if (currentIndex().isValid())
         return currentIndex().row();
@@ -246,19 +259,32 @@ int LogView::firstColumn() const
 LogView::Jump LogView::GoToProblem(int step)
 {
     Jump jump = Jump::Ahead;
-    int row = m_model->FindProblem(rowBefore(step), step);
+    int row = m_model->FindProblem(StartRow(step), step);
     if (row < 0) {
         jump = Jump::Wrapped;
         row = m_model->FindProblem(step > 0 ? -1 : m_model->rowCount(), step);
     }
     if (row < 0)
         return Jump::None;
+    GoToRow(row);
+    return jump;
+}
+
+void LogView::GoToRow(int row)
+{
     // Whatever keys are held: Shift would extend the selection.
     const QModelIndex index = m_model->index(row, firstColumn());
     selectionModel()->setCurrentIndex(index, QItemSelectionModel::ClearAndSelect |
                                                  QItemSelectionModel::Rows);
     scrollTo(index, PositionAtCenter);
-    return jump;
+    if (row + 1 < m_model->rowCount())
+        SetFollowing(false);
+}
+
+void LogView::SetFound(LogFilter const& found)
+{
+    m_delegate->SetFound(found);
+    viewport()->update();
 }
 
 QList<int> LogView::selectedRowNumbers() const

@@ -8,7 +8,9 @@
 namespace Velocor {
 
 class LogDelegate;
+class LogFilter;
 class LogModel;
+class TickScrollBar;
 
 /// The table of a log: keeps its position while rows change, or follows the newest entry.
 ///
@@ -37,6 +39,20 @@ public:
     /// without one, from the rows in view.
     Jump GoToProblem(int step);
 
+    /// Makes a row the only selected and the current one, and centers it. Unless it is the last
+    /// one, the view no longer follows the newest entry.
+    void GoToRow(int row);
+
+    /// The row to search from in a direction: the current one or, without one, the one outside of
+    /// the rows in view.
+    int StartRow(int step) const;
+
+    /// Highlights the matches of a text to find.
+    void SetFound(LogFilter const& found);
+
+    /// The vertical scroll bar.
+    TickScrollBar* ticks() const { return m_ticks; }
+
     /// Copies the selected lines, as stored in the file.
     ///
     /// @return the number of lines copied
@@ -57,8 +73,12 @@ public:
 Q_SIGNALS:
     void followingChanged(bool following);
 
+    /// The menu of the table is wanted at a global position.
+    void menuRequested(QPoint const& position);
+
 protected:
     void paintEvent(QPaintEvent* event) override;
+    void contextMenuEvent(QContextMenuEvent* event) override;
     void changeEvent(QEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
     void focusInEvent(QFocusEvent* event) override;
@@ -71,7 +91,6 @@ private:
     void afterRefresh();
     void noteCurrent();
     void restoreCurrent();
-    int rowBefore(int step) const;
     int firstColumn() const;
     void setRowHeight();
     void fitTimes();
@@ -80,6 +99,7 @@ private:
 
     LogModel* m_model;
     LogDelegate* m_delegate;
+    TickScrollBar* m_ticks;
     QString m_placeholder;
     QString m_fittedPath;
     bool m_following = true;

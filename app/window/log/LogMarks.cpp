@@ -1,0 +1,186 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/log/LogMarks.h"
+
+#include "app/logfile/LogLineReader.h"
+#include "app/logfile/LogMarkFinder.h"
+#include "app/window/log/LogMarkStore.h"
+#include "app/window/log/LogModel.h"
+
+#include <algorithm>
+
+namespace Velocor {
+
+namespace {
+
+size_t BitOf(qint64 start)
+{
+    return static_cast<size_t>(start) & 0xffff;
+}
+
+} // namespace
+
+LogMarks::LogMarks(LogModel* model, QObject* parent)
+    : QObject(parent), m_model(model), m_rows(std::make_shared<std::vector<int>>())
+{
+    connect(model, &LogModel::modelReset, this, [this] { m_wasReset = true; });
+    connect(model, &LogModel::rowsRemoved, this, [this] { m_haveMoved = true; });
+    connect(model, &LogModel::dataChanged, this, [this] { m_haveMoved = true; });
+    connect(model, &LogModel::rowsInserted, this, [this](QModelIndex const&, int first) {
+        m_haveMoved = m_haveMoved || first < m_rowCount;
+    });
+    connect(model, &LogModel::refreshed, this, &LogMarks::noteRefreshed);
+}
+
+LogMarks::~LogMarks()
+{
+    if (m_finder)
+        m_finder->SetCurrentRequest(m_request + 1);
+    m_thread.quit();
+    m_thread.wait();
+}
+
+void LogMarks::Load()
+{
+    m_path = m_model->path();
+    m_marks = m_store ? m_store->Marks(m_path) : QVector<LogMark>();
+    ++m_request;
+    update();
+}
+
+void LogMarks::noteRefreshed()
+{
+    if (m_wasReset || (m_haveMoved && dropOverwritten()))
+        find();
+    if (m_wasReset || m_haveMoved) {
+        update();
+    } else if (m_model->rowCount() > m_rowCount && !m_marks.isEmpty()) {
+        auto rows = std::make_shared<std::vector<int>>(*m_rows);
+        addRows(*rows, m_rowCount);
+        m_rows = rows;
+        Q_EMIT changed();
+    }
+    m_rowCount = m_model->rowCount();
+    m_wasReset = false;
+    m_haveMoved = false;
+}
+
+// Another line may start exactly where a marked one did.
+bool LogMarks::dropOverwritten()
+{
+    bool isDropped = false;
+    LogLineReader reader;
+    const bool isOpen = !m_marks.isEmpty() && reader.Open(m_path, m_model->parser().fileType());
+    for (LogMark& mark : m_marks) {
+        if (!mark.isFound || (isOpen && LogMark::IdentityOf(reader.Line(mark.start)) == mark.line))
+            continue;
+        mark.isFound = false;
+        isDropped = true;
+    }
+    return isDropped;
+}
+
+void LogMarks::find()
+{
+    if (m_marks.isEmpty())
+        return;
+    if (!m_finder) {
+        m_finder = new LogMarkFinder;
+        m_finder->moveToThread(&m_thread);
+        connect(&m_thread, &QThread::finished, m_finder, &QObject::deleteLater);
+        connect(this, &LogMarks::findRequested, m_finder, &LogMarkFinder::Find);
+        connect(m_finder, &LogMarkFinder::found, this, &LogMarks::take);
+        m_thread.start();
+    }
+    m_finder->SetCurrentRequest(++m_request);
+    Q_EMIT findRequested(m_request, m_path, m_marks, m_model->parser().fileType());
+}
+
+void LogMarks::take(int request, QVector<LogMark> const& marks)
+{
+    if (request != m_request)
+        return;
+    m_marks = marks;
+    update();
+}
+
+void LogMarks::update()
+{
+    QHash<qint64, QString> notes;
+    m_starts.reset();
+    for (LogMark const& mark : qAsConst(m_marks)) {
+        if (!mark.isFound)
+            continue;
+        notes.insert(mark.start, mark.note);
+        m_starts.set(BitOf(mark.start));
+    }
+    m_model->SetMarks(notes);
+    auto rows = std::make_shared<std::vector<int>>();
+    if (!notes.isEmpty())
+        addRows(*rows, 0);
+    m_rows = rows;
+    m_rowCount = m_model->rowCount();
+    Q_EMIT changed();
+}
+
+void LogMarks::addRows(std::vector<int>& rows, int from) const
+{
+    const int count = m_model->rowCount();
+    for (int row = from; row < count; ++row) {
+        if (m_starts.test(BitOf(m_model->LineStart(row))) && indexOf(row) >= 0)
+            rows.push_back(row);
+    }
+}
+
+int LogMarks::indexOf(int row) const
+{
+    if (row < 0 || row >= m_model->rowCount())
+        return -1;
+    const qint64 start = m_model->LineStart(row);
+    for (int i = 0; i < m_marks.size(); ++i) {
+        if (m_marks.at(i).isFound && m_marks.at(i).start == start)
+            return i;
+    }
+    return -1;
+}
+
+QString LogMarks::NoteOf(int row) const
+{
+    const int at = indexOf(row);
+    return at < 0 ? QString() : m_marks.at(at).note;
+}
+
+QString LogMarks::Toggle(int row)
+{
+    const int at = indexOf(row);
+    if (at < 0)
+        return SetNote(row, QString());
+    m_marks.removeAt(at);
+    return save();
+}
+
+QString LogMarks::SetNote(int row, QString const& note)
+{
+    if (row < 0 || row >= m_model->rowCount() || m_model->LineStart(row) < 0)
+        return tr("Select a line first");
+    int at = indexOf(row);
+    if (at < 0) {
+        if (m_marks.size() >= LogMark::MaximumMarks)
+            return tr("A file can have %1 marks").arg(LogMark::MaximumMarks);
+        at = m_marks.size();
+        m_marks.append(LogMark::Of(m_path, m_model->LineStart(row), m_model->parser().fileType()));
+    }
+    m_marks[at].note = note.simplified().left(LogMark::MaximumNote);
+    return save();
+}
+
+// A search that is under way would bring back the former marks.
+QString LogMarks::save()
+{
+    ++m_request;
+    update();
+    return m_store ? m_store->SetMarks(m_path, m_marks) : QString();
+}
+
+} // namespace Velocor

@@ -1,0 +1,29 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include <QDialog>
+#include <QString>
+
+class QLineEdit;
+
+namespace Velocor {
+
+/// Asks for a note on a line of a log.
+class NoteDialog : public QDialog
+{
+    Q_OBJECT
+
+public:
+    /// @param note  the note so far
+    NoteDialog(QString const& note, QWidget* parent);
+
+    /// What the user has entered, of at most LogMark::MaximumNote characters.
+    QString note() const;
+
+private:
+    QLineEdit* m_text;
+};
+
+} // namespace Velocor

@@ -1,0 +1,191 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// The locator without a thread: Locate() returns when the place is found.
+
+#include "app/logfile/LogLocator.h"
+
+#include "app/logfile/LogIndex.h"
+#include "support/DemoLog.h"
+#include "support/TestFiles.h"
+
+#include <QTemporaryDir>
+#include <QtTest>
+
+using namespace Velocor;
+
+using DemoLog::entry;
+
+namespace {
+
+// Rows 0 to 5: two days, a line that continues an entry, and a clock that is set back a little.
+QByteArray TwoDays()
+{
+    return entry("22:00:00.000", "Trace", "first", true) +
+           entry("23:00:00.000", "Trace", "second", true) +
+           entry("09:00:00.000", "Error", "third") + "continued\n" +
+           entry("10:00:00.000", "Trace", "fourth") + entry("09:59:00.000", "Trace", "fifth");
+}
+
+} // namespace
+
+class tst_LogLocator : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void places_data();
+    void places();
+    void withoutDates();
+    void withoutTimes();
+    void wideCharacters();
+    void hiddenLine();
+    void severalSlices();
+    void obsoleteRequest();
+
+private:
+    LogLocation locate(QByteArray const& log, char const* place, int current,
+                       LogFilter const& filter = LogFilter(),
+                       LogLineParser const& parser = LogLineParser());
+
+    QTemporaryDir m_folder;
+    int m_current = 0;
+};
+
+LogLocation tst_LogLocator::locate(QByteArray const& log, char const* place, int current,
+                                   LogFilter const& filter, LogLineParser const& parser)
+{
+    const QString path = m_folder.filePath("app.log");
+    TestFiles::write(path, log);
+    LogIndex index(parser, LogFilter(), true);
+    index.Begin();
+    index.Feed(log.constData(), log.size());
+    index.End();
+    LogLocateRequest request;
+    request.number = 1;
+    request.path = path;
+    request.parser = parser;
+    request.place = LogPlace::Parse(place);
+    request.rows = std::make_shared<LogRows>(index.Rows(filter));
+    request.currentRow = current;
+    LogLocation found;
+    LogLocator locator;
+    locator.SetCurrentRequest(m_current);
+    connect(&locator, &LogLocator::located, this,
+            [&](LogLocation const& location) { found = location; });
+    locator.Locate(request);
+    return found;
+}
+
+void tst_LogLocator::places_data()
+{
+    QTest::addColumn<QByteArray>("place");
+    QTest::addColumn<int>("current");
+    QTest::addColumn<int>("answer");
+    QTest::addColumn<int>("row");
+    const auto row = [](char const* name, char const* place, int current,
+                        LogLocation::Answer answer, int found) {
+        QTest::newRow(name) << QByteArray(place) << current << int(answer) << found;
+    };
+    row("first line", "1", -1, LogLocation::Found, 0);
+    row("line", "4", -1, LogLocation::Found, 3);
+    row("last line", "6", -1, LogLocation::Found, 5);
+    row("one line too many", "7", -1, LogLocation::NoSuchLine, -1);
+    row("time on the last day", "09:00", -1, LogLocation::Found, 2);
+    row("next entry after the time", "9:00:00.001", -1, LogLocation::Found, 4);
+    row("time on the day of the current entry", "22:30", 0, LogLocation::Found, 1);
+    row("no more on that day", "23:30", 0, LogLocation::Found, 2);
+    row("of a continued entry", "9:00", 3, LogLocation::Found, 2);
+    row("after the end", "11:00", -1, LogLocation::Beyond, 5);
+    row("date", "2025-03-03", 0, LogLocation::Found, 2);
+    row("date and time", "2025-03-02 22:30", -1, LogLocation::Found, 1);
+    row("before the start", "2020-01-01", -1, LogLocation::Found, 0);
+    row("forward", "+1h", 0, LogLocation::Found, 1);
+    row("forward over a gap", "+61m", 0, LogLocation::Found, 2);
+    row("forward from a continued entry", "+1h", 3, LogLocation::Found, 4);
+    row("forward, after the end", "+2h", 3, LogLocation::Beyond, 5);
+    row("forward, not to the current row", "+0s", 0, LogLocation::Found, 1);
+    row("back", "-10h", 2, LogLocation::Found, 1);
+    row("back a little", "-1s", 2, LogLocation::Found, 1);
+    row("back from a clock set back", "-1m", 4, LogLocation::Found, 2);
+    row("back, before the start", "-2d", 4, LogLocation::Beyond, 0);
+}
+
+void tst_LogLocator::places()
+{
+    QFETCH(QByteArray, place);
+    QFETCH(int, current);
+    QFETCH(int, answer);
+    QFETCH(int, row);
+    const LogLocation location = locate(TwoDays(), place.constData(), current);
+    QCOMPARE(int(location.answer), answer);
+    QCOMPARE(location.row, row);
+    QCOMPARE(location.start >= 0, row >= 0);
+}
+
+void tst_LogLocator::withoutDates()
+{
+    const LogLineParser parser({"hh:mm:ss"}, {});
+    const QByteArray log = "09:00:00 Trace a\n10:00:00 Trace b\n11:00:00 Trace c\n";
+    QCOMPARE(locate(log, "10:00", -1, LogFilter(), parser).row, 1);
+    QCOMPARE(locate(log, "+90m", 0, LogFilter(), parser).row, 2);
+    QCOMPARE(locate(log, "2025-03-03 10:00", -1, LogFilter(), parser).answer, LogLocation::NoDates);
+}
+
+void tst_LogLocator::withoutTimes()
+{
+    QCOMPARE(locate("a\nb\n", "10:00", -1).answer, LogLocation::NoTimes);
+    QCOMPARE(locate("a\nb\n", "2", -1).row, 1);
+    QCOMPARE(locate("", "10:00", -1).answer, LogLocation::NoTimes);
+}
+
+// Lines are those of the file, whatever is shown of it.
+void tst_LogLocator::wideCharacters()
+{
+    LogFileType type;
+    type.encoding = LogEncoding::Utf16Be;
+    LogLineParser parser;
+    parser.SetFileType(type);
+    QByteArray log;
+    for (char character : TwoDays())
+        log.append('\0').append(character);
+    log.replace(QByteArray("\0c\0o", 4), QByteArray("\1\n\n\1", 4)); // no line feeds
+    QCOMPARE(locate(log, "4", -1, LogFilter(), parser).row, 3);
+    QCOMPARE(locate(log, "6", -1, LogFilter(), parser).row, 5);
+    QCOMPARE(locate(log, "7", -1, LogFilter(), parser).answer, LogLocation::NoSuchLine);
+    QCOMPARE(locate(log, "2025-03-02 22:30", -1, LogFilter(), parser).row, 1);
+    QCOMPARE(locate(log, "+1h", 3, LogFilter(), parser).row, 4);
+}
+
+void tst_LogLocator::hiddenLine()
+{
+    LogFilter filter;
+    filter.SetSeverity(LogEntry::Error, false);
+    const LogLocation hidden = locate(TwoDays(), "3", -1, filter);
+    QCOMPARE(hidden.answer, LogLocation::Nearest);
+    QVERIFY(hidden.row == 1 || hidden.row == 2);
+    const LogLocation shown = locate(TwoDays(), "5", -1, filter);
+    QCOMPARE(shown.answer, LogLocation::Found);
+    QCOMPARE(shown.row, 2);
+}
+
+void tst_LogLocator::severalSlices()
+{
+    QByteArray log;
+    for (int i = 0; i < 60000; ++i)
+        log += entry("09:00:00.000", "Trace", QString("line %1").arg(i));
+    QCOMPARE(locate(log, "59999", -1).row, 59998);
+    QCOMPARE(locate(log, "25000", -1).row, 24999);
+}
+
+void tst_LogLocator::obsoleteRequest()
+{
+    m_current = 2;
+    QCOMPARE(locate(TwoDays(), "4", -1).row, -1);
+    m_current = 1;
+    QCOMPARE(locate(TwoDays(), "4", -1).row, 3);
+}
+
+QTEST_GUILESS_MAIN(tst_LogLocator)
+
+#include "tst_LogLocator.moc"

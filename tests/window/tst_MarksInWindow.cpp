@@ -1,0 +1,361 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// Marks and notes, driven with keys and mouse on a real screen.
+
+#include "WindowParts.h"
+
+#include "app/window/MarksFile.h"
+#include "app/window/log/LogModel.h"
+#include "app/window/log/LogView.h"
+#include "app/window/log/NoteDialog.h"
+#include "app/window/log/TickScrollBar.h"
+
+#include <QLabel>
+#include <QLineEdit>
+#include <QLoggingCategory>
+#include <QMenu>
+#include <QStatusBar>
+
+using namespace Velocor;
+using namespace WindowParts;
+
+using DemoLog::entry;
+using DemoLog::run;
+using DemoLog::writtenOver;
+
+namespace {
+
+QColor const MarkColor(0x8a, 0x2b, 0xe2);
+
+QVector<int> Marked(MainWindow& window)
+{
+    QVector<int> rows;
+    QAbstractItemModel const* model = View(window)->model();
+    for (int row = 0; row < model->rowCount(); ++row) {
+        if (model->index(row, 0).data(LogModel::MarkedRole).toBool())
+            rows.append(row);
+    }
+    return rows;
+}
+
+QString Note(MainWindow& window)
+{
+    auto const* label = Child<QLabel>(&window, "Note on the current line");
+    return label->isVisible() ? label->text() : QString();
+}
+
+QString Status(MainWindow const& window)
+{
+    return window.statusBar()->currentMessage();
+}
+
+void WriteNote(MainWindow& window, char const* note)
+{
+    WindowTest::whenShown<NoteDialog>([note](NoteDialog* dialog) {
+        auto* field = dialog->findChild<QLineEdit*>();
+        field->selectAll();
+        QTest::keyClicks(field, note);
+        QTest::keyClick(field, Qt::Key_Return);
+    });
+    QTest::keyClick(&window, Qt::Key_M, Qt::ControlModifier | Qt::ShiftModifier);
+    window.activateWindow(); // no window manager does it
+    QVERIFY(QTest::qWaitForWindowActive(&window));
+}
+
+void MarkRow(MainWindow& window, int row)
+{
+    View(window)->GoToRow(row);
+    QTest::keyClick(&window, Qt::Key_M, Qt::ControlModifier);
+}
+
+} // namespace
+
+class tst_MarksInWindow : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void initTestCase();
+    void cleanup();
+
+    void marks();
+    void nextAndPrevious();
+    void notes();
+    void looks();
+    void outliveTheSession();
+    void moveWithTheirLines();
+    void lineWrittenOver();
+    void filteredOut();
+    void nothingSelected();
+    void contextMenu();
+    void fileIsBounded();
+    void damagedFile();
+    void hostileNotes();
+};
+
+void tst_MarksInWindow::initTestCase()
+{
+    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
+    // in a test's log. The environment would be too late: it was read with the application object.
+    QLoggingCategory::setFilterRules("qt.qpa.*=false");
+}
+
+void tst_MarksInWindow::cleanup()
+{
+    const QWidgetList windows = QApplication::topLevelWidgets();
+    for (QWidget* window : windows)
+        window->hide();
+}
+
+void tst_MarksInWindow::marks()
+{
+    const WindowTest test(run(100, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+    MarkRow(*window, 30);
+    MarkRow(*window, 60);
+    QCOMPARE(Marked(*window), QVector<int>({30, 60}));
+    QCOMPARE(View(*window)->model()->index(30, 0).data(Qt::AccessibleTextRole).toString(),
+             QString("Marked: 2025-03-03 09:00:30.000"));
+    QTest::keyClick(window.get(), Qt::Key_M, Qt::ControlModifier);
+    QCOMPARE(Marked(*window), QVector<int>({30}));
+}
+
+void tst_MarksInWindow::nextAndPrevious()
+{
+    const WindowTest test(run(100, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+    QTest::keyClick(window.get(), Qt::Key_F2);
+    QCOMPARE(Status(*window), QString("No marks in the lines shown"));
+    for (int row : {60, 30, 90})
+        MarkRow(*window, row);
+    View(*window)->GoToRow(40);
+    for (int row : {60, 90, 30, 60}) {
+        QTest::keyClick(window.get(), Qt::Key_F2);
+        QCOMPARE(View(*window)->currentIndex().row(), row);
+        QCOMPARE(View(*window)->selectionModel()->selectedRows().size(), 1);
+    }
+    QCOMPARE(Status(*window), QString("Continued from the top"));
+    for (int row : {30, 90}) {
+        QTest::keyClick(window.get(), Qt::Key_F2, Qt::ShiftModifier);
+        QCOMPARE(View(*window)->currentIndex().row(), row);
+    }
+    QCOMPARE(Status(*window), QString("Continued from the bottom"));
+}
+
+void tst_MarksInWindow::notes()
+{
+    const WindowTest test(run(100, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+    View(*window)->GoToRow(30);
+    WriteNote(*window, "it began here");
+    QCOMPARE(Marked(*window), QVector<int>({30}));
+    QCOMPARE(Note(*window), QString("Note: it began here"));
+    QCOMPARE(View(*window)->model()->index(30, 0).data(Qt::ToolTipRole).toString(),
+             QString("Note: it began here"));
+    View(*window)->GoToRow(31);
+    QCOMPARE(Note(*window), QString());
+    View(*window)->GoToRow(30);
+    WriteNote(*window, "or not");
+    QCOMPARE(Note(*window), QString("Note: or not"));
+    QTest::keyClick(window.get(), Qt::Key_M, Qt::ControlModifier);
+    QCOMPARE(Note(*window), QString());
+    QVERIFY(Marked(*window).isEmpty());
+}
+
+// In the table and in the scroll bar.
+void tst_MarksInWindow::looks()
+{
+    const WindowTest test(run(100, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+    const auto pixels = [](QWidget* widget) {
+        const QImage image = widget->grab().toImage();
+        int count = 0;
+        for (int y = 0; y < image.height(); ++y) {
+            for (int x = 0; x < image.width(); ++x)
+                count += image.pixelColor(x, y) == MarkColor ? 1 : 0;
+        }
+        return count;
+    };
+    LogView* view = View(*window);
+    QCOMPARE(pixels(view->viewport()), 0);
+    QCOMPARE(pixels(view->ticks()), 0);
+    MarkRow(*window, 50);
+    QTRY_VERIFY(pixels(view->viewport()) > 4 * 10);
+    QTRY_VERIFY(pixels(view->ticks()) > 10);
+    const int withoutNote = pixels(view->viewport());
+    WriteNote(*window, "why");
+    QTRY_VERIFY(pixels(view->viewport()) > withoutNote + 10);
+    QTest::keyClick(window.get(), Qt::Key_M, Qt::ControlModifier);
+    QTRY_COMPARE(pixels(view->viewport()), 0);
+    QTRY_COMPARE(pixels(view->ticks()), 0);
+}
+
+void tst_MarksInWindow::outliveTheSession()
+{
+    const WindowTest test(run(100, QTime(9, 0), "x"));
+    {
+        const auto window = WindowTest::show();
+        QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+        MarkRow(*window, 70);
+        View(*window)->GoToRow(30);
+        WriteNote(*window, "<b>\"]]> & 100%1");
+    }
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(Marked(*window), QVector<int>({30, 70}), Patience);
+    View(*window)->GoToRow(30);
+    QTRY_COMPARE(Note(*window), QString("Note: <b>\"]]> & 100%1"));
+}
+
+// Found by content: lines were added before, and the file has been written over.
+void tst_MarksInWindow::moveWithTheirLines()
+{
+    const QByteArray older = run(100, QTime(17, 0), "older", true);
+    const WindowTest test(older);
+    {
+        const auto window = WindowTest::show();
+        QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+        MarkRow(*window, 80);
+    }
+    QVERIFY(TestFiles::write(test.logFile(),
+                             writtenOver(older, run(20, QTime(9, 0), "a much longer entry"))));
+    const auto window = WindowTest::show();
+    QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) > 20, Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(Marked(*window).size(), 1, Patience);
+    const int row = Marked(*window).first();
+    QVERIFY(row != 80);
+    QCOMPARE(View(*window)->model()->index(row, 3).data().toString(), QString("older 80"));
+
+    // While the window is open.
+    QVERIFY(TestFiles::write(test.logFile(), "new\n" + older));
+    QTRY_COMPARE_WITH_TIMEOUT(Marked(*window), QVector<int>({81}), Patience);
+}
+
+// The new lines start exactly where the old ones did.
+void tst_MarksInWindow::lineWrittenOver()
+{
+    const QByteArray older = run(100, QTime(17, 0), "older", true);
+    const QByteArray newer = run(60, QTime(9, 0), "newer");
+    const WindowTest test(writtenOver(older, newer.left(newer.indexOf("newer 40") + 9)));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 102, Patience);
+    int row = 0;
+    while (View(*window)->model()->index(row, 3).data().toString() != "older 50")
+        ++row;
+    MarkRow(*window, row);
+    QCOMPARE(Marked(*window).size(), 1);
+    QVERIFY(TestFiles::write(test.logFile(), writtenOver(older, newer)));
+    QTRY_COMPARE_WITH_TIMEOUT(View(*window)->model()->index(101, 3).data().toString(),
+                              QString("newer 59"), Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(Marked(*window).isEmpty(), Patience);
+}
+
+void tst_MarksInWindow::filteredOut()
+{
+    const WindowTest test(run(100, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+    MarkRow(*window, 15);
+    MarkRow(*window, 72);
+    QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);
+    QTest::keyClicks(QApplication::focusWidget(), "x 7");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 11, Patience);
+    QTRY_COMPARE(Marked(*window), QVector<int>({3}));
+    QTest::keyClick(window.get(), Qt::Key_F2);
+    QCOMPARE(View(*window)->currentIndex().row(), 3);
+    Panel(*window)->ClearFilter();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+    QTRY_COMPARE(Marked(*window), QVector<int>({15, 72}));
+    QTest::keyClick(window.get(), Qt::Key_F2, Qt::ShiftModifier);
+    QCOMPARE(View(*window)->currentIndex().row(), 15);
+}
+
+void tst_MarksInWindow::nothingSelected()
+{
+    const WindowTest test(run(10, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 10, Patience);
+    QTest::keyClick(window.get(), Qt::Key_M, Qt::ControlModifier);
+    QCOMPARE(Status(*window), QString("Select a line first"));
+    QVERIFY(Marked(*window).isEmpty());
+}
+
+void tst_MarksInWindow::contextMenu()
+{
+    const WindowTest test(run(10, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 10, Patience);
+    LogView* view = View(*window);
+    view->GoToRow(4);
+    QContextMenuEvent byKey(QContextMenuEvent::Keyboard, QPoint(1, 1));
+    QApplication::sendEvent(view->viewport(), &byKey);
+    auto* menu = qobject_cast<QMenu*>(QApplication::activePopupWidget());
+    QVERIFY(menu);
+    const QPoint row =
+        view->viewport()->mapToGlobal(view->visualRect(view->currentIndex()).center());
+    QVERIFY(qAbs(menu->y() - row.y()) < 2 * view->rowHeight(4));
+    QTest::keyClick(menu, Qt::Key_M);
+    QCOMPARE(Marked(*window), QVector<int>({4}));
+}
+
+void tst_MarksInWindow::fileIsBounded()
+{
+    const WindowTest test;
+    MarksFile file(test.folder());
+    LogMark mark;
+    mark.line = "1:a";
+    mark.note = "n";
+    for (int i = 0; i <= MarksFile::MaximumFiles; ++i)
+        QCOMPARE(file.SetMarks(QString("/log %1 a").arg(i), {mark}), QString());
+    QCOMPARE(file.Marks("/log 0 a").size(), 0);
+    QCOMPARE(file.Marks(QString("/log 1 a")).size(), 1);
+    QCOMPARE(file.Marks(QString("/log 50 a")).value(0).note, QString("n"));
+    QCOMPARE(file.SetMarks(QString("/log 1 a"), {}), QString());
+    QCOMPARE(file.Marks(QString("/log 1 a")).size(), 0);
+    QVector<LogMark> many(LogMark::MaximumMarks + 1, mark);
+    QCOMPARE(file.SetMarks("/many", many), QString());
+    QCOMPARE(file.Marks("/many").size(), int(LogMark::MaximumMarks));
+}
+
+void tst_MarksInWindow::damagedFile()
+{
+    const WindowTest test(run(10, QTime(9, 0), "x"));
+    const QByteArray damaged("<VelocorSettings><Log1>");
+    QVERIFY(TestFiles::write(test.folder() + "data/marks.cfg", damaged));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 10, Patience);
+    MarkRow(*window, 4);
+    QCOMPARE(Marked(*window), QVector<int>({4}));
+    QVERIFY2(Status(*window).contains("is damaged"), qPrintable(Status(*window)));
+    QCOMPARE(TestFiles::read(test.folder() + "data/marks.cfg"), damaged);
+}
+
+// Whatever a note holds, it comes back.
+void tst_MarksInWindow::hostileNotes()
+{
+    const WindowTest test;
+    MarksFile file(test.folder());
+    for (QString const& note :
+         {QString(), QString("a b  c"), QString("]]>"), QString("\\n\\"), QString("<x>&amp;"),
+          QString::fromUtf8("\xE2\x82\xAC \xF0\x9F\x98\x80"), QString(" x "), QString("-")}) {
+        LogMark mark;
+        mark.line = "1:a";
+        mark.start = 7;
+        mark.note = note;
+        QCOMPARE(file.SetMarks("/log", {mark}), QString());
+        const QVector<LogMark> marks = file.Marks("/log");
+        QCOMPARE(marks.size(), 1);
+        QCOMPARE(marks[0].note, note);
+        QCOMPARE(marks[0].start, qint64(7));
+        QVERIFY(marks[0].above.isEmpty() && marks[0].below.isEmpty());
+    }
+}
+
+QTEST_MAIN(tst_MarksInWindow)
+
+#include "tst_MarksInWindow.moc"
