@@ -95,6 +95,7 @@ private slots:
     void namesTheLimit_data();
     void namesTheLimit();
     void tellsThePlace();
+    void staysAtItsEnd();
     void tellsWithoutBeingWatched();
     void textIsUntouched();
     void readsWhatAPlainSourceReads_data();
@@ -366,6 +367,20 @@ void tst_TorkXmlGuard::tellsThePlace()
     QVERIFY(!reader.parse(source));
     QCOMPARE(handler.line, 3);
     QCOMPARE(handler.column, 5);
+}
+
+// For a reader that asks again, and for what was fetched already.
+void tst_TorkXmlGuard::staysAtItsEnd()
+{
+    QByteArray document = Nested(1001);
+    QBuffer buffer(&document);
+    TorkXmlGuard source(&buffer);
+    int count = 0;
+    for (QChar next; next != QChar(QXmlInputSource::EndOfDocument); next = source.next())
+        count += next == QLatin1Char('<') ? 1 : 0;
+    QCOMPARE(count, 1001);
+    for (int i = 0; i < 10; ++i)
+        QCOMPARE(source.next(), QChar(QXmlInputSource::EndOfDocument));
 }
 
 void tst_TorkXmlGuard::tellsWithoutBeingWatched()
