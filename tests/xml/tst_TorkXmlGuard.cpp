@@ -98,6 +98,8 @@ private slots:
     void staysAtItsEnd();
     void tellsWithoutBeingWatched();
     void textIsUntouched();
+    void givesWhatAPlainSourceGives_data();
+    void givesWhatAPlainSourceGives();
     void readsWhatAPlainSourceReads_data();
     void readsWhatAPlainSourceReads();
 };
@@ -412,6 +414,30 @@ void tst_TorkXmlGuard::textIsUntouched()
     reader.setContentHandler(&text);
     QVERIFY(reader.parse(source));
     QCOMPARE(text.all, expected + "x");
+}
+
+void tst_TorkXmlGuard::givesWhatAPlainSourceGives_data()
+{
+    QTest::addColumn<QByteArray>("document");
+
+    QTest::newRow("nothing") << QByteArray();
+    QTest::newRow("short") << QByteArray("<r>a&amp;</r>");
+    QTest::newRow("fetched in pieces") << "<r>" + QByteArray(3000, 'x') + "</r>";
+}
+
+// Character by character, the ends of data between two fetches included.
+void tst_TorkXmlGuard::givesWhatAPlainSourceGives()
+{
+    QFETCH(QByteArray, document);
+    QBuffer plainBuffer(&document);
+    QXmlInputSource plain(&plainBuffer);
+    QBuffer buffer(&document);
+    TorkXmlGuard source(&buffer);
+    QChar expected;
+    do {
+        expected = plain.next();
+        QCOMPARE(source.next(), expected);
+    } while (expected != QChar(QXmlInputSource::EndOfDocument));
 }
 
 void tst_TorkXmlGuard::readsWhatAPlainSourceReads_data()
