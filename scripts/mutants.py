@@ -176,10 +176,18 @@ class Desk:
         with os.fdopen(reading) as pipe:
             self.display = ":" + pipe.readline().strip()
 
+    def clear(self):
+        """Removes what the last test left; one that was killed may have left file systems mounted."""
+        mounted = [line.split()[1] for line in pathlib.Path("/proc/self/mounts").read_text().splitlines()]
+        for place in mounted:
+            if place.startswith(f"{self.folder}/"):
+                subprocess.run(["umount", place], stderr=subprocess.DEVNULL)
+        shutil.rmtree(self.folder, ignore_errors=True)
+
     def run(self, test, functions, limit, **more):
         """Runs functions of a test until one fails; returns why it failed, or nothing."""
         program, variables = test
-        shutil.rmtree(self.folder, ignore_errors=True)
+        self.clear()
         (self.folder / "tmp").mkdir(parents=True, exist_ok=True)
         (self.folder / "tmp").chmod(0o1777)  # some tests change the user
         home = variables["HOME"]
@@ -403,6 +411,7 @@ def main():
         for desk in desks:
             desk.server.terminate()
             desk.server.wait()
+            desk.clear()
     return report(mutants, known, not options.sample)
 
 

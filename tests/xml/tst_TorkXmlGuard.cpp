@@ -95,8 +95,11 @@ private slots:
     void namesTheLimit_data();
     void namesTheLimit();
     void tellsThePlace();
+    void staysAtItsEnd();
     void tellsWithoutBeingWatched();
     void textIsUntouched();
+    void givesWhatAPlainSourceGives_data();
+    void givesWhatAPlainSourceGives();
     void readsWhatAPlainSourceReads_data();
     void readsWhatAPlainSourceReads();
 };
@@ -368,6 +371,20 @@ void tst_TorkXmlGuard::tellsThePlace()
     QCOMPARE(handler.column, 5);
 }
 
+// For a reader that asks again, and for what was fetched already.
+void tst_TorkXmlGuard::staysAtItsEnd()
+{
+    QByteArray document = Nested(1001);
+    QBuffer buffer(&document);
+    TorkXmlGuard source(&buffer);
+    int count = 0;
+    for (QChar next; next != QChar(QXmlInputSource::EndOfDocument); next = source.next())
+        count += next == QLatin1Char('<') ? 1 : 0;
+    QCOMPARE(count, 1001);
+    for (int i = 0; i < 10; ++i)
+        QCOMPARE(source.next(), QChar(QXmlInputSource::EndOfDocument));
+}
+
 void tst_TorkXmlGuard::tellsWithoutBeingWatched()
 {
     QByteArray document = Nested(1001);
@@ -397,6 +414,30 @@ void tst_TorkXmlGuard::textIsUntouched()
     reader.setContentHandler(&text);
     QVERIFY(reader.parse(source));
     QCOMPARE(text.all, expected + "x");
+}
+
+void tst_TorkXmlGuard::givesWhatAPlainSourceGives_data()
+{
+    QTest::addColumn<QByteArray>("document");
+
+    QTest::newRow("nothing") << QByteArray();
+    QTest::newRow("short") << QByteArray("<r>a&amp;</r>");
+    QTest::newRow("fetched in pieces") << "<r>" + QByteArray(3000, 'x') + "</r>";
+}
+
+// Character by character, the ends of data between two fetches included.
+void tst_TorkXmlGuard::givesWhatAPlainSourceGives()
+{
+    QFETCH(QByteArray, document);
+    QBuffer plainBuffer(&document);
+    QXmlInputSource plain(&plainBuffer);
+    QBuffer buffer(&document);
+    TorkXmlGuard source(&buffer);
+    QChar expected;
+    do {
+        expected = plain.next();
+        QCOMPARE(source.next(), expected);
+    } while (expected != QChar(QXmlInputSource::EndOfDocument));
 }
 
 void tst_TorkXmlGuard::readsWhatAPlainSourceReads_data()

@@ -98,6 +98,7 @@ class tst_TorkXmlLexer : public QObject
 private slots:
     void counts_data();
     void counts();
+    void refusesAtOnce();
 };
 
 void tst_TorkXmlLexer::counts_data()
@@ -272,6 +273,18 @@ void tst_TorkXmlLexer::counts()
         if (expected > 0)
             QCOMPARE(reason(expected - 1), ReasonOf(count, expected - 1));
     }
+}
+
+// Nobody would live to see all of this document.
+void tst_TorkXmlLexer::refusesAtOnce()
+{
+    QByteArray entities = "<!ENTITY e0 'x'>";
+    for (int i = 1; i < 100; ++i) {
+        const QByteArray half = "&e" + QByteArray::number(i - 1) + ";";
+        entities += "<!ENTITY e" + QByteArray::number(i) + " '" + half + half + "'>";
+    }
+    const QString document = Typed(entities, "&e99;");
+    QCOMPARE(ReasonAfter(document, LimitsWith(Expansion, 1000), false), ReasonOf(Expansion, 1000));
 }
 
 QTEST_APPLESS_MAIN(tst_TorkXmlLexer)
