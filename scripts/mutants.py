@@ -14,6 +14,7 @@ import collections
 import concurrent.futures
 import contextlib
 import fcntl
+import functools
 import hashlib
 import itertools
 import json
@@ -77,6 +78,7 @@ def load(path, otherwise):
     return json.loads(path.read_text()) if path.exists() else otherwise
 
 
+@functools.cache
 def targets():
     names = run("git", "ls-files", *ROOMS, cwd=ROOT, capture_output=True).stdout.split()
     return sorted(n for n in names if n.endswith(".cpp") or n.endswith("_p.h")
@@ -97,25 +99,20 @@ def find(name):
     commands = {c["file"]: c for c in load(WORK / "plain/compile_commands.json", [])}
     text = (ROOT / name).read_text("latin-1")
     unit = name
-    if name.endswith(".h"):  # parsed as part of a source that includes it, its own if there is one
-        room = pathlib.Path(name).parent.as_posix()
+    if name.endswith(".h"):  # parsed as part of a source that includes it, best its own or one beside it
+        own, room = re.sub(r"(_p)?\.h$", ".cpp", name), os.path.dirname(name)
         users = [n for n in targets() if n.endswith(".cpp") and f'"{name}"' in (ROOT / n).read_text("latin-1")]
-        own = name.replace("_p.h", ".cpp").replace(".h", ".cpp")
-        unit = own if own in users else next((n for n in users if n.startswith(room)), users[0] if users else None)
-        if unit is None:
+        if not users:
             return name, [], text
+        unit = min(users, key=lambda n: (n != own, not n.startswith(room)))
     first = targets().index(name) * NUMBERS + 1
     kept = WORK / "found" / (digest(name, str(first), text, (ROOT / unit).read_text("latin-1"),
                                     pathlib.Path(mutations.__file__).read_text()) + ".json")
     if not kept.exists():
-        words = shlex.split(commands[str(COPY / unit)]["command"])[1:]
-        arguments, resources = [], run("clang++-14", "-print-resource-dir", capture_output=True).stdout.strip()
-        while words:
-            word = words.pop(0)
-            if word in ("-Xclang", "-o", "-c"):
-                words.pop(0)
-            elif word != "-Winvalid-pch":
-                arguments.append(word)
+        words, left_out = shlex.split(commands[str(COPY / unit)]["command"]), ("-Xclang", "-o", "-c")
+        resources = run("clang++-14", "-print-resource-dir", capture_output=True).stdout.strip()
+        arguments = [word for before, word in zip(words, words[1:])
+                     if before not in left_out and word not in (*left_out, "-Winvalid-pch")]
         arguments += ["-resource-dir", resources, "-ferror-limit=0"]
         mutants, changed = mutations.compilable(name, first, text, str(COPY / name), arguments, str(COPY / unit))
         kept.parent.mkdir(parents=True, exist_ok=True)
