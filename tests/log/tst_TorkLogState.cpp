@@ -3,6 +3,7 @@
 
 #include "common/log/TorkLog.h"
 #include "common/log/TorkLogLock_p.h"
+#include "common/log/TorkLogStamp_p.h"
 #include "log/LogAtATime.h"
 #include "log/LogFolder.h"
 #include "support/ForkedChild.h"
@@ -34,6 +35,8 @@ private slots:
     void isWritingWhileALineIsWritten();
     void waitsForTheLock_data();
     void waitsForTheLock();
+    void stampsWaitForTheirLock_data();
+    void stampsWaitForTheirLock();
     void prefixChangedWhileTheEntryWaits();
     void qtIsReadyBeforeTheFirstFork();
     void stampKeptAtMidnight_data();
@@ -112,6 +115,22 @@ int s_installedHandlers = 0;
 int s_stampsMade = 0;
 int s_categoriesAskedFor = 0;
 std::function<void()> s_beforeWriting;
+
+// Whether an operation in another thread waits while this one holds the lock.
+bool waits(QMutex& mutex, std::function<void()> const& operation)
+{
+    std::atomic<bool> isDone{false};
+    mutex.lock();
+    std::thread other([&] {
+        operation();
+        isDone = true;
+    });
+    std::this_thread::sleep_for(std::chrono::milliseconds(50));
+    const bool waited = !isDone;
+    mutex.unlock();
+    other.join();
+    return waited;
+}
 
 } // namespace
 
@@ -248,18 +267,29 @@ void tst_TorkLogState::waitsForTheLock()
     TorkLog log;
     folder.prepare(log, "app");
 
-    QMutex& mutex = log.*privateField(Mutex());
-    std::atomic<bool> isDone{false};
-    mutex.lock();
-    std::thread other([&] {
-        operation(log);
-        isDone = true;
-    });
-    std::this_thread::sleep_for(std::chrono::milliseconds(50));
-    const bool waited = !isDone;
-    mutex.unlock();
-    other.join();
-    QVERIFY(waited);
+    QVERIFY(waits(log.*privateField(Mutex()), [&] { operation(log); }));
+}
+
+// Qt's environment has a lock of its own, which no entry may hold while a process forks.
+void tst_TorkLogState::stampsWaitForTheirLock_data()
+{
+    using Operation = std::function<void(TorkLogLine&)>;
+    QTest::addColumn<Operation>("operation");
+
+    const auto row = [](char const* name, Operation const& operation) {
+        QTest::newRow(name) << operation;
+    };
+    row("time of day", [](TorkLogLine&) { TorkLogStamp::TimeOfDay(1); });
+    row("kept stamp", [](TorkLogLine& line) { TorkLogStamp::Append(line, 1, 1); });
+    row("new stamp", [](TorkLogLine& line) { TorkLogStamp::Make(line, 1, "ss", 1); });
+}
+Q_DECLARE_METATYPE(std::function<void(TorkLogLine&)>)
+
+void tst_TorkLogState::stampsWaitForTheirLock()
+{
+    QFETCH(std::function<void(TorkLogLine&)>, operation);
+    TorkLogLine line;
+    QVERIFY(waits(TorkLogStamp::Mutex(), [&] { operation(line); }));
 }
 
 // A thread that has its stamp still needs the prefix, and waits for it.
