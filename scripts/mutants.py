@@ -272,6 +272,15 @@ def notice(desk, number, reaching):
     return None
 
 
+def what(mutant):
+    return mutant["file"], mutant["function"], mutant["from"], mutant["to"]
+
+
+def accepted():
+    """The changes that nobody could see: blocks of "file: function", "- before", "+ after" and a reason."""
+    return set(re.findall(r"^(\S+): (\S+)\n- (.*)\n\+ (.*)\n(?=\S)", ACCEPTED.read_text(), re.M))
+
+
 def try_all(mutants, sources, desks, tests_wanted):
     """Runs the mutants whose result is not known yet; returns the results of all."""
     kept, known = WORK / "results.jsonl", {}
@@ -295,7 +304,7 @@ def try_all(mutants, sources, desks, tests_wanted):
 
     in_parallel(desks, one, open_ones)
     for kind, (build, sanitizer, pattern) in SANITIZERS.items():
-        left = [m for m in mutants if m["kind"] == kind and not known[m["key"]]["by"]]
+        left = [m for m in mutants if m["kind"] == kind and not known[m["key"]]["by"] and what(m) not in accepted()]
         names = {name for m in left for _, name, _, _ in reaching.get(m["id"], []) if re.match(pattern, name)}
         if names:
             configure(build, sanitizer)
@@ -310,15 +319,13 @@ def try_all(mutants, sources, desks, tests_wanted):
 
 def report(mutants, known, is_whole):
     """Prints what survived, and what the list of accepted changes need not hold any more."""
-    # Blocks of "file: function", "- before", "+ after" and a reason.
-    accepted = set(re.findall(r"^(\S+): (\S+)\n- (.*)\n\+ (.*)\n(?=\S)", ACCEPTED.read_text(), re.M))
-    failed, rates = False, {}
-    for name in sorted({m["file"] for m in mutants} | {a[0] for a in accepted} - set(targets())):
+    failed, rates, explained = False, {}, accepted()
+    for name in sorted({m["file"] for m in mutants} | {e[0] for e in explained} - set(targets())):
         own = [m for m in mutants if m["file"] == name]
         survivors = [m for m in own if not known[m["key"]]["by"]]
-        listed = [m for m in survivors if what(m) in accepted]
+        listed = [m for m in survivors if what(m) in explained]
         made, lasting = {what(m) for m in own}, {what(m) for m in survivors}
-        for _, function, before, after in sorted(a for a in accepted - lasting if is_whole and a[0] == name):
+        for _, function, before, after in sorted(e for e in explained - lasting if is_whole and e[0] == name):
             is_made = (name, function, before, after) in made
             failed = failed or not is_made
             print(f"{ACCEPTED.name}: {'noticed' if is_made else 'no such change'}: {name}: {function}\n"
@@ -339,10 +346,6 @@ def report(mutants, known, is_whole):
         print(f"mutants of {folder}: {noticed} of {made} noticed, {rate:.1f} %; goal: {GOALS[folder]} %")
         failed = failed or rate < GOALS[folder]
     return failed
-
-
-def what(mutant):
-    return mutant["file"], mutant["function"], mutant["from"], mutant["to"]
 
 
 def some(mutants, chance):
