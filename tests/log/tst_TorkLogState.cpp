@@ -37,6 +37,7 @@ private slots:
     void waitsForTheLock();
     void stampsWaitForTheirLock_data();
     void stampsWaitForTheirLock();
+    void formatChangedWhileTheEntryWaits();
     void prefixChangedWhileTheEntryWaits();
     void qtIsReadyBeforeTheFirstFork();
     void stampKeptAtMidnight_data();
@@ -94,6 +95,13 @@ struct Writing
     friend Field privateField(Writing);
 };
 template struct PrivateField<Writing, &TorkLog::m_writing>;
+
+struct Format
+{
+    using Field = QString TorkLog::*;
+    friend Field privateField(Format);
+};
+template struct PrivateField<Format, &TorkLog::m_dateTimeFormat>;
 
 struct Prefix
 {
@@ -290,6 +298,23 @@ void tst_TorkLogState::stampsWaitForTheirLock()
     QFETCH(std::function<void(TorkLogLine&)>, operation);
     TorkLogLine line;
     QVERIFY(waits(TorkLogStamp::Mutex(), [&] { operation(line); }));
+}
+
+// A thread that has no stamp yet waits for the format.
+void tst_TorkLogState::formatChangedWhileTheEntryWaits()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+
+    QMutex& mutex = log.*privateField(Mutex());
+    mutex.lock();
+    std::thread other([&log] { log.trace("entry"); });
+    std::this_thread::sleep_for(std::chrono::milliseconds(50));
+    log.*privateField(Format()) = "'later'";
+    mutex.unlock();
+    other.join();
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("later Trace entry\n"));
 }
 
 // A thread that has its stamp still needs the prefix, and waits for it.
