@@ -14,6 +14,7 @@ import collections
 import concurrent.futures
 import contextlib
 import fcntl
+import functools
 import hashlib
 import itertools
 import json
@@ -77,6 +78,7 @@ def load(path, otherwise):
     return json.loads(path.read_text()) if path.exists() else otherwise
 
 
+@functools.cache
 def targets():
     names = run("git", "ls-files", *ROOMS, cwd=ROOT, capture_output=True).stdout.split()
     return sorted(n for n in names if n.endswith(".cpp") or n.endswith("_p.h")
@@ -97,25 +99,20 @@ def find(name):
     commands = {c["file"]: c for c in load(WORK / "plain/compile_commands.json", [])}
     text = (ROOT / name).read_text("latin-1")
     unit = name
-    if name.endswith(".h"):  # parsed as part of a source that includes it, its own if there is one
-        room = pathlib.Path(name).parent.as_posix()
+    if name.endswith(".h"):  # parsed as part of a source that includes it, best its own or one beside it
+        own, room = re.sub(r"(_p)?\.h$", ".cpp", name), os.path.dirname(name)
         users = [n for n in targets() if n.endswith(".cpp") and f'"{name}"' in (ROOT / n).read_text("latin-1")]
-        own = name.replace("_p.h", ".cpp").replace(".h", ".cpp")
-        unit = own if own in users else next((n for n in users if n.startswith(room)), users[0] if users else None)
-        if unit is None:
+        if not users:
             return name, [], text
+        unit = min(users, key=lambda n: (n != own, not n.startswith(room)))
     first = targets().index(name) * NUMBERS + 1
     kept = WORK / "found" / (digest(name, str(first), text, (ROOT / unit).read_text("latin-1"),
                                     pathlib.Path(mutations.__file__).read_text()) + ".json")
     if not kept.exists():
-        words = shlex.split(commands[str(COPY / unit)]["command"])[1:]
-        arguments, resources = [], run("clang++-14", "-print-resource-dir", capture_output=True).stdout.strip()
-        while words:
-            word = words.pop(0)
-            if word in ("-Xclang", "-o", "-c"):
-                words.pop(0)
-            elif word != "-Winvalid-pch":
-                arguments.append(word)
+        words, left_out = shlex.split(commands[str(COPY / unit)]["command"]), ("-Xclang", "-o", "-c")
+        resources = run("clang++-14", "-print-resource-dir", capture_output=True).stdout.strip()
+        arguments = [word for before, word in zip(words, words[1:])
+                     if before not in left_out and word not in (*left_out, "-Winvalid-pch")]
         arguments += ["-resource-dir", resources, "-ferror-limit=0"]
         mutants, changed = mutations.compilable(name, first, text, str(COPY / name), arguments, str(COPY / unit))
         kept.parent.mkdir(parents=True, exist_ok=True)
@@ -273,7 +270,8 @@ def record(build, desks, sources, pattern):
 def notice(desk, number, reaching):
     """The test that notices a mutant, if any: quick functions of a program run in one process."""
     runs = {}
-    for seconds, name, test, function in sorted(reaching.get(number, []), key=lambda r: r[0]):
+    # In the order of the program: some tests need what others leave.
+    for seconds, name, test, function in reaching.get(number, []):
         own = function if seconds > 0.5 else ""
         runs.setdefault((name, own), (test, []))[1].append((seconds, function))
     def cost(entry):  # less for a test that noticed others
@@ -286,6 +284,15 @@ def notice(desk, number, reaching):
             NOTICED[name, own] += 1
             return f"{name} {why}"
     return None
+
+
+def what(mutant):
+    return mutant["file"], mutant["function"], mutant["from"], mutant["to"]
+
+
+def accepted():
+    """The changes that nobody could see: blocks of "file: function", "- before", "+ after" and a reason."""
+    return set(re.findall(r"^(\S+): (\S+)\n- (.*)\n\+ (.*)\n(?=\S)", ACCEPTED.read_text(), re.M))
 
 
 def try_all(mutants, sources, desks, tests_wanted):
@@ -311,7 +318,7 @@ def try_all(mutants, sources, desks, tests_wanted):
 
     in_parallel(desks, one, open_ones)
     for kind, (build, sanitizer, pattern) in SANITIZERS.items():
-        left = [m for m in mutants if m["kind"] == kind and not known[m["key"]]["by"]]
+        left = [m for m in mutants if m["kind"] == kind and not known[m["key"]]["by"] and what(m) not in accepted()]
         names = {name for m in left for _, name, _, _ in reaching.get(m["id"], []) if re.match(pattern, name)}
         if names:
             configure(build, sanitizer)
@@ -326,15 +333,13 @@ def try_all(mutants, sources, desks, tests_wanted):
 
 def report(mutants, known, is_whole):
     """Prints what survived, and what the list of accepted changes need not hold any more."""
-    # Blocks of "file: function", "- before", "+ after" and a reason.
-    accepted = set(re.findall(r"^(\S+): (\S+)\n- (.*)\n\+ (.*)\n(?=\S)", ACCEPTED.read_text(), re.M))
-    failed, rates = False, {}
-    for name in sorted({m["file"] for m in mutants} | {a[0] for a in accepted} - set(targets())):
+    failed, rates, explained = False, {}, accepted()
+    for name in sorted({m["file"] for m in mutants} | {e[0] for e in explained} - set(targets())):
         own = [m for m in mutants if m["file"] == name]
         survivors = [m for m in own if not known[m["key"]]["by"]]
-        listed = [m for m in survivors if what(m) in accepted]
+        listed = [m for m in survivors if what(m) in explained]
         made, lasting = {what(m) for m in own}, {what(m) for m in survivors}
-        for _, function, before, after in sorted(a for a in accepted - lasting if is_whole and a[0] == name):
+        for _, function, before, after in sorted(e for e in explained - lasting if is_whole and e[0] == name):
             is_made = (name, function, before, after) in made
             failed = failed or not is_made
             print(f"{ACCEPTED.name}: {'noticed' if is_made else 'no such change'}: {name}: {function}\n"
@@ -355,10 +360,6 @@ def report(mutants, known, is_whole):
         print(f"mutants of {folder}: {noticed} of {made} noticed, {rate:.1f} %; goal: {GOALS[folder]} %")
         failed = failed or rate < GOALS[folder]
     return failed
-
-
-def what(mutant):
-    return mutant["file"], mutant["function"], mutant["from"], mutant["to"]
 
 
 def some(mutants, chance):

@@ -3,6 +3,7 @@
 
 #include "common/log/TorkLog.h"
 #include "common/log/TorkLogLock_p.h"
+#include "common/log/TorkLogStamp_p.h"
 #include "log/LogAtATime.h"
 #include "log/LogFolder.h"
 #include "support/ForkedChild.h"
@@ -34,6 +35,9 @@ private slots:
     void isWritingWhileALineIsWritten();
     void waitsForTheLock_data();
     void waitsForTheLock();
+    void stampsWaitForTheirLock_data();
+    void stampsWaitForTheirLock();
+    void formatChangedWhileTheEntryWaits();
     void prefixChangedWhileTheEntryWaits();
     void qtIsReadyBeforeTheFirstFork();
     void stampKeptAtMidnight_data();
@@ -56,6 +60,7 @@ PRIVATE_FIELD(SeverityName, TorkLog, QString, m_severityName);
 PRIVATE_FIELD(ConsoleKey, TorkLog, QString, m_outputToConsoleKey);
 PRIVATE_FIELD(Console, TorkLog, bool, m_outputToConsole);
 PRIVATE_FIELD(Writing, TorkLog, int, m_writing);
+PRIVATE_FIELD(Format, TorkLog, QString, m_dateTimeFormat);
 PRIVATE_FIELD(Prefix, TorkLog, QString, m_elapsedTimePrefix);
 PRIVATE_FIELD(Mutex, TorkLog, QMutex, m_mutex);
 
@@ -65,6 +70,22 @@ int s_installedHandlers = 0;
 int s_stampsMade = 0;
 int s_categoriesAskedFor = 0;
 std::function<void()> s_beforeWriting;
+
+// Whether an operation in another thread waits while this one holds the lock.
+bool waits(QMutex& mutex, std::function<void()> const& operation)
+{
+    std::atomic<bool> isDone{false};
+    mutex.lock();
+    std::thread other([&] {
+        operation();
+        isDone = true;
+    });
+    std::this_thread::sleep_for(std::chrono::milliseconds(50));
+    const bool waited = !isDone;
+    mutex.unlock();
+    other.join();
+    return waited;
+}
 
 } // namespace
 
@@ -201,18 +222,46 @@ void tst_TorkLogState::waitsForTheLock()
     TorkLog log;
     folder.prepare(log, "app");
 
+    QVERIFY(waits(log.*privateField(Mutex()), [&] { operation(log); }));
+}
+
+// Qt's environment has a lock of its own, which no entry may hold while a process forks.
+void tst_TorkLogState::stampsWaitForTheirLock_data()
+{
+    using Operation = std::function<void(TorkLogLine&)>;
+    QTest::addColumn<Operation>("operation");
+
+    const auto row = [](char const* name, Operation const& operation) {
+        QTest::newRow(name) << operation;
+    };
+    row("time of day", [](TorkLogLine&) { TorkLogStamp::TimeOfDay(1); });
+    row("kept stamp", [](TorkLogLine& line) { TorkLogStamp::Append(line, 1, 1); });
+    row("new stamp", [](TorkLogLine& line) { TorkLogStamp::Make(line, 1, "ss", 1); });
+}
+Q_DECLARE_METATYPE(std::function<void(TorkLogLine&)>)
+
+void tst_TorkLogState::stampsWaitForTheirLock()
+{
+    QFETCH(std::function<void(TorkLogLine&)>, operation);
+    TorkLogLine line;
+    QVERIFY(waits(TorkLogStamp::Mutex(), [&] { operation(line); }));
+}
+
+// A thread that has no stamp yet waits for the format.
+void tst_TorkLogState::formatChangedWhileTheEntryWaits()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+
     QMutex& mutex = log.*privateField(Mutex());
-    std::atomic<bool> isDone{false};
     mutex.lock();
-    std::thread other([&] {
-        operation(log);
-        isDone = true;
-    });
+    std::thread other([&log] { log.trace("entry"); });
     std::this_thread::sleep_for(std::chrono::milliseconds(50));
-    const bool waited = !isDone;
+    log.*privateField(Format()) = "'later'";
     mutex.unlock();
     other.join();
-    QVERIFY(waited);
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("later Trace entry\n"));
 }
 
 // A thread that has its stamp still needs the prefix, and waits for it.

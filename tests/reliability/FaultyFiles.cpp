@@ -171,6 +171,7 @@ void Start(Fault fault, int step, bool lasts, int error, char const* name = null
 FaultyFiles::FaultyFiles(QString const& folder)
 {
     std::snprintf(s_folder, sizeof s_folder, "%s", QFile::encodeName(folder).constData());
+    Start(Fault::None, 0, false, 0);
 }
 
 FaultyFiles::~FaultyFiles()
