@@ -7,12 +7,11 @@
 #include <QFileInfo>
 
 #include <algorithm>
+#include <limits>
 
 namespace Velocor {
 
 namespace {
-
-constexpr int SliceSize = 1 << 20;
 
 // With an expression, which may be slow, a newer request is looked for more often.
 constexpr int PieceSize = 1 << 12;
@@ -62,18 +61,21 @@ void LogScanner::SetFilter(int request, LogFilter const& filter)
     const bool sameText = filter.HasSameText(m_filter);
     m_request = request;
     m_filter = filter;
-    if (!isCurrentRequest())
+    if (!isCurrentRequest()) {
         m_complete = m_complete && sameText; // the text has not been searched for yet
-    else if (sameText && m_complete)
-        report(true);
-    else
+    } else if (sameText && m_complete) {
+        m_isReset = true;
+        report();
+    } else {
         readFromStart(m_index.isOneRun());
+    }
 }
 
 void LogScanner::startOver(bool isOneRun)
 {
     m_index = LogIndex(m_parser, m_filter, isOneRun);
     m_rows = std::make_shared<LogRows>();
+    m_isReset = true;
     m_head.clear();
     m_anchor.clear();
     m_tail.clear();
@@ -94,7 +96,7 @@ void LogScanner::readFromStart(bool isOneRun)
     m_exists = true;
     m_error.clear();
     if (readFrom(file))
-        report(true);
+        report();
 }
 
 void LogScanner::reportMissing()
@@ -102,19 +104,25 @@ void LogScanner::reportMissing()
     startOver(false);
     m_exists = false;
     m_complete = true;
-    report(true);
+    report();
 }
 
 // Returns false if a newer request has arrived.
 bool LogScanner::readFrom(QFile& file)
 {
-    m_modified = QFileInfo(m_path).lastModified();
-    const qint64 size = file.size();
-    QByteArray slice(SliceSize, Qt::Uninitialized);
+    // Of the same moment: what is written later changes both.
+    const QFileInfo info(m_path);
+    m_modified = info.lastModified();
+    const qint64 size = info.size();
+    const qint64 end = size > 0 ? size : std::numeric_limits<qint64>::max(); // or it has none
+    QByteArray slice(m_sliceSize, Qt::Uninitialized);
     bool more = file.seek(m_index.Begin());
     int reported = 0;
-    while (more) {
-        const qint64 count = file.read(slice.data(), slice.size());
+    m_sinceReport.start();
+    m_reportCost = 0;
+    while (more && file.pos() < end) {
+        const qint64 count =
+            file.read(slice.data(), std::min<qint64>(slice.size(), end - file.pos()));
         if (count <= 0)
             break;
         if (!feed(slice, count))
@@ -126,10 +134,12 @@ bool LogScanner::readFrom(QFile& file)
             reported = percent;
             Q_EMIT progressed(m_request, percent);
         }
+        if (file.pos() < end)
+            reportPart();
     }
     m_index.End();
     noteFile(file);
-    m_complete = m_size >= m_index.nextOffset(); // otherwise it was truncated meanwhile
+    m_complete = file.size() >= m_size; // otherwise it was truncated meanwhile
     return true;
 }
 
@@ -159,12 +169,12 @@ void LogScanner::readChanges(QFile& file)
     if ((!isNew && m_modified != modified) || m_index.hasLostSeam())
         readFromStart(false);
     else
-        report(false);
+        report();
 }
 
 void LogScanner::noteFile(QFile& file)
 {
-    m_size = file.size();
+    m_size = m_index.nextOffset();
     m_anchorEnd = m_index.resumeOffset();
     m_head = BytesAt(file, 0, std::min<qint64>(HeadSize, m_anchorEnd));
     const qint64 start = std::max<qint64>(0, m_anchorEnd - AnchorSize);
@@ -212,16 +222,37 @@ void LogScanner::Poll()
     Q_EMIT polled(); // NOLINT(readability-misleading-indentation): Q_EMIT is empty
 }
 
-void LogScanner::report(bool isReset)
+void LogScanner::SetPace(int sliceSize, int interval)
+{
+    m_sliceSize = sliceSize;
+    m_interval = interval;
+}
+
+// Most of the time is for reading, even if the rows are many.
+void LogScanner::reportPart()
+{
+    if (m_sinceReport.elapsed() < std::max<qint64>(m_interval, 4 * m_reportCost) ||
+        m_index.awaitsKnownLines())
+        return;
+    m_sinceReport.start();
+    report(true);
+    m_reportCost = m_interval > 0 ? m_sinceReport.restart() : 0;
+}
+
+void LogScanner::report(bool isPartial)
 {
     LogUpdate update;
     update.request = m_request;
     update.rows = std::make_shared<LogRows>(m_index.Rows(m_filter));
-    if (!isReset)
+    update.isPartial = isPartial;
+    update.isReset = m_isReset;
+    if (!m_isReset)
         update.Compare(*m_rows);
     const bool nothingNew = !update.isReset && update.removed == 0 && update.inserted == 0 &&
                             update.changedTail == 0 && update.rows->size() == m_rows->size() &&
-                            m_index.size() == m_lines;
+                            m_index.size() == m_lines && m_isPartial == isPartial;
+    m_isReset = false;
+    m_isPartial = isPartial;
     m_rows = update.rows;
     m_lines = m_index.size();
     update.exists = m_exists;

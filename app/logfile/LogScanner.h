@@ -7,6 +7,7 @@
 #include "app/logfile/LogUpdate.h"
 
 #include <QDateTime>
+#include <QElapsedTimer>
 #include <QObject>
 #include <QString>
 
@@ -20,10 +21,12 @@ namespace Velocor {
 /// Reads a log file in its own thread and reports the rows for a view of it.
 ///
 /// The file is read in slices through an ordinary handle: with a mapped file, the program would
-/// crash if the file were truncated. The file is identified by its first bytes, by those before the
-/// position where reading resumes, and by those of its last complete lines; if any have changed, it
-/// is another file or another run and is read from the start. So it is if the file was modified and
-/// nothing new is found where it is expected.
+/// crash if the file were truncated. A pass ends where the file ended when it began, however fast
+/// the file grows. During a long one, what has been found so far is reported again and again. The
+/// file is identified by its first bytes, by those before the position where reading resumes, and
+/// by those of its last complete lines; if any have changed, it is another file or another run and
+/// is read from the start. So it is if the file was modified and nothing new is found where it is
+/// expected.
 ///
 /// Requests are numbered; SetCurrentRequest() with a later number cancels work on an earlier one.
 /// SetCurrentRequest() may be called from any thread, everything else only from the scanner's.
@@ -36,6 +39,13 @@ public:
 
     /// Makes earlier requests obsolete.
     void SetCurrentRequest(int request) { m_currentRequest = request; }
+
+    /// How much is read at once, and after how long what has been found is reported while reading
+    /// goes on.
+    ///
+    /// @param sliceSize  in bytes
+    /// @param interval  in milliseconds; 0: after each slice
+    void SetPace(int sliceSize, int interval);
 
 public Q_SLOTS:
     /// Reads a file from its start.
@@ -63,7 +73,8 @@ private:
     bool isSameFile(QFile& file) const;
     void noteFile(QFile& file);
     void reportMissing();
-    void report(bool isReset);
+    void reportPart();
+    void report(bool isPartial = false);
     void startOver(bool isOneRun);
 
     std::atomic<int> m_currentRequest{0};
@@ -73,6 +84,13 @@ private:
     LogFilter m_filter;
     LogIndex m_index;
     std::shared_ptr<LogRows const> m_rows;
+
+    int m_sliceSize = 1 << 20;
+    int m_interval = 200;
+    QElapsedTimer m_sinceReport;
+    qint64 m_reportCost = 0;  // milliseconds
+    bool m_isReset = true;    // the next update
+    bool m_isPartial = false; // the last update
 
     bool m_exists = false;
     bool m_complete = false;

@@ -135,6 +135,9 @@ private slots:
     void noRegularFile();
     void sizeIsUnknown();
     void progress();
+    void partsOfALongPass_data();
+    void partsOfALongPass();
+    void growsWhileItIsRead();
     void obsoleteOpenReadsNothing();
     void pollWithoutAFile();
     void cancelledRead();
@@ -450,6 +453,85 @@ void tst_LogScanner::progress()
         expected.append(qMakePair(4, percent));
     QCOMPARE(reader.progress, expected);
     QCOMPARE(reader.updates.last().lines, size_t(1));
+}
+
+void tst_LogScanner::partsOfALongPass_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<bool>("isOpen"); // and its filter is changed
+    QTest::newRow("all lines are opened") << "" << false;
+    QTest::newRow("lines with a text are opened") << "7" << false;
+    QTest::newRow("a filter is set") << "7" << true;
+}
+
+// What has been found is reported while reading goes on; only the first report is a new beginning.
+void tst_LogScanner::partsOfALongPass()
+{
+    QFETCH(QString, text);
+    QFETCH(bool, isOpen);
+    QVERIFY(TestFiles::write(m_file, run(300, QTime(9, 0), "x")));
+    Reader whole(m_file);
+    whole.Open(1, With(text));
+    QCOMPARE(whole.updates.size(), 1);
+    QVERIFY(!whole.updates.first().isPartial);
+
+    Reader reader(m_file);
+    if (isOpen)
+        reader.Open(1);
+    reader.updates.clear();
+    reader.scanner.SetPace(1000, 0);
+    if (isOpen)
+        reader.SetFilter(2, With(text));
+    else
+        reader.Open(2, With(text));
+    QVERIFY(reader.updates.size() > 8);
+    size_t lines = 0;
+    for (LogUpdate const& update : qAsConst(reader.updates)) {
+        const bool isLast = update.lines == 300;
+        QCOMPARE(update.isPartial, !isLast);
+        QCOMPARE(update.isReset, lines == 0);
+        QVERIFY(update.lines > lines);
+        lines = update.lines;
+    }
+    QCOMPARE(lines, size_t(300));
+    QCOMPARE(reader.Rows(), whole.Rows());
+
+    // The same pass when new lines are added.
+    reader.updates.clear();
+    QVERIFY(TestFiles::write(m_file, run(600, QTime(9, 0), "x")));
+    reader.scanner.Poll();
+    QVERIFY(reader.updates.size() > 8);
+    for (LogUpdate const& update : qAsConst(reader.updates))
+        QVERIFY(!update.isReset);
+    QVERIFY(reader.updates.first().isPartial && !reader.updates.last().isPartial);
+    QCOMPARE(reader.updates.last().lines, size_t(600));
+}
+
+// However fast that is, a pass ends, and the next one goes on from there.
+void tst_LogScanner::growsWhileItIsRead()
+{
+    const QByteArray line = entry("09:00:00.000", "Trace", "x");
+    QVERIFY(TestFiles::write(m_file, line.repeated(100)));
+    Reader reader(m_file);
+    reader.scanner.SetPace(100, 1000000);
+    int added = 0;
+    reader.onProgress = [&](int) {
+        QFile file(m_file);
+        if (added < 100 && file.open(QIODevice::Append) && file.write(line.repeated(20)) > 0)
+            ++added;
+    };
+    reader.Open(1, With("x"));
+    QVERIFY(added > 5);
+    QCOMPARE(reader.updates.size(), 1);
+    QCOMPARE(reader.updates.last().lines, size_t(100));
+
+    reader.onProgress = nullptr;
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 2);
+    QVERIFY(!reader.updates.last().isReset);
+    QCOMPARE(reader.updates.last().lines, size_t(100 + 20 * added));
+    reader.scanner.Poll(); // that was all
+    QCOMPARE(reader.updates.size(), 2);
 }
 
 void tst_LogScanner::obsoleteOpenReadsNothing()

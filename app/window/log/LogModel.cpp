@@ -98,6 +98,7 @@ void LogModel::Reload()
         return;
     startScanner();
     m_reading = true;
+    m_awaitsReset = true;
     m_scanner->SetCurrentRequest(++m_request);
     Q_EMIT openRequested(m_request, m_path, m_parser, m_filter);
     if (!m_paused)
@@ -110,6 +111,7 @@ void LogModel::SetFilter(LogFilter const& filter)
     if (!m_scanner)
         return;
     m_reading = true;
+    m_awaitsReset = true;
     m_scanner->SetCurrentRequest(++m_request);
     Q_EMIT filterRequested(m_request, m_filter);
 }
@@ -139,19 +141,20 @@ void LogModel::take(LogUpdate const& update)
     if (update.request != m_request)
         return;
     const bool wasReading = m_reading;
-    m_reading = false;
+    m_reading = wasReading && update.isPartial;
     if (m_paused && !wasReading) {
         m_hasDropped = true;
         return;
     }
     if (!m_paused)
         m_lines.clear();
-    if (update.isReset || wasReading || m_hasDropped)
+    if (update.isReset || m_awaitsReset || m_hasDropped)
         reset(update);
     else
         applyChange(update);
+    m_awaitsReset = false;
     m_hasDropped = false;
-    if (wasReading)
+    if (wasReading && !m_reading)
         Q_EMIT progressed(100);
     Q_EMIT refreshed();
 }

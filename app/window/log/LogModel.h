@@ -156,6 +156,7 @@ private:
     bool m_paused = false;
     bool m_hasDropped = false; // an update that arrived after the pause
     bool m_reading = false;
+    bool m_awaitsReset = false; // what was requested has not been reported yet
     bool m_isCurrent = false;
     int m_request = 0;
 
