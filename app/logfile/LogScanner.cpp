@@ -5,6 +5,9 @@
 
 #include <QFile>
 #include <QFileInfo>
+#include <QFileSystemWatcher>
+#include <QStorageInfo>
+#include <QTimer>
 
 #include <algorithm>
 #include <limits>
@@ -25,6 +28,20 @@ constexpr qint64 StampUncertainty = 2000; // milliseconds
 QByteArray BytesAt(QFile& file, qint64 offset, qint64 count)
 {
     return file.seek(offset) ? file.read(count) : QByteArray();
+}
+
+// A change is read after this time: a few lines are usually written at once.
+constexpr int LookDelay = 10; // milliseconds
+
+// Whether the system tells of every change of a file: on other file systems, another computer or
+// the system itself may change it.
+bool IsOnLocalDisk(QString const& folder)
+{
+    static char const* const types[] = {"bcachefs", "btrfs", "exfat", "ext2",  "ext3",    "ext4",
+                                        "f2fs",     "jfs",   "msdos", "ntfs3", "overlay", "ramfs",
+                                        "reiserfs", "tmpfs", "vfat",  "xfs",   "zfs"};
+    const QByteArray type = QStorageInfo(folder).fileSystemType();
+    return std::find(std::begin(types), std::end(types), type) != std::end(types);
 }
 
 // Why a file could not be opened; empty if it does not exist.
@@ -54,6 +71,79 @@ void LogScanner::Open(int request, QString const& path, LogLineParser const& par
     m_filter = filter;
     if (isCurrentRequest())
         readFromStart(false);
+    if (m_isWatched) {
+        m_isFolderChanged = true; // after the first rows, which should not wait
+        noteChange();
+    }
+}
+
+void LogScanner::SetWatched(bool watched)
+{
+    if (!m_lookTimer) {
+        m_lookTimer = new QTimer(this);
+        m_lookTimer->setSingleShot(true);
+        connect(m_lookTimer, &QTimer::timeout, this, &LogScanner::look);
+    }
+    m_isWatched = watched;
+    m_isFolderChanged = true;
+    if (watched) {
+        noteChange();
+        return;
+    }
+    m_lookTimer->stop();
+    delete m_watcher;
+    m_watcher = nullptr;
+}
+
+// Watches the file and, as it may be replaced, its folder; and the same where it really is, if the
+// path is a link.
+void LogScanner::watch()
+{
+    m_isFolderChanged = false;
+    delete m_watcher; // a file that was replaced would still be watched
+    m_watcher = new QFileSystemWatcher(this);
+    connect(m_watcher, &QFileSystemWatcher::fileChanged, this, &LogScanner::noteChange);
+    connect(m_watcher, &QFileSystemWatcher::directoryChanged, this, [this] {
+        m_isFolderChanged = true;
+        noteChange();
+    });
+
+    const QFileInfo file(m_path);
+    QStringList paths(file.absolutePath());
+    if (file.exists())
+        paths.append({m_path, QFileInfo(file.canonicalFilePath()).absolutePath()});
+    else if (file.isSymLink())
+        paths.append(QFileInfo(file.symLinkTarget()).absolutePath());
+    paths.removeDuplicates();
+    if (m_folder != paths.last())
+        m_isLocal = IsOnLocalDisk(paths.last());
+    m_folder = paths.last();
+    m_isPolling = !m_isLocal || !m_watcher->addPaths(paths).isEmpty();
+}
+
+void LogScanner::noteChange()
+{
+    if (m_isWatched && !m_lookTimer->isActive())
+        m_lookTimer->start(std::max(LookDelay, m_lookDelay));
+}
+
+// The more there is to do, the less often it is done.
+void LogScanner::look()
+{
+    if (m_path.isEmpty())
+        return;
+    if (!m_isTaken) {
+        noteChange();
+        return;
+    }
+    if (m_isFolderChanged || m_isPolling)
+        watch();
+    QElapsedTimer time;
+    time.start();
+    Poll();
+    m_lookDelay = static_cast<int>(std::min<qint64>(10 * time.elapsed(), PollInterval));
+    if (m_isPolling)
+        m_lookTimer->start(PollInterval);
 }
 
 void LogScanner::SetFilter(int request, LogFilter const& filter)
@@ -69,6 +159,7 @@ void LogScanner::SetFilter(int request, LogFilter const& filter)
     } else {
         readFromStart(m_index.isOneRun());
     }
+    noteChange(); // which may have been overlooked because of this request
 }
 
 void LogScanner::startOver(bool isOneRun)
@@ -260,8 +351,10 @@ void LogScanner::report(bool isPartial)
     update.lines = m_lines;
     update.hasElapsed = m_index.hasElapsed();
     update.slowLine = m_index.slowLine();
-    if (!nothingNew)
-        Q_EMIT updated(update);
+    if (nothingNew)
+        return;
+    m_isTaken = false;
+    Q_EMIT updated(update);
 }
 
 } // namespace Velocor

@@ -15,6 +15,8 @@
 #include <memory>
 
 class QFile;
+class QFileSystemWatcher;
+class QTimer;
 
 namespace Velocor {
 
@@ -28,8 +30,12 @@ namespace Velocor {
 /// is read from the start. So it is if the file was modified and nothing new is found where it is
 /// expected.
 ///
+/// With SetWatched(), changes are read as they happen. The system tells of them; where it does not,
+/// as on network file systems or when it has no watches left, the scanner polls.
+///
 /// Requests are numbered; SetCurrentRequest() with a later number cancels work on an earlier one.
-/// SetCurrentRequest() may be called from any thread, everything else only from the scanner's.
+/// SetCurrentRequest() and NoteTaken() may be called from any thread, everything else only from the
+/// scanner's.
 class LogScanner : public QObject
 {
     Q_OBJECT
@@ -40,6 +46,10 @@ public:
     /// Makes earlier requests obsolete.
     void SetCurrentRequest(int request) { m_currentRequest = request; }
 
+    /// Tells that the last update has been dealt with. Until then, a scanner that is watched does
+    /// not look for another one, so that they do not pile up.
+    void NoteTaken() { m_isTaken = true; }
+
     /// How much is read at once, and after how long what has been found is reported while reading
     /// goes on.
     ///
@@ -47,10 +57,17 @@ public:
     /// @param interval  in milliseconds; 0: after each slice
     void SetPace(int sliceSize, int interval);
 
+    /// The interval between checks for changes where the system does not tell of them, and the
+    /// longest delay where it does, in milliseconds.
+    static constexpr int PollInterval = 250;
+
 public Q_SLOTS:
     /// Reads a file from its start.
     void Open(int request, QString const& path, Velocor::LogLineParser const& parser,
               Velocor::LogFilter const& filter);
+
+    /// Follows changes or stops to do so. Needs an event loop.
+    void SetWatched(bool watched);
 
     /// Checks for changes and reads them. Always emits polled() at the end.
     void Poll();
@@ -73,11 +90,15 @@ private:
     bool isSameFile(QFile& file) const;
     void noteFile(QFile& file);
     void reportMissing();
+    void watch();
+    void noteChange();
+    void look();
     void reportPart();
     void report(bool isPartial = false);
     void startOver(bool isOneRun);
 
     std::atomic<int> m_currentRequest{0};
+    std::atomic<bool> m_isTaken{true};
     int m_request = 0;
     QString m_path;
     LogLineParser m_parser;
@@ -91,6 +112,15 @@ private:
     qint64 m_reportCost = 0;  // milliseconds
     bool m_isReset = true;    // the next update
     bool m_isPartial = false; // the last update
+
+    QFileSystemWatcher* m_watcher = nullptr;
+    QTimer* m_lookTimer = nullptr;
+    bool m_isWatched = false;
+    bool m_isPolling = false;
+    QString m_folder; // m_isLocal is about this one
+    bool m_isLocal = false;
+    bool m_isFolderChanged = false;
+    int m_lookDelay = 0; // milliseconds
 
     bool m_exists = false;
     bool m_complete = false;

@@ -12,7 +12,6 @@
 #include <QCache>
 #include <QFile>
 #include <QThread>
-#include <QTimer>
 
 namespace Velocor {
 
@@ -102,7 +101,8 @@ public:
     QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
     Qt::ItemFlags flags(QModelIndex const& index) const override;
 
-    /// The interval between checks for changes, in milliseconds.
+    /// The interval between checks for changes where the system does not tell of them, in
+    /// milliseconds.
     static constexpr int PollInterval = 250;
 
     /// The maximum length that a row shows of a line, in bytes. The size of a longer one follows.
@@ -119,6 +119,7 @@ Q_SIGNALS:
     void openRequested(int request, QString const& path, Velocor::LogLineParser const& parser,
                        Velocor::LogFilter const& filter);
     void filterRequested(int request, Velocor::LogFilter const& filter);
+    void watchRequested(bool watched);
     void pollRequested();
 
 private:
@@ -136,7 +137,6 @@ private:
     void take(LogUpdate const& update);
     void reset(LogUpdate const& update);
     void applyChange(LogUpdate const& update);
-    void poll();
     bool isHeading(int row) const;
     bool openFile() const;
     QByteArray readBytes(int row, qint64 limit) const;
@@ -151,8 +151,6 @@ private:
 
     QThread m_thread;
     LogScanner* m_scanner = nullptr;
-    QTimer m_pollTimer;
-    bool m_polling = false;
     bool m_paused = false;
     bool m_hasDropped = false; // an update that arrived after the pause
     bool m_reading = false;
