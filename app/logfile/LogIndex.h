@@ -86,6 +86,10 @@ public:
     /// Whether the last pass found the seam in another place, or that it was none.
     bool hasMoved() const { return m_hasMoved; }
 
+    /// Whether lines that were found after the seam have not been reached in this pass. Until they
+    /// are, Rows() lacks them.
+    bool awaitsKnownLines() const { return !m_knownStarts.empty() && m_runs.size() == 1; }
+
     /// Whether the last pass found no seam, although there had been one. Either the newest run has
     /// overwritten all earlier ones, or it has changed what follows it in a way that a pass over
     /// the new lines cannot recognize: the file should be read from the start by a new index.

@@ -5,14 +5,16 @@
 
 #include <QFile>
 #include <QFileInfo>
+#include <QFileSystemWatcher>
+#include <QStorageInfo>
+#include <QTimer>
 
 #include <algorithm>
+#include <limits>
 
 namespace Velocor {
 
 namespace {
-
-constexpr int SliceSize = 1 << 20;
 
 // With an expression, which may be slow, a newer request is looked for more often.
 constexpr int PieceSize = 1 << 12;
@@ -26,6 +28,20 @@ constexpr qint64 StampUncertainty = 2000; // milliseconds
 QByteArray BytesAt(QFile& file, qint64 offset, qint64 count)
 {
     return file.seek(offset) ? file.read(count) : QByteArray();
+}
+
+// A change is read after this time: a few lines are usually written at once.
+constexpr int LookDelay = 10; // milliseconds
+
+// Whether the system tells of every change of a file: on other file systems, another computer or
+// the system itself may change it.
+bool IsOnLocalDisk(QString const& folder)
+{
+    static char const* const types[] = {"bcachefs", "btrfs", "exfat", "ext2",  "ext3",    "ext4",
+                                        "f2fs",     "jfs",   "msdos", "ntfs3", "overlay", "ramfs",
+                                        "reiserfs", "tmpfs", "vfat",  "xfs",   "zfs"};
+    const QByteArray type = QStorageInfo(folder).fileSystemType();
+    return std::find(std::begin(types), std::end(types), type) != std::end(types);
 }
 
 // Why a file could not be opened; empty if it does not exist.
@@ -55,6 +71,79 @@ void LogScanner::Open(int request, QString const& path, LogLineParser const& par
     m_filter = filter;
     if (isCurrentRequest())
         readFromStart(false);
+    if (m_isWatched) {
+        m_isFolderChanged = true; // after the first rows, which should not wait
+        noteChange();
+    }
+}
+
+void LogScanner::SetWatched(bool watched)
+{
+    if (!m_lookTimer) {
+        m_lookTimer = new QTimer(this);
+        m_lookTimer->setSingleShot(true);
+        connect(m_lookTimer, &QTimer::timeout, this, &LogScanner::look);
+    }
+    m_isWatched = watched;
+    m_isFolderChanged = true;
+    if (watched) {
+        noteChange();
+        return;
+    }
+    m_lookTimer->stop();
+    delete m_watcher;
+    m_watcher = nullptr;
+}
+
+// Watches the file and, as it may be replaced, its folder; and the same where it really is, if the
+// path is a link.
+void LogScanner::watch()
+{
+    m_isFolderChanged = false;
+    delete m_watcher; // a file that was replaced would still be watched
+    m_watcher = new QFileSystemWatcher(this);
+    connect(m_watcher, &QFileSystemWatcher::fileChanged, this, &LogScanner::noteChange);
+    connect(m_watcher, &QFileSystemWatcher::directoryChanged, this, [this] {
+        m_isFolderChanged = true;
+        noteChange();
+    });
+
+    const QFileInfo file(m_path);
+    QStringList paths(file.absolutePath());
+    if (file.exists())
+        paths.append({m_path, QFileInfo(file.canonicalFilePath()).absolutePath()});
+    else if (file.isSymLink())
+        paths.append(QFileInfo(file.symLinkTarget()).absolutePath());
+    paths.removeDuplicates();
+    if (m_folder != paths.last())
+        m_isLocal = IsOnLocalDisk(paths.last());
+    m_folder = paths.last();
+    m_isPolling = !m_isLocal || !m_watcher->addPaths(paths).isEmpty();
+}
+
+void LogScanner::noteChange()
+{
+    if (m_isWatched && !m_lookTimer->isActive())
+        m_lookTimer->start(std::max(LookDelay, m_lookDelay));
+}
+
+// The more there is to do, the less often it is done.
+void LogScanner::look()
+{
+    if (m_path.isEmpty())
+        return;
+    if (!m_isTaken) {
+        noteChange();
+        return;
+    }
+    if (m_isFolderChanged || m_isPolling)
+        watch();
+    QElapsedTimer time;
+    time.start();
+    Poll();
+    m_lookDelay = static_cast<int>(std::min<qint64>(10 * time.elapsed(), PollInterval));
+    if (m_isPolling)
+        m_lookTimer->start(PollInterval);
 }
 
 void LogScanner::SetFilter(int request, LogFilter const& filter)
@@ -62,18 +151,22 @@ void LogScanner::SetFilter(int request, LogFilter const& filter)
     const bool sameText = filter.HasSameText(m_filter);
     m_request = request;
     m_filter = filter;
-    if (!isCurrentRequest())
+    if (!isCurrentRequest()) {
         m_complete = m_complete && sameText; // the text has not been searched for yet
-    else if (sameText && m_complete)
-        report(true);
-    else
+    } else if (sameText && m_complete) {
+        m_isReset = true;
+        report();
+    } else {
         readFromStart(m_index.isOneRun());
+    }
+    noteChange(); // which may have been overlooked because of this request
 }
 
 void LogScanner::startOver(bool isOneRun)
 {
     m_index = LogIndex(m_parser, m_filter, isOneRun);
     m_rows = std::make_shared<LogRows>();
+    m_isReset = true;
     m_head.clear();
     m_anchor.clear();
     m_tail.clear();
@@ -96,7 +189,7 @@ void LogScanner::readFromStart(bool isOneRun)
     m_parser.SetFileType(typeOf(file));
     m_index = LogIndex(m_parser, m_filter, isOneRun);
     if (readFrom(file))
-        report(true);
+        report();
 }
 
 void LogScanner::reportMissing()
@@ -104,19 +197,25 @@ void LogScanner::reportMissing()
     startOver(false);
     m_exists = false;
     m_complete = true;
-    report(true);
+    report();
 }
 
 // Returns false if a newer request has arrived.
 bool LogScanner::readFrom(QFile& file)
 {
-    m_modified = QFileInfo(m_path).lastModified();
-    const qint64 size = file.size();
-    QByteArray slice(SliceSize, Qt::Uninitialized);
+    // Of the same moment: what is written later changes both.
+    const QFileInfo info(m_path);
+    m_modified = info.lastModified();
+    const qint64 size = info.size();
+    const qint64 end = size > 0 ? size : std::numeric_limits<qint64>::max(); // or it has none
+    QByteArray slice(m_sliceSize, Qt::Uninitialized);
     bool more = file.seek(m_index.Begin());
     int reported = 0;
-    while (more) {
-        const qint64 count = file.read(slice.data(), slice.size());
+    m_sinceReport.start();
+    m_reportCost = 0;
+    while (more && file.pos() < end) {
+        const qint64 count =
+            file.read(slice.data(), std::min<qint64>(slice.size(), end - file.pos()));
         if (count <= 0)
             break;
         if (!feed(slice, count))
@@ -128,10 +227,12 @@ bool LogScanner::readFrom(QFile& file)
             reported = percent;
             Q_EMIT progressed(m_request, percent);
         }
+        if (file.pos() < end)
+            reportPart();
     }
     m_index.End();
     noteFile(file);
-    m_complete = m_size >= m_index.nextOffset(); // otherwise it was truncated meanwhile
+    m_complete = file.size() >= m_size; // otherwise it was truncated meanwhile
     return true;
 }
 
@@ -165,7 +266,7 @@ void LogScanner::readChanges(QFile& file)
     if ((!isNew && m_modified != modified) || m_index.hasLostSeam())
         readFromStart(false);
     else
-        report(false);
+        report();
 }
 
 LogFileType LogScanner::typeOf(QFile& file) const
@@ -184,7 +285,7 @@ bool LogScanner::hasNewType(QFile& file) const
 
 void LogScanner::noteFile(QFile& file)
 {
-    m_size = file.size();
+    m_size = m_index.nextOffset();
     m_anchorEnd = m_index.resumeOffset();
     m_head = BytesAt(file, 0, std::min<qint64>(HeadSize, m_anchorEnd));
     const qint64 start = std::max<qint64>(0, m_anchorEnd - AnchorSize);
@@ -232,16 +333,37 @@ void LogScanner::Poll()
     Q_EMIT polled(); // NOLINT(readability-misleading-indentation): Q_EMIT is empty
 }
 
-void LogScanner::report(bool isReset)
+void LogScanner::SetPace(int sliceSize, int interval)
+{
+    m_sliceSize = sliceSize;
+    m_interval = interval;
+}
+
+// Most of the time is for reading, even if the rows are many.
+void LogScanner::reportPart()
+{
+    if (m_sinceReport.elapsed() < std::max<qint64>(m_interval, 4 * m_reportCost) ||
+        m_index.awaitsKnownLines())
+        return;
+    m_sinceReport.start();
+    report(true);
+    m_reportCost = m_interval > 0 ? m_sinceReport.restart() : 0;
+}
+
+void LogScanner::report(bool isPartial)
 {
     LogUpdate update;
     update.request = m_request;
     update.rows = std::make_shared<LogRows>(m_index.Rows(m_filter));
-    if (!isReset)
+    update.isPartial = isPartial;
+    update.isReset = m_isReset;
+    if (!m_isReset)
         update.Compare(*m_rows);
     const bool nothingNew = !update.isReset && update.removed == 0 && update.inserted == 0 &&
                             update.changedTail == 0 && update.rows->size() == m_rows->size() &&
-                            m_index.size() == m_lines;
+                            m_index.size() == m_lines && m_isPartial == isPartial;
+    m_isReset = false;
+    m_isPartial = isPartial;
     m_rows = update.rows;
     m_lines = m_index.size();
     update.exists = m_exists;
@@ -252,8 +374,10 @@ void LogScanner::report(bool isReset)
     update.hasSeverities = m_index.hasSeverities();
     update.type = m_parser.fileType();
     update.slowLine = m_index.slowLine();
-    if (!nothingNew)
-        Q_EMIT updated(update);
+    if (nothingNew)
+        return;
+    m_isTaken = false;
+    Q_EMIT updated(update);
 }
 
 } // namespace Velocor

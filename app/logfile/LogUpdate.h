@@ -26,6 +26,8 @@ struct LogUpdate
     size_t inserted = 0;    ///< number of rows inserted there
     size_t changedTail = 0; ///< changed rows at the former end
 
+    bool isPartial = false; ///< the file is still being read; another update will follow
+
     std::shared_ptr<LogRows const> rows;
     bool exists = true;
     QString error; ///< why the file could not be read; empty if it could

@@ -13,6 +13,7 @@
 
 #include <functional>
 
+#include <cstdio>
 #include <sys/stat.h>
 
 using namespace Velocor;
@@ -31,8 +32,10 @@ class Reader
 public:
     explicit Reader(QString const& path) : m_path(path)
     {
-        QObject::connect(&scanner, &LogScanner::updated,
-                         [this](LogUpdate const& update) { updates.append(update); });
+        QObject::connect(&scanner, &LogScanner::updated, [this](LogUpdate const& update) {
+            updates.append(update);
+            scanner.NoteTaken();
+        });
         QObject::connect(&scanner, &LogScanner::progressed, [this](int request, int percent) {
             progress.append(qMakePair(request, percent));
             if (onProgress)
@@ -114,6 +117,7 @@ QByteArray Long(char const* first, char const* middle, char const* last)
 } // namespace
 
 Q_DECLARE_METATYPE(Change)
+Q_DECLARE_METATYPE(QVector<Change>)
 
 class tst_LogScanner : public QObject
 {
@@ -135,6 +139,15 @@ private slots:
     void noRegularFile();
     void sizeIsUnknown();
     void progress();
+    void partsOfALongPass_data();
+    void partsOfALongPass();
+    void growsWhileItIsRead();
+    void watched_data();
+    void watched();
+    void watchedWithoutAFolder();
+    void watchedWhereTheSystemDoesNotTell();
+    void idle();
+    void untakenUpdates();
     void obsoleteOpenReadsNothing();
     void pollWithoutAFile();
     void cancelledRead();
@@ -450,6 +463,228 @@ void tst_LogScanner::progress()
         expected.append(qMakePair(4, percent));
     QCOMPARE(reader.progress, expected);
     QCOMPARE(reader.updates.last().lines, size_t(1));
+}
+
+void tst_LogScanner::partsOfALongPass_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<bool>("isOpen"); // and its filter is changed
+    QTest::newRow("all lines are opened") << "" << false;
+    QTest::newRow("lines with a text are opened") << "7" << false;
+    QTest::newRow("a filter is set") << "7" << true;
+}
+
+// What has been found is reported while reading goes on; only the first report is a new beginning.
+void tst_LogScanner::partsOfALongPass()
+{
+    QFETCH(QString, text);
+    QFETCH(bool, isOpen);
+    QVERIFY(TestFiles::write(m_file, run(300, QTime(9, 0), "x")));
+    Reader whole(m_file);
+    whole.Open(1, With(text));
+    QCOMPARE(whole.updates.size(), 1);
+    QVERIFY(!whole.updates.first().isPartial);
+
+    Reader reader(m_file);
+    if (isOpen)
+        reader.Open(1);
+    reader.updates.clear();
+    reader.scanner.SetPace(1000, 0);
+    if (isOpen)
+        reader.SetFilter(2, With(text));
+    else
+        reader.Open(2, With(text));
+    QVERIFY(reader.updates.size() > 8);
+    size_t lines = 0;
+    for (LogUpdate const& update : qAsConst(reader.updates)) {
+        const bool isLast = update.lines == 300;
+        QCOMPARE(update.isPartial, !isLast);
+        QCOMPARE(update.isReset, lines == 0);
+        QVERIFY(update.lines > lines);
+        lines = update.lines;
+    }
+    QCOMPARE(lines, size_t(300));
+    QCOMPARE(reader.Rows(), whole.Rows());
+
+    // The same pass when new lines are added.
+    reader.updates.clear();
+    QVERIFY(TestFiles::write(m_file, run(600, QTime(9, 0), "x")));
+    reader.scanner.Poll();
+    QVERIFY(reader.updates.size() > 8);
+    for (LogUpdate const& update : qAsConst(reader.updates))
+        QVERIFY(!update.isReset);
+    QVERIFY(reader.updates.first().isPartial && !reader.updates.last().isPartial);
+    QCOMPARE(reader.updates.last().lines, size_t(600));
+}
+
+// However fast that is, a pass ends, and the next one goes on from there.
+void tst_LogScanner::growsWhileItIsRead()
+{
+    const QByteArray line = entry("09:00:00.000", "Trace", "x");
+    QVERIFY(TestFiles::write(m_file, line.repeated(100)));
+    Reader reader(m_file);
+    reader.scanner.SetPace(100, 1000000);
+    int added = 0;
+    reader.onProgress = [&](int) {
+        QFile file(m_file);
+        if (added < 100 && file.open(QIODevice::Append) && file.write(line.repeated(20)) > 0)
+            ++added;
+    };
+    reader.Open(1, With("x"));
+    QVERIFY(added > 5);
+    QCOMPARE(reader.updates.size(), 1);
+    QCOMPARE(reader.updates.last().lines, size_t(100));
+
+    reader.onProgress = nullptr;
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 2);
+    QVERIFY(!reader.updates.last().isReset);
+    QCOMPARE(reader.updates.last().lines, size_t(100 + 20 * added));
+    reader.scanner.Poll(); // that was all
+    QCOMPARE(reader.updates.size(), 2);
+}
+
+void tst_LogScanner::watched_data()
+{
+    QTest::addColumn<bool>("isLink");
+    QTest::addColumn<QVector<Change>>("changes");
+
+    const auto append = [](QString const& path) {
+        QFile file(path);
+        return file.open(QIODevice::Append) && file.write("2025-03-03 10:00:00.000 Trace a\n") > 0;
+    };
+    const auto overwrite = [](QString const& path) {
+        QFile file(path);
+        return file.open(QIODevice::ReadWrite) && file.write(run(2, QTime(11, 0), "w")) > 0;
+    };
+    const auto cut = [](QString const& path) {
+        return QFile::resize(path, 10);
+    };
+    const auto remove = [](QString const& path) {
+        return QFile::remove(path);
+    };
+    const auto create = [](QString const& path) {
+        return TestFiles::write(path, run(3, QTime(10, 0), "new"));
+    };
+    const auto rotate = [](QString const& path) {
+        QFile::remove(path + ".1");
+        return QFile::rename(path, path + ".1");
+    };
+    const auto replace = [](QString const& path) {
+        return TestFiles::write(path + ".new", run(4, QTime(10, 0), "other")) &&
+               ::rename(QFile::encodeName(path + ".new").constData(),
+                        QFile::encodeName(path).constData()) == 0;
+    };
+    const auto row = [](char const* name, QVector<Change> const& changes) {
+        QTest::newRow(name) << false << changes;
+        QTest::newRow(qPrintable(QString("%1, through a link").arg(name))) << true << changes;
+    };
+    row("appended to", {append, append, append});
+    row("overwritten", {overwrite});
+    row("cut short", {cut, append});
+    row("removed and created", {remove, create, append});
+    row("rotated", {rotate, create, append, rotate, create, append});
+    row("replaced", {replace, append, replace, append});
+}
+
+// Each change is seen without a Poll().
+void tst_LogScanner::watched()
+{
+    QFETCH(bool, isLink);
+    QFETCH(QVector<Change>, changes);
+    QString file = m_file;
+    if (isLink) {
+        file = m_folder->filePath("elsewhere/target.log");
+        QVERIFY(QDir().mkpath(QFileInfo(file).path()));
+        QVERIFY(QFile::link(file, m_file));
+    }
+    QVERIFY(TestFiles::write(file, run(5, QTime(9, 0), "x")));
+    Reader reader(m_file);
+    reader.scanner.SetWatched(true);
+    reader.Open(1);
+    for (Change const& change : changes) {
+        QVERIFY(change(file));
+        const auto lines = [&] {
+            QFile now(file);
+            return size_t(now.open(QIODevice::ReadOnly) ? now.readAll().count('\n') : 0);
+        };
+        const size_t expected = lines() + (QFileInfo(file).size() == 10 ? 1 : 0);
+        QTRY_COMPARE_WITH_TIMEOUT(reader.updates.last().lines, expected, 5000);
+        QCOMPARE(reader.updates.last().exists, QFileInfo(file).exists());
+        Reader fresh(m_file);
+        fresh.Open(1);
+        QTRY_COMPARE_WITH_TIMEOUT(reader.Rows(), fresh.Rows(), 5000);
+    }
+
+    reader.scanner.SetWatched(false);
+    const int updates = reader.updates.size();
+    QVERIFY(TestFiles::write(file, run(50, QTime(12, 0), "x")));
+    QTest::qWait(2 * LogScanner::PollInterval);
+    QCOMPARE(reader.updates.size(), updates);
+    reader.scanner.SetWatched(true); // also tells what happened before
+    QTRY_COMPARE_WITH_TIMEOUT(reader.updates.last().lines, size_t(50), 20000);
+}
+
+// Nobody tells of it before the folder exists.
+void tst_LogScanner::watchedWithoutAFolder()
+{
+    const QString file = m_folder->filePath("later/app.log");
+    Reader reader(file);
+    reader.scanner.SetWatched(true);
+    reader.Open(1);
+    QTest::qWait(50);
+    QVERIFY(!reader.updates.last().exists);
+    for (int i = 1; i <= 2; ++i) {
+        QVERIFY(TestFiles::write(file, run(3, QTime(9, 0), "x")));
+        QTRY_COMPARE_WITH_TIMEOUT(reader.updates.last().lines, size_t(3), 20000);
+        QVERIFY(QDir(QFileInfo(file).path()).removeRecursively());
+        QTRY_VERIFY_WITH_TIMEOUT(!reader.updates.last().exists, 20000);
+    }
+}
+
+void tst_LogScanner::watchedWhereTheSystemDoesNotTell()
+{
+    if (!QFileInfo("/proc/self/status").isFile())
+        QSKIP("no such file here");
+    Reader reader("/proc/self/status");
+    reader.scanner.SetWatched(true);
+    reader.Open(1);
+    QTRY_VERIFY_WITH_TIMEOUT(reader.polls > 3, 20000);
+}
+
+// Nothing happens until something changes.
+void tst_LogScanner::idle()
+{
+    QVERIFY(TestFiles::write(m_file, run(5, QTime(9, 0), "x")));
+    Reader reader(m_file);
+    reader.scanner.SetWatched(true);
+    reader.Open(1);
+    QTRY_VERIFY_WITH_TIMEOUT(reader.polls > 0, 20000);
+    QTest::qWait(100);
+    const int polls = reader.polls;
+    QTest::qWait(4 * LogScanner::PollInterval);
+    QCOMPARE(reader.polls, polls);
+    QVERIFY(TestFiles::write(m_file, run(6, QTime(9, 0), "x")));
+    QTRY_VERIFY_WITH_TIMEOUT(reader.polls > polls, 20000);
+}
+
+// Whoever is slow gets one update for many changes.
+void tst_LogScanner::untakenUpdates()
+{
+    QVERIFY(TestFiles::write(m_file, run(1, QTime(9, 0), "x")));
+    LogScanner scanner;
+    QSignalSpy updated(&scanner, &LogScanner::updated);
+    scanner.SetCurrentRequest(1);
+    scanner.SetWatched(true);
+    scanner.Open(1, m_file, LogLineParser(), LogFilter());
+    for (int lines = 2; lines < 10; ++lines) {
+        QVERIFY(TestFiles::write(m_file, run(lines, QTime(9, 0), "x")));
+        QTest::qWait(30);
+    }
+    QCOMPARE(updated.count(), 1);
+    scanner.NoteTaken();
+    QTRY_COMPARE_WITH_TIMEOUT(updated.count(), 2, 20000);
+    QCOMPARE(updated.last().first().value<LogUpdate>().lines, size_t(9));
 }
 
 void tst_LogScanner::obsoleteOpenReadsNothing()

@@ -662,6 +662,10 @@ private:
         m_exists = m_exists || !m_file.isEmpty();
         store();
         m_isOpen = true;
+        if (m_draws->once(2))
+            m_scanner.SetPace(1 + m_draws->below(300), 0);
+        else
+            m_scanner.SetPace(1 << 20, 1000000);
         m_scanner.SetCurrentRequest(++m_request);
         m_scanner.Open(m_request, m_path, parser(m_readsTimes), m_filter);
         compare();

@@ -62,8 +62,6 @@ int EndOfLine(QByteArray const& line, LogLineEnd const& lineEnd)
 LogModel::LogModel(QObject* parent) : QAbstractTableModel(parent), m_lines(1000)
 {
     m_state.rows = std::make_shared<LogRows>();
-    m_pollTimer.setInterval(PollInterval);
-    connect(&m_pollTimer, &QTimer::timeout, this, &LogModel::poll);
 }
 
 LogModel::~LogModel()
@@ -84,14 +82,15 @@ void LogModel::startScanner()
     connect(&m_thread, &QThread::finished, m_scanner, &QObject::deleteLater);
     connect(this, &LogModel::openRequested, m_scanner, &LogScanner::Open);
     connect(this, &LogModel::filterRequested, m_scanner, &LogScanner::SetFilter);
+    connect(this, &LogModel::watchRequested, m_scanner, &LogScanner::SetWatched);
     connect(this, &LogModel::pollRequested, m_scanner, &LogScanner::Poll);
     connect(m_scanner, &LogScanner::updated, this, &LogModel::take);
-    connect(m_scanner, &LogScanner::polled, this, [this] { m_polling = false; });
     connect(m_scanner, &LogScanner::progressed, this, [this](int request, int percent) {
         if (request == m_request && m_reading)
             Q_EMIT progressed(percent);
     });
     m_thread.start();
+    Q_EMIT watchRequested(!m_paused);
 }
 
 void LogModel::Open(QString const& path, LogLineParser const& parser, bool isCurrent)
@@ -111,10 +110,9 @@ void LogModel::Reload()
         return;
     startScanner();
     m_reading = true;
+    m_awaitsReset = true;
     m_scanner->SetCurrentRequest(++m_request);
     Q_EMIT openRequested(m_request, m_path, m_parser, m_filter);
-    if (!m_paused)
-        m_pollTimer.start();
 }
 
 void LogModel::SetEncoding(LogEncoding encoding)
@@ -130,6 +128,7 @@ void LogModel::SetFilter(LogFilter const& filter)
     if (!m_scanner)
         return;
     m_reading = true;
+    m_awaitsReset = true;
     m_scanner->SetCurrentRequest(++m_request);
     Q_EMIT filterRequested(m_request, m_filter);
 }
@@ -137,29 +136,20 @@ void LogModel::SetFilter(LogFilter const& filter)
 void LogModel::SetPaused(bool paused)
 {
     m_paused = paused;
-    if (paused) {
-        m_pollTimer.stop();
+    if (paused)
         openFile(); // so that a rotation does not take the lines away
-    } else if (m_scanner) {
-        m_pollTimer.start();
-        poll();
-    }
-}
-
-void LogModel::poll()
-{
-    if (m_polling || m_reading)
-        return;
-    m_polling = true;
-    Q_EMIT pollRequested();
+    Q_EMIT watchRequested(!paused);
+    if (!paused)
+        Q_EMIT pollRequested();
 }
 
 void LogModel::take(LogUpdate const& update)
 {
+    m_scanner->NoteTaken();
     if (update.request != m_request)
         return;
     const bool wasReading = m_reading;
-    m_reading = false;
+    m_reading = wasReading && update.isPartial;
     if (m_paused && !wasReading) {
         m_hasDropped = true;
         return;
@@ -167,12 +157,13 @@ void LogModel::take(LogUpdate const& update)
     if (!m_paused || !update.type.IsLike(m_parser.fileType()))
         m_lines.clear();
     m_parser.SetFileType(update.type);
-    if (update.isReset || wasReading || m_hasDropped)
+    if (update.isReset || m_awaitsReset || m_hasDropped)
         reset(update);
     else
         applyChange(update);
+    m_awaitsReset = false;
     m_hasDropped = false;
-    if (wasReading)
+    if (wasReading && !m_reading)
         Q_EMIT progressed(100);
     Q_EMIT refreshed();
 }

@@ -13,7 +13,6 @@
 #include <QFile>
 #include <QHash>
 #include <QThread>
-#include <QTimer>
 
 namespace Velocor {
 
@@ -116,7 +115,8 @@ public:
     QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
     Qt::ItemFlags flags(QModelIndex const& index) const override;
 
-    /// The interval between checks for changes, in milliseconds.
+    /// The interval between checks for changes where the system does not tell of them, in
+    /// milliseconds.
     static constexpr int PollInterval = 250;
 
     /// The maximum length that a row shows of a line, in bytes. The size of a longer one follows.
@@ -133,6 +133,7 @@ Q_SIGNALS:
     void openRequested(int request, QString const& path, Velocor::LogLineParser const& parser,
                        Velocor::LogFilter const& filter);
     void filterRequested(int request, Velocor::LogFilter const& filter);
+    void watchRequested(bool watched);
     void pollRequested();
 
 private:
@@ -150,7 +151,6 @@ private:
     void take(LogUpdate const& update);
     void reset(LogUpdate const& update);
     void applyChange(LogUpdate const& update);
-    void poll();
     bool isHeading(int row) const;
     bool openFile() const;
     QByteArray readBytes(int row, qint64 limit) const;
@@ -165,11 +165,10 @@ private:
 
     QThread m_thread;
     LogScanner* m_scanner = nullptr;
-    QTimer m_pollTimer;
-    bool m_polling = false;
     bool m_paused = false;
     bool m_hasDropped = false; // an update that arrived after the pause
     bool m_reading = false;
+    bool m_awaitsReset = false; // what was requested has not been reported yet
     bool m_isCurrent = false;
     int m_request = 0;
 

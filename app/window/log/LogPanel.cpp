@@ -474,9 +474,10 @@ QString LogPanel::path() const
 
 QString LogPanel::summary() const
 {
-    if (m_model->isReading() && m_percent < 100)
-        return tr("Reading: %1%").arg(m_percent);
+    const bool isReading = m_model->isReading() && m_percent < 100;
     LogUpdate const& state = m_model->state();
+    if (isReading && !state.isPartial)
+        return tr("Reading: %1%").arg(m_percent);
     const QString separator = QStringLiteral("  %1  ").arg(QChar(0xb7)); // middle dot
     const QLocale locale;
     const auto lines = static_cast<qlonglong>(state.lines);
@@ -488,6 +489,8 @@ QString LogPanel::summary() const
     const auto problems = static_cast<qlonglong>(state.rows->problems);
     text += separator +
             (problems == 1 ? tr("1 problem") : tr("%1 problems").arg(locale.toString(problems)));
+    if (isReading)
+        text += separator + tr("%1% read").arg(m_percent);
     if (isPaused())
         text += separator + tr("paused");
     return text;
