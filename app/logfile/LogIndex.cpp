@@ -357,15 +357,30 @@ LogRows LogIndex::Rows(LogFilter const& filter) const
     const auto addRun = [&](size_t number) {
         const bool isLast = number + 1 == m_runs.size();
         const size_t end = isLast ? m_starts.size() : m_runs[number + 1].firstLine;
-        for (size_t line = m_runs[number].firstLine; line < end; ++line) {
+        const auto add = [&](size_t line, quint8 flag) {
+            const quint8 mark = m_marks[line];
+            const auto severity = static_cast<LogEntry::Severity>(mark & LogRows::SeverityMask);
+            rows.add(m_starts[line], mark | flag);
+            if (LogSeverities::IsProblem(severity) && !(mark & LogRows::Continued))
+                ++rows.problems;
+        };
+        const auto context = static_cast<size_t>(filter.context());
+        size_t next = m_runs[number].firstLine; // the first line not added yet
+        size_t contextEnd = next;               // up to here lines follow a hit
+        for (size_t line = next; line < end; ++line) {
             const quint8 mark = m_marks[line];
             const auto severity = static_cast<LogEntry::Severity>(mark & LogRows::SeverityMask);
             const bool isMatched = m_slowLine > 0 || !(mark & LogRows::Unmatched);
-            if (!isMatched || !filter.Shows(severity))
+            const bool isHit = isMatched && filter.Shows(severity);
+            if (!isHit && line >= contextEnd)
                 continue;
-            rows.add(m_starts[line], mark);
-            if (LogSeverities::IsProblem(severity) && !(mark & LogRows::Continued))
-                ++rows.problems;
+            if (isHit) {
+                for (next = std::max(next, line - std::min(line, context)); next < line; ++next)
+                    add(next, LogRows::Context);
+                contextEnd = line + context + 1;
+            }
+            add(line, isHit ? quint8(0) : LogRows::Context);
+            next = line + 1;
         }
     };
 

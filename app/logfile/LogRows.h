@@ -27,6 +27,7 @@ struct LogRows
     static constexpr quint8 Torn = 0x10;      ///< its first part was overwritten
     static constexpr quint8 Timed = 0x20;     ///< its time is known
     static constexpr quint8 Unmatched = 0x40; ///< does not match the text filter
+    static constexpr quint8 Context = 0x80;   ///< shown only because it is near a line that matches
 
     std::vector<qint64> starts;
     std::vector<quint8> marks;
