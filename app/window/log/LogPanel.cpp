@@ -413,7 +413,7 @@ void LogPanel::showMarks()
 {
     m_view->ticks()->SetTicks(TickScrollBar::Marked, m_marks->rows());
     m_view->viewport()->update();
-    showCurrentLine();
+    showNote(); // not the line, in which the user may have selected something
 }
 
 void LogPanel::SetFilterHistory(std::shared_ptr<QStringList> const& history)
@@ -552,7 +552,12 @@ void LogPanel::showCurrentLine()
     const QModelIndex current = m_view->currentIndex();
     m_line->setPlainText(current.isValid() ? m_model->LineText(current.row(), LogIndex::LineLimit)
                                            : QString());
-    const QString note = m_marks->NoteOf(current.row());
+    showNote();
+}
+
+void LogPanel::showNote()
+{
+    const QString note = m_marks->NoteOf(m_view->currentIndex().row());
     m_note->setText(note.isEmpty() ? QString() : tr("Note: %1").arg(note));
     m_note->setToolTip(PlainToolTip(note));
     m_note->setVisible(!note.isEmpty());

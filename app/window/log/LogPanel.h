@@ -125,6 +125,7 @@ private:
     void chooseFile(int position);
     void showFile(QString const& path);
     void showCurrentLine();
+    void showNote();
     void updatePlaceholder();
     void applyFind();
     void showFound();
