@@ -53,9 +53,19 @@ bool LogFilter::SetText(QString const& text, bool isExpression, bool caseSensiti
     return true;
 }
 
+void LogFilter::SetTerms(LogTerms const& required, LogTerms const& hidden)
+{
+    m_required = required;
+    m_hidden = hidden;
+}
+
 LogFilter::Match LogFilter::Find(QString const& line) const
 {
-    if (!hasText())
+    if (m_hidden.IsAnyIn(line))
+        return Hidden;
+    if (!m_required.AreAllIn(line))
+        return No;
+    if (m_text.isEmpty())
         return Yes;
     if (!m_isExpression)
         return m_matcher.indexIn(line) >= 0 ? Yes : No;
@@ -68,15 +78,15 @@ LogFilter::Match LogFilter::Find(QString const& line) const
 QVector<QPair<int, int>> LogFilter::Ranges(QString const& text) const
 {
     QVector<QPair<int, int>> ranges;
-    if (!hasText())
-        return ranges;
+    if (m_text.isEmpty())
+        return m_required.Ranges(text);
     QRegularExpressionMatchIterator matches = m_marking.globalMatch(text);
     while (matches.hasNext()) {
         const QRegularExpressionMatch match = matches.next();
         if (match.capturedLength() > 0)
             ranges.append(qMakePair(match.capturedStart(), match.capturedLength()));
     }
-    return ranges;
+    return ranges + m_required.Ranges(text);
 }
 
 QString LogFilter::ErrorOf(QString const& expression)
@@ -91,7 +101,8 @@ QString LogFilter::ErrorOf(QString const& expression)
 
 bool LogFilter::HasSameText(LogFilter const& other) const
 {
-    return m_expression == other.m_expression && m_isExpression == other.m_isExpression;
+    return m_expression == other.m_expression && m_isExpression == other.m_isExpression &&
+           m_required == other.m_required && m_hidden == other.m_hidden;
 }
 
 } // namespace Velocor

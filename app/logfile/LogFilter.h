@@ -4,6 +4,7 @@
 #pragma once
 
 #include "app/logfile/LogEntry.h"
+#include "app/logfile/LogTerms.h"
 
 #include <QPair>
 #include <QRegularExpression>
@@ -37,24 +38,37 @@ public:
     /// @return false, with the filter unchanged, if the expression is not valid
     bool SetText(QString const& text, bool isExpression, bool caseSensitive);
 
+    /// Sets the terms that lines have to contain besides the text, and those that hide a line.
+    void SetTerms(LogTerms const& required, LogTerms const& hidden);
+
+    /// Sets how many lines before and after each line that matches are shown as well.
+    void SetContext(int lines) { m_context = lines; }
+    int context() const { return m_context; }
+
     /// Whether entries of runs before the newest are shown.
     void SetEarlierRuns(bool shown) { m_earlierRuns = shown; }
     bool earlierRuns() const { return m_earlierRuns; }
 
-    bool hasText() const { return !m_text.isEmpty(); }
+    /// Whether there is any text or term.
+    bool hasText() const
+    {
+        return !m_text.isEmpty() || !m_required.isEmpty() || !m_hidden.isEmpty();
+    }
     bool isExpression() const { return m_isExpression; }
 
     enum Match {
         Yes,
         No,
+        Hidden, ///< has a term that hides its entry
         TooLong ///< unknown: the expression tried too many ways to match this line
     };
 
-    /// Whether a line, as stored in the file, contains the text.
+    /// Whether a line, as stored in the file, contains the text and the right terms.
     Match Find(QString const& line) const;
     bool Matches(QString const& line) const { return Find(line) == Yes; }
 
-    /// The matches in a text: start and length, in order. An expression that takes too long to find
+    /// The matches in a text: start and length, in order, followed by those of required terms. An
+    /// expression that takes too long to find
     /// them has none.
     QVector<QPair<int, int>> Ranges(QString const& text) const;
 
@@ -69,6 +83,9 @@ private:
     bool m_earlierRuns = true;
     bool m_isExpression = false;
     QString m_text;
+    LogTerms m_required;
+    LogTerms m_hidden;
+    int m_context = 0;
     QStringMatcher m_matcher;        // prepared once for many lines
     QRegularExpression m_expression; // to find lines
     QRegularExpression m_marking;    // to mark matches while painting, which must be quick

@@ -28,6 +28,14 @@ constexpr qint64 HalfADay = 12 * 60 * Minute;
 // be given in minutes.
 constexpr qint64 ClockChange = 61 * Minute;
 
+// The flags of a mark that the text filter sets.
+constexpr quint8 OfText = LogRows::Unmatched | LogRows::Hidden;
+
+LogEntry::Severity SeverityOf(quint8 mark)
+{
+    return static_cast<LogEntry::Severity>(mark & LogRows::SeverityMask);
+}
+
 template <class T>
 void MoveTail(std::vector<T>& from, size_t first, std::vector<T>& to)
 {
@@ -182,15 +190,18 @@ void LogIndex::End()
     m_hasLostSeam = m_knownSeam >= 0 && m_runs.size() == 1 && !m_isOneRun;
 }
 
-bool LogIndex::isMatched(char const* line, int length)
+// What the text filter says of a line: flags of its mark.
+quint8 LogIndex::textMarkOf(char const* line, int length)
 {
     if (!m_filter.hasText() || m_slowLine > 0)
-        return true;
+        return 0;
     const LogFilter::Match match =
         m_filter.Find(m_parser.fileType().encoding.narrowed().Decode(line, length));
     if (match == LogFilter::TooLong)
         m_slowLine = m_starts.size() + 1;
-    return match == LogFilter::Yes;
+    if (match == LogFilter::Hidden)
+        return LogRows::Unmatched | LogRows::Hidden;
+    return match == LogFilter::Yes ? 0 : LogRows::Unmatched;
 }
 
 quint8 LogIndex::markOf(LogLineParser::Parts const& parts, char const* line, int length)
@@ -202,9 +213,7 @@ quint8 LogIndex::markOf(LogLineParser::Parts const& parts, char const* line, int
         mark = (m_marks.back() & LogRows::SeverityMask) | LogRows::Continued;
     if (parts.timeKey >= 0)
         mark |= LogRows::Timed;
-    if (!isMatched(line, length))
-        mark |= LogRows::Unmatched;
-    return mark;
+    return mark | textMarkOf(line, length);
 }
 
 // Returns false if the lines up to the new position are known.
@@ -286,7 +295,7 @@ void LogIndex::joinRuns()
         const size_t first = m_runs[number].firstLine;
         if (m_marks[first] & LogRows::Torn)
             m_marks[first] = (m_marks[first - 1] & LogRows::SeverityMask) | LogRows::Continued |
-                             (m_marks[first] & LogRows::Unmatched);
+                             (m_marks[first] & OfText);
     }
     m_runs.resize(1);
     m_isSeamUnchanged = false;
@@ -307,8 +316,8 @@ void LogIndex::beginRun(LogLineParser::Parts const& parts)
     run.hasDate = parts.hasDate;
     if (run.firstLine > m_lastTimed + 1) {
         --run.firstLine;
-        const quint8 unmatched = m_marks.back() & LogRows::Unmatched;
-        m_marks.back() = LogEntry::None | LogRows::Torn | unmatched;
+        const quint8 ofText = m_marks.back() & OfText;
+        m_marks.back() = LogEntry::None | LogRows::Torn | ofText;
     }
     m_runs.push_back(run);
     m_runHasTimed = false;
@@ -367,16 +376,58 @@ void LogIndex::noteTime(LogLineParser::Parts const& parts)
     }
 }
 
-// Whether a line from the first one of an entry on matches the text.
+// Whether a line from the first one of an entry on matches the text, and none has a term that
+// hides.
 bool LogIndex::isEntryMatched(size_t first, size_t end) const
 {
-    size_t line = first;
-    while (m_slowLine == 0 && (m_marks[line] & LogRows::Unmatched)) {
-        ++line;
-        if (line == end || !(m_marks[line] & LogRows::Continued))
+    bool isMatched = m_slowLine > 0;
+    for (size_t line = first; line < end && m_slowLine == 0; ++line) {
+        if (line > first && !(m_marks[line] & LogRows::Continued))
+            break;
+        if (m_marks[line] & LogRows::Hidden)
             return false;
+        isMatched = isMatched || !(m_marks[line] & LogRows::Unmatched);
     }
-    return true;
+    return isMatched;
+}
+
+void LogIndex::addRow(size_t line, int flags, LogRows& rows) const
+{
+    const auto mark = static_cast<quint8>((m_marks[line] & ~OfText) | flags);
+    rows.add(m_starts[line], mark, m_checks[line]);
+    if (LogSeverities::IsProblem(SeverityOf(mark)) && !(mark & LogRows::Continued))
+        ++rows.problems;
+}
+
+void LogIndex::addRun(size_t number, LogFilter const& filter, LogRows& rows) const
+{
+    const bool isLast = number + 1 == m_runs.size();
+    const size_t end = isLast ? m_starts.size() : m_runs[number + 1].firstLine;
+    const auto context = static_cast<size_t>(filter.context());
+    size_t entryEnd = 0; // at most
+    bool isMatched = false;
+    size_t next = m_runs[number].firstLine; // the first line not added yet
+    size_t contextEnd = next;               // up to here, lines follow a hit
+    for (size_t line = next; line < end; ++line) {
+        const quint8 mark = m_marks[line];
+        const bool isContinued = mark & LogRows::Continued;
+        const bool isAlone = isContinued && line >= entryEnd;
+        if (!isContinued)
+            entryEnd = LogRows::BeginsEntry(mark) ? line + MaximumEntryLines : line + 1;
+        if (!isContinued || isAlone)
+            isMatched = isEntryMatched(line, isAlone ? line + 1 : std::min(entryEnd, end));
+        if (isMatched && filter.Shows(SeverityOf(mark))) {
+            for (next = std::max(next, line - std::min(line, context)); next < line; ++next)
+                addRow(next, LogRows::Context | LogRows::Alone, rows);
+            addRow(line, isAlone ? LogRows::Alone : 0, rows);
+            contextEnd = line + context + 1;
+        } else if (line < contextEnd) {
+            addRow(line, LogRows::Context | LogRows::Alone, rows);
+        } else {
+            continue;
+        }
+        next = line + 1;
+    }
 }
 
 LogRows LogIndex::Rows(LogFilter const& filter) const
@@ -385,40 +436,17 @@ LogRows LogIndex::Rows(LogFilter const& filter) const
     rows.starts.reserve(m_starts.size() + 2);
     rows.marks.reserve(m_starts.size() + 2);
     rows.checks.reserve(m_starts.size() + 2);
-    const auto addRun = [&](size_t number) {
-        const bool isLast = number + 1 == m_runs.size();
-        const size_t end = isLast ? m_starts.size() : m_runs[number + 1].firstLine;
-        size_t entryEnd = 0; // at most
-        bool isMatched = false;
-        for (size_t line = m_runs[number].firstLine; line < end; ++line) {
-            quint8 mark = m_marks[line];
-            if (!(mark & LogRows::Continued)) {
-                entryEnd = LogRows::BeginsEntry(mark) ? line + MaximumEntryLines : line + 1;
-                isMatched = isEntryMatched(line, std::min(entryEnd, end));
-            } else if (line >= entryEnd) {
-                mark |= LogRows::Alone;
-                isMatched = isEntryMatched(line, line + 1);
-            }
-            const auto severity = static_cast<LogEntry::Severity>(mark & LogRows::SeverityMask);
-            if (!isMatched || !filter.Shows(severity))
-                continue;
-            rows.add(m_starts[line], mark, m_checks[line]);
-            if (LogSeverities::IsProblem(severity) && !(mark & LogRows::Continued))
-                ++rows.problems;
-        }
-    };
-
     if (filter.earlierRuns() && m_runs.size() > 1) {
         rows.add(LogRows::EarlierHeading, LogEntry::None);
         for (size_t number = m_runs.size() - 1; number > 0; --number)
-            addRun(number);
+            addRun(number, filter, rows);
         rows.earlier = rows.size() > 1 ? rows.size() : 0;
         if (rows.earlier == 0)
             rows = LogRows();
         else
             rows.add(LogRows::NewestHeading, LogEntry::None);
     }
-    addRun(0);
+    addRun(0, filter, rows);
     rows.complete = completeOffset();
     rows.end = m_position;
     return rows;

@@ -129,11 +129,13 @@ private:
     };
 
     bool isEntryMatched(size_t first, size_t end) const;
+    void addRow(size_t line, int flags, LogRows& rows) const;
+    void addRun(size_t number, LogFilter const& filter, LogRows& rows) const;
     size_t resumeLine() const;
     void forgetFrom(size_t line);
     bool addLine(char const* line, int length, bool complete);
     quint8 markOf(LogLineParser::Parts const& parts, char const* line, int length);
-    bool isMatched(char const* line, int length);
+    quint8 textMarkOf(char const* line, int length);
     bool isSeam(LogLineParser::Parts const& parts, qint64 end) const;
     bool isOlder(LogLineParser::Parts const& parts) const;
     bool isKnown(LogLineParser::Parts const& parts, qint64 end) const;

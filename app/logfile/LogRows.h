@@ -30,8 +30,13 @@ struct LogRows
     static constexpr quint8 Continued = 0x08; ///< not an entry; has the severity of the entry above
     static constexpr quint8 Torn = 0x10;      ///< its first part was overwritten
     static constexpr quint8 Timed = 0x20;     ///< its time is known
-    static constexpr quint8 Unmatched = 0x40; ///< does not match the text filter itself
+    static constexpr quint8 Context = 0x40;   ///< shown only because it is near a line that matches
     static constexpr quint8 Alone = 0x80;     ///< continued, but not shown along with its entry
+
+    /// In an index, instead of the last two: the line does not match the text filter, or has a term
+    /// that hides it.
+    static constexpr quint8 Unmatched = 0x40;
+    static constexpr quint8 Hidden = 0x80;
 
     std::vector<qint64> starts;
     std::vector<quint8> marks;

@@ -63,6 +63,7 @@ LogPanel* FileTabs::addLog(QString const& title, QString const& path)
     const QString name = path.isEmpty() ? title : QFileInfo(path).fileName();
     panel->setAccessibleName(name);
     panel->SetMarkStore(m_marks);
+    panel->SetFilterHistory(m_filterHistory);
     connect(panel, &LogPanel::stateChanged, this, &FileTabs::stateChanged);
     connect(panel, &LogPanel::messageReported, this, &FileTabs::messageReported);
     if (!path.isEmpty())

@@ -4,7 +4,10 @@
 #pragma once
 
 #include <QString>
+#include <QStringList>
 #include <QTabWidget>
+
+#include <memory>
 
 namespace Velocor {
 
@@ -36,6 +39,10 @@ public:
     /// @return false if the user cancels
     bool MayCloseAll();
 
+    /// The last filter texts of all logs, newest first.
+    QStringList filterHistory() const { return *m_filterHistory; }
+    void SetFilterHistory(QStringList const& texts) { *m_filterHistory = texts; }
+
     /// The panel of the program's own log.
     LogPanel* ownLog() const { return m_ownLog; }
 
@@ -59,6 +66,7 @@ private:
     void addCloseButton(QWidget* page, QString const& name);
 
     LogMarkStore* m_marks;
+    std::shared_ptr<QStringList> m_filterHistory = std::make_shared<QStringList>();
     LogPanel* m_ownLog;
 };
 

@@ -14,6 +14,7 @@
 #include "app/window/ReportDialog.h"
 #include "app/window/SelectableMessageBoxes.h"
 #include "app/window/SystemReport.h"
+#include "app/window/log/LogFilterBar.h"
 #include "app/window/log/LogPanel.h"
 #include "app/window/log/LogSettingsDialog.h"
 #include "app/window/settings/SettingsEditor.h"
@@ -339,6 +340,9 @@ void MainWindow::restoreState()
     m_tabs->ownLog()->SetColumnWidths(m_settings.Numbers(QStringLiteral("columns")));
     m_tabs->ownLog()->SetPaneSizes(m_settings.Numbers(QStringLiteral("linePane")));
     m_recent->SetList(m_settings.Text(QStringLiteral("recentFiles")));
+    QStringList filters = m_settings.Text(QStringLiteral("filters")).split(QLatin1Char('\n'));
+    filters.removeAll(QString());
+    m_tabs->SetFilterHistory(filters.mid(0, LogFilterBar::MaximumHistory));
     m_showPlaces->setChecked(m_settings.Flag(QStringLiteral("placesShown"), true));
 }
 
@@ -351,6 +355,7 @@ void MainWindow::saveState()
     m_settings.SetNumbers(QStringLiteral("columns"), m_tabs->ownLog()->columnWidths());
     m_settings.SetNumbers(QStringLiteral("linePane"), m_tabs->ownLog()->paneSizes());
     m_settings.SetText(QStringLiteral("recentFiles"), m_recent->list());
+    m_settings.SetText(QStringLiteral("filters"), m_tabs->filterHistory().join(QLatin1Char('\n')));
 
     // No message box: the window may be closing because of a system shutdown.
     const QString error = m_settings.Save();

@@ -254,7 +254,7 @@ private:
                 const auto severity = LogEntry::Severity(row.mark & LogRows::SeverityMask);
                 if (!isMatched || !filter.Shows(severity))
                     continue;
-                rows.add(row.start, row.mark, row.check);
+                rows.add(row.start, quint8(row.mark & ~LogRows::Unmatched), row.check);
                 const bool isProblem = severity >= LogEntry::Warning && severity <= LogEntry::Fatal;
                 rows.problems += isProblem && !(row.mark & LogRows::Continued);
             }

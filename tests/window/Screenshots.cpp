@@ -14,8 +14,10 @@
 #include "support/DemoLog.h"
 #include "support/TestFiles.h"
 
+#include <QAbstractButton>
 #include <QAction>
 #include <QApplication>
+#include <QComboBox>
 #include <QLineEdit>
 #include <QStyleFactory>
 #include <QTabWidget>
@@ -109,6 +111,17 @@ LogPanel* PanelOf(MainWindow& window)
     return window.findChild<LogPanel*>();
 }
 
+template <class Widget>
+Widget* ByName(QWidget* parent, QString const& accessibleName)
+{
+    const QList<Widget*> all = parent->findChildren<Widget*>();
+    for (Widget* widget : all) {
+        if (widget->accessibleName() == accessibleName)
+            return widget;
+    }
+    qFatal("no %s", qPrintable(accessibleName));
+}
+
 void TakeLogViews(MainWindow& window, Camera const& camera)
 {
     LogPanel* panel = PanelOf(window);
@@ -119,7 +132,13 @@ void TakeLogViews(MainWindow& window, Camera const& camera)
     auto* filter = panel->findChild<QLineEdit*>();
     filter->setText("index");
     camera.take(window, "filter");
+    auto* more = ByName<QAbstractButton>(panel, "More filters");
+    more->setChecked(true);
+    ByName<QLineEdit>(panel, "Terms of lines to hide")->setText("opened");
+    ByName<QComboBox>(panel, "Lines of context")->setCurrentIndex(1);
+    camera.take(window, "more");
     panel->ClearFilter();
+    more->setChecked(false);
     table->clearSelection();
 
     panel->GoToProblem(-1);

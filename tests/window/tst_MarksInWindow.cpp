@@ -15,6 +15,7 @@
 #include <QLineEdit>
 #include <QLoggingCategory>
 #include <QMenu>
+#include <QPlainTextEdit>
 #include <QStatusBar>
 
 using namespace Velocor;
@@ -89,6 +90,7 @@ private slots:
     void filteredOut();
     void nothingSelected();
     void contextMenu();
+    void selectionInTheLineStays();
     void fileIsBounded();
     void damagedFile();
     void hostileNotes();
@@ -301,6 +303,22 @@ void tst_MarksInWindow::contextMenu()
     QVERIFY(qAbs(menu->y() - row.y()) < 2 * view->rowHeight(4));
     QTest::keyClick(menu, Qt::Key_M);
     QCOMPARE(Marked(*window), QVector<int>({4}));
+}
+
+void tst_MarksInWindow::selectionInTheLineStays()
+{
+    const WindowTest test(run(100, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+    MarkRow(*window, 50);
+    auto* line = Child<QPlainTextEdit>(window.get(), "Full text of the current line");
+    line->setFocus();
+    QTest::keyClick(line, Qt::Key_A, Qt::ControlModifier);
+    QVERIFY(line->textCursor().hasSelection());
+    QVERIFY(TestFiles::write(test.logFile(), run(120, QTime(9, 0), "x")));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 120, Patience);
+    QVERIFY(line->textCursor().hasSelection());
+    QCOMPARE(View(*window)->currentIndex().row(), 50);
 }
 
 void tst_MarksInWindow::fileIsBounded()

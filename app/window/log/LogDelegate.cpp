@@ -14,7 +14,10 @@ namespace Velocor {
 
 namespace {
 
-constexpr int MarkWidth = 4; // pixels
+constexpr int MarkWidth = 3; // pixels
+
+// Dimmed, but still with a contrast of more than 4.5:1.
+constexpr qreal ContextFade = 0.4;
 
 QColor Blended(QColor const& a, QColor const& b, qreal share)
 {
@@ -77,11 +80,15 @@ void LogDelegate::initStyleOption(QStyleOptionViewItem* option, QModelIndex cons
     if (index.data(LogModel::EarlierRole).toBool())
         option->backgroundBrush = Blended(option->palette.color(QPalette::Base),
                                           option->palette.color(QPalette::Text), 0.045);
+    if (index.data(LogModel::ContextRole).toBool())
+        option->palette.setColor(QPalette::Text,
+                                 Blended(option->palette.color(QPalette::Text),
+                                         option->palette.color(QPalette::Base), ContextFade));
     if (index.column() == LogModel::TimeColumn && index.data(LogModel::MarkedRole).toBool())
         option->backgroundBrush =
             Blended(option->palette.color(QPalette::Base),
                     TickScrollBar::Color(TickScrollBar::Marked, option->palette), 0.2);
-    if (index.column() == LogModel::SeverityColumn)
+    if (index.column() == LogModel::SeverityColumn && !index.data(LogModel::ContextRole).toBool())
         option->palette.setColor(QPalette::Text, SeverityIcons::Color(severity, option->palette));
 }
 

@@ -5,10 +5,14 @@
 
 #include "app/logfile/LogFilter.h"
 
+#include <QStringList>
 #include <QTimer>
 #include <QWidget>
 
+#include <memory>
+
 class QCheckBox;
+class QComboBox;
 class QLabel;
 class QLineEdit;
 class QToolButton;
@@ -16,7 +20,8 @@ class QToolButton;
 namespace Velocor {
 
 /// The filter controls of a log view: text, match options, one button per severity and one for
-/// lines without a severity.
+/// lines without a severity; in a second row, which is shown on demand, more terms, a least
+/// severity, and context.
 class LogFilterBar : public QWidget
 {
     Q_OBJECT
@@ -30,10 +35,26 @@ public:
     /// Focuses the text field and selects its text.
     void FocusText();
 
-    /// Resets the text and the severities.
+    /// Resets everything that hides lines, except for earlier runs.
     void Clear();
 
     void SetEarlierRuns(bool shown);
+
+    /// Shows only lines with this text, as it is.
+    void FilterBy(QString const& text);
+
+    /// Hides the lines with this text as well.
+    void Hide(QString const& text);
+
+    /// Shows only the entries of this severity, or hides them as well.
+    void FilterBy(LogEntry::Severity severity);
+    void Hide(LogEntry::Severity severity);
+
+    /// Sets where the last filter texts are kept, newest first; shared with other bars.
+    void SetHistory(std::shared_ptr<QStringList> const& history) { m_history = history; }
+
+    /// How many filter texts are kept.
+    static constexpr int MaximumHistory = 20;
 
     /// Says that the expression takes too long at a line, starting at 1; 0 if it does not.
     void ShowSlowLine(size_t line);
@@ -43,10 +64,18 @@ Q_SIGNALS:
 
 protected:
     void changeEvent(QEvent* event) override;
+    bool eventFilter(QObject* watched, QEvent* event) override;
 
 private:
     QCheckBox* makeOption(QString const& text, QString const& name, QString const& toolTip);
     void addSeverities();
+    QLineEdit* makeTerms(QString const& name, QString const& toolTip);
+    QWidget* makeSecondRow();
+    void setLeastSeverity(int least);
+    void showLeastSeverity();
+    void showMore();
+    void keepText();
+    void showHistory();
     void updateIcons();
     void apply();
     void showError(QString const& error);
@@ -55,9 +84,16 @@ private:
     QCheckBox* m_case;
     QCheckBox* m_expression;
     QVector<QToolButton*> m_severities;
+    QToolButton* m_earlier;
+    QToolButton* m_more;
+    QLineEdit* m_required = nullptr;
+    QLineEdit* m_hidden = nullptr;
+    QComboBox* m_least = nullptr;
+    QComboBox* m_context = nullptr;
     QLabel* m_error;
     QTimer m_typing;
     LogFilter m_filter;
+    std::shared_ptr<QStringList> m_history = std::make_shared<QStringList>();
 };
 
 } // namespace Velocor

@@ -488,6 +488,8 @@ QVariant LogModel::data(QModelIndex const& index, int role) const
         return static_cast<size_t>(row) < m_state.rows->earlier;
     case MarkedRole:
         return m_marks.contains(LineStart(row));
+    case ContextRole:
+        return bool(m_state.rows->marks[static_cast<size_t>(row)] & LogRows::Context);
     case NoteRole:
         return m_marks.value(LineStart(row));
     default:

@@ -40,7 +40,8 @@ public:
         HeadingRole,                 ///< whether the row is a heading
         EarlierRole,                 ///< whether the row belongs to an earlier run
         MarkedRole,                  ///< whether the user has marked the row
-        NoteRole                     ///< the user's note on it
+        NoteRole,                    ///< the user's note on it
+        ContextRole                  ///< whether it is shown only as the context of others
     };
 
     explicit LogModel(QObject* parent = nullptr);

@@ -110,7 +110,7 @@ void LogPanel::makeLayout()
 
     auto* table = new QWidget;
     auto* tableLayout = new QVBoxLayout(table);
-    tableLayout->setContentsMargins(0, 0, 0, 0);
+    tableLayout->setContentsMargins(0, 0, 0, 2);
     tableLayout->setSpacing(6);
     tableLayout->addWidget(m_view, 1);
     tableLayout->addWidget(m_findBar);
@@ -157,6 +157,8 @@ void LogPanel::connectAll()
             Q_EMIT messageReported(message);
     });
     connect(m_marks, &LogMarks::changed, this, &LogPanel::showMarks);
+    m_line->setContextMenuPolicy(Qt::CustomContextMenu);
+    connect(m_line, &QWidget::customContextMenuRequested, this, &LogPanel::showLineMenu);
     connect(m_view, &LogView::menuRequested, this, &LogPanel::showMenu);
     connect(m_search, &LogSearch::changed, this, &LogPanel::showFound);
     connect(m_view, &LogView::followingChanged, this, [this](bool following) {
@@ -422,14 +424,62 @@ void LogPanel::showMarks()
 {
     m_view->ticks()->SetTicks(TickScrollBar::Marked, m_marks->rows());
     m_view->viewport()->update();
-    showCurrentLine();
+    showNote(); // not the line, in which the user may have selected something
 }
 
-void LogPanel::showMenu(QPoint const& position)
+void LogPanel::SetFilterHistory(std::shared_ptr<QStringList> const& history)
+{
+    m_filterBar->SetHistory(history);
+}
+
+// The names of severities are translated, so their cells stand for the severity itself.
+void LogPanel::filterBy(QModelIndex const& cell, bool isHiding)
+{
+    if (!cell.isValid())
+        return;
+    if (cell.column() == LogModel::SeverityColumn) {
+        const auto severity =
+            static_cast<LogEntry::Severity>(cell.data(LogModel::SeverityRole).toInt());
+        if (isHiding)
+            m_filterBar->Hide(severity);
+        else
+            m_filterBar->FilterBy(severity);
+        return;
+    }
+    const QString text = cell.data().toString();
+    if (text.isEmpty())
+        return;
+    if (isHiding)
+        m_filterBar->Hide(text);
+    else
+        m_filterBar->FilterBy(text);
+}
+
+// For a part of the line, which cannot be selected in the table.
+void LogPanel::showLineMenu(QPoint const& position)
+{
+    QMenu* menu = m_line->createStandardContextMenu();
+    menu->setAttribute(Qt::WA_DeleteOnClose);
+    const QString selected = m_line->textCursor().selectedText();
+    menu->addSeparator();
+    QAction* filter = menu->addAction(tr("&Filter by This"), this,
+                                      [this, selected] { m_filterBar->FilterBy(selected); });
+    QAction* hide =
+        menu->addAction(tr("&Hide This"), this, [this, selected] { m_filterBar->Hide(selected); });
+    filter->setEnabled(!selected.isEmpty());
+    hide->setEnabled(!selected.isEmpty());
+    menu->popup(m_line->mapToGlobal(position));
+}
+
+void LogPanel::showMenu(QPoint const& position, QModelIndex const& cell)
 {
     auto* menu = new QMenu(this);
     menu->setAttribute(Qt::WA_DeleteOnClose);
     menu->addAction(tr("&Copy"), this, &LogPanel::CopySelected);
+    menu->addSeparator();
+    const QPersistentModelIndex clicked = cell;
+    menu->addAction(tr("&Filter by This"), this, [this, clicked] { filterBy(clicked, false); });
+    menu->addAction(tr("&Hide This"), this, [this, clicked] { filterBy(clicked, true); });
     menu->addSeparator();
     const bool isMarked = m_marks->isMarked(m_view->currentIndex().row());
     menu->addAction(isMarked ? tr("Remove &Mark") : tr("&Mark"), this, &LogPanel::ToggleMark);
@@ -516,7 +566,12 @@ void LogPanel::showCurrentLine()
     const QModelIndex current = m_view->currentIndex();
     m_line->setPlainText(current.isValid() ? m_model->EntryText(current.row(), LogIndex::LineLimit)
                                            : QString());
-    const QString note = m_marks->NoteOf(current.row());
+    showNote();
+}
+
+void LogPanel::showNote()
+{
+    const QString note = m_marks->NoteOf(m_view->currentIndex().row());
     m_note->setText(note.isEmpty() ? QString() : tr("Note: %1").arg(note));
     m_note->setToolTip(PlainToolTip(note));
     m_note->setVisible(!note.isEmpty());

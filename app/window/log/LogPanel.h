@@ -6,8 +6,12 @@
 #include "app/logfile/LogEncoding.h"
 
 #include <QList>
+#include <QModelIndex>
 #include <QString>
+#include <QStringList>
 #include <QWidget>
+
+#include <memory>
 
 class QCheckBox;
 class QComboBox;
@@ -71,6 +75,9 @@ public:
     /// Asks for a line number or a time, and goes there.
     void AskGoTo();
 
+    /// See LogFilterBar::SetHistory().
+    void SetFilterHistory(std::shared_ptr<QStringList> const& history);
+
     /// Sets where the marks of log files are kept, before a file is opened.
     ///
     /// @param store  not owned
@@ -124,12 +131,15 @@ private:
     void chooseFile(int position);
     void showFile(QString const& path);
     void showCurrentLine();
+    void showNote();
     void updatePlaceholder();
     void applyFind();
     void showFound();
     void goToFound();
     void showMarks();
-    void showMenu(QPoint const& position);
+    void showMenu(QPoint const& position, QModelIndex const& cell);
+    void showLineMenu(QPoint const& position);
+    void filterBy(QModelIndex const& cell, bool isHiding);
     void report(QString const& message);
 
     LogModel* m_model;

@@ -113,9 +113,12 @@ void LogView::focusInEvent(QFocusEvent* event)
 void LogView::contextMenuEvent(QContextMenuEvent* event)
 {
     QPoint position = event->globalPos();
-    if (event->reason() == QContextMenuEvent::Keyboard && currentIndex().isValid())
+    QModelIndex cell = indexAt(event->pos());
+    if (event->reason() == QContextMenuEvent::Keyboard && currentIndex().isValid()) {
         position = viewport()->mapToGlobal(visualRect(currentIndex()).bottomLeft());
-    Q_EMIT menuRequested(position);
+        cell = m_model->index(currentIndex().row(), LogModel::MessageColumn);
+    }
+    Q_EMIT menuRequested(position, cell);
 }
 
 void LogView::SetFollowing(bool following)

@@ -74,7 +74,10 @@ Q_SIGNALS:
     void followingChanged(bool following);
 
     /// The menu of the table is wanted at a global position.
-    void menuRequested(QPoint const& position);
+    ///
+    /// @param cell  what was clicked on, or the current message if the menu key was pressed; may be
+    ///              invalid
+    void menuRequested(QPoint const& position, QModelIndex const& cell);
 
 protected:
     void paintEvent(QPaintEvent* event) override;

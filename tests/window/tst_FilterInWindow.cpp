@@ -1,0 +1,378 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// What the filter has besides its text, driven with keys and mouse on a real screen.
+
+#include "WindowParts.h"
+
+#include "app/window/log/LogModel.h"
+#include "app/window/log/LogView.h"
+
+#include <QCheckBox>
+#include <QComboBox>
+#include <QLabel>
+#include <QLineEdit>
+#include <QLoggingCategory>
+#include <QMenu>
+#include <QPlainTextEdit>
+#include <QToolButton>
+
+using namespace Velocor;
+using namespace WindowParts;
+
+using DemoLog::entry;
+using DemoLog::run;
+
+namespace {
+
+QLineEdit* Field(MainWindow& window, char const* name = "Filter by text")
+{
+    return Child<QLineEdit>(&window, name);
+}
+
+QStringList Messages(MainWindow& window)
+{
+    QStringList messages;
+    for (int row = 0; row < Rows(window); ++row)
+        messages.append(View(window)->model()->index(row, 3).data().toString());
+    return messages;
+}
+
+void Type(MainWindow& window, char const* text)
+{
+    QTest::keyClick(&window, Qt::Key_L, Qt::ControlModifier);
+    QTest::keyClicks(QApplication::focusWidget(), text);
+}
+
+// Opens the menu of a cell and chooses the item with this letter.
+void Choose(MainWindow& window, int row, int column, Qt::Key letter)
+{
+    LogView* view = View(window);
+    const QPoint at = view->visualRect(view->model()->index(row, column)).center();
+    QTest::mouseClick(view->viewport(), Qt::RightButton, Qt::NoModifier, at);
+    QContextMenuEvent event(QContextMenuEvent::Mouse, at, view->viewport()->mapToGlobal(at));
+    QApplication::sendEvent(view->viewport(), &event);
+    QWidget* menu = QApplication::activePopupWidget();
+    QVERIFY(menu);
+    QTest::keyClick(menu, letter);
+}
+
+// Chooses an item with the keyboard.
+void Choose(QComboBox* box, char const* text)
+{
+    box->setFocus();
+    QTest::keyClick(box, Qt::Key_Home);
+    for (int i = 0; i < box->count() && box->currentText() != text; ++i)
+        QTest::keyClick(box, Qt::Key_Down);
+    QCOMPARE(box->currentText(), QString(text));
+}
+
+QByteArray Fruit()
+{
+    return entry("09:00:00.000", "Trace", "red apple") +
+           entry("09:00:01.000", "Warning", "green apple") +
+           entry("09:00:02.000", "Error", "red \"cherry\" pie") +
+           entry("09:00:03.000", "Fatal", "green pear") + entry("09:00:04.000", "Trace", "plum");
+}
+
+} // namespace
+
+class tst_FilterInWindow : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void initTestCase();
+    void cleanup();
+
+    void moreIsHidden();
+    void textIsOneText();
+    void hidesTerms();
+    void requiresTerms();
+    void leastSeverity();
+    void context();
+    void contextIsDimmed();
+    void clears();
+    void filterByThis();
+    void hideThis();
+    void severityOfTheMenu();
+    void selectionOfTheCurrentLine();
+    void history();
+    void historyIsShared();
+};
+
+void tst_FilterInWindow::initTestCase()
+{
+    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
+    // in a test's log. The environment would be too late: it was read with the application object.
+    QLoggingCategory::setFilterRules("qt.qpa.*=false");
+}
+
+void tst_FilterInWindow::cleanup()
+{
+    const QWidgetList windows = QApplication::topLevelWidgets();
+    for (QWidget* window : windows)
+        window->hide();
+}
+
+void tst_FilterInWindow::moreIsHidden()
+{
+    const WindowTest test(Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    QVERIFY(!Field(*window, "Terms of lines to hide")->isVisible());
+    Click(Child<QToolButton>(window.get(), "More filters"));
+    QVERIFY(Field(*window, "Terms of lines to hide")->isVisible());
+    QVERIFY(Child<QComboBox>(window.get(), "Lines of context")->isVisible());
+    Click(Child<QToolButton>(window.get(), "More filters"));
+    QVERIFY(!Field(*window, "Terms of lines to hide")->isVisible());
+}
+
+void tst_FilterInWindow::textIsOneText()
+{
+    const WindowTest test(Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    Type(*window, "red \"cherry\"");
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(*window), QStringList({"red \"cherry\" pie"}), Patience);
+}
+
+void tst_FilterInWindow::hidesTerms()
+{
+    const WindowTest test(Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    Click(Child<QToolButton>(window.get(), "More filters"));
+    Field(*window, "Terms of lines to hide")->setFocus();
+    QTest::keyClicks(QApplication::focusWidget(), "Pear \"red a\"");
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(*window),
+                              QStringList({"green apple", "red \"cherry\" pie", "plum"}), Patience);
+    QTest::mouseClick(Child<QCheckBox>(window.get(), "Match case"), Qt::LeftButton, Qt::NoModifier,
+                      QPoint(8, 8));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 4, Patience);
+}
+
+void tst_FilterInWindow::requiresTerms()
+{
+    const WindowTest test(Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    Type(*window, "e");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    Click(Child<QToolButton>(window.get(), "More filters"));
+    Field(*window, "Terms that lines also contain")->setFocus();
+    QTest::keyClicks(QApplication::focusWidget(), "apple green");
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(*window), QStringList({"green apple"}), Patience);
+}
+
+void tst_FilterInWindow::leastSeverity()
+{
+    const WindowTest test(Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    Click(Child<QToolButton>(window.get(), "More filters"));
+    auto* least = Child<QComboBox>(window.get(), "Least severity");
+    Choose(least, "At least Warning");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
+    QVERIFY(!Child<QToolButton>(window.get(), "Show Notification")->isChecked());
+    Choose(least, "Only Fatal");
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(*window), QStringList({"green pear"}), Patience);
+    Choose(least, "All severities");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+
+    // The box says what the buttons amount to.
+    QTest::keyClick(window.get(), Qt::Key_1, Qt::ControlModifier);
+    QTRY_COMPARE(least->currentText(), QString("At least Notification"));
+    QTest::keyClick(window.get(), Qt::Key_4, Qt::ControlModifier);
+    QTRY_COMPARE(least->currentText(), QString("Some severities"));
+}
+
+void tst_FilterInWindow::context()
+{
+    const WindowTest test(run(100, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+    Type(*window, "x 50");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+    Click(Child<QToolButton>(window.get(), "More filters"));
+    Choose(Child<QComboBox>(window.get(), "Lines of context"), "2 around");
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(*window),
+                              QStringList({"x 48", "x 49", "x 50", "x 51", "x 52"}), Patience);
+    QVERIFY(TestFiles::write(test.logFile(),
+                             run(101, QTime(9, 0), "x") + entry("10:00:00.000", "Trace", "x 50")));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 8, Patience);
+    Choose(Child<QComboBox>(window.get(), "Lines of context"), "No context");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+}
+
+void tst_FilterInWindow::contextIsDimmed()
+{
+    const WindowTest test(run(100, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+    Type(*window, "x 50");
+    Click(Child<QToolButton>(window.get(), "More filters"));
+    Choose(Child<QComboBox>(window.get(), "Lines of context"), "1 around");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
+    LogView* view = View(*window);
+    const auto darkest = [view](int row) {
+        const QRect cell = view->visualRect(view->model()->index(row, 0)).adjusted(4, 0, -4, 0);
+        const QImage image = view->viewport()->grab(cell).toImage();
+        int least = 255;
+        for (int y = 0; y < image.height(); ++y) {
+            for (int x = 0; x < image.width(); ++x)
+                least = std::min(least, image.pixelColor(x, y).lightness());
+        }
+        return least;
+    };
+    QTRY_VERIFY(darkest(0) > darkest(1) + 40);
+    QTRY_VERIFY(darkest(2) > darkest(1) + 40);
+}
+
+void tst_FilterInWindow::clears()
+{
+    const WindowTest test(Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    Click(Child<QToolButton>(window.get(), "More filters"));
+    Field(*window, "Terms of lines to hide")->setFocus();
+    QTest::keyClicks(QApplication::focusWidget(), "red");
+    Field(*window, "Terms that lines also contain")->setFocus();
+    QTest::keyClicks(QApplication::focusWidget(), "pear");
+    Choose(Child<QComboBox>(window.get(), "Least severity"), "Only Fatal");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+    Choose(Child<QComboBox>(window.get(), "Lines of context"), "1 around");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
+    QCOMPARE(Child<QToolButton>(window.get(), "More filters")->text(), QString("More (3)"));
+    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier | Qt::ShiftModifier);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    QCOMPARE(Child<QComboBox>(window.get(), "Least severity")->currentIndex(), 0);
+    QCOMPARE(Child<QComboBox>(window.get(), "Lines of context")->currentIndex(), 0);
+    QCOMPARE(Child<QToolButton>(window.get(), "More filters")->text(), QString("More"));
+}
+
+void tst_FilterInWindow::filterByThis()
+{
+    const WindowTest test(Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    QTest::mouseClick(Child<QCheckBox>(window.get(), "Regular expression"), Qt::LeftButton,
+                      Qt::NoModifier, QPoint(8, 8));
+    Choose(*window, 2, LogModel::MessageColumn, Qt::Key_F);
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(*window), QStringList({"red \"cherry\" pie"}), Patience);
+    QCOMPARE(Field(*window)->text(), QString("red \"cherry\" pie"));
+    Panel(*window)->ClearFilter();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    Choose(*window, 3, LogModel::TimeColumn, Qt::Key_F);
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(*window), QStringList({"green pear"}), Patience);
+}
+
+void tst_FilterInWindow::hideThis()
+{
+    const WindowTest test(Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    Choose(*window, 1, LogModel::MessageColumn, Qt::Key_H);
+    QTRY_COMPARE_WITH_TIMEOUT(
+        Messages(*window), QStringList({"red apple", "red \"cherry\" pie", "green pear", "plum"}),
+        Patience);
+    QVERIFY(Field(*window, "Terms of lines to hide")->isVisible());
+    Choose(*window, 3, LogModel::MessageColumn, Qt::Key_H);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
+    QCOMPARE(Field(*window, "Terms of lines to hide")->text(), QString("\"green apple\" plum"));
+}
+
+void tst_FilterInWindow::severityOfTheMenu()
+{
+    const WindowTest test(Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    Choose(*window, 0, LogModel::SeverityColumn, Qt::Key_H);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
+    QVERIFY(!Child<QToolButton>(window.get(), "Show Trace")->isChecked());
+    Choose(*window, 1, LogModel::SeverityColumn, Qt::Key_F);
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(*window), QStringList({"red \"cherry\" pie"}), Patience);
+}
+
+void tst_FilterInWindow::selectionOfTheCurrentLine()
+{
+    const WindowTest test(Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    View(*window)->GoToRow(0);
+    auto* line = Child<QPlainTextEdit>(window.get(), "Full text of the current line");
+    line->setFocus();
+    QTest::keyClick(line, Qt::Key_End);
+    QTest::keyClick(line, Qt::Key_Left, Qt::ControlModifier | Qt::ShiftModifier);
+    QCOMPARE(line->textCursor().selectedText(), QString("apple"));
+    QContextMenuEvent event(QContextMenuEvent::Mouse, QPoint(5, 5),
+                            line->viewport()->mapToGlobal(QPoint(5, 5)));
+    QApplication::sendEvent(line->viewport(), &event);
+    QVERIFY(QApplication::activePopupWidget());
+    QTest::keyClick(QApplication::activePopupWidget(), Qt::Key_H);
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(*window),
+                              QStringList({"red \"cherry\" pie", "green pear", "plum"}), Patience);
+}
+
+void tst_FilterInWindow::history()
+{
+    const WindowTest test(Fruit());
+    const auto open = [](MainWindow& window) {
+        QTest::keyClick(&window, Qt::Key_L, Qt::ControlModifier);
+        QTest::keyClick(Field(window), Qt::Key_Down);
+        return qobject_cast<QMenu*>(QApplication::activePopupWidget());
+    };
+    {
+        const auto window = WindowTest::show();
+        QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+        for (int i = 0; i < 25; ++i) {
+            Type(*window, qPrintable(QString("text %1").arg(i)));
+            QTest::keyClick(Field(*window), Qt::Key_Return);
+        }
+        Type(*window, "pear & plum");
+        View(*window)->setFocus(); // also counts
+        Type(*window, "text 24");
+        QTest::keyClick(Field(*window), Qt::Key_Return);
+        QMenu* menu = open(*window);
+        QVERIFY(menu);
+        QCOMPARE(menu->actions().size(), 20);
+        QCOMPARE(menu->actions().at(0)->text(), QString("text 24"));
+        QCOMPARE(menu->actions().at(1)->text(), QString("pear && plum"));
+        QCOMPARE(menu->actions().at(2)->text(), QString("text 23"));
+        QTest::keyClick(menu, Qt::Key_Escape);
+        window->close();
+    }
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    QMenu* menu = open(*window);
+    QVERIFY(menu);
+    QCOMPARE(menu->actions().size(), 20);
+    QTest::keyClick(menu, Qt::Key_Down);
+    QTest::keyClick(menu, Qt::Key_Down);
+    QTest::keyClick(menu, Qt::Key_Return);
+    QCOMPARE(Field(*window)->text(), QString("pear & plum"));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 0, Patience);
+}
+
+void tst_FilterInWindow::historyIsShared()
+{
+    const WindowTest test(Fruit());
+    QVERIFY(TestFiles::write(test.folder() + "other.log", Fruit()));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    Type(*window, "pear");
+    QTest::keyClick(Field(*window), Qt::Key_Return);
+    window->OpenFile(test.folder() + "other.log");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    Click(Child<QToolButton>(Panel(*window), "Earlier filters"));
+    auto* menu = qobject_cast<QMenu*>(QApplication::activePopupWidget());
+    QVERIFY(menu);
+    QCOMPARE(menu->actions().size(), 1);
+    QTest::keyClick(menu, Qt::Key_Down);
+    QTest::keyClick(menu, Qt::Key_Return);
+    QTRY_COMPARE_WITH_TIMEOUT(Messages(*window), QStringList({"green pear"}), Patience);
+}
+
+QTEST_MAIN(tst_FilterInWindow)
+
+#include "tst_FilterInWindow.moc"
