@@ -110,17 +110,25 @@ int FileTabs::positionOf(QString const& path) const
 
 void FileTabs::OpenFile(QString const& path)
 {
-    int position = positionOf(path);
-    if (position < 0) {
-        QWidget* page = nullptr;
-        if (IsSettingsFile(path))
-            page = addEditor(TitleOf(path), path);
-        else
-            page = addLog(TitleOf(path), path);
-        position = indexOf(page);
-    }
-    setCurrentIndex(position);
-    widget(position)->setFocus();
+    QWidget* page = widget(positionOf(path));
+    if (!page && IsSettingsFile(path))
+        page = addEditor(TitleOf(path), path);
+    else if (!page)
+        page = addLog(TitleOf(path), path);
+    goTo(page);
+}
+
+LogPanel* FileTabs::OpenLog(QString const& path)
+{
+    LogPanel* panel = addLog(TitleOf(path), path);
+    goTo(panel);
+    return panel;
+}
+
+void FileTabs::goTo(QWidget* page)
+{
+    setCurrentWidget(page);
+    page->setFocus();
     Q_EMIT stateChanged();
 }
 

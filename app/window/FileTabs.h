@@ -25,6 +25,11 @@ public:
     /// A file that begins with "<" is treated as a settings file, any other as a log.
     void OpenFile(QString const& path);
 
+    /// Shows a file as a log in a new tab.
+    ///
+    /// @return its panel, owned by the tabs
+    LogPanel* OpenLog(QString const& path);
+
     /// Closes the current tab, unless it is the program's log or the user cancels.
     void CloseCurrent();
 
@@ -52,6 +57,7 @@ private:
     LogPanel* addLog(QString const& title, QString const& path);
     SettingsEditor* addEditor(QString const& title, QString const& path);
     void closeTab(int position);
+    void goTo(QWidget* page);
     int positionOf(QString const& path) const;
     void addCloseButton(QWidget* page, QString const& name);
 

@@ -13,6 +13,7 @@
 #include "app/window/RecentFiles.h"
 #include "app/window/ReportDialog.h"
 #include "app/window/SelectableMessageBoxes.h"
+#include "app/window/StandardInput.h"
 #include "app/window/SystemReport.h"
 #include "app/window/log/LogPanel.h"
 #include "app/window/log/LogSettingsDialog.h"
@@ -24,6 +25,7 @@
 #include <QApplication>
 #include <QCloseEvent>
 #include <QDesktopWidget>
+#include <QDir>
 #include <QFileDialog>
 #include <QMenuBar>
 #include <QMessageBox>
@@ -117,6 +119,7 @@ void MainWindow::complete()
     restoreState();
     updateState();
     startWork();
+    openFilesOfStart();
 }
 
 void MainWindow::makeTabs()
@@ -376,16 +379,63 @@ void MainWindow::OpenFile(QString const& path)
         offerToForget(path);
         return;
     }
-    if (QFileInfo(full).isDir()) {
-        showMessage(tr("%1 is a folder").arg(full));
-        return;
+    const QString problem = open(full);
+    if (!problem.isEmpty())
+        showMessage(problem);
+}
+
+// Returns why it cannot be opened; empty if it was.
+QString MainWindow::open(QString const& path)
+{
+    const QFileInfo info(path);
+    if (!info.exists())
+        return tr("%1 does not exist").arg(path);
+    if (info.isDir())
+        return tr("%1 is a folder").arg(path);
+    if (!info.isFile()) // opening a pipe would block, and a device may have no end
+        return tr("%1 is not a regular file").arg(path);
+    m_tabs->OpenFile(path);
+    m_recent->Add(path);
+    return QString();
+}
+
+void MainWindow::OpenAtStart(QStringList const& files)
+{
+    m_filesOfStart = files;
+    if (m_tabs)
+        openFilesOfStart();
+}
+
+void MainWindow::openFilesOfStart()
+{
+    QStringList problems;
+    const QStringList files = m_filesOfStart.mid(0, MaximumFilesAtStart);
+    for (QString const& file : files) {
+        const bool isInput = file == QLatin1String("-");
+        const QString problem = isInput ? openStandardInput() : open(file);
+        if (!problem.isEmpty())
+            problems.append(Shortened(problem, MaximumMessageLength));
     }
-    if (!QFileInfo(full).isFile()) { // opening a pipe would block, and a device may have no end
-        showMessage(tr("%1 is not a regular file").arg(full));
-        return;
+    if (m_filesOfStart.size() > MaximumFilesAtStart)
+        problems.append(tr("Only the first %1 of %2 files were opened")
+                            .arg(MaximumFilesAtStart)
+                            .arg(m_filesOfStart.size()));
+    m_filesOfStart.clear();
+    if (!problems.isEmpty())
+        m_notice->ShowMessage(problems.join(QLatin1Char('\n')));
+}
+
+QString MainWindow::openStandardInput()
+{
+    auto* input = new StandardInput;
+    if (input->path().isEmpty()) {
+        delete input;
+        return tr("Standard input cannot be shown, because no file can be created in %1")
+            .arg(QDir::tempPath());
     }
-    m_tabs->OpenFile(full);
-    m_recent->Add(full);
+    connect(input, &StandardInput::failed, m_notice, &NoticeBar::ShowMessage);
+    input->setParent(m_tabs->OpenLog(input->path())); // ends with its tab
+    return QString();
 }
 
 bool MainWindow::offerToForget(QString const& path)

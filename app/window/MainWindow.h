@@ -43,6 +43,15 @@ public:
     /// If the file does not exist, offers to remove it from the recent files.
     void OpenFile(QString const& path);
 
+    /// Opens files as soon as the window is complete; the last one gets the current tab. A notice
+    /// names those that cannot be opened.
+    ///
+    /// @param files  absolute paths; "-" is standard input
+    void OpenAtStart(QStringList const& files);
+
+    /// The maximum number of files that OpenAtStart() opens.
+    static constexpr int MaximumFilesAtStart = 50;
+
 protected:
     bool event(QEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
@@ -70,11 +79,14 @@ private:
     void restoreState();
     void saveState();
     void startWork();
+    void openFilesOfStart();
+    QString openStandardInput();
     void updateState();
     void checkLog();
     void showMessage(QString const& text);
 
     void chooseFile();
+    QString open(QString const& path);
     void openLogFolder();
     void saveReport();
     void showAbout();
@@ -84,6 +96,7 @@ private:
     bool offerToForget(QString const& path);
 
     WindowSettings m_settings;
+    QStringList m_filesOfStart;
     QString m_startupMessage; ///< about a damaged settings file
     NoticeBar* m_notice = nullptr;
     QSplitter* m_splitter;
