@@ -3,6 +3,7 @@
 
 #include "app/window/FileTabs.h"
 
+#include "app/window/DistinctNames.h"
 #include "app/window/log/LogPanel.h"
 #include "app/window/settings/SettingsEditor.h"
 #include "app/window/widgets/PlainText.h"
@@ -12,25 +13,9 @@
 #include <QTabBar>
 #include <QToolButton>
 
+#include <algorithm>
+
 namespace Velocor {
-
-namespace {
-
-QString PathOf(QWidget const* page)
-{
-    if (auto const* log = qobject_cast<LogPanel const*>(page))
-        return log->path();
-    auto const* editor = qobject_cast<SettingsEditor const*>(page);
-    return editor ? editor->path() : QString();
-}
-
-QString TitleOf(QString const& path)
-{
-    QString title = QFileInfo(path).fileName();
-    return title.replace(QLatin1Char('&'), QLatin1String("&&"));
-}
-
-} // namespace
 
 FileTabs::FileTabs(QWidget* parent) : QTabWidget(parent)
 {
@@ -40,8 +25,36 @@ FileTabs::FileTabs(QWidget* parent) : QTabWidget(parent)
     setElideMode(Qt::ElideMiddle);
     setAccessibleName(tr("Open files"));
     tabBar()->setAccessibleName(tr("Open files"));
-    m_ownLog = addLog(tr("Log"), QString());
+    m_ownLog = addLog(QString());
+    setTabText(0, tr("Log"));
     connect(this, &QTabWidget::currentChanged, this, &FileTabs::stateChanged);
+    connect(this, &FileTabs::stateChanged, this, &FileTabs::updateTitles);
+}
+
+QString FileTabs::PathOf(QWidget const* page)
+{
+    if (auto const* log = qobject_cast<LogPanel const*>(page))
+        return log->path();
+    auto const* editor = qobject_cast<SettingsEditor const*>(page);
+    return editor ? editor->path() : QString();
+}
+
+// Setting a text lays out the tabs, even if it is the same.
+void FileTabs::updateTitles()
+{
+    QStringList paths;
+    for (int i = 1; i < count(); ++i)
+        paths.append(PathOf(widget(i)));
+    QStringList titles = DistinctNames(paths);
+    for (int i = 1; i < count(); ++i) {
+        QString& title = titles[i - 1];
+        title.replace(QLatin1Char('&'), QLatin1String("&&"));
+        auto const* editor = qobject_cast<SettingsEditor const*>(widget(i));
+        if (editor && editor->isModified())
+            title += QLatin1String(" *");
+        if (tabText(i) != title)
+            setTabText(i, title);
+    }
 }
 
 // The style's close button is an image that is invisible on dark palettes.
@@ -57,33 +70,31 @@ void FileTabs::addCloseButton(QWidget* page, QString const& name)
     tabBar()->setTabButton(indexOf(page), QTabBar::RightSide, button);
 }
 
-LogPanel* FileTabs::addLog(QString const& title, QString const& path)
+LogPanel* FileTabs::addLog(QString const& path)
 {
     auto* panel = new LogPanel;
-    const QString name = path.isEmpty() ? title : QFileInfo(path).fileName();
+    const QString name = path.isEmpty() ? tr("Log") : QFileInfo(path).fileName();
     panel->setAccessibleName(name);
     connect(panel, &LogPanel::stateChanged, this, &FileTabs::stateChanged);
     connect(panel, &LogPanel::messageReported, this, &FileTabs::messageReported);
     if (!path.isEmpty())
         panel->Open(path, false);
-    setTabToolTip(addTab(panel, title), PlainToolTip(path));
+    setTabToolTip(addTab(panel, QString()), PlainToolTip(path));
     if (!path.isEmpty())
         addCloseButton(panel, name);
     return panel;
 }
 
-SettingsEditor* FileTabs::addEditor(QString const& title, QString const& path)
+SettingsEditor* FileTabs::addEditor(QString const& path)
 {
     auto* editor = new SettingsEditor;
     const QString name = QFileInfo(path).fileName();
     editor->setAccessibleName(name);
     editor->Open(path);
     connect(editor, &SettingsEditor::messageReported, this, &FileTabs::messageReported);
-    connect(editor, &SettingsEditor::modifiedChanged, this, [this, editor, title](bool modified) {
-        setTabText(indexOf(editor), modified ? title + QLatin1String(" *") : title);
-    });
+    connect(editor, &SettingsEditor::modifiedChanged, this, &FileTabs::stateChanged);
     connect(editor, &SettingsEditor::canSaveChanged, this, &FileTabs::stateChanged);
-    setTabToolTip(addTab(editor, title), PlainToolTip(path));
+    setTabToolTip(addTab(editor, QString()), PlainToolTip(path));
     addCloseButton(editor, name);
     return editor;
 }
@@ -110,17 +121,34 @@ int FileTabs::positionOf(QString const& path) const
 
 void FileTabs::OpenFile(QString const& path)
 {
-    QWidget* page = widget(positionOf(path));
-    if (!page && IsSettingsFile(path))
-        page = addEditor(TitleOf(path), path);
-    else if (!page)
-        page = addLog(TitleOf(path), path);
-    goTo(page);
+    goTo(pageOf(path));
+}
+
+void FileTabs::OpenInBackground(QString const& path)
+{
+    pageOf(path);
+    Q_EMIT stateChanged();
+}
+
+void FileTabs::GoTo(QString const& path)
+{
+    goTo(widget(std::max(0, positionOf(path))));
+}
+
+// The existing page of a file, or a new one.
+QWidget* FileTabs::pageOf(QString const& path)
+{
+    const int position = positionOf(path);
+    if (position >= 0)
+        return widget(position);
+    if (IsSettingsFile(path))
+        return addEditor(path);
+    return addLog(path);
 }
 
 LogPanel* FileTabs::OpenLog(QString const& path)
 {
-    LogPanel* panel = addLog(TitleOf(path), path);
+    LogPanel* panel = addLog(path);
     goTo(panel);
     return panel;
 }

@@ -25,6 +25,12 @@ public:
     /// A file that begins with "<" is treated as a settings file, any other as a log.
     void OpenFile(QString const& path);
 
+    /// Opens a file like OpenFile(), without going to its tab.
+    void OpenInBackground(QString const& path);
+
+    /// Goes to the tab of a file, or else to that of the program's log.
+    void GoTo(QString const& path);
+
     /// Shows a file as a log in a new tab.
     ///
     /// @return its panel, owned by the tabs
@@ -45,6 +51,9 @@ public:
     LogPanel* currentLog() const;
     SettingsEditor* currentEditor() const;
 
+    /// The file that a tab shows.
+    static QString PathOf(QWidget const* page);
+
     /// Whether a file looks like a settings file.
     static bool IsSettingsFile(QString const& path);
 
@@ -54,10 +63,12 @@ Q_SIGNALS:
     void messageReported(QString const& text);
 
 private:
-    LogPanel* addLog(QString const& title, QString const& path);
-    SettingsEditor* addEditor(QString const& title, QString const& path);
+    LogPanel* addLog(QString const& path);
+    SettingsEditor* addEditor(QString const& path);
+    QWidget* pageOf(QString const& path);
     void closeTab(int position);
     void goTo(QWidget* page);
+    void updateTitles();
     int positionOf(QString const& path) const;
     void addCloseButton(QWidget* page, QString const& name);
 

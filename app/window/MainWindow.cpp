@@ -3,6 +3,7 @@
 
 #include "app/window/MainWindow.h"
 
+#include "app/MruSeparator_p.h"
 #include "app/ScreenlessPlatform_p.h"
 #include "app/UserMessages.h"
 #include "app/runninglog/LogHealth.h"
@@ -119,6 +120,7 @@ void MainWindow::complete()
     restoreState();
     updateState();
     startWork();
+    reopenFiles();
     openFilesOfStart();
 }
 
@@ -261,6 +263,10 @@ void MainWindow::makeViewMenu()
     m_logActions.append(addAction(menu, tr("&Reload"), QKeySequence(tr("F5")),
                                   tr("Reload the file"),
                                   [this] { m_tabs->currentLog()->Reload(); }));
+    menu->addSeparator();
+    m_reopen =
+        addSwitch(menu, tr("Re&open Files at Start"), QKeySequence(tr("Ctrl+Alt+O")),
+                  tr("Open the files of these tabs again when the program starts"), [](bool) {});
 }
 
 void MainWindow::makeHelpMenu()
@@ -293,6 +299,7 @@ void MainWindow::restoreState()
     m_tabs->ownLog()->SetPaneSizes(m_settings.Numbers(QStringLiteral("linePane")));
     m_recent->SetList(m_settings.Text(QStringLiteral("recentFiles")));
     m_showPlaces->setChecked(m_settings.Flag(QStringLiteral("placesShown"), true));
+    m_reopen->setChecked(m_settings.Flag(QStringLiteral("reopenFiles"), true));
 }
 
 void MainWindow::saveState()
@@ -304,6 +311,12 @@ void MainWindow::saveState()
     m_settings.SetNumbers(QStringLiteral("columns"), m_tabs->ownLog()->columnWidths());
     m_settings.SetNumbers(QStringLiteral("linePane"), m_tabs->ownLog()->paneSizes());
     m_settings.SetText(QStringLiteral("recentFiles"), m_recent->list());
+    m_settings.SetFlag(QStringLiteral("reopenFiles"), m_reopen->isChecked());
+    const QStringList files = openFiles();
+    const QString current = FileTabs::PathOf(m_tabs->currentWidget());
+    m_settings.SetText(QStringLiteral("openFiles"), files.join(MruSeparator));
+    m_settings.SetText(QStringLiteral("currentFile"),
+                       files.contains(current) ? current : QString());
 
     // No message box: the window may be closing because of a system shutdown.
     const QString error = m_settings.Save();
@@ -330,6 +343,32 @@ void MainWindow::startWork()
     checkLog();
 }
 
+// Not standard input, which is gone, and no path that would read back as two.
+QStringList MainWindow::openFiles() const
+{
+    QStringList files;
+    for (int i = 1; i < m_tabs->count(); ++i) {
+        QWidget const* page = m_tabs->widget(i);
+        const QString path = FileTabs::PathOf(page);
+        if (!page->findChild<StandardInput*>() && !path.contains(MruSeparator) &&
+            path.size() <= RecentFiles::MaximumPathLength && files.size() < MaximumFilesAtStart)
+            files.append(path);
+    }
+    return files;
+}
+
+void MainWindow::reopenFiles()
+{
+    if (!m_reopen->isChecked())
+        return;
+    const QStringList files = m_settings.Text(QStringLiteral("openFiles")).split(MruSeparator);
+    for (QString const& file : files.mid(0, MaximumFilesAtStart)) {
+        if (QFileInfo(file).isAbsolute() && QFileInfo(file).isFile())
+            m_tabs->OpenInBackground(file);
+    }
+    m_tabs->GoTo(m_settings.Text(QStringLiteral("currentFile")));
+}
+
 void MainWindow::checkLog()
 {
     const QString problem = m_logHealth->Check();
@@ -340,8 +379,25 @@ void MainWindow::checkLog()
     m_health->setAccessibleDescription(problem);
 }
 
+void MainWindow::updateTitle()
+{
+    const QString caption = ApplicationProperty("caption");
+    QWidget const* page = m_tabs->currentWidget();
+    if (page == m_tabs->ownLog()) {
+        setWindowTitle(caption);
+        return;
+    }
+    QString name = QFileInfo(FileTabs::PathOf(page)).fileName();
+    if (m_tabs->currentEditor() && m_tabs->currentEditor()->isModified())
+        name += QLatin1String(" *");
+    // Qt replaces the placeholder, and a file may be called like it.
+    name.replace(QLatin1String("[*]"), QLatin1String("[*][*]"));
+    setWindowTitle(tr("%1 \u2013 %2").arg(name, caption));
+}
+
 void MainWindow::updateState()
 {
+    updateTitle();
     LogPanel const* log = m_tabs->currentLog();
     SettingsEditor const* editor = m_tabs->currentEditor();
     for (QAction* action : qAsConst(m_logActions))

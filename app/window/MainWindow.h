@@ -79,9 +79,12 @@ private:
     void restoreState();
     void saveState();
     void startWork();
+    void reopenFiles();
+    QStringList openFiles() const;
     void openFilesOfStart();
     QString openStandardInput();
     void updateState();
+    void updateTitle();
     void checkLog();
     void showMessage(QString const& text);
 
@@ -111,6 +114,7 @@ private:
     QAction* m_save = nullptr;
     QAction* m_close = nullptr;
     QAction* m_showPlaces = nullptr;
+    QAction* m_reopen = nullptr;
     QAction* m_earlierRuns = nullptr;
     QAction* m_pause = nullptr;
     QAction* m_follow = nullptr;

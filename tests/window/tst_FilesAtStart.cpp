@@ -1,11 +1,15 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Files that the window opens by itself: those of the command line, and standard input.
+// Files that the window opens by itself: those of the command line and of the last session, and
+// standard input; and what tabs and the window are called.
 
 #include "WindowParts.h"
 
+#include "app/window/DistinctNames.h"
+#include "app/window/settings/SettingsEditor.h"
 #include "app/window/widgets/NoticeBar.h"
+#include "app/window/widgets/PlainText.h"
 
 #include <QLoggingCategory>
 #include <QMenu>
@@ -107,6 +111,19 @@ private slots:
     void closingTheTabEndsStandardInput();
     void endOfStandardInputKeepsTheTab();
     void neverWaitsForStandardInput();
+
+    void reopensFiles();
+    void reopensOnlyWhatIsThere();
+    void reopensNothingWhenSwitchedOff();
+    void reopensNoStandardInput();
+    void opensGivenFilesAfterThoseOfTheSession();
+    void paintsBeforeItOpensFiles();
+
+    void distinctNames_data();
+    void distinctNames();
+    void tabsOfEqualNamesSayTheirFolder();
+    void titleSaysTheFile();
+    void boxesHaveTheCaption();
 };
 
 void tst_FilesAtStart::initTestCase()
@@ -225,6 +242,199 @@ void tst_FilesAtStart::neverWaitsForStandardInput()
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
     QTest::keyClick(window.get(), Qt::Key_P, Qt::ControlModifier | Qt::ShiftModifier);
     QVERIFY(Panel(*window)->isPaused());
+}
+
+// Logs and settings files, in their order, at the tab that was current.
+void tst_FilesAtStart::reopensFiles()
+{
+    const WindowTest test(run(2, QTime(9, 0), "x"));
+    const QString log = test.folder() + QString::fromUtf8("K\xC3\xB6ln & <b>.log");
+    const QString settings = test.folder() + "some.cfg";
+    const QString other = test.folder() + "other.log";
+    QVERIFY(TestFiles::write(log, run(500, QTime(9, 0), "y")));
+    QVERIFY(TestFiles::write(settings, Settings));
+    QVERIFY(TestFiles::write(other, run(7, QTime(9, 0), "z")));
+    QStringList texts;
+    {
+        const auto window = ShowWith({settings, log, other});
+        texts = TabTexts(*window);
+        QCOMPARE(texts.size(), 4);
+        window->findChild<FileTabs*>()->setCurrentIndex(2);
+        window->close();
+    }
+    const auto window = WindowTest::show();
+    QCOMPARE(TabTexts(*window), texts);
+    QCOMPARE(window->findChild<FileTabs*>()->currentIndex(), 2);
+    QCOMPARE(Panel(*window)->path(), log);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 500, Patience);
+    QVERIFY(View(*window)->hasFocus());
+    // One that was opened in the background follows its end as well.
+    window->findChild<FileTabs*>()->setCurrentIndex(3);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 7, Patience);
+}
+
+void tst_FilesAtStart::reopensOnlyWhatIsThere()
+{
+    const WindowTest test;
+    const QString pipe = test.folder() + "pipe.log";
+    const QString gone = test.folder() + "gone.log";
+    const QString kept = test.folder() + "kept.log";
+    for (QString const& file : {pipe, gone, kept})
+        QVERIFY(TestFiles::write(file, "x\n"));
+    {
+        const auto window = ShowWith({pipe, kept, gone});
+        QCOMPARE(TabTexts(*window).size(), 4);
+        window->close();
+    }
+    QVERIFY(QFile::remove(gone) && QFile::remove(pipe));
+    QCOMPARE(mkfifo(qPrintable(pipe), 0600), 0);
+    const auto window = WindowTest::show();
+    QCOMPARE(TabTexts(*window), QStringList({"Log", "kept.log"}));
+    QCOMPARE(window->findChild<FileTabs*>()->currentIndex(), 0);
+    QVERIFY(!window->findChild<NoticeBar*>()->isVisible());
+}
+
+void tst_FilesAtStart::reopensNothingWhenSwitchedOff()
+{
+    const WindowTest test;
+    const QString log = test.folder() + "some.log";
+    QVERIFY(TestFiles::write(log, "x\n"));
+    {
+        const auto window = ShowWith({log});
+        QVERIFY(Action(*window, "Reopen Files at Start")->isChecked());
+        QTest::keyClick(window.get(), Qt::Key_O, Qt::ControlModifier | Qt::AltModifier);
+        window->close();
+    }
+    const auto window = WindowTest::show();
+    QVERIFY(!Action(*window, "Reopen Files at Start")->isChecked());
+    QCOMPARE(TabTexts(*window), QStringList({"Log"}));
+}
+
+void tst_FilesAtStart::reopensNoStandardInput()
+{
+    const WindowTest test;
+    const InputPipe input;
+    {
+        const auto window = ShowWith({"-"});
+        QTRY_COMPARE_WITH_TIMEOUT(TabTexts(*window).size(), 2, Patience);
+        window->close();
+    }
+    QVERIFY(!TestFiles::read(test.settingsFile()).contains("<openFiles>/"));
+    const auto window = WindowTest::show();
+    QCOMPARE(TabTexts(*window), QStringList({"Log"}));
+}
+
+void tst_FilesAtStart::opensGivenFilesAfterThoseOfTheSession()
+{
+    const WindowTest test;
+    const QString first = test.folder() + "first.log";
+    const QString second = test.folder() + "second.log";
+    for (QString const& file : {first, second})
+        QVERIFY(TestFiles::write(file, "x\n"));
+    QVERIFY(ShowWith({first})->close());
+    const auto window = ShowWith({second});
+    QCOMPARE(TabTexts(*window), QStringList({"Log", "first.log", "second.log"}));
+    QCOMPARE(Panel(*window)->path(), second);
+}
+
+// The window is on the screen before any file is looked at.
+void tst_FilesAtStart::paintsBeforeItOpensFiles()
+{
+    const WindowTest test;
+    const QString log = test.folder() + "some.log";
+    QVERIFY(TestFiles::write(log, "x\n"));
+    QVERIFY(ShowWith({log})->close());
+
+    class FirstPaint : public QObject
+    {
+    public:
+        explicit FirstPaint(MainWindow& window) : m_window(window) {}
+        int tabs = -1;
+
+    protected:
+        bool eventFilter(QObject*, QEvent* event) override
+        {
+            if (event->type() == QEvent::Paint && tabs < 0)
+                tabs = m_window.findChildren<FileTabs*>().size();
+            return false;
+        }
+
+    private:
+        MainWindow& m_window;
+    };
+    MainWindow window;
+    FirstPaint paint(window);
+    window.installEventFilter(&paint);
+    window.show();
+    QTRY_COMPARE_WITH_TIMEOUT(window.findChildren<FileTabs*>().size(), 1, Patience);
+    QCOMPARE(paint.tabs, 0);
+}
+
+void tst_FilesAtStart::distinctNames_data()
+{
+    QTest::addColumn<QStringList>("paths");
+    QTest::addColumn<QString>("expected");
+
+    const auto row = [](char const* name, QStringList const& paths, char const* expected) {
+        QTest::newRow(name) << paths << QString(expected).replace(" - ", QString::fromUtf8(" – "));
+    };
+    row("none", {}, "");
+    row("different names", {"/a/x.log", "/a/y.log"}, "x.log|y.log");
+    row("different folders", {"/srv/web/a.log", "/srv/db/a.log"}, "a.log - web|a.log - db");
+    row("others stay short", {"/w/a.log", "/b.log", "/d/a.log"}, "a.log - w|b.log|a.log - d");
+    row("folders of equal names", {"/x/logs/a.log", "/y/logs/a.log"},
+        "a.log - x/logs|a.log - y/logs");
+    row("one in the root", {"/a.log", "/x/a.log"}, "a.log - /|a.log - x");
+    row("one below the other", {"/x/a.log", "/y/x/a.log"}, "a.log - /x|a.log - y/x");
+    row("case makes a difference", {"/x/a.log", "/x/A.log"}, "a.log|A.log");
+}
+
+void tst_FilesAtStart::distinctNames()
+{
+    QFETCH(QStringList, paths);
+    QFETCH(QString, expected);
+    QCOMPARE(DistinctNames(paths).join('|'), expected);
+}
+
+void tst_FilesAtStart::tabsOfEqualNamesSayTheirFolder()
+{
+    const WindowTest test;
+    const QString web = test.folder() + "web/a.log";
+    const QString db = test.folder() + "db/a.log";
+    QVERIFY(TestFiles::write(web, "x\n") && TestFiles::write(db, "x\n"));
+    const auto window = ShowWith({web, db});
+    QCOMPARE(TabTexts(*window), QStringList({"Log", QString::fromUtf8("a.log – web"),
+                                             QString::fromUtf8("a.log – db")}));
+    QTest::keyClick(window.get(), Qt::Key_W, Qt::ControlModifier);
+    QCOMPARE(TabTexts(*window), QStringList({"Log", "a.log"}));
+}
+
+void tst_FilesAtStart::titleSaysTheFile()
+{
+    const WindowTest test;
+    const QString log = test.folder() + "%1 [*].log";
+    const QString settings = test.folder() + "some.cfg";
+    QVERIFY(TestFiles::write(log, "x\n") && TestFiles::write(settings, Settings));
+    const auto window = ShowWith({log});
+    QCOMPARE(window->windowTitle(), QString::fromUtf8("%1 [*][*].log – Caption"));
+    window->findChild<FileTabs*>()->setCurrentIndex(0);
+    QCOMPARE(window->windowTitle(), QString("Caption"));
+    window->OpenFile(settings);
+    QCOMPARE(window->windowTitle(), QString::fromUtf8("some.cfg – Caption"));
+    QTest::keyClick(window.get(), Qt::Key_W, Qt::ControlModifier);
+    QCOMPARE(TabTexts(*window).size(), 2);
+    QVERIFY(window->windowTitle().endsWith("Caption"));
+}
+
+void tst_FilesAtStart::boxesHaveTheCaption()
+{
+    const WindowTest test;
+    const QString log = test.folder() + "some.log";
+    QVERIFY(TestFiles::write(log, "x\n"));
+    const auto window = ShowWith({log});
+    QVERIFY(window->windowTitle() != "Caption");
+    QCOMPARE(PlainMessageBox(QMessageBox::Critical, window.get(), "text").windowTitle(),
+             QString("Caption"));
 }
 
 QTEST_MAIN(tst_FilesAtStart)
