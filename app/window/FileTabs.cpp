@@ -7,6 +7,7 @@
 #include "app/window/log/LogPanel.h"
 #include "app/window/settings/SettingsEditor.h"
 #include "app/window/widgets/PlainText.h"
+#include "app/window/widgets/SeverityIcons.h"
 
 #include <QFile>
 #include <QFileInfo>
@@ -21,6 +22,9 @@ FileTabs::FileTabs(QWidget* parent) : QTabWidget(parent)
 {
     setDocumentMode(true);
     setTabBarAutoHide(true);
+    // Tab would go to the bar even while that is hidden, and stay where it is.
+    setFocusProxy(nullptr);
+    setFocusPolicy(Qt::NoFocus);
     setMovable(false);
     setElideMode(Qt::ElideMiddle);
     setAccessibleName(tr("Open files"));
@@ -190,6 +194,12 @@ bool FileTabs::MayCloseAll()
             return false;
     }
     return true;
+}
+
+void FileTabs::MarkOwnLog(bool marked)
+{
+    if (tabIcon(0).isNull() == marked)
+        setTabIcon(0, marked ? SeverityIcons::Icon(LogEntry::Warning, palette()) : QIcon());
 }
 
 LogPanel* FileTabs::currentLog() const

@@ -47,6 +47,9 @@ public:
     /// The panel of the program's own log.
     LogPanel* ownLog() const { return m_ownLog; }
 
+    /// Marks the tab of the program's log: there is a problem with it.
+    void MarkOwnLog(bool marked);
+
     /// The content of the current tab; null if it is of the other type.
     LogPanel* currentLog() const;
     SettingsEditor* currentEditor() const;

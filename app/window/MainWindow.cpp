@@ -10,10 +10,13 @@
 #include "app/runninglog/RunningLog.h"
 #include "app/window/ApplicationProperty.h"
 #include "app/window/FileTabs.h"
+#include "app/window/MainToolBar.h"
+#include "app/window/Manual.h"
 #include "app/window/PlacesPanel.h"
 #include "app/window/RecentFiles.h"
 #include "app/window/ReportDialog.h"
 #include "app/window/SelectableMessageBoxes.h"
+#include "app/window/ShortcutList.h"
 #include "app/window/StandardInput.h"
 #include "app/window/SystemReport.h"
 #include "app/window/log/LogPanel.h"
@@ -62,8 +65,7 @@ QIcon WindowIcon()
 } // namespace
 
 MainWindow::MainWindow(QWidget* parent)
-    : QMainWindow(parent), m_settings(ApplicationProperty("DataPath")), m_splitter(new QSplitter),
-      m_places(new PlacesPanel(m_settings.fileName()))
+    : QMainWindow(parent), m_settings(ApplicationProperty("DataPath"))
 {
     setWindowTitle(ApplicationProperty("caption"));
     setAcceptDrops(true);
@@ -86,20 +88,6 @@ MainWindow::~MainWindow()
 // The menu bar exists from the start, so that nothing moves when the menus are filled.
 void MainWindow::makeFirstContent()
 {
-    m_splitter->setAccessibleName(tr("Places and files"));
-    m_splitter->setChildrenCollapsible(false);
-    m_splitter->addWidget(m_places);
-    m_splitter->addWidget(new QWidget);
-    m_splitter->setStretchFactor(1, 1);
-    m_splitter->setSizes({250, 750});
-
-    auto* content = new QWidget;
-    auto* layout = new QVBoxLayout(content);
-    layout->setContentsMargins(0, 0, 0, 0);
-    layout->setSpacing(0);
-    layout->addWidget(m_splitter, 1);
-    setCentralWidget(content);
-
     menuBar()->setAccessibleName(tr("Menus"));
     for (QString const& title : {tr("&File"), tr("&Edit"), tr("&View"), tr("&Help")})
         m_menus.append(menuBar()->addMenu(title));
@@ -111,12 +99,13 @@ void MainWindow::complete()
         return;
     InitializeResources();
     QGuiApplication::setWindowIcon(WindowIcon());
+    QCoreApplication::setAttribute(Qt::AA_UseHighDpiPixmaps); // or icons are scaled up
     QGuiApplication::setDesktopFileName(QStringLiteral("org.tork.velocor"));
     new SelectableMessageBoxes(this);
-    m_places->AddButtons();
     makeTabs();
     makeStatusBar();
     makeMenus();
+    makeToolBar();
     restoreState();
     updateState();
     startWork();
@@ -127,14 +116,23 @@ void MainWindow::complete()
 void MainWindow::makeTabs()
 {
     m_notice = new NoticeBar;
-    static_cast<QVBoxLayout*>(centralWidget()->layout())->insertWidget(0, m_notice);
-    const QList<int> sizes = m_splitter->sizes();
     m_tabs = new FileTabs;
-    delete m_splitter->replaceWidget(1, m_tabs);
-    m_tabs->show();
-    m_splitter->setStretchFactor(1, 1);
-    m_splitter->setSizes(sizes);
-    connect(m_places, &PlacesPanel::messageReported, this, &MainWindow::showMessage);
+    m_splitter = new QSplitter;
+    m_splitter->setAccessibleName(tr("Places and files"));
+    m_splitter->setChildrenCollapsible(false);
+    m_splitter->addWidget(m_tabs);
+
+    auto* content = new QWidget;
+    auto* layout = new QVBoxLayout(content);
+    layout->setContentsMargins(0, 0, 0, 0);
+    layout->setSpacing(0);
+    layout->addWidget(m_notice);
+    layout->addWidget(m_splitter, 1);
+    setCentralWidget(content);
+    content->show(); // Qt would do it in the next turn of the event loop
+
+    m_health = new NoticeBar(tr("State of the log"));
+    m_tabs->ownLog()->AddBar(m_health);
     connect(m_tabs, &FileTabs::messageReported, this, &MainWindow::showMessage);
     connect(m_tabs, &FileTabs::stateChanged, this, &MainWindow::updateState);
     m_tabs->ownLog()->setFocus();
@@ -142,24 +140,46 @@ void MainWindow::makeTabs()
 
 void MainWindow::makeStatusBar()
 {
-    m_health = new ElidedLabel(Qt::ElideRight);
     m_summary = new ElidedLabel(Qt::ElideMiddle);
-    m_health->setAccessibleName(tr("State of the log"));
-    m_health->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
-    m_health->setContentsMargins(6, 0, 0, 0);
     m_summary->setAccessibleName(tr("Lines shown"));
-    m_summary->setContentsMargins(18, 0, 6, 0);
+    m_summary->setContentsMargins(6, 0, 6, 0);
+    m_summary->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
     statusBar()->setAccessibleName(tr("Status"));
-    statusBar()->addWidget(m_health, 1);
-    statusBar()->addWidget(m_summary); // not permanent, to leave all room to messages
-    limitSummary();
+    statusBar()->addWidget(m_summary, 1); // not permanent, to leave all room to messages
 }
 
-// The path of a settings file may be longer than the window is wide.
-void MainWindow::limitSummary()
+void MainWindow::makeToolBar()
 {
-    if (m_summary)
-        m_summary->setMaximumWidth(width() / 2);
+    m_toolBar = new MainToolBar;
+    m_toolBar->AddTool(m_open, ActionIcons::Open);
+    m_toolBar->addSeparator();
+    m_toolBar->AddTool(m_reload, ActionIcons::Reload);
+    m_toolBar->AddTool(m_pause, ActionIcons::Pause);
+    m_toolBar->AddTool(m_follow, ActionIcons::Follow);
+    m_toolBar->addSeparator();
+    m_toolBar->AddTool(m_previousProblem, ActionIcons::PreviousProblem);
+    m_toolBar->AddTool(m_nextProblem, ActionIcons::NextProblem);
+    m_toolBar->addSeparator();
+    m_toolBar->AddTool(m_filter, ActionIcons::Filter);
+    m_toolBar->AddSpace();
+    m_toolBar->AddTool(m_showPlaces, ActionIcons::Places);
+    addToolBar(m_toolBar);
+}
+
+// Made when they are shown for the first time.
+void MainWindow::showPlaces(bool shown)
+{
+    m_showPlaces->setChecked(shown);
+    if (shown && !m_places) {
+        m_places = new PlacesPanel(m_settings.fileName());
+        connect(m_places, &PlacesPanel::messageReported, this, &MainWindow::showMessage);
+        m_splitter->insertWidget(0, m_places);
+        m_splitter->setStretchFactor(1, 1);
+        const QList<int> sizes = m_settings.Numbers(QStringLiteral("panes"));
+        m_splitter->setSizes(sizes.size() == m_splitter->count() ? sizes : QList<int>{280, 800});
+    }
+    if (m_places)
+        m_places->setVisible(shown);
 }
 
 QAction* MainWindow::addAction(QMenu* menu, QString const& text, QKeySequence const& shortcut,
@@ -193,8 +213,8 @@ void MainWindow::makeMenus()
 void MainWindow::makeFileMenu()
 {
     QMenu* menu = m_menus.at(0);
-    addAction(menu, tr("&Open..."), QKeySequence::Open, tr("Open a log file or a settings file"),
-              [this] { chooseFile(); });
+    m_open = addAction(menu, tr("&Open..."), QKeySequence::Open,
+                       tr("Open a log file or a settings file"), [this] { chooseFile(); });
     m_recentMenu = menu->addMenu(tr("Open &Recent"));
     m_recent = new RecentFiles(m_recentMenu, this);
     connect(m_recent, &RecentFiles::fileChosen, this, &MainWindow::OpenFile);
@@ -221,9 +241,10 @@ void MainWindow::makeEditMenu()
     addAction(menu, tr("Select &All"), QKeySequence::SelectAll, tr("Select all lines"),
               [this] { selectAll(); });
     menu->addSeparator();
-    m_logActions.append(addAction(menu, tr("&Filter"), QKeySequence::Find,
-                                  tr("Show only lines that contain the filter text"),
-                                  [this] { m_tabs->currentLog()->FocusFilter(); }));
+    m_filter = addAction(menu, tr("&Filter"), QKeySequence::Find,
+                         tr("Show only lines that contain the filter text"),
+                         [this] { m_tabs->currentLog()->FocusFilter(); });
+    m_logActions.append(m_filter);
     m_logActions.append(addAction(menu, tr("Clear Fi&lter"), QKeySequence(tr("Ctrl+Shift+F")),
                                   tr("Show all lines again"),
                                   [this] { m_tabs->currentLog()->ClearFilter(); }));
@@ -239,8 +260,10 @@ void MainWindow::makeViewMenu()
     QMenu* menu = m_menus.at(2);
     m_showPlaces = addSwitch(menu, tr("&Places"), QKeySequence(tr("F9")),
                              tr("Show program identity and file locations"),
-                             [this](bool shown) { m_places->setVisible(shown); });
-    m_showPlaces->setChecked(true);
+                             [this](bool shown) { showPlaces(shown); });
+    m_showToolBar =
+        addSwitch(menu, tr("&Tool Bar"), QKeySequence(tr("Ctrl+Alt+B")), tr("Show the tool bar"),
+                  [this](bool shown) { m_toolBar->setVisible(shown); });
     menu->addSeparator();
     m_earlierRuns = addSwitch(menu, tr("&Earlier Runs"), QKeySequence(tr("Ctrl+Shift+E")),
                               tr("Show entries from earlier runs"),
@@ -253,16 +276,16 @@ void MainWindow::makeViewMenu()
                          [this](bool follow) { m_tabs->currentLog()->SetFollowing(follow); });
     menu->addSeparator();
     m_logActions += {m_earlierRuns, m_pause, m_follow};
-    m_logActions.append(addAction(menu, tr("&Next Problem"), QKeySequence(tr("F8")),
-                                  tr("Go to the next warning or error"),
-                                  [this] { m_tabs->currentLog()->GoToProblem(1); }));
-    m_logActions.append(addAction(menu, tr("Pre&vious Problem"), QKeySequence(tr("Shift+F8")),
+    m_nextProblem = addAction(menu, tr("&Next Problem"), QKeySequence(tr("F8")),
+                              tr("Go to the next warning or error"),
+                              [this] { m_tabs->currentLog()->GoToProblem(1); });
+    m_previousProblem = addAction(menu, tr("Pre&vious Problem"), QKeySequence(tr("Shift+F8")),
                                   tr("Go to the previous warning or error"),
-                                  [this] { m_tabs->currentLog()->GoToProblem(-1); }));
+                                  [this] { m_tabs->currentLog()->GoToProblem(-1); });
     menu->addSeparator();
-    m_logActions.append(addAction(menu, tr("&Reload"), QKeySequence(tr("F5")),
-                                  tr("Reload the file"),
-                                  [this] { m_tabs->currentLog()->Reload(); }));
+    m_reload = addAction(menu, tr("&Reload"), QKeySequence(tr("F5")), tr("Reload the file"),
+                         [this] { m_tabs->currentLog()->Reload(); });
+    m_logActions += {m_nextProblem, m_previousProblem, m_reload};
     menu->addSeparator();
     m_reopen =
         addSwitch(menu, tr("Re&open Files at Start"), QKeySequence(tr("Ctrl+Alt+O")),
@@ -272,9 +295,14 @@ void MainWindow::makeViewMenu()
 void MainWindow::makeHelpMenu()
 {
     QMenu* menu = m_menus.at(3);
-    QAction* about =
-        addAction(menu, tr("&About %1").arg(QStringLiteral("Velocor")), QKeySequence(tr("F1")),
-                  tr("Show versions, system and directories"), [this] { showAbout(); });
+    addAction(menu, tr("&Manual"), QKeySequence(tr("F1")), tr("Open the manual"),
+              [this] { showManual(); });
+    addAction(menu, tr("&Keyboard Shortcuts"), QKeySequence(tr("Ctrl+F1")),
+              tr("List all keyboard shortcuts"), [this] { showShortcuts(); });
+    menu->addSeparator();
+    QAction* about = addAction(
+        menu, tr("&About %1").arg(QStringLiteral("Velocor")), QKeySequence(tr("Shift+F1")),
+        tr("Show version, license, system and directories"), [this] { showAbout(); });
     about->setMenuRole(QAction::AboutRole);
 }
 
@@ -285,10 +313,6 @@ void MainWindow::restoreFirstState()
 
     m_startupMessage = m_settings.Load();
     m_settings.RestoreGeometry(this);
-    const QList<int> sizes = m_settings.Numbers(QStringLiteral("panes"));
-    if (sizes.size() == m_splitter->count())
-        m_splitter->setSizes(sizes);
-    m_places->setVisible(m_settings.Flag(QStringLiteral("placesShown"), true));
 }
 
 void MainWindow::restoreState()
@@ -298,7 +322,10 @@ void MainWindow::restoreState()
     m_tabs->ownLog()->SetColumnWidths(m_settings.Numbers(QStringLiteral("columns")));
     m_tabs->ownLog()->SetPaneSizes(m_settings.Numbers(QStringLiteral("linePane")));
     m_recent->SetList(m_settings.Text(QStringLiteral("recentFiles")));
-    m_showPlaces->setChecked(m_settings.Flag(QStringLiteral("placesShown"), true));
+    showPlaces(m_settings.Flag(QStringLiteral("placesShown"), false));
+    const bool toolBarShown = m_settings.Flag(QStringLiteral("toolBarShown"), true);
+    m_showToolBar->setChecked(toolBarShown);
+    m_toolBar->setVisible(toolBarShown);
     m_reopen->setChecked(m_settings.Flag(QStringLiteral("reopenFiles"), true));
 }
 
@@ -308,6 +335,7 @@ void MainWindow::saveState()
     m_settings.SetFlag(QStringLiteral("placesShown"), m_showPlaces->isChecked());
     if (m_showPlaces->isChecked())
         m_settings.SetNumbers(QStringLiteral("panes"), m_splitter->sizes());
+    m_settings.SetFlag(QStringLiteral("toolBarShown"), m_showToolBar->isChecked());
     m_settings.SetNumbers(QStringLiteral("columns"), m_tabs->ownLog()->columnWidths());
     m_settings.SetNumbers(QStringLiteral("linePane"), m_tabs->ownLog()->paneSizes());
     m_settings.SetText(QStringLiteral("recentFiles"), m_recent->list());
@@ -372,11 +400,8 @@ void MainWindow::reopenFiles()
 void MainWindow::checkLog()
 {
     const QString problem = m_logHealth->Check();
-    if (problem == m_health->text())
-        return;
-    m_health->setText(problem);
-    m_health->setToolTip(PlainToolTip(problem));
-    m_health->setAccessibleDescription(problem);
+    m_health->SetState(problem);
+    m_tabs->MarkOwnLog(!problem.isEmpty());
 }
 
 void MainWindow::updateTitle()
@@ -531,8 +556,24 @@ void MainWindow::showAbout()
     ReportDialog dialog(tr("About %1").arg(QStringLiteral("Velocor")),
                         QStringLiteral("Velocor %1\n").arg(QLatin1String(VELOCOR_VERSION)) +
                             tr("The startup program of the Tork family. MIT license."),
-                        SystemReport::Facts(m_settings.fileName()), false, this);
+                        SystemReport::Licenses() + SystemReport::Facts(m_settings.fileName()),
+                        false, this);
     dialog.exec();
+}
+
+void MainWindow::showShortcuts()
+{
+    ReportDialog dialog(tr("Keyboard Shortcuts"),
+                        tr("Alt and the underlined letter open a menu; Tab goes from one control "
+                           "to the next."),
+                        ShortcutList(this), false, this);
+    dialog.exec();
+}
+
+void MainWindow::showManual()
+{
+    if (!OpenManual())
+        showMessage(tr("The manual is not installed, or there is no program to show it"));
 }
 
 void MainWindow::changeLogSettings()
@@ -561,12 +602,6 @@ void MainWindow::selectAll()
         QMetaObject::invokeMethod(focused, "selectAll");
     else if (LogPanel* log = m_tabs->currentLog())
         log->SelectAll();
-}
-
-void MainWindow::resizeEvent(QResizeEvent* event)
-{
-    QMainWindow::resizeEvent(event);
-    limitSummary();
 }
 
 void MainWindow::closeEvent(QCloseEvent* event)

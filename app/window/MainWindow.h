@@ -19,6 +19,7 @@ namespace Velocor {
 class ElidedLabel;
 class FileTabs;
 class LogHealth;
+class MainToolBar;
 class NoticeBar;
 class PlacesPanel;
 class RecentFiles;
@@ -27,9 +28,8 @@ class RecentFiles;
 /// files, the log settings, and reports for bugs.
 ///
 /// Reads the application object's properties and the log when it is constructed, so create it after
-/// both are set up. It writes no log entries at startup. To show up quickly, it has only the
-/// identity and locations for its first paint; everything else is created right after that or on
-/// demand.
+/// both are set up. It writes no log entries at startup. To show up quickly, it has only the menu
+/// titles for its first paint; everything else is created right after that or on demand.
 class MainWindow : public QMainWindow
 {
     Q_OBJECT
@@ -54,7 +54,6 @@ public:
 
 protected:
     bool event(QEvent* event) override;
-    void resizeEvent(QResizeEvent* event) override;
     void closeEvent(QCloseEvent* event) override;
     void dragEnterEvent(QDragEnterEvent* event) override;
     void dropEvent(QDropEvent* event) override;
@@ -64,7 +63,8 @@ private:
     void complete();
     void makeTabs();
     void makeStatusBar();
-    void limitSummary();
+    void makeToolBar();
+    void showPlaces(bool shown);
     void makeMenus();
     void makeFileMenu();
     void makeEditMenu();
@@ -93,6 +93,8 @@ private:
     void openLogFolder();
     void saveReport();
     void showAbout();
+    void showShortcuts();
+    void showManual();
     void changeLogSettings();
     void copy();
     void selectAll();
@@ -102,19 +104,26 @@ private:
     QStringList m_filesOfStart;
     QString m_startupMessage; ///< about a damaged settings file
     NoticeBar* m_notice = nullptr;
-    QSplitter* m_splitter;
-    PlacesPanel* m_places;
+    NoticeBar* m_health = nullptr; ///< above the program's log
+    QSplitter* m_splitter = nullptr;
+    PlacesPanel* m_places = nullptr; ///< null until they are shown
+    MainToolBar* m_toolBar = nullptr;
     FileTabs* m_tabs = nullptr; ///< null until the window is complete
     ElidedLabel* m_summary = nullptr;
-    ElidedLabel* m_health = nullptr;
     QList<QMenu*> m_menus; ///< in menu bar order
     QMenu* m_recentMenu = nullptr;
     RecentFiles* m_recent = nullptr;
 
+    QAction* m_open = nullptr;
     QAction* m_save = nullptr;
     QAction* m_close = nullptr;
     QAction* m_showPlaces = nullptr;
+    QAction* m_showToolBar = nullptr;
     QAction* m_reopen = nullptr;
+    QAction* m_filter = nullptr;
+    QAction* m_nextProblem = nullptr;
+    QAction* m_previousProblem = nullptr;
+    QAction* m_reload = nullptr;
     QAction* m_earlierRuns = nullptr;
     QAction* m_pause = nullptr;
     QAction* m_follow = nullptr;

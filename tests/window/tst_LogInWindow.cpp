@@ -24,6 +24,7 @@
 #include <QSpinBox>
 #include <QStatusBar>
 #include <QToolButton>
+#include <QTreeView>
 
 using namespace Velocor;
 using namespace WindowParts;
@@ -80,6 +81,9 @@ private slots:
     void logSettingsRefused();
 
     void logSwitchedOff();
+    void stateOfTheLogCanBeDismissed();
+    void rowsAreAlikeEverywhere();
+    void emptyTableSaysWhatToDo();
 };
 
 void tst_LogInWindow::initTestCase()
@@ -574,9 +578,62 @@ void tst_LogInWindow::logSwitchedOff()
     TorkLog::logger()->setEnable(false);
     const auto window = WindowTest::show();
     auto const* state = Child<QLabel>(window.get(), "State of the log");
+    auto* tabs = window->findChild<FileTabs*>();
     QTRY_COMPARE_WITH_TIMEOUT(state->text(), QString("Logging is off"), Patience);
+    QVERIFY(state->isVisible());
+    QVERIFY(!tabs->tabIcon(0).isNull());
+    QVERIFY(state->mapToGlobal(QPoint()).y() < View(*window)->mapToGlobal(QPoint()).y());
     TorkLog::logger()->setEnable(true);
     QTRY_COMPARE_WITH_TIMEOUT(state->text(), QString(), Patience);
+    QVERIFY(!state->isVisible());
+    QVERIFY(tabs->tabIcon(0).isNull());
+}
+
+// Until it changes; it is in nobody's way in between.
+void tst_LogInWindow::stateOfTheLogCanBeDismissed()
+{
+    const WindowTest test;
+    TorkLog::logger()->setEnable(false);
+    const auto window = WindowTest::show();
+    auto const* state = Child<QLabel>(window.get(), "State of the log");
+    QTRY_VERIFY_WITH_TIMEOUT(state->isVisible(), Patience);
+    Click(Child<QAbstractButton>(window.get(), "Dismiss state of the log"));
+    QVERIFY(!state->isVisible());
+    QTest::qWait(2500); // it has been checked again
+    QVERIFY(!state->isVisible());
+    TorkLog::logger()->setEnable(true);
+    QTest::qWait(2500);
+    TorkLog::logger()->setEnable(false);
+    QTRY_VERIFY_WITH_TIMEOUT(state->isVisible(), Patience);
+    TorkLog::logger()->setEnable(true);
+}
+
+void tst_LogInWindow::rowsAreAlikeEverywhere()
+{
+    const WindowTest test(run(5, QTime(9, 0), "x"));
+    QVERIFY(TestFiles::write(test.folder() + "some.cfg", Settings));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    LogView const* view = View(*window);
+    window->OpenFile(test.folder() + "some.cfg");
+    auto const* tree = Child<QTreeView>(window.get(), "Settings");
+    QCOMPARE(tree->visualRect(tree->model()->index(0, 0)).height(), view->rowHeight(0));
+    QVERIFY(tree->alternatingRowColors() && view->alternatingRowColors());
+}
+
+void tst_LogInWindow::emptyTableSaysWhatToDo()
+{
+    const WindowTest test(run(5, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier);
+    QTest::keyClicks(QApplication::focusWidget(), "nowhere");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 0, Patience);
+    QTRY_COMPARE(View(*window)->accessibleDescription(),
+                 QString("No lines match the filter.\nClear it with Ctrl+Shift+F."));
+    QTest::keyClick(QApplication::focusWidget(), Qt::Key_F,
+                    Qt::ControlModifier | Qt::ShiftModifier);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
 }
 
 QTEST_MAIN(tst_LogInWindow)

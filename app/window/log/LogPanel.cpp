@@ -12,7 +12,6 @@
 #include "app/window/widgets/FileSizeText.h"
 #include "app/window/widgets/PlainText.h"
 
-#include <QCheckBox>
 #include <QComboBox>
 #include <QFileInfo>
 #include <QHBoxLayout>
@@ -45,13 +44,17 @@ public:
 
 LogPanel::LogPanel(QWidget* parent)
     : QWidget(parent), m_model(new LogModel(this)), m_view(new LogView(m_model)),
-      m_filterBar(new LogFilterBar), m_pause(new QCheckBox(tr("Pause"))),
-      m_follow(new QCheckBox(tr("Follow newest"))), m_splitter(new QSplitter(Qt::Vertical))
+      m_filterBar(new LogFilterBar), m_splitter(new QSplitter(Qt::Vertical))
 {
     makeControls();
     makeLayout();
     connectAll();
-    setFocusProxy(m_view);
+}
+
+// Not a focus proxy: coming from the widget before this one, Tab would skip all up to the table.
+void LogPanel::focusInEvent(QFocusEvent*)
+{
+    m_view->setFocus();
 }
 
 void LogPanel::makeControls()
@@ -65,11 +68,6 @@ void LogPanel::makeControls()
     m_files->setToolTip(PlainToolTip(tr("The current log file and older log files")));
     m_files->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon);
     m_files->setMinimumContentsLength(16);
-
-    m_pause->setToolTip(
-        PlainToolTip(tr("Stop updating the view while logging continues (Ctrl+Shift+P)")));
-    m_follow->setToolTip(PlainToolTip(tr("Scroll to new entries as they arrive (Ctrl+Shift+N)")));
-    m_follow->setChecked(true);
 
     m_line = new QPlainTextEdit;
     m_line->setReadOnly(true);
@@ -87,8 +85,6 @@ void LogPanel::makeLayout()
     top->setSpacing(8);
     top->addWidget(label);
     top->addWidget(m_files, 1);
-    top->addWidget(m_pause);
-    top->addWidget(m_follow);
 
     m_splitter->setAccessibleName(tr("Log entries and current line"));
     m_splitter->setChildrenCollapsible(false);
@@ -109,16 +105,11 @@ void LogPanel::makeLayout()
 void LogPanel::connectAll()
 {
     connect(m_files, QOverload<int>::of(&QComboBox::activated), this, &LogPanel::chooseFile);
-    connect(m_pause, &QCheckBox::toggled, this, &LogPanel::SetPaused);
-    connect(m_follow, &QCheckBox::toggled, this, &LogPanel::SetFollowing);
     connect(m_filterBar, &LogFilterBar::filterChanged, this, [this] {
         m_model->SetFilter(m_filterBar->filter());
         m_view->UpdateMarks();
     });
-    connect(m_view, &LogView::followingChanged, this, [this](bool following) {
-        m_follow->setChecked(following);
-        Q_EMIT stateChanged();
-    });
+    connect(m_view, &LogView::followingChanged, this, &LogPanel::stateChanged);
     connect(m_view->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
             &LogPanel::showCurrentLine);
     connect(m_model, &LogModel::refreshed, this, [this] {
@@ -183,7 +174,6 @@ void LogPanel::Reload()
 void LogPanel::SetPaused(bool paused)
 {
     m_model->SetPaused(paused);
-    m_pause->setChecked(paused);
     Q_EMIT stateChanged();
 }
 
@@ -195,7 +185,6 @@ bool LogPanel::isPaused() const
 void LogPanel::SetFollowing(bool following)
 {
     m_view->SetFollowing(following);
-    m_follow->setChecked(following);
 }
 
 bool LogPanel::isFollowing() const
@@ -211,6 +200,12 @@ void LogPanel::SetEarlierRuns(bool shown)
 bool LogPanel::showsEarlierRuns() const
 {
     return m_filterBar->filter().earlierRuns();
+}
+
+void LogPanel::AddBar(QWidget* bar)
+{
+    auto* all = static_cast<QVBoxLayout*>(layout());
+    all->insertWidget(all->indexOf(m_splitter), bar);
 }
 
 void LogPanel::FocusFilter()
@@ -287,11 +282,12 @@ void LogPanel::updatePlaceholder()
     else if (!state.error.isEmpty())
         m_view->SetPlaceholder(tr("Cannot read %1:\n%2").arg(path(), state.error));
     else if (!state.exists)
-        m_view->SetPlaceholder(tr("%1 does not exist.").arg(path()));
+        m_view->SetPlaceholder(
+            tr("%1 does not exist.\nIt is shown here as soon as it is created.").arg(path()));
     else if (state.lines > 0)
-        m_view->SetPlaceholder(tr("No lines match the filter."));
+        m_view->SetPlaceholder(tr("No lines match the filter.\nClear it with Ctrl+Shift+F."));
     else
-        m_view->SetPlaceholder(tr("The log is empty."));
+        m_view->SetPlaceholder(tr("The log is empty.\nNew lines appear here as they are written."));
 }
 
 void LogPanel::showCurrentLine()

@@ -7,7 +7,6 @@
 #include <QString>
 #include <QWidget>
 
-class QCheckBox;
 class QComboBox;
 class QPlainTextEdit;
 class QSplitter;
@@ -45,6 +44,9 @@ public:
     void SetEarlierRuns(bool shown);
     bool showsEarlierRuns() const;
 
+    /// Adds a bar above the table. The panel takes ownership.
+    void AddBar(QWidget* bar);
+
     void FocusFilter();
     void ClearFilter();
     void CopySelected();
@@ -75,6 +77,9 @@ Q_SIGNALS:
     /// A message for the status bar.
     void messageReported(QString const& text);
 
+protected:
+    void focusInEvent(QFocusEvent* event) override;
+
 private:
     void makeControls();
     void makeLayout();
@@ -89,8 +94,6 @@ private:
     LogView* m_view;
     LogFilterBar* m_filterBar;
     QComboBox* m_files = nullptr;
-    QCheckBox* m_pause;
-    QCheckBox* m_follow;
     QPlainTextEdit* m_line = nullptr;
     QSplitter* m_splitter;
     QString m_currentPath; // the log of the running program; empty for other logs

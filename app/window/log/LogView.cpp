@@ -7,6 +7,7 @@
 #include "app/logfile/LogSeverities.h"
 #include "app/window/log/LogDelegate.h"
 #include "app/window/log/LogModel.h"
+#include "app/window/widgets/RowHeight.h"
 
 #include <QAbstractButton>
 #include <QClipboard>
@@ -45,6 +46,7 @@ void LogView::setUp()
     setVerticalScrollMode(ScrollPerItem);
     setHorizontalScrollMode(ScrollPerPixel);
     setTextElideMode(Qt::ElideRight);
+    setAlternatingRowColors(true);
     verticalHeader()->hide();
     verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
     horizontalHeader()->setStretchLastSection(true);
@@ -61,7 +63,7 @@ void LogView::setUp()
 void LogView::setRowHeight()
 {
     verticalHeader()->setMinimumSectionSize(1);
-    verticalHeader()->setDefaultSectionSize(fontMetrics().height() + 6);
+    verticalHeader()->setDefaultSectionSize(RowHeight(fontMetrics()));
 }
 
 void LogView::SetDefaultWidths()
