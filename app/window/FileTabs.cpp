@@ -81,6 +81,8 @@ LogPanel* FileTabs::addLog(QString const& path)
     panel->setAccessibleName(name);
     connect(panel, &LogPanel::stateChanged, this, &FileTabs::stateChanged);
     connect(panel, &LogPanel::messageReported, this, &FileTabs::messageReported);
+    connect(panel, &LogPanel::zoomRequested, this, &FileTabs::zoomRequested);
+    panel->SetTextFont(m_textFont);
     if (!path.isEmpty())
         panel->Open(path, false);
     setTabToolTip(addTab(panel, QString()), PlainToolTip(path));
@@ -194,6 +196,15 @@ bool FileTabs::MayCloseAll()
             return false;
     }
     return true;
+}
+
+void FileTabs::SetTextFont(QFont const& font)
+{
+    m_textFont = font;
+    for (int i = 0; i < count(); ++i) {
+        if (auto* log = qobject_cast<LogPanel*>(widget(i)))
+            log->SetTextFont(font);
+    }
 }
 
 void FileTabs::MarkOwnLog(bool marked)

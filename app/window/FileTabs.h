@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include <QFont>
 #include <QString>
 #include <QTabWidget>
 
@@ -47,6 +48,9 @@ public:
     /// The panel of the program's own log.
     LogPanel* ownLog() const { return m_ownLog; }
 
+    /// Sets the font of all logs.
+    void SetTextFont(QFont const& font);
+
     /// Marks the tab of the program's log: there is a problem with it.
     void MarkOwnLog(bool marked);
 
@@ -64,6 +68,7 @@ Q_SIGNALS:
     /// Another tab is current, or what the current one shows has changed.
     void stateChanged();
     void messageReported(QString const& text);
+    void zoomRequested(int steps);
 
 private:
     LogPanel* addLog(QString const& path);
@@ -76,6 +81,7 @@ private:
     void addCloseButton(QWidget* page, QString const& name);
 
     LogPanel* m_ownLog;
+    QFont m_textFont;
 };
 
 } // namespace Velocor

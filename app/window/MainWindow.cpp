@@ -31,6 +31,8 @@
 #include <QDesktopWidget>
 #include <QDir>
 #include <QFileDialog>
+#include <QFontDatabase>
+#include <QFontInfo>
 #include <QMenuBar>
 #include <QMessageBox>
 #include <QMimeData>
@@ -38,6 +40,8 @@
 #include <QStatusBar>
 #include <QUrl>
 #include <QVBoxLayout>
+
+#include <cmath>
 
 // Resources of a static library must be initialized explicitly, outside any namespace.
 static void InitializeResources()
@@ -52,6 +56,8 @@ namespace {
 constexpr int HealthInterval = 2000; // milliseconds
 constexpr int MessageTime = 6000;    // milliseconds
 constexpr int MaximumDroppedFiles = 20;
+constexpr int MaximumZoom = 12; // steps
+constexpr qreal ZoomStep = 1.1;
 constexpr int MaximumMessageLength = 1000; // characters
 
 QIcon WindowIcon()
@@ -135,6 +141,7 @@ void MainWindow::makeTabs()
     m_tabs->ownLog()->AddBar(m_health);
     connect(m_tabs, &FileTabs::messageReported, this, &MainWindow::showMessage);
     connect(m_tabs, &FileTabs::stateChanged, this, &MainWindow::updateState);
+    connect(m_tabs, &FileTabs::zoomRequested, this, [this](int steps) { setZoom(m_zoom + steps); });
     m_tabs->ownLog()->setFocus();
 }
 
@@ -287,9 +294,46 @@ void MainWindow::makeViewMenu()
                          [this] { m_tabs->currentLog()->Reload(); });
     m_logActions += {m_nextProblem, m_previousProblem, m_reload};
     menu->addSeparator();
+    makeTextMenu(menu->addMenu(tr("Te&xt")));
     m_reopen =
         addSwitch(menu, tr("Re&open Files at Start"), QKeySequence(tr("Ctrl+Alt+O")),
                   tr("Open the files of these tabs again when the program starts"), [](bool) {});
+}
+
+void MainWindow::makeTextMenu(QMenu* menu)
+{
+    QAction* larger = addAction(menu, tr("&Larger"), QKeySequence(tr("Ctrl++")),
+                                tr("Show logs in larger text"), [this] { setZoom(m_zoom + 1); });
+    larger->setShortcuts({QKeySequence(tr("Ctrl++")), QKeySequence(tr("Ctrl+="))});
+    addAction(menu, tr("&Smaller"), QKeySequence(tr("Ctrl+-")), tr("Show logs in smaller text"),
+              [this] { setZoom(m_zoom - 1); });
+    addAction(menu, tr("&Normal Size"), QKeySequence(tr("Ctrl+0")),
+              tr("Show logs in the text size of the desktop"), [this] { setZoom(0); });
+    menu->addSeparator();
+    m_monospaced = addSwitch(menu, tr("&Monospaced Font"), QKeySequence(tr("Ctrl+Alt+M")),
+                             tr("Show logs in a font whose characters are equally wide"),
+                             [this](bool) { updateTextFont(); });
+}
+
+void MainWindow::setZoom(int zoom)
+{
+    m_zoom = qBound(-MaximumZoom, zoom, MaximumZoom);
+    updateTextFont();
+    showMessage(tr("Text size: %1%").arg(qRound(100 * std::pow(ZoomStep, m_zoom))));
+}
+
+// The default font, if nothing has been changed, follows the desktop's settings.
+void MainWindow::updateTextFont()
+{
+    const bool monospaced = m_monospaced->isChecked();
+    if (m_zoom == 0 && !monospaced) {
+        m_tabs->SetTextFont(QFont());
+        return;
+    }
+    const QFont normal = QApplication::font("QAbstractItemView");
+    QFont font = monospaced ? QFontDatabase::systemFont(QFontDatabase::FixedFont) : normal;
+    font.setPointSizeF(QFontInfo(normal).pointSizeF() * std::pow(ZoomStep, m_zoom));
+    m_tabs->SetTextFont(font);
 }
 
 void MainWindow::makeHelpMenu()
@@ -319,6 +363,9 @@ void MainWindow::restoreState()
 {
     if (!m_startupMessage.isEmpty())
         m_notice->ShowMessage(m_startupMessage);
+    m_monospaced->setChecked(m_settings.Flag(QStringLiteral("monospaced"), false));
+    m_zoom = qBound(-MaximumZoom, m_settings.Text(QStringLiteral("zoom")).toInt(), MaximumZoom);
+    updateTextFont();
     m_tabs->ownLog()->SetColumnWidths(m_settings.Numbers(QStringLiteral("columns")));
     m_tabs->ownLog()->SetPaneSizes(m_settings.Numbers(QStringLiteral("linePane")));
     m_recent->SetList(m_settings.Text(QStringLiteral("recentFiles")));
@@ -335,6 +382,8 @@ void MainWindow::saveState()
     m_settings.SetFlag(QStringLiteral("placesShown"), m_showPlaces->isChecked());
     if (m_showPlaces->isChecked())
         m_settings.SetNumbers(QStringLiteral("panes"), m_splitter->sizes());
+    m_settings.SetFlag(QStringLiteral("monospaced"), m_monospaced->isChecked());
+    m_settings.SetText(QStringLiteral("zoom"), QString::number(m_zoom));
     m_settings.SetFlag(QStringLiteral("toolBarShown"), m_showToolBar->isChecked());
     m_settings.SetNumbers(QStringLiteral("columns"), m_tabs->ownLog()->columnWidths());
     m_settings.SetNumbers(QStringLiteral("linePane"), m_tabs->ownLog()->paneSizes());

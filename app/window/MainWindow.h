@@ -65,6 +65,9 @@ private:
     void makeStatusBar();
     void makeToolBar();
     void showPlaces(bool shown);
+    void makeTextMenu(QMenu* menu);
+    void setZoom(int zoom);
+    void updateTextFont();
     void makeMenus();
     void makeFileMenu();
     void makeEditMenu();
@@ -120,6 +123,7 @@ private:
     QAction* m_showPlaces = nullptr;
     QAction* m_showToolBar = nullptr;
     QAction* m_reopen = nullptr;
+    QAction* m_monospaced = nullptr;
     QAction* m_filter = nullptr;
     QAction* m_nextProblem = nullptr;
     QAction* m_previousProblem = nullptr;
@@ -132,6 +136,7 @@ private:
     std::unique_ptr<LogHealth> m_logHealth;
     QTimer m_healthTimer;
     bool m_painted = false;
+    int m_zoom = 0; // steps from the desktop's text size
 };
 
 } // namespace Velocor

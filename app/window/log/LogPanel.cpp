@@ -20,6 +20,7 @@
 #include <QPlainTextEdit>
 #include <QSignalBlocker>
 #include <QSplitter>
+#include <QWheelEvent>
 
 #include <functional>
 
@@ -104,6 +105,8 @@ void LogPanel::makeLayout()
 
 void LogPanel::connectAll()
 {
+    m_view->viewport()->installEventFilter(this);
+    m_line->viewport()->installEventFilter(this);
     connect(m_files, QOverload<int>::of(&QComboBox::activated), this, &LogPanel::chooseFile);
     connect(m_filterBar, &LogFilterBar::filterChanged, this, [this] {
         m_model->SetFilter(m_filterBar->filter());
@@ -200,6 +203,39 @@ void LogPanel::SetEarlierRuns(bool shown)
 bool LogPanel::showsEarlierRuns() const
 {
     return m_filterBar->filter().earlierRuns();
+}
+
+void LogPanel::SetTextFont(QFont const& font)
+{
+    const auto timeWidth = [this] {
+        return QFontMetricsF(m_view->font())
+            .boundingRect(QStringLiteral("2000-00-00 00:00:00.000"))
+            .width();
+    };
+    const qreal before = timeWidth();
+    QList<int> widths = columnWidths();
+    m_view->setFont(font);
+    m_line->setFont(font);
+    const qreal factor = timeWidth() / before;
+    for (int& width : widths)
+        width = qRound(width * factor);
+    SetColumnWidths(widths);
+}
+
+// A read-only text would zoom by itself, and the table would scroll.
+bool LogPanel::eventFilter(QObject* object, QEvent* event)
+{
+    if (event->type() != QEvent::Wheel)
+        return QWidget::eventFilter(object, event);
+    auto const* wheel = static_cast<QWheelEvent const*>(event);
+    if (!(wheel->modifiers() & Qt::ControlModifier))
+        return false;
+    m_wheel += wheel->angleDelta().y();
+    const int steps = m_wheel / QWheelEvent::DefaultDeltasPerStep;
+    m_wheel -= steps * QWheelEvent::DefaultDeltasPerStep;
+    if (steps != 0)
+        Q_EMIT zoomRequested(steps);
+    return true;
 }
 
 void LogPanel::AddBar(QWidget* bar)

@@ -44,6 +44,10 @@ public:
     void SetEarlierRuns(bool shown);
     bool showsEarlierRuns() const;
 
+    /// Sets the font of the table and of the current line; a default QFont is the application's.
+    /// The columns keep their widths in characters.
+    void SetTextFont(QFont const& font);
+
     /// Adds a bar above the table. The panel takes ownership.
     void AddBar(QWidget* bar);
 
@@ -77,7 +81,11 @@ Q_SIGNALS:
     /// A message for the status bar.
     void messageReported(QString const& text);
 
+    /// Ctrl and the mouse wheel: larger (1) or smaller (-1) text.
+    void zoomRequested(int steps);
+
 protected:
+    bool eventFilter(QObject* object, QEvent* event) override;
     void focusInEvent(QFocusEvent* event) override;
 
 private:
@@ -98,6 +106,7 @@ private:
     QSplitter* m_splitter;
     QString m_currentPath; // the log of the running program; empty for other logs
     int m_percent = 100;
+    int m_wheel = 0; // eighths of a degree that have not zoomed yet
 };
 
 } // namespace Velocor

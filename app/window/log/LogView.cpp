@@ -83,8 +83,14 @@ void LogView::SetDefaultWidths()
 void LogView::changeEvent(QEvent* event)
 {
     QTableView::changeEvent(event);
-    if (event->type() == QEvent::FontChange || event->type() == QEvent::StyleChange)
-        setRowHeight();
+    if (event->type() != QEvent::FontChange && event->type() != QEvent::StyleChange)
+        return;
+    setRowHeight();
+    if (!m_following)
+        return;
+    const QScopedValueRollback<bool> guard(m_scrollingItself, true);
+    updateGeometries(); // updates the scroll bar's range
+    scrollToBottom();
 }
 
 // A lower view would show the same first row, and no longer the newest one.
