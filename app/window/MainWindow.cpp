@@ -19,6 +19,7 @@
 #include "app/window/ShortcutList.h"
 #include "app/window/StandardInput.h"
 #include "app/window/SystemReport.h"
+#include "app/window/log/LineSaver.h"
 #include "app/window/log/LogPanel.h"
 #include "app/window/log/LogSettingsDialog.h"
 #include "app/window/settings/SettingsEditor.h"
@@ -229,6 +230,9 @@ void MainWindow::makeFileMenu()
                        [this] { m_tabs->currentEditor()->Save(); });
     m_close = addAction(menu, tr("&Close Tab"), QKeySequence::Close, tr("Close the current file"),
                         [this] { m_tabs->CloseCurrent(); });
+    m_logActions.append(addAction(menu, tr("Save &Lines As..."), QKeySequence(tr("Ctrl+Shift+S")),
+                                  tr("Save the lines that the filter shows to a file"),
+                                  [this] { saveLines(); }));
     menu->addSeparator();
     addAction(menu, tr("Open Log &Folder"), QKeySequence(tr("Ctrl+Shift+O")),
               tr("Show the log files in the file manager"), [this] { openLogFolder(); });
@@ -245,6 +249,13 @@ void MainWindow::makeEditMenu()
     QMenu* menu = m_menus.at(1);
     addAction(menu, tr("&Copy"), QKeySequence::Copy, tr("Copy the selected lines"),
               [this] { copy(); });
+    QMenu* copyAs = menu->addMenu(tr("Copy A&s"));
+    m_logActions.append(addAction(copyAs, tr("&Markdown"), QKeySequence(tr("Ctrl+Alt+D")),
+                                  tr("Copy the selected lines as a Markdown code block"),
+                                  [this] { m_tabs->currentLog()->CopyAsMarkdown(); }));
+    m_logActions.append(addAction(copyAs, tr("&CSV"), QKeySequence(tr("Ctrl+Alt+V")),
+                                  tr("Copy the selected lines as comma-separated values"),
+                                  [this] { m_tabs->currentLog()->CopyAsCsv(); }));
     addAction(menu, tr("Select &All"), QKeySequence::SelectAll, tr("Select all lines"),
               [this] { selectAll(); });
     menu->addSeparator();
@@ -256,7 +267,7 @@ void MainWindow::makeEditMenu()
                                   tr("Show all lines again"),
                                   [this] { m_tabs->currentLog()->ClearFilter(); }));
     menu->addSeparator();
-    QAction* settings = addAction(menu, tr("Log &Settings..."), QKeySequence(tr("Ctrl+,")),
+    QAction* settings = addAction(menu, tr("Log Se&ttings..."), QKeySequence(tr("Ctrl+,")),
                                   tr("Change what is logged and how many log files are kept"),
                                   [this] { changeLogSettings(); });
     settings->setMenuRole(QAction::PreferencesRole);
@@ -598,6 +609,37 @@ void MainWindow::saveReport()
                            "the log may contain private information."),
                         SystemReport::Whole(m_settings.fileName()), true, this);
     dialog.exec();
+}
+
+void MainWindow::saveLines()
+{
+    const QString name = QFileInfo(m_tabs->currentLog()->path()).completeBaseName();
+    const QString path = QFileDialog::getSaveFileName(
+        this, tr("Save Lines"), ApplicationProperty("DocPath") + name + tr("-lines.log"),
+        tr("Logs (*.log);;All files (*)"));
+    if (!path.isEmpty())
+        saveLinesTo(path);
+}
+
+void MainWindow::saveLinesTo(QString const& path)
+{
+    LogPanel const* log = m_tabs->currentLog();
+    if (!log)
+        return;
+    auto* saver = new LineSaver(log->path(), log->LineStarts(), path, this);
+    connect(saver, &LineSaver::progressed, this,
+            [this](int percent) { showMessage(tr("Saving lines: %1%").arg(percent)); });
+    connect(saver, &QThread::finished, this, [this, saver] {
+        saver->deleteLater();
+        const QString error = saver->error();
+        if (error.isEmpty())
+            showMessage(saver->count() == 1
+                            ? tr("1 line saved to %1").arg(saver->target())
+                            : tr("%L1 lines saved to %2").arg(saver->count()).arg(saver->target()));
+        else
+            m_notice->ShowMessage(tr("Could not save lines to %1: %2").arg(saver->target(), error));
+    });
+    saver->start();
 }
 
 void MainWindow::showAbout()

@@ -95,6 +95,8 @@ private:
     QString open(QString const& path);
     void openLogFolder();
     void saveReport();
+    void saveLines();
+    void saveLinesTo(QString const& path);
     void showAbout();
     void showShortcuts();
     void showManual();

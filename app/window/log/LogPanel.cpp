@@ -5,6 +5,7 @@
 
 #include "app/logfile/LogFileList.h"
 #include "app/logfile/LogIndex.h"
+#include "app/window/log/LinesAsText.h"
 #include "app/window/log/LogFilterBar.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogView.h"
@@ -12,8 +13,10 @@
 #include "app/window/widgets/FileSizeText.h"
 #include "app/window/widgets/PlainText.h"
 
+#include <QClipboard>
 #include <QComboBox>
 #include <QFileInfo>
+#include <QGuiApplication>
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QLocale>
@@ -22,6 +25,7 @@
 #include <QSplitter>
 #include <QWheelEvent>
 
+#include <algorithm>
 #include <functional>
 
 namespace Velocor {
@@ -256,7 +260,44 @@ void LogPanel::ClearFilter()
 
 void LogPanel::CopySelected()
 {
-    const int count = m_view->CopySelected();
+    reportCopied(m_view->CopySelected());
+}
+
+void LogPanel::CopyAsMarkdown()
+{
+    const QList<int> rows = m_view->SelectedRows();
+    copyRows(rows, LinesAsText::Markdown(*m_model, rows));
+}
+
+void LogPanel::CopyAsCsv()
+{
+    const QList<int> rows = m_view->SelectedRows();
+    copyRows(rows, LinesAsText::Csv(*m_model, rows));
+}
+
+void LogPanel::copyRows(QList<int> const& rows, QString const& text)
+{
+    const auto count = std::count_if(rows.begin(), rows.end(),
+                                     [this](int row) { return m_model->LineStart(row) >= 0; });
+    if (count > 0)
+        QGuiApplication::clipboard()->setText(text);
+    reportCopied(static_cast<int>(count));
+}
+
+QVector<qint64> LogPanel::LineStarts() const
+{
+    QVector<qint64> starts;
+    starts.reserve(m_model->rowCount());
+    for (int row = 0; row < m_model->rowCount(); ++row) {
+        const qint64 start = m_model->LineStart(row);
+        if (start >= 0) // not a heading
+            starts.append(start);
+    }
+    return starts;
+}
+
+void LogPanel::reportCopied(int count)
+{
     if (count == 0)
         Q_EMIT messageReported(tr("No lines selected"));
     else if (count >= LogView::MaximumCopiedLines)

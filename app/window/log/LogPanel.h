@@ -54,6 +54,13 @@ public:
     void FocusFilter();
     void ClearFilter();
     void CopySelected();
+
+    /// Copies the selected lines as a Markdown code block, or as CSV.
+    void CopyAsMarkdown();
+    void CopyAsCsv();
+
+    /// Where the lines shown start in the file, in the order shown.
+    QVector<qint64> LineStarts() const;
     void SelectAll();
 
     /// Goes to the next (step 1) or previous (step -1) warning or worse, or reports that
@@ -89,6 +96,8 @@ protected:
     void focusInEvent(QFocusEvent* event) override;
 
 private:
+    void copyRows(QList<int> const& rows, QString const& text);
+    void reportCopied(int count);
     void makeControls();
     void makeLayout();
     void connectAll();

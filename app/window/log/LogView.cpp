@@ -243,7 +243,7 @@ LogView::Jump LogView::GoToProblem(int step)
     return jump;
 }
 
-QList<int> LogView::selectedRowNumbers() const
+QList<int> LogView::SelectedRows() const
 {
     QList<int> rows;
     const QItemSelection selection = selectionModel()->selection();
@@ -259,7 +259,7 @@ QList<int> LogView::selectedRowNumbers() const
 
 int LogView::CopySelected()
 {
-    const QList<int> rows = selectedRowNumbers();
+    const QList<int> rows = SelectedRows();
     QString text;
     int count = 0;
     for (int row : rows) {

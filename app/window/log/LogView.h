@@ -42,6 +42,9 @@ public:
     /// @return the number of lines copied
     int CopySelected();
 
+    /// The numbers of the selected rows in ascending order, at most MaximumCopiedLines.
+    QList<int> SelectedRows() const;
+
     /// The text that is shown while the table is empty.
     void SetPlaceholder(QString const& text);
 
@@ -74,7 +77,6 @@ private:
     int rowBefore(int step) const;
     void setRowHeight();
     void updateHeadings();
-    QList<int> selectedRowNumbers() const;
 
     LogModel* m_model;
     LogDelegate* m_delegate;
