@@ -17,7 +17,7 @@ namespace {
 
 constexpr int KeysWidth = 18; // characters
 
-QString Line(QKeySequence const& keys, QString const& text)
+QString KeyLine(QKeySequence const& keys, QString const& text)
 {
     return QStringLiteral("  ") + keys.toString(QKeySequence::NativeText).leftJustified(KeysWidth) +
            text + QLatin1Char('\n');
@@ -36,7 +36,7 @@ QString MenuLines(QMenu const* menu)
         if (action->menu())
             lines += MenuLines(action->menu());
         else if (!action->shortcut().isEmpty())
-            lines += Line(action->shortcut(), action->statusTip());
+            lines += KeyLine(action->shortcut(), action->statusTip());
     }
     return lines;
 }
@@ -52,7 +52,7 @@ QString ButtonLines(QMainWindow const* window)
     }
     QString lines;
     for (auto text = texts.constBegin(); text != texts.constEnd(); ++text)
-        lines += Line(text.key(), text.value());
+        lines += KeyLine(text.key(), text.value());
     return lines;
 }
 

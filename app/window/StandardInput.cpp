@@ -15,7 +15,7 @@ namespace Velocor {
 
 namespace {
 
-constexpr size_t SliceSize = 1 << 16; // bytes; what a pipe usually holds
+constexpr size_t ReadSize = 1 << 16; // bytes; what a pipe usually holds
 
 // Closing the descriptor would give its number to the next file that is opened.
 void EndInput()
@@ -53,7 +53,7 @@ QString StandardInput::path() const
 // There is something to read, so this does not wait for more.
 void StandardInput::readSome()
 {
-    std::array<char, SliceSize> slice;
+    std::array<char, ReadSize> slice;
     const ssize_t size = read(STDIN_FILENO, slice.data(), slice.size());
     if (size < 0 && (errno == EINTR || errno == EAGAIN))
         return;

@@ -14,8 +14,8 @@ namespace Velocor {
 
 namespace {
 
-constexpr qreal Box = 16; // size of the square that shapes are drawn in
-constexpr int Sizes[] = {16, 24, 32, 48};
+constexpr qreal IconBox = 16; // size of the square that shapes are drawn in
+constexpr int IconSizes[] = {16, 24, 32, 48};
 
 QPolygonF Lines(std::initializer_list<QPointF> points)
 {
@@ -116,12 +116,12 @@ void Draw(QPainter& painter, ActionIcons::Name name, QPalette const& palette)
 QIcon ActionIcons::Icon(Name name, QPalette const& palette)
 {
     QIcon icon;
-    for (int size : Sizes) {
+    for (int size : IconSizes) {
         QPixmap pixmap(size, size);
         pixmap.fill(Qt::transparent);
         QPainter painter(&pixmap);
         painter.setRenderHint(QPainter::Antialiasing);
-        painter.scale(size / Box, size / Box);
+        painter.scale(size / IconBox, size / IconBox);
         const QColor color = palette.color(QPalette::Active, QPalette::ButtonText);
         painter.setPen(QPen(color, 1.4, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
         Draw(painter, name, palette);
