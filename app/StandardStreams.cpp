@@ -20,13 +20,14 @@ void OpenMissingStandardStreams()
     }
 }
 
-void PrintWithoutWaiting(QByteArray const& text)
+void PrintWithoutWaiting(QByteArray const& text, int stream)
 {
-    pollfd output = {STDOUT_FILENO, POLLOUT, 0};
+    if (text.isEmpty())
+        return;
+    pollfd output = {stream, POLLOUT, 0};
     if (poll(&output, 1, 0) != 1 || !(output.revents & POLLOUT))
         return;
-    const ssize_t written =
-        write(STDOUT_FILENO, text.constData(), static_cast<size_t>(text.size()));
+    const ssize_t written = write(stream, text.constData(), static_cast<size_t>(text.size()));
     static_cast<void>(written); // there is nowhere to report a failure
 }
 

@@ -14,12 +14,13 @@ namespace Velocor {
 /// threads start; uses the C library only.
 void OpenMissingStandardStreams();
 
-/// Writes to standard output without ever blocking.
+/// Writes to standard output, or to standard error, without ever blocking.
 ///
 /// Text that does not fit into the output buffer is dropped; failures are ignored. Needs
-/// SurviveFailedWrites() in case standard output is a pipe without a reader.
+/// SurviveFailedWrites() in case the stream is a pipe without a reader.
 ///
 /// @param text  bytes to write, including the line end; at most a few kilobytes
-void PrintWithoutWaiting(QByteArray const& text);
+/// @param stream  the descriptor: 1 is standard output, 2 is standard error
+void PrintWithoutWaiting(QByteArray const& text, int stream = 1);
 
 } // namespace Velocor

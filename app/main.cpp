@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 
 #include "app/AppPaths.h"
+#include "app/CommandLine_p.h"
 #include "app/FailedWrites.h"
 #include "app/QuitOnSignal.h"
 #include "app/ScreenlessPlatform_p.h"
@@ -13,6 +14,9 @@
 #include <QApplication>
 #include <QDebug>
 #include <QFile>
+#include <QTimer>
+
+#include <unistd.h>
 
 namespace {
 
@@ -20,6 +24,13 @@ QString Caption()
 {
     QString const& product = AppPaths::ProductName();
     return product.isEmpty() ? QStringLiteral("Velocor") : product;
+}
+
+// The caller of --help wants the text, and no window that flashes up.
+void Answer(QByteArray const& text)
+{
+    Velocor::PrintWithoutWaiting(text);
+    QTimer::singleShot(0, QCoreApplication::instance(), &QCoreApplication::quit);
 }
 
 // Without a screen, the terminal is the only place to show where the log is.
@@ -48,10 +59,19 @@ int main(int argc, char** argv)
     application.setProperty("caption", Caption());
 
     QuitOnSignal quitOnSignal;
+    const Velocor::CommandLine commandLine(QApplication::arguments());
+    const bool answers = !commandLine.answer().isEmpty();
     Velocor::MainWindow window;
+    window.setAttribute(Qt::WA_DontShowOnScreen, answers);
+    if (!answers)
+        window.OpenAtStart(commandLine.files());
     window.show();
 
     qDebug() << "app.exec() starting";
-    PrintLogFileIfScreenless();
+    Velocor::PrintWithoutWaiting(commandLine.complaints(), STDERR_FILENO);
+    if (answers)
+        Answer(commandLine.answer());
+    else
+        PrintLogFileIfScreenless();
     return QApplication::exec();
 }

@@ -84,6 +84,12 @@ public:
     /// Its length in bytes.
     int size() const { return m_size; }
 
+    QByteArray bytes() const
+    {
+        char const pair[] = {m_first, m_last};
+        return QByteArray(pair + 2 - m_size, m_size);
+    }
+
     /// Finds the last byte of the first line end in [at, end).
     ///
     /// @param offset  where `at` is in the file

@@ -3,20 +3,39 @@
 
 #include "app/window/FileTabs.h"
 
+#include "app/window/DistinctNames.h"
 #include "app/window/log/LogPanel.h"
 #include "app/window/settings/SettingsEditor.h"
 #include "app/window/widgets/PlainText.h"
+#include "app/window/widgets/SeverityIcons.h"
 
 #include <QFile>
 #include <QFileInfo>
 #include <QTabBar>
 #include <QToolButton>
 
+#include <algorithm>
+
 namespace Velocor {
 
-namespace {
+FileTabs::FileTabs(LogMarkStore* marks, QWidget* parent) : QTabWidget(parent), m_marks(marks)
+{
+    setDocumentMode(true);
+    setTabBarAutoHide(true);
+    // Tab would go to the bar even while that is hidden, and stay where it is.
+    setFocusProxy(nullptr);
+    setFocusPolicy(Qt::NoFocus);
+    setMovable(false);
+    setElideMode(Qt::ElideMiddle);
+    setAccessibleName(tr("Open files"));
+    tabBar()->setAccessibleName(tr("Open files"));
+    m_ownLog = addLog(QString());
+    setTabText(0, tr("Log"));
+    connect(this, &QTabWidget::currentChanged, this, &FileTabs::stateChanged);
+    connect(this, &FileTabs::stateChanged, this, &FileTabs::updateTitles);
+}
 
-QString PathOf(QWidget const* page)
+QString FileTabs::PathOf(QWidget const* page)
 {
     if (auto const* log = qobject_cast<LogPanel const*>(page))
         return log->path();
@@ -24,24 +43,22 @@ QString PathOf(QWidget const* page)
     return editor ? editor->path() : QString();
 }
 
-QString TitleOf(QString const& path)
+// Setting a text lays out the tabs, even if it is the same.
+void FileTabs::updateTitles()
 {
-    QString title = QFileInfo(path).fileName();
-    return title.replace(QLatin1Char('&'), QLatin1String("&&"));
-}
-
-} // namespace
-
-FileTabs::FileTabs(LogMarkStore* marks, QWidget* parent) : QTabWidget(parent), m_marks(marks)
-{
-    setDocumentMode(true);
-    setTabBarAutoHide(true);
-    setMovable(false);
-    setElideMode(Qt::ElideMiddle);
-    setAccessibleName(tr("Open files"));
-    tabBar()->setAccessibleName(tr("Open files"));
-    m_ownLog = addLog(tr("Log"), QString());
-    connect(this, &QTabWidget::currentChanged, this, &FileTabs::stateChanged);
+    QStringList paths;
+    for (int i = 1; i < count(); ++i)
+        paths.append(PathOf(widget(i)));
+    QStringList titles = DistinctNames(paths);
+    for (int i = 1; i < count(); ++i) {
+        QString& title = titles[i - 1];
+        title.replace(QLatin1Char('&'), QLatin1String("&&"));
+        auto const* editor = qobject_cast<SettingsEditor const*>(widget(i));
+        if (editor && editor->isModified())
+            title += QLatin1String(" *");
+        if (tabText(i) != title)
+            setTabText(i, title);
+    }
 }
 
 // The style's close button is an image that is invisible on dark palettes.
@@ -57,35 +74,35 @@ void FileTabs::addCloseButton(QWidget* page, QString const& name)
     tabBar()->setTabButton(indexOf(page), QTabBar::RightSide, button);
 }
 
-LogPanel* FileTabs::addLog(QString const& title, QString const& path)
+LogPanel* FileTabs::addLog(QString const& path)
 {
     auto* panel = new LogPanel;
-    const QString name = path.isEmpty() ? title : QFileInfo(path).fileName();
+    const QString name = path.isEmpty() ? tr("Log") : QFileInfo(path).fileName();
     panel->setAccessibleName(name);
     panel->SetMarkStore(m_marks);
     panel->SetFilterHistory(m_filterHistory);
     connect(panel, &LogPanel::stateChanged, this, &FileTabs::stateChanged);
     connect(panel, &LogPanel::messageReported, this, &FileTabs::messageReported);
+    connect(panel, &LogPanel::zoomRequested, this, &FileTabs::zoomRequested);
+    panel->SetTextFont(m_textFont);
     if (!path.isEmpty())
         panel->Open(path, false);
-    setTabToolTip(addTab(panel, title), PlainToolTip(path));
+    setTabToolTip(addTab(panel, QString()), PlainToolTip(path));
     if (!path.isEmpty())
         addCloseButton(panel, name);
     return panel;
 }
 
-SettingsEditor* FileTabs::addEditor(QString const& title, QString const& path)
+SettingsEditor* FileTabs::addEditor(QString const& path)
 {
     auto* editor = new SettingsEditor;
     const QString name = QFileInfo(path).fileName();
     editor->setAccessibleName(name);
     editor->Open(path);
     connect(editor, &SettingsEditor::messageReported, this, &FileTabs::messageReported);
-    connect(editor, &SettingsEditor::modifiedChanged, this, [this, editor, title](bool modified) {
-        setTabText(indexOf(editor), modified ? title + QLatin1String(" *") : title);
-    });
+    connect(editor, &SettingsEditor::modifiedChanged, this, &FileTabs::stateChanged);
     connect(editor, &SettingsEditor::canSaveChanged, this, &FileTabs::stateChanged);
-    setTabToolTip(addTab(editor, title), PlainToolTip(path));
+    setTabToolTip(addTab(editor, QString()), PlainToolTip(path));
     addCloseButton(editor, name);
     return editor;
 }
@@ -112,17 +129,42 @@ int FileTabs::positionOf(QString const& path) const
 
 void FileTabs::OpenFile(QString const& path)
 {
-    int position = positionOf(path);
-    if (position < 0) {
-        QWidget* page = nullptr;
-        if (IsSettingsFile(path))
-            page = addEditor(TitleOf(path), path);
-        else
-            page = addLog(TitleOf(path), path);
-        position = indexOf(page);
-    }
-    setCurrentIndex(position);
-    widget(position)->setFocus();
+    goTo(pageOf(path));
+}
+
+void FileTabs::OpenInBackground(QString const& path)
+{
+    pageOf(path);
+    Q_EMIT stateChanged();
+}
+
+void FileTabs::GoTo(QString const& path)
+{
+    goTo(widget(std::max(0, positionOf(path))));
+}
+
+// The existing page of a file, or a new one.
+QWidget* FileTabs::pageOf(QString const& path)
+{
+    const int position = positionOf(path);
+    if (position >= 0)
+        return widget(position);
+    if (IsSettingsFile(path))
+        return addEditor(path);
+    return addLog(path);
+}
+
+LogPanel* FileTabs::OpenLog(QString const& path)
+{
+    LogPanel* panel = addLog(path);
+    goTo(panel);
+    return panel;
+}
+
+void FileTabs::goTo(QWidget* page)
+{
+    setCurrentWidget(page);
+    page->setFocus();
     Q_EMIT stateChanged();
 }
 
@@ -156,6 +198,21 @@ bool FileTabs::MayCloseAll()
             return false;
     }
     return true;
+}
+
+void FileTabs::SetTextFont(QFont const& font)
+{
+    m_textFont = font;
+    for (int i = 0; i < count(); ++i) {
+        if (auto* log = qobject_cast<LogPanel*>(widget(i)))
+            log->SetTextFont(font);
+    }
+}
+
+void FileTabs::MarkOwnLog(bool marked)
+{
+    if (tabIcon(0).isNull() == marked)
+        setTabIcon(0, marked ? SeverityIcons::Icon(LogEntry::Warning, palette()) : QIcon());
 }
 
 LogPanel* FileTabs::currentLog() const

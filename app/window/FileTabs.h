@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include <QFont>
 #include <QString>
 #include <QStringList>
 #include <QTabWidget>
@@ -31,6 +32,17 @@ public:
     /// A file that begins with "<" is treated as a settings file, any other as a log.
     void OpenFile(QString const& path);
 
+    /// Opens a file like OpenFile(), without going to its tab.
+    void OpenInBackground(QString const& path);
+
+    /// Goes to the tab of a file, or else to that of the program's log.
+    void GoTo(QString const& path);
+
+    /// Shows a file as a log in a new tab.
+    ///
+    /// @return its panel, owned by the tabs
+    LogPanel* OpenLog(QString const& path);
+
     /// Closes the current tab, unless it is the program's log or the user cancels.
     void CloseCurrent();
 
@@ -46,9 +58,18 @@ public:
     /// The panel of the program's own log.
     LogPanel* ownLog() const { return m_ownLog; }
 
+    /// Sets the font of all logs.
+    void SetTextFont(QFont const& font);
+
+    /// Marks the tab of the program's log: there is a problem with it.
+    void MarkOwnLog(bool marked);
+
     /// The content of the current tab; null if it is of the other type.
     LogPanel* currentLog() const;
     SettingsEditor* currentEditor() const;
+
+    /// The file that a tab shows.
+    static QString PathOf(QWidget const* page);
 
     /// Whether a file looks like a settings file.
     static bool IsSettingsFile(QString const& path);
@@ -57,17 +78,22 @@ Q_SIGNALS:
     /// Another tab is current, or what the current one shows has changed.
     void stateChanged();
     void messageReported(QString const& text);
+    void zoomRequested(int steps);
 
 private:
-    LogPanel* addLog(QString const& title, QString const& path);
-    SettingsEditor* addEditor(QString const& title, QString const& path);
+    LogPanel* addLog(QString const& path);
+    SettingsEditor* addEditor(QString const& path);
+    QWidget* pageOf(QString const& path);
     void closeTab(int position);
+    void goTo(QWidget* page);
+    void updateTitles();
     int positionOf(QString const& path) const;
     void addCloseButton(QWidget* page, QString const& name);
 
     LogMarkStore* m_marks;
     std::shared_ptr<QStringList> m_filterHistory = std::make_shared<QStringList>();
     LogPanel* m_ownLog;
+    QFont m_textFont;
 };
 
 } // namespace Velocor

@@ -5,6 +5,7 @@
 
 #include "app/runninglog/RunningLog.h"
 #include "app/window/ApplicationProperty.h"
+#include "app/window/widgets/ElidedLabel.h"
 #include "app/window/widgets/PlainText.h"
 
 #include <QClipboard>
@@ -12,29 +13,14 @@
 #include <QDesktopServices>
 #include <QFileInfo>
 #include <QGuiApplication>
+#include <QHBoxLayout>
 #include <QLabel>
-#include <QLineEdit>
 #include <QScrollArea>
 #include <QToolButton>
 #include <QUrl>
 #include <QVBoxLayout>
 
 namespace Velocor {
-
-namespace {
-
-QToolButton* MakeButton(QString const& text, QString const& name, QString const& toolTip)
-{
-    auto* button = new QToolButton;
-    button->setText(text);
-    button->setAutoRaise(true);
-    button->setMaximumHeight(button->fontMetrics().height() + 8);
-    button->setAccessibleName(name);
-    button->setToolTip(PlainToolTip(toolTip));
-    return button;
-}
-
-} // namespace
 
 PlacesPanel::PlacesPanel(QString const& settingsFile, QWidget* parent) : QWidget(parent)
 {
@@ -61,57 +47,46 @@ PlacesPanel::PlacesPanel(QString const& settingsFile, QWidget* parent) : QWidget
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(0, 0, 0, 0);
     layout->addWidget(scroller);
-    setMinimumWidth(180);
+    setMinimumWidth(200);
 }
 
 void PlacesPanel::addValue(QString const& caption, QString const& text, bool isPlace)
 {
-    auto* value = new QLineEdit(text);
-    value->setReadOnly(true);
+    auto* value = new ElidedLabel(Qt::ElideMiddle);
+    value->setText(text);
     value->setAccessibleName(caption);
-    value->setToolTip(PlainToolTip(text));
     value->setAccessibleDescription(text);
-    value->setCursorPosition(0);
-    QPalette flat; // sets only this role, so the others still follow the window's palette
-    flat.setBrush(QPalette::Base, Qt::transparent);
-    value->setPalette(flat);
+    value->setToolTip(PlainToolTip(text));
+    value->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
 
     QLabel* label = NewPlainLabel(caption);
-    label->setBuddy(value);
-
-    // As high as the buttons, so that nothing moves when they are added.
-    label->setMinimumHeight(fontMetrics().height() + 8);
+    QFont bold = label->font();
+    bold.setBold(true);
+    label->setFont(bold);
     auto* row = new QHBoxLayout;
-    row->setSpacing(2);
+    row->setSpacing(4);
     row->addWidget(label, 1);
     m_layout->addLayout(row);
     m_layout->addWidget(value);
-    m_layout->addSpacing(6);
-    m_rows.append({row, caption, text, isPlace, value});
+    m_layout->addSpacing(10);
+
+    if (isPlace)
+        addButton(tr("Open"), tr("Open: %1").arg(caption), tr("Show in the file manager"), row,
+                  [this, text] { openPlace(text); });
+    addButton(tr("Copy"), tr("Copy: %1").arg(caption), tr("Copy to the clipboard"), row,
+              [this, caption, text] { copy(caption, text); });
 }
 
-void PlacesPanel::AddButtons()
+void PlacesPanel::addButton(QString const& text, QString const& name, QString const& toolTip,
+                            QLayout* row, std::function<void()> const& work)
 {
-    for (Row const& row : qAsConst(m_rows)) {
-        QToolButton* open = nullptr;
-        if (row.isPlace) {
-            open = MakeButton(tr("Open"), tr("Open: %1").arg(row.caption),
-                              tr("Show in the file manager"));
-            connect(open, &QToolButton::clicked, this, [this, row] { openPlace(row.text); });
-            row.layout->addWidget(open);
-        }
-        QToolButton* copyButton =
-            MakeButton(tr("Copy"), tr("Copy: %1").arg(row.caption), tr("Copy to the clipboard"));
-        connect(copyButton, &QToolButton::clicked, this,
-                [this, row] { copy(row.caption, row.text); });
-        row.layout->addWidget(copyButton);
-        if (open) {
-            setTabOrder(row.value, open);
-            setTabOrder(open, copyButton);
-        } else {
-            setTabOrder(row.value, copyButton);
-        }
-    }
+    auto* button = new QToolButton;
+    button->setText(text);
+    button->setAccessibleName(name);
+    button->setToolTip(PlainToolTip(toolTip));
+    button->setFocusPolicy(Qt::TabFocus);
+    connect(button, &QToolButton::clicked, this, work);
+    row->addWidget(button);
 }
 
 bool PlacesPanel::OpenPlace(QString const& path)

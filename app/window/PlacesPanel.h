@@ -4,10 +4,11 @@
 #pragma once
 
 #include <QString>
-#include <QVector>
 #include <QWidget>
 
-class QHBoxLayout;
+#include <functional>
+
+class QLayout;
 class QVBoxLayout;
 
 namespace Velocor {
@@ -21,9 +22,6 @@ public:
     /// @param settingsFile  the window's settings file
     explicit PlacesPanel(QString const& settingsFile, QWidget* parent = nullptr);
 
-    /// Adds the buttons. Call once; separate from construction, so that the first paint is quick.
-    void AddButtons();
-
     /// Shows a folder, or the folder of a file, in the system's file manager.
     ///
     /// @return false if the folder does not exist or there is no file manager
@@ -35,20 +33,12 @@ Q_SIGNALS:
 
 private:
     void addValue(QString const& caption, QString const& text, bool isPlace);
+    void addButton(QString const& text, QString const& name, QString const& toolTip, QLayout* row,
+                   std::function<void()> const& work);
     void openPlace(QString const& path);
     void copy(QString const& caption, QString const& text);
 
-    struct Row
-    {
-        QHBoxLayout* layout;
-        QString caption;
-        QString text;
-        bool isPlace;
-        QWidget* value;
-    };
-
     QVBoxLayout* m_layout;
-    QVector<Row> m_rows;
 };
 
 } // namespace Velocor

@@ -65,7 +65,9 @@ QString ReportDialog::SaveTo(QString const& path) const
     QSaveFile file(path);
     if (!file.open(QIODevice::WriteOnly))
         return file.errorString();
-    file.write(m_text->toPlainText().toUtf8());
+    const QByteArray bytes = m_text->toPlainText().toUtf8();
+    if (file.write(bytes) != bytes.size()) // of which commit() does not know
+        return tr("Only a part could be written");
     return file.commit() ? QString() : file.errorString();
 }
 

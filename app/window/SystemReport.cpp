@@ -195,6 +195,15 @@ QString SystemReport::Facts(QString const& settingsFile)
 
 // The current file alone may not have the end of the previous run: a new run that finds the file
 // full moves it to the older ones first.
+QString SystemReport::Licenses()
+{
+    return Line(QStringLiteral("License"), QStringLiteral("MIT")) +
+           Line(QStringLiteral("Qt %1").arg(QLatin1String(qVersion())),
+                QStringLiteral("LGPL 3 or GPL 2")) +
+           Line(QStringLiteral("rapidxml"), QStringLiteral("Boost Software License 1.0 or MIT")) +
+           QLatin1Char('\n');
+}
+
 QString SystemReport::LogTail(int lines)
 {
     QStringList tail;

@@ -17,6 +17,9 @@ public:
     /// @param settingsFile  the window's settings file
     static QString Facts(QString const& settingsFile);
 
+    /// The licenses of the program and of what it uses, one per line.
+    static QString Licenses();
+
     /// The last lines of the current log, oldest first. Those of the newest run come last, even if
     /// older ones follow in the file. The whole file is read to find them. If it has fewer lines,
     /// the last ones of the older files precede them.

@@ -16,6 +16,7 @@
 #include <QRegularExpression>
 #include <QTemporaryDir>
 
+#include <algorithm>
 #include <csignal>
 #include <functional>
 #include <sys/types.h>
@@ -132,6 +133,22 @@ public:
     pid_t Id() const { return static_cast<pid_t>(m_process.processId()); }
 
     void Send(int signalNumber) const { ::kill(Id(), signalNumber); }
+
+    // Whether the program has a file open.
+    bool HasOpen(QString const& path) const
+    {
+        const QDir folder(QString("/proc/%1/fd").arg(Id()));
+        const QFileInfoList files = folder.entryInfoList(QDir::AllEntries | QDir::System);
+        return std::any_of(files.begin(), files.end(),
+                           [&](QFileInfo const& file) { return file.symLinkTarget() == path; });
+    }
+
+    // To standard input, which stays open.
+    void Write(QByteArray const& text)
+    {
+        m_process.write(text);
+        m_process.waitForBytesWritten(Patience);
+    }
 
     // The exit code, or -1 if the program did not exit normally.
     int ExitCode()

@@ -6,6 +6,7 @@
 // object, and once the event loop runs writes a report and ends the program.
 //
 //     SPY_REPORT  the file to write, JSON
+//     SPY_AWAIT   a text; the report is written when a widget shows it
 //     SPY_END     "close" closes the windows as the user would; a number is the exit code
 
 #include <QApplication>
@@ -108,6 +109,16 @@ private:
             return;
         }
         Note("exec");
+        AwaitText();
+    }
+
+    void AwaitText()
+    {
+        const QString text = QString::fromLocal8Bit(qgetenv("SPY_AWAIT"));
+        if (!text.isEmpty() && !ShownTexts().contains(text)) {
+            QTimer::singleShot(10, this, &StartupSpy::AwaitText);
+            return;
+        }
         WriteReport();
         End();
     }

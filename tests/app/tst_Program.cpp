@@ -526,7 +526,11 @@ void tst_Program::windowShowsIdentityAndPlaces()
     QVERIFY(installation.installed);
     QVERIFY(installation.WriteLaunchData(Option("organization", "My Org") +
                                          Option("product", "P&amp;Q")));
+    QVERIFY(TestFiles::write(installation.top + "data/My Org/P&Q/velocor.cfg",
+                             "<VelocorSettings><MainWindow><placesShown>yes</placesShown>"
+                             "</MainWindow></VelocorSettings>"));
     installation.AddSpy("0");
+    installation.environment.insert("SPY_AWAIT", "My Org");
 
     const ProgramResult result = RunProgram(installation.program, {}, installation.environment);
     QCOMPARE(result.exitCode, 0);

@@ -122,6 +122,15 @@ Widget* ByName(QWidget* parent, QString const& accessibleName)
     qFatal("no %s", qPrintable(accessibleName));
 }
 
+void Trigger(MainWindow& window, QString const& item)
+{
+    const QList<QAction*> actions = window.findChildren<QAction*>();
+    for (QAction* action : actions) {
+        if (QString(action->text()).remove('&') == item)
+            action->trigger();
+    }
+}
+
 void TakeLogViews(MainWindow& window, Camera const& camera)
 {
     LogPanel* panel = PanelOf(window);
@@ -154,6 +163,18 @@ void TakeLogViews(MainWindow& window, Camera const& camera)
     table->clearSelection();
 }
 
+// And the bar that says that something is wrong with the log.
+void TakePlaces(MainWindow& window, Camera const& camera)
+{
+    TorkLog::logger()->setEnable(false);
+    Trigger(window, "Places");
+    QTest::qWait(2500); // the log is checked every two seconds
+    camera.take(window, "places");
+    TorkLog::logger()->setEnable(true);
+    Trigger(window, "Places");
+    QTest::qWait(2500);
+}
+
 // Of the dialog that a menu item opens.
 void TakeDialog(MainWindow& window, QString const& item, Camera const& camera, QString const& name)
 {
@@ -162,17 +183,14 @@ void TakeDialog(MainWindow& window, QString const& item, Camera const& camera, Q
         camera.take(*dialog, name);
         dialog->close();
     });
-    const QList<QAction*> actions = window.findChildren<QAction*>();
-    for (QAction* action : actions) {
-        if (QString(action->text()).remove('&') == item)
-            action->trigger();
-    }
+    Trigger(window, item);
 }
 
 void TakeDialogs(MainWindow& window, Camera const& camera)
 {
     TakeDialog(window, "Log Settings...", camera, "log-settings");
     TakeDialog(window, "About Velocor", camera, "about");
+    TakeDialog(window, "Keyboard Shortcuts", camera, "shortcuts");
     TakeDialog(window, "Save Report...", camera, "report");
 }
 
@@ -184,6 +202,7 @@ void TakeAll(QString const& folder, QString const& suffix)
     window.show();
     QTest::qWait(1000);
     TakeLogViews(window, camera);
+    TakePlaces(window, camera);
     TakeDialogs(window, camera);
 
     window.OpenFile(Home + "viewer.cfg");

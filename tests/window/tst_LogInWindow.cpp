@@ -24,6 +24,8 @@
 #include <QSpinBox>
 #include <QStatusBar>
 #include <QToolButton>
+#include <QTreeView>
+#include <QWheelEvent>
 
 using namespace Velocor;
 using namespace WindowParts;
@@ -97,6 +99,12 @@ private slots:
     void logSettingsRefused();
 
     void logSwitchedOff();
+    void stateOfTheLogCanBeDismissed();
+    void rowsAreAlikeEverywhere();
+    void emptyTableSaysWhatToDo();
+    void textSize();
+    void wheelZooms();
+    void monospacedFont();
 };
 
 void tst_LogInWindow::initTestCase()
@@ -877,9 +885,144 @@ void tst_LogInWindow::logSwitchedOff()
     TorkLog::logger()->setEnable(false);
     const auto window = WindowTest::show();
     auto const* state = Child<QLabel>(window.get(), "State of the log");
+    auto* tabs = window->findChild<FileTabs*>();
     QTRY_COMPARE_WITH_TIMEOUT(state->text(), QString("Logging is off"), Patience);
+    QVERIFY(state->isVisible());
+    QVERIFY(!tabs->tabIcon(0).isNull());
+    QVERIFY(state->mapToGlobal(QPoint()).y() < View(*window)->mapToGlobal(QPoint()).y());
     TorkLog::logger()->setEnable(true);
     QTRY_COMPARE_WITH_TIMEOUT(state->text(), QString(), Patience);
+    QVERIFY(!state->isVisible());
+    QVERIFY(tabs->tabIcon(0).isNull());
+}
+
+// Until it changes; it is in nobody's way in between.
+void tst_LogInWindow::stateOfTheLogCanBeDismissed()
+{
+    const WindowTest test;
+    TorkLog::logger()->setEnable(false);
+    const auto window = WindowTest::show();
+    auto const* state = Child<QLabel>(window.get(), "State of the log");
+    QTRY_VERIFY_WITH_TIMEOUT(state->isVisible(), Patience);
+    Click(Child<QAbstractButton>(window.get(), "Dismiss state of the log"));
+    QVERIFY(!state->isVisible());
+    QTest::qWait(2500); // it has been checked again
+    QVERIFY(!state->isVisible());
+    TorkLog::logger()->setEnable(true);
+    QTest::qWait(2500);
+    TorkLog::logger()->setEnable(false);
+    QTRY_VERIFY_WITH_TIMEOUT(state->isVisible(), Patience);
+    TorkLog::logger()->setEnable(true);
+}
+
+void tst_LogInWindow::rowsAreAlikeEverywhere()
+{
+    const WindowTest test(run(5, QTime(9, 0), "x"));
+    QVERIFY(TestFiles::write(test.folder() + "some.cfg", Settings));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    LogView const* view = View(*window);
+    window->OpenFile(test.folder() + "some.cfg");
+    auto const* tree = Child<QTreeView>(window.get(), "Settings");
+    QCOMPARE(tree->visualRect(tree->model()->index(0, 0)).height(), view->rowHeight(0));
+    QVERIFY(tree->alternatingRowColors() && view->alternatingRowColors());
+}
+
+void tst_LogInWindow::emptyTableSaysWhatToDo()
+{
+    const WindowTest test(run(5, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);
+    QTest::keyClicks(QApplication::focusWidget(), "nowhere");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 0, Patience);
+    QTRY_COMPARE(View(*window)->accessibleDescription(),
+                 QString("No lines match the filter.\nClear it with Ctrl+Shift+F."));
+    QTest::keyClick(QApplication::focusWidget(), Qt::Key_F,
+                    Qt::ControlModifier | Qt::ShiftModifier);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+}
+
+// For all logs, also those opened later; the rows fit, the columns keep their text, and the newest
+// line stays in view.
+void tst_LogInWindow::textSize()
+{
+    const WindowTest test(run(300, QTime(9, 0), "x"));
+    const QString other = test.folder() + "other.log";
+    QVERIFY(TestFiles::write(other, run(5, QTime(9, 0), "y")));
+    qreal size = 0;
+    int width = 0;
+    {
+        const auto window = WindowTest::show();
+        QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 300, Patience);
+        LogView* view = View(*window);
+        const qreal before = view->font().pointSizeF();
+        const int widthBefore = view->columnWidth(LogModel::TimeColumn);
+        for (int i = 0; i < 5; ++i)
+            QTest::keyClick(window.get(), Qt::Key_Plus, Qt::ControlModifier);
+        size = view->font().pointSizeF();
+        width = view->columnWidth(LogModel::TimeColumn);
+        QVERIFY(size > 1.5 * before && width > 1.4 * widthBefore);
+        QVERIFY(view->rowHeight(0) >= view->fontMetrics().height());
+        QVERIFY(view->viewport()->rect().contains(
+            view->visualRect(view->model()->index(299, LogModel::TimeColumn)).center()));
+        window->OpenFile(other);
+        QCOMPARE(View(*window)->font().pointSizeF(), size);
+        window->findChild<FileTabs*>()->setCurrentIndex(0);
+        window->close();
+    }
+    const auto window = WindowTest::show();
+    QCOMPARE(View(*window)->font().pointSizeF(), size);
+    QCOMPARE(View(*window)->columnWidth(LogModel::TimeColumn), width);
+    for (int i = 0; i < 100; ++i)
+        QTest::keyClick(window.get(), Qt::Key_Minus, Qt::ControlModifier);
+    QVERIFY(View(*window)->font().pointSizeF() > 1);
+    QTest::keyClick(window.get(), Qt::Key_0, Qt::ControlModifier);
+    QCOMPARE(View(*window)->font().pointSizeF(), QApplication::font().pointSizeF());
+}
+
+void tst_LogInWindow::wheelZooms()
+{
+    const WindowTest test(run(300, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 300, Patience);
+    auto* line = Child<QPlainTextEdit>(window.get(), "Full text of the current line");
+    LogView* view = View(*window);
+    const qreal before = view->font().pointSizeF();
+    const auto turn = [](QWidget* widget, int angle, Qt::KeyboardModifiers keys) {
+        const QPointF center = widget->rect().center();
+        QWheelEvent event(center, widget->mapToGlobal(center.toPoint()), QPoint(), QPoint(0, angle),
+                          angle, Qt::Vertical, Qt::NoButton, keys);
+        QCoreApplication::sendEvent(widget, &event);
+    };
+    turn(view->viewport(), 60, Qt::ControlModifier);
+    QCOMPARE(view->font().pointSizeF(), before); // half a step
+    turn(view->viewport(), 60, Qt::ControlModifier);
+    const qreal larger = view->font().pointSizeF();
+    QVERIFY(larger > before);
+    QVERIFY(Panel(*window)->isFollowing());
+    QCOMPARE(line->font().pointSizeF(), larger);
+    turn(line->viewport(), -120, Qt::ControlModifier);
+    QVERIFY(view->font().pointSizeF() < larger);
+    QCOMPARE(line->font().pointSizeF(), view->font().pointSizeF());
+
+    turn(view->viewport(), 120, Qt::NoModifier);
+    QVERIFY(!Panel(*window)->isFollowing()); // has scrolled
+}
+
+void tst_LogInWindow::monospacedFont()
+{
+    const WindowTest test(run(5, QTime(9, 0), "x"));
+    {
+        const auto window = WindowTest::show();
+        QVERIFY(!QFontInfo(View(*window)->font()).fixedPitch());
+        QTest::keyClick(window.get(), Qt::Key_M, Qt::ControlModifier | Qt::AltModifier);
+        QVERIFY(QFontInfo(View(*window)->font()).fixedPitch());
+        window->close();
+    }
+    const auto window = WindowTest::show();
+    QVERIFY(QFontInfo(View(*window)->font()).fixedPitch());
+    QVERIFY(Action(*window, "Monospaced Font")->isChecked());
 }
 
 QTEST_MAIN(tst_LogInWindow)

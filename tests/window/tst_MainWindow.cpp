@@ -10,12 +10,15 @@
 #include "app/window/ReportDialog.h"
 #include "app/window/SystemReport.h"
 #include "app/window/log/LogModel.h"
+#include "app/window/widgets/ElidedLabel.h"
 #include "app/window/widgets/NoticeBar.h"
 
 #include <QAbstractButton>
 #include <QClipboard>
+#include <QDesktopServices>
 #include <QDropEvent>
 #include <QFileDialog>
+#include <QLabel>
 #include <QLineEdit>
 #include <QLoggingCategory>
 #include <QMenuBar>
@@ -25,7 +28,9 @@
 #include <QPushButton>
 #include <QScreen>
 #include <QSplitter>
+#include <QStandardPaths>
 #include <QStatusBar>
+#include <QToolBar>
 #include <QToolButton>
 
 using namespace Velocor;
@@ -38,9 +43,24 @@ namespace {
 // The text in one of the locations, found the way assistive technology finds it.
 QString Place(MainWindow& window, QString const& name)
 {
-    auto const* field = Child<QLineEdit>(&window, name);
+    auto const* field = Child<QLabel>(&window, name);
     return field ? field->text() : QString();
 }
+
+// Takes what would be shown in another program.
+class UrlHandler : public QObject
+{
+    Q_OBJECT
+
+public:
+    UrlHandler() { QDesktopServices::setUrlHandler("file", this, "take"); }
+    ~UrlHandler() override { QDesktopServices::unsetUrlHandler("file"); }
+
+    QUrl url;
+
+public slots:
+    void take(QUrl const& taken) { url = taken; }
+};
 
 } // namespace
 
@@ -67,6 +87,10 @@ private slots:
     void dropsOnlyTheFirstFiles();
 
     void about();
+    void listsShortcuts();
+    void opensTheManual();
+    void toolBar();
+    void placesElidePaths();
     void saveReport();
 
     void keepsItsState();
@@ -112,6 +136,8 @@ void tst_MainWindow::identityAndPlaces()
     const WindowTest test;
     const auto window = WindowTest::show();
     QCOMPARE(window->windowTitle(), QString("Caption"));
+    QVERIFY(!window->findChild<PlacesPanel*>());
+    QTest::keyClick(window.get(), Qt::Key_F9);
     QCOMPARE(Place(*window, "Organization"), QString("Org"));
     QCOMPARE(Place(*window, "Product"), QString("Product"));
     QCOMPARE(Place(*window, "Installation"), test.folder() + "root/");
@@ -130,6 +156,7 @@ void tst_MainWindow::copiesAPlace()
 {
     const WindowTest test;
     const auto window = WindowTest::show();
+    QTest::keyClick(window.get(), Qt::Key_F9);
     Click(Child<QToolButton>(window.get(), "Copy: Log file"));
     QCOMPARE(QGuiApplication::clipboard()->text(), test.logFile());
     QCOMPARE(window->statusBar()->currentMessage(), QString("Copied: Log file"));
@@ -325,10 +352,105 @@ void tst_MainWindow::about()
         }
         QTest::keyClick(dialog, Qt::Key_Escape);
     });
-    QTest::keyClick(window.get(), Qt::Key_F1);
+    QTest::keyClick(window.get(), Qt::Key_F1, Qt::ShiftModifier);
     const QString copied = QGuiApplication::clipboard()->text();
-    QVERIFY2(copied.contains("Running with Qt: ") && copied.contains(test.logFile()),
-             qPrintable(copied));
+    for (QString const& part : {QString("License: MIT\n"), QString("\nrapidxml: "),
+                                QString("\nRunning with Qt: "), test.logFile()})
+        QVERIFY2(copied.contains(part), qPrintable(copied));
+}
+
+// Whatever the menus have, and the buttons with keys of their own.
+void tst_MainWindow::listsShortcuts()
+{
+    const WindowTest test;
+    const auto window = WindowTest::show();
+    QString list;
+    WindowTest::whenShown<ReportDialog>([&](ReportDialog* dialog) {
+        list = Child<QPlainTextEdit>(dialog, "Keyboard Shortcuts")->toPlainText();
+        QTest::keyClick(dialog, Qt::Key_Escape);
+    });
+    QTest::keyClick(window.get(), Qt::Key_F1, Qt::ControlModifier);
+    int actions = 0;
+    for (QMenu const* menu : window->menuBar()->findChildren<QMenu*>()) {
+        for (QAction const* action : menu->actions()) {
+            if (action->shortcut().isEmpty())
+                continue;
+            const QRegularExpression line(
+                "(?m)^  " +
+                QRegularExpression::escape(action->shortcut().toString(QKeySequence::NativeText)) +
+                " +" + QRegularExpression::escape(action->statusTip()) + "$");
+            QVERIFY2(line.match(list).hasMatch(), qPrintable(action->text() + list));
+            ++actions;
+        }
+    }
+    QVERIFY(actions > 15);
+    QVERIFY2(list.contains(QRegularExpression("(?m)^  Ctrl\\+4 +Show Error$")), qPrintable(list));
+    QCOMPARE(list.count("Show Error"), 1);
+}
+
+void tst_MainWindow::opensTheManual()
+{
+    const WindowTest test;
+    const auto window = WindowTest::show();
+    const QString folder =
+        QStandardPaths::writableLocation(QStandardPaths::GenericDataLocation) + "/doc/velocor/";
+    QFile::remove(folder + "window.md");
+    UrlHandler handler;
+    QTest::keyClick(window.get(), Qt::Key_F1);
+    if (handler.url.isEmpty()) // one may be installed on this system
+        QVERIFY2(window->statusBar()->currentMessage().startsWith("The manual is not installed"),
+                 qPrintable(window->statusBar()->currentMessage()));
+    QVERIFY(TestFiles::write(folder + "window.md", "# The window\n"));
+    QTest::keyClick(window.get(), Qt::Key_F1);
+    QCOMPARE(handler.url, QUrl::fromLocalFile(folder + "window.md"));
+    QVERIFY(QFile::remove(folder + "window.md"));
+}
+
+// They do what the menu items do, and say which keys do the same.
+void tst_MainWindow::toolBar()
+{
+    const WindowTest test(run(100, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+    auto const* bar = Child<QToolBar>(window.get(), "Tools");
+    const auto button = [&](char const* text) {
+        return static_cast<QToolButton*>(bar->widgetForAction(Action(*window, text)));
+    };
+    for (char const* text : {"Open...", "Reload", "Pause", "Follow Newest", "Previous Problem",
+                             "Next Problem", "Filter", "Places"}) {
+        QVERIFY2(button(text) && button(text)->isVisible(), text);
+        QVERIFY2(!button(text)->icon().isNull(), text);
+        const QString keys = Action(*window, text)->shortcut().toString();
+        QVERIFY2(button(text)->toolTip().endsWith("(" + keys + ")"), text);
+    }
+    Click(button("Pause"));
+    QVERIFY(Panel(*window)->isPaused());
+    Click(button("Pause"));
+    QVERIFY(!Panel(*window)->isPaused());
+    Click(button("Follow Newest"));
+    QVERIFY(!Panel(*window)->isFollowing());
+    Click(button("Next Problem"));
+    QVERIFY(View(*window)->currentIndex().isValid());
+    Click(button("Filter"));
+    QCOMPARE(QApplication::focusWidget()->accessibleName(), QString("Filter by text"));
+    Click(button("Places"));
+    QVERIFY(window->findChild<PlacesPanel*>()->isVisible());
+    Click(button("Places"));
+    QVERIFY(!window->findChild<PlacesPanel*>()->isVisible());
+}
+
+// The middle of a path is left out, not its file name.
+void tst_MainWindow::placesElidePaths()
+{
+    const WindowTest test;
+    QCoreApplication::instance()->setProperty(
+        "DocPath", "/home/" + QString("a-long-name/").repeated(30) + "documents/");
+    const auto window = WindowTest::show();
+    QTest::keyClick(window.get(), Qt::Key_F9);
+    auto const* place = static_cast<ElidedLabel*>(Child<QLabel>(window.get(), "Documents"));
+    QVERIFY2(place->ShownText().startsWith("/home/"), qPrintable(place->ShownText()));
+    QVERIFY2(place->ShownText().endsWith("documents/"), qPrintable(place->ShownText()));
+    QVERIFY(place->toolTip().contains(QString("a-long-name/").repeated(30)));
 }
 
 // Nothing of a long one is missing: neither on the screen nor in the file nor in the clipboard.
@@ -374,7 +496,7 @@ void tst_MainWindow::keepsItsState()
         window->setGeometry(60, 70, 640, 420);
         QTest::qWait(100);
         QTest::keyClick(window.get(), Qt::Key_F9);
-        QTest::keyClick(window.get(), Qt::Key_F9);
+        QTest::keyClick(window.get(), Qt::Key_B, Qt::ControlModifier | Qt::AltModifier);
         window->findChild<QSplitter*>()->setSizes({220, 420});
         View(*window)->setColumnWidth(LogModel::TimeColumn, 123);
         QTest::qWait(100);
@@ -391,12 +513,16 @@ void tst_MainWindow::keepsItsState()
         QVERIFY((window->pos() - geometry.topLeft()).manhattanLength() < 100);
         QCOMPARE(window->findChild<QSplitter*>()->sizes(), panes);
         QCOMPARE(View(*window)->columnWidth(LogModel::TimeColumn), 123);
+        QVERIFY(!window->findChild<QToolBar*>()->isVisible());
+        QVERIFY(!Action(*window, "Tool Bar")->isChecked());
         QTest::keyClick(window.get(), Qt::Key_F9);
+        QTest::keyClick(window.get(), Qt::Key_B, Qt::ControlModifier | Qt::AltModifier);
         window->close();
     }
     const auto window = WindowTest::show();
-    QVERIFY(!window->findChild<PlacesPanel*>()->isVisible());
+    QVERIFY(!window->findChild<PlacesPanel*>());
     QVERIFY(!Action(*window, "Places")->isChecked());
+    QVERIFY(window->findChild<QToolBar*>()->isVisible());
 }
 
 void tst_MainWindow::damagedState()

@@ -126,6 +126,7 @@ void tst_WindowAccessibility::names()
     QVERIFY(TestFiles::write(test.folder() + "some.cfg", Settings));
     QVERIFY(TestFiles::write(test.folder() + "broken.cfg", "<a"));
     const auto window = WindowTest::show();
+    QTest::keyClick(window.get(), Qt::Key_F9);
     window->OpenFile(test.folder() + "some.cfg");
     window->OpenFile(test.folder() + "broken.cfg");
     const QStringList nameless = NamelessControls(window.get());
@@ -205,6 +206,7 @@ void tst_WindowAccessibility::tabOrder()
     const WindowTest test(run(5, QTime(9, 0), "x"));
     const auto window = WindowTest::show();
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    QTest::keyClick(window.get(), Qt::Key_F9);
     Child<QComboBox>(window.get(), "Log file")->setFocus();
     QStringList order;
     for (int i = 0; i < 60 && (order.isEmpty() ||
@@ -216,14 +218,14 @@ void tst_WindowAccessibility::tabOrder()
                                                                   : widget->accessibleName());
         QTest::keyClick(QApplication::focusWidget(), Qt::Key_Tab);
     }
-    QCOMPARE(QStringList(order.mid(0, 11)),
-             QStringList({"Log file", "Pause", "Follow newest", "Filter by text", "Match case",
-                          "Regular expression", "Show Trace", "Show Notification", "Show Warning",
-                          "Show Error", "Show Fatal"}));
+    QCOMPARE(
+        QStringList(order.mid(0, 9)),
+        QStringList({"Log file", "Filter by text", "Match case", "Regular expression", "Show Trace",
+                     "Show Notification", "Show Warning", "Show Error", "Show Fatal"}));
     QVERIFY(order.contains("Log entries"));
     QVERIFY(order.contains("Full text of the current line"));
     QVERIFY(order.contains("Copy: Organization"));
-    QVERIFY(order.size() < 60);
+    QVERIFY2(order.size() < 60, qPrintable(order.join("; ")));
 }
 
 QTEST_MAIN(tst_WindowAccessibility)

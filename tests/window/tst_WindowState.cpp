@@ -8,6 +8,7 @@
 #include "app/runninglog/LogPreferences.h"
 #include "app/runninglog/RunningLog.h"
 #include "app/window/RecentFiles.h"
+#include "app/window/ReportDialog.h"
 #include "app/window/SystemReport.h"
 #include "app/window/WindowSettings.h"
 #include "app/window/widgets/FileSizeText.h"
@@ -53,6 +54,7 @@ private slots:
     void reportIncludesOlderFiles_data();
     void reportIncludesOlderFiles();
     void reportOfATroubledLog();
+    void fullDiskLeavesTheOldReport();
     void severityIcons();
 };
 
@@ -438,6 +440,20 @@ double Contrast(QColor const& a, QColor const& b)
 }
 
 } // namespace
+
+void tst_WindowState::fullDiskLeavesTheOldReport()
+{
+    const WindowTest test;
+    const QString file = test.folder() + "report.txt";
+    QVERIFY(TestFiles::write(file, "old"));
+    const ReportDialog dialog("T", "H", QString(100000, 'x'), true);
+    if (!ProcessLimits::limitFileSize(1000))
+        QSKIP("the size of files cannot be limited here");
+    const QString error = dialog.SaveTo(file);
+    ProcessLimits::unlimitFileSize();
+    QVERIFY(!error.isEmpty());
+    QCOMPARE(TestFiles::read(file), QByteArray("old"));
+}
 
 void tst_WindowState::severityIcons()
 {

@@ -5,6 +5,7 @@
 
 #include "app/window/log/LogModel.h"
 #include "app/window/log/TickScrollBar.h"
+#include "app/window/widgets/BlendedColor.h"
 #include "app/window/widgets/SeverityIcons.h"
 
 #include <QApplication>
@@ -18,13 +19,6 @@ constexpr int MarkWidth = 3; // pixels
 
 // Dimmed, but still with a contrast of more than 4.5:1.
 constexpr qreal ContextFade = 0.4;
-
-QColor Blended(QColor const& a, QColor const& b, qreal share)
-{
-    return QColor::fromRgbF(a.redF() * (1 - share) + b.redF() * share,
-                            a.greenF() * (1 - share) + b.greenF() * share,
-                            a.blueF() * (1 - share) + b.blueF() * share);
-}
 
 QStyle const* StyleOf(QStyleOptionViewItem const& option)
 {
@@ -78,8 +72,11 @@ void LogDelegate::initStyleOption(QStyleOptionViewItem* option, QModelIndex cons
     const auto severity =
         static_cast<LogEntry::Severity>(index.data(LogModel::SeverityRole).toInt());
     if (index.data(LogModel::EarlierRole).toBool())
-        option->backgroundBrush = Blended(option->palette.color(QPalette::Base),
-                                          option->palette.color(QPalette::Text), 0.045);
+        option->backgroundBrush =
+            Blended(option->palette.color(option->features & QStyleOptionViewItem::Alternate
+                                              ? QPalette::AlternateBase
+                                              : QPalette::Base),
+                    option->palette.color(QPalette::Text), 0.045);
     if (index.data(LogModel::ContextRole).toBool())
         option->palette.setColor(QPalette::Text,
                                  Blended(option->palette.color(QPalette::Text),

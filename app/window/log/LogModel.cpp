@@ -368,6 +368,18 @@ QString LogModel::LineText(int row, int limit) const
     return whole.startsWith(line.start) ? m_parser.Text(whole) : GoneText();
 }
 
+QString LogModel::MessageText(int row) const
+{
+    if (row < 0 || row >= m_rowCount || isHeading(row))
+        return QString();
+    Line const* known = knownLine(row);
+    const Line line = known ? *known : readLine(row);
+    if (line.isGone || line.isTorn)
+        return LineText(row, LogIndex::LineLimit);
+    const QByteArray whole = readBytes(row, LogIndex::LineLimit);
+    return whole.startsWith(line.start) ? m_parser.Parse(whole).message : line.entry.message;
+}
+
 QPair<int, int> LogModel::EntryRows(int row) const
 {
     std::vector<quint8> const& marks = m_state.rows->marks;

@@ -91,6 +91,9 @@ public:
     /// @param limit  maximum number of bytes to read
     QString LineText(int row, int limit) const;
 
+    /// The message of a row, whole even if the row shows only its start.
+    QString MessageText(int row) const;
+
     /// The first and the last row of the entry that a row belongs to: its first line and the lines
     /// that follow without a stamp. Of a line that belongs to no entry, and of a heading, the row
     /// itself.

@@ -6,6 +6,7 @@
 #include "app/logfile/LogFileList.h"
 #include "app/logfile/LogIndex.h"
 #include "app/window/log/GoToDialog.h"
+#include "app/window/log/LinesAsText.h"
 #include "app/window/log/LogFilterBar.h"
 #include "app/window/log/LogFindBar.h"
 #include "app/window/log/LogGoTo.h"
@@ -20,9 +21,10 @@
 #include "app/window/widgets/FileSizeText.h"
 #include "app/window/widgets/PlainText.h"
 
-#include <QCheckBox>
+#include <QClipboard>
 #include <QComboBox>
 #include <QFileInfo>
+#include <QGuiApplication>
 #include <QHBoxLayout>
 #include <QKeyEvent>
 #include <QLabel>
@@ -31,6 +33,7 @@
 #include <QPlainTextEdit>
 #include <QSignalBlocker>
 #include <QSplitter>
+#include <QWheelEvent>
 
 #include <algorithm>
 #include <functional>
@@ -58,13 +61,17 @@ LogPanel::LogPanel(QWidget* parent)
     : QWidget(parent), m_model(new LogModel(this)), m_view(new LogView(m_model)),
       m_filterBar(new LogFilterBar), m_findBar(new LogFindBar),
       m_search(new LogSearch(m_model, this)), m_goTo(new LogGoTo(m_model, this)),
-      m_marks(new LogMarks(m_model, this)), m_pause(new QCheckBox(tr("Pause"))),
-      m_follow(new QCheckBox(tr("Follow newest"))), m_splitter(new QSplitter(Qt::Vertical))
+      m_marks(new LogMarks(m_model, this)), m_splitter(new QSplitter(Qt::Vertical))
 {
     makeControls();
     makeLayout();
     connectAll();
-    setFocusProxy(m_view);
+}
+
+// Not a focus proxy: coming from the widget before this one, Tab would skip all up to the table.
+void LogPanel::focusInEvent(QFocusEvent*)
+{
+    m_view->setFocus();
 }
 
 void LogPanel::makeControls()
@@ -78,11 +85,6 @@ void LogPanel::makeControls()
     m_files->setToolTip(PlainToolTip(tr("The current log file and older log files")));
     m_files->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon);
     m_files->setMinimumContentsLength(16);
-
-    m_pause->setToolTip(
-        PlainToolTip(tr("Stop updating the view while logging continues (Ctrl+Shift+P)")));
-    m_follow->setToolTip(PlainToolTip(tr("Scroll to new entries as they arrive (Ctrl+Shift+N)")));
-    m_follow->setChecked(true);
 
     m_note = new ElidedLabel(Qt::ElideRight);
     m_note->setAccessibleName(tr("Note on the current line"));
@@ -105,8 +107,6 @@ void LogPanel::makeLayout()
     top->setSpacing(8);
     top->addWidget(label);
     top->addWidget(m_files, 1);
-    top->addWidget(m_pause);
-    top->addWidget(m_follow);
 
     auto* table = new QWidget;
     auto* tableLayout = new QVBoxLayout(table);
@@ -140,9 +140,9 @@ void LogPanel::makeLayout()
 
 void LogPanel::connectAll()
 {
+    m_view->viewport()->installEventFilter(this);
+    m_line->viewport()->installEventFilter(this);
     connect(m_files, QOverload<int>::of(&QComboBox::activated), this, &LogPanel::chooseFile);
-    connect(m_pause, &QCheckBox::toggled, this, &LogPanel::SetPaused);
-    connect(m_follow, &QCheckBox::toggled, this, &LogPanel::SetFollowing);
     connect(m_filterBar, &LogFilterBar::filterChanged, this, [this] {
         m_model->SetFilter(m_filterBar->filter());
         m_view->UpdateMarks();
@@ -161,10 +161,7 @@ void LogPanel::connectAll()
     connect(m_line, &QWidget::customContextMenuRequested, this, &LogPanel::showLineMenu);
     connect(m_view, &LogView::menuRequested, this, &LogPanel::showMenu);
     connect(m_search, &LogSearch::changed, this, &LogPanel::showFound);
-    connect(m_view, &LogView::followingChanged, this, [this](bool following) {
-        m_follow->setChecked(following);
-        Q_EMIT stateChanged();
-    });
+    connect(m_view, &LogView::followingChanged, this, &LogPanel::stateChanged);
     connect(m_view->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
             &LogPanel::showCurrentLine);
     connect(m_view->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
@@ -232,7 +229,6 @@ void LogPanel::Reload()
 void LogPanel::SetPaused(bool paused)
 {
     m_model->SetPaused(paused);
-    m_pause->setChecked(paused);
     Q_EMIT stateChanged();
 }
 
@@ -244,7 +240,6 @@ bool LogPanel::isPaused() const
 void LogPanel::SetFollowing(bool following)
 {
     m_view->SetFollowing(following);
-    m_follow->setChecked(following);
 }
 
 bool LogPanel::isFollowing() const
@@ -271,6 +266,45 @@ void LogPanel::SetEncoding(LogEncoding encoding)
 LogEncoding LogPanel::chosenEncoding() const
 {
     return m_model->chosenEncoding();
+}
+
+void LogPanel::SetTextFont(QFont const& font)
+{
+    const auto timeWidth = [this] {
+        return QFontMetricsF(m_view->font())
+            .boundingRect(QStringLiteral("2000-00-00 00:00:00.000"))
+            .width();
+    };
+    const qreal before = timeWidth();
+    QList<int> widths = columnWidths();
+    m_view->setFont(font);
+    m_line->setFont(font);
+    const qreal factor = timeWidth() / before;
+    for (int& width : widths)
+        width = qRound(width * factor);
+    SetColumnWidths(widths);
+}
+
+// A read-only text would zoom by itself, and the table would scroll.
+bool LogPanel::eventFilter(QObject* object, QEvent* event)
+{
+    if (event->type() != QEvent::Wheel)
+        return QWidget::eventFilter(object, event);
+    auto const* wheel = static_cast<QWheelEvent const*>(event);
+    if (!(wheel->modifiers() & Qt::ControlModifier))
+        return false;
+    m_wheel += wheel->angleDelta().y();
+    const int steps = m_wheel / QWheelEvent::DefaultDeltasPerStep;
+    m_wheel -= steps * QWheelEvent::DefaultDeltasPerStep;
+    if (steps != 0)
+        Q_EMIT zoomRequested(steps);
+    return true;
+}
+
+void LogPanel::AddBar(QWidget* bar)
+{
+    auto* all = static_cast<QVBoxLayout*>(layout());
+    all->insertWidget(all->indexOf(m_splitter), bar);
 }
 
 void LogPanel::FocusFilter()
@@ -489,7 +523,44 @@ void LogPanel::showMenu(QPoint const& position, QModelIndex const& cell)
 
 void LogPanel::CopySelected()
 {
-    const int count = m_view->CopySelected();
+    reportCopied(m_view->CopySelected());
+}
+
+void LogPanel::CopyAsMarkdown()
+{
+    const QList<int> rows = m_view->SelectedRows();
+    copyRows(rows, LinesAsText::Markdown(*m_model, rows));
+}
+
+void LogPanel::CopyAsCsv()
+{
+    const QList<int> rows = m_view->SelectedRows();
+    copyRows(rows, LinesAsText::Csv(*m_model, rows));
+}
+
+void LogPanel::copyRows(QList<int> const& rows, QString const& text)
+{
+    const auto count = std::count_if(rows.begin(), rows.end(),
+                                     [this](int row) { return m_model->LineStart(row) >= 0; });
+    if (count > 0)
+        QGuiApplication::clipboard()->setText(text);
+    reportCopied(static_cast<int>(count));
+}
+
+QVector<qint64> LogPanel::LineStarts() const
+{
+    QVector<qint64> starts;
+    starts.reserve(m_model->rowCount());
+    for (int row = 0; row < m_model->rowCount(); ++row) {
+        const qint64 start = m_model->LineStart(row);
+        if (start >= 0) // not a heading
+            starts.append(start);
+    }
+    return starts;
+}
+
+void LogPanel::reportCopied(int count)
+{
     if (count == 0)
         Q_EMIT messageReported(tr("No lines selected"));
     else if (count >= LogView::MaximumCopiedLines)
@@ -554,11 +625,12 @@ void LogPanel::updatePlaceholder()
     else if (!state.error.isEmpty())
         m_view->SetPlaceholder(tr("Cannot read %1:\n%2").arg(path(), state.error));
     else if (!state.exists)
-        m_view->SetPlaceholder(tr("%1 does not exist.").arg(path()));
+        m_view->SetPlaceholder(
+            tr("%1 does not exist.\nIt is shown here as soon as it is created.").arg(path()));
     else if (state.lines > 0)
-        m_view->SetPlaceholder(tr("No lines match the filter."));
+        m_view->SetPlaceholder(tr("No lines match the filter.\nClear it with Ctrl+Shift+F."));
     else
-        m_view->SetPlaceholder(tr("The log is empty."));
+        m_view->SetPlaceholder(tr("The log is empty.\nNew lines appear here as they are written."));
 }
 
 void LogPanel::showCurrentLine()

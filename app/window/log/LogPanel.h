@@ -13,7 +13,6 @@
 
 #include <memory>
 
-class QCheckBox;
 class QComboBox;
 class QPlainTextEdit;
 class QMenu;
@@ -62,6 +61,13 @@ public:
     void SetEncoding(LogEncoding encoding);
     LogEncoding chosenEncoding() const;
 
+    /// Sets the font of the table and of the current line; a default QFont is the application's.
+    /// The columns keep their widths in characters.
+    void SetTextFont(QFont const& font);
+
+    /// Adds a bar above the table. The panel takes ownership.
+    void AddBar(QWidget* bar);
+
     void FocusFilter();
     void ClearFilter();
 
@@ -93,6 +99,13 @@ public:
     void GoToMark(int step);
 
     void CopySelected();
+
+    /// Copies the selected lines as a Markdown code block, or as CSV.
+    void CopyAsMarkdown();
+    void CopyAsCsv();
+
+    /// Where the lines shown start in the file, in the order shown.
+    QVector<qint64> LineStarts() const;
     void SelectAll();
 
     /// Goes to the next (step 1) or previous (step -1) warning or worse, or reports that
@@ -120,10 +133,17 @@ Q_SIGNALS:
     /// A message for the status bar.
     void messageReported(QString const& text);
 
+    /// Ctrl and the mouse wheel: larger (1) or smaller (-1) text.
+    void zoomRequested(int steps);
+
 protected:
     void keyPressEvent(QKeyEvent* event) override;
+    bool eventFilter(QObject* object, QEvent* event) override;
+    void focusInEvent(QFocusEvent* event) override;
 
 private:
+    void copyRows(QList<int> const& rows, QString const& text);
+    void reportCopied(int count);
     void makeControls();
     void makeLayout();
     void connectAll();
@@ -150,14 +170,13 @@ private:
     LogGoTo* m_goTo;
     LogMarks* m_marks;
     QComboBox* m_files = nullptr;
-    QCheckBox* m_pause;
-    QCheckBox* m_follow;
     QPlainTextEdit* m_line = nullptr;
     ElidedLabel* m_note = nullptr;
     QSplitter* m_splitter;
     QString m_currentPath; // the log of the running program; empty for other logs
     int m_percent = 100;
     int m_wantedStep = 0; // to a hit that has not been found yet
+    int m_wheel = 0;      // eighths of a degree that have not zoomed yet
 };
 
 } // namespace Velocor

@@ -8,6 +8,7 @@
 #include "app/window/log/LogDelegate.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/TickScrollBar.h"
+#include "app/window/widgets/RowHeight.h"
 
 #include <QAbstractButton>
 #include <QClipboard>
@@ -49,6 +50,7 @@ void LogView::setUp()
     setVerticalScrollMode(ScrollPerItem);
     setHorizontalScrollMode(ScrollPerPixel);
     setTextElideMode(Qt::ElideRight);
+    setAlternatingRowColors(true);
     verticalHeader()->hide();
     verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
     horizontalHeader()->setStretchLastSection(true);
@@ -65,7 +67,7 @@ void LogView::setUp()
 void LogView::setRowHeight()
 {
     verticalHeader()->setMinimumSectionSize(1);
-    verticalHeader()->setDefaultSectionSize(fontMetrics().height() + 6);
+    verticalHeader()->setDefaultSectionSize(RowHeight(fontMetrics()));
 }
 
 void LogView::SetDefaultWidths()
@@ -85,8 +87,14 @@ void LogView::SetDefaultWidths()
 void LogView::changeEvent(QEvent* event)
 {
     QTableView::changeEvent(event);
-    if (event->type() == QEvent::FontChange || event->type() == QEvent::StyleChange)
-        setRowHeight();
+    if (event->type() != QEvent::FontChange && event->type() != QEvent::StyleChange)
+        return;
+    setRowHeight();
+    if (!m_following)
+        return;
+    const QScopedValueRollback<bool> guard(m_scrollingItself, true);
+    updateGeometries(); // updates the scroll bar's range
+    scrollToBottom();
 }
 
 // A lower view would show the same first row, and no longer the newest one.
@@ -290,7 +298,7 @@ void LogView::SetFound(LogFilter const& found)
     viewport()->update();
 }
 
-QList<int> LogView::selectedRowNumbers() const
+QList<int> LogView::SelectedRows() const
 {
     QList<int> rows;
     const QItemSelection selection = selectionModel()->selection();
@@ -306,7 +314,7 @@ QList<int> LogView::selectedRowNumbers() const
 
 int LogView::CopySelected()
 {
-    const QList<int> rows = selectedRowNumbers();
+    const QList<int> rows = SelectedRows();
     QString text;
     int count = 0;
     int next = 0; // the lines before are copied

@@ -58,6 +58,9 @@ public:
     /// @return the number of lines copied
     int CopySelected();
 
+    /// The numbers of the selected rows in ascending order, at most MaximumCopiedLines.
+    QList<int> SelectedRows() const;
+
     /// The text that is shown while the table is empty.
     void SetPlaceholder(QString const& text);
 
@@ -98,7 +101,6 @@ private:
     void setRowHeight();
     void fitTimes();
     void updateHeadings();
-    QList<int> selectedRowNumbers() const;
 
     LogModel* m_model;
     LogDelegate* m_delegate;

@@ -8,6 +8,7 @@
 #include "app/window/settings/ValueDialog.h"
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
+#include "app/window/widgets/RowHeight.h"
 #include "app/window/widgets/TextDialog.h"
 #include "common/config/TorkConfigText.h"
 
@@ -80,6 +81,12 @@ public:
 
     std::function<void()> editLong;
     std::function<void(bool)> noteEditing;
+
+    QSize sizeHint(QStyleOptionViewItem const& option, QModelIndex const& index) const override
+    {
+        const QSize size = QStyledItemDelegate::sizeHint(option, index);
+        return QSize(size.width(), RowHeight(option.fontMetrics));
+    }
 
     QWidget* createEditor(QWidget* parent, QStyleOptionViewItem const& option,
                           QModelIndex const& index) const override

@@ -3,29 +3,37 @@
 
 #include "app/window/widgets/NoticeBar.h"
 
+#include "app/window/widgets/BlendedColor.h"
 #include "app/window/widgets/PlainText.h"
 #include "app/window/widgets/SeverityIcons.h"
 
+#include <QEvent>
+#include <QGuiApplication>
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QPushButton>
 
 namespace Velocor {
 
-NoticeBar::NoticeBar(QWidget* parent)
+namespace {
+
+constexpr qreal Tint = 0.18;
+
+} // namespace
+
+NoticeBar::NoticeBar(QString const& name, QWidget* parent)
     : QFrame(parent), m_icon(NewPlainLabel()), m_label(NewPlainLabel())
 {
     setFrameShape(StyledPanel);
     setAutoFillBackground(true);
-    setBackgroundRole(QPalette::Base);
     m_label->setWordWrap(true);
     m_label->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
-    m_label->setAccessibleName(tr("Notice"));
-    m_icon->setAccessibleName(tr("Notice icon"));
+    m_label->setAccessibleName(name);
+    m_icon->setAccessibleName(tr("%1 icon").arg(name));
 
     auto* dismiss = new QPushButton(tr("Dismiss"));
     dismiss->setAutoDefault(false);
-    dismiss->setAccessibleName(tr("Dismiss notice"));
+    dismiss->setAccessibleName(tr("Dismiss %1").arg(name.toLower()));
     connect(dismiss, &QPushButton::clicked, this, &NoticeBar::Dismiss);
 
     auto* layout = new QHBoxLayout(this);
@@ -34,12 +42,39 @@ NoticeBar::NoticeBar(QWidget* parent)
     layout->addWidget(m_icon);
     layout->addWidget(m_label, 1);
     layout->addWidget(dismiss, 0, Qt::AlignTop);
+    updateColors();
     hide();
+}
+
+void NoticeBar::updateColors()
+{
+    QPalette const& outer = parentWidget() ? parentWidget()->palette() : QGuiApplication::palette();
+    const QColor warning = SeverityIcons::Color(LogEntry::Warning, outer);
+    QPalette colors; // sets only this role, so the others still follow the window's palette
+    colors.setColor(QPalette::Window, Blended(outer.color(QPalette::Base), warning, Tint));
+    if (palette().color(QPalette::Window) != colors.color(QPalette::Window))
+        setPalette(colors);
+    m_icon->setPixmap(SeverityIcons::Icon(LogEntry::Warning, outer).pixmap(16));
+}
+
+void NoticeBar::changeEvent(QEvent* event)
+{
+    QFrame::changeEvent(event);
+    if (event->type() == QEvent::PaletteChange || event->type() == QEvent::ParentChange)
+        updateColors();
+}
+
+void NoticeBar::SetState(QString const& state)
+{
+    if (state == m_state)
+        return;
+    m_state = state;
+    m_label->setText(state);
+    setVisible(!state.isEmpty());
 }
 
 void NoticeBar::ShowMessage(QString const& text)
 {
-    m_icon->setPixmap(SeverityIcons::Icon(LogEntry::Warning, palette()).pixmap(16));
     m_label->setText(isHidden() ? text : m_label->text() + QLatin1Char('\n') + text);
     show();
 }

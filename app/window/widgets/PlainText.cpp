@@ -5,8 +5,10 @@
 
 #include "app/window/widgets/FileSizeText.h"
 
+#include <QCoreApplication>
 #include <QLabel>
 #include <QTextDocument>
+#include <QVariant>
 
 namespace Velocor {
 
@@ -48,8 +50,8 @@ QLabel* NewPlainLabel(QString const& text)
 // informative text when that is first set, and that label opens links itself.
 PlainMessageBox::PlainMessageBox(Icon icon, QWidget* parent, QString const& text,
                                  StandardButtons buttons, QString const& details)
-    : QMessageBox(icon, parent ? parent->window()->windowTitle() : QString(), QString(), buttons,
-                  parent)
+    : QMessageBox(icon, QCoreApplication::instance()->property("caption").toString(), QString(),
+                  buttons, parent)
 {
     if (!details.isEmpty())
         setInformativeText(QStringLiteral(" "));

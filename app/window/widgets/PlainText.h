@@ -45,7 +45,7 @@ QLabel* NewPlainLabel(QString const& text = QString());
 class PlainMessageBox : public QMessageBox
 {
 public:
-    /// The title is that of the parent's window.
+    /// The title is the application's "caption", like that of every message box.
     ///
     /// @param text  shown in full; the caller limits its length
     PlainMessageBox(Icon icon, QWidget* parent, QString const& text, StandardButtons buttons = Ok,

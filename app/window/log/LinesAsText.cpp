@@ -1,0 +1,85 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/log/LinesAsText.h"
+
+#include "app/logfile/LogIndex.h"
+#include "app/window/log/LogModel.h"
+
+#include <algorithm>
+
+namespace Velocor {
+
+namespace {
+
+constexpr QLatin1Char Quote('"');
+
+bool IsHeading(LogModel const& model, int row)
+{
+    return model.index(row, 0).data(LogModel::HeadingRole).toBool();
+}
+
+int LongestRun(QString const& text, QChar character)
+{
+    int longest = 0;
+    int length = 0;
+    for (QChar c : text) {
+        length = c == character ? length + 1 : 0;
+        longest = std::max(longest, length);
+    }
+    return longest;
+}
+
+QString Field(QString text)
+{
+    return Quote + text.replace(Quote, QLatin1String("\"\"")) + Quote;
+}
+
+QString Record(QStringList const& fields)
+{
+    return fields.join(QLatin1Char(',')) + QLatin1String("\r\n");
+}
+
+QString ColumnName(LogModel const& model, int column)
+{
+    return model.headerData(column, Qt::Horizontal, Qt::DisplayRole).toString();
+}
+
+QString CellText(LogModel const& model, int row, int column)
+{
+    return column == LogModel::MessageColumn ? model.MessageText(row)
+                                             : model.index(row, column).data().toString();
+}
+
+} // namespace
+
+QString LinesAsText::Markdown(LogModel const& model, QList<int> const& rows)
+{
+    QString lines;
+    for (int row : rows) {
+        if (!IsHeading(model, row))
+            lines += model.LineText(row, LogIndex::LineLimit) + QLatin1Char('\n');
+    }
+    const QChar tick = QLatin1Char('`');
+    const QString fence(std::max(3, LongestRun(lines, tick) + 1), tick);
+    return fence + QLatin1Char('\n') + lines + fence + QLatin1Char('\n');
+}
+
+QString LinesAsText::Csv(LogModel const& model, QList<int> const& rows)
+{
+    QStringList names;
+    for (int column = 0; column < model.columnCount(); ++column)
+        names.append(Field(ColumnName(model, column)));
+    QString text = Record(names);
+    for (int row : rows) {
+        if (IsHeading(model, row))
+            continue;
+        QStringList fields;
+        for (int column = 0; column < model.columnCount(); ++column)
+            fields.append(Field(CellText(model, row, column)));
+        text += Record(fields);
+    }
+    return text;
+}
+
+} // namespace Velocor
