@@ -75,9 +75,11 @@ CrashDisk::CrashDisk(State const& base, QVector<Operation> const& record) : m_ba
         step.bytes = operation.bytes;
         switch (operation.kind) {
         case DiskRecorder::Open: {
-            const QByteArray folder = operation.path.isEmpty() || operation.path.endsWith('/')
-                                          ? operation.path
-                                          : operation.path + '/';
+            QByteArray folder = operation.path;
+            if (folder == "." || folder.endsWith("/.")) // a folder in itself
+                folder.chop(1);
+            if (!folder.isEmpty() && !folder.endsWith('/'))
+                folder += '/';
             const bool isUnnamed = (operation.flags & O_TMPFILE) == O_TMPFILE;
             const bool isFolder = !isUnnamed && (folder.isEmpty() || now.folders.contains(folder));
             const bool isThere = now.files.contains(operation.path);
