@@ -80,6 +80,23 @@ bool IsBlank(char c)
     return c == ' ' || c == '\t';
 }
 
+// The bracket that closes this one; '\0' if it is none.
+char ClosingOf(char c)
+{
+    switch (c) {
+    case '[':
+        return ']';
+    case '(':
+        return ')';
+    case '<':
+        return '>';
+    case '{':
+        return '}';
+    default:
+        return '\0';
+    }
+}
+
 int RankOf(LogField const& field)
 {
     int rank = 0;
@@ -359,19 +376,12 @@ private:
     // begins.
     LogEntry::Severity readWord(bool isFirst, int& next, bool& endsTag) const
     {
-        const char c = m_text[m_at];
-        const char closing = c == '['   ? ']'
-                             : c == '(' ? ')'
-                             : c == '<' ? '>'
-                             : c == '{' ? '}'
-                                        : '\0';
+        const char closing = ClosingOf(m_text[m_at]);
         char const* const end = m_text + m_length;
-        if (closing != '\0') {
-            char const* const close = std::find(m_text + m_at, end, closing);
-            if (close != end) {
-                next = static_cast<int>(close - m_text) + 1;
-                return severityIn(m_at + 1, next - 1);
-            }
+        char const* const close = closing == '\0' ? end : std::find(m_text + m_at, end, closing);
+        if (close != end) {
+            next = static_cast<int>(close - m_text) + 1;
+            return severityIn(m_at + 1, next - 1);
         }
         int at = m_at;
         while (at < m_length && (IsLetter(m_text[at]) || (at > m_at && IsAsciiDigit(m_text[at]))))
@@ -425,13 +435,13 @@ private:
     // Where the message starts after a severity at m_at.
     int afterSeverity()
     {
-        const bool isBracketed = !IsLetter(m_text[m_at]);
-        const char closing = m_text[m_at] == '[' ? ']' : m_text[m_at] == '(' ? ')' : '>';
-        while (m_at < m_length &&
-               (isBracketed ? m_text[m_at] != closing
-                            : IsLetter(m_text[m_at]) || IsAsciiDigit(m_text[m_at])))
+        const char closing = ClosingOf(m_text[m_at]);
+        const auto isInside = [&](char c) {
+            return closing != '\0' ? c != closing : IsLetter(c) || IsAsciiDigit(c);
+        };
+        while (m_at < m_length && isInside(m_text[m_at]))
             ++m_at;
-        if (m_at < m_length && (isBracketed || m_text[m_at] == ']'))
+        if (m_at < m_length && (closing != '\0' || m_text[m_at] == ']'))
             ++m_at;
         skipSeparators();
         return m_at;

@@ -13,10 +13,28 @@ namespace {
 char const Utf8Mark[] = "\xEF\xBB\xBF";
 constexpr int Utf8MarkLength = 3;
 
+// Whether a byte may be the second one of a UTF-8 sequence: which then is not too long, no
+// surrogate and not above U+10FFFF.
+bool MayFollow(unsigned lead, unsigned byte)
+{
+    switch (lead) {
+    case 0xE0:
+        return byte >= 0xA0 && byte <= 0xBF;
+    case 0xED:
+        return byte >= 0x80 && byte <= 0x9F;
+    case 0xF0:
+        return byte >= 0x90 && byte <= 0xBF;
+    case 0xF4:
+        return byte >= 0x80 && byte <= 0x8F;
+    default:
+        return byte >= 0x80 && byte <= 0xBF;
+    }
+}
+
 // How many bytes the UTF-8 sequence at `at` has; 0 if it is not valid, -1 if the text ends in it.
 int SequenceLength(char const* at, char const* end)
 {
-    const auto lead = static_cast<unsigned char>(*at);
+    const unsigned lead = static_cast<unsigned char>(*at);
     if (lead < 0x80)
         return 1;
     const int length = lead >= 0xF0 ? 4 : lead >= 0xE0 ? 3 : 2;
@@ -25,11 +43,8 @@ int SequenceLength(char const* at, char const* end)
     for (int i = 1; i < length; ++i) {
         if (at + i == end)
             return -1;
-        const auto byte = static_cast<unsigned char>(at[i]);
-        // Not too long, no surrogate, not above U+10FFFF.
-        const unsigned lowest = i > 1 ? 0x80 : lead == 0xE0 ? 0xA0 : lead == 0xF0 ? 0x90 : 0x80;
-        const unsigned highest = i > 1 ? 0xBF : lead == 0xED ? 0x9F : lead == 0xF4 ? 0x8F : 0xBF;
-        if (byte < lowest || byte > highest)
+        const unsigned byte = static_cast<unsigned char>(at[i]);
+        if (!MayFollow(i == 1 ? lead : 0, byte))
             return 0;
     }
     return length;

@@ -23,6 +23,7 @@ public:
         Utf16Be
     };
 
+    // cppcheck-suppress noExplicitConstructor ; a kind is all that an encoding is
     LogEncoding(Kind kind = Latin1) : m_kind(kind) {} // NOLINT(google-explicit-constructor)
     Kind kind() const { return m_kind; }
 

@@ -36,13 +36,6 @@ LogPlace Right(LogPlace::Kind kind, qint64 value)
     return place;
 }
 
-QRegularExpressionMatch Match(char const* pattern, QString const& text)
-{
-    const QRegularExpression expression(QLatin1String("^") + QLatin1String(pattern) +
-                                        QLatin1String("$"));
-    return expression.match(text);
-}
-
 LogPlace LineAt(QString const& digits)
 {
     if (digits.size() > MaximumDigits)
@@ -108,24 +101,28 @@ LogPlace DateTimeOf(QRegularExpressionMatch const& match)
 
 LogPlace LogPlace::Parse(QString const& text)
 {
-    constexpr char const* TimePattern =
-        "([0-9]{1,2}):([0-9]{2})(?::([0-9]{2})(?:[.,]([0-9]{1,9}))?)?";
+    static const QRegularExpression line(QStringLiteral("^[0-9]+$"));
+    static const QRegularExpression interval(QStringLiteral("^([+-]) ?([0-9]+) ?(ms|s|m|h|d|)$"));
+    const QString timePattern =
+        QStringLiteral("([0-9]{1,2}):([0-9]{2})(?::([0-9]{2})(?:[.,]([0-9]{1,9}))?)?");
+    static const QRegularExpression time(QLatin1Char('^') + timePattern + QLatin1Char('$'));
+    static const QRegularExpression dateTime(
+        QStringLiteral("^([0-9]{4}-[0-9]{2}-[0-9]{2})(?:(?: +|T)%1)?$").arg(timePattern));
+
     const QString typed = text.trimmed();
     if (typed.isEmpty())
         return LogPlace();
-    if (Match("[0-9]+", typed).hasMatch())
+    if (line.match(typed).hasMatch())
         return LineAt(typed);
-    const auto interval = Match("([+-]) ?([0-9]+) ?(ms|s|m|h|d|)", typed);
-    if (interval.hasMatch())
-        return IntervalOf(interval);
-    const auto time = Match(TimePattern, typed);
-    if (time.hasMatch())
-        return TimeOf(time, 1);
-    const QByteArray dateTime =
-        QByteArray("([0-9]{4}-[0-9]{2}-[0-9]{2})(?:(?: +|T)") + TimePattern + ")?";
-    const auto both = Match(dateTime.constData(), typed);
-    if (both.hasMatch())
-        return DateTimeOf(both);
+    QRegularExpressionMatch match = interval.match(typed);
+    if (match.hasMatch())
+        return IntervalOf(match);
+    match = time.match(typed);
+    if (match.hasMatch())
+        return TimeOf(match, 1);
+    match = dateTime.match(typed);
+    if (match.hasMatch())
+        return DateTimeOf(match);
     return Wrong(QObject::tr("Neither a line number nor a time."));
 }
 

@@ -506,8 +506,10 @@ void MainWindow::reopenFiles()
 {
     if (!m_reopen->isChecked())
         return;
-    const QStringList files = m_settings.Text(QStringLiteral("openFiles")).split(MruSeparator);
-    for (QString const& file : files.mid(0, MaximumFilesAtStart)) {
+    const QStringList files = m_settings.Text(QStringLiteral("openFiles"))
+                                  .split(MruSeparator)
+                                  .mid(0, MaximumFilesAtStart);
+    for (QString const& file : files) {
         if (QFileInfo(file).isAbsolute() && QFileInfo(file).isFile())
             m_tabs->OpenInBackground(file);
     }

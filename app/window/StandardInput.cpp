@@ -53,7 +53,7 @@ QString StandardInput::path() const
 // There is something to read, so this does not wait for more.
 void StandardInput::readSome()
 {
-    std::array<char, ReadSize> slice;
+    std::array<char, ReadSize> slice{};
     const ssize_t size = read(STDIN_FILENO, slice.data(), slice.size());
     if (size < 0 && (errno == EINTR || errno == EAGAIN))
         return;

@@ -86,6 +86,10 @@ void tst_ForeignLine::formats_data()
 
     row("stamp and level in brackets", "[2026-11-22 14:03:02.123] [error] x",
         "2026-11-22 14:03:02.123", error, "x");
+    row("level in angle brackets", "2026-11-22 14:03:02 <error> x", "2026-11-22 14:03:02", error,
+        "x");
+    row("level in braces", "2026-11-22 14:03:02 {ERROR} x > y", "2026-11-22 14:03:02", error,
+        "x > y");
     row("a logger's name between them", "[2026-11-22 14:03:02.123] [net] [warning] x",
         "2026-11-22 14:03:02.123", warning, "[net] [warning] x");
     row("level within the stamp's brackets", "[2026-11-22T14:03:02Z WARN  net::io] x",

@@ -71,11 +71,10 @@ void LogDelegate::initStyleOption(QStyleOptionViewItem* option, QModelIndex cons
 
     const auto severity =
         static_cast<LogEntry::Severity>(index.data(LogModel::SeverityRole).toInt());
+    const bool isAlternate = option->features & QStyleOptionViewItem::Alternate;
     if (index.data(LogModel::EarlierRole).toBool())
         option->backgroundBrush =
-            Blended(option->palette.color(option->features & QStyleOptionViewItem::Alternate
-                                              ? QPalette::AlternateBase
-                                              : QPalette::Base),
+            Blended(option->palette.color(isAlternate ? QPalette::AlternateBase : QPalette::Base),
                     option->palette.color(QPalette::Text), 0.045);
     if (index.data(LogModel::ContextRole).toBool())
         option->palette.setColor(QPalette::Text,

@@ -94,7 +94,8 @@ bool LogFindBar::eventFilter(QObject* watched, QEvent* event)
     if (event->type() == QEvent::KeyPress) {
         auto const* key = static_cast<QKeyEvent*>(event);
         if (key->key() == Qt::Key_Return || key->key() == Qt::Key_Enter) {
-            Q_EMIT stepRequested(key->modifiers() & Qt::ShiftModifier ? -1 : 1);
+            const bool isBackward = key->modifiers() & Qt::ShiftModifier;
+            Q_EMIT stepRequested(isBackward ? -1 : 1);
             return true;
         }
     }

@@ -325,7 +325,7 @@ int LogView::CopySelected()
         for (next = std::max(next, entry.first); next <= entry.second && count < MaximumCopiedLines;
              ++next) {
             const QString line = m_model->LineText(next, LogIndex::LineLimit + 1);
-            text += line.left(LogIndex::LineLimit);
+            text += line.leftRef(LogIndex::LineLimit);
             text += line.size() > LogIndex::LineLimit ? QStringLiteral("\u2026\n")
                                                       : QStringLiteral("\n");
             ++count;

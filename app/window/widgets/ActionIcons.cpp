@@ -122,7 +122,7 @@ QIcon ActionIcons::Icon(Name name, QPalette const& palette)
         QPainter painter(&pixmap);
         painter.setRenderHint(QPainter::Antialiasing);
         painter.scale(size / IconBox, size / IconBox);
-        const QColor color = palette.color(QPalette::Active, QPalette::ButtonText);
+        QColor const& color = palette.color(QPalette::Active, QPalette::ButtonText);
         painter.setPen(QPen(color, 1.4, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
         Draw(painter, name, palette);
         icon.addPixmap(pixmap);
