@@ -194,9 +194,9 @@ void tst_ForeignLine::formats_data()
     row("JSON that is cut", R"({"level":"info","msg":"abc)", "", note,
         R"({"level":"info","msg":"abc)");
     row("journal export", "__CURSOR=s=1\nPRIORITY=4\nMESSAGE=a\n_PID=7", "", warning, "a");
-    row("journal export, value with its size",
-        QByteArray("__CURSOR=s=1\nPRIORITY=2\nMESSAGE\n\x03\0\0\0\0\0\0\0a\nb\n_PID=7", 57), "",
-        fatal, "a\nb");
+    constexpr char sized[] = "__CURSOR=s=1\nPRIORITY=2\nMESSAGE\n\x03\0\0\0\0\0\0\0a\nb\n_PID=7";
+    row("journal export, value with its size", QByteArray(sized, sizeof sized - 1), "", fatal,
+        "a\nb");
 }
 
 void tst_ForeignLine::formats()
@@ -343,13 +343,14 @@ void tst_ForeignLine::epochs()
 void tst_ForeignLine::anyBytes()
 {
     std::mt19937 random(1);
+    constexpr char sized[] = "__CURSOR=s=1\nMESSAGE\n\x03\0\0\0\0\0\0\0a\nb\nPRIORITY=7";
     const QByteArray seeds[] = {
         "<34>1 2026-11-22T14:03:02.123Z host app[71]: ERROR x",
         "[Sun Nov 22 14:03:02.123456 2026] [core:error] (EE) x",
         "kern  :err   : [    1.250000] W, [2026-11-22 14:03:02 x",
         R"({"time":1795442582.5,"level":"er\"ror","a":{"b":[1]},"msg":"x\u00e9"})",
         "time=2026-11-22T14:03:02.123Z level=WARN msg=\"disk \\\"a\\\" slow\"",
-        QByteArray("__CURSOR=s=1\nMESSAGE\n\x03\0\0\0\0\0\0\0a\nb\nPRIORITY=7", 54),
+        QByteArray(sized, sizeof sized - 1),
     };
     for (int i = 0; i < 60000; ++i) {
         QByteArray line = seeds[random() % 6];

@@ -84,6 +84,7 @@ class tst_FilterInWindow : public QObject
 private slots:
     void initTestCase();
     void cleanup();
+    void cleanupTestCase();
 
     void moreIsHidden();
     void textIsOneText();
@@ -113,6 +114,12 @@ void tst_FilterInWindow::cleanup()
     const QWidgetList windows = QApplication::topLevelWidgets();
     for (QWidget* window : windows)
         window->hide();
+}
+
+// Qt frees the animation of a clear button when it ends, even if the button is gone by then.
+void tst_FilterInWindow::cleanupTestCase()
+{
+    QTest::qWait(300);
 }
 
 void tst_FilterInWindow::moreIsHidden()
