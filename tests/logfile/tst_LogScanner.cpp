@@ -12,6 +12,7 @@
 #include <QtTest>
 
 #include <functional>
+#include <limits>
 
 #include <cstdio>
 #include <sys/stat.h>
@@ -42,6 +43,7 @@ public:
                 onProgress(percent);
         });
         QObject::connect(&scanner, &LogScanner::polled, [this] { ++polls; });
+        scanner.SetPace(1 << 20, std::numeric_limits<int>::max()); // no parts, however slow this is
     }
 
     void Open(int request, LogFilter const& filter = LogFilter(), bool isCurrent = true)

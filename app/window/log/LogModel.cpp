@@ -139,8 +139,11 @@ void LogModel::SetPaused(bool paused)
     if (paused)
         openFile(); // so that a rotation does not take the lines away
     Q_EMIT watchRequested(!paused);
-    if (!paused)
-        Q_EMIT pollRequested();
+    if (paused)
+        return;
+    if (m_heldBack) // the scanner does not report it again
+        take(LogUpdate(*m_heldBack));
+    Q_EMIT pollRequested();
 }
 
 void LogModel::take(LogUpdate const& update)
@@ -151,18 +154,18 @@ void LogModel::take(LogUpdate const& update)
     const bool wasReading = m_reading;
     m_reading = wasReading && update.isPartial;
     if (m_paused && !wasReading) {
-        m_hasDropped = true;
+        m_heldBack = std::make_shared<LogUpdate>(update);
         return;
     }
     if (!m_paused || !update.type.IsLike(m_parser.fileType()))
         m_lines.clear();
     m_parser.SetFileType(update.type);
-    if (update.isReset || m_awaitsReset || m_hasDropped)
+    if (update.isReset || m_awaitsReset || m_heldBack)
         reset(update);
     else
         applyChange(update);
     m_awaitsReset = false;
-    m_hasDropped = false;
+    m_heldBack.reset();
     if (wasReading && !m_reading)
         Q_EMIT progressed(100);
     Q_EMIT refreshed();

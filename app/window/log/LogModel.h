@@ -14,6 +14,8 @@
 #include <QHash>
 #include <QThread>
 
+#include <memory>
+
 namespace Velocor {
 
 class LogScanner;
@@ -170,7 +172,7 @@ private:
     QThread m_thread;
     LogScanner* m_scanner = nullptr;
     bool m_paused = false;
-    bool m_hasDropped = false; // an update that arrived after the pause
+    std::shared_ptr<LogUpdate const> m_heldBack; // the last update that arrived after the pause
     bool m_reading = false;
     bool m_awaitsReset = false; // what was requested has not been reported yet
     bool m_isCurrent = false;

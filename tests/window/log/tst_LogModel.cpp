@@ -105,6 +105,7 @@ private slots:
     void entries();
     void pause();
     void updateAfterThePause();
+    void updateThatThePauseHeldBack();
     void overwritten_data();
     void overwritten();
     void rotatedWhilePaused();
@@ -487,6 +488,20 @@ void tst_LogModel::pause()
 
 // An update that is on its way when the pause begins, and the next one, which only says what has
 // changed since.
+// The scanner has reported the lines before the pause, and has nothing to add after it.
+void tst_LogModel::updateThatThePauseHeldBack()
+{
+    LogModel model;
+    open(model, run(2, QTime(9, 0), "x"));
+    QVERIFY(TestFiles::write(m_file, run(5, QTime(9, 0), "x")));
+    QThread::msleep(8 * LogModel::PollInterval); // meanwhile the other thread looks
+    model.SetPaused(true);
+    QTest::qWait(LogModel::PollInterval);
+    QCOMPARE(model.rowCount(), 2);
+    model.SetPaused(false);
+    QTRY_COMPARE_WITH_TIMEOUT(model.rowCount(), 5, Patience);
+}
+
 void tst_LogModel::updateAfterThePause()
 {
     QByteArray newer = run(5, QTime(9, 0), "n");
