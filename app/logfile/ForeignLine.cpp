@@ -3,7 +3,7 @@
 
 #include "app/logfile/ForeignLine.h"
 
-#include "app/logfile/AsciiDigit.h"
+#include "app/logfile/AsciiCharacters.h"
 #include "app/logfile/ForeignStamp.h"
 #include "app/logfile/LevelNames.h"
 #include "app/logfile/LogFields.h"
@@ -69,11 +69,6 @@ constexpr char const* Prefixes[] = {
 
 constexpr char const* Facilities[] = {"kern", "user", "mail", "daemon", "auth",    "syslog",
                                       "lpr",  "news", "uucp", "cron",   "authpriv"};
-
-bool IsLetter(char c)
-{
-    return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z');
-}
 
 bool IsBlank(char c)
 {
@@ -207,7 +202,7 @@ private:
         while (digits < m_length && IsAsciiDigit(m_text[digits]))
             ++digits;
         return digits > 0 && m_length - digits > 3 && m_text[digits] == ':' &&
-               IsLetter(m_text[digits + 1]) && m_text[digits + 2] == ' ' &&
+               IsAsciiLetter(m_text[digits + 1]) && m_text[digits + 2] == ' ' &&
                readStampWithin(digits + 3);
     }
 
@@ -264,7 +259,7 @@ private:
             if (!skipTo(':'))
                 continue;
             const int name = at;
-            while (at < m_length && IsLetter(m_text[at]))
+            while (at < m_length && IsAsciiLetter(m_text[at]))
                 ++at;
             const LogEntry::Severity severity = LevelNames::Named(m_text + name, at - name);
             if (severity == LogEntry::None || !skipTo(':'))
@@ -384,7 +379,8 @@ private:
             return severityIn(m_at + 1, next - 1);
         }
         int at = m_at;
-        while (at < m_length && (IsLetter(m_text[at]) || (at > m_at && IsAsciiDigit(m_text[at]))))
+        while (at < m_length &&
+               (IsAsciiLetter(m_text[at]) || (at > m_at && IsAsciiDigit(m_text[at]))))
             ++at;
         next = at;
         while (next < m_length && !IsBlank(m_text[next]))
@@ -437,7 +433,7 @@ private:
     {
         const char closing = ClosingOf(m_text[m_at]);
         const auto isInside = [&](char c) {
-            return closing != '\0' ? c != closing : IsLetter(c) || IsAsciiDigit(c);
+            return closing != '\0' ? c != closing : IsAsciiLetter(c) || IsAsciiDigit(c);
         };
         while (m_at < m_length && isInside(m_text[m_at]))
             ++m_at;
@@ -451,7 +447,7 @@ private:
     // with a colon: "error: text".
     bool readSeverityFirst()
     {
-        if (m_at == m_length || (!IsLetter(m_text[m_at]) && m_text[m_at] != '['))
+        if (m_at == m_length || (!IsAsciiLetter(m_text[m_at]) && m_text[m_at] != '['))
             return false;
         int next = m_at;
         bool endsTag = false;

@@ -3,7 +3,7 @@
 
 #include "app/logfile/ForeignStamp.h"
 
-#include "app/logfile/AsciiDigit.h"
+#include "app/logfile/AsciiCharacters.h"
 #include "app/logfile/DayNumber.h"
 
 #include <QDateTime>
@@ -56,11 +56,6 @@ constexpr char const* Zones[] = {"UTC", "GMT",  "CET", "CEST", "MET", "EST", "ED
                                  "CDT", "MST",  "MDT", "PST",  "PDT", "BST", "WET", "WEST",
                                  "EET", "EEST", "MSK", "IST",  "JST", "KST", "AEST"};
 
-bool IsLetter(char c)
-{
-    return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z');
-}
-
 // Reads a pattern's fields from a text. Each method moves on and returns false if the text has
 // something else.
 class Fields
@@ -80,7 +75,7 @@ public:
     ForeignStamp stamp(QDate const& latest) const
     {
         ForeignStamp result;
-        const bool isWhole = m_at == m_end || (!IsAsciiDigit(*m_at) && !IsLetter(*m_at));
+        const bool isWhole = m_at == m_end || (!IsAsciiDigit(*m_at) && !IsAsciiLetter(*m_at));
         if (!isWhole || !isPlausible())
             return result;
         result.length = static_cast<int>(m_at - m_text);
@@ -231,7 +226,7 @@ private:
             const auto length = static_cast<int>(std::strlen(zone));
             if (m_end - m_at < length || std::memcmp(m_at, zone, static_cast<size_t>(length)) != 0)
                 continue;
-            if (m_end - m_at > length && IsLetter(m_at[length]))
+            if (m_end - m_at > length && IsAsciiLetter(m_at[length]))
                 continue;
             m_at += length;
             return true;
@@ -294,7 +289,7 @@ ForeignStamp ReadOne(char const* pattern, char const* text, int length, QDate co
 ForeignStamp ForeignStamp::Read(char const* text, int length, QDate const& latest)
 {
     // Most lines without a time stamp end here.
-    if (length < 8 || (!IsAsciiDigit(*text) && !IsLetter(*text) && *text != ' '))
+    if (length < 8 || (!IsAsciiDigit(*text) && !IsAsciiLetter(*text) && *text != ' '))
         return ForeignStamp();
     for (char const* pattern : Patterns) {
         const ForeignStamp stamp = ReadOne(pattern, text, length, latest);

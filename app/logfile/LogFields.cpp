@@ -9,7 +9,7 @@ namespace Velocor {
 
 namespace {
 
-bool IsBlank(char c)
+bool IsWhitespace(char c)
 {
     return c == ' ' || c == '\t' || c == '\r' || c == '\n';
 }
@@ -74,7 +74,7 @@ JsonFields::JsonFields(char const* text, int length) : m_text(text), m_length(le
 
 void JsonFields::skipBlanks()
 {
-    while (m_at < m_length && IsBlank(m_text[m_at]))
+    while (m_at < m_length && IsWhitespace(m_text[m_at]))
         ++m_at;
 }
 
@@ -148,7 +148,7 @@ bool JsonFields::Next(LogField& field)
         field.isEscaped = false;
         field.value = m_at;
         while (m_at < m_length && m_text[m_at] != ',' && m_text[m_at] != '}' &&
-               !IsBlank(m_text[m_at]))
+               !IsWhitespace(m_text[m_at]))
             ++m_at;
         field.valueLength = m_at - field.value;
         return true;
@@ -157,10 +157,10 @@ bool JsonFields::Next(LogField& field)
 
 bool LogfmtFields::Next(LogField& field)
 {
-    while (m_at < m_length && IsBlank(m_text[m_at]))
+    while (m_at < m_length && IsWhitespace(m_text[m_at]))
         ++m_at;
     const int name = m_at;
-    while (m_at < m_length && m_text[m_at] != '=' && !IsBlank(m_text[m_at]))
+    while (m_at < m_length && m_text[m_at] != '=' && !IsWhitespace(m_text[m_at]))
         ++m_at;
     if (m_at == m_length || m_text[m_at] != '=' || m_at == name)
         return false;
@@ -170,7 +170,7 @@ bool LogfmtFields::Next(LogField& field)
     const bool isQuoted = m_at + 1 < m_length && m_text[m_at + 1] == '"';
     m_at += isQuoted ? 2 : 1;
     field.value = m_at;
-    while (m_at < m_length && (isQuoted ? m_text[m_at] != '"' : !IsBlank(m_text[m_at]))) {
+    while (m_at < m_length && (isQuoted ? m_text[m_at] != '"' : !IsWhitespace(m_text[m_at]))) {
         const bool isEscape = isQuoted && m_text[m_at] == '\\' && m_at + 1 < m_length;
         field.isEscaped = field.isEscaped || isEscape;
         m_at += isEscape ? 2 : 1;

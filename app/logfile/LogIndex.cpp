@@ -4,6 +4,7 @@
 #include "app/logfile/LogIndex.h"
 
 #include "app/logfile/LogSeverities.h"
+#include "app/logfile/Milliseconds.h"
 
 #include <algorithm>
 #include <cstring>
@@ -21,12 +22,11 @@ constexpr size_t MaximumReread = 1000;
 // Concurrent threads may write their entries in a different order than they stamped them.
 constexpr qint64 Tolerance = 20; // milliseconds
 
-constexpr qint64 Minute = 60 * 1000; // milliseconds
-constexpr qint64 HalfADay = 12 * 60 * Minute;
+constexpr qint64 HalfADay = 12 * Milliseconds::Hour;
 
 // The most that the end of daylight saving time sets a clock back; and a minute, because stamps may
 // be given in minutes.
-constexpr qint64 ClockChange = 61 * Minute;
+constexpr qint64 ClockChange = 61 * Milliseconds::Minute;
 
 // The flags of a mark that the text filter sets.
 constexpr quint8 OfText = LogRows::Unmatched | LogRows::Hidden;

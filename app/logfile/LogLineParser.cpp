@@ -3,7 +3,7 @@
 
 #include "app/logfile/LogLineParser.h"
 
-#include "app/logfile/AsciiDigit.h"
+#include "app/logfile/AsciiCharacters.h"
 #include "app/logfile/ForeignLine.h"
 #include "app/logfile/LogFields.h"
 #include "app/logfile/LogSeverities.h"

@@ -5,6 +5,7 @@
 
 #include "app/logfile/LogIndex.h"
 #include "app/logfile/LogLineReader.h"
+#include "app/logfile/Milliseconds.h"
 
 #include <QFile>
 
@@ -15,8 +16,6 @@
 namespace Velocor {
 
 namespace {
-
-constexpr qint64 Day = 24 * 60 * 60 * 1000; // milliseconds
 
 // Where a line of the file starts; -1 if it has fewer lines.
 qint64 StartOfLine(LogLocateRequest const& request, std::function<bool()> const& isCancelled)
@@ -84,7 +83,7 @@ public:
             return onward(base.timeKey + place.value, place.value);
         const qint64 target = place.kind == LogPlace::DateTime
                                   ? place.value
-                                  : base.timeKey - base.timeKey % Day + place.value;
+                                  : base.timeKey - base.timeKey % Milliseconds::Day + place.value;
         return forward(-1, target);
     }
 

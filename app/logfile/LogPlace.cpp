@@ -4,6 +4,7 @@
 #include "app/logfile/LogPlace.h"
 
 #include "app/logfile/LogTimeReader.h"
+#include "app/logfile/Milliseconds.h"
 
 #include <QDate>
 #include <QObject>
@@ -12,11 +13,6 @@
 namespace Velocor {
 
 namespace {
-
-constexpr qint64 Second = 1000; // milliseconds
-constexpr qint64 Minute = 60 * Second;
-constexpr qint64 Hour = 60 * Minute;
-constexpr qint64 Day = 24 * Hour;
 
 // More digits than any file has lines, but few enough for a multiplication by a day.
 constexpr int MaximumDigits = 9;
@@ -54,13 +50,13 @@ LogPlace IntervalOf(QRegularExpressionMatch const& match)
         return Wrong(QObject::tr("The interval is too long."));
     qint64 factor = 1;
     if (unit == QLatin1String("s"))
-        factor = Second;
+        factor = Milliseconds::Second;
     else if (unit == QLatin1String("m"))
-        factor = Minute;
+        factor = Milliseconds::Minute;
     else if (unit == QLatin1String("h"))
-        factor = Hour;
+        factor = Milliseconds::Hour;
     else if (unit == QLatin1String("d"))
-        factor = Day;
+        factor = Milliseconds::Day;
     const qint64 value = digits.toLongLong() * factor;
     return Right(LogPlace::Interval, match.captured(1) == QLatin1String("-") ? -value : value);
 }
@@ -78,8 +74,8 @@ LogPlace TimeOf(QRegularExpressionMatch const& match, int group)
         return Wrong(QObject::tr("The minutes go up to 59."));
     if (second > 59)
         return Wrong(QObject::tr("The seconds go up to 59."));
-    return Right(LogPlace::Time,
-                 hour * Hour + minute * Minute + second * Second + fraction.toInt());
+    return Right(LogPlace::Time, hour * Milliseconds::Hour + minute * Milliseconds::Minute +
+                                     second * Milliseconds::Second + fraction.toInt());
 }
 
 LogPlace DateTimeOf(QRegularExpressionMatch const& match)

@@ -3,7 +3,7 @@
 
 #include "app/logfile/LogTimeReader.h"
 
-#include "app/logfile/AsciiDigit.h"
+#include "app/logfile/AsciiCharacters.h"
 #include "app/logfile/DayNumber.h"
 
 #include <QLocale>

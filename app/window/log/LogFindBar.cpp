@@ -16,7 +16,7 @@ namespace Velocor {
 
 namespace {
 
-constexpr int TypingPause = 150; // milliseconds
+constexpr int FindPause = 150; // milliseconds
 
 QToolButton* NewButton(QString const& text, QString const& name, QString const& toolTip)
 {
@@ -72,7 +72,7 @@ LogFindBar::LogFindBar(QWidget* parent)
     hide();
 
     m_typing.setSingleShot(true);
-    m_typing.setInterval(TypingPause);
+    m_typing.setInterval(FindPause);
     connect(&m_typing, &QTimer::timeout, this, &LogFindBar::Apply);
     connect(m_text, &QLineEdit::textChanged, this, [this] { m_typing.start(); });
     connect(next, &QToolButton::clicked, this, [this] { Q_EMIT stepRequested(1); });
