@@ -11,7 +11,6 @@
 
 #include <algorithm>
 #include <functional>
-#include <limits>
 
 namespace Velocor {
 
@@ -44,20 +43,6 @@ qint64 StartOfLine(LogLocateRequest const& request, std::function<bool()> const&
         offset += bytes.size();
     }
     return -1;
-}
-
-int RowNear(LogRows const& rows, qint64 start)
-{
-    int nearest = -1;
-    qint64 least = std::numeric_limits<qint64>::max();
-    for (size_t row = 0; row < rows.size() && least > 0; ++row) {
-        const qint64 distance = rows.starts[row] < 0 ? least : qAbs(rows.starts[row] - start);
-        if (distance < least) {
-            least = distance;
-            nearest = static_cast<int>(row);
-        }
-    }
-    return nearest;
 }
 
 // One look at the times of the rows.
@@ -174,7 +159,7 @@ LogLocation LineIn(LogLocateRequest const& request, std::function<bool()> const&
         location.answer = LogLocation::NoSuchLine;
         return location;
     }
-    location.row = RowNear(*request.rows, start);
+    location.row = request.rows->RowNear(start);
     if (location.row >= 0 && request.rows->starts[static_cast<size_t>(location.row)] != start)
         location.answer = LogLocation::Nearest;
     return location;

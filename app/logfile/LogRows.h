@@ -9,6 +9,7 @@
 #include <QtGlobal>
 
 #include <algorithm>
+#include <limits>
 #include <vector>
 
 namespace Velocor {
@@ -74,6 +75,22 @@ struct LogRows
     {
         const auto checked = static_cast<size_t>(std::min(length, CheckedLength));
         return static_cast<quint16>(qHashBits(line, checked));
+    }
+
+    /// The row whose line starts there or, if there is none, as near to it as possible; -1 without
+    /// lines.
+    int RowNear(qint64 start) const
+    {
+        int nearest = -1;
+        qint64 least = std::numeric_limits<qint64>::max();
+        for (size_t row = 0; row < starts.size() && least > 0; ++row) {
+            const qint64 distance = starts[row] < 0 ? least : qAbs(starts[row] - start);
+            if (distance < least) {
+                least = distance;
+                nearest = static_cast<int>(row);
+            }
+        }
+        return nearest;
     }
 
     LogEntry::Severity severity(size_t row) const

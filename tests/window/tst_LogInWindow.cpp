@@ -5,6 +5,7 @@
 
 #include "WindowParts.h"
 
+#include "app/logfile/LogScanner.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogSettingsDialog.h"
 #include "app/window/log/LogView.h"
@@ -495,7 +496,7 @@ void tst_LogInWindow::pauses()
     QTest::keyClick(window.get(), Qt::Key_P, Qt::ControlModifier | Qt::ShiftModifier);
     QVERIFY(Child<QLabel>(window.get(), "Lines shown")->text().endsWith("paused"));
     QVERIFY(TestFiles::write(test.logFile(), run(5, QTime(9, 0), "x")));
-    QTest::qWait(4 * LogModel::PollInterval);
+    QTest::qWait(4 * LogScanner::PollInterval);
     QCOMPARE(Rows(*window), 2);
     QTest::keyClick(window.get(), Qt::Key_P, Qt::ControlModifier | Qt::ShiftModifier);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);

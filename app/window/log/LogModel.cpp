@@ -15,7 +15,6 @@
 #include <QPalette>
 
 #include <algorithm>
-#include <limits>
 
 namespace Velocor {
 
@@ -230,21 +229,6 @@ int LogModel::FindProblem(int row, int step) const
             return row;
     }
     return -1;
-}
-
-int LogModel::RowNear(qint64 start) const
-{
-    std::vector<qint64> const& starts = m_state.rows->starts;
-    int nearest = -1;
-    qint64 least = std::numeric_limits<qint64>::max();
-    for (size_t row = 0; row < starts.size() && least > 0; ++row) {
-        const qint64 distance = starts[row] < 0 ? least : qAbs(starts[row] - start);
-        if (distance < least) {
-            least = distance;
-            nearest = static_cast<int>(row);
-        }
-    }
-    return nearest;
 }
 
 bool LogModel::isHeading(int row) const

@@ -85,7 +85,7 @@ public:
 
     /// The row whose line starts there or, if it is filtered out, as near to it as possible; -1 if
     /// there are no lines.
-    int RowNear(qint64 start) const;
+    int RowNear(qint64 start) const { return m_state.rows->RowNear(start); }
 
     /// The text of a row's line in the file, without its line end; empty for a heading. If the line
     /// is gone, a sentence that says so.
@@ -120,10 +120,6 @@ public:
     QVariant data(QModelIndex const& index, int role) const override;
     QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
     Qt::ItemFlags flags(QModelIndex const& index) const override;
-
-    /// The interval between checks for changes where the system does not tell of them, in
-    /// milliseconds.
-    static constexpr int PollInterval = 250;
 
     /// The maximum length that a row shows of a line, in bytes. The size of a longer one follows.
     static constexpr int ShownLimit = 4096;

@@ -6,6 +6,7 @@
 #include "app/window/log/LogModel.h"
 
 #include "app/logfile/LogIndex.h"
+#include "app/logfile/LogScanner.h"
 #include "common/log/TorkLog.h"
 #include "support/DemoLog.h"
 #include "support/TestFiles.h"
@@ -494,9 +495,9 @@ void tst_LogModel::updateThatThePauseHeldBack()
     LogModel model;
     open(model, run(2, QTime(9, 0), "x"));
     QVERIFY(TestFiles::write(m_file, run(5, QTime(9, 0), "x")));
-    QThread::msleep(8 * LogModel::PollInterval); // meanwhile the other thread looks
+    QThread::msleep(8 * LogScanner::PollInterval); // meanwhile the other thread looks
     model.SetPaused(true);
-    QTest::qWait(LogModel::PollInterval);
+    QTest::qWait(LogScanner::PollInterval);
     QCOMPARE(model.rowCount(), 2);
     model.SetPaused(false);
     QTRY_COMPARE_WITH_TIMEOUT(model.rowCount(), 5, Patience);
@@ -514,7 +515,7 @@ void tst_LogModel::updateAfterThePause()
     QVERIFY(WriteAt(m_file, 0, newer));
     model.SetPaused(false); // looks for changes
     model.SetPaused(true);
-    QTest::qWait(4 * LogModel::PollInterval);
+    QTest::qWait(4 * LogScanner::PollInterval);
     QCOMPARE(model.rowCount(), rows);
 
     newer += entry("09:01:01.000", "Trace", "last");
@@ -567,7 +568,7 @@ void tst_LogModel::overwritten()
         QVERIFY(WriteAt(m_file, 0, over));
         QVERIFY(length == 0 || QFile::resize(m_file, length));
         if (isPaused)
-            QTest::qWait(2 * LogModel::PollInterval);
+            QTest::qWait(2 * LogScanner::PollInterval);
 
         const QByteArray file = TestFiles::read(m_file);
         for (int row = 0; row < lines; ++row) {
