@@ -31,6 +31,18 @@ inline bool write(QString const& path, QByteArray const& bytes)
     return file.write(bytes) == bytes.size();
 }
 
+/// Gives a file these bytes without emptying it first, as a log that grows does: whoever
+/// watches the file never finds it shorter than before and after.
+inline bool writeOver(QString const& path, QByteArray const& bytes)
+{
+    QFile file(path);
+    if (!file.open(QIODevice::ReadWrite | QIODevice::Unbuffered)) {
+        qWarning("%s: %s", qPrintable(path), qPrintable(file.errorString()));
+        return false;
+    }
+    return file.write(bytes) == bytes.size() && file.resize(bytes.size());
+}
+
 /// The bytes of a file; if it does not open, a text that no test expects.
 inline QByteArray read(QString const& path)
 {

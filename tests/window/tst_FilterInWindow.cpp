@@ -205,8 +205,8 @@ void tst_FilterInWindow::context()
     Choose(Child<QComboBox>(window.get(), "Lines of context"), "2 around");
     QTRY_COMPARE_WITH_TIMEOUT(Messages(*window),
                               QStringList({"x 48", "x 49", "x 50", "x 51", "x 52"}), Patience);
-    QVERIFY(TestFiles::write(test.logFile(),
-                             run(101, QTime(9, 0), "x") + entry("10:00:00.000", "Trace", "x 50")));
+    QVERIFY(TestFiles::writeOver(test.logFile(), run(101, QTime(9, 0), "x") +
+                                                     entry("10:00:00.000", "Trace", "x 50")));
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 8, Patience);
     Choose(Child<QComboBox>(window.get(), "Lines of context"), "No context");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);

@@ -144,7 +144,7 @@ void tst_LogInWindow::followsTheLog()
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 200, Patience);
     LogView* view = View(*window);
     QTRY_COMPARE(view->verticalScrollBar()->value(), view->verticalScrollBar()->maximum());
-    QVERIFY(TestFiles::write(test.logFile(), run(300, QTime(9, 0), "x")));
+    QVERIFY(TestFiles::writeOver(test.logFile(), run(300, QTime(9, 0), "x")));
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 300, Patience);
     QCOMPARE(view->verticalScrollBar()->value(), view->verticalScrollBar()->maximum());
     QVERIFY(view->visualRect(view->model()->index(299, 0)).isValid());
@@ -161,7 +161,7 @@ void tst_LogInWindow::followsUntilScrolled()
     QVERIFY(!Panel(*window)->isFollowing());
     QVERIFY(!Action(*window, "Follow Newest")->isChecked());
     const int place = view->verticalScrollBar()->value();
-    QVERIFY(TestFiles::write(test.logFile(), run(300, QTime(9, 0), "x")));
+    QVERIFY(TestFiles::writeOver(test.logFile(), run(300, QTime(9, 0), "x")));
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 300, Patience);
     QCOMPARE(view->verticalScrollBar()->value(), place);
 
@@ -464,7 +464,7 @@ void tst_LogInWindow::longStamps()
     const int needed = view->fontMetrics().boundingRect(stamp).width();
     QTRY_VERIFY_WITH_TIMEOUT(view->columnWidth(LogModel::TimeColumn) > needed, Patience);
     view->setColumnWidth(LogModel::TimeColumn, 50);
-    QVERIFY(TestFiles::write(path, line + line));
+    QVERIFY(TestFiles::writeOver(path, line + line));
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
     QCOMPARE(view->columnWidth(LogModel::TimeColumn), 50);
 }
@@ -480,7 +480,7 @@ void tst_LogInWindow::becomesForeign()
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
     LogView* view = View(*window);
     QTRY_VERIFY_WITH_TIMEOUT(view->isColumnHidden(LogModel::TimeColumn), Patience);
-    QVERIFY(TestFiles::write(path, "starting\n2026-11-22 14:03:02 WARN caf\xC3\xA9\n"));
+    QVERIFY(TestFiles::writeOver(path, "starting\n2026-11-22 14:03:02 WARN caf\xC3\xA9\n"));
     QTRY_VERIFY_WITH_TIMEOUT(!view->isColumnHidden(LogModel::TimeColumn), Patience);
     QCOMPARE(view->model()->index(1, LogModel::SeverityColumn).data().toString(),
              QString("Warning"));
@@ -495,7 +495,7 @@ void tst_LogInWindow::pauses()
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
     QTest::keyClick(window.get(), Qt::Key_P, Qt::ControlModifier | Qt::ShiftModifier);
     QVERIFY(Child<QLabel>(window.get(), "Lines shown")->text().endsWith("paused"));
-    QVERIFY(TestFiles::write(test.logFile(), run(5, QTime(9, 0), "x")));
+    QVERIFY(TestFiles::writeOver(test.logFile(), run(5, QTime(9, 0), "x")));
     QTest::qWait(4 * LogScanner::PollInterval);
     QCOMPARE(Rows(*window), 2);
     QTest::keyClick(window.get(), Qt::Key_P, Qt::ControlModifier | Qt::ShiftModifier);

@@ -234,7 +234,7 @@ void tst_MarksInWindow::moveWithTheirLines()
     QCOMPARE(View(*window)->model()->index(row, 3).data().toString(), QString("older 80"));
 
     // While the window is open.
-    QVERIFY(TestFiles::write(test.logFile(), "new\n" + older));
+    QVERIFY(TestFiles::writeOver(test.logFile(), "new\n" + older));
     QTRY_COMPARE_WITH_TIMEOUT(Marked(*window), QVector<int>({81}), Patience);
 }
 
@@ -251,7 +251,7 @@ void tst_MarksInWindow::lineWrittenOver()
         ++row;
     MarkRow(*window, row);
     QCOMPARE(Marked(*window).size(), 1);
-    QVERIFY(TestFiles::write(test.logFile(), writtenOver(older, newer)));
+    QVERIFY(TestFiles::writeOver(test.logFile(), writtenOver(older, newer)));
     QTRY_COMPARE_WITH_TIMEOUT(View(*window)->model()->index(101, 3).data().toString(),
                               QString("newer 59"), Patience);
     QTRY_VERIFY_WITH_TIMEOUT(Marked(*window).isEmpty(), Patience);
@@ -315,7 +315,7 @@ void tst_MarksInWindow::selectionInTheLineStays()
     line->setFocus();
     QTest::keyClick(line, Qt::Key_A, Qt::ControlModifier);
     QVERIFY(line->textCursor().hasSelection());
-    QVERIFY(TestFiles::write(test.logFile(), run(120, QTime(9, 0), "x")));
+    QVERIFY(TestFiles::writeOver(test.logFile(), run(120, QTime(9, 0), "x")));
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 120, Patience);
     QVERIFY(line->textCursor().hasSelection());
     QCOMPARE(View(*window)->currentIndex().row(), 50);
