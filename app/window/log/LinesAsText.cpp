@@ -53,6 +53,26 @@ QString CellText(LogModel const& model, int row, int column)
 
 } // namespace
 
+QString LinesAsText::Entries(LogModel const& model, QList<int> const& rows, int limit, int& count)
+{
+    QString text;
+    count = 0;
+    int next = 0; // the lines before are in the text
+    for (int row : rows) {
+        if (IsHeading(model, row))
+            continue;
+        const QPair<int, int> entry = model.EntryRows(row);
+        for (next = std::max(next, entry.first); next <= entry.second && count < limit; ++next) {
+            const QString line = model.LineText(next, LogIndex::LineLimit + 1);
+            text += line.leftRef(LogIndex::LineLimit);
+            text += line.size() > LogIndex::LineLimit ? QStringLiteral("\u2026\n")
+                                                      : QStringLiteral("\n");
+            ++count;
+        }
+    }
+    return text;
+}
+
 QString LinesAsText::Markdown(LogModel const& model, QList<int> const& rows)
 {
     QString lines;

@@ -15,6 +15,12 @@ class LogModel;
 class LinesAsText
 {
 public:
+    /// The entries that rows belong to, as stored in the file.
+    ///
+    /// @param limit  the maximum number of lines
+    /// @param count  set to the number of lines in the text
+    static QString Entries(LogModel const& model, QList<int> const& rows, int limit, int& count);
+
     /// A code block, fenced so that no line ends it.
     static QString Markdown(LogModel const& model, QList<int> const& rows);
 

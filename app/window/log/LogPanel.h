@@ -4,30 +4,29 @@
 #pragma once
 
 #include "app/logfile/LogEncoding.h"
+#include "app/window/log/FindControl.h"
+#include "app/window/log/LineCopier.h"
+#include "app/window/log/MarkControl.h"
 
 #include <QList>
-#include <QModelIndex>
 #include <QString>
 #include <QStringList>
 #include <QWidget>
 
 #include <memory>
 
-class QComboBox;
-class QPlainTextEdit;
-class QMenu;
+class QModelIndex;
 class QSplitter;
 
 namespace Velocor {
 
-class ElidedLabel;
+class CurrentLine;
+class LogFileBox;
 class LogFilterBar;
 class LogFindBar;
 class LogGoTo;
 class LogMarkStore;
-class LogMarks;
 class LogModel;
-class LogSearch;
 class LogView;
 
 /// A log view with its controls: choice of older files, filter, table, and the text of the current
@@ -76,7 +75,7 @@ public:
 
     /// Goes to the next (step 1) or previous (step -1) line with the text to find, as soon as it is
     /// found. Opens the find bar if there is no text yet.
-    void FindNext(int step);
+    void FindNext(int step) { m_find->Next(step); }
 
     /// Asks for a line number or a time, and goes there.
     void AskGoTo();
@@ -87,22 +86,23 @@ public:
     /// Sets where the marks of log files are kept, before a file is opened.
     ///
     /// @param store  not owned
-    void SetMarkStore(LogMarkStore* store);
+    void SetMarkStore(LogMarkStore* store) { m_marks->SetStore(store); }
 
     /// Marks the current line or removes its mark.
-    void ToggleMark();
+    void ToggleMark() { m_marks->Toggle(); }
 
     /// Asks for a note on the current line.
-    void AskNote();
+    void AskNote() { m_marks->AskNote(); }
 
     /// Goes to the next (step 1) or previous (step -1) marked line, or reports that there is none.
-    void GoToMark(int step);
+    void GoToMark(int step) { m_marks->GoTo(step); }
 
-    void CopySelected();
+    /// Copies the selected entries, as stored in the file.
+    void CopySelected() { m_copier->Copy(); }
 
     /// Copies the selected lines as a Markdown code block, or as CSV.
-    void CopyAsMarkdown();
-    void CopyAsCsv();
+    void CopyAsMarkdown() { m_copier->CopyAsMarkdown(); }
+    void CopyAsCsv() { m_copier->CopyAsCsv(); }
 
     /// Where the lines shown start in the file, in the order shown.
     QVector<qint64> LineStarts() const;
@@ -138,45 +138,32 @@ Q_SIGNALS:
 
 protected:
     void keyPressEvent(QKeyEvent* event) override;
-    bool eventFilter(QObject* object, QEvent* event) override;
     void focusInEvent(QFocusEvent* event) override;
 
 private:
-    void copyRows(QList<int> const& rows, QString const& text);
-    void reportCopied(int count);
-    void makeControls();
+    QWidget* makeTable();
     void makeLayout();
-    void connectAll();
-    void fillFileList();
-    void chooseFile(int position);
+    void connectParts();
+    void connectView();
+    void connectModel();
     void showFile(QString const& path);
     void showCurrentLine();
-    void showNote();
     void updatePlaceholder();
-    void applyFind();
-    void showFound();
-    void goToFound();
-    void showMarks();
     void showMenu(QPoint const& position, QModelIndex const& cell);
-    void showLineMenu(QPoint const& position);
-    void filterBy(QModelIndex const& cell, bool isHiding);
-    void report(QString const& message);
 
     LogModel* m_model;
     LogView* m_view;
+    LogFileBox* m_files;
     LogFilterBar* m_filterBar;
     LogFindBar* m_findBar;
-    LogSearch* m_search;
-    LogGoTo* m_goTo;
-    LogMarks* m_marks;
-    QComboBox* m_files = nullptr;
-    QPlainTextEdit* m_line = nullptr;
-    ElidedLabel* m_note = nullptr;
+    CurrentLine* m_line;
     QSplitter* m_splitter;
+    FindControl* m_find;
+    MarkControl* m_marks;
+    LineCopier* m_copier;
+    LogGoTo* m_goTo;
     QString m_currentPath; // the log of the running program; empty for other logs
     int m_percent = 100;
-    int m_wantedStep = 0; // to a hit that has not been found yet
-    int m_wheel = 0;      // eighths of a degree that have not zoomed yet
 };
 
 } // namespace Velocor

@@ -3,7 +3,6 @@
 
 #include "app/window/log/LogView.h"
 
-#include "app/logfile/LogIndex.h"
 #include "app/logfile/LogSeverities.h"
 #include "app/window/log/LogDelegate.h"
 #include "app/window/log/LogModel.h"
@@ -11,10 +10,8 @@
 #include "app/window/widgets/RowHeight.h"
 
 #include <QAbstractButton>
-#include <QClipboard>
 #include <QContextMenuEvent>
 #include <QEvent>
-#include <QGuiApplication>
 #include <QHeaderView>
 #include <QPainter>
 #include <QScopedValueRollback>
@@ -310,30 +307,6 @@ QList<int> LogView::SelectedRows() const
     std::sort(rows.begin(), rows.end());
     rows.erase(std::unique(rows.begin(), rows.end()), rows.end());
     return rows;
-}
-
-int LogView::CopySelected()
-{
-    const QList<int> rows = SelectedRows();
-    QString text;
-    int count = 0;
-    int next = 0; // the lines before are copied
-    for (int row : rows) {
-        if (m_model->index(row, 0).data(LogModel::HeadingRole).toBool())
-            continue;
-        const QPair<int, int> entry = m_model->EntryRows(row);
-        for (next = std::max(next, entry.first); next <= entry.second && count < MaximumCopiedLines;
-             ++next) {
-            const QString line = m_model->LineText(next, LogIndex::LineLimit + 1);
-            text += line.leftRef(LogIndex::LineLimit);
-            text += line.size() > LogIndex::LineLimit ? QStringLiteral("\u2026\n")
-                                                      : QStringLiteral("\n");
-            ++count;
-        }
-    }
-    if (count > 0)
-        QGuiApplication::clipboard()->setText(text);
-    return count;
 }
 
 void LogView::SetPlaceholder(QString const& text)

@@ -53,11 +53,6 @@ public:
     /// The vertical scroll bar.
     TickScrollBar* ticks() const { return m_ticks; }
 
-    /// Copies the selected lines, as stored in the file.
-    ///
-    /// @return the number of lines copied
-    int CopySelected();
-
     /// The numbers of the selected rows in ascending order, at most MaximumCopiedLines.
     QList<int> SelectedRows() const;
 

@@ -1,0 +1,50 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/log/LogTableMenu.h"
+
+#include "app/window/log/LineCopier.h"
+#include "app/window/log/LogFilterBar.h"
+#include "app/window/log/LogModel.h"
+#include "app/window/log/MarkControl.h"
+
+namespace Velocor {
+
+LogTableMenu::LogTableMenu(QModelIndex const& cell, LineCopier* copier, LogFilterBar* filter,
+                           MarkControl* marks, QWidget* parent)
+    : QMenu(parent), m_cell(cell), m_filter(filter)
+{
+    setAttribute(Qt::WA_DeleteOnClose);
+    addAction(tr("&Copy"), copier, &LineCopier::Copy);
+    addSeparator();
+    addAction(tr("&Filter by This"), this, [this] { filterBy(false); });
+    addAction(tr("&Hide This"), this, [this] { filterBy(true); });
+    addSeparator();
+    addAction(marks->isMarked() ? tr("Remove &Mark") : tr("&Mark"), marks, &MarkControl::Toggle);
+    addAction(tr("&Note..."), marks, &MarkControl::AskNote);
+}
+
+// The names of severities are translated, so their cells stand for the severity itself.
+void LogTableMenu::filterBy(bool isHiding)
+{
+    if (!m_cell.isValid())
+        return;
+    if (m_cell.column() == LogModel::SeverityColumn) {
+        const auto severity =
+            static_cast<LogEntry::Severity>(m_cell.data(LogModel::SeverityRole).toInt());
+        if (isHiding)
+            m_filter->Hide(severity);
+        else
+            m_filter->FilterBy(severity);
+        return;
+    }
+    const QString text = m_cell.data().toString();
+    if (text.isEmpty())
+        return;
+    if (isHiding)
+        m_filter->Hide(text);
+    else
+        m_filter->FilterBy(text);
+}
+
+} // namespace Velocor

@@ -1,0 +1,91 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/log/MarkControl.h"
+
+#include "app/window/log/LogMarks.h"
+#include "app/window/log/LogView.h"
+#include "app/window/log/NoteDialog.h"
+#include "app/window/log/TickScrollBar.h"
+
+#include <algorithm>
+
+namespace Velocor {
+
+MarkControl::MarkControl(LogModel* model, LogView* view, QWidget* parent)
+    : QObject(parent), m_view(view), m_marks(new LogMarks(model, this)), m_window(parent)
+{
+    connect(m_marks, &LogMarks::changed, this, &MarkControl::show);
+}
+
+void MarkControl::SetStore(LogMarkStore* store)
+{
+    m_marks->SetStore(store);
+}
+
+void MarkControl::Load()
+{
+    m_marks->Load();
+}
+
+void MarkControl::report(QString const& message)
+{
+    if (!message.isEmpty())
+        Q_EMIT messageReported(message);
+}
+
+void MarkControl::Toggle()
+{
+    report(m_marks->Toggle(m_view->currentIndex().row()));
+}
+
+void MarkControl::AskNote()
+{
+    const QPersistentModelIndex current = m_view->currentIndex();
+    if (!current.isValid()) {
+        report(tr("Select a line first"));
+        return;
+    }
+    NoteDialog dialog(m_marks->NoteOf(current.row()), m_window);
+    if (dialog.exec() == QDialog::Accepted)
+        report(m_marks->SetNote(current.row(), dialog.note()));
+}
+
+void MarkControl::GoTo(int step)
+{
+    std::vector<int> const& rows = *m_marks->rows();
+    if (rows.empty()) {
+        report(tr("No marks in the lines shown"));
+        return;
+    }
+    const int from = m_view->StartRow(step);
+    const auto after = std::upper_bound(rows.begin(), rows.end(), from);
+    const auto before = std::lower_bound(rows.begin(), rows.end(), from);
+    const bool isAhead = step > 0 ? after != rows.end() : before != rows.begin();
+    if (step > 0)
+        m_view->GoToRow(isAhead ? *after : rows.front());
+    else
+        m_view->GoToRow(isAhead ? *(before - 1) : rows.back());
+    m_view->setFocus();
+    if (!isAhead)
+        report(step > 0 ? tr("Continued from the top") : tr("Continued from the bottom"));
+}
+
+bool MarkControl::isMarked() const
+{
+    return m_marks->isMarked(m_view->currentIndex().row());
+}
+
+QString MarkControl::note() const
+{
+    return m_marks->NoteOf(m_view->currentIndex().row());
+}
+
+void MarkControl::show()
+{
+    m_view->ticks()->SetTicks(TickScrollBar::Marked, m_marks->rows());
+    m_view->viewport()->update();
+    Q_EMIT changed();
+}
+
+} // namespace Velocor
