@@ -97,6 +97,7 @@ private slots:
     void filterByThis();
     void hideThis();
     void severityOfTheMenu();
+    void severityCounts();
     void selectionOfTheCurrentLine();
     void history();
     void historyIsShared();
@@ -299,6 +300,35 @@ void tst_FilterInWindow::severityOfTheMenu()
     QVERIFY(!Child<QToolButton>(window.get(), "Show Trace")->isChecked());
     Choose(*window, 1, LogModel::SeverityColumn, Qt::Key_F);
     QTRY_COMPARE_WITH_TIMEOUT(Messages(*window), QStringList({"red \"cherry\" pie"}), Patience);
+}
+
+// Of the whole file, whatever the filter.
+void tst_FilterInWindow::severityCounts()
+{
+    const WindowTest test(Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    const auto counts = [&] {
+        QStringList texts;
+        for (char const* name : {"Trace", "Notification", "Warning", "Error", "Fatal", "Other"})
+            texts.append(Child<QToolButton>(window.get(), QString("Show %1").arg(name))->text());
+        return texts.join(' ');
+    };
+    QCOMPARE(counts(), QString("2 0 1 1 1 0"));
+    Type(*window, "apple");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    Click(Child<QToolButton>(window.get(), "Show Warning"));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+    QCOMPARE(counts(), QString("2 0 1 1 1 0"));
+    auto* errors = Child<QToolButton>(window.get(), "Show Error");
+    QVERIFY2(errors->toolTip().endsWith(": 1 in this file"), qPrintable(errors->toolTip()));
+    const QRect place = errors->geometry();
+    QVERIFY(TestFiles::writeOver(test.logFile(),
+                                 Fruit() + entry("09:00:05.000", "Error", "x").repeated(2000)));
+    QTRY_COMPARE_WITH_TIMEOUT(counts(), QString("2 0 1 2.0k 1 0"), Patience);
+    QCOMPARE(errors->geometry(), place);
+    QTest::keyClick(window.get(), Qt::Key_4, Qt::ControlModifier);
+    QTRY_VERIFY(!errors->isChecked());
 }
 
 void tst_FilterInWindow::selectionOfTheCurrentLine()

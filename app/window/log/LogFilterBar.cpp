@@ -4,12 +4,11 @@
 #include "app/window/log/LogFilterBar.h"
 
 #include "app/logfile/LogSeverities.h"
+#include "app/window/log/SeveritySwitches.h"
 #include "app/window/widgets/PlainText.h"
-#include "app/window/widgets/SeverityIcons.h"
 
 #include <QCheckBox>
 #include <QComboBox>
-#include <QEvent>
 #include <QHBoxLayout>
 #include <QKeyEvent>
 #include <QLabel>
@@ -28,56 +27,29 @@ constexpr int MaximumShown = 80; // characters of an earlier filter
 } // namespace
 
 LogFilterBar::LogFilterBar(QWidget* parent)
-    : QWidget(parent), m_text(new QLineEdit), m_error(NewPlainLabel())
+    : QWidget(parent), m_text(new QLineEdit), m_severities(new SeveritySwitches),
+      m_error(NewPlainLabel())
 {
     m_text->setPlaceholderText(tr("Filter"));
     m_text->setClearButtonEnabled(true);
     m_text->setAccessibleName(tr("Filter by text"));
     m_text->setAcceptDrops(false); // leave dropped files to the window
     m_text->setToolTip(PlainToolTip(tr("Show only lines that contain this text (Ctrl+L)")));
+    m_text->installEventFilter(this);
     m_error->setAccessibleName(tr("Filter error"));
     m_error->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
     m_error->setWordWrap(true);
     m_error->hide();
 
-    m_case = makeOption(tr("Aa"), tr("Match case"), tr("Match case"));
-    m_expression = makeOption(tr(".*"), tr("Regular expression"),
-                              tr("Search each line with a regular expression"));
-
-    m_text->installEventFilter(this);
-    m_earlier = new QToolButton;
-    m_earlier->setArrowType(Qt::DownArrow);
-    m_earlier->setAutoRaise(true);
-    m_earlier->setFocusPolicy(Qt::NoFocus); // the Down key in the text does the same
-    m_earlier->setAccessibleName(tr("Earlier filters"));
-    m_earlier->setToolTip(PlainToolTip(tr("Earlier filters (Down)")));
-    connect(m_earlier, &QToolButton::clicked, this, &LogFilterBar::showHistory);
-
-    auto* row = new QHBoxLayout;
-    row->setSpacing(6);
-    row->addWidget(m_text, 1);
-    row->addWidget(m_earlier);
-    row->addWidget(m_case);
-    row->addWidget(m_expression);
-    row->addSpacing(8);
-    addSeverities();
-    for (QToolButton* button : qAsConst(m_severities))
-        row->addWidget(button);
-
-    m_more = new QToolButton;
-    m_more->setText(tr("More"));
-    m_more->setCheckable(true);
-    m_more->setFocusPolicy(Qt::TabFocus);
-    m_more->setAccessibleName(tr("More filters"));
-    m_more->setToolTip(PlainToolTip(tr("More terms, terms to hide, least severity, context")));
-    row->addWidget(m_more);
+    QLayout* firstRow = makeFirstRow();
     QWidget* secondRow = makeSecondRow();
     connect(m_more, &QToolButton::toggled, secondRow, &QWidget::setVisible);
+    connect(m_severities, &SeveritySwitches::toggled, this, &LogFilterBar::apply);
 
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(0, 0, 0, 0);
     layout->setSpacing(4);
-    layout->addLayout(row);
+    layout->addLayout(firstRow);
     layout->addWidget(secondRow);
     layout->addWidget(m_error);
 
@@ -87,6 +59,38 @@ LogFilterBar::LogFilterBar(QWidget* parent)
     connect(m_text, &QLineEdit::textChanged, this, [this] { m_typing.start(); });
     connect(m_text, &QLineEdit::returnPressed, this, &LogFilterBar::apply);
     connect(m_text, &QLineEdit::editingFinished, this, &LogFilterBar::keepText);
+}
+
+QLayout* LogFilterBar::makeFirstRow()
+{
+    auto* earlier = new QToolButton;
+    earlier->setArrowType(Qt::DownArrow);
+    earlier->setAutoRaise(true);
+    earlier->setFocusPolicy(Qt::NoFocus); // the Down key in the text does the same
+    earlier->setAccessibleName(tr("Earlier filters"));
+    earlier->setToolTip(PlainToolTip(tr("Earlier filters (Down)")));
+    connect(earlier, &QToolButton::clicked, this, &LogFilterBar::showHistory);
+
+    m_case = makeOption(tr("Aa"), tr("Match case"), tr("Match case"));
+    m_expression = makeOption(tr(".*"), tr("Regular expression"),
+                              tr("Search each line with a regular expression"));
+    m_more = new QToolButton;
+    m_more->setText(tr("More"));
+    m_more->setCheckable(true);
+    m_more->setFocusPolicy(Qt::TabFocus);
+    m_more->setAccessibleName(tr("More filters"));
+    m_more->setToolTip(PlainToolTip(tr("More terms, terms to hide, least severity, context")));
+
+    auto* row = new QHBoxLayout;
+    row->setSpacing(6);
+    row->addWidget(m_text, 1);
+    row->addWidget(earlier);
+    row->addWidget(m_case);
+    row->addWidget(m_expression);
+    row->addSpacing(8);
+    row->addWidget(m_severities);
+    row->addWidget(m_more);
+    return row;
 }
 
 QLineEdit* LogFilterBar::makeTerms(QString const& name, QString const& toolTip)
@@ -110,25 +114,8 @@ QWidget* LogFilterBar::makeSecondRow()
     m_hidden = makeTerms(tr("Terms of lines to hide"),
                          tr("Hide lines that contain any of these terms. "
                             "Blanks separate terms; \"two words\" are one."));
-    m_least = new QComboBox;
-    m_least->setAccessibleName(tr("Least severity"));
-    m_least->addItem(tr("All severities"));
-    for (int i = 1; i < LogEntry::Fatal; ++i)
-        m_least->addItem(
-            tr("At least %1").arg(LogSeverities::Name(static_cast<LogEntry::Severity>(i))));
-    m_least->addItem(tr("Only %1").arg(LogSeverities::Name(LogEntry::Fatal)));
-    m_least->addItem(tr("Some severities")); // as the buttons say
-    connect(m_least, QOverload<int>::of(&QComboBox::activated), this,
-            &LogFilterBar::setLeastSeverity);
-    m_context = new QComboBox;
-    m_context->setAccessibleName(tr("Lines of context"));
-    m_context->setToolTip(PlainToolTip(tr("Lines to show before and after each one that matches")));
-    for (int lines : {0, 1, 2, 5, 10}) {
-        const QString text = lines == 0 ? tr("No context") : tr("%1 around").arg(lines);
-        m_context->addItem(text, lines);
-    }
-    connect(m_context, QOverload<int>::of(&QComboBox::currentIndexChanged), this,
-            &LogFilterBar::apply);
+    m_least = makeLeastSeverity();
+    m_context = makeContext();
 
     auto* second = new QWidget;
     auto* row = new QHBoxLayout(second);
@@ -144,27 +131,34 @@ QWidget* LogFilterBar::makeSecondRow()
     return second;
 }
 
-void LogFilterBar::setLeastSeverity(int least)
+QComboBox* LogFilterBar::makeLeastSeverity()
 {
-    if (least >= LogEntry::None)
-        return;
-    for (int i = 0; i < m_severities.size(); ++i) {
-        const QSignalBlocker blocker(m_severities.at(i));
-        m_severities.at(i)->setChecked(i >= least);
-    }
-    apply();
+    auto* box = new QComboBox;
+    box->setAccessibleName(tr("Least severity"));
+    box->addItem(tr("All severities"));
+    for (int i = 1; i < LogEntry::Fatal; ++i)
+        box->addItem(
+            tr("At least %1").arg(LogSeverities::Name(static_cast<LogEntry::Severity>(i))));
+    box->addItem(tr("Only %1").arg(LogSeverities::Name(LogEntry::Fatal)));
+    box->addItem(tr("Some severities")); // as the buttons say
+    connect(box, QOverload<int>::of(&QComboBox::activated), this, [this](int least) {
+        if (least < LogEntry::None)
+            m_severities->SetLeast(least);
+    });
+    return box;
 }
 
-// What the five buttons amount to.
-void LogFilterBar::showLeastSeverity()
+QComboBox* LogFilterBar::makeContext()
 {
-    int least = 0;
-    while (least < LogEntry::None && !m_severities.at(least)->isChecked())
-        ++least;
-    bool isRange = least < LogEntry::None;
-    for (int i = least; i < m_severities.size(); ++i)
-        isRange = isRange && m_severities.at(i)->isChecked();
-    m_least->setCurrentIndex(isRange ? least : LogEntry::None);
+    auto* box = new QComboBox;
+    box->setAccessibleName(tr("Lines of context"));
+    box->setToolTip(PlainToolTip(tr("Lines to show before and after each one that matches")));
+    for (int lines : {0, 1, 2, 5, 10}) {
+        const QString text = lines == 0 ? tr("No context") : tr("%1 around").arg(lines);
+        box->addItem(text, lines);
+    }
+    connect(box, QOverload<int>::of(&QComboBox::currentIndexChanged), this, &LogFilterBar::apply);
+    return box;
 }
 
 // What the second row does is told while it is hidden, too.
@@ -196,19 +190,12 @@ void LogFilterBar::Hide(QString const& text)
 
 void LogFilterBar::FilterBy(LogEntry::Severity severity)
 {
-    if (severity >= m_severities.size())
-        return; // it has no button
-    for (int i = 0; i < m_severities.size(); ++i) {
-        const QSignalBlocker blocker(m_severities.at(i));
-        m_severities.at(i)->setChecked(i == severity);
-    }
-    apply();
+    m_severities->ShowOnly(severity);
 }
 
 void LogFilterBar::Hide(LogEntry::Severity severity)
 {
-    if (severity < m_severities.size())
-        m_severities.at(severity)->setChecked(false);
+    m_severities->SetShown(severity, false);
 }
 
 void LogFilterBar::keepText()
@@ -259,41 +246,6 @@ QCheckBox* LogFilterBar::makeOption(QString const& text, QString const& name,
     return option;
 }
 
-void LogFilterBar::addSeverities()
-{
-    for (int i = 0; i <= LogEntry::None; ++i) {
-        const bool isNone = i == LogEntry::None;
-        const QString name = isNone ? tr("Other") : LogSeverities::Name(LogEntry::Severity(i));
-        auto* button = new QToolButton;
-        button->setCheckable(true);
-        button->setChecked(true);
-        button->setFocusPolicy(Qt::TabFocus);
-        button->setText(name);
-        button->setAccessibleName(tr("Show %1").arg(name));
-        const QString what = isNone ? tr("lines without a severity") : tr("%1 entries").arg(name);
-        button->setToolTip(PlainToolTip(tr("Show or hide %1 (Ctrl+%2)").arg(what).arg(i + 1)));
-        button->setShortcut(QKeySequence(Qt::CTRL | (Qt::Key_1 + i)));
-        button->setToolButtonStyle(Qt::ToolButtonIconOnly);
-        connect(button, &QToolButton::toggled, this, &LogFilterBar::apply);
-        m_severities.append(button);
-    }
-    updateIcons();
-}
-
-void LogFilterBar::updateIcons()
-{
-    for (int i = 0; i < m_severities.size(); ++i)
-        m_severities.at(i)->setIcon(
-            SeverityIcons::SwitchIcon(static_cast<LogEntry::Severity>(i), palette()));
-}
-
-void LogFilterBar::changeEvent(QEvent* event)
-{
-    QWidget::changeEvent(event);
-    if (event->type() == QEvent::PaletteChange)
-        updateIcons();
-}
-
 void LogFilterBar::FocusText()
 {
     m_text->setFocus(Qt::ShortcutFocusReason);
@@ -306,9 +258,7 @@ void LogFilterBar::Clear()
     m_required->clear();
     m_hidden->clear();
     m_context->setCurrentIndex(0);
-    for (QToolButton* button : qAsConst(m_severities))
-        button->setChecked(true);
-    apply();
+    m_severities->ShowAll(); // applies everything
 }
 
 void LogFilterBar::SetEarlierRuns(bool shown)
@@ -319,12 +269,14 @@ void LogFilterBar::SetEarlierRuns(bool shown)
 
 void LogFilterBar::apply()
 {
-    if (m_severities.size() <= LogEntry::None || !m_context)
+    if (!m_context)
         return; // controls are not complete yet
     m_typing.stop();
-    for (int i = 0; i < m_severities.size(); ++i)
-        m_filter.SetSeverity(static_cast<LogEntry::Severity>(i), m_severities.at(i)->isChecked());
-    showLeastSeverity();
+    for (int i = 0; i <= LogEntry::None; ++i) {
+        const auto severity = static_cast<LogEntry::Severity>(i);
+        m_filter.SetSeverity(severity, m_severities->Shows(severity));
+    }
+    m_least->setCurrentIndex(m_severities->least());
     m_filter.SetTerms(LogTerms(m_required->text(), m_case->isChecked()),
                       LogTerms(m_hidden->text(), m_case->isChecked()));
     m_filter.SetContext(m_context->currentData().toInt());
@@ -353,6 +305,11 @@ void LogFilterBar::ShowSlowLine(size_t line)
                       .arg(static_cast<qulonglong>(line)));
     else if (m_filter.hasText())
         showError(QString());
+}
+
+void LogFilterBar::ShowCounts(LogCounts const& counts)
+{
+    m_severities->SetCounts(counts);
 }
 
 } // namespace Velocor

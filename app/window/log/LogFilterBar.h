@@ -14,10 +14,13 @@
 class QCheckBox;
 class QComboBox;
 class QLabel;
+class QLayout;
 class QLineEdit;
 class QToolButton;
 
 namespace Velocor {
+
+class SeveritySwitches;
 
 /// The filter controls of a log view: text, match options, one button per severity and one for
 /// lines without a severity; in a second row, which is shown on demand, more terms, a least
@@ -59,33 +62,33 @@ public:
     /// Says that the expression takes too long at a line, starting at 1; 0 if it does not.
     void ShowSlowLine(size_t line);
 
+    /// Shows how many entries of each severity are in the file.
+    void ShowCounts(LogCounts const& counts);
+
 Q_SIGNALS:
     void filterChanged();
 
 protected:
-    void changeEvent(QEvent* event) override;
     bool eventFilter(QObject* watched, QEvent* event) override;
 
 private:
     QCheckBox* makeOption(QString const& text, QString const& name, QString const& toolTip);
-    void addSeverities();
+    QLayout* makeFirstRow();
     QLineEdit* makeTerms(QString const& name, QString const& toolTip);
     QWidget* makeSecondRow();
-    void setLeastSeverity(int least);
-    void showLeastSeverity();
+    QComboBox* makeLeastSeverity();
+    QComboBox* makeContext();
     void showMore();
     void keepText();
     void showHistory();
-    void updateIcons();
     void apply();
     void showError(QString const& error);
 
     QLineEdit* m_text;
-    QCheckBox* m_case;
-    QCheckBox* m_expression;
-    QVector<QToolButton*> m_severities;
-    QToolButton* m_earlier;
-    QToolButton* m_more;
+    QCheckBox* m_case = nullptr;
+    QCheckBox* m_expression = nullptr;
+    SeveritySwitches* m_severities;
+    QToolButton* m_more = nullptr;
     QLineEdit* m_required = nullptr;
     QLineEdit* m_hidden = nullptr;
     QComboBox* m_least = nullptr;

@@ -120,6 +120,7 @@ void LogPanel::connectModel()
 {
     connect(m_model, &LogModel::refreshed, this, [this] {
         m_filterBar->ShowSlowLine(m_model->state().slowLine);
+        m_filterBar->ShowCounts(m_model->state().counts);
         updatePlaceholder();
         if (!m_view->currentIndex().isValid())
             showCurrentLine();
