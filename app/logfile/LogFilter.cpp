@@ -75,6 +75,16 @@ LogFilter::Match LogFilter::Find(QString const& line) const
     return match.hasMatch() ? Yes : No;
 }
 
+LogFilter::Match LogFilter::FindQuickly(QString const& line) const
+{
+    if (!m_isExpression)
+        return m_matcher.indexIn(line) >= 0 ? Yes : No;
+    const QRegularExpressionMatch match = m_marking.match(line);
+    if (!match.isValid())
+        return TooLong;
+    return match.hasMatch() ? Yes : No;
+}
+
 QVector<QPair<int, int>> LogFilter::Ranges(QString const& text) const
 {
     QVector<QPair<int, int>> ranges;

@@ -4,6 +4,7 @@
 #include "app/window/FileTabs.h"
 
 #include "app/window/DistinctNames.h"
+#include "app/window/log/HighlightDialog.h"
 #include "app/window/log/LogPanel.h"
 #include "app/window/settings/SettingsEditor.h"
 #include "app/window/widgets/PlainText.h"
@@ -18,7 +19,8 @@
 
 namespace Velocor {
 
-FileTabs::FileTabs(LogMarkStore* marks, QWidget* parent) : QTabWidget(parent), m_marks(marks)
+FileTabs::FileTabs(LogMarkStore* marks, QWidget* parent)
+    : QTabWidget(parent), m_marks(marks), m_highlightRules(std::make_shared<HighlightRules>())
 {
     setDocumentMode(true);
     setTabBarAutoHide(true);
@@ -29,6 +31,7 @@ FileTabs::FileTabs(LogMarkStore* marks, QWidget* parent) : QTabWidget(parent), m
     setElideMode(Qt::ElideMiddle);
     setAccessibleName(tr("Open files"));
     tabBar()->setAccessibleName(tr("Open files"));
+    connect(m_highlightRules.get(), &HighlightRules::stopped, this, &FileTabs::messageReported);
     m_ownLog = addLog(QString());
     setTabText(0, tr("Log"));
     connect(this, &QTabWidget::currentChanged, this, &FileTabs::stateChanged);
@@ -81,6 +84,7 @@ LogPanel* FileTabs::addLog(QString const& path)
     panel->setAccessibleName(name);
     panel->SetMarkStore(m_marks);
     panel->SetFilterHistory(m_filterHistory);
+    panel->SetHighlightRules(m_highlightRules);
     connect(panel, &LogPanel::stateChanged, this, &FileTabs::stateChanged);
     connect(panel, &LogPanel::messageReported, this, &FileTabs::messageReported);
     connect(panel, &LogPanel::zoomRequested, this, &FileTabs::zoomRequested);
@@ -207,6 +211,11 @@ void FileTabs::SetTextFont(QFont const& font)
         if (auto* log = qobject_cast<LogPanel*>(widget(i)))
             log->SetTextFont(font);
     }
+}
+
+void FileTabs::EditHighlightRules()
+{
+    HighlightDialog(m_highlightRules, this).exec();
 }
 
 void FileTabs::MarkOwnLog(bool marked)

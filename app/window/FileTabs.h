@@ -12,6 +12,7 @@
 
 namespace Velocor {
 
+class HighlightRules;
 class LogMarkStore;
 class LogPanel;
 class SettingsEditor;
@@ -55,6 +56,12 @@ public:
     QStringList filterHistory() const { return *m_filterHistory; }
     void SetFilterHistory(QStringList const& texts) { *m_filterHistory = texts; }
 
+    /// The rules that highlight lines, in all logs.
+    HighlightRules* highlightRules() const { return m_highlightRules.get(); }
+
+    /// Lets the user change them.
+    void EditHighlightRules();
+
     /// The panel of the program's own log.
     LogPanel* ownLog() const { return m_ownLog; }
 
@@ -92,6 +99,7 @@ private:
 
     LogMarkStore* m_marks;
     std::shared_ptr<QStringList> m_filterHistory = std::make_shared<QStringList>();
+    std::shared_ptr<HighlightRules> m_highlightRules;
     LogPanel* m_ownLog;
     QFont m_textFont;
 };

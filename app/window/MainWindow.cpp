@@ -19,6 +19,7 @@
 #include "app/window/ShortcutList.h"
 #include "app/window/StandardInput.h"
 #include "app/window/SystemReport.h"
+#include "app/window/log/HighlightRules.h"
 #include "app/window/log/LineSaver.h"
 #include "app/window/log/LogFilterBar.h"
 #include "app/window/log/LogModel.h"
@@ -338,6 +339,9 @@ void MainWindow::makeViewMenu()
     menu->addSeparator();
     makeEncodingMenu(menu->addMenu(tr("En&coding")));
     makeTextMenu(menu->addMenu(tr("Te&xt")));
+    addAction(menu, tr("&Highlight Rules..."), QKeySequence(tr("Ctrl+Shift+H")),
+              tr("Give lines with certain texts a color"),
+              [this] { m_tabs->EditHighlightRules(); });
     m_reopen =
         addSwitch(menu, tr("Reopen Files at &Start"), QKeySequence(tr("Ctrl+Alt+O")),
                   tr("Open the files of these tabs again when the program starts"), [](bool) {});
@@ -436,6 +440,7 @@ void MainWindow::restoreState()
     QStringList filters = m_settings.Text(QStringLiteral("filters")).split(QLatin1Char('\n'));
     filters.removeAll(QString());
     m_tabs->SetFilterHistory(filters.mid(0, LogFilterBar::MaximumHistory));
+    m_tabs->highlightRules()->SetFromText(m_settings.Text(QStringLiteral("highlights")));
     showPlaces(m_settings.Flag(QStringLiteral("placesShown"), false));
     const bool toolBarShown = m_settings.Flag(QStringLiteral("toolBarShown"), true);
     m_showToolBar->setChecked(toolBarShown);
@@ -456,6 +461,7 @@ void MainWindow::saveState()
     m_settings.SetNumbers(QStringLiteral("linePane"), m_tabs->ownLog()->paneSizes());
     m_settings.SetText(QStringLiteral("recentFiles"), m_recent->list());
     m_settings.SetText(QStringLiteral("filters"), m_tabs->filterHistory().join(QLatin1Char('\n')));
+    m_settings.SetText(QStringLiteral("highlights"), m_tabs->highlightRules()->ToText());
     m_settings.SetFlag(QStringLiteral("reopenFiles"), m_reopen->isChecked());
     const QStringList files = openFiles();
     const QString current = FileTabs::PathOf(m_tabs->currentWidget());

@@ -69,12 +69,14 @@ void CurrentLine::showMenu(QPoint const& position)
     menu->setAttribute(Qt::WA_DeleteOnClose);
     const QString selected = m_text->textCursor().selectedText();
     menu->addSeparator();
-    QAction* filter = menu->addAction(tr("&Filter by This"), this,
-                                      [this, selected] { Q_EMIT filterRequested(selected); });
-    QAction* hide = menu->addAction(tr("&Hide This"), this,
-                                    [this, selected] { Q_EMIT hideRequested(selected); });
-    filter->setEnabled(!selected.isEmpty());
-    hide->setEnabled(!selected.isEmpty());
+    const auto add = [&](QString const& text, void (CurrentLine::*request)(QString const&)) {
+        QAction* action =
+            menu->addAction(text, this, [this, selected, request] { (this->*request)(selected); });
+        action->setEnabled(!selected.isEmpty());
+    };
+    add(tr("&Filter by This"), &CurrentLine::filterRequested);
+    add(tr("&Hide This"), &CurrentLine::hideRequested);
+    add(tr("Hi&ghlight This"), &CurrentLine::highlightRequested);
     menu->popup(m_text->mapToGlobal(position));
 }
 

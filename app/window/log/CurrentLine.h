@@ -35,9 +35,11 @@ public:
     QWidget* viewport() const;
 
 Q_SIGNALS:
-    /// What is selected in the text shall filter the log, or lines with it shall be hidden.
+    /// What is selected in the text shall filter the log, lines with it shall be hidden, or
+    /// highlighted.
     void filterRequested(QString const& text);
     void hideRequested(QString const& text);
+    void highlightRequested(QString const& text);
 
 private:
     void showMenu(QPoint const& position);

@@ -3,6 +3,8 @@
 
 #include "app/window/log/LogDelegate.h"
 
+#include "app/window/log/HighlightColors.h"
+#include "app/window/log/HighlightRules.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/TickScrollBar.h"
 #include "app/window/widgets/BlendedColor.h"
@@ -80,12 +82,25 @@ void LogDelegate::initStyleOption(QStyleOptionViewItem* option, QModelIndex cons
         option->palette.setColor(QPalette::Text,
                                  Blended(option->palette.color(QPalette::Text),
                                          option->palette.color(QPalette::Base), ContextFade));
+    const int color = ruleColor(index);
+    if (color >= 0) {
+        option->backgroundBrush = HighlightColors::Background(color, option->palette);
+        option->palette.setColor(QPalette::Text, HighlightColors::Text(option->palette));
+    }
     if (index.column() == LogModel::TimeColumn && index.data(LogModel::MarkedRole).toBool())
         option->backgroundBrush =
             Blended(option->palette.color(QPalette::Base),
                     TickScrollBar::Color(TickScrollBar::Marked, option->palette), 0.2);
     if (index.column() == LogModel::SeverityColumn && !index.data(LogModel::ContextRole).toBool())
         option->palette.setColor(QPalette::Text, SeverityIcons::Color(severity, option->palette));
+}
+
+// Not in the severity column, which has colors of its own.
+int LogDelegate::ruleColor(QModelIndex const& index) const
+{
+    if (!m_rules || m_rules->isIdle() || index.column() == LogModel::SeverityColumn)
+        return -1;
+    return m_rules->ColorOf(index.data(LogModel::LineRole).toString());
 }
 
 void LogDelegate::paint(QPainter* painter, QStyleOptionViewItem const& option,

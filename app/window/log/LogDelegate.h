@@ -8,10 +8,14 @@
 #include <QStyledItemDelegate>
 #include <QTextLayout>
 
+#include <memory>
+
 namespace Velocor {
 
+class HighlightRules;
+
 /// Draws the cells of a log view: headings between runs, severity colors, and highlighted matches
-/// of the filter text and of the text to find, and the user's marks.
+/// of the filter text and of the text to find, the user's marks, and lines that rules highlight.
 class LogDelegate : public QStyledItemDelegate
 {
     Q_OBJECT
@@ -25,6 +29,9 @@ public:
     /// Highlights the matches of this text in another color.
     void SetFound(LogFilter const& found) { m_found = found; }
 
+    /// Highlights whole lines, except for their severity.
+    void SetRules(std::shared_ptr<HighlightRules> const& rules) { m_rules = rules; }
+
     void paint(QPainter* painter, QStyleOptionViewItem const& option,
                QModelIndex const& index) const override;
 
@@ -32,6 +39,7 @@ protected:
     void initStyleOption(QStyleOptionViewItem* option, QModelIndex const& index) const override;
 
 private:
+    int ruleColor(QModelIndex const& index) const;
     QVector<QTextLayout::FormatRange> marks(QString const& text) const;
     void paintMarked(QPainter* painter, QStyleOptionViewItem const& option,
                      QVector<QTextLayout::FormatRange> const& formats) const;
@@ -40,6 +48,7 @@ private:
 
     LogFilter m_filter;
     LogFilter m_found;
+    std::shared_ptr<HighlightRules> m_rules;
 };
 
 } // namespace Velocor

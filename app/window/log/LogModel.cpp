@@ -489,6 +489,8 @@ QVariant LogModel::data(QModelIndex const& index, int role) const
         return m_marks.contains(LineStart(row));
     case ContextRole:
         return bool(m_state.rows->marks[static_cast<size_t>(row)] & LogRows::Context);
+    case LineRole:
+        return LineText(row, ShownLimit);
     case NoteRole:
         return m_marks.value(LineStart(row));
     default:

@@ -43,7 +43,8 @@ public:
         EarlierRole,                 ///< whether the row belongs to an earlier run
         MarkedRole,                  ///< whether the user has marked the row
         NoteRole,                    ///< the user's note on it
-        ContextRole                  ///< whether it is shown only as the context of others
+        LineRole,   ///< the start of the line in the file, of up to ShownLimit bytes
+        ContextRole ///< whether it is shown only as the context of others
     };
 
     explicit LogModel(QObject* parent = nullptr);

@@ -6,6 +6,7 @@
 #include "app/logfile/LogIndex.h"
 #include "app/window/log/CurrentLine.h"
 #include "app/window/log/GoToDialog.h"
+#include "app/window/log/HighlightRules.h"
 #include "app/window/log/LogFileBox.h"
 #include "app/window/log/LogFilterBar.h"
 #include "app/window/log/LogFindBar.h"
@@ -91,6 +92,7 @@ void LogPanel::connectParts()
             [this](QString const& text) { m_filterBar->FilterBy(text); });
     connect(m_line, &CurrentLine::hideRequested, this,
             [this](QString const& text) { m_filterBar->Hide(text); });
+    connect(m_line, &CurrentLine::highlightRequested, this, &LogPanel::highlight);
     connect(m_find, &FindControl::messageReported, this, &LogPanel::messageReported);
     connect(m_copier, &LineCopier::messageReported, this, &LogPanel::messageReported);
     connect(m_marks, &MarkControl::messageReported, this, &LogPanel::messageReported);
@@ -256,9 +258,22 @@ void LogPanel::SetFilterHistory(std::shared_ptr<QStringList> const& history)
     m_filterBar->SetHistory(history);
 }
 
+void LogPanel::SetHighlightRules(std::shared_ptr<HighlightRules> const& rules)
+{
+    m_rules = rules;
+    m_view->SetHighlightRules(rules);
+}
+
+void LogPanel::highlight(QString const& text)
+{
+    if (m_rules && !text.isEmpty())
+        Q_EMIT messageReported(m_rules->Add(text));
+}
+
 void LogPanel::showMenu(QPoint const& position, QModelIndex const& cell)
 {
     auto* menu = new LogTableMenu(cell, m_copier, m_filterBar, m_marks, this);
+    connect(menu, &LogTableMenu::highlightRequested, this, &LogPanel::highlight);
     menu->popup(position);
 }
 

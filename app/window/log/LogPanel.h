@@ -21,6 +21,7 @@ class QSplitter;
 namespace Velocor {
 
 class CurrentLine;
+class HighlightRules;
 class LogFileBox;
 class LogFilterBar;
 class LogFindBar;
@@ -82,6 +83,9 @@ public:
 
     /// See LogFilterBar::SetHistory().
     void SetFilterHistory(std::shared_ptr<QStringList> const& history);
+
+    /// Sets the rules that highlight lines; shared with other logs.
+    void SetHighlightRules(std::shared_ptr<HighlightRules> const& rules);
 
     /// Sets where the marks of log files are kept, before a file is opened.
     ///
@@ -149,6 +153,7 @@ private:
     void showFile(QString const& path);
     void showCurrentLine();
     void updatePlaceholder();
+    void highlight(QString const& text);
     void showMenu(QPoint const& position, QModelIndex const& cell);
 
     LogModel* m_model;
@@ -162,6 +167,7 @@ private:
     MarkControl* m_marks;
     LineCopier* m_copier;
     LogGoTo* m_goTo;
+    std::shared_ptr<HighlightRules> m_rules;
     QString m_currentPath; // the log of the running program; empty for other logs
     int m_percent = 100;
 };

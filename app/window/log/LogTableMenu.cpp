@@ -19,6 +19,9 @@ LogTableMenu::LogTableMenu(QModelIndex const& cell, LineCopier* copier, LogFilte
     addSeparator();
     addAction(tr("&Filter by This"), this, [this] { filterBy(false); });
     addAction(tr("&Hide This"), this, [this] { filterBy(true); });
+    QAction* highlight = addAction(tr("Hi&ghlight This"), this,
+                                   [this] { Q_EMIT highlightRequested(m_cell.data().toString()); });
+    highlight->setEnabled(cell.isValid() && cell.column() != LogModel::SeverityColumn);
     addSeparator();
     addAction(marks->isMarked() ? tr("Remove &Mark") : tr("&Mark"), marks, &MarkControl::Toggle);
     addAction(tr("&Note..."), marks, &MarkControl::AskNote);

@@ -26,6 +26,10 @@ public:
     LogTableMenu(QModelIndex const& cell, LineCopier* copier, LogFilterBar* filter,
                  MarkControl* marks, QWidget* parent);
 
+Q_SIGNALS:
+    /// Lines with a text shall be highlighted.
+    void highlightRequested(QString const& text);
+
 private:
     void filterBy(bool isHiding);
 

@@ -4,6 +4,7 @@
 #include "app/window/log/LogView.h"
 
 #include "app/logfile/LogSeverities.h"
+#include "app/window/log/HighlightRules.h"
 #include "app/window/log/LogDelegate.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/TickScrollBar.h"
@@ -293,6 +294,12 @@ void LogView::SetFound(LogFilter const& found)
 {
     m_delegate->SetFound(found);
     viewport()->update();
+}
+
+void LogView::SetHighlightRules(std::shared_ptr<HighlightRules> const& rules)
+{
+    m_delegate->SetRules(rules);
+    connect(rules.get(), &HighlightRules::changed, viewport(), QOverload<>::of(&QWidget::update));
 }
 
 QList<int> LogView::SelectedRows() const

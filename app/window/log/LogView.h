@@ -5,8 +5,11 @@
 
 #include <QTableView>
 
+#include <memory>
+
 namespace Velocor {
 
+class HighlightRules;
 class LogDelegate;
 class LogFilter;
 class LogModel;
@@ -49,6 +52,9 @@ public:
 
     /// Highlights the matches of a text to find.
     void SetFound(LogFilter const& found);
+
+    /// Sets the rules that highlight lines.
+    void SetHighlightRules(std::shared_ptr<HighlightRules> const& rules);
 
     /// The vertical scroll bar.
     TickScrollBar* ticks() const { return m_ticks; }

@@ -153,8 +153,8 @@ void SeveritySwitches::showCount(int severity)
     QToolButton* button = m_buttons.at(severity);
     SetText(button, ShortCount(count));
     button->setAccessibleDescription(number);
-    button->setToolTip(PlainToolTip(
-        tr("Show or hide %1 (Ctrl+%2): %3").arg(what).arg(severity + 1).arg(number)));
+    button->setToolTip(
+        PlainToolTip(tr("Show or hide %1 (Ctrl+%2): %3").arg(what).arg(severity + 1).arg(number)));
 }
 
 QString SeveritySwitches::ShortCount(size_t count)
