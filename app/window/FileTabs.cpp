@@ -89,6 +89,7 @@ LogPanel* FileTabs::addLog(QString const& path)
     connect(panel, &LogPanel::messageReported, this, &FileTabs::messageReported);
     connect(panel, &LogPanel::zoomRequested, this, &FileTabs::zoomRequested);
     panel->SetTextFont(m_textFont);
+    panel->SetLineWrap(m_isWrapped);
     if (!path.isEmpty())
         panel->Open(path, false);
     setTabToolTip(addTab(panel, QString()), PlainToolTip(path));
@@ -210,6 +211,15 @@ void FileTabs::SetTextFont(QFont const& font)
     for (int i = 0; i < count(); ++i) {
         if (auto* log = qobject_cast<LogPanel*>(widget(i)))
             log->SetTextFont(font);
+    }
+}
+
+void FileTabs::SetLineWrap(bool wrapped)
+{
+    m_isWrapped = wrapped;
+    for (int i = 0; i < count(); ++i) {
+        if (auto* log = qobject_cast<LogPanel*>(widget(i)))
+            log->SetLineWrap(wrapped);
     }
 }
 

@@ -68,6 +68,9 @@ public:
     /// Sets the font of all logs.
     void SetTextFont(QFont const& font);
 
+    /// Wraps the lines of all logs or not.
+    void SetLineWrap(bool wrapped);
+
     /// Marks the tab of the program's log: there is a problem with it.
     void MarkOwnLog(bool marked);
 
@@ -102,6 +105,7 @@ private:
     std::shared_ptr<HighlightRules> m_highlightRules;
     LogPanel* m_ownLog;
     QFont m_textFont;
+    bool m_isWrapped = false;
 };
 
 } // namespace Velocor

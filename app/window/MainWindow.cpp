@@ -381,6 +381,9 @@ void MainWindow::makeTextMenu(QMenu* menu)
     m_monospaced = addSwitch(menu, tr("&Monospaced Font"), QKeySequence(tr("Ctrl+Alt+M")),
                              tr("Show logs in a font whose characters are equally wide"),
                              [this](bool) { updateTextFont(); });
+    m_wrap = addSwitch(menu, tr("Line &Wrap"), QKeySequence(tr("Ctrl+Alt+W")),
+                       tr("Show long messages of logs in several lines"),
+                       [this](bool wrapped) { m_tabs->SetLineWrap(wrapped); });
 }
 
 void MainWindow::setZoom(int zoom)
@@ -434,6 +437,8 @@ void MainWindow::restoreState()
     m_monospaced->setChecked(m_settings.Flag(QStringLiteral("monospaced"), false));
     m_zoom = qBound(-MaximumZoom, m_settings.Text(QStringLiteral("zoom")).toInt(), MaximumZoom);
     updateTextFont();
+    m_wrap->setChecked(m_settings.Flag(QStringLiteral("lineWrap"), false));
+    m_tabs->SetLineWrap(m_wrap->isChecked());
     m_tabs->ownLog()->SetColumnWidths(m_settings.Numbers(QStringLiteral("columns")));
     m_tabs->ownLog()->SetPaneSizes(m_settings.Numbers(QStringLiteral("linePane")));
     m_recent->SetList(m_settings.Text(QStringLiteral("recentFiles")));
@@ -455,6 +460,7 @@ void MainWindow::saveState()
     if (m_showPlaces->isChecked())
         m_settings.SetNumbers(QStringLiteral("panes"), m_splitter->sizes());
     m_settings.SetFlag(QStringLiteral("monospaced"), m_monospaced->isChecked());
+    m_settings.SetFlag(QStringLiteral("lineWrap"), m_wrap->isChecked());
     m_settings.SetText(QStringLiteral("zoom"), QString::number(m_zoom));
     m_settings.SetFlag(QStringLiteral("toolBarShown"), m_showToolBar->isChecked());
     m_settings.SetNumbers(QStringLiteral("columns"), m_tabs->ownLog()->columnWidths());

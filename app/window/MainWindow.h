@@ -130,6 +130,7 @@ private:
     QAction* m_showToolBar = nullptr;
     QAction* m_reopen = nullptr;
     QAction* m_monospaced = nullptr;
+    QAction* m_wrap = nullptr;
     QAction* m_find = nullptr;
     QAction* m_filter = nullptr;
     QAction* m_nextProblem = nullptr;

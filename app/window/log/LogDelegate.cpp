@@ -8,10 +8,14 @@
 #include "app/window/log/LogModel.h"
 #include "app/window/log/TickScrollBar.h"
 #include "app/window/widgets/BlendedColor.h"
+#include "app/window/widgets/RowHeight.h"
 #include "app/window/widgets/SeverityIcons.h"
 
 #include <QApplication>
 #include <QPainter>
+#include <QtMath>
+
+#include <algorithm>
 
 namespace Velocor {
 
@@ -44,6 +48,54 @@ QTextCharFormat FoundFormat()
     format.setBackground(QColor(0x74, 0xe0, 0xef));
     format.setForeground(QColor(0x1a, 0x1a, 0x1a));
     return format;
+}
+
+int TextMargin(QStyle const* style, QWidget const* widget)
+{
+    return style->pixelMetric(QStyle::PM_FocusFrameHMargin, nullptr, widget) + 1;
+}
+
+void LayOutLines(QTextLayout& layout, qreal width, int mostLines)
+{
+    qreal y = 0;
+    layout.beginLayout();
+    while (layout.lineCount() < mostLines) {
+        QTextLine line = layout.createLine();
+        if (!line.isValid())
+            break;
+        line.setLineWidth(width);
+        line.setPosition(QPointF(0, y));
+        y += line.height();
+    }
+    layout.endLayout();
+}
+
+// One line is clipped by the cell; of several, the last one is elided.
+void LayOut(QTextLayout& layout, int width, int mostLines)
+{
+    QTextOption option(Qt::AlignLeft);
+    option.setWrapMode(mostLines == 1 ? QTextOption::NoWrap
+                                      : QTextOption::WrapAtWordBoundaryOrAnywhere);
+    layout.setTextOption(option);
+    LayOutLines(layout, mostLines == 1 ? 1 << 20 : std::max(1, width), mostLines);
+    if (mostLines == 1 || layout.lineCount() < mostLines)
+        return;
+    const QTextLine last = layout.lineAt(mostLines - 1);
+    if (last.textStart() + last.textLength() >= layout.text().size())
+        return;
+    const QString rest = QFontMetrics(layout.font())
+                             .elidedText(layout.text().mid(last.textStart()), Qt::ElideRight,
+                                         std::max(1, width - 1));
+    layout.setText(layout.text().left(last.textStart()) + rest);
+    LayOutLines(layout, std::max(1, width), mostLines);
+}
+
+qreal HeightOfLines(QTextLayout const& layout)
+{
+    qreal height = 0;
+    for (int i = 0; i < layout.lineCount(); ++i)
+        height += layout.lineAt(i).height();
+    return height;
 }
 
 void AddFormats(QVector<QTextLayout::FormatRange>& formats, QVector<QPair<int, int>> const& ranges,
@@ -112,17 +164,29 @@ void LogDelegate::paint(QPainter* painter, QStyleOptionViewItem const& option,
         paintHeading(painter, cell);
         return;
     }
+    paintContent(painter, cell, index);
+    if (index.column() == LogModel::TimeColumn && index.data(LogModel::MarkedRole).toBool())
+        paintUserMark(painter, cell, !index.data(LogModel::NoteRole).toString().isEmpty());
+}
 
+void LogDelegate::paintContent(QPainter* painter, QStyleOptionViewItem const& option,
+                               QModelIndex const& index) const
+{
+    QStyleOptionViewItem cell = option;
+    const bool isMessage = index.column() == LogModel::MessageColumn;
+    if (m_mostLines > 1 && !isMessage) { // beside the first line of the message
+        paintEmpty(painter, cell);
+        cell.rect.setHeight(RowHeight(cell.fontMetrics));
+        cell.state &= ~QStyle::State_HasFocus;
+    }
     // Not in the severity column, because the filter does not search translated names.
     const bool isMarkable = index.column() != LogModel::SeverityColumn;
     const QVector<QTextLayout::FormatRange> formats =
         isMarkable ? marks(cell.text) : QVector<QTextLayout::FormatRange>();
-    if (formats.isEmpty())
+    if (formats.isEmpty() && (m_mostLines == 1 || !isMessage))
         StyleOf(cell)->drawControl(QStyle::CE_ItemViewItem, &cell, painter, cell.widget);
     else
-        paintMarked(painter, cell, formats);
-    if (index.column() == LogModel::TimeColumn && index.data(LogModel::MarkedRole).toBool())
-        paintUserMark(painter, cell, !index.data(LogModel::NoteRole).toString().isEmpty());
+        paintMarked(painter, cell, formats, isMessage ? m_mostLines : 1);
 }
 
 // A bar at the edge of the row, and a folded corner if there is a note.
@@ -133,7 +197,7 @@ void LogDelegate::paintUserMark(QPainter* painter, QStyleOptionViewItem const& o
     painter->save();
     painter->fillRect(cell.left(), cell.top(), MarkWidth, cell.height(), color);
     if (hasNote) {
-        const int size = cell.height() / 2;
+        const int size = std::min(cell.height(), RowHeight(option.fontMetrics)) / 2;
         const QPoint corner(cell.right() + 1, cell.top());
         painter->setPen(Qt::NoPen);
         painter->setBrush(color);
@@ -171,37 +235,47 @@ void LogDelegate::paintHeading(QPainter* painter, QStyleOptionViewItem const& op
     painter->restore();
 }
 
-void LogDelegate::paintMarked(QPainter* painter, QStyleOptionViewItem const& option,
-                              QVector<QTextLayout::FormatRange> const& formats) const
+int LogDelegate::HeightOf(QString const& message, QFont const& font, int width) const
 {
-    QStyle const* style = StyleOf(option);
-    QStyleOptionViewItem background = option;
-    background.text.clear();
-    style->drawControl(QStyle::CE_ItemViewItem, &background, painter, option.widget);
+    QStyle const* style = QApplication::style();
+    QTextLayout layout(message, font);
+    LayOut(layout, width - 2 * TextMargin(style, nullptr), m_mostLines);
+    return qCeil(HeightOfLines(layout)) + RowHeight(QFontMetrics(font)) -
+           QFontMetrics(font).height();
+}
 
+void LogDelegate::paintMarked(QPainter* painter, QStyleOptionViewItem const& option,
+                              QVector<QTextLayout::FormatRange> const& formats, int mostLines)
+{
+    paintEmpty(painter, option);
+    QStyle const* style = StyleOf(option);
     const QRect cell = style->subElementRect(QStyle::SE_ItemViewItemText, &option, option.widget);
-    const int margin = style->pixelMetric(QStyle::PM_FocusFrameHMargin, nullptr, option.widget) + 1;
+    const int margin = TextMargin(style, option.widget);
     const QRect area = cell.adjusted(margin, 0, -margin, 0);
 
     QTextLayout layout(option.text, option.font);
-    QTextOption textOption(Qt::AlignLeft);
-    textOption.setWrapMode(QTextOption::NoWrap);
-    layout.setTextOption(textOption);
     layout.setFormats(formats);
-    layout.beginLayout();
-    QTextLine line = layout.createLine();
-    if (line.isValid())
-        line.setLineWidth(1 << 20);
-    layout.endLayout();
-
+    LayOut(layout, area.width(), mostLines);
+    const qreal width = layout.lineCount() > 0 ? layout.lineAt(0).naturalTextWidth() : 0;
+    const qreal height = HeightOfLines(layout);
     const bool selected = option.state & QStyle::State_Selected;
     const bool right = option.displayAlignment & Qt::AlignRight;
-    const qreal x = right ? area.right() + 1 - line.naturalTextWidth() : area.left();
+    const qreal x = right ? area.right() + 1 - width : area.left();
     painter->save();
     painter->setClipRect(area);
     painter->setPen(option.palette.color(selected ? QPalette::HighlightedText : QPalette::Text));
-    layout.draw(painter, QPointF(x, area.top() + (area.height() - line.height()) / 2));
+    layout.draw(painter, QPointF(x, area.top() + std::max(0.0, (area.height() - height) / 2)));
     painter->restore();
+}
+
+// Background and focus.
+void LogDelegate::paintEmpty(QPainter* painter, QStyleOptionViewItem const& option)
+{
+    QStyleOptionViewItem background = option;
+    background.text.clear();
+    background.icon = QIcon();
+    background.features &= ~QStyleOptionViewItem::HasDecoration;
+    StyleOf(option)->drawControl(QStyle::CE_ItemViewItem, &background, painter, option.widget);
 }
 
 } // namespace Velocor

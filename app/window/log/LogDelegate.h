@@ -32,6 +32,12 @@ public:
     /// Highlights whole lines, except for their severity.
     void SetRules(std::shared_ptr<HighlightRules> const& rules) { m_rules = rules; }
 
+    /// Wraps messages to several lines, at most to this number; 1: does not wrap them.
+    void SetMostLines(int lines) { m_mostLines = lines; }
+
+    /// The height of a row with a message in a column of a width, in pixels.
+    int HeightOf(QString const& message, QFont const& font, int width) const;
+
     void paint(QPainter* painter, QStyleOptionViewItem const& option,
                QModelIndex const& index) const override;
 
@@ -39,16 +45,20 @@ protected:
     void initStyleOption(QStyleOptionViewItem* option, QModelIndex const& index) const override;
 
 private:
+    void paintContent(QPainter* painter, QStyleOptionViewItem const& option,
+                      QModelIndex const& index) const;
     int ruleColor(QModelIndex const& index) const;
     QVector<QTextLayout::FormatRange> marks(QString const& text) const;
-    void paintMarked(QPainter* painter, QStyleOptionViewItem const& option,
-                     QVector<QTextLayout::FormatRange> const& formats) const;
+    static void paintMarked(QPainter* painter, QStyleOptionViewItem const& option,
+                            QVector<QTextLayout::FormatRange> const& formats, int mostLines);
+    static void paintEmpty(QPainter* painter, QStyleOptionViewItem const& option);
     static void paintUserMark(QPainter* painter, QStyleOptionViewItem const& option, bool hasNote);
     static void paintHeading(QPainter* painter, QStyleOptionViewItem const& option);
 
     LogFilter m_filter;
     LogFilter m_found;
     std::shared_ptr<HighlightRules> m_rules;
+    int m_mostLines = 1;
 };
 
 } // namespace Velocor

@@ -214,6 +214,11 @@ void LogPanel::SetTextFont(QFont const& font)
     SetColumnWidths(widths);
 }
 
+void LogPanel::SetLineWrap(bool wrapped)
+{
+    m_view->SetLineWrap(wrapped);
+}
+
 void LogPanel::AddBar(QWidget* bar)
 {
     auto* all = static_cast<QVBoxLayout*>(layout());

@@ -65,6 +65,9 @@ public:
     /// The columns keep their widths in characters.
     void SetTextFont(QFont const& font);
 
+    /// See LogView::SetLineWrap().
+    void SetLineWrap(bool wrapped);
+
     /// Adds a bar above the table. The panel takes ownership.
     void AddBar(QWidget* bar);
 

@@ -23,8 +23,7 @@
 namespace Velocor {
 
 LogView::LogView(LogModel* model, QWidget* parent)
-    : QTableView(parent), m_model(model), m_delegate(new LogDelegate(this)),
-      m_ticks(new TickScrollBar(this))
+    : WrappingTable(new LogDelegate, parent), m_model(model), m_ticks(new TickScrollBar(this))
 {
     setUp();
     setModel(model);
@@ -34,10 +33,14 @@ LogView::LogView(LogModel* model, QWidget* parent)
     connect(model, &LogModel::refreshed, this, &LogView::afterRefresh);
 }
 
+LogDelegate* LogView::cells() const
+{
+    return static_cast<LogDelegate*>(itemDelegate());
+}
+
 void LogView::setUp()
 {
     setAccessibleName(tr("Log entries"));
-    setItemDelegate(m_delegate);
     setVerticalScrollBar(m_ticks);
     setSelectionBehavior(SelectRows);
     setSelectionMode(ExtendedSelection);
@@ -84,25 +87,21 @@ void LogView::SetDefaultWidths()
 
 void LogView::changeEvent(QEvent* event)
 {
-    QTableView::changeEvent(event);
+    WrappingTable::changeEvent(event);
     if (event->type() != QEvent::FontChange && event->type() != QEvent::StyleChange)
         return;
     setRowHeight();
-    if (!m_following)
-        return;
-    const QScopedValueRollback<bool> guard(m_scrollingItself, true);
-    updateGeometries(); // updates the scroll bar's range
-    scrollToBottom();
+    restartWrapping();
+    if (m_following)
+        goToEnd();
 }
 
 // A lower view would show the same first row, and no longer the newest one.
 void LogView::resizeEvent(QResizeEvent* event)
 {
-    QTableView::resizeEvent(event);
-    if (!m_following)
-        return;
-    const QScopedValueRollback<bool> guard(m_scrollingItself, true);
-    scrollToBottom();
+    WrappingTable::resizeEvent(event);
+    if (m_following)
+        goToEnd();
 }
 
 // Qt makes the first row the current one, although nobody has selected it: its text would be shown
@@ -129,20 +128,37 @@ void LogView::contextMenuEvent(QContextMenuEvent* event)
 
 void LogView::SetFollowing(bool following)
 {
-    if (following) {
-        const QScopedValueRollback<bool> guard(m_scrollingItself, true);
-        scrollToBottom();
-    }
+    if (following)
+        goToEnd();
     if (following == m_following)
         return;
     m_following = following;
     Q_EMIT followingChanged(following);
 }
 
+void LogView::goToEnd()
+{
+    const QScopedValueRollback<bool> guard(m_scrollingItself, true);
+    updateScrollBars();
+    scrollToBottom();
+}
+
+// Rows that come into view may be higher, so that the end of the table moves.
 void LogView::noteScrolled(int value)
 {
+    const bool isEnd = value == verticalScrollBar()->maximum();
+    measureRows();
     if (!m_scrollingItself && m_model->rowCount() > 0)
-        SetFollowing(value == verticalScrollBar()->maximum());
+        SetFollowing(isEnd);
+}
+
+void LogView::SetLineWrap(bool wrapped)
+{
+    setWrapped(wrapped);
+    if (m_following)
+        goToEnd();
+    else if (currentIndex().isValid())
+        scrollTo(currentIndex());
 }
 
 // Compensates for rows inserted above the visible ones.
@@ -178,11 +194,10 @@ void LogView::afterRefresh()
     fitTimes();
     updateHeadings();
     m_ticks->SetRowCount(m_model->rowCount());
+    measureChangedRows();
     restoreCurrent();
-    if (m_following) {
-        updateGeometries(); // updates the scroll bar's range
-        scrollToBottom();
-    }
+    if (m_following)
+        goToEnd();
     viewport()->update();
 }
 
@@ -218,6 +233,8 @@ void LogView::restoreCurrent()
         SetFollowing(false);
     updateGeometries(); // updates the scroll bar's range
     verticalScrollBar()->setValue(row - m_keptDistance);
+    if (isWrapped())
+        scrollTo(index); // the rows above it may have become higher
 }
 
 // Other programs' stamps may be longer than the log's own. Once for a file, or users could not make
@@ -292,13 +309,13 @@ void LogView::GoToRow(int row)
 
 void LogView::SetFound(LogFilter const& found)
 {
-    m_delegate->SetFound(found);
+    cells()->SetFound(found);
     viewport()->update();
 }
 
 void LogView::SetHighlightRules(std::shared_ptr<HighlightRules> const& rules)
 {
-    m_delegate->SetRules(rules);
+    cells()->SetRules(rules);
     connect(rules.get(), &HighlightRules::changed, viewport(), QOverload<>::of(&QWidget::update));
 }
 
@@ -325,7 +342,7 @@ void LogView::SetPlaceholder(QString const& text)
 
 void LogView::UpdateMarks()
 {
-    m_delegate->SetFilter(m_model->filter());
+    cells()->SetFilter(m_model->filter());
     viewport()->update();
 }
 

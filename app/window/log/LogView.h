@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include <QTableView>
+#include "app/window/log/WrappingTable.h"
 
 #include <memory>
 
@@ -20,13 +20,16 @@ class TickScrollBar;
 /// Following stops when the user scrolls away from the end and resumes on scrolling back to it. The
 /// current line stays current and in view when the filter changes; if it is filtered out, the
 /// nearest one takes its place.
-class LogView : public QTableView
+class LogView : public WrappingTable
 {
     Q_OBJECT
 
 public:
     /// @param model  shown from the start; not owned
     explicit LogView(LogModel* model, QWidget* parent = nullptr);
+
+    /// Shows long messages in several lines, at most WrappedRows::MaximumLines. The rest is elided.
+    void SetLineWrap(bool wrapped);
 
     /// Whether to keep the newest row in view.
     void SetFollowing(bool following);
@@ -93,8 +96,10 @@ protected:
     void rowsAboutToBeRemoved(QModelIndex const& parent, int first, int last) override;
 
 private:
+    LogDelegate* cells() const;
     void setUp();
     void noteScrolled(int value);
+    void goToEnd();
     void afterRefresh();
     void noteCurrent();
     void restoreCurrent();
@@ -104,12 +109,10 @@ private:
     void updateHeadings();
 
     LogModel* m_model;
-    LogDelegate* m_delegate;
     TickScrollBar* m_ticks;
     QString m_placeholder;
     QString m_fittedPath;
     bool m_following = true;
-    bool m_scrollingItself = false;
     int m_earlierRows = -1;
 
     // The current line and its distance from the top, while the rows are replaced.
