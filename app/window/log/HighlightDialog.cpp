@@ -14,6 +14,7 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
+#include <QPixmap>
 #include <QPushButton>
 #include <QSignalBlocker>
 #include <QVBoxLayout>
@@ -83,8 +84,11 @@ QLayout* HighlightDialog::makeFields()
     m_case->setAccessibleName(tr("Match case"));
     m_expression->setAccessibleName(tr("Regular expression"));
     m_color->setAccessibleName(tr("Color"));
-    for (int color = 0; color < HighlightColors::Count; ++color)
-        m_color->addItem(HighlightColors::Name(color));
+    for (int color = 0; color < HighlightColors::Count; ++color) {
+        QPixmap sample(m_color->iconSize());
+        sample.fill(HighlightColors::Background(color, palette()));
+        m_color->addItem(sample, HighlightColors::Name(color));
+    }
     m_error->setAccessibleName(tr("Problem of the rule"));
     m_error->setWordWrap(true);
     connect(m_text, &QLineEdit::textChanged, this, &HighlightDialog::takeFields);

@@ -19,6 +19,9 @@ namespace Velocor {
 
 namespace {
 
+constexpr int Margin = 5; // pixels
+constexpr int Gap = 4;    // of Qt, between icon and text, in pixels
+
 // Qt replaces the shortcut of a button along with its text.
 void SetText(QToolButton* button, QString const& text)
 {
@@ -33,7 +36,7 @@ SeveritySwitches::SeveritySwitches(QWidget* parent) : QWidget(parent)
 {
     auto* layout = new QHBoxLayout(this);
     layout->setContentsMargins(0, 0, 0, 0);
-    layout->setSpacing(4);
+    layout->setSpacing(3);
     for (int i = 0; i <= LogEntry::None; ++i) {
         m_buttons.append(makeButton(static_cast<LogEntry::Severity>(i)));
         layout->addWidget(m_buttons.last());
@@ -64,14 +67,13 @@ void SeveritySwitches::updateIcons()
             SeverityIcons::SwitchIcon(static_cast<LogEntry::Severity>(i), palette()));
 }
 
-// As wide as the longest number needs, so that the bar does not jump while a log grows.
+// As wide as the longest number needs, so that the bar does not jump while a log grows. The style
+// would leave more room, which the text of the filter needs on small screens.
 void SeveritySwitches::updateWidths()
 {
     for (QToolButton* button : qAsConst(m_buttons)) {
-        const QString text = button->text();
-        SetText(button, QStringLiteral("888M"));
-        button->setMinimumWidth(button->sizeHint().width());
-        SetText(button, text);
+        const int number = button->fontMetrics().boundingRect(QStringLiteral("888M")).width();
+        button->setFixedWidth(Margin + button->iconSize().width() + Gap + number + Margin);
     }
 }
 
