@@ -7,7 +7,9 @@
 //
 // The build target "screenshots" runs it on a virtual display and puts them into docs/images.
 
+#include "app/window/FileTabs.h"
 #include "app/window/MainWindow.h"
+#include "app/window/log/HighlightRules.h"
 #include "app/window/log/LogFindBar.h"
 #include "app/window/log/LogPanel.h"
 #include "common/log/TorkLog.h"
@@ -194,6 +196,18 @@ void TakeDialogs(MainWindow& window, Camera const& camera)
     TakeDialog(window, "Save Report...", camera, "report");
 }
 
+void TakeHighlights(MainWindow& window, Camera const& camera)
+{
+    HighlightRules* rules = window.findChild<FileTabs*>()->highlightRules();
+    rules->Add("index");
+    rules->Add("import");
+    Trigger(window, "Line Wrap");
+    camera.take(window, "highlight");
+    TakeDialog(window, "Highlight Rules...", camera, "highlight-rules");
+    rules->SetRules({});
+    Trigger(window, "Line Wrap");
+}
+
 void TakeAll(QString const& folder, QString const& suffix)
 {
     const Camera camera(folder, suffix);
@@ -202,6 +216,7 @@ void TakeAll(QString const& folder, QString const& suffix)
     window.show();
     QTest::qWait(1000);
     TakeLogViews(window, camera);
+    TakeHighlights(window, camera);
     TakePlaces(window, camera);
     TakeDialogs(window, camera);
 
