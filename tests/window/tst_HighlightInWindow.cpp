@@ -31,7 +31,6 @@ namespace {
 constexpr int None = -1;
 constexpr int Green = 0;
 constexpr int Blue = 1;
-constexpr int Orange = 2;
 constexpr int Red = 4;
 
 QByteArray Fruit()
