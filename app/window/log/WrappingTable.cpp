@@ -52,7 +52,8 @@ void WrappingTable::measureRows()
         updateScrollBars();
 }
 
-// The header keeps its offset when rows above the first one in view become higher.
+// Rows above the first one in view may have become higher. Newer versions of Qt move the header along
+// in updateGeometries().
 void WrappingTable::updateScrollBars()
 {
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
