@@ -52,8 +52,8 @@ void WrappingTable::measureRows()
         updateScrollBars();
 }
 
-// Rows above the first one in view may have become higher. Newer versions of Qt move the header along
-// in updateGeometries().
+// Rows above the first one in view may have become higher. Newer versions of Qt move the header
+// along in updateGeometries().
 void WrappingTable::updateScrollBars()
 {
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
@@ -68,21 +68,12 @@ void WrappingTable::updateScrollBars()
     viewport()->update();
 }
 
+// Qt needs the heights of the rows on the way from the edge of the view.
 void WrappingTable::scrollTo(QModelIndex const& index, ScrollHint hint)
 {
-    if (!m_wrapped.isOn() || !index.isValid()) {
-        QTableView::scrollTo(index, hint);
-        return;
-    }
-    const int before = verticalScrollBar()->value();
-    int top = before;
-    {
-        const QScopedValueRollback<bool> guard(m_scrollingItself, true);
-        QTableView::scrollTo(index, hint); // to the column
-        top = topFor(index.row(), hint, before);
-        verticalScrollBar()->setValue(before);
-    }
-    verticalScrollBar()->setValue(top);
+    if (index.isValid() && m_wrapped.Measure(index.row()))
+        updateScrollBars();
+    QTableView::scrollTo(index, hint);
 }
 
 // Qt would skip a row that is only partly in view, which may have many lines.
@@ -96,23 +87,6 @@ QModelIndex WrappingTable::moveCursor(CursorAction action, Qt::KeyboardModifiers
     if (m_wrapped.isOn() && action == MovePageUp && current.row() > 0)
         return current.sibling(m_wrapped.FirstAbove(current.row() - 1, height), current.column());
     return QTableView::moveCursor(action, modifiers);
-}
-
-// The row at the top that shows a row at the right place, if rows differ in height.
-int WrappingTable::topFor(int row, ScrollHint hint, int before)
-{
-    const int height = viewport()->height();
-    const int lowest = m_wrapped.FirstAbove(row, height);
-    int top = qBound(lowest, before, row);
-    if (hint == PositionAtTop)
-        top = row;
-    else if (hint == PositionAtBottom)
-        top = lowest;
-    else if (hint == PositionAtCenter)
-        top = m_wrapped.FirstAbove(row, (height + rowHeight(row)) / 2);
-    m_wrapped.Measure(top);
-    updateScrollBars();
-    return top;
 }
 
 } // namespace Velocor

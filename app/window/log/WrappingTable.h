@@ -45,8 +45,6 @@ protected:
     bool m_scrollingItself = false;
 
 private:
-    int topFor(int row, ScrollHint hint, int before);
-
     WrappedRows m_wrapped;
 };
 
