@@ -46,6 +46,8 @@ private slots:
     void copiesAsMarkdown_data();
     void copiesAsMarkdown();
     void copiesAsCsv();
+    void copiesFromTheMenu_data();
+    void copiesFromTheMenu();
     void copiesNothingWithoutASelection();
     void savesFilteredLines();
     void savesManyLines();
@@ -118,6 +120,33 @@ void tst_LinesElsewhere::copiesAsCsv()
     // The clipboard may have its own line ends.
     QCOMPARE(QGuiApplication::clipboard()->text().remove('\r'), QString(expected).remove('\r'));
     QCOMPARE(window->statusBar()->currentMessage(), QString("3 lines copied"));
+}
+
+void tst_LinesElsewhere::copiesFromTheMenu_data()
+{
+    QTest::addColumn<int>("key");
+    QTest::addColumn<QString>("start");
+    QTest::newRow("as it is") << int(Qt::Key_C) << "2025-03-03";
+    QTest::newRow("Markdown") << int(Qt::Key_K) << "```\n2025";
+    QTest::newRow("CSV") << int(Qt::Key_V) << "\"Time\",";
+}
+
+void tst_LinesElsewhere::copiesFromTheMenu()
+{
+    QFETCH(int, key);
+    QFETCH(QString, start);
+    const WindowTest test(run(3, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
+    View(*window)->GoToRow(1);
+    QContextMenuEvent byKey(QContextMenuEvent::Keyboard, QPoint(1, 1));
+    QApplication::sendEvent(View(*window)->viewport(), &byKey);
+    QWidget* menu = QApplication::activePopupWidget();
+    QVERIFY(menu);
+    QTest::keyClick(menu, static_cast<Qt::Key>(key));
+    QVERIFY2(QGuiApplication::clipboard()->text().startsWith(start),
+             qPrintable(QGuiApplication::clipboard()->text()));
+    QCOMPARE(window->statusBar()->currentMessage(), QString("1 line copied"));
 }
 
 void tst_LinesElsewhere::copiesNothingWithoutASelection()

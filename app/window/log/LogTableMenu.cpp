@@ -16,6 +16,8 @@ LogTableMenu::LogTableMenu(QModelIndex const& cell, LineCopier* copier, LogFilte
 {
     setAttribute(Qt::WA_DeleteOnClose);
     addAction(tr("&Copy"), copier, &LineCopier::Copy);
+    addAction(tr("Copy as Mar&kdown"), copier, &LineCopier::CopyAsMarkdown);
+    addAction(tr("Copy as CS&V"), copier, &LineCopier::CopyAsCsv);
     addSeparator();
     addAction(tr("&Filter by This"), this, [this] { filterBy(false); });
     addAction(tr("&Hide This"), this, [this] { filterBy(true); });
