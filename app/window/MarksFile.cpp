@@ -43,6 +43,18 @@ bool ReadMark(QString const& text, LogMark& mark)
     return isNumber;
 }
 
+// By LogEncoding::Kind.
+char const* const EncodingNames[] = {"", "latin-1", "utf-8", "utf-16le", "utf-16be"};
+
+LogEncoding EncodingOf(QString const& name)
+{
+    for (int kind = LogEncoding::Utf16Be; kind > LogEncoding::Automatic; --kind) {
+        if (name == QLatin1String(EncodingNames[kind]))
+            return static_cast<LogEncoding::Kind>(kind);
+    }
+    return LogEncoding::Automatic;
+}
+
 } // namespace
 
 MarksFile::MarksFile(QString const& dataPath) : m_fileName(dataPath + QLatin1String("marks.cfg")) {}
@@ -54,7 +66,7 @@ QVector<MarksFile::Log> MarksFile::read(QString& error) const
         return logs;
     const SettingsDocument document = SettingsFileReader::Read(m_fileName);
     if (!document.isReadable || !document.isParsed) {
-        error = QObject::tr("%1 is damaged, so marks are not saved").arg(m_fileName);
+        error = QObject::tr("%1 is damaged, so marks and encodings are not saved").arg(m_fileName);
         return logs;
     }
     for (SettingsDocument::Section const& section : document.sections) {
@@ -64,6 +76,8 @@ QVector<MarksFile::Log> MarksFile::read(QString& error) const
             LogMark mark;
             if (item.key == QLatin1String("path"))
                 log.path = value;
+            else if (item.key == QLatin1String("encoding"))
+                log.encoding = EncodingOf(value);
             else if (log.marks.size() < LogMark::MaximumMarks && ReadMark(value, mark))
                 log.marks.append(mark);
         }
@@ -73,38 +87,69 @@ QVector<MarksFile::Log> MarksFile::read(QString& error) const
     return logs;
 }
 
-QVector<LogMark> MarksFile::Marks(QString const& path)
+MarksFile::Log MarksFile::find(QString const& path) const
 {
     QString error;
     const QVector<Log> logs = read(error);
     for (Log const& log : logs) {
         if (log.path == path)
-            return log.marks;
+            return log;
     }
-    return QVector<LogMark>();
+    Log none;
+    none.path = path;
+    return none;
+}
+
+QVector<LogMark> MarksFile::Marks(QString const& path)
+{
+    return find(path).marks;
 }
 
 QString MarksFile::SetMarks(QString const& path, QVector<LogMark> const& marks)
+{
+    Log log = find(path);
+    log.marks = marks;
+    return replace(log);
+}
+
+LogEncoding MarksFile::Encoding(QString const& path)
+{
+    return find(path).encoding;
+}
+
+QString MarksFile::SetEncoding(QString const& path, LogEncoding encoding)
+{
+    Log log = find(path);
+    log.encoding = encoding;
+    return replace(log);
+}
+
+// It becomes the first one.
+QString MarksFile::replace(Log const& log) const
 {
     QString error;
     QVector<Log> logs = read(error);
     if (!error.isEmpty())
         return error;
-    logs.erase(
-        std::remove_if(logs.begin(), logs.end(), [&](Log const& log) { return log.path == path; }),
-        logs.end());
-    if (!marks.isEmpty())
-        logs.prepend({path, marks});
+    logs.erase(std::remove_if(logs.begin(), logs.end(),
+                              [&](Log const& other) { return other.path == log.path; }),
+               logs.end());
+    if (!log.marks.isEmpty() || log.encoding != LogEncoding::Automatic)
+        logs.prepend(log);
 
     TorkConfigFile file(m_fileName);
     for (int i = 0; i < logs.size() && i < MaximumFiles; ++i) {
         const QString section = QStringLiteral("Log%1").arg(i + 1);
-        file.WriteItem(section, QStringLiteral("path"),
-                       TorkConfigText::EncodeValue(logs.at(i).path));
+        const auto write = [&](QString const& key, QString const& value) {
+            file.WriteItem(section, key, TorkConfigText::EncodeValue(value));
+        };
+        write(QStringLiteral("path"), logs.at(i).path);
+        if (logs.at(i).encoding != LogEncoding::Automatic)
+            write(QStringLiteral("encoding"),
+                  QLatin1String(EncodingNames[logs.at(i).encoding.kind()]));
         int number = 0;
         for (LogMark const& mark : logs.at(i).marks)
-            file.WriteItem(section, QStringLiteral("mark%1").arg(++number),
-                           TorkConfigText::EncodeValue(TextOf(mark)));
+            write(QStringLiteral("mark%1").arg(++number), TextOf(mark));
     }
     QDir().mkpath(QFileInfo(m_fileName).path());
     return file.SaveAtomically() ? QString() : file.m_lastError;

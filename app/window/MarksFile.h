@@ -7,7 +7,7 @@
 
 namespace Velocor {
 
-/// The marks of log files, in the settings file "marks.cfg" in the data directory.
+/// The marks and encodings of log files, in the settings file "marks.cfg" in the data directory.
 ///
 /// The file is read before it is written, so that several windows can share it. A malformed file is
 /// never overwritten. Keys and values: docs/window.md. GUI thread.
@@ -19,8 +19,10 @@ public:
 
     QVector<LogMark> Marks(QString const& path) override;
     QString SetMarks(QString const& path, QVector<LogMark> const& marks) override;
+    LogEncoding Encoding(QString const& path) override;
+    QString SetEncoding(QString const& path, LogEncoding encoding) override;
 
-    /// For how many log files marks are kept: those whose marks were changed last.
+    /// How many log files are kept: those whose marks or encodings were changed last.
     static constexpr int MaximumFiles = 50;
 
 private:
@@ -28,9 +30,12 @@ private:
     {
         QString path;
         QVector<LogMark> marks;
+        LogEncoding encoding = LogEncoding::Automatic;
     };
 
     QVector<Log> read(QString& error) const;
+    Log find(QString const& path) const;
+    QString replace(Log const& log) const;
 
     QString m_fileName;
 };

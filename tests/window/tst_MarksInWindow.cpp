@@ -94,6 +94,8 @@ private slots:
     void fileIsBounded();
     void damagedFile();
     void hostileNotes();
+    void encodings();
+    void encodingIsKept();
 };
 
 void tst_MarksInWindow::initTestCase()
@@ -372,6 +374,63 @@ void tst_MarksInWindow::hostileNotes()
         QCOMPARE(marks[0].start, qint64(7));
         QVERIFY(marks[0].above.isEmpty() && marks[0].below.isEmpty());
     }
+}
+
+// Beside the marks of a file, and without.
+void tst_MarksInWindow::encodings()
+{
+    const WindowTest test;
+    MarksFile file(test.folder());
+    LogMark mark;
+    mark.line = "1:a";
+    QCOMPARE(file.SetMarks("/a", {mark}), QString());
+    QVERIFY(file.Encoding("/a") == LogEncoding::Automatic);
+    for (LogEncoding::Kind kind :
+         {LogEncoding::Latin1, LogEncoding::Utf8, LogEncoding::Utf16Le, LogEncoding::Utf16Be}) {
+        for (char const* path : {"/a", "/b"}) {
+            QCOMPARE(file.SetEncoding(path, kind), QString());
+            QVERIFY(file.Encoding(path) == kind);
+        }
+        QCOMPARE(file.Marks("/a").size(), 1);
+    }
+    QCOMPARE(file.SetMarks("/a", {}), QString());
+    QVERIFY(file.Encoding("/a") == LogEncoding::Utf16Be);
+    QCOMPARE(file.SetEncoding("/a", LogEncoding::Automatic), QString());
+    const QByteArray stored = TestFiles::read(test.folder() + "marks.cfg");
+    QVERIFY2(stored.contains("/b") && !stored.contains("/a<"), stored.constData());
+    QVERIFY(TestFiles::write(test.folder() + "marks.cfg",
+                             "<VelocorSettings><Log1><path>/c</path><encoding>utf-99</encoding>"
+                             "</Log1></VelocorSettings>"));
+    QVERIFY(file.Encoding("/c") == LogEncoding::Automatic);
+}
+
+void tst_MarksInWindow::encodingIsKept()
+{
+    const WindowTest test;
+    const QString path = test.folder() + "other.log";
+    QVERIFY(TestFiles::write(path, "caf\xc3\xa9\n"));
+    const auto message = [](MainWindow& window) {
+        return View(window)->model()->index(0, LogModel::MessageColumn).data().toString();
+    };
+    {
+        const auto window = WindowTest::show();
+        window->OpenFile(path);
+        QTRY_COMPARE_WITH_TIMEOUT(message(*window), QString("caf\u00e9"), Patience);
+        Action(*window, "Latin-1")->trigger();
+        QTRY_COMPARE_WITH_TIMEOUT(message(*window), QString("caf\u00c3\u00a9"), Patience);
+    }
+    {
+        const auto window = WindowTest::show();
+        window->OpenFile(path);
+        QTRY_COMPARE_WITH_TIMEOUT(message(*window), QString("caf\u00c3\u00a9"), Patience);
+        QVERIFY(Action(*window, "Latin-1")->isChecked());
+        Action(*window, "Automatic")->trigger();
+        QTRY_COMPARE_WITH_TIMEOUT(message(*window), QString("caf\u00e9"), Patience);
+    }
+    const auto window = WindowTest::show();
+    window->OpenFile(path);
+    QTRY_COMPARE_WITH_TIMEOUT(message(*window), QString("caf\u00e9"), Patience);
+    QVERIFY(Action(*window, "Automatic")->isChecked());
 }
 
 QTEST_MAIN(tst_MarksInWindow)

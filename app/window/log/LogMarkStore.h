@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "app/logfile/LogEncoding.h"
 #include "app/logfile/LogMark.h"
 
 #include <QString>
@@ -10,7 +11,7 @@
 
 namespace Velocor {
 
-/// Keeps the marks of log files between sessions.
+/// Keeps the marks of log files, and the encodings chosen for them, between sessions.
 class LogMarkStore
 {
 public:
@@ -23,6 +24,14 @@ public:
     ///
     /// @return the reason for a failure; empty on success
     virtual QString SetMarks(QString const& path, QVector<LogMark> const& marks) = 0;
+
+    /// The encoding chosen for a log file; Automatic if none was.
+    virtual LogEncoding Encoding(QString const& path) = 0;
+
+    /// Replaces the encoding chosen for a log file.
+    ///
+    /// @return the reason for a failure; empty on success
+    virtual QString SetEncoding(QString const& path, LogEncoding encoding) = 0;
 };
 
 } // namespace Velocor

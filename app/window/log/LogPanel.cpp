@@ -11,6 +11,7 @@
 #include "app/window/log/LogFilterBar.h"
 #include "app/window/log/LogFindBar.h"
 #include "app/window/log/LogGoTo.h"
+#include "app/window/log/LogMarkStore.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogStateText.h"
 #include "app/window/log/LogTableMenu.h"
@@ -145,6 +146,9 @@ void LogPanel::Open(QString const& path, bool isCurrent)
 void LogPanel::showFile(QString const& path)
 {
     m_files->SetShown(path);
+    const LogEncoding kept = m_store ? m_store->Encoding(path) : LogEncoding::Automatic;
+    if (kept != LogEncoding::Automatic)
+        m_model->SetEncoding(kept);
     m_model->Open(path, RunningLogParser(), path == m_currentPath);
     m_marks->Load();
     updatePlaceholder();
@@ -190,6 +194,15 @@ void LogPanel::SetEncoding(LogEncoding encoding)
 {
     m_model->SetEncoding(encoding);
     Q_EMIT stateChanged();
+    const QString problem = m_store ? m_store->SetEncoding(path(), encoding) : QString();
+    if (!problem.isEmpty())
+        Q_EMIT messageReported(problem);
+}
+
+void LogPanel::SetMarkStore(LogMarkStore* store)
+{
+    m_store = store;
+    m_marks->SetStore(store);
 }
 
 LogEncoding LogPanel::chosenEncoding() const

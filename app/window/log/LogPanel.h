@@ -57,7 +57,7 @@ public:
     void SetEarlierRuns(bool shown);
     bool showsEarlierRuns() const;
 
-    /// Reads the file in another encoding; Automatic finds out which.
+    /// Reads the file in another encoding, also in the next session; Automatic finds out which.
     void SetEncoding(LogEncoding encoding);
     LogEncoding chosenEncoding() const;
 
@@ -90,10 +90,10 @@ public:
     /// Sets the rules that highlight lines; shared with other logs.
     void SetHighlightRules(std::shared_ptr<HighlightRules> const& rules);
 
-    /// Sets where the marks of log files are kept, before a file is opened.
+    /// Sets where the marks and encodings of log files are kept, before a file is opened.
     ///
     /// @param store  not owned
-    void SetMarkStore(LogMarkStore* store) { m_marks->SetStore(store); }
+    void SetMarkStore(LogMarkStore* store);
 
     /// Marks the current line or removes its mark.
     void ToggleMark() { m_marks->Toggle(); }
@@ -170,6 +170,7 @@ private:
     MarkControl* m_marks;
     LineCopier* m_copier;
     LogGoTo* m_goTo;
+    LogMarkStore* m_store = nullptr;
     std::shared_ptr<HighlightRules> m_rules;
     QString m_currentPath; // the log of the running program; empty for other logs
     int m_percent = 100;
