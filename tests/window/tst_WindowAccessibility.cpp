@@ -8,6 +8,7 @@
 #include "app/UserMessages.h"
 #include "app/window/ReportDialog.h"
 #include "app/window/log/GoToDialog.h"
+#include "app/window/log/HighlightDialog.h"
 #include "app/window/log/LogSettingsDialog.h"
 #include "app/window/log/NoteDialog.h"
 
@@ -144,6 +145,8 @@ void tst_WindowAccessibility::namesInDialogs()
     QCOMPARE(NamelessControls(&goTo), QStringList());
     NoteDialog note("text", nullptr);
     QCOMPARE(NamelessControls(&note), QStringList());
+    HighlightDialog highlights(std::make_shared<HighlightRules>(), nullptr);
+    QCOMPARE(NamelessControls(&highlights), QStringList());
 }
 
 // Every action that does something has a shortcut and a status tip, and no two share one. One of

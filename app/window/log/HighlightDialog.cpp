@@ -107,7 +107,7 @@ QLayout* HighlightDialog::makeFields()
     color->setBuddy(m_color);
     auto* form = new QFormLayout;
     form->addRow(text, m_text);
-    form->addRow(NewPlainLabel(), options);
+    form->setLayout(1, QFormLayout::FieldRole, options);
     form->addRow(color, m_color);
     return form;
 }
