@@ -4,6 +4,7 @@
 // The window on a real screen, driven with keys and mouse.
 
 #include "WindowParts.h"
+#include "WindowTestCase.h"
 
 #include "app/window/FileTabs.h"
 #include "app/window/settings/SettingsEditor.h"
@@ -12,9 +13,7 @@
 #include "common/log/TorkLog.h"
 
 #include <QAbstractButton>
-#include <QClipboard>
 #include <QLineEdit>
-#include <QLoggingCategory>
 #include <QMenuBar>
 #include <QMessageBox>
 #include <QPlainTextEdit>
@@ -25,14 +24,11 @@
 using namespace Velocor;
 using namespace WindowParts;
 
-class tst_SettingsInWindow : public QObject
+class tst_SettingsInWindow : public WindowTestCase
 {
     Q_OBJECT
 
 private slots:
-    void initTestCase();
-    void cleanup();
-
     void editsSettings();
     void rejectedNameKeepsTheOld_data();
     void rejectedNameKeepsTheOld();
@@ -53,21 +49,6 @@ private slots:
     void closesWhileEditing();
 };
 
-void tst_SettingsInWindow::initTestCase()
-{
-    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
-    // in a test's log. The environment would be too late: it was read with the application object.
-    QLoggingCategory::setFilterRules("qt.qpa.*=false");
-}
-
-void tst_SettingsInWindow::cleanup()
-{
-    const QWidgetList windows = QApplication::topLevelWidgets();
-    for (QWidget* window : windows)
-        window->hide();
-    QGuiApplication::clipboard()->clear();
-}
-
 void tst_SettingsInWindow::editsSettings()
 {
     const WindowTest test;
@@ -83,14 +64,9 @@ void tst_SettingsInWindow::editsSettings()
     QVERIFY(!Action(*window, "Save")->isEnabled());
 
     // A value is changed with the keyboard.
-    tree->setFocus();
-    tree->setCurrentItem(tree->topLevelItem(0)->child(0), 1);
-    QTest::keyClick(tree, Qt::Key_F2);
-    QTRY_VERIFY(tree->findChild<QLineEdit*>());
-    QTest::keyClicks(tree->findChild<QLineEdit*>(), "Sans & Serif");
-    QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
-    QTRY_VERIFY(!tree->findChild<QLineEdit*>());
-    QTRY_VERIFY(editor->isModified());
+    TypeInto(tree, tree->topLevelItem(0)->child(0), 1, "Sans & Serif");
+    Enter(tree);
+    QTRY_VERIFY_WITH_TIMEOUT(editor->isModified(), Patience);
     QVERIFY(Action(*window, "Save")->isEnabled());
     QVERIFY(window->findChild<FileTabs*>()->tabText(1).endsWith("*"));
 
@@ -102,18 +78,19 @@ void tst_SettingsInWindow::editsSettings()
         });
     };
     Click(button("Add Key"));
-    QTRY_VERIFY(tree->findChild<QLineEdit*>());
+    QTRY_VERIFY_WITH_TIMEOUT(tree->findChild<QLineEdit*>(), Patience);
     QTest::keyClicks(tree->findChild<QLineEdit*>(), "two words");
     QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
-    QTRY_COMPARE(tree->topLevelItem(0)->child(2)->text(0), QString("twowords"));
-    QTRY_VERIFY(!tree->findChild<QLineEdit*>());
+    QTRY_COMPARE_WITH_TIMEOUT(tree->topLevelItem(0)->child(2)->text(0), QString("twowords"),
+                              Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(!tree->findChild<QLineEdit*>(), Patience);
     tree->setCurrentItem(tree->topLevelItem(0)->child(1));
     Click(button("Remove"));
     Click(button("Add Section"));
-    QTRY_VERIFY(tree->findChild<QLineEdit*>());
+    QTRY_VERIFY_WITH_TIMEOUT(tree->findChild<QLineEdit*>(), Patience);
     QTest::keyClicks(tree->findChild<QLineEdit*>(), "1 is no name");
     QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
-    QTRY_VERIFY(!tree->findChild<QLineEdit*>());
+    QTRY_VERIFY_WITH_TIMEOUT(!tree->findChild<QLineEdit*>(), Patience);
     QCOMPARE(tree->topLevelItem(1)->text(0), QString("Section"));
 
     QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
@@ -129,26 +106,6 @@ void tst_SettingsInWindow::editsSettings()
     QVERIFY(editor->Save());
     QCOMPARE(TestFiles::read(file + ".bak"), Settings);
 }
-
-namespace {
-
-// Types a text over that of a cell, without ending the editing.
-void TypeInto(QTreeWidget* tree, QTreeWidgetItem* item, int column, QString const& text)
-{
-    tree->setFocus();
-    tree->setCurrentItem(item, column);
-    QTest::keyClick(tree, Qt::Key_F2);
-    QTRY_VERIFY(tree->findChild<QLineEdit*>());
-    QTest::keyClicks(tree->findChild<QLineEdit*>(), text);
-}
-
-void Enter(QTreeWidget* tree)
-{
-    QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
-    QTRY_VERIFY(!tree->findChild<QLineEdit*>());
-}
-
-} // namespace
 
 void tst_SettingsInWindow::rejectedNameKeepsTheOld_data()
 {
@@ -192,7 +149,7 @@ void tst_SettingsInWindow::rejectedNameKeepsTheOld()
     TypeInto(tree, item, 0, typed);
     Enter(tree);
     QCOMPARE(item->text(0), old);
-    const QString status = window->statusBar()->currentMessage();
+    const QString status = Status(*window);
     QVERIFY2(status.startsWith(told), qPrintable(status));
 
     // A valid name is still taken afterwards.
@@ -249,8 +206,8 @@ void tst_SettingsInWindow::savesWhatIsBeingTyped()
         QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_S, Qt::ControlModifier);
         QCOMPARE(TestFiles::read(file), QByteArray(Settings).replace("Serif", typed));
         QVERIFY(!editor->isModified());
-        QTRY_VERIFY(!Action(*window, "Save")->isEnabled());
-        QTRY_VERIFY(!tree->findChild<QLineEdit*>());
+        QTRY_VERIFY_WITH_TIMEOUT(!Action(*window, "Save")->isEnabled(), Patience);
+        QTRY_VERIFY_WITH_TIMEOUT(!tree->findChild<QLineEdit*>(), Patience);
     }
 }
 
@@ -265,7 +222,7 @@ void tst_SettingsInWindow::escapeLeavesNothingToSave()
     TypeInto(tree, tree->topLevelItem(0)->child(0), 1, "Sans");
     QVERIFY(Action(*window, "Save")->isEnabled());
     QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Escape);
-    QTRY_VERIFY(!Action(*window, "Save")->isEnabled());
+    QTRY_VERIFY_WITH_TIMEOUT(!Action(*window, "Save")->isEnabled(), Patience);
     QCOMPARE(tree->topLevelItem(0)->child(0)->text(1), QString("Serif"));
     QCOMPARE(TestFiles::read(file), Settings);
 }
@@ -298,15 +255,16 @@ void tst_SettingsInWindow::statusTextsHaveRoom()
     window->resize(700, 500);
     window->OpenFile(file);
     auto const* summary = static_cast<ElidedLabel*>(Child<QLabel>(window.get(), "Lines shown"));
-    QTRY_COMPARE(summary->text(), file);
-    QTRY_VERIFY2(summary->ShownText().endsWith("/some.cfg"), qPrintable(summary->ShownText()));
+    QTRY_COMPARE_WITH_TIMEOUT(summary->text(), file, Patience);
+    QTRY_VERIFY2_WITH_TIMEOUT(summary->ShownText().endsWith("/some.cfg"),
+                              qPrintable(summary->ShownText()), Patience);
     QVERIFY(summary->width() <= window->width());
 
     // A message has the whole width.
     auto* tree = Child<QTreeWidget>(window.get(), "Settings");
     TypeInto(tree, tree->topLevelItem(0), 0, "C++");
     Enter(tree);
-    QVERIFY(!window->statusBar()->currentMessage().isEmpty());
+    QVERIFY(!Status(*window).isEmpty());
     QVERIFY(!summary->isVisible());
     window->statusBar()->clearMessage();
     QVERIFY(summary->isVisible());
@@ -458,11 +416,7 @@ void tst_SettingsInWindow::closesWhileEditing()
         auto window = WindowTest::show();
         window->OpenFile(file);
         auto* tree = Child<QTreeWidget>(window.get(), "Settings");
-        tree->setFocus();
-        tree->setCurrentItem(tree->topLevelItem(0)->child(0), 1);
-        QTest::keyClick(tree, Qt::Key_F2);
-        QTRY_VERIFY(tree->findChild<QLineEdit*>());
-        QTest::keyClicks(tree->findChild<QLineEdit*>(), "typed");
+        TypeInto(tree, tree->topLevelItem(0)->child(0), 1, "typed");
         if (close) {
             WindowTest::whenShown<QMessageBox>(
                 [&](QMessageBox* box) { Click(box->button(QMessageBox::Save)); });
