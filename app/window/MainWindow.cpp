@@ -134,7 +134,7 @@ void MainWindow::makeStatusBar()
 {
     m_summary = new ElidedLabel(Qt::ElideMiddle);
     m_summary->setAccessibleName(tr("Lines shown"));
-    m_summary->setContentsMargins(6, 0, 6, 0);
+    m_summary->setContentsMargins(4, 0, 6, 0); // starts where the messages do
     m_summary->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
     statusBar()->setAccessibleName(tr("Status"));
     statusBar()->addWidget(m_summary, 1); // not permanent, to leave all room to messages
