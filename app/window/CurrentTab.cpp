@@ -32,8 +32,9 @@ void CurrentTab::Update()
         action->setEnabled(log != nullptr);
     m_actions.save->setEnabled(editor && editor->CanSave());
     m_actions.close->setEnabled(m_tabs->currentWidget() != m_tabs->ownLog());
-    m_summary->setText(log ? log->summary() : editor->path());
-    m_summary->setToolTip(PlainToolTip(log ? QString() : editor->path()));
+    const QString path = FileTabs::PathOf(m_tabs->currentWidget());
+    m_summary->setText(log ? log->summary() : path);
+    m_summary->setToolTip(PlainToolTip(log ? QString() : path));
     if (log)
         updateSwitches(log);
 }
