@@ -3,6 +3,7 @@
 
 // Files that are not regular files, and files that are far too large, opened in the window.
 
+#include "ShownSettings.h"
 #include "WindowParts.h"
 #include "WindowTestCase.h"
 
@@ -443,14 +444,9 @@ void tst_HostileFiles::longValueIsShownShortened()
 
 void tst_HostileFiles::longValueSurvivesOtherEdits()
 {
-    const WindowTest test;
     const QByteArray value = LongValue();
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, WithValue(value)));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* editor = window->findChild<FileTabs*>()->currentEditor();
-    auto* tree = editor->findChild<QTreeWidget*>();
+    const ShownSettings shown(WithValue(value));
+    QTreeWidget* tree = shown.tree;
 
     // The long value is opened.
     tree->setFocus();
@@ -464,18 +460,18 @@ void tst_HostileFiles::longValueSurvivesOtherEdits()
     QTRY_VERIFY_WITH_TIMEOUT(!looked.isEmpty(), Patience);
     QVERIFY2(looked.startsWith("S / long (10 MB)\n"), qPrintable(looked));
     QTRY_VERIFY_WITH_TIMEOUT(!QApplication::activeModalWidget(), Patience);
-    QVERIFY(!editor->isModified());
+    QVERIFY(!shown.editor->isModified());
 
     // Its key gets another name, and another value is changed.
     TypeInto(tree, tree->topLevelItem(0)->child(0), 0, "renamed");
     Enter(tree);
     TypeInto(tree, tree->topLevelItem(0)->child(1), 1, "yes");
     Enter(tree);
-    QVERIFY(WindowTest::activate(window.get()));
-    QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
-    QVERIFY(!editor->isModified());
+    QVERIFY(WindowTest::activate(shown.window.get()));
+    QTest::keyClick(shown.window.get(), Qt::Key_S, Qt::ControlModifier);
+    QVERIFY(!shown.editor->isModified());
     const QByteArray expected = WithValue(value, "yes").replace("long>", "renamed>");
-    QVERIFY(TestFiles::read(file) == expected);
+    QVERIFY(TestFiles::read(shown.file) == expected);
     QVERIFY(MaximumCellLength(tree) <= 1000);
 }
 
@@ -489,21 +485,16 @@ void tst_HostileFiles::longValueIsEdited_data()
 void tst_HostileFiles::longValueIsEdited()
 {
     QFETCH(QString, way);
-    const WindowTest test;
     const QByteArray value = LongValue();
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, WithValue(value)));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* editor = window->findChild<FileTabs*>()->currentEditor();
-    auto* tree = editor->findChild<QTreeWidget*>();
+    const ShownSettings shown(WithValue(value));
+    QTreeWidget* tree = shown.tree;
     tree->setFocus();
     QTreeWidgetItem* item = tree->topLevelItem(0)->child(0);
     tree->setCurrentItem(item, 1);
 
-    int shown = 0;
+    int dialogs = 0;
     WindowTest::whenShown<QDialog>([&](QDialog* dialog) {
-        ++shown;
+        ++dialogs;
         auto* text = dialog->findChild<QPlainTextEdit*>();
         text->setFocus();
         QTest::keyClick(text, Qt::Key_End, Qt::ControlModifier);
@@ -523,13 +514,13 @@ void tst_HostileFiles::longValueIsEdited()
         QTest::mouseClick(tree->viewport(), Qt::LeftButton, Qt::NoModifier, cell);
         QTest::mouseDClick(tree->viewport(), Qt::LeftButton, Qt::NoModifier, cell);
     }
-    QTRY_COMPARE_WITH_TIMEOUT(shown, 1, Patience);
-    QTRY_VERIFY_WITH_TIMEOUT(editor->isModified(), Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(dialogs, 1, Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(shown.editor->isModified(), Patience);
     QTRY_VERIFY_WITH_TIMEOUT(!QApplication::activeModalWidget(), Patience);
     QVERIFY(MaximumCellLength(tree) <= 1000);
-    QVERIFY(WindowTest::activate(window.get()));
-    QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
-    QVERIFY(TestFiles::read(file) == WithValue(value + "end"));
+    QVERIFY(WindowTest::activate(shown.window.get()));
+    QTest::keyClick(shown.window.get(), Qt::Key_S, Qt::ControlModifier);
+    QVERIFY(TestFiles::read(shown.file) == WithValue(value + "end"));
 }
 
 // A long value can become short; its cell is then edited like any other.

@@ -3,6 +3,7 @@
 
 // The window on a real screen, driven with keys and mouse.
 
+#include "ShownSettings.h"
 #include "WindowParts.h"
 #include "WindowTestCase.h"
 
@@ -51,27 +52,22 @@ private slots:
 
 void tst_SettingsInWindow::editsSettings()
 {
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, Settings));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* editor = window->findChild<FileTabs*>()->currentEditor();
-    auto* tree = Child<QTreeWidget>(editor, "Settings");
+    const ShownSettings shown;
+    QTreeWidget* tree = shown.tree;
     QCOMPARE(tree->topLevelItemCount(), 1);
     QCOMPARE(tree->topLevelItem(0)->text(0), QString("Editor"));
     QCOMPARE(tree->topLevelItem(0)->child(0)->text(1), QString("Serif"));
-    QVERIFY(!Action(*window, "Save")->isEnabled());
+    QVERIFY(!Action(*shown.window, "Save")->isEnabled());
 
     // A value is changed with the keyboard.
     TypeInto(tree, tree->topLevelItem(0)->child(0), 1, "Sans & Serif");
     Enter(tree);
-    QTRY_VERIFY_WITH_TIMEOUT(editor->isModified(), Patience);
-    QVERIFY(Action(*window, "Save")->isEnabled());
-    QVERIFY(window->findChild<FileTabs*>()->tabText(1).endsWith("*"));
+    QTRY_VERIFY_WITH_TIMEOUT(shown.editor->isModified(), Patience);
+    QVERIFY(Action(*shown.window, "Save")->isEnabled());
+    QVERIFY(shown.window->findChild<FileTabs*>()->tabText(1).endsWith("*"));
 
     // A key is added and named; the name is corrected where the store could not write it.
-    QList<QPushButton*> buttons = editor->findChildren<QPushButton*>();
+    QList<QPushButton*> buttons = shown.editor->findChildren<QPushButton*>();
     const auto button = [&](QString const& text) {
         return *std::find_if(buttons.begin(), buttons.end(), [&](QPushButton* candidate) {
             return candidate->text().remove('&') == text;
@@ -93,18 +89,18 @@ void tst_SettingsInWindow::editsSettings()
     QTRY_VERIFY_WITH_TIMEOUT(!tree->findChild<QLineEdit*>(), Patience);
     QCOMPARE(tree->topLevelItem(1)->text(0), QString("Section"));
 
-    QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
-    QVERIFY(!editor->isModified());
-    QCOMPARE(TestFiles::read(file),
+    QTest::keyClick(shown.window.get(), Qt::Key_S, Qt::ControlModifier);
+    QVERIFY(!shown.editor->isModified());
+    QCOMPARE(TestFiles::read(shown.file),
              QByteArray("<VelocorSettings>\n<Editor>\n<font><![CDATA[Sans & Serif]]></font>\n"
                         "<twowords>value</twowords>\n</Editor>\n<Section>\n</Section>\n"
                         "</VelocorSettings>\n"));
-    QCOMPARE(TestFiles::read(file + ".bak"), Settings);
+    QCOMPARE(TestFiles::read(shown.file + ".bak"), Settings);
 
     // Only the first save keeps a copy.
     tree->topLevelItem(0)->child(0)->setText(1, "again");
-    QVERIFY(editor->Save());
-    QCOMPARE(TestFiles::read(file + ".bak"), Settings);
+    QVERIFY(shown.editor->Save());
+    QCOMPARE(TestFiles::read(shown.file + ".bak"), Settings);
 }
 
 void tst_SettingsInWindow::rejectedNameKeepsTheOld_data()
@@ -134,14 +130,10 @@ void tst_SettingsInWindow::rejectedNameKeepsTheOld()
     QFETCH(bool, isSection);
     QFETCH(QString, typed);
     QFETCH(QString, told);
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
     const QByteArray content =
         QByteArray(Settings).replace("</V", "<Other>\n<k>v</k>\n</Other>\n</V");
-    QVERIFY(TestFiles::write(file, content));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    const ShownSettings shown(content);
+    QTreeWidget* tree = shown.tree;
     QTreeWidgetItem* section = tree->topLevelItem(0);
     QTreeWidgetItem* item = isSection ? section : section->child(0);
     const QString old = item->text(0);
@@ -149,41 +141,33 @@ void tst_SettingsInWindow::rejectedNameKeepsTheOld()
     TypeInto(tree, item, 0, typed);
     Enter(tree);
     QCOMPARE(item->text(0), old);
-    const QString status = Status(*window);
+    const QString status = Status(*shown.window);
     QVERIFY2(status.startsWith(told), qPrintable(status));
 
     // A valid name is still taken afterwards.
     TypeInto(tree, item, 0, "valid");
     Enter(tree);
     QCOMPARE(item->text(0), QString("valid"));
-    QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
-    QCOMPARE(TestFiles::read(file), QByteArray(content).replace(old.toLatin1(), "valid"));
+    QTest::keyClick(shown.window.get(), Qt::Key_S, Qt::ControlModifier);
+    QCOMPARE(TestFiles::read(shown.file), QByteArray(content).replace(old.toLatin1(), "valid"));
 }
 
 void tst_SettingsInWindow::rejectedNameChangesNothing()
 {
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, Settings));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    const ShownSettings shown;
+    QTreeWidget* tree = shown.tree;
     TypeInto(tree, tree->topLevelItem(0), 0, "C++");
     Enter(tree);
-    QVERIFY(!window->findChild<FileTabs*>()->currentEditor()->isModified());
-    QVERIFY(!Action(*window, "Save")->isEnabled());
+    QVERIFY(!shown.editor->isModified());
+    QVERIFY(!Action(*shown.window, "Save")->isEnabled());
 }
 
 // The store reads names that it cannot write.
 void tst_SettingsInWindow::valueOfAnUnusualNameIsEdited()
 {
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, QByteArray(Settings).replace("font", "gr\xC3\xB6\xC3\x9F"
-                                                                        "e")));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    const ShownSettings shown(QByteArray(Settings).replace("font", "gr\xC3\xB6\xC3\x9F"
+                                                                   "e"));
+    QTreeWidget* tree = shown.tree;
     QTreeWidgetItem* item = tree->topLevelItem(0)->child(0);
     TypeInto(tree, item, 1, "12");
     Enter(tree);
@@ -194,54 +178,41 @@ void tst_SettingsInWindow::valueOfAnUnusualNameIsEdited()
 
 void tst_SettingsInWindow::savesWhatIsBeingTyped()
 {
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, Settings));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* editor = window->findChild<FileTabs*>()->currentEditor();
-    auto* tree = Child<QTreeWidget>(editor, "Settings");
+    const ShownSettings shown;
+    QTreeWidget* tree = shown.tree;
     for (char const* typed : {"Sans", "Mono"}) { // the second time after a save
         TypeInto(tree, tree->topLevelItem(0)->child(0), 1, typed);
         QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_S, Qt::ControlModifier);
-        QCOMPARE(TestFiles::read(file), QByteArray(Settings).replace("Serif", typed));
-        QVERIFY(!editor->isModified());
-        QTRY_VERIFY_WITH_TIMEOUT(!Action(*window, "Save")->isEnabled(), Patience);
+        QCOMPARE(TestFiles::read(shown.file), QByteArray(Settings).replace("Serif", typed));
+        QVERIFY(!shown.editor->isModified());
+        QTRY_VERIFY_WITH_TIMEOUT(!Action(*shown.window, "Save")->isEnabled(), Patience);
         QTRY_VERIFY_WITH_TIMEOUT(!tree->findChild<QLineEdit*>(), Patience);
     }
 }
 
 void tst_SettingsInWindow::escapeLeavesNothingToSave()
 {
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, Settings));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    const ShownSettings shown;
+    QTreeWidget* tree = shown.tree;
     TypeInto(tree, tree->topLevelItem(0)->child(0), 1, "Sans");
-    QVERIFY(Action(*window, "Save")->isEnabled());
+    QVERIFY(Action(*shown.window, "Save")->isEnabled());
     QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Escape);
-    QTRY_VERIFY_WITH_TIMEOUT(!Action(*window, "Save")->isEnabled(), Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(!Action(*shown.window, "Save")->isEnabled(), Patience);
     QCOMPARE(tree->topLevelItem(0)->child(0)->text(1), QString("Serif"));
-    QCOMPARE(TestFiles::read(file), Settings);
+    QCOMPARE(TestFiles::read(shown.file), Settings);
 }
 
 void tst_SettingsInWindow::sizeOfALongValueIsVisible()
 {
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(
-        file, QByteArray(Settings).replace("Serif", QByteArray("word ").repeated(5000))));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    const ShownSettings shown(
+        QByteArray(Settings).replace("Serif", QByteArray("word ").repeated(5000)));
+    QTreeWidget* tree = shown.tree;
     QTreeWidgetItem const* item = tree->topLevelItem(0)->child(0);
     const int width = tree->visualItemRect(item).width() - tree->columnWidth(0);
     QVERIFY(width > 50 && width < tree->fontMetrics().boundingRect(item->text(1)).width());
-    const QString shown =
+    const QString text =
         tree->fontMetrics().elidedText(item->text(1), tree->textElideMode(), width);
-    QVERIFY2(shown.endsWith("(25 kB)"), qPrintable(shown));
+    QVERIFY2(text.endsWith("(25 kB)"), qPrintable(text));
 }
 
 void tst_SettingsInWindow::statusTextsHaveRoom()
@@ -314,24 +285,19 @@ void tst_SettingsInWindow::losesKnowingly()
 
 void tst_SettingsInWindow::brokenSettings()
 {
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
     const QByteArray broken = QByteArray(Settings).replace("</font>", "</fnt>");
-    QVERIFY(TestFiles::write(file, broken));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* editor = window->findChild<FileTabs*>()->currentEditor();
-    const QString told = editor->findChild<NoticeBar*>()->text();
+    const ShownSettings shown(broken);
+    const QString told = shown.editor->findChild<NoticeBar*>()->text();
     QVERIFY2(told.contains("tag mismatch") && told.contains("line 3, column"), qPrintable(told));
-    auto const* text = Child<QPlainTextEdit>(editor, "File text");
+    auto const* text = Child<QPlainTextEdit>(shown.editor, "File text");
     QVERIFY(text->isVisible() && text->isReadOnly());
     QCOMPARE(text->toPlainText(), QString(broken));
     QCOMPARE(text->textCursor().blockNumber(), 2);
-    QVERIFY(!editor->Save());
-    QVERIFY(!Action(*window, "Save")->isEnabled());
-    QCOMPARE(TestFiles::read(file), broken);
-    window->close();
-    QCOMPARE(TestFiles::read(file), broken);
+    QVERIFY(!shown.editor->Save());
+    QVERIFY(!Action(*shown.window, "Save")->isEnabled());
+    QCOMPARE(TestFiles::read(shown.file), broken);
+    shown.window->close();
+    QCOMPARE(TestFiles::read(shown.file), broken);
 }
 
 void tst_SettingsInWindow::saveFails()
@@ -392,38 +358,29 @@ void tst_SettingsInWindow::askedBeforeClosing()
     QFETCH(int, answer);
     QFETCH(bool, closes);
     QFETCH(bool, saves);
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, Settings));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* editor = window->findChild<FileTabs*>()->currentEditor();
-    Child<QTreeWidget>(editor, "Settings")->topLevelItem(0)->child(0)->setText(1, "new");
+    const ShownSettings shown;
+    shown.tree->topLevelItem(0)->child(0)->setText(1, "new");
     WindowTest::whenShown<QMessageBox>([&](QMessageBox* box) {
         Click(box->button(static_cast<QMessageBox::StandardButton>(answer)));
     });
-    QCOMPARE(window->close(), closes);
-    QCOMPARE(TestFiles::read(file).contains("<font>new</font>"), saves);
+    QCOMPARE(shown.window->close(), closes);
+    QCOMPARE(TestFiles::read(shown.file).contains("<font>new</font>"), saves);
 }
 
 // Text typed into a cell is kept even without the Enter key.
 void tst_SettingsInWindow::closesWhileEditing()
 {
     for (bool close : {true, false}) {
-        const WindowTest test;
-        const QString file = test.folder() + "some.cfg";
-        QVERIFY(TestFiles::write(file, Settings));
-        auto window = WindowTest::show();
-        window->OpenFile(file);
-        auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+        ShownSettings shown;
+        QTreeWidget* tree = shown.tree;
         TypeInto(tree, tree->topLevelItem(0)->child(0), 1, "typed");
         if (close) {
             WindowTest::whenShown<QMessageBox>(
                 [&](QMessageBox* box) { Click(box->button(QMessageBox::Save)); });
-            QVERIFY(window->close());
-            QVERIFY(TestFiles::read(file).contains("typed"));
+            QVERIFY(shown.window->close());
+            QVERIFY(TestFiles::read(shown.file).contains("typed"));
         }
-        window.reset(); // even without having been closed
+        shown.window.reset(); // even without having been closed
         QCoreApplication::processEvents();
     }
 }
