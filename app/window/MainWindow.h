@@ -3,28 +3,31 @@
 
 #pragma once
 
+#include "app/window/FileOpener.h"
 #include "app/window/MarksFile.h"
 #include "app/window/WindowSettings.h"
 
 #include <QMainWindow>
 #include <QTimer>
 
-#include <functional>
 #include <memory>
 
-class QActionGroup;
 class QMenu;
 class QSplitter;
 
 namespace Velocor {
 
+class CurrentTab;
 class ElidedLabel;
 class FileTabs;
+class LineCommands;
 class LogHealth;
+class MainMenus;
 class MainToolBar;
 class NoticeBar;
 class PlacesPanel;
-class RecentFiles;
+class TextFont;
+class WindowDialogs;
 
 /// The main window: the live log, program identity and file locations, other log and settings
 /// files, the log settings, and reports for bugs.
@@ -52,7 +55,7 @@ public:
     void OpenAtStart(QStringList const& files);
 
     /// The maximum number of files that OpenAtStart() opens.
-    static constexpr int MaximumFilesAtStart = 50;
+    static constexpr int MaximumFilesAtStart = FileOpener::MaximumFiles;
 
 protected:
     bool event(QEvent* event) override;
@@ -65,48 +68,17 @@ private:
     void complete();
     void makeTabs();
     void makeStatusBar();
+    void makeMenus();
     void makeToolBar();
     void showPlaces(bool shown);
-    void makeTextMenu(QMenu* menu);
-    void setZoom(int zoom);
-    void updateTextFont();
-    void makeMenus();
-    void makeFileMenu();
-    void makeEditMenu();
-    void makeViewMenu();
-    void makeEncodingMenu(QMenu* menu);
-    void makeHelpMenu();
-    QAction* addAction(QMenu* menu, QString const& text, QKeySequence const& shortcut,
-                       QString const& statusTip, std::function<void()> const& work);
-    QAction* addSwitch(QMenu* menu, QString const& text, QKeySequence const& shortcut,
-                       QString const& statusTip, std::function<void(bool)> const& work);
 
     void restoreFirstState();
     void restoreState();
     void saveState();
     void startWork();
-    void reopenFiles();
-    QStringList openFiles() const;
     void openFilesOfStart();
-    QString openStandardInput();
-    void updateState();
-    void updateTitle();
     void checkLog();
     void showMessage(QString const& text);
-
-    void chooseFile();
-    QString open(QString const& path);
-    void openLogFolder();
-    void saveReport();
-    void saveLines();
-    void saveLinesTo(QString const& path);
-    void showAbout();
-    void showShortcuts();
-    void showManual();
-    void changeLogSettings();
-    void copy();
-    void selectAll();
-    bool offerToForget(QString const& path);
 
     WindowSettings m_settings;
     MarksFile m_marks;
@@ -119,33 +91,18 @@ private:
     MainToolBar* m_toolBar = nullptr;
     FileTabs* m_tabs = nullptr; ///< null until the window is complete
     ElidedLabel* m_summary = nullptr;
-    QList<QMenu*> m_menus; ///< in menu bar order
-    QMenu* m_recentMenu = nullptr;
-    RecentFiles* m_recent = nullptr;
+    QList<QMenu*> m_titles; ///< in menu bar order
 
-    QAction* m_open = nullptr;
-    QAction* m_save = nullptr;
-    QAction* m_close = nullptr;
-    QAction* m_showPlaces = nullptr;
-    QAction* m_showToolBar = nullptr;
-    QAction* m_reopen = nullptr;
-    QAction* m_monospaced = nullptr;
-    QAction* m_wrap = nullptr;
-    QAction* m_find = nullptr;
-    QAction* m_filter = nullptr;
-    QAction* m_nextProblem = nullptr;
-    QAction* m_previousProblem = nullptr;
-    QAction* m_reload = nullptr;
-    QAction* m_earlierRuns = nullptr;
-    QAction* m_pause = nullptr;
-    QAction* m_follow = nullptr;
-    QActionGroup* m_encodings = nullptr;
-    QList<QAction*> m_logActions; // those that need a log in the current tab
+    std::unique_ptr<FileOpener> m_files;
+    std::unique_ptr<LineCommands> m_lines;
+    std::unique_ptr<TextFont> m_textFont;
+    std::unique_ptr<WindowDialogs> m_dialogs;
+    std::unique_ptr<MainMenus> m_menus;
+    std::unique_ptr<CurrentTab> m_currentTab;
 
     std::unique_ptr<LogHealth> m_logHealth;
     QTimer m_healthTimer;
     bool m_painted = false;
-    int m_zoom = 0; // steps from the desktop's text size
 };
 
 } // namespace Velocor

@@ -7,6 +7,8 @@
 #include <QFile>
 #include <QProcess>
 
+#include <csignal>
+
 bool CopyProgram(QString const& program, QString const& folder, QString const& name)
 {
     return QDir().mkpath(folder) && QFile::copy(program, folder + "/" + name);
@@ -52,6 +54,16 @@ ProgramResult RunProgram(QString const& program, QStringList const& arguments,
     result.output = process.readAllStandardOutput();
     result.errors = process.readAllStandardError();
     return result;
+}
+
+// Tests that run in the background, or under nohup, ignore some of these signals, and so would the
+// program.
+void PreparedProcess::setupChildProcess()
+{
+    for (int signalNumber : {SIGHUP, SIGINT, SIGTERM})
+        std::signal(signalNumber, SIG_DFL);
+    if (inChild)
+        inChild();
 }
 
 QByteArray NextLine(QProcess& process)

@@ -31,8 +31,8 @@ struct ProgramResult
 ProgramResult RunProgram(QString const& program, QStringList const& arguments,
                          QProcessEnvironment const& environment);
 
-/// A process that runs a function in the child before the program starts there. Killed with this
-/// object if it is still running.
+/// A process that runs a function in the child before the program starts there, where signals that
+/// end a program have their default effect. Killed with this object if it is still running.
 class PreparedProcess : public QProcess
 {
 public:
@@ -45,11 +45,7 @@ public:
     std::function<void()> inChild; ///< async-signal-safe calls only
 
 protected:
-    void setupChildProcess() override
-    {
-        if (inChild)
-            inChild();
-    }
+    void setupChildProcess() override;
 };
 
 /// The next line of a process's standard output, including its line feed. Whatever there is of it

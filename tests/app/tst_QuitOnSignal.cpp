@@ -57,7 +57,8 @@ public:
 
     QByteArray Rest() { return m_process.readAllStandardOutput(); }
 
-    // Whether a signal is in one of the masks of the process's status, SigIgn or SigCgt.
+    // Whether a signal is in one of the masks of the process's status: SigIgn, SigCgt, or ShdPnd
+    // for those that it has not taken yet.
     bool IsIn(char const* mask, int signalNumber) const
     {
         QFile status(QString("/proc/%1/status").arg(m_process.processId()));
@@ -226,6 +227,7 @@ void tst_QuitOnSignal::theSecondEndsAtOnce()
     probe.Send(first);
     if (!asked.isEmpty())
         QVERIFY(probe.Prints(asked));
+    QTRY_VERIFY_WITH_TIMEOUT(!probe.IsIn("ShdPnd", first), Patience);
     QVERIFY(probe.RunsFor(AnotherRequest));
     probe.Send(second);
     QCOMPARE(probe.End(), KilledBy(second));

@@ -31,8 +31,9 @@ inline bool write(QString const& path, QByteArray const& bytes)
     return file.write(bytes) == bytes.size();
 }
 
-/// Gives a file these bytes without emptying it first, as a log that grows does: whoever
-/// watches the file never finds it shorter than before and after.
+/// Gives a file these bytes as a log does that grows: writes only those that differ, at once. So
+/// whoever watches the file never finds it shorter than before and after, and never modified with
+/// nothing new in it.
 inline bool writeOver(QString const& path, QByteArray const& bytes)
 {
     QFile file(path);
@@ -40,7 +41,13 @@ inline bool writeOver(QString const& path, QByteArray const& bytes)
         qWarning("%s: %s", qPrintable(path), qPrintable(file.errorString()));
         return false;
     }
-    return file.write(bytes) == bytes.size() && file.resize(bytes.size());
+    const QByteArray before = file.readAll();
+    const auto differing = std::mismatch(
+        before.begin(), before.begin() + std::min(before.size(), bytes.size()), bytes.begin());
+    const QByteArray changed = bytes.mid(static_cast<int>(differing.first - before.begin()));
+    if (!file.seek(bytes.size() - changed.size()) || file.write(changed) != changed.size())
+        return false;
+    return before.size() <= bytes.size() || file.resize(bytes.size());
 }
 
 /// The bytes of a file; if it does not open, a text that no test expects.

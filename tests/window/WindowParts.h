@@ -11,11 +11,15 @@
 #include "app/window/log/LogView.h"
 
 #include <QAction>
+#include <QCheckBox>
+#include <QLineEdit>
+#include <QStatusBar>
+#include <QTreeWidget>
 
 /// The parts of a window, found the way assistive technology finds them.
 namespace WindowParts {
 
-constexpr int Patience = 20000; // milliseconds
+constexpr int Patience = WindowTest::Patience;
 
 QByteArray const Settings("<VelocorSettings>\n<Editor>\n<font>Serif</font>\n<wrap>yes</wrap>\n"
                           "</Editor>\n</VelocorSettings>\n");
@@ -50,6 +54,47 @@ inline int Rows(Velocor::MainWindow& window)
 inline void Click(QWidget* widget)
 {
     QTest::mouseClick(widget, Qt::LeftButton, Qt::NoModifier, widget->rect().center());
+}
+
+/// A check box reacts to clicks on the box, not on the whole area of the widget.
+inline void ClickBox(QCheckBox* box)
+{
+    QTest::mouseClick(box, Qt::LeftButton, Qt::NoModifier, QPoint(8, box->height() / 2));
+}
+
+/// How many pixels of a widget have a color.
+inline int Pixels(QWidget* widget, QColor const& color)
+{
+    const QImage image = widget->grab().toImage();
+    int count = 0;
+    for (int y = 0; y < image.height(); ++y) {
+        for (int x = 0; x < image.width(); ++x)
+            count += image.pixelColor(x, y) == color ? 1 : 0;
+    }
+    return count;
+}
+
+/// The message in the status bar.
+inline QString Status(Velocor::MainWindow const& window)
+{
+    return window.statusBar()->currentMessage();
+}
+
+/// Types a text over that of a cell, without ending the editing.
+inline void TypeInto(QTreeWidget* tree, QTreeWidgetItem* item, int column, QString const& text)
+{
+    tree->setFocus();
+    tree->setCurrentItem(item, column);
+    QTest::keyClick(tree, Qt::Key_F2);
+    QTRY_VERIFY_WITH_TIMEOUT(tree->findChild<QLineEdit*>(), Patience);
+    QTest::keyClicks(tree->findChild<QLineEdit*>(), text);
+}
+
+/// Ends the editing of a cell with the Enter key.
+inline void Enter(QTreeWidget* tree)
+{
+    QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
+    QTRY_VERIFY_WITH_TIMEOUT(!tree->findChild<QLineEdit*>(), Patience);
 }
 
 inline QString ActionText(QAction const* action)

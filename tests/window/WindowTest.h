@@ -3,11 +3,13 @@
 
 #pragma once
 
+#include "app/window/FileTabs.h"
 #include "app/window/MainWindow.h"
 #include "support/DemoLog.h"
 #include "support/TestRun.h"
 
 #include <QApplication>
+#include <QElapsedTimer>
 #include <QPointer>
 #include <QtTest>
 
@@ -20,17 +22,33 @@ class WindowTest : public TestRun
 public:
     using TestRun::TestRun;
 
-    /// A window on the screen, with keyboard focus and its log read.
-    static std::unique_ptr<Velocor::MainWindow> show()
+    /// How long to wait for what has to happen, in milliseconds: long enough for a crowded machine.
+    static constexpr int Patience = 20000;
+
+    /// A complete window on the screen, with keyboard focus.
+    ///
+    /// @param files  opened at the start
+    static std::unique_ptr<Velocor::MainWindow> show(QStringList const& files = QStringList())
     {
         auto window = std::make_unique<Velocor::MainWindow>();
+        if (!files.isEmpty())
+            window->OpenAtStart(files);
         window->show();
-        // Without a window manager, the window has to take the keyboard focus itself.
-        if (QTest::qWaitForWindowExposed(window.get()))
-            window->activateWindow();
-        if (!QTest::qWaitForWindowActive(window.get()))
+        if (!QTest::qWaitForWindowExposed(window.get(), Patience) || !activate(window.get()))
             qWarning("the window does not get the keyboard focus");
+        // It completes itself after its first paint.
+        QElapsedTimer time;
+        time.start();
+        while (!window->findChild<Velocor::FileTabs*>() && time.elapsed() < Patience)
+            QTest::qWait(10);
         return window;
+    }
+
+    /// Gives a window the keyboard focus, as a window manager would, and waits until it has it.
+    static bool activate(QWidget* window)
+    {
+        window->activateWindow();
+        return QTest::qWaitForWindowActive(window, Patience);
     }
 
     /// Runs a function with the next modal dialog, soon after it appears. The dialog is closed if
@@ -39,6 +57,7 @@ public:
     static void whenShown(std::function<void(Dialog*)> const& work)
     {
         auto* timer = new QTimer(qApp);
+        timer->setObjectName(waiting());
         QObject::connect(timer, &QTimer::timeout, timer, [timer, work] {
             auto* dialog = qobject_cast<Dialog*>(QApplication::activeModalWidget());
             if (!dialog || !dialog->isVisible())
@@ -52,4 +71,13 @@ public:
         });
         timer->start(20);
     }
+
+    /// Forgets all functions of whenShown() whose dialog did not appear.
+    static void stopWaiting()
+    {
+        qDeleteAll(qApp->findChildren<QTimer*>(waiting(), Qt::FindDirectChildrenOnly));
+    }
+
+private:
+    static QString waiting() { return "waits for a dialog"; }
 };

@@ -5,13 +5,13 @@
 // standard input; and what tabs and the window are called.
 
 #include "WindowParts.h"
+#include "WindowTestCase.h"
 
 #include "app/window/DistinctNames.h"
 #include "app/window/settings/SettingsEditor.h"
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
 
-#include <QLoggingCategory>
 #include <QMenu>
 
 #include <cerrno>
@@ -82,27 +82,14 @@ QStringList TabTexts(MainWindow& window)
     return texts;
 }
 
-std::unique_ptr<MainWindow> ShowWith(QStringList const& files)
-{
-    auto window = std::make_unique<MainWindow>();
-    window->OpenAtStart(files);
-    window->show();
-    if (QTest::qWaitForWindowExposed(window.get()))
-        window->activateWindow();
-    if (!QTest::qWaitForWindowActive(window.get()))
-        qWarning("the window does not get the keyboard focus");
-    return window;
-}
-
 } // namespace
 
-class tst_FilesAtStart : public QObject
+class tst_FilesAtStart : public WindowTestCase
 {
     Q_OBJECT
 
 private slots:
-    void initTestCase();
-    void cleanup();
+    void initTestCase() override;
 
     void opensFiles();
     void tellsWhatItCannotOpen();
@@ -128,17 +115,8 @@ private slots:
 
 void tst_FilesAtStart::initTestCase()
 {
-    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
-    // in a test's log. The environment would be too late: it was read with the application object.
-    QLoggingCategory::setFilterRules("qt.qpa.*=false");
+    WindowTestCase::initTestCase();
     signal(SIGPIPE, SIG_IGN);
-}
-
-void tst_FilesAtStart::cleanup()
-{
-    const QWidgetList windows = QApplication::topLevelWidgets();
-    for (QWidget* window : windows)
-        window->hide();
 }
 
 void tst_FilesAtStart::opensFiles()
@@ -148,7 +126,7 @@ void tst_FilesAtStart::opensFiles()
     const QString settings = test.folder() + "some.cfg";
     QVERIFY(TestFiles::write(log, run(5, QTime(9, 0), "y")));
     QVERIFY(TestFiles::write(settings, Settings));
-    const auto window = ShowWith({settings, log});
+    const auto window = WindowTest::show({settings, log});
     QTRY_COMPARE_WITH_TIMEOUT(TabTexts(*window), QStringList({"Log", "some.cfg", "some.log"}),
                               Patience);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
@@ -164,7 +142,7 @@ void tst_FilesAtStart::tellsWhatItCannotOpen()
     QCOMPARE(mkfifo(qPrintable(pipe), 0600), 0);
     QVERIFY(TestFiles::write(log, run(5, QTime(9, 0), "y")));
     const auto window =
-        ShowWith({test.folder() + "missing", pipe, log, test.folder() + "documents"});
+        WindowTest::show({test.folder() + "missing", pipe, log, test.folder() + "documents"});
     auto const* notice = window->findChild<NoticeBar*>();
     QVERIFY(notice->isVisible());
     QCOMPARE(notice->text().split('\n'),
@@ -181,7 +159,7 @@ void tst_FilesAtStart::opensOnlyTheFirstFiles()
         files.append(test.folder() + QString("%1.log").arg(i, 3, 10, QChar('0')));
         QVERIFY(TestFiles::write(files.last(), "x\n"));
     }
-    const auto window = ShowWith(files);
+    const auto window = WindowTest::show(files);
     QCOMPARE(TabTexts(*window).size(), MainWindow::MaximumFilesAtStart + 1);
     QCOMPARE(TabTexts(*window).last(), QString("049.log"));
     QCOMPARE(window->findChild<NoticeBar*>()->text(),
@@ -193,7 +171,7 @@ void tst_FilesAtStart::followsStandardInput()
     const WindowTest test;
     InputPipe input;
     QVERIFY(input.isOpen);
-    const auto window = ShowWith({"-"});
+    const auto window = WindowTest::show({"-"});
     QTRY_COMPARE_WITH_TIMEOUT(TabTexts(*window), QStringList({"Log", "Standard input"}), Patience);
     QVERIFY(input.Write(entry("09:00:00.000", "Trace", "first")));
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
@@ -209,7 +187,7 @@ void tst_FilesAtStart::closingTheTabEndsStandardInput()
 {
     const WindowTest test;
     const InputPipe input;
-    const auto window = ShowWith({"-"});
+    const auto window = WindowTest::show({"-"});
     QTRY_COMPARE_WITH_TIMEOUT(TabTexts(*window), QStringList({"Log", "Standard input"}), Patience);
     const QString copy = Panel(*window)->path();
     QVERIFY(QFile::exists(copy));
@@ -225,7 +203,7 @@ void tst_FilesAtStart::endOfStandardInputKeepsTheTab()
     InputPipe input;
     QVERIFY(input.Write(run(5, QTime(9, 0), "y")));
     input.End();
-    const auto window = ShowWith({"-"});
+    const auto window = WindowTest::show({"-"});
     QTRY_COMPARE_WITH_TIMEOUT(TabTexts(*window), QStringList({"Log", "Standard input"}), Patience);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
     QVERIFY(!window->findChild<NoticeBar*>()->isVisible());
@@ -236,7 +214,7 @@ void tst_FilesAtStart::neverWaitsForStandardInput()
 {
     const WindowTest test;
     const InputPipe input;
-    const auto window = ShowWith({"-"});
+    const auto window = WindowTest::show({"-"});
     QTRY_COMPARE_WITH_TIMEOUT(TabTexts(*window), QStringList({"Log", "Standard input"}), Patience);
     QVERIFY(input.Write("half a line"));
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
@@ -256,7 +234,7 @@ void tst_FilesAtStart::reopensFiles()
     QVERIFY(TestFiles::write(other, run(7, QTime(9, 0), "z")));
     QStringList texts;
     {
-        const auto window = ShowWith({settings, log, other});
+        const auto window = WindowTest::show({settings, log, other});
         texts = TabTexts(*window);
         QCOMPARE(texts.size(), 4);
         window->findChild<FileTabs*>()->setCurrentIndex(2);
@@ -282,7 +260,7 @@ void tst_FilesAtStart::reopensOnlyWhatIsThere()
     for (QString const& file : {pipe, gone, kept})
         QVERIFY(TestFiles::write(file, "x\n"));
     {
-        const auto window = ShowWith({pipe, kept, gone});
+        const auto window = WindowTest::show({pipe, kept, gone});
         QCOMPARE(TabTexts(*window).size(), 4);
         window->close();
     }
@@ -300,7 +278,7 @@ void tst_FilesAtStart::reopensNothingWhenSwitchedOff()
     const QString log = test.folder() + "some.log";
     QVERIFY(TestFiles::write(log, "x\n"));
     {
-        const auto window = ShowWith({log});
+        const auto window = WindowTest::show({log});
         QVERIFY(Action(*window, "Reopen Files at Start")->isChecked());
         QTest::keyClick(window.get(), Qt::Key_O, Qt::ControlModifier | Qt::AltModifier);
         window->close();
@@ -315,7 +293,7 @@ void tst_FilesAtStart::reopensNoStandardInput()
     const WindowTest test;
     const InputPipe input;
     {
-        const auto window = ShowWith({"-"});
+        const auto window = WindowTest::show({"-"});
         QTRY_COMPARE_WITH_TIMEOUT(TabTexts(*window).size(), 2, Patience);
         window->close();
     }
@@ -331,8 +309,8 @@ void tst_FilesAtStart::opensGivenFilesAfterThoseOfTheSession()
     const QString second = test.folder() + "second.log";
     for (QString const& file : {first, second})
         QVERIFY(TestFiles::write(file, "x\n"));
-    QVERIFY(ShowWith({first})->close());
-    const auto window = ShowWith({second});
+    QVERIFY(WindowTest::show({first})->close());
+    const auto window = WindowTest::show({second});
     QCOMPARE(TabTexts(*window), QStringList({"Log", "first.log", "second.log"}));
     QCOMPARE(Panel(*window)->path(), second);
 }
@@ -343,7 +321,7 @@ void tst_FilesAtStart::paintsBeforeItOpensFiles()
     const WindowTest test;
     const QString log = test.folder() + "some.log";
     QVERIFY(TestFiles::write(log, "x\n"));
-    QVERIFY(ShowWith({log})->close());
+    QVERIFY(WindowTest::show({log})->close());
 
     class FirstPaint : public QObject
     {
@@ -402,7 +380,7 @@ void tst_FilesAtStart::tabsOfEqualNamesSayTheirFolder()
     const QString web = test.folder() + "web/a.log";
     const QString db = test.folder() + "db/a.log";
     QVERIFY(TestFiles::write(web, "x\n") && TestFiles::write(db, "x\n"));
-    const auto window = ShowWith({web, db});
+    const auto window = WindowTest::show({web, db});
     QCOMPARE(TabTexts(*window), QStringList({"Log", QString::fromUtf8("a.log – web"),
                                              QString::fromUtf8("a.log – db")}));
     QTest::keyClick(window.get(), Qt::Key_W, Qt::ControlModifier);
@@ -415,7 +393,7 @@ void tst_FilesAtStart::titleSaysTheFile()
     const QString log = test.folder() + "%1 [*].log";
     const QString settings = test.folder() + "some.cfg";
     QVERIFY(TestFiles::write(log, "x\n") && TestFiles::write(settings, Settings));
-    const auto window = ShowWith({log});
+    const auto window = WindowTest::show({log});
     QCOMPARE(window->windowTitle(), QString::fromUtf8("%1 [*][*].log – Caption"));
     window->findChild<FileTabs*>()->setCurrentIndex(0);
     QCOMPARE(window->windowTitle(), QString("Caption"));
@@ -431,7 +409,7 @@ void tst_FilesAtStart::boxesHaveTheCaption()
     const WindowTest test;
     const QString log = test.folder() + "some.log";
     QVERIFY(TestFiles::write(log, "x\n"));
-    const auto window = ShowWith({log});
+    const auto window = WindowTest::show({log});
     QVERIFY(window->windowTitle() != "Caption");
     QCOMPARE(PlainMessageBox(QMessageBox::Critical, window.get(), "text").windowTitle(),
              QString("Caption"));

@@ -4,6 +4,7 @@
 // What the filter has besides its text, driven with keys and mouse on a real screen.
 
 #include "WindowParts.h"
+#include "WindowTestCase.h"
 
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogView.h"
@@ -12,7 +13,6 @@
 #include <QComboBox>
 #include <QLabel>
 #include <QLineEdit>
-#include <QLoggingCategory>
 #include <QMenu>
 #include <QPlainTextEdit>
 #include <QToolButton>
@@ -77,13 +77,11 @@ QByteArray Fruit()
 
 } // namespace
 
-class tst_FilterInWindow : public QObject
+class tst_FilterInWindow : public WindowTestCase
 {
     Q_OBJECT
 
 private slots:
-    void initTestCase();
-    void cleanup();
     void cleanupTestCase();
 
     void moreIsHidden();
@@ -102,20 +100,6 @@ private slots:
     void history();
     void historyIsShared();
 };
-
-void tst_FilterInWindow::initTestCase()
-{
-    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
-    // in a test's log. The environment would be too late: it was read with the application object.
-    QLoggingCategory::setFilterRules("qt.qpa.*=false");
-}
-
-void tst_FilterInWindow::cleanup()
-{
-    const QWidgetList windows = QApplication::topLevelWidgets();
-    for (QWidget* window : windows)
-        window->hide();
-}
 
 // Qt frees the animation of a clear button when it ends, even if the button is gone by then.
 void tst_FilterInWindow::cleanupTestCase()
@@ -190,9 +174,9 @@ void tst_FilterInWindow::leastSeverity()
 
     // The box says what the buttons amount to.
     QTest::keyClick(window.get(), Qt::Key_1, Qt::ControlModifier);
-    QTRY_COMPARE(least->currentText(), QString("At least Notification"));
+    QTRY_COMPARE_WITH_TIMEOUT(least->currentText(), QString("At least Notification"), Patience);
     QTest::keyClick(window.get(), Qt::Key_4, Qt::ControlModifier);
-    QTRY_COMPARE(least->currentText(), QString("Some severities"));
+    QTRY_COMPARE_WITH_TIMEOUT(least->currentText(), QString("Some severities"), Patience);
 }
 
 void tst_FilterInWindow::context()
@@ -233,8 +217,8 @@ void tst_FilterInWindow::contextIsDimmed()
         }
         return least;
     };
-    QTRY_VERIFY(darkest(0) > darkest(1) + 40);
-    QTRY_VERIFY(darkest(2) > darkest(1) + 40);
+    QTRY_VERIFY_WITH_TIMEOUT(darkest(0) > darkest(1) + 40, Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(darkest(2) > darkest(1) + 40, Patience);
 }
 
 void tst_FilterInWindow::clears()

@@ -4,6 +4,7 @@
 // Finding lines, driven with keys and mouse on a real screen.
 
 #include "WindowParts.h"
+#include "WindowTestCase.h"
 
 #include "app/window/log/GoToDialog.h"
 #include "app/window/log/LogFindBar.h"
@@ -16,9 +17,7 @@
 #include <QDialogButtonBox>
 #include <QLabel>
 #include <QLineEdit>
-#include <QLoggingCategory>
 #include <QPushButton>
-#include <QStatusBar>
 #include <QToolButton>
 
 using namespace Velocor;
@@ -31,22 +30,6 @@ namespace {
 
 QColor const FoundColor(0x74, 0xe0, 0xef);
 
-void ClickBox(QCheckBox* box)
-{
-    QTest::mouseClick(box, Qt::LeftButton, Qt::NoModifier, QPoint(8, box->height() / 2));
-}
-
-int Pixels(QWidget* widget, QColor const& color)
-{
-    const QImage image = widget->grab().toImage();
-    int count = 0;
-    for (int y = 0; y < image.height(); ++y) {
-        for (int x = 0; x < image.width(); ++x)
-            count += image.pixelColor(x, y) == color ? 1 : 0;
-    }
-    return count;
-}
-
 QLineEdit* Field(MainWindow& window)
 {
     return Child<QLineEdit>(&window, "Find text");
@@ -55,11 +38,6 @@ QLineEdit* Field(MainWindow& window)
 QString Count(MainWindow& window)
 {
     return Child<QLabel>(&window, "Lines found")->text();
-}
-
-QString Status(MainWindow const& window)
-{
-    return window.statusBar()->currentMessage();
 }
 
 // Opens the bar and types.
@@ -77,8 +55,7 @@ void GoTo(MainWindow& window, char const* place)
         QTest::keyClick(field, Qt::Key_Return);
     });
     QTest::keyClick(&window, Qt::Key_G, Qt::ControlModifier);
-    window.activateWindow(); // no window manager does it
-    QVERIFY(QTest::qWaitForWindowActive(&window));
+    QVERIFY(WindowTest::activate(&window)); // no window manager does it
 }
 
 // `count` entries, every hundredth of which has the word "needle".
@@ -93,14 +70,11 @@ QByteArray Needles(int count)
 
 } // namespace
 
-class tst_FindInWindow : public QObject
+class tst_FindInWindow : public WindowTestCase
 {
     Q_OBJECT
 
 private slots:
-    void initTestCase();
-    void cleanup();
-
     void amongTheOtherLines();
     void withTheKeyboardFromTheTable();
     void startsAtTheCurrentRow();
@@ -121,20 +95,6 @@ private slots:
     void goesToATime();
     void goToSaysWhatIsWrong();
 };
-
-void tst_FindInWindow::initTestCase()
-{
-    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
-    // in a test's log. The environment would be too late: it was read with the application object.
-    QLoggingCategory::setFilterRules("qt.qpa.*=false");
-}
-
-void tst_FindInWindow::cleanup()
-{
-    const QWidgetList windows = QApplication::topLevelWidgets();
-    for (QWidget* window : windows)
-        window->hide();
-}
 
 // The lines between the hits stay, one row is selected, and it comes with context.
 void tst_FindInWindow::amongTheOtherLines()
@@ -184,7 +144,8 @@ void tst_FindInWindow::withTheKeyboardFromTheTable()
     QTRY_COMPARE_WITH_TIMEOUT(view->currentIndex().row(), 50, Patience);
     QVERIFY(view->hasFocus());
     QTest::keyClick(window.get(), Qt::Key_F3, Qt::ShiftModifier); // would extend the selection
-    QCOMPARE(view->currentIndex().row(), 250);
+    QTRY_COMPARE_WITH_TIMEOUT(view->currentIndex().row(), 250,
+                              Patience); // only a search that is over starts again
     QCOMPARE(view->selectionModel()->selectedRows().size(), 1);
 
     // F3 goes on with the former text after the bar was closed.
@@ -207,8 +168,8 @@ void tst_FindInWindow::startsAtTheCurrentRow()
     QTRY_COMPARE_WITH_TIMEOUT(view->currentIndex().row(), 350, Patience);
     view->GoToRow(300);
     QTest::keyClick(Field(*window), Qt::Key_Return, Qt::ShiftModifier);
-    QCOMPARE(view->currentIndex().row(), 250);
-    QCOMPARE(Count(*window), QString("3 of 6"));
+    QTRY_COMPARE_WITH_TIMEOUT(view->currentIndex().row(), 250, Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(Count(*window), QString("3 of 6"), Patience);
     view->GoToRow(300);
     QCOMPARE(Count(*window), QString("6 lines"));
 }
@@ -454,7 +415,7 @@ void tst_FindInWindow::goesToALine()
     QCOMPARE(view->selectionModel()->selectedRows().size(), 1);
     QVERIFY(view->rowAt(0) < 119 - 2);
     QVERIFY(view->rowAt(view->viewport()->height() - 1) > 119 + 2);
-    QTRY_VERIFY(view->hasFocus());
+    QTRY_VERIFY_WITH_TIMEOUT(view->hasFocus(), Patience);
 
     // Lines are those of the file, not of the rows.
     QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);

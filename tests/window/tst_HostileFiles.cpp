@@ -3,7 +3,9 @@
 
 // Files that are not regular files, and files that are far too large, opened in the window.
 
-#include "WindowTest.h"
+#include "ShownSettings.h"
+#include "WindowParts.h"
+#include "WindowTestCase.h"
 
 #include "app/logfile/LogIndex.h"
 #include "app/runninglog/InstanceList.h"
@@ -25,7 +27,6 @@
 #include <QDropEvent>
 #include <QLabel>
 #include <QLineEdit>
-#include <QLoggingCategory>
 #include <QMenu>
 #include <QMessageBox>
 #include <QMimeData>
@@ -47,10 +48,10 @@
 #include <unistd.h>
 
 using namespace Velocor;
+using namespace WindowParts;
 
 namespace {
 
-constexpr int Patience = 20000; // milliseconds
 constexpr int TenMegabytes = 10000000;
 
 // Before the application object, which would look for a session bus and start one: the child gets
@@ -129,16 +130,6 @@ void Drop(MainWindow& window, QString const& file)
     QCoreApplication::sendEvent(&window, &drop);
 }
 
-QAction* Action(MainWindow& window, QString const& text)
-{
-    const QList<QAction*> all = window.findChildren<QAction*>();
-    for (QAction* action : all) {
-        if (QString(action->text()).remove('&') == text)
-            return action;
-    }
-    return nullptr;
-}
-
 QByteArray WithValue(QByteArray const& value, QByteArray const& other = "no")
 {
     return "<R>\n<S>\n<long>" + value + "</long>\n<other>" + other + "</other>\n</S>\n</R>\n";
@@ -167,12 +158,12 @@ int MaximumCellLength(QTreeWidget const* tree)
 
 } // namespace
 
-class tst_HostileFiles : public QObject
+class tst_HostileFiles : public WindowTestCase
 {
     Q_OBJECT
 
 private slots:
-    void initTestCase();
+    void initTestCase() override;
 
     void isToldAndNotOpened_data();
     void isToldAndNotOpened();
@@ -215,7 +206,7 @@ private slots:
 void tst_HostileFiles::initTestCase()
 {
     QVERIFY(NoSessionBus);
-    QLoggingCategory::setFilterRules("qt.qpa.*=false");
+    WindowTestCase::initTestCase();
 }
 
 void tst_HostileFiles::isToldAndNotOpened_data()
@@ -254,7 +245,7 @@ void tst_HostileFiles::isToldAndNotOpened()
     for (auto const& open : ways) {
         window->statusBar()->clearMessage();
         open();
-        QCOMPARE(window->statusBar()->currentMessage(), told);
+        QCOMPARE(Status(*window), told);
         QCOMPARE(window->findChild<FileTabs*>()->count(), 1);
     }
     QVERIFY(!FileTabs::IsSettingsFile(file));
@@ -321,7 +312,6 @@ void tst_HostileFiles::windowSettings()
         QVERIFY(QFile::link(file, test.settingsFile()));
     {
         const auto window = WindowTest::show();
-        QTRY_VERIFY(window->findChild<NoticeBar*>());
         const QString told = window->findChild<NoticeBar*>()->text();
         QVERIFY2(told.contains("Cannot read the settings file " + test.settingsFile() +
                                " (Not a regular file)"),
@@ -341,7 +331,6 @@ void tst_HostileFiles::windowSettingsAtTheEnd()
 {
     const WindowTest test;
     const auto window = WindowTest::show();
-    QTRY_VERIFY(window->findChild<FileTabs*>()); // until then, nothing is saved
     const Pipe pipe(test.settingsFile());
     window->close();
     QVERIFY(!pipe.wasOpened());
@@ -427,7 +416,6 @@ void tst_HostileFiles::recentFilesInTheWindow()
                                               "</recentFiles></MainWindow></VelocorSettings>");
     {
         const auto window = WindowTest::show();
-        QTRY_VERIFY(Action(*window, "Open Recent"));
         QCOMPARE(Action(*window, "Open Recent")->menu()->actions().size(),
                  RecentFiles::MaximumFiles + 2);
         window->close();
@@ -456,14 +444,9 @@ void tst_HostileFiles::longValueIsShownShortened()
 
 void tst_HostileFiles::longValueSurvivesOtherEdits()
 {
-    const WindowTest test;
     const QByteArray value = LongValue();
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, WithValue(value)));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* editor = window->findChild<FileTabs*>()->currentEditor();
-    auto* tree = editor->findChild<QTreeWidget*>();
+    const ShownSettings shown(WithValue(value));
+    QTreeWidget* tree = shown.tree;
 
     // The long value is opened.
     tree->setFocus();
@@ -476,28 +459,19 @@ void tst_HostileFiles::longValueSurvivesOtherEdits()
     QTest::keyClick(tree, Qt::Key_F2);
     QTRY_VERIFY_WITH_TIMEOUT(!looked.isEmpty(), Patience);
     QVERIFY2(looked.startsWith("S / long (10 MB)\n"), qPrintable(looked));
-    QTRY_VERIFY(!QApplication::activeModalWidget());
-    QVERIFY(!editor->isModified());
+    QTRY_VERIFY_WITH_TIMEOUT(!QApplication::activeModalWidget(), Patience);
+    QVERIFY(!shown.editor->isModified());
 
     // Its key gets another name, and another value is changed.
-    tree->setCurrentItem(tree->topLevelItem(0)->child(0), 0);
-    QTest::keyClick(tree, Qt::Key_F2);
-    QTRY_VERIFY(tree->findChild<QLineEdit*>());
-    QTest::keyClicks(tree->findChild<QLineEdit*>(), "renamed");
-    QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
-    QTRY_VERIFY(!tree->findChild<QLineEdit*>());
-    tree->setCurrentItem(tree->topLevelItem(0)->child(1), 1);
-    QTest::keyClick(tree, Qt::Key_F2);
-    QTRY_VERIFY(tree->findChild<QLineEdit*>());
-    QTest::keyClicks(tree->findChild<QLineEdit*>(), "yes");
-    QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
-    QTRY_VERIFY(!tree->findChild<QLineEdit*>());
-    window->activateWindow();
-    QVERIFY(QTest::qWaitForWindowActive(window.get()));
-    QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
-    QVERIFY(!editor->isModified());
+    TypeInto(tree, tree->topLevelItem(0)->child(0), 0, "renamed");
+    Enter(tree);
+    TypeInto(tree, tree->topLevelItem(0)->child(1), 1, "yes");
+    Enter(tree);
+    QVERIFY(WindowTest::activate(shown.window.get()));
+    QTest::keyClick(shown.window.get(), Qt::Key_S, Qt::ControlModifier);
+    QVERIFY(!shown.editor->isModified());
     const QByteArray expected = WithValue(value, "yes").replace("long>", "renamed>");
-    QVERIFY(TestFiles::read(file) == expected);
+    QVERIFY(TestFiles::read(shown.file) == expected);
     QVERIFY(MaximumCellLength(tree) <= 1000);
 }
 
@@ -511,21 +485,16 @@ void tst_HostileFiles::longValueIsEdited_data()
 void tst_HostileFiles::longValueIsEdited()
 {
     QFETCH(QString, way);
-    const WindowTest test;
     const QByteArray value = LongValue();
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, WithValue(value)));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* editor = window->findChild<FileTabs*>()->currentEditor();
-    auto* tree = editor->findChild<QTreeWidget*>();
+    const ShownSettings shown(WithValue(value));
+    QTreeWidget* tree = shown.tree;
     tree->setFocus();
     QTreeWidgetItem* item = tree->topLevelItem(0)->child(0);
     tree->setCurrentItem(item, 1);
 
-    int shown = 0;
+    int dialogs = 0;
     WindowTest::whenShown<QDialog>([&](QDialog* dialog) {
-        ++shown;
+        ++dialogs;
         auto* text = dialog->findChild<QPlainTextEdit*>();
         text->setFocus();
         QTest::keyClick(text, Qt::Key_End, Qt::ControlModifier);
@@ -545,15 +514,13 @@ void tst_HostileFiles::longValueIsEdited()
         QTest::mouseClick(tree->viewport(), Qt::LeftButton, Qt::NoModifier, cell);
         QTest::mouseDClick(tree->viewport(), Qt::LeftButton, Qt::NoModifier, cell);
     }
-    QTRY_COMPARE_WITH_TIMEOUT(shown, 1, Patience);
-    QTRY_VERIFY_WITH_TIMEOUT(editor->isModified(), Patience);
-    QTest::qWait(50);
-    QVERIFY(!QApplication::activeModalWidget());
+    QTRY_COMPARE_WITH_TIMEOUT(dialogs, 1, Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(shown.editor->isModified(), Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(!QApplication::activeModalWidget(), Patience);
     QVERIFY(MaximumCellLength(tree) <= 1000);
-    window->activateWindow();
-    QVERIFY(QTest::qWaitForWindowActive(window.get()));
-    QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
-    QVERIFY(TestFiles::read(file) == WithValue(value + "end"));
+    QVERIFY(WindowTest::activate(shown.window.get()));
+    QTest::keyClick(shown.window.get(), Qt::Key_S, Qt::ControlModifier);
+    QVERIFY(TestFiles::read(shown.file) == WithValue(value + "end"));
 }
 
 // A long value can become short; its cell is then edited like any other.
@@ -580,10 +547,11 @@ void tst_HostileFiles::longValueIsTypedOver()
     QTest::keyClick(tree, Qt::Key_F2);
     QTRY_COMPARE_WITH_TIMEOUT(tree->topLevelItem(0)->child(0)->text(1), QString("short"), Patience);
     QTest::keyClick(tree, Qt::Key_F2);
-    QTRY_VERIFY(tree->findChild<QLineEdit*>());
+    QTRY_VERIFY_WITH_TIMEOUT(tree->findChild<QLineEdit*>(), Patience);
     QTest::keyClicks(tree->findChild<QLineEdit*>(), "shorter");
     QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
-    QTRY_COMPARE(editor.document().Value("S", "long", ""), QString("shorter"));
+    QTRY_COMPARE_WITH_TIMEOUT(editor.document().Value("S", "long", ""), QString("shorter"),
+                              Patience);
     QVERIFY(editor.Save());
     QCOMPARE(TestFiles::read(file), WithValue("shorter"));
 }
@@ -779,12 +747,12 @@ void tst_HostileFiles::otherLineBreaks()
         });
         QTest::keyClick(tree, Qt::Key_F2);
         QTRY_COMPARE_WITH_TIMEOUT(shown, 1, Patience);
-        QTRY_VERIFY(!QApplication::activeModalWidget());
+        QTRY_VERIFY_WITH_TIMEOUT(!QApplication::activeModalWidget(), Patience);
     } else {
         QTest::keyClick(tree, Qt::Key_F2);
-        QTRY_VERIFY(tree->findChild<QLineEdit*>());
+        QTRY_VERIFY_WITH_TIMEOUT(tree->findChild<QLineEdit*>(), Patience);
         QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
-        QTRY_VERIFY(!tree->findChild<QLineEdit*>());
+        QTRY_VERIFY_WITH_TIMEOUT(!tree->findChild<QLineEdit*>(), Patience);
     }
     QTest::qWait(50);
     QVERIFY(stored() == value);
@@ -793,11 +761,11 @@ void tst_HostileFiles::otherLineBreaks()
 
     if (!inDialog) {
         QTest::keyClick(tree, Qt::Key_F2);
-        QTRY_VERIFY(tree->findChild<QLineEdit*>());
+        QTRY_VERIFY_WITH_TIMEOUT(tree->findChild<QLineEdit*>(), Patience);
         QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_End);
         QTest::keyClicks(tree->findChild<QLineEdit*>(), "!");
         QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
-        QTRY_VERIFY(stored() == value + '!');
+        QTRY_VERIFY_WITH_TIMEOUT(stored() == value + '!', Patience);
     }
 }
 

@@ -4,6 +4,7 @@
 // Lines that leave the window: copied in other formats, and saved to a file.
 
 #include "WindowParts.h"
+#include "WindowTestCase.h"
 
 #include "app/window/log/LineSaver.h"
 #include "app/window/widgets/NoticeBar.h"
@@ -12,8 +13,6 @@
 #include <QClipboard>
 #include <QFileDialog>
 #include <QLineEdit>
-#include <QLoggingCategory>
-#include <QStatusBar>
 
 using namespace Velocor;
 using namespace WindowParts;
@@ -35,14 +34,11 @@ void SaveLines(MainWindow& window, QString const& path)
 
 } // namespace
 
-class tst_LinesElsewhere : public QObject
+class tst_LinesElsewhere : public WindowTestCase
 {
     Q_OBJECT
 
 private slots:
-    void initTestCase();
-    void cleanup();
-
     void copiesAsMarkdown_data();
     void copiesAsMarkdown();
     void copiesAsCsv();
@@ -59,21 +55,6 @@ private slots:
     void fullDiskLeavesTheOldFile();
     void tellsWhyNothingWasSaved();
 };
-
-void tst_LinesElsewhere::initTestCase()
-{
-    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
-    // in a test's log. The environment would be too late: it was read with the application object.
-    QLoggingCategory::setFilterRules("qt.qpa.*=false");
-}
-
-void tst_LinesElsewhere::cleanup()
-{
-    const QWidgetList windows = QApplication::topLevelWidgets();
-    for (QWidget* window : windows)
-        window->hide();
-    QGuiApplication::clipboard()->clear();
-}
 
 void tst_LinesElsewhere::copiesAsMarkdown_data()
 {
@@ -100,7 +81,7 @@ void tst_LinesElsewhere::copiesAsMarkdown()
     QTest::keyClick(window.get(), Qt::Key_D, Qt::ControlModifier | Qt::AltModifier);
     QCOMPARE(QGuiApplication::clipboard()->text(),
              fence + "\n" + QString::fromLatin1(log) + fence + "\n");
-    QCOMPARE(window->statusBar()->currentMessage(), QString("2 lines copied"));
+    QCOMPARE(Status(*window), QString("2 lines copied"));
 }
 
 // A line that is shown shortened is copied whole.
@@ -119,7 +100,7 @@ void tst_LinesElsewhere::copiesAsCsv()
                              longText + "\"\r\n\"\",\"\",\"\",\"no entry\"\r\n";
     // The clipboard may have its own line ends.
     QCOMPARE(QGuiApplication::clipboard()->text().remove('\r'), QString(expected).remove('\r'));
-    QCOMPARE(window->statusBar()->currentMessage(), QString("3 lines copied"));
+    QCOMPARE(Status(*window), QString("3 lines copied"));
 }
 
 void tst_LinesElsewhere::copiesFromTheMenu_data()
@@ -157,7 +138,7 @@ void tst_LinesElsewhere::copiesNothingWithoutASelection()
     QGuiApplication::clipboard()->setText("before");
     QTest::keyClick(window.get(), Qt::Key_V, Qt::ControlModifier | Qt::AltModifier);
     QCOMPARE(QGuiApplication::clipboard()->text(), QString("before"));
-    QCOMPARE(window->statusBar()->currentMessage(), QString("No lines selected"));
+    QCOMPARE(Status(*window), QString("No lines selected"));
 }
 
 // Without headings, and only what the filter shows.
@@ -183,8 +164,9 @@ void tst_LinesElsewhere::savesFilteredLines()
     QVERIFY(expected.count('\n') > 3 && expected.count('\n') < model->rowCount());
     SaveLines(*window, file);
     QTRY_COMPARE_WITH_TIMEOUT(TestFiles::read(file), expected, Patience);
-    QTRY_COMPARE(window->statusBar()->currentMessage(),
-                 QString("%1 lines saved to %2").arg(expected.count('\n')).arg(file));
+    QTRY_COMPARE_WITH_TIMEOUT(Status(*window),
+                              QString("%1 lines saved to %2").arg(expected.count('\n')).arg(file),
+                              Patience);
 }
 
 void tst_LinesElsewhere::savesManyLines()
@@ -198,8 +180,7 @@ void tst_LinesElsewhere::savesManyLines()
     window->OpenFile(source);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 80000, Patience);
     SaveLines(*window, target);
-    QTRY_VERIFY_WITH_TIMEOUT(window->statusBar()->currentMessage().startsWith("80,000 lines saved"),
-                             Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(Status(*window).startsWith("80,000 lines saved"), Patience);
     QCOMPARE(TestFiles::read(target), log);
 }
 

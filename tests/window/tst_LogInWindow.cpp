@@ -4,6 +4,7 @@
 // The window on a real screen, driven with keys and mouse.
 
 #include "WindowParts.h"
+#include "WindowTestCase.h"
 
 #include "app/logfile/LogScanner.h"
 #include "app/window/log/LogModel.h"
@@ -17,13 +18,11 @@
 #include <QDialogButtonBox>
 #include <QLabel>
 #include <QLineEdit>
-#include <QLoggingCategory>
 #include <QMenuBar>
 #include <QPlainTextEdit>
 #include <QPushButton>
 #include <QScrollBar>
 #include <QSpinBox>
-#include <QStatusBar>
 #include <QToolButton>
 #include <QTreeView>
 #include <QWheelEvent>
@@ -49,22 +48,13 @@ void Type(QWidget* widget, QString const& text)
     QApplication::sendEvent(widget, &press);
 }
 
-// A check box reacts to clicks on the box, not on the whole area of the widget.
-void ClickBox(QCheckBox* box)
-{
-    QTest::mouseClick(box, Qt::LeftButton, Qt::NoModifier, QPoint(8, box->height() / 2));
-}
-
 } // namespace
 
-class tst_LogInWindow : public QObject
+class tst_LogInWindow : public WindowTestCase
 {
     Q_OBJECT
 
 private slots:
-    void initTestCase();
-    void cleanup();
-
     void showsTheLog();
     void followsTheLog();
     void followsUntilScrolled();
@@ -108,21 +98,6 @@ private slots:
     void monospacedFont();
 };
 
-void tst_LogInWindow::initTestCase()
-{
-    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
-    // in a test's log. The environment would be too late: it was read with the application object.
-    QLoggingCategory::setFilterRules("qt.qpa.*=false");
-}
-
-void tst_LogInWindow::cleanup()
-{
-    const QWidgetList windows = QApplication::topLevelWidgets();
-    for (QWidget* window : windows)
-        window->hide();
-    QGuiApplication::clipboard()->clear();
-}
-
 void tst_LogInWindow::showsTheLog()
 {
     const WindowTest test(
@@ -143,7 +118,8 @@ void tst_LogInWindow::followsTheLog()
     const auto window = WindowTest::show();
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 200, Patience);
     LogView* view = View(*window);
-    QTRY_COMPARE(view->verticalScrollBar()->value(), view->verticalScrollBar()->maximum());
+    QTRY_COMPARE_WITH_TIMEOUT(view->verticalScrollBar()->value(),
+                              view->verticalScrollBar()->maximum(), Patience);
     QVERIFY(TestFiles::writeOver(test.logFile(), run(300, QTime(9, 0), "x")));
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 300, Patience);
     QCOMPARE(view->verticalScrollBar()->value(), view->verticalScrollBar()->maximum());
@@ -182,17 +158,17 @@ void tst_LogInWindow::followsWhileResized()
     const auto newest = [&] {
         return view->visualRect(view->model()->index(59, LogModel::MessageColumn));
     };
-    QTRY_VERIFY(view->viewport()->rect().contains(newest().center()));
+    QTRY_VERIFY_WITH_TIMEOUT(view->viewport()->rect().contains(newest().center()), Patience);
     for (int height : {450, 560}) {
         window->resize(700, height);
-        QTRY_COMPARE(window->height(), height);
+        QTRY_COMPARE_WITH_TIMEOUT(window->height(), height, Patience);
         QVERIFY(view->isFollowing());
         QVERIFY(view->viewport()->rect().contains(newest().center()));
     }
     view->SetFollowing(false);
     const int position = view->verticalScrollBar()->value();
     window->resize(700, 450);
-    QTRY_COMPARE(window->height(), 450);
+    QTRY_COMPARE_WITH_TIMEOUT(window->height(), 450, Patience);
     QCOMPARE(view->verticalScrollBar()->value(), position);
 }
 
@@ -206,7 +182,7 @@ void tst_LogInWindow::firstProblemIsFound()
     LogView* view = View(*window);
     Child<QLineEdit>(window.get(), "Filter by text")->setFocus();
     view->setFocus();
-    QTRY_VERIFY(view->hasFocus());
+    QTRY_VERIFY_WITH_TIMEOUT(view->hasFocus(), Patience);
     QVERIFY(!view->currentIndex().isValid());
     QCOMPARE(Child<QPlainTextEdit>(window.get(), "Full text of the current line")->toPlainText(),
              QString());
@@ -224,7 +200,8 @@ void tst_LogInWindow::filterByText()
     QTest::keyClicks(QApplication::focusWidget(), "entry 2");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 11, Patience);
     auto const* summary = Child<QLabel>(window.get(), "Lines shown");
-    QTRY_VERIFY2(summary->text().startsWith("11 of 30 lines"), qPrintable(summary->text()));
+    QTRY_VERIFY2_WITH_TIMEOUT(summary->text().startsWith("11 of 30 lines"),
+                              qPrintable(summary->text()), Patience);
 
     ClickBox(Child<QCheckBox>(window.get(), "Match case"));
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 0, Patience);
@@ -236,18 +213,10 @@ void tst_LogInWindow::filterByText()
     QTest::keyClicks(QApplication::focusWidget(), "Entry 7");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
     LogView* view = View(*window);
-    const auto yellowPixels = [&] {
-        const QImage image = view->viewport()->grab().toImage();
-        int count = 0;
-        for (int y = 0; y < image.height(); ++y) {
-            for (int x = 0; x < image.width(); ++x)
-                count += image.pixelColor(x, y) == QColor(0xff, 0xe0, 0x66) ? 1 : 0;
-        }
-        return count;
-    };
-    QTRY_VERIFY_WITH_TIMEOUT(yellowPixels() > 50, Patience);
+    const QColor yellow(0xff, 0xe0, 0x66);
+    QTRY_VERIFY_WITH_TIMEOUT(Pixels(view->viewport(), yellow) > 50, Patience);
     Panel(*window)->ClearFilter();
-    QTRY_COMPARE_WITH_TIMEOUT(yellowPixels(), 0, Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(Pixels(view->viewport(), yellow), 0, Patience);
 }
 
 void tst_LogInWindow::filterByExpression()
@@ -263,11 +232,11 @@ void tst_LogInWindow::filterByExpression()
     auto const* error = Child<QLabel>(window.get(), "Filter error");
     QVERIFY(!error->isVisible());
     QTest::keyClicks(QApplication::focusWidget(), "(");
-    QTRY_VERIFY(error->isVisible());
+    QTRY_VERIFY_WITH_TIMEOUT(error->isVisible(), Patience);
     QVERIFY2(error->text().contains("at character"), qPrintable(error->text()));
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 30, Patience);
     QTest::keyClick(QApplication::focusWidget(), Qt::Key_Backspace);
-    QTRY_VERIFY(!error->isVisible());
+    QTRY_VERIFY_WITH_TIMEOUT(!error->isVisible(), Patience);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
 }
 
@@ -560,7 +529,7 @@ void tst_LogInWindow::entriesOfSeveralLines()
     QCOMPARE(pane->toPlainText() + '\n', QString(first));
     QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
     QCOMPARE(QGuiApplication::clipboard()->text(), QString(first));
-    QCOMPARE(window->statusBar()->currentMessage(), QString("3 lines copied"));
+    QCOMPARE(Status(*window), QString("3 lines copied"));
     QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::ShiftModifier, RowCentre(view, 4));
     QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
     QCOMPARE(QGuiApplication::clipboard()->text().toLatin1(), TestFiles::read(test.logFile()));
@@ -600,7 +569,7 @@ void tst_LogInWindow::copiesLines()
     QTest::keyClick(view, Qt::Key_A, Qt::ControlModifier);
     QTest::keyClick(view, Qt::Key_C, Qt::ControlModifier);
     QCOMPARE(QGuiApplication::clipboard()->text(), QString(log));
-    QCOMPARE(window->statusBar()->currentMessage(), QString("20 lines copied"));
+    QCOMPARE(Status(*window), QString("20 lines copied"));
 }
 
 // From the menu too, a focused text field takes precedence over the log.
@@ -613,7 +582,7 @@ void tst_LogInWindow::copiesFromTheMenu()
     View(*window)->clearSelection();
     window->setFocus();
     Action(*window, "Copy")->trigger();
-    QCOMPARE(window->statusBar()->currentMessage(), QString("No lines selected"));
+    QCOMPARE(Status(*window), QString("No lines selected"));
     Action(*window, "Select All")->trigger();
     Action(*window, "Copy")->trigger();
     QCOMPARE(QGuiApplication::clipboard()->text(), QString(log));
@@ -639,10 +608,10 @@ void tst_LogInWindow::problems()
     QCOMPARE(View(*window)->currentIndex().row(), 3);
     QTest::keyClick(window.get(), Qt::Key_F8);
     QCOMPARE(View(*window)->currentIndex().row(), 1);
-    QCOMPARE(window->statusBar()->currentMessage(), QString("Continued from the top"));
+    QCOMPARE(Status(*window), QString("Continued from the top"));
     QTest::keyClick(window.get(), Qt::Key_F8, Qt::ShiftModifier);
     QCOMPARE(View(*window)->currentIndex().row(), 3);
-    QCOMPARE(window->statusBar()->currentMessage(), QString("Continued from the bottom"));
+    QCOMPARE(Status(*window), QString("Continued from the bottom"));
     QTest::keyClick(window.get(), Qt::Key_F8, Qt::ShiftModifier);
     QCOMPARE(View(*window)->selectionModel()->selectedRows().size(), 1);
     QCOMPARE(View(*window)->currentIndex().row(), 1);
@@ -654,7 +623,7 @@ void tst_LogInWindow::noProblems()
     const auto window = WindowTest::show();
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
     QTest::keyClick(window.get(), Qt::Key_F8);
-    QCOMPARE(window->statusBar()->currentMessage(), QString("No warnings or errors"));
+    QCOMPARE(Status(*window), QString("No warnings or errors"));
     QVERIFY(!View(*window)->currentIndex().isValid());
 }
 
@@ -910,7 +879,7 @@ void tst_LogInWindow::stateOfTheLogCanBeDismissed()
     QTest::qWait(2500); // it has been checked again
     QVERIFY(!state->isVisible());
     TorkLog::logger()->setEnable(true);
-    QTest::qWait(2500);
+    QTRY_VERIFY_WITH_TIMEOUT(window->findChild<FileTabs*>()->tabIcon(0).isNull(), Patience);
     TorkLog::logger()->setEnable(false);
     QTRY_VERIFY_WITH_TIMEOUT(state->isVisible(), Patience);
     TorkLog::logger()->setEnable(true);
@@ -937,8 +906,9 @@ void tst_LogInWindow::emptyTableSaysWhatToDo()
     QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);
     QTest::keyClicks(QApplication::focusWidget(), "nowhere");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 0, Patience);
-    QTRY_COMPARE(View(*window)->accessibleDescription(),
-                 QString("No lines match the filter.\nClear it with Ctrl+Shift+F."));
+    QTRY_COMPARE_WITH_TIMEOUT(View(*window)->accessibleDescription(),
+                              QString("No lines match the filter.\nClear it with Ctrl+Shift+F."),
+                              Patience);
     QTest::keyClick(QApplication::focusWidget(), Qt::Key_F,
                     Qt::ControlModifier | Qt::ShiftModifier);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);

@@ -4,6 +4,7 @@
 // The window on a real screen, driven with keys and mouse.
 
 #include "WindowParts.h"
+#include "WindowTestCase.h"
 
 #include "app/window/FileTabs.h"
 #include "app/window/PlacesPanel.h"
@@ -20,7 +21,6 @@
 #include <QFileDialog>
 #include <QLabel>
 #include <QLineEdit>
-#include <QLoggingCategory>
 #include <QMenuBar>
 #include <QMessageBox>
 #include <QMimeData>
@@ -29,7 +29,6 @@
 #include <QScreen>
 #include <QSplitter>
 #include <QStandardPaths>
-#include <QStatusBar>
 #include <QToolBar>
 #include <QToolButton>
 
@@ -64,14 +63,11 @@ public slots:
 
 } // namespace
 
-class tst_MainWindow : public QObject
+class tst_MainWindow : public WindowTestCase
 {
     Q_OBJECT
 
 private slots:
-    void initTestCase();
-    void cleanup();
-
     void fitsTheScreen();
     void identityAndPlaces();
     void copiesAPlace();
@@ -96,21 +92,6 @@ private slots:
     void keepsItsState();
     void damagedState();
 };
-
-void tst_MainWindow::initTestCase()
-{
-    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
-    // in a test's log. The environment would be too late: it was read with the application object.
-    QLoggingCategory::setFilterRules("qt.qpa.*=false");
-}
-
-void tst_MainWindow::cleanup()
-{
-    const QWidgetList windows = QApplication::topLevelWidgets();
-    for (QWidget* window : windows)
-        window->hide();
-    QGuiApplication::clipboard()->clear();
-}
 
 void tst_MainWindow::fitsTheScreen()
 {
@@ -159,7 +140,7 @@ void tst_MainWindow::copiesAPlace()
     QTest::keyClick(window.get(), Qt::Key_F9);
     Click(Child<QToolButton>(window.get(), "Copy: Log file"));
     QCOMPARE(QGuiApplication::clipboard()->text(), test.logFile());
-    QCOMPARE(window->statusBar()->currentMessage(), QString("Copied: Log file"));
+    QCOMPARE(Status(*window), QString("Copied: Log file"));
     QVERIFY(Child<QToolButton>(window.get(), "Open: Data"));
     QVERIFY(!PlacesPanel::OpenPlace(test.folder() + "nowhere/at/all"));
     QVERIFY(!PlacesPanel::OpenPlace(QString()));
@@ -182,7 +163,7 @@ void tst_MainWindow::opensNoFolder()
     const WindowTest test;
     const auto window = WindowTest::show();
     window->OpenFile(test.folder() + "documents");
-    QCOMPARE(window->statusBar()->currentMessage(), test.folder() + "documents is a folder");
+    QCOMPARE(Status(*window), test.folder() + "documents is a folder");
 }
 
 void tst_MainWindow::opensFiles()
@@ -289,7 +270,7 @@ void tst_MainWindow::forgetsMissingFile()
     QVERIFY(!menu->isEnabled());
     QCOMPARE(window->findChild<FileTabs*>()->count(), 1);
     window->OpenFile(test.folder() + "never there");
-    QVERIFY(window->statusBar()->currentMessage().endsWith(" does not exist"));
+    QVERIFY(Status(*window).endsWith(" does not exist"));
 }
 
 void tst_MainWindow::dropsFiles()
@@ -398,8 +379,8 @@ void tst_MainWindow::opensTheManual()
     UrlHandler handler;
     QTest::keyClick(window.get(), Qt::Key_F1);
     if (handler.url.isEmpty()) // one may be installed on this system
-        QVERIFY2(window->statusBar()->currentMessage().startsWith("The manual is not installed"),
-                 qPrintable(window->statusBar()->currentMessage()));
+        QVERIFY2(Status(*window).startsWith("The manual is not installed"),
+                 qPrintable(Status(*window)));
     QVERIFY(TestFiles::write(folder + "window.md", "# The window\n"));
     QTest::keyClick(window.get(), Qt::Key_F1);
     QCOMPARE(handler.url, QUrl::fromLocalFile(folder + "window.md"));
@@ -494,7 +475,7 @@ void tst_MainWindow::keepsItsState()
     {
         const auto window = WindowTest::show();
         window->setGeometry(60, 70, 640, 420);
-        QTest::qWait(100);
+        QTRY_COMPARE_WITH_TIMEOUT(window->geometry(), QRect(60, 70, 640, 420), Patience);
         QTest::keyClick(window.get(), Qt::Key_F9);
         QTest::keyClick(window.get(), Qt::Key_B, Qt::ControlModifier | Qt::AltModifier);
         window->findChild<QSplitter*>()->setSizes({220, 420});
@@ -508,10 +489,10 @@ void tst_MainWindow::keepsItsState()
     QVERIFY2(file.contains("<ApplicationScreens>\n<MainWindow>"), file);
     {
         const auto window = WindowTest::show();
-        QTest::qWait(100);
-        QCOMPARE(window->size(), geometry.size());
-        QVERIFY((window->pos() - geometry.topLeft()).manhattanLength() < 100);
-        QCOMPARE(window->findChild<QSplitter*>()->sizes(), panes);
+        QTRY_COMPARE_WITH_TIMEOUT(window->size(), geometry.size(), Patience);
+        QTRY_VERIFY_WITH_TIMEOUT((window->pos() - geometry.topLeft()).manhattanLength() < 100,
+                                 Patience);
+        QTRY_COMPARE_WITH_TIMEOUT(window->findChild<QSplitter*>()->sizes(), panes, Patience);
         QCOMPARE(View(*window)->columnWidth(LogModel::TimeColumn), 123);
         QVERIFY(!window->findChild<QToolBar*>()->isVisible());
         QVERIFY(!Action(*window, "Tool Bar")->isChecked());

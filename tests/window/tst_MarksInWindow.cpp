@@ -4,6 +4,7 @@
 // Marks and notes, driven with keys and mouse on a real screen.
 
 #include "WindowParts.h"
+#include "WindowTestCase.h"
 
 #include "app/window/MarksFile.h"
 #include "app/window/log/LogModel.h"
@@ -13,10 +14,8 @@
 
 #include <QLabel>
 #include <QLineEdit>
-#include <QLoggingCategory>
 #include <QMenu>
 #include <QPlainTextEdit>
-#include <QStatusBar>
 
 using namespace Velocor;
 using namespace WindowParts;
@@ -46,11 +45,6 @@ QString Note(MainWindow& window)
     return label->isVisible() ? label->text() : QString();
 }
 
-QString Status(MainWindow const& window)
-{
-    return window.statusBar()->currentMessage();
-}
-
 void WriteNote(MainWindow& window, char const* note)
 {
     WindowTest::whenShown<NoteDialog>([note](NoteDialog* dialog) {
@@ -60,8 +54,7 @@ void WriteNote(MainWindow& window, char const* note)
         QTest::keyClick(field, Qt::Key_Return);
     });
     QTest::keyClick(&window, Qt::Key_M, Qt::ControlModifier | Qt::ShiftModifier);
-    window.activateWindow(); // no window manager does it
-    QVERIFY(QTest::qWaitForWindowActive(&window));
+    QVERIFY(WindowTest::activate(&window)); // no window manager does it
 }
 
 void MarkRow(MainWindow& window, int row)
@@ -72,14 +65,11 @@ void MarkRow(MainWindow& window, int row)
 
 } // namespace
 
-class tst_MarksInWindow : public QObject
+class tst_MarksInWindow : public WindowTestCase
 {
     Q_OBJECT
 
 private slots:
-    void initTestCase();
-    void cleanup();
-
     void marks();
     void nextAndPrevious();
     void notes();
@@ -97,20 +87,6 @@ private slots:
     void encodings();
     void encodingIsKept();
 };
-
-void tst_MarksInWindow::initTestCase()
-{
-    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
-    // in a test's log. The environment would be too late: it was read with the application object.
-    QLoggingCategory::setFilterRules("qt.qpa.*=false");
-}
-
-void tst_MarksInWindow::cleanup()
-{
-    const QWidgetList windows = QApplication::topLevelWidgets();
-    for (QWidget* window : windows)
-        window->hide();
-}
 
 void tst_MarksInWindow::marks()
 {
@@ -177,26 +153,20 @@ void tst_MarksInWindow::looks()
     const auto window = WindowTest::show();
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
     const auto pixels = [](QWidget* widget) {
-        const QImage image = widget->grab().toImage();
-        int count = 0;
-        for (int y = 0; y < image.height(); ++y) {
-            for (int x = 0; x < image.width(); ++x)
-                count += image.pixelColor(x, y) == MarkColor ? 1 : 0;
-        }
-        return count;
+        return Pixels(widget, MarkColor);
     };
     LogView* view = View(*window);
     QCOMPARE(pixels(view->viewport()), 0);
     QCOMPARE(pixels(view->ticks()), 0);
     MarkRow(*window, 50);
-    QTRY_VERIFY(pixels(view->viewport()) > 4 * 10);
-    QTRY_VERIFY(pixels(view->ticks()) > 10);
+    QTRY_VERIFY_WITH_TIMEOUT(pixels(view->viewport()) > 4 * 10, Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(pixels(view->ticks()) > 10, Patience);
     const int withoutNote = pixels(view->viewport());
     WriteNote(*window, "why");
-    QTRY_VERIFY(pixels(view->viewport()) > withoutNote + 10);
+    QTRY_VERIFY_WITH_TIMEOUT(pixels(view->viewport()) > withoutNote + 10, Patience);
     QTest::keyClick(window.get(), Qt::Key_M, Qt::ControlModifier);
-    QTRY_COMPARE(pixels(view->viewport()), 0);
-    QTRY_COMPARE(pixels(view->ticks()), 0);
+    QTRY_COMPARE_WITH_TIMEOUT(pixels(view->viewport()), 0, Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(pixels(view->ticks()), 0, Patience);
 }
 
 void tst_MarksInWindow::outliveTheSession()
@@ -213,7 +183,7 @@ void tst_MarksInWindow::outliveTheSession()
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
     QTRY_COMPARE_WITH_TIMEOUT(Marked(*window), QVector<int>({30, 70}), Patience);
     View(*window)->GoToRow(30);
-    QTRY_COMPARE(Note(*window), QString("Note: <b>\"]]> & 100%1"));
+    QTRY_COMPARE_WITH_TIMEOUT(Note(*window), QString("Note: <b>\"]]> & 100%1"), Patience);
 }
 
 // Found by content: lines were added before, and the file has been written over.
@@ -269,12 +239,12 @@ void tst_MarksInWindow::filteredOut()
     QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);
     QTest::keyClicks(QApplication::focusWidget(), "x 7");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 11, Patience);
-    QTRY_COMPARE(Marked(*window), QVector<int>({3}));
+    QTRY_COMPARE_WITH_TIMEOUT(Marked(*window), QVector<int>({3}), Patience);
     QTest::keyClick(window.get(), Qt::Key_F2);
     QCOMPARE(View(*window)->currentIndex().row(), 3);
     Panel(*window)->ClearFilter();
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
-    QTRY_COMPARE(Marked(*window), QVector<int>({15, 72}));
+    QTRY_COMPARE_WITH_TIMEOUT(Marked(*window), QVector<int>({15, 72}), Patience);
     QTest::keyClick(window.get(), Qt::Key_F2, Qt::ShiftModifier);
     QCOMPARE(View(*window)->currentIndex().row(), 15);
 }

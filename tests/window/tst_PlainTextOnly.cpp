@@ -4,7 +4,8 @@
 // Nothing from a file, a path or a log line is interpreted as rich text: every part of the window
 // is checked with names and contents that look like markup.
 
-#include "WindowTest.h"
+#include "WindowParts.h"
+#include "WindowTestCase.h"
 
 #include "app/runninglog/LogPreferences.h"
 #include "app/window/FileTabs.h"
@@ -26,7 +27,6 @@
 #include <QHelpEvent>
 #include <QLabel>
 #include <QLineEdit>
-#include <QLoggingCategory>
 #include <QMenu>
 #include <QMessageBox>
 #include <QPushButton>
@@ -40,12 +40,11 @@
 #include <random>
 
 using namespace Velocor;
+using namespace WindowParts;
 
 using Velocor::PlainToolTip;
 
 namespace {
-
-constexpr int Patience = 20000; // milliseconds
 
 // What a widget that guesses the format shows for a text.
 QString Displayed(QString const& text)
@@ -144,21 +143,6 @@ QString NameOf(QString const& markup, QString const& end)
     return markup + end;
 }
 
-QAction* Action(QWidget* window, QString const& text)
-{
-    const QList<QAction*> all = window->findChildren<QAction*>();
-    for (QAction* action : all) {
-        if (QString(action->text()).remove('&') == text)
-            return action;
-    }
-    return nullptr;
-}
-
-void Click(QWidget* widget)
-{
-    QTest::mouseClick(widget, Qt::LeftButton, Qt::NoModifier, widget->rect().center());
-}
-
 void ClickNamed(QWidget* window, QString const& text)
 {
     const QList<QPushButton*> buttons = window->findChildren<QPushButton*>();
@@ -216,13 +200,12 @@ void LookAtNextBox(QStringList* seen, QString* text, Qt::Key answer = Qt::Key_Es
 
 } // namespace
 
-class tst_PlainTextOnly : public QObject
+class tst_PlainTextOnly : public WindowTestCase
 {
     Q_OBJECT
 
 private slots:
-    void initTestCase();
-    void cleanup();
+    void cleanup() override;
 
     void toolTips_data();
     void toolTips();
@@ -257,14 +240,10 @@ private:
     static void markup();
 };
 
-void tst_PlainTextOnly::initTestCase()
-{
-    QLoggingCategory::setFilterRules("qt.qpa.*=false");
-}
-
 void tst_PlainTextOnly::cleanup()
 {
     QToolTip::hideText();
+    WindowTestCase::cleanup();
 }
 
 void tst_PlainTextOnly::markup()
@@ -393,7 +372,8 @@ void tst_PlainTextOnly::shownToolTips()
     QCOMPARE(files->accessibleDescription(), place.log);
     auto* view = tabs->currentLog()->view();
     QTRY_COMPARE_WITH_TIMEOUT(view->model()->rowCount(), 2, Patience);
-    QTRY_VERIFY(view->visualRect(view->model()->index(0, LogModel::MessageColumn)).isValid());
+    QTRY_VERIFY_WITH_TIMEOUT(
+        view->visualRect(view->model()->index(0, LogModel::MessageColumn)).isValid(), Patience);
     Hover(view->viewport(),
           view->visualRect(view->model()->index(0, LogModel::MessageColumn)).center());
     QCOMPARE(Displayed(QToolTip::text()), markup);
@@ -419,8 +399,7 @@ void tst_PlainTextOnly::statusText()
     const HostilePlace place(markup);
     const auto window = WindowTest::show();
     window->OpenFile(place.folder);
-    QCOMPARE(window->statusBar()->currentMessage(),
-             QFileInfo(place.folder).absoluteFilePath() + " is a folder");
+    QCOMPARE(Status(*window), QFileInfo(place.folder).absoluteFilePath() + " is a folder");
     QCOMPARE(Breaches(window->statusBar()).join('\n'), QString());
 
     QFile::remove(place.folder + "logs/app.log");
@@ -443,7 +422,7 @@ void tst_PlainTextOnly::recentFiles()
     const HostilePlace place(markup);
     const auto window = WindowTest::show();
     window->OpenFile(place.log);
-    QMenu* menu = Action(window.get(), "Open Recent")->menu();
+    QMenu* menu = Action(*window, "Open Recent")->menu();
     QAction const* action = menu->actions().first();
     QCOMPARE(Displayed(action->toolTip()), place.log);
     QVERIFY(!HasMarkup(action->toolTip()));
@@ -546,7 +525,7 @@ void tst_PlainTextOnly::boxAboutAMissingFile()
     QStringList breaches("no box");
     QString text;
     LookAtNextBox(&breaches, &text);
-    Action(window.get(), "Open Recent")->menu()->actions().first()->trigger();
+    Action(*window, "Open Recent")->menu()->actions().first()->trigger();
     QCOMPARE(breaches.join('\n'), QString());
     QVERIFY2(text.contains(place.log), qPrintable(text));
 }
@@ -586,7 +565,6 @@ void tst_PlainTextOnly::boxOfTheFileDialog()
         ClickNamed(dialog, "Save...");
         dialog->reject();
     });
-    QTRY_VERIFY(Action(window.get(), "Save Report..."));
     QTest::keyClick(window.get(), Qt::Key_R, Qt::ControlModifier | Qt::ShiftModifier);
     QTRY_VERIFY_WITH_TIMEOUT(breaches != QStringList("no box"), Patience);
     QCOMPARE(breaches.join('\n'), QString());

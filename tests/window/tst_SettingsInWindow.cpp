@@ -3,7 +3,9 @@
 
 // The window on a real screen, driven with keys and mouse.
 
+#include "ShownSettings.h"
 #include "WindowParts.h"
+#include "WindowTestCase.h"
 
 #include "app/window/FileTabs.h"
 #include "app/window/settings/SettingsEditor.h"
@@ -12,9 +14,7 @@
 #include "common/log/TorkLog.h"
 
 #include <QAbstractButton>
-#include <QClipboard>
 #include <QLineEdit>
-#include <QLoggingCategory>
 #include <QMenuBar>
 #include <QMessageBox>
 #include <QPlainTextEdit>
@@ -25,14 +25,11 @@
 using namespace Velocor;
 using namespace WindowParts;
 
-class tst_SettingsInWindow : public QObject
+class tst_SettingsInWindow : public WindowTestCase
 {
     Q_OBJECT
 
 private slots:
-    void initTestCase();
-    void cleanup();
-
     void editsSettings();
     void rejectedNameKeepsTheOld_data();
     void rejectedNameKeepsTheOld();
@@ -53,102 +50,58 @@ private slots:
     void closesWhileEditing();
 };
 
-void tst_SettingsInWindow::initTestCase()
-{
-    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
-    // in a test's log. The environment would be too late: it was read with the application object.
-    QLoggingCategory::setFilterRules("qt.qpa.*=false");
-}
-
-void tst_SettingsInWindow::cleanup()
-{
-    const QWidgetList windows = QApplication::topLevelWidgets();
-    for (QWidget* window : windows)
-        window->hide();
-    QGuiApplication::clipboard()->clear();
-}
-
 void tst_SettingsInWindow::editsSettings()
 {
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, Settings));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* editor = window->findChild<FileTabs*>()->currentEditor();
-    auto* tree = Child<QTreeWidget>(editor, "Settings");
+    const ShownSettings shown;
+    QTreeWidget* tree = shown.tree;
     QCOMPARE(tree->topLevelItemCount(), 1);
     QCOMPARE(tree->topLevelItem(0)->text(0), QString("Editor"));
     QCOMPARE(tree->topLevelItem(0)->child(0)->text(1), QString("Serif"));
-    QVERIFY(!Action(*window, "Save")->isEnabled());
+    QVERIFY(!Action(*shown.window, "Save")->isEnabled());
 
     // A value is changed with the keyboard.
-    tree->setFocus();
-    tree->setCurrentItem(tree->topLevelItem(0)->child(0), 1);
-    QTest::keyClick(tree, Qt::Key_F2);
-    QTRY_VERIFY(tree->findChild<QLineEdit*>());
-    QTest::keyClicks(tree->findChild<QLineEdit*>(), "Sans & Serif");
-    QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
-    QTRY_VERIFY(!tree->findChild<QLineEdit*>());
-    QTRY_VERIFY(editor->isModified());
-    QVERIFY(Action(*window, "Save")->isEnabled());
-    QVERIFY(window->findChild<FileTabs*>()->tabText(1).endsWith("*"));
+    TypeInto(tree, tree->topLevelItem(0)->child(0), 1, "Sans & Serif");
+    Enter(tree);
+    QTRY_VERIFY_WITH_TIMEOUT(shown.editor->isModified(), Patience);
+    QVERIFY(Action(*shown.window, "Save")->isEnabled());
+    QVERIFY(shown.window->findChild<FileTabs*>()->tabText(1).endsWith("*"));
 
     // A key is added and named; the name is corrected where the store could not write it.
-    QList<QPushButton*> buttons = editor->findChildren<QPushButton*>();
+    QList<QPushButton*> buttons = shown.editor->findChildren<QPushButton*>();
     const auto button = [&](QString const& text) {
         return *std::find_if(buttons.begin(), buttons.end(), [&](QPushButton* candidate) {
             return candidate->text().remove('&') == text;
         });
     };
     Click(button("Add Key"));
-    QTRY_VERIFY(tree->findChild<QLineEdit*>());
+    QTRY_VERIFY_WITH_TIMEOUT(tree->findChild<QLineEdit*>(), Patience);
     QTest::keyClicks(tree->findChild<QLineEdit*>(), "two words");
     QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
-    QTRY_COMPARE(tree->topLevelItem(0)->child(2)->text(0), QString("twowords"));
-    QTRY_VERIFY(!tree->findChild<QLineEdit*>());
+    QTRY_COMPARE_WITH_TIMEOUT(tree->topLevelItem(0)->child(2)->text(0), QString("twowords"),
+                              Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(!tree->findChild<QLineEdit*>(), Patience);
     tree->setCurrentItem(tree->topLevelItem(0)->child(1));
     Click(button("Remove"));
     Click(button("Add Section"));
-    QTRY_VERIFY(tree->findChild<QLineEdit*>());
+    QTRY_VERIFY_WITH_TIMEOUT(tree->findChild<QLineEdit*>(), Patience);
     QTest::keyClicks(tree->findChild<QLineEdit*>(), "1 is no name");
     QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
-    QTRY_VERIFY(!tree->findChild<QLineEdit*>());
+    QTRY_VERIFY_WITH_TIMEOUT(!tree->findChild<QLineEdit*>(), Patience);
     QCOMPARE(tree->topLevelItem(1)->text(0), QString("Section"));
 
-    QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
-    QVERIFY(!editor->isModified());
-    QCOMPARE(TestFiles::read(file),
+    QTest::keyClick(shown.window.get(), Qt::Key_S, Qt::ControlModifier);
+    QVERIFY(!shown.editor->isModified());
+    QCOMPARE(TestFiles::read(shown.file),
              QByteArray("<VelocorSettings>\n<Editor>\n<font><![CDATA[Sans & Serif]]></font>\n"
                         "<twowords>value</twowords>\n</Editor>\n<Section>\n</Section>\n"
                         "</VelocorSettings>\n"));
-    QCOMPARE(TestFiles::read(file + ".bak"), Settings);
+    QCOMPARE(TestFiles::read(shown.file + ".bak"), Settings);
 
     // Only the first save keeps a copy.
     tree->topLevelItem(0)->child(0)->setText(1, "again");
-    QVERIFY(editor->Save());
-    QCOMPARE(TestFiles::read(file + ".bak"), Settings);
+    QVERIFY(shown.editor->Save());
+    QCOMPARE(TestFiles::read(shown.file + ".bak"), Settings);
 }
-
-namespace {
-
-// Types a text over that of a cell, without ending the editing.
-void TypeInto(QTreeWidget* tree, QTreeWidgetItem* item, int column, QString const& text)
-{
-    tree->setFocus();
-    tree->setCurrentItem(item, column);
-    QTest::keyClick(tree, Qt::Key_F2);
-    QTRY_VERIFY(tree->findChild<QLineEdit*>());
-    QTest::keyClicks(tree->findChild<QLineEdit*>(), text);
-}
-
-void Enter(QTreeWidget* tree)
-{
-    QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
-    QTRY_VERIFY(!tree->findChild<QLineEdit*>());
-}
-
-} // namespace
 
 void tst_SettingsInWindow::rejectedNameKeepsTheOld_data()
 {
@@ -177,14 +130,10 @@ void tst_SettingsInWindow::rejectedNameKeepsTheOld()
     QFETCH(bool, isSection);
     QFETCH(QString, typed);
     QFETCH(QString, told);
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
     const QByteArray content =
         QByteArray(Settings).replace("</V", "<Other>\n<k>v</k>\n</Other>\n</V");
-    QVERIFY(TestFiles::write(file, content));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    const ShownSettings shown(content);
+    QTreeWidget* tree = shown.tree;
     QTreeWidgetItem* section = tree->topLevelItem(0);
     QTreeWidgetItem* item = isSection ? section : section->child(0);
     const QString old = item->text(0);
@@ -192,41 +141,33 @@ void tst_SettingsInWindow::rejectedNameKeepsTheOld()
     TypeInto(tree, item, 0, typed);
     Enter(tree);
     QCOMPARE(item->text(0), old);
-    const QString status = window->statusBar()->currentMessage();
+    const QString status = Status(*shown.window);
     QVERIFY2(status.startsWith(told), qPrintable(status));
 
     // A valid name is still taken afterwards.
     TypeInto(tree, item, 0, "valid");
     Enter(tree);
     QCOMPARE(item->text(0), QString("valid"));
-    QTest::keyClick(window.get(), Qt::Key_S, Qt::ControlModifier);
-    QCOMPARE(TestFiles::read(file), QByteArray(content).replace(old.toLatin1(), "valid"));
+    QTest::keyClick(shown.window.get(), Qt::Key_S, Qt::ControlModifier);
+    QCOMPARE(TestFiles::read(shown.file), QByteArray(content).replace(old.toLatin1(), "valid"));
 }
 
 void tst_SettingsInWindow::rejectedNameChangesNothing()
 {
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, Settings));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    const ShownSettings shown;
+    QTreeWidget* tree = shown.tree;
     TypeInto(tree, tree->topLevelItem(0), 0, "C++");
     Enter(tree);
-    QVERIFY(!window->findChild<FileTabs*>()->currentEditor()->isModified());
-    QVERIFY(!Action(*window, "Save")->isEnabled());
+    QVERIFY(!shown.editor->isModified());
+    QVERIFY(!Action(*shown.window, "Save")->isEnabled());
 }
 
 // The store reads names that it cannot write.
 void tst_SettingsInWindow::valueOfAnUnusualNameIsEdited()
 {
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, QByteArray(Settings).replace("font", "gr\xC3\xB6\xC3\x9F"
-                                                                        "e")));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    const ShownSettings shown(QByteArray(Settings).replace("font", "gr\xC3\xB6\xC3\x9F"
+                                                                   "e"));
+    QTreeWidget* tree = shown.tree;
     QTreeWidgetItem* item = tree->topLevelItem(0)->child(0);
     TypeInto(tree, item, 1, "12");
     Enter(tree);
@@ -237,54 +178,41 @@ void tst_SettingsInWindow::valueOfAnUnusualNameIsEdited()
 
 void tst_SettingsInWindow::savesWhatIsBeingTyped()
 {
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, Settings));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* editor = window->findChild<FileTabs*>()->currentEditor();
-    auto* tree = Child<QTreeWidget>(editor, "Settings");
+    const ShownSettings shown;
+    QTreeWidget* tree = shown.tree;
     for (char const* typed : {"Sans", "Mono"}) { // the second time after a save
         TypeInto(tree, tree->topLevelItem(0)->child(0), 1, typed);
         QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_S, Qt::ControlModifier);
-        QCOMPARE(TestFiles::read(file), QByteArray(Settings).replace("Serif", typed));
-        QVERIFY(!editor->isModified());
-        QTRY_VERIFY(!Action(*window, "Save")->isEnabled());
-        QTRY_VERIFY(!tree->findChild<QLineEdit*>());
+        QCOMPARE(TestFiles::read(shown.file), QByteArray(Settings).replace("Serif", typed));
+        QVERIFY(!shown.editor->isModified());
+        QTRY_VERIFY_WITH_TIMEOUT(!Action(*shown.window, "Save")->isEnabled(), Patience);
+        QTRY_VERIFY_WITH_TIMEOUT(!tree->findChild<QLineEdit*>(), Patience);
     }
 }
 
 void tst_SettingsInWindow::escapeLeavesNothingToSave()
 {
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, Settings));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    const ShownSettings shown;
+    QTreeWidget* tree = shown.tree;
     TypeInto(tree, tree->topLevelItem(0)->child(0), 1, "Sans");
-    QVERIFY(Action(*window, "Save")->isEnabled());
+    QVERIFY(Action(*shown.window, "Save")->isEnabled());
     QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Escape);
-    QTRY_VERIFY(!Action(*window, "Save")->isEnabled());
+    QTRY_VERIFY_WITH_TIMEOUT(!Action(*shown.window, "Save")->isEnabled(), Patience);
     QCOMPARE(tree->topLevelItem(0)->child(0)->text(1), QString("Serif"));
-    QCOMPARE(TestFiles::read(file), Settings);
+    QCOMPARE(TestFiles::read(shown.file), Settings);
 }
 
 void tst_SettingsInWindow::sizeOfALongValueIsVisible()
 {
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(
-        file, QByteArray(Settings).replace("Serif", QByteArray("word ").repeated(5000))));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* tree = Child<QTreeWidget>(window.get(), "Settings");
+    const ShownSettings shown(
+        QByteArray(Settings).replace("Serif", QByteArray("word ").repeated(5000)));
+    QTreeWidget* tree = shown.tree;
     QTreeWidgetItem const* item = tree->topLevelItem(0)->child(0);
     const int width = tree->visualItemRect(item).width() - tree->columnWidth(0);
     QVERIFY(width > 50 && width < tree->fontMetrics().boundingRect(item->text(1)).width());
-    const QString shown =
+    const QString text =
         tree->fontMetrics().elidedText(item->text(1), tree->textElideMode(), width);
-    QVERIFY2(shown.endsWith("(25 kB)"), qPrintable(shown));
+    QVERIFY2(text.endsWith("(25 kB)"), qPrintable(text));
 }
 
 void tst_SettingsInWindow::statusTextsHaveRoom()
@@ -298,15 +226,16 @@ void tst_SettingsInWindow::statusTextsHaveRoom()
     window->resize(700, 500);
     window->OpenFile(file);
     auto const* summary = static_cast<ElidedLabel*>(Child<QLabel>(window.get(), "Lines shown"));
-    QTRY_COMPARE(summary->text(), file);
-    QTRY_VERIFY2(summary->ShownText().endsWith("/some.cfg"), qPrintable(summary->ShownText()));
+    QTRY_COMPARE_WITH_TIMEOUT(summary->text(), file, Patience);
+    QTRY_VERIFY2_WITH_TIMEOUT(summary->ShownText().endsWith("/some.cfg"),
+                              qPrintable(summary->ShownText()), Patience);
     QVERIFY(summary->width() <= window->width());
 
     // A message has the whole width.
     auto* tree = Child<QTreeWidget>(window.get(), "Settings");
     TypeInto(tree, tree->topLevelItem(0), 0, "C++");
     Enter(tree);
-    QVERIFY(!window->statusBar()->currentMessage().isEmpty());
+    QVERIFY(!Status(*window).isEmpty());
     QVERIFY(!summary->isVisible());
     window->statusBar()->clearMessage();
     QVERIFY(summary->isVisible());
@@ -356,24 +285,19 @@ void tst_SettingsInWindow::losesKnowingly()
 
 void tst_SettingsInWindow::brokenSettings()
 {
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
     const QByteArray broken = QByteArray(Settings).replace("</font>", "</fnt>");
-    QVERIFY(TestFiles::write(file, broken));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* editor = window->findChild<FileTabs*>()->currentEditor();
-    const QString told = editor->findChild<NoticeBar*>()->text();
+    const ShownSettings shown(broken);
+    const QString told = shown.editor->findChild<NoticeBar*>()->text();
     QVERIFY2(told.contains("tag mismatch") && told.contains("line 3, column"), qPrintable(told));
-    auto const* text = Child<QPlainTextEdit>(editor, "File text");
+    auto const* text = Child<QPlainTextEdit>(shown.editor, "File text");
     QVERIFY(text->isVisible() && text->isReadOnly());
     QCOMPARE(text->toPlainText(), QString(broken));
     QCOMPARE(text->textCursor().blockNumber(), 2);
-    QVERIFY(!editor->Save());
-    QVERIFY(!Action(*window, "Save")->isEnabled());
-    QCOMPARE(TestFiles::read(file), broken);
-    window->close();
-    QCOMPARE(TestFiles::read(file), broken);
+    QVERIFY(!shown.editor->Save());
+    QVERIFY(!Action(*shown.window, "Save")->isEnabled());
+    QCOMPARE(TestFiles::read(shown.file), broken);
+    shown.window->close();
+    QCOMPARE(TestFiles::read(shown.file), broken);
 }
 
 void tst_SettingsInWindow::saveFails()
@@ -434,42 +358,29 @@ void tst_SettingsInWindow::askedBeforeClosing()
     QFETCH(int, answer);
     QFETCH(bool, closes);
     QFETCH(bool, saves);
-    const WindowTest test;
-    const QString file = test.folder() + "some.cfg";
-    QVERIFY(TestFiles::write(file, Settings));
-    const auto window = WindowTest::show();
-    window->OpenFile(file);
-    auto* editor = window->findChild<FileTabs*>()->currentEditor();
-    Child<QTreeWidget>(editor, "Settings")->topLevelItem(0)->child(0)->setText(1, "new");
+    const ShownSettings shown;
+    shown.tree->topLevelItem(0)->child(0)->setText(1, "new");
     WindowTest::whenShown<QMessageBox>([&](QMessageBox* box) {
         Click(box->button(static_cast<QMessageBox::StandardButton>(answer)));
     });
-    QCOMPARE(window->close(), closes);
-    QCOMPARE(TestFiles::read(file).contains("<font>new</font>"), saves);
+    QCOMPARE(shown.window->close(), closes);
+    QCOMPARE(TestFiles::read(shown.file).contains("<font>new</font>"), saves);
 }
 
 // Text typed into a cell is kept even without the Enter key.
 void tst_SettingsInWindow::closesWhileEditing()
 {
     for (bool close : {true, false}) {
-        const WindowTest test;
-        const QString file = test.folder() + "some.cfg";
-        QVERIFY(TestFiles::write(file, Settings));
-        auto window = WindowTest::show();
-        window->OpenFile(file);
-        auto* tree = Child<QTreeWidget>(window.get(), "Settings");
-        tree->setFocus();
-        tree->setCurrentItem(tree->topLevelItem(0)->child(0), 1);
-        QTest::keyClick(tree, Qt::Key_F2);
-        QTRY_VERIFY(tree->findChild<QLineEdit*>());
-        QTest::keyClicks(tree->findChild<QLineEdit*>(), "typed");
+        ShownSettings shown;
+        QTreeWidget* tree = shown.tree;
+        TypeInto(tree, tree->topLevelItem(0)->child(0), 1, "typed");
         if (close) {
             WindowTest::whenShown<QMessageBox>(
                 [&](QMessageBox* box) { Click(box->button(QMessageBox::Save)); });
-            QVERIFY(window->close());
-            QVERIFY(TestFiles::read(file).contains("typed"));
+            QVERIFY(shown.window->close());
+            QVERIFY(TestFiles::read(shown.file).contains("typed"));
         }
-        window.reset(); // even without having been closed
+        shown.window.reset(); // even without having been closed
         QCoreApplication::processEvents();
     }
 }

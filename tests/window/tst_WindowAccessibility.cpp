@@ -4,6 +4,7 @@
 // The window on a real screen, driven with keys and mouse.
 
 #include "WindowParts.h"
+#include "WindowTestCase.h"
 
 #include "app/UserMessages.h"
 #include "app/window/ReportDialog.h"
@@ -13,11 +14,9 @@
 #include "app/window/log/NoteDialog.h"
 
 #include <QAbstractButton>
-#include <QClipboard>
 #include <QComboBox>
 #include <QLabel>
 #include <QLineEdit>
-#include <QLoggingCategory>
 #include <QMenuBar>
 #include <QMessageBox>
 #include <QScreen>
@@ -75,14 +74,11 @@ QStringList NamelessControls(QWidget* window)
 
 } // namespace
 
-class tst_WindowAccessibility : public QObject
+class tst_WindowAccessibility : public WindowTestCase
 {
     Q_OBJECT
 
 private slots:
-    void initTestCase();
-    void cleanup();
-
     void messageBoxesAreSelectable();
 
     void names();
@@ -91,21 +87,6 @@ private slots:
     void menusByKeyboard();
     void tabOrder();
 };
-
-void tst_WindowAccessibility::initTestCase()
-{
-    // The X11 plug-in warns when a window disappears while it is being queried, which would end up
-    // in a test's log. The environment would be too late: it was read with the application object.
-    QLoggingCategory::setFilterRules("qt.qpa.*=false");
-}
-
-void tst_WindowAccessibility::cleanup()
-{
-    const QWidgetList windows = QApplication::topLevelWidgets();
-    for (QWidget* window : windows)
-        window->hide();
-    QGuiApplication::clipboard()->clear();
-}
 
 void tst_WindowAccessibility::messageBoxesAreSelectable()
 {

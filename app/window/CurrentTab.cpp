@@ -1,0 +1,68 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/CurrentTab.h"
+
+#include "app/window/ApplicationProperty.h"
+#include "app/window/FileTabs.h"
+#include "app/window/MainMenus.h"
+#include "app/window/log/LogPanel.h"
+#include "app/window/settings/SettingsEditor.h"
+#include "app/window/widgets/ElidedLabel.h"
+#include "app/window/widgets/PlainText.h"
+
+#include <QActionGroup>
+#include <QFileInfo>
+
+namespace Velocor {
+
+CurrentTab::CurrentTab(FileTabs* tabs, MenuActions const& actions, ElidedLabel* summary,
+                       QWidget* window)
+    : m_tabs(tabs), m_actions(actions), m_summary(summary), m_window(window)
+{
+    connect(m_tabs, &FileTabs::stateChanged, this, &CurrentTab::Update);
+}
+
+void CurrentTab::Update()
+{
+    updateTitle();
+    LogPanel const* log = m_tabs->currentLog();
+    SettingsEditor const* editor = m_tabs->currentEditor();
+    for (QAction* action : m_actions.ofLogs)
+        action->setEnabled(log != nullptr);
+    m_actions.save->setEnabled(editor && editor->CanSave());
+    m_actions.close->setEnabled(m_tabs->currentWidget() != m_tabs->ownLog());
+    const QString path = FileTabs::PathOf(m_tabs->currentWidget());
+    m_summary->setText(log ? log->summary() : path);
+    m_summary->setToolTip(PlainToolTip(log ? QString() : path));
+    if (log)
+        updateSwitches(log);
+}
+
+void CurrentTab::updateTitle()
+{
+    const QString caption = ApplicationProperty("caption");
+    QWidget const* page = m_tabs->currentWidget();
+    if (page == m_tabs->ownLog()) {
+        m_window->setWindowTitle(caption);
+        return;
+    }
+    QString name = QFileInfo(FileTabs::PathOf(page)).fileName();
+    if (m_tabs->currentEditor() && m_tabs->currentEditor()->isModified())
+        name += QLatin1String(" *");
+    // Qt replaces the placeholder, and a file may be called like it.
+    name.replace(QLatin1String("[*]"), QLatin1String("[*][*]"));
+    m_window->setWindowTitle(tr("%1 \u2013 %2").arg(name, caption));
+}
+
+void CurrentTab::updateSwitches(LogPanel const* log)
+{
+    m_actions.pause->setChecked(log->isPaused());
+    m_actions.follow->setChecked(log->isFollowing());
+    m_actions.earlierRuns->setChecked(log->showsEarlierRuns());
+    const QList<QAction*> encodings = m_actions.encodings->actions();
+    for (QAction* action : encodings)
+        action->setChecked(action->data().toInt() == log->chosenEncoding().kind());
+}
+
+} // namespace Velocor

@@ -1,0 +1,73 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/WindowDialogs.h"
+
+#include "app/runninglog/RunningLog.h"
+#include "app/window/Manual.h"
+#include "app/window/PlacesPanel.h"
+#include "app/window/ReportDialog.h"
+#include "app/window/ShortcutList.h"
+#include "app/window/SystemReport.h"
+#include "app/window/log/LogSettingsDialog.h"
+
+#include <QMainWindow>
+
+namespace Velocor {
+
+WindowDialogs::WindowDialogs(QString const& settingsFile, QMainWindow* window)
+    : m_settingsFile(settingsFile), m_window(window)
+{}
+
+void WindowDialogs::ShowAbout()
+{
+    ReportDialog dialog(tr("About %1").arg(QStringLiteral("Velocor")),
+                        QStringLiteral("Velocor %1\n").arg(QLatin1String(VELOCOR_VERSION)) +
+                            tr("The startup program of the Tork family. MIT license."),
+                        SystemReport::Licenses() + SystemReport::Facts(m_settingsFile), false,
+                        m_window);
+    dialog.exec();
+}
+
+void WindowDialogs::ShowShortcuts()
+{
+    ReportDialog dialog(tr("Keyboard Shortcuts"),
+                        tr("Alt and the underlined letter open a menu; Tab goes from one control "
+                           "to the next."),
+                        ShortcutList(m_window), false, m_window);
+    dialog.exec();
+}
+
+void WindowDialogs::ShowManual()
+{
+    if (!OpenManual())
+        Q_EMIT messageReported(
+            tr("The manual is not installed, or there is no program to show it"));
+}
+
+void WindowDialogs::SaveReport()
+{
+    ReportDialog dialog(tr("Save Report"),
+                        tr("This is the content of the report. Review it before you share it: "
+                           "the log may contain private information."),
+                        SystemReport::Whole(m_settingsFile), true, m_window);
+    dialog.exec();
+}
+
+void WindowDialogs::ChangeLogSettings()
+{
+    LogSettingsDialog dialog(m_window);
+    if (dialog.exec() != QDialog::Accepted)
+        return;
+    Q_EMIT messageReported(tr("Log settings saved"));
+    Q_EMIT logSettingsChanged();
+}
+
+void WindowDialogs::OpenLogFolder()
+{
+    if (!PlacesPanel::OpenPlace(RunningLog::FileName()))
+        Q_EMIT messageReported(
+            tr("Cannot open the log folder: it does not exist, or there is no file manager"));
+}
+
+} // namespace Velocor
