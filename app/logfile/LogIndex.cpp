@@ -430,6 +430,16 @@ void LogIndex::addRun(size_t number, LogFilter const& filter, LogRows& rows) con
     }
 }
 
+LogCounts LogIndex::counts() const
+{
+    LogCounts counts{};
+    for (quint8 mark : m_marks) {
+        if (!(mark & LogRows::Continued))
+            ++counts[SeverityOf(mark)];
+    }
+    return counts;
+}
+
 LogRows LogIndex::Rows(LogFilter const& filter) const
 {
     LogRows rows;

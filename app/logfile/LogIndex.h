@@ -80,6 +80,10 @@ public:
     /// The number of lines in the file.
     size_t size() const { return m_starts.size(); }
 
+    /// The numbers of entries in the file. None stands for entries without a severity and for other
+    /// lines that do not continue an entry; see LogRows::Continued.
+    LogCounts counts() const;
+
     /// Whether the file was seen growing at its end, so that all of its lines are of one run.
     bool isOneRun() const { return m_isOneRun; }
 

@@ -359,13 +359,16 @@ void LogScanner::report(bool isPartial)
     update.isReset = m_isReset;
     if (!m_isReset)
         update.Compare(*m_rows);
+    update.counts = m_index.counts();
     const bool nothingNew = !update.isReset && update.removed == 0 && update.inserted == 0 &&
                             update.changedTail == 0 && update.rows->size() == m_rows->size() &&
-                            m_index.size() == m_lines && m_isPartial == isPartial;
+                            m_index.size() == m_lines && update.counts == m_counts &&
+                            m_isPartial == isPartial;
     m_isReset = false;
     m_isPartial = isPartial;
     m_rows = update.rows;
     m_lines = m_index.size();
+    m_counts = update.counts;
     update.exists = m_exists;
     update.error = m_error;
     update.lines = m_lines;

@@ -134,6 +134,7 @@ private:
     qint64 m_anchorEnd = 0;
     QByteArray m_tail;
     size_t m_lines = 0; // as reported
+    LogCounts m_counts{};
 };
 
 } // namespace Velocor

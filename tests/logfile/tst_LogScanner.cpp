@@ -160,6 +160,7 @@ private slots:
     void obsoleteFilter_data();
     void obsoleteFilter();
     void sameTextReadsNothing();
+    void countsOfHiddenEntries();
     void obsoleteFilterOfAMissingFile();
 
 private:
@@ -885,6 +886,27 @@ void tst_LogScanner::sameTextReadsNothing()
     QCOMPARE(reader.updates.size(), 2);
     QVERIFY(reader.updates.last().exists);
     QCOMPARE(reader.updates.last().rows->size(), size_t(1));
+}
+
+// The last line becomes an entry of another severity, which is hidden.
+void tst_LogScanner::countsOfHiddenEntries()
+{
+    const QByteArray first = run(3, QTime(8, 0), "of the log's own");
+    const QByteArray error = entry("09:00:00.000", "Error", "a");
+    QVERIFY(TestFiles::write(m_file, first + error.left(error.indexOf("Error")) + "Fatal"));
+    LogFilter filter;
+    filter.SetSeverity(LogEntry::Error, false);
+    filter.SetSeverity(LogEntry::Fatal, false);
+    Reader reader(m_file);
+    reader.Open(1, filter);
+    QCOMPARE(reader.updates.last().counts[LogEntry::Fatal], size_t(1));
+    QVERIFY(TestFiles::write(m_file, first + error));
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 2);
+    QVERIFY(!reader.updates.last().isReset);
+    QCOMPARE(reader.updates.last().rows->size(), size_t(3));
+    QCOMPARE(reader.updates.last().counts[LogEntry::Fatal], size_t(0));
+    QCOMPARE(reader.updates.last().counts[LogEntry::Error], size_t(1));
 }
 
 void tst_LogScanner::obsoleteFilterOfAMissingFile()

@@ -159,10 +159,17 @@ public:
             run.afterTimed = run.rows.size();
             ++run.timed;
         }
+        for (Run const& run : runs) {
+            for (Row const& row : run.rows) {
+                if (!(row.mark & LogRows::Continued))
+                    ++counts[row.mark & LogRows::SeverityMask];
+            }
+        }
         collect(filter);
     }
 
     LogRows rows;
+    LogCounts counts{};
     size_t lineCount = 0;
     bool hasElapsed = false;
     Entries older; // the entries with a time after the newest run
@@ -272,6 +279,14 @@ QString Text(LogRows const& rows)
         texts.append(QString("%1:%2").arg(rows.starts[i]).arg(uint(rows.marks[i]), 0, 16));
     return QString("%1 earlier, %2 problems: ").arg(rows.earlier).arg(rows.problems) +
            texts.join(' ');
+}
+
+QString Text(LogCounts const& counts)
+{
+    QStringList texts;
+    for (size_t count : counts)
+        texts.append(QString::number(count));
+    return texts.join(' ');
 }
 
 bool IsSame(LogRows const& left, LogRows const& right)
@@ -488,6 +503,7 @@ private:
         if (!IsSame(rows, plain.rows))
             same("rows", Text(rows), Text(plain.rows));
         same("lines", m_index.size(), plain.lineCount);
+        same("counts", Text(m_index.counts()), Text(plain.counts));
         same("elapsed", m_index.hasElapsed() || !plain.hasElapsed, true);
     }
 
@@ -598,6 +614,7 @@ private:
         same("exists", m_update.exists, m_exists);
         same("error", m_update.error, QString());
         same("lines", m_update.lines, plain.lineCount);
+        same("counts", Text(m_update.counts), Text(plain.counts));
     }
 
     // What a view makes of an update.
