@@ -354,7 +354,8 @@ void LogScanner::report(bool isPartial)
 {
     LogUpdate update;
     update.request = m_request;
-    update.rows = std::make_shared<LogRows>(m_index.Rows(m_filter));
+    update.rows = std::make_shared<LogRows>(m_isReset ? m_index.Rows(m_filter)
+                                                      : m_index.Rows(m_filter, *m_rows));
     update.isPartial = isPartial;
     update.isReset = m_isReset;
     if (!m_isReset)

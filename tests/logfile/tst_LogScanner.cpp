@@ -65,8 +65,9 @@ public:
     {
         QStringList rows;
         const QByteArray file = TestFiles::read(m_path);
-        for (qint64 start : updates.last().rows->starts) {
-            const int at = static_cast<int>(start);
+        LogRows const& all = *updates.last().rows;
+        for (size_t row = 0; row < all.size(); ++row) {
+            const int at = static_cast<int>(all.start(row));
             rows.append(at < 0 ? QString("[heading]")
                                : QString(file.mid(at, file.indexOf('\n', at) - at)));
         }

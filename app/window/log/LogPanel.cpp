@@ -299,8 +299,9 @@ QVector<qint64> LogPanel::LineStarts() const
 {
     QVector<qint64> starts;
     starts.reserve(m_model->rowCount());
+    LogRows::Reader reader(*m_model->state().rows);
     for (int row = 0; row < m_model->rowCount(); ++row) {
-        const qint64 start = m_model->LineStart(row);
+        const qint64 start = reader.start(static_cast<size_t>(row));
         if (start >= 0) // not a heading
             starts.append(start);
     }

@@ -29,12 +29,12 @@ QString LogStateText::Summary(LogModel const& model, int percent)
     const QLocale locale;
     const auto lines = static_cast<qlonglong>(state.lines);
     qlonglong shown = model.rowCount();
-    if (state.rows->earlier > 0)
+    if (state.rows->earlier() > 0)
         shown -= 2; // headings
     const QString all = lines == 1 ? StateText::tr("1 line")
                                    : StateText::tr("%1 lines").arg(locale.toString(lines));
     QString text = shown < lines ? StateText::tr("%1 of %2").arg(locale.toString(shown), all) : all;
-    const auto problems = static_cast<qlonglong>(state.rows->problems);
+    const auto problems = static_cast<qlonglong>(state.rows->problems());
     text +=
         separator + (problems == 1 ? StateText::tr("1 problem")
                                    : StateText::tr("%1 problems").arg(locale.toString(problems)));
