@@ -482,16 +482,6 @@ size_t LogIndex::countProblems() const
     return problems;
 }
 
-LogCounts LogIndex::counts() const
-{
-    LogCounts counts{};
-    for (quint8 mark : m_marks) {
-        if (!(mark & LogRows::Continued))
-            ++counts[SeverityOf(mark)];
-    }
-    return counts;
-}
-
 LogRows LogIndex::Rows(LogFilter const& filter) const
 {
     LogRows rows(m_lines, endOfRun(0), completeOffset(), m_position);

@@ -92,10 +92,6 @@ public:
     /// lines that do not continue an entry; see LogRows::Continued.
     LogCounts const& counts() const { return m_counts; }
 
-    /// The numbers of entries in the file. None stands for entries without a severity and for other
-    /// lines that do not continue an entry; see LogRows::Continued.
-    LogCounts counts() const;
-
     /// Whether the file was seen growing at its end, so that all of its lines are of one run.
     bool isOneRun() const { return m_isOneRun; }
 

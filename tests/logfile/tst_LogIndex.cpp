@@ -472,37 +472,6 @@ void tst_LogIndex::counts()
     QCOMPARE(found.join(' '), counts);
 }
 
-void tst_LogIndex::counts_data()
-{
-    QTest::addColumn<QByteArray>("file");
-    QTest::addColumn<QString>("counts"); // from Trace to Fatal, and None
-
-    const auto row = [](char const* name, QByteArray const& file, char const* counts) {
-        QTest::newRow(name) << file << QString(counts);
-    };
-    const QByteArray error = entry("09:00:00.000", "Error", "a");
-    row("an empty file", "", "0 0 0 0 0 0");
-    row("each severity", run(20, QTime(9, 0), "x") + error, "16 0 3 2 0 0");
-    row("continued lines are not counted", error + "more\nand more\n", "0 0 0 1 0 0");
-    row("a line before any entry", "what\n" + error, "0 0 0 1 0 1");
-    row("an entry without a severity", entry("09:00:00.000", "", "?"), "0 0 0 0 0 1");
-    row("an entry without a line end", error + error.trimmed(), "0 0 0 2 0 0");
-    row("earlier runs, and a torn line",
-        error + "n entry\n" + entry("06:00:00.000", "Fatal", "b") + "more\n", "0 0 0 1 1 1");
-}
-
-void tst_LogIndex::counts()
-{
-    QFETCH(QByteArray, file);
-    QFETCH(QString, counts);
-    LogIndex index;
-    Pass(index, file, 4096);
-    QStringList found;
-    for (size_t count : index.counts())
-        found.append(QString::number(count));
-    QCOMPARE(found.join(' '), counts);
-}
-
 void tst_LogIndex::passesOverAWritingRun_data()
 {
     QTest::addColumn<unsigned>("seed");

@@ -45,15 +45,10 @@ void LogView::setUp()
     setSelectionBehavior(SelectRows);
     setSelectionMode(ExtendedSelection);
     setEditTriggers(NoEditTriggers);
-    setShowGrid(false);
     setWordWrap(false);
     setTabKeyNavigation(false);
-    setVerticalScrollMode(ScrollPerItem);
-    setHorizontalScrollMode(ScrollPerPixel);
     setTextElideMode(Qt::ElideRight);
     setAlternatingRowColors(true);
-    verticalHeader()->hide();
-    verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
     horizontalHeader()->setStretchLastSection(true);
     horizontalHeader()->setHighlightSections(false);
     horizontalHeader()->setSectionsMovable(false);
@@ -67,8 +62,7 @@ void LogView::setUp()
 
 void LogView::setRowHeight()
 {
-    verticalHeader()->setMinimumSectionSize(1);
-    verticalHeader()->setDefaultSectionSize(RowHeight(fontMetrics()));
+    SetRowHeight(RowHeight(fontMetrics()));
 }
 
 void LogView::SetDefaultWidths()
@@ -90,8 +84,8 @@ void LogView::changeEvent(QEvent* event)
     WrappingTable::changeEvent(event);
     if (event->type() != QEvent::FontChange && event->type() != QEvent::StyleChange)
         return;
+    forgetHeights();
     setRowHeight();
-    restartWrapping();
     if (m_following)
         goToEnd();
 }
@@ -109,7 +103,7 @@ void LogView::resizeEvent(QResizeEvent* event)
 void LogView::focusInEvent(QFocusEvent* event)
 {
     const bool hadCurrent = currentIndex().isValid();
-    QTableView::focusInEvent(event);
+    WrappingTable::focusInEvent(event);
     if (!hadCurrent)
         selectionModel()->clearCurrentIndex();
 }
@@ -139,22 +133,22 @@ void LogView::SetFollowing(bool following)
 void LogView::goToEnd()
 {
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
-    updateScrollBars();
+    updateGeometries(); // updates the scroll bar's range
     scrollToBottom();
 }
 
-// Rows that come into view may be higher, so that the end of the table moves.
 void LogView::noteScrolled(int value)
 {
-    const bool isEnd = value == verticalScrollBar()->maximum();
-    measureRows();
     if (!m_scrollingItself && m_model->rowCount() > 0)
-        SetFollowing(isEnd);
+        SetFollowing(value == verticalScrollBar()->maximum());
 }
 
 void LogView::SetLineWrap(bool wrapped)
 {
-    setWrapped(wrapped);
+    {
+        const QScopedValueRollback<bool> guard(m_scrollingItself, true);
+        setWrapped(wrapped);
+    }
     if (m_following)
         goToEnd();
     else if (currentIndex().isValid())
@@ -165,7 +159,7 @@ void LogView::SetLineWrap(bool wrapped)
 void LogView::rowsInserted(QModelIndex const& parent, int first, int last)
 {
     const bool above = !m_following && first < rowAt(0);
-    QTableView::rowsInserted(parent, first, last);
+    WrappingTable::rowsInserted(parent, first, last);
     if (!above)
         return;
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
@@ -176,7 +170,7 @@ void LogView::rowsInserted(QModelIndex const& parent, int first, int last)
 void LogView::rowsAboutToBeRemoved(QModelIndex const& parent, int first, int last)
 {
     const int top = rowAt(0);
-    QTableView::rowsAboutToBeRemoved(parent, first, last);
+    WrappingTable::rowsAboutToBeRemoved(parent, first, last);
     if (m_following || first >= top)
         return;
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
@@ -192,9 +186,10 @@ void LogView::afterRefresh()
     setColumnHidden(LogModel::SeverityColumn, !state.hasSeverities && state.lines > 0);
     setColumnHidden(LogModel::ElapsedColumn, !state.hasElapsed);
     fitTimes();
-    updateHeadings();
     m_ticks->SetRowCount(m_model->rowCount());
-    measureChangedRows();
+    forgetHeights();
+    if (isWrapped())
+        updateGeometries(); // a last line may have got longer
     restoreCurrent();
     if (m_following)
         goToEnd();
@@ -234,7 +229,7 @@ void LogView::restoreCurrent()
     updateGeometries(); // updates the scroll bar's range
     verticalScrollBar()->setValue(row - m_keptDistance);
     if (isWrapped())
-        scrollTo(index); // the rows above it may have become higher
+        scrollTo(index); // the rows above it may be higher than before
 }
 
 // Other programs' stamps may be longer than the log's own. Once for a file, or users could not make
@@ -249,18 +244,11 @@ void LogView::fitTimes()
     setColumnWidth(LogModel::TimeColumn, std::max(columnWidth(LogModel::TimeColumn), width));
 }
 
-// A heading spans all columns.
-void LogView::updateHeadings()
+// The headings.
+bool LogView::isSpanning(int row) const
 {
     const int earlier = static_cast<int>(m_model->state().rows->earlier());
-    if (earlier == m_earlierRows)
-        return;
-    clearSpans();
-    m_earlierRows = earlier;
-    if (earlier == 0)
-        return;
-    setSpan(0, 0, 1, LogModel::ColumnCount);
-    setSpan(earlier, 0, 1, LogModel::ColumnCount);
+    return earlier > 0 && (row == 0 || row == earlier);
 }
 
 int LogView::StartRow(int step) const
@@ -348,7 +336,7 @@ void LogView::UpdateMarks()
 
 void LogView::paintEvent(QPaintEvent* event)
 {
-    QTableView::paintEvent(event);
+    WrappingTable::paintEvent(event);
     if (m_placeholder.isEmpty() || m_model->rowCount() > 0)
         return;
     QPainter painter(viewport());

@@ -87,6 +87,7 @@ Q_SIGNALS:
     void menuRequested(QPoint const& position, QModelIndex const& cell);
 
 protected:
+    bool isSpanning(int row) const override;
     void paintEvent(QPaintEvent* event) override;
     void contextMenuEvent(QContextMenuEvent* event) override;
     void changeEvent(QEvent* event) override;
@@ -106,14 +107,13 @@ private:
     int firstColumn() const;
     void setRowHeight();
     void fitTimes();
-    void updateHeadings();
 
     LogModel* m_model;
     TickScrollBar* m_ticks;
     QString m_placeholder;
     QString m_fittedPath;
     bool m_following = true;
-    int m_earlierRows = -1;
+    bool m_scrollingItself = false;
 
     // The current line and its distance from the top, while the rows are replaced.
     QString m_keptPath;

@@ -3,49 +3,59 @@
 
 #pragma once
 
-#include "app/window/log/WrappedRows.h"
+#include "app/window/widgets/UniformTable.h"
 
-#include <QTableView>
+#include <unordered_map>
 
 namespace Velocor {
 
-/// A table that scrolls by rows, whose messages may be wrapped. GUI thread.
-class WrappingTable : public QTableView
+class LogDelegate;
+
+/// A table of a log whose messages may be wrapped, so that rows differ in height.
+///
+/// It still scrolls by rows. Only rows near those in view, and the last ones, which tell how far
+/// the table can scroll, are measured: millions of them would take minutes. GUI thread.
+class WrappingTable : public UniformTable
 {
     Q_OBJECT
 
 public:
-    /// @param delegate  draws the cells; must be destroyed with or after the table
+    /// @param delegate  draws the cells; owned by the table
     explicit WrappingTable(LogDelegate* delegate, QWidget* parent = nullptr);
 
-    bool isWrapped() const { return m_wrapped.isOn(); }
+    bool isWrapped() const { return m_isWrapped; }
 
-    void scrollTo(QModelIndex const& index, ScrollHint hint = EnsureVisible) override;
+    /// How many rows have been measured since the rows, their width or their font have changed.
+    int measuredRows() const { return static_cast<int>(m_heights.size()); }
+
+    /// The maximum number of lines that a message is wrapped to.
+    static constexpr int MaximumLines = 12;
 
 protected:
-    QModelIndex moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) override;
-    void resizeEvent(QResizeEvent* event) override;
+    int heightOf(int row) const override;
+    int topOf(int row) const override;
+    int rowPast(int y) const override;
+    int rowsThatFit(int height) const override;
+    int topFor(int row, ScrollHint hint) const override;
+    int pageFrom(int row, int step) const override;
 
     /// Wraps messages or not; the first row in view stays.
     void setWrapped(bool isWrapped);
 
-    /// Gives the rows in view their heights.
-    void measureRows();
-
-    /// The rows, or their numbers, have changed.
-    void measureChangedRows();
-
-    /// Gives all rows their heights again, after a change of the font.
-    void restartWrapping();
-
-    /// Updates range and position of the scroll bar to the heights of the rows.
-    void updateScrollBars();
-
-    /// Whether it is not the user who scrolls.
-    bool m_scrollingItself = false;
+    /// The rows, their numbers or their font have changed.
+    void forgetHeights() { m_heights.clear(); }
 
 private:
-    WrappedRows m_wrapped;
+    int mostLines() const;
+    void adapt() const;
+    int firstAbove(int row, int height) const;
+    int lastBelow(int row, int height) const;
+
+    LogDelegate* m_delegate;
+    bool m_isWrapped = false;
+    mutable std::unordered_map<int, int> m_heights; // of measured rows
+    mutable int m_width = 0;                        // for which they were measured
+    mutable int m_mostLines = 1;                    // likewise
 };
 
 } // namespace Velocor
