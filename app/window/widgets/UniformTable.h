@@ -8,7 +8,8 @@
 
 namespace Velocor {
 
-/// A table for any number of rows, all of the same height.
+/// A table for any number of rows, all of the same height unless a subclass overrides heightOf()
+/// and what depends on it.
 ///
 /// QTableView keeps the position of each row, and computes all of them again when a row is added.
 /// This table computes them when they are needed: rows take neither memory nor time, for the goals
