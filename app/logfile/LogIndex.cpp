@@ -7,7 +7,6 @@
 #include "app/logfile/Milliseconds.h"
 
 #include <algorithm>
-#include <cstring>
 #include <limits>
 
 namespace Velocor {
@@ -36,6 +35,13 @@ LogEntry::Severity SeverityOf(quint8 mark)
     return static_cast<LogEntry::Severity>(mark & LogRows::SeverityMask);
 }
 
+quint8 TextMarkFor(LogFilter::Match match)
+{
+    if (match == LogFilter::Hidden)
+        return LogRows::Unmatched | LogRows::Hidden;
+    return match == LogFilter::Yes ? 0 : LogRows::Unmatched;
+}
+
 template <class T>
 void MoveTail(std::vector<T>& from, size_t first, std::vector<T>& to)
 {
@@ -52,8 +58,8 @@ void AppendTail(std::vector<T>& to, std::vector<T> const& from, size_t first)
 } // namespace
 
 LogIndex::LogIndex(LogLineParser const& parser, LogFilter const& filter, bool isOneRun)
-    : m_parser(parser), m_filter(filter), m_lineEnd(parser.fileType().lineEnd()),
-      m_isOneRun(isOneRun || parser.fileType().isForeign)
+    : m_parser(parser), m_filter(filter), m_search(filter, parser.fileType().encoding.narrowed()),
+      m_lineEnd(parser.fileType().lineEnd()), m_isOneRun(isOneRun || parser.fileType().isForeign)
 {
     m_runs.emplace_back();
 }
@@ -100,6 +106,7 @@ qint64 LogIndex::completeOffset() const
 qint64 LogIndex::Begin()
 {
     const bool hasSeam = m_runs.size() > 1;
+    m_searched = AllLines;
     m_formerEnd = m_position;
     m_knownEnd = completeOffset();
     m_knownSeam = hasSeam ? m_starts[m_runs[1].firstLine] : -1;
@@ -152,6 +159,8 @@ void LogIndex::keepKnownLines()
 
 bool LogIndex::Feed(char const* bytes, int count)
 {
+    if (m_position == 0)
+        m_search.Learn(bytes, count);
     char const* at = bytes;
     char const* const end = bytes + count;
     while (at != end) {
@@ -190,18 +199,17 @@ void LogIndex::End()
     m_hasLostSeam = m_knownSeam >= 0 && m_runs.size() == 1 && !m_isOneRun;
 }
 
-// What the text filter says of a line: flags of its mark.
-quint8 LogIndex::textMarkOf(char const* line, int length)
+// What the text filter says of the line with this index: flags of its mark.
+quint8 LogIndex::textMarkOf(char const* line, int length, size_t index)
 {
     if (!m_filter.hasText() || m_slowLine > 0)
         return 0;
-    const LogFilter::Match match =
-        m_filter.Find(m_parser.fileType().encoding.narrowed().Decode(line, length));
+    LogFilter::Match match = m_search.answer();
+    if (m_search.IsCandidate(line, length))
+        match = m_filter.Find(m_parser.fileType().encoding.narrowed().Decode(line, length));
     if (match == LogFilter::TooLong)
-        m_slowLine = m_starts.size() + 1;
-    if (match == LogFilter::Hidden)
-        return LogRows::Unmatched | LogRows::Hidden;
-    return match == LogFilter::Yes ? 0 : LogRows::Unmatched;
+        m_slowLine = index + 1;
+    return TextMarkFor(match);
 }
 
 quint8 LogIndex::markOf(LogLineParser::Parts const& parts, char const* line, int length)
@@ -213,17 +221,25 @@ quint8 LogIndex::markOf(LogLineParser::Parts const& parts, char const* line, int
         mark = (m_marks.back() & LogRows::SeverityMask) | LogRows::Continued;
     if (parts.timeKey >= 0)
         mark |= LogRows::Timed;
-    return mark | textMarkOf(line, length);
+    return mark | textMarkOf(line, length, m_starts.size());
+}
+
+// The length of a line without its line end.
+//
+// @param length  without the last byte of the line end
+int LogIndex::contentLength(char const* line, int length, bool complete) const
+{
+    if (complete)
+        length = std::max(0, length + 1 - m_lineEnd.size());
+    return m_parser.fileType().encoding.WithoutReturn(line, length);
 }
 
 // Returns false if the lines up to the new position are known.
 bool LogIndex::addLine(char const* line, int length, bool complete)
 {
     const qint64 end = m_lineStart + length + 1;
-    if (complete)
-        length = std::max(0, length + 1 - m_lineEnd.size());
     LogEncoding const& encoding = m_parser.fileType().encoding;
-    length = encoding.WithoutReturn(line, length);
+    length = contentLength(line, length, complete);
     const quint16 check = LogRows::CheckOf(line, length);
     QByteArray narrow;
     encoding.Narrow(line, length, narrow);
@@ -374,6 +390,87 @@ void LogIndex::noteTime(LogLineParser::Parts const& parts)
         m_newestLastTimed = m_lastTimed;
         m_newestLastTime = m_lastTime;
     }
+}
+
+void LogIndex::setTextMarks(size_t from, size_t to, quint8 flags)
+{
+    for (size_t line = from; line < to; ++line)
+        m_marks[line] = static_cast<quint8>((m_marks[line] & ~OfText) | flags);
+}
+
+qint64 LogIndex::endOf(size_t line) const
+{
+    return line + 1 < m_starts.size() ? m_starts[line + 1] : m_position;
+}
+
+// The line that has the byte at `offset`, which is `from` or one after it.
+size_t LogIndex::lineAt(qint64 offset, size_t from) const
+{
+    size_t step = 1;
+    while (from + step < m_starts.size() && m_starts[from + step] <= offset)
+        step *= 2;
+    const auto first = m_starts.begin() + static_cast<std::ptrdiff_t>(from);
+    const auto last =
+        m_starts.begin() + static_cast<std::ptrdiff_t>(std::min(from + step, m_starts.size()));
+    return static_cast<size_t>(std::upper_bound(first, last, offset) - m_starts.begin()) - 1;
+}
+
+void LogIndex::BeginSearch(LogFilter const& filter)
+{
+    m_filter = filter;
+    m_search = CandidateSearch(filter, m_parser.fileType().encoding.narrowed());
+    m_slowLine = 0;
+    m_searched = filter.hasText() && !m_starts.empty() ? 0 : AllLines;
+    setTextMarks(0, m_starts.size(), filter.hasText() ? LogRows::Unmatched : 0);
+}
+
+qint64 LogIndex::SearchEnd(qint64 size) const
+{
+    const qint64 start = searchOffset();
+    if (m_position - start <= size)
+        return m_position;
+    const size_t line = lineAt(start + size, m_searched);
+    return line > m_searched ? m_starts[line]
+                             : std::min(endOf(line), start + LineLimit + m_lineEnd.size());
+}
+
+bool LogIndex::Search(QByteArray const& lines, qint64 offset)
+{
+    const qint64 end = offset + lines.size();
+    if (searchOffset() >= end)
+        return false;
+    if (m_searched == 0)
+        m_search.Learn(lines.constData(), lines.size());
+
+    // A line in UTF-16 is narrowed before it is searched.
+    char const* const rest = lines.constData() + (searchOffset() - offset);
+    char const* const restEnd = lines.constEnd();
+    const bool isWide = m_parser.fileType().encoding.isWide();
+    char const* const found = isWide ? rest : m_search.Find(rest, restEnd);
+    const bool isFound = found != restEnd;
+    const qint64 place = searchOffset() + (found - rest) - (isFound ? 0 : 1);
+    const size_t next = lineAt(place, m_searched) + (isFound ? 0 : 1);
+    setTextMarks(m_searched, next, TextMarkFor(m_search.answer()));
+    m_searched = next;
+    if (isFound)
+        searchLine(lines.constData() + (searchOffset() - offset));
+    if (m_searched >= m_starts.size() || m_slowLine > 0)
+        m_searched = AllLines;
+    return searchOffset() < end;
+}
+
+// Asks the filter about the next line.
+void LogIndex::searchLine(char const* line)
+{
+    const bool complete = m_lastIsComplete || m_searched + 1 < m_starts.size();
+    const qint64 whole = endOf(m_searched) - searchOffset() - (complete ? 1 : 0);
+    int length =
+        contentLength(line, static_cast<int>(std::min<qint64>(whole, LineLimit)), complete);
+    QByteArray narrow;
+    m_parser.fileType().encoding.Narrow(line, length, narrow);
+    setTextMarks(m_searched, m_searched + 1,
+                 textMarkOf(line, std::min(length, LineLimit), m_searched));
+    ++m_searched;
 }
 
 // Whether a line from the first one of an entry on matches the text, and none has a term that

@@ -3,12 +3,15 @@
 
 #pragma once
 
+#include "app/logfile/CandidateSearch.h"
 #include "app/logfile/LogFilter.h"
 #include "app/logfile/LogLineParser.h"
 #include "app/logfile/LogRows.h"
 
 #include <QByteArray>
 
+#include <algorithm>
+#include <limits>
 #include <vector>
 
 namespace Velocor {
@@ -66,6 +69,39 @@ public:
     /// Ends the pass at the end of the file; a last line without a line end counts as a line.
     void End();
 
+    /// Starts to search the known lines for the text of another filter, which Rows() then needs.
+    ///
+    /// Only between two passes. The bytes from searchOffset() on have to be fed to Search(), until
+    /// it is nextOffset(). Rows() lacks the lines that have not been searched, as it lacks those
+    /// that have not been read in a first pass.
+    ///
+    ///     index.BeginSearch(filter);
+    ///     while (index.searchOffset() < index.nextOffset()) {
+    ///         const qint64 offset = index.searchOffset();
+    ///         lines = bytesOfFile(offset, index.SearchEnd(1 << 20));
+    ///         while (index.Search(lines, offset)) {}
+    ///     }
+    void BeginSearch(LogFilter const& filter);
+
+    /// The offset of the first line that has not been searched; nextOffset() if there is none or
+    /// slowLine() is known.
+    qint64 searchOffset() const { return m_searched < size() ? m_starts[m_searched] : m_position; }
+
+    /// How many lines have been searched: all, if no search is under way.
+    size_t searchedLines() const { return std::min(m_searched, size()); }
+
+    /// The end of the bytes to search next: of whole lines of up to `size` bytes together, or of
+    /// one line if that is longer. What follows LineLimit in such a line is left out.
+    qint64 SearchEnd(qint64 size) const;
+
+    /// Searches on to the next line that the filter has to be asked about, and asks it.
+    ///
+    /// @param lines  the bytes of the file from `offset` to SearchEnd() when it was called; the
+    ///               same in all calls until this returns false
+    /// @param offset  searchOffset() at that time
+    /// @return false if all of these lines have been searched
+    bool Search(QByteArray const& lines, qint64 offset);
+
     /// Where the last complete line ends; after it the file may still change.
     qint64 completeOffset() const;
 
@@ -120,6 +156,8 @@ public:
     static constexpr int PartsLimit = 64 * 1024;
 
 private:
+    static constexpr size_t AllLines = std::numeric_limits<size_t>::max();
+
     struct Run
     {
         size_t firstLine = 0;
@@ -135,7 +173,12 @@ private:
     void forgetFrom(size_t line);
     bool addLine(char const* line, int length, bool complete);
     quint8 markOf(LogLineParser::Parts const& parts, char const* line, int length);
-    quint8 textMarkOf(char const* line, int length);
+    int contentLength(char const* line, int length, bool complete) const;
+    quint8 textMarkOf(char const* line, int length, size_t index);
+    void setTextMarks(size_t from, size_t to, quint8 flags);
+    qint64 endOf(size_t line) const;
+    size_t lineAt(qint64 offset, size_t from) const;
+    void searchLine(char const* line);
     bool isSeam(LogLineParser::Parts const& parts, qint64 end) const;
     bool isOlder(LogLineParser::Parts const& parts) const;
     bool isKnown(LogLineParser::Parts const& parts, qint64 end) const;
@@ -147,6 +190,8 @@ private:
 
     LogLineParser m_parser;
     LogFilter m_filter;
+    CandidateSearch m_search;
+    size_t m_searched = AllLines;
     LogLineEnd m_lineEnd;
 
     std::vector<qint64> m_starts;
