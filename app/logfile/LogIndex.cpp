@@ -27,19 +27,9 @@ constexpr qint64 HalfADay = 12 * Milliseconds::Hour;
 // be given in minutes.
 constexpr qint64 ClockChange = 61 * Milliseconds::Minute;
 
-// The flags of a mark that the text filter sets.
-constexpr quint8 OfText = LogRows::Unmatched | LogRows::Hidden;
-
 LogEntry::Severity SeverityOf(quint8 mark)
 {
     return static_cast<LogEntry::Severity>(mark & LogRows::SeverityMask);
-}
-
-quint8 TextMarkFor(LogFilter::Match match)
-{
-    if (match == LogFilter::Hidden)
-        return LogRows::Unmatched | LogRows::Hidden;
-    return match == LogFilter::Yes ? 0 : LogRows::Unmatched;
 }
 
 template <class T>
@@ -82,6 +72,7 @@ void LogIndex::forgetFrom(size_t line)
     m_starts.resize(line);
     m_marks.resize(line);
     m_checks.resize(line);
+    m_matches.resize(std::min(line, m_matches.size()));
     m_runs.resize(1);
     if (line == 0) {
         m_runs[0] = Run();
@@ -138,6 +129,7 @@ void LogIndex::keepKnownLines()
     m_knownStarts.clear();
     m_knownMarks.clear();
     m_knownChecks.clear();
+    m_knownMatches.clear();
     if (m_runs.size() < 2)
         return;
 
@@ -148,10 +140,12 @@ void LogIndex::keepKnownLines()
     MoveTail(m_starts, seam, m_knownStarts);
     MoveTail(m_marks, seam, m_knownMarks);
     MoveTail(m_checks, seam, m_knownChecks);
+    MoveTail(m_matches, std::min(seam, m_matches.size()), m_knownMatches);
     if (!m_lastIsComplete) {
         m_knownStarts.pop_back();
         m_knownMarks.pop_back();
         m_knownChecks.pop_back();
+        m_knownMatches.resize(std::min(m_knownMatches.size(), m_knownStarts.size()));
     }
     while (m_knownRuns.size() > 1 && m_knownRuns.back().firstLine >= m_knownStarts.size())
         m_knownRuns.pop_back();
@@ -194,25 +188,28 @@ void LogIndex::End()
     m_knownStarts.clear();
     m_knownMarks.clear();
     m_knownChecks.clear();
+    m_knownMatches.clear();
     if (m_lineIsPartial)
         addLine(m_partialLine.constData(), m_partialLine.size(), false);
     m_hasLostSeam = m_knownSeam >= 0 && m_runs.size() == 1 && !m_isOneRun;
 }
 
-// What the text filter says of the line with this index: flags of its mark.
-quint8 LogIndex::textMarkOf(char const* line, int length, size_t index)
+// Whether the line with this index matches the text filter.
+LogFilter::Match LogIndex::matchOf(char const* line, int length, size_t index)
 {
-    if (!m_filter.hasText() || m_slowLine > 0)
-        return 0;
-    LogFilter::Match match = m_search.answer();
-    if (m_search.IsCandidate(line, length))
-        match = m_filter.Find(m_parser.fileType().encoding.narrowed().Decode(line, length));
+    if (m_slowLine > 0)
+        return LogFilter::Yes;
+    length = std::min(length, LineLimit);
+    if (!m_search.IsCandidate(line, length))
+        return m_search.answer();
+    const LogFilter::Match match =
+        m_filter.Find(m_parser.fileType().encoding.narrowed().Decode(line, length));
     if (match == LogFilter::TooLong)
         m_slowLine = index + 1;
-    return TextMarkFor(match);
+    return match;
 }
 
-quint8 LogIndex::markOf(LogLineParser::Parts const& parts, char const* line, int length)
+quint8 LogIndex::markOf(LogLineParser::Parts const& parts) const
 {
     quint8 mark = LogEntry::None;
     if (parts.isEntry)
@@ -221,7 +218,7 @@ quint8 LogIndex::markOf(LogLineParser::Parts const& parts, char const* line, int
         mark = (m_marks.back() & LogRows::SeverityMask) | LogRows::Continued;
     if (parts.timeKey >= 0)
         mark |= LogRows::Timed;
-    return mark | textMarkOf(line, length, m_starts.size());
+    return mark;
 }
 
 // The length of a line without its line end.
@@ -256,7 +253,9 @@ bool LogIndex::addLine(char const* line, int length, bool complete)
     }
     if (m_isSeamUnchanged && m_lineStart >= m_formerEnd)
         joinRuns();
-    m_marks.push_back(markOf(parts, line, std::min(length, LineLimit)));
+    if (m_filter.hasText())
+        m_matches.push_back(matchOf(line, length, m_starts.size()));
+    m_marks.push_back(markOf(parts));
     m_checks.push_back(check);
     m_starts.push_back(m_lineStart);
     if (parts.timeKey >= 0 && complete) // an incomplete line is read again
@@ -310,8 +309,7 @@ void LogIndex::joinRuns()
     for (size_t number = 1; number < m_runs.size(); ++number) {
         const size_t first = m_runs[number].firstLine;
         if (m_marks[first] & LogRows::Torn)
-            m_marks[first] = (m_marks[first - 1] & LogRows::SeverityMask) | LogRows::Continued |
-                             (m_marks[first] & OfText);
+            m_marks[first] = (m_marks[first - 1] & LogRows::SeverityMask) | LogRows::Continued;
     }
     m_runs.resize(1);
     m_isSeamUnchanged = false;
@@ -332,8 +330,7 @@ void LogIndex::beginRun(LogLineParser::Parts const& parts)
     run.hasDate = parts.hasDate;
     if (run.firstLine > m_lastTimed + 1) {
         --run.firstLine;
-        const quint8 ofText = m_marks.back() & OfText;
-        m_marks.back() = LogEntry::None | LogRows::Torn | ofText;
+        m_marks.back() = LogEntry::None | LogRows::Torn;
     }
     m_runs.push_back(run);
     m_runHasTimed = false;
@@ -355,6 +352,7 @@ bool LogIndex::joinKnownLines(qint64 start)
     AppendTail(m_starts, m_knownStarts, first);
     AppendTail(m_marks, m_knownMarks, first);
     AppendTail(m_checks, m_knownChecks, first);
+    AppendTail(m_matches, m_knownMatches, std::min(first, m_knownMatches.size()));
     for (Run known : m_knownRuns) {
         if (known.firstLine <= first) {
             m_runs[1].firstTime = known.firstTime;
@@ -392,12 +390,6 @@ void LogIndex::noteTime(LogLineParser::Parts const& parts)
     }
 }
 
-void LogIndex::setTextMarks(size_t from, size_t to, quint8 flags)
-{
-    for (size_t line = from; line < to; ++line)
-        m_marks[line] = static_cast<quint8>((m_marks[line] & ~OfText) | flags);
-}
-
 qint64 LogIndex::endOf(size_t line) const
 {
     return line + 1 < m_starts.size() ? m_starts[line + 1] : m_position;
@@ -421,7 +413,7 @@ void LogIndex::BeginSearch(LogFilter const& filter)
     m_search = CandidateSearch(filter, m_parser.fileType().encoding.narrowed());
     m_slowLine = 0;
     m_searched = filter.hasText() && !m_starts.empty() ? 0 : AllLines;
-    setTextMarks(0, m_starts.size(), filter.hasText() ? LogRows::Unmatched : 0);
+    m_matches.assign(filter.hasText() ? m_starts.size() : 0, LogFilter::No);
 }
 
 qint64 LogIndex::SearchEnd(qint64 size) const
@@ -450,8 +442,8 @@ bool LogIndex::Search(QByteArray const& lines, qint64 offset)
     const bool isFound = found != restEnd;
     const qint64 place = searchOffset() + (found - rest) - (isFound ? 0 : 1);
     const size_t next = lineAt(place, m_searched) + (isFound ? 0 : 1);
-    setTextMarks(m_searched, next, TextMarkFor(m_search.answer()));
-    m_searched = next;
+    for (; m_searched < next; ++m_searched)
+        m_matches[m_searched] = m_search.answer();
     if (isFound)
         searchLine(lines.constData() + (searchOffset() - offset));
     if (m_searched >= m_starts.size() || m_slowLine > 0)
@@ -468,8 +460,7 @@ void LogIndex::searchLine(char const* line)
         contentLength(line, static_cast<int>(std::min<qint64>(whole, LineLimit)), complete);
     QByteArray narrow;
     m_parser.fileType().encoding.Narrow(line, length, narrow);
-    setTextMarks(m_searched, m_searched + 1,
-                 textMarkOf(line, std::min(length, LineLimit), m_searched));
+    m_matches[m_searched] = matchOf(line, length, m_searched);
     ++m_searched;
 }
 
@@ -477,20 +468,22 @@ void LogIndex::searchLine(char const* line)
 // hides.
 bool LogIndex::isEntryMatched(size_t first, size_t end) const
 {
-    bool isMatched = m_slowLine > 0;
-    for (size_t line = first; line < end && m_slowLine == 0; ++line) {
+    if (m_slowLine > 0 || m_matches.empty())
+        return true;
+    bool isMatched = false;
+    for (size_t line = first; line < end; ++line) {
         if (line > first && !(m_marks[line] & LogRows::Continued))
             break;
-        if (m_marks[line] & LogRows::Hidden)
+        if (m_matches[line] == LogFilter::Hidden)
             return false;
-        isMatched = isMatched || !(m_marks[line] & LogRows::Unmatched);
+        isMatched = isMatched || m_matches[line] == LogFilter::Yes;
     }
     return isMatched;
 }
 
 void LogIndex::addRow(size_t line, int flags, LogRows& rows) const
 {
-    const auto mark = static_cast<quint8>((m_marks[line] & ~OfText) | flags);
+    const auto mark = static_cast<quint8>(m_marks[line] | flags);
     rows.add(m_starts[line], mark, m_checks[line]);
     if (LogSeverities::IsProblem(SeverityOf(mark)) && !(mark & LogRows::Continued))
         ++rows.problems;

@@ -172,10 +172,9 @@ private:
     size_t resumeLine() const;
     void forgetFrom(size_t line);
     bool addLine(char const* line, int length, bool complete);
-    quint8 markOf(LogLineParser::Parts const& parts, char const* line, int length);
+    quint8 markOf(LogLineParser::Parts const& parts) const;
     int contentLength(char const* line, int length, bool complete) const;
-    quint8 textMarkOf(char const* line, int length, size_t index);
-    void setTextMarks(size_t from, size_t to, quint8 flags);
+    LogFilter::Match matchOf(char const* line, int length, size_t index);
     qint64 endOf(size_t line) const;
     size_t lineAt(qint64 offset, size_t from) const;
     void searchLine(char const* line);
@@ -197,7 +196,8 @@ private:
     std::vector<qint64> m_starts;
     std::vector<quint8> m_marks;
     std::vector<quint16> m_checks;
-    std::vector<Run> m_runs; // newest first, as in the file
+    std::vector<quint8> m_matches; // a LogFilter::Match for each line; empty without a text
+    std::vector<Run> m_runs;       // newest first, as in the file
     bool m_hasElapsed = false;
     bool m_hasTimes = false;
     bool m_hasSeverities = false;
@@ -232,6 +232,7 @@ private:
     std::vector<qint64> m_knownStarts;
     std::vector<quint8> m_knownMarks;
     std::vector<quint16> m_knownChecks;
+    std::vector<quint8> m_knownMatches;
     std::vector<Run> m_knownRuns;
 };
 

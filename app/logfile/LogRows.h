@@ -34,11 +34,6 @@ struct LogRows
     static constexpr quint8 Context = 0x40;   ///< shown only because it is near a line that matches
     static constexpr quint8 Alone = 0x80;     ///< continued, but not shown along with its entry
 
-    /// In an index, instead of the last two: the line does not match the text filter, or has a term
-    /// that hides it.
-    static constexpr quint8 Unmatched = 0x40;
-    static constexpr quint8 Hidden = 0x80;
-
     std::vector<qint64> starts;
     std::vector<quint8> marks;
     std::vector<quint16> checks; ///< see CheckOf(); 0 for headings
