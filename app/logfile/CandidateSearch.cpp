@@ -31,13 +31,19 @@ int Usable(QString const& text, int at, bool isAnyCase, LogEncoding const& encod
         return 0;
     if (c.unicode() < 0x80)
         return 1;
-    if (isAnyCase || c == QChar::ReplacementCharacter) // which invalid bytes become, too
+    // Invalid bytes become the one, and the other is removed from the start of a line.
+    if (isAnyCase || c == QChar::ReplacementCharacter || c == QChar::ByteOrderMark)
         return 0;
     if (encoding.kind() != LogEncoding::Utf8)
         return c.unicode() <= 0xFF ? 1 : 0;
     if (!c.isSurrogate())
         return 1;
     return c.isHighSurrogate() && at + 1 < text.size() && text.at(at + 1).isLowSurrogate() ? 2 : 0;
+}
+
+QByteArray Encoded(QString const& text, LogEncoding const& encoding)
+{
+    return encoding.kind() == LogEncoding::Utf8 ? text.toUtf8() : text.toLatin1();
 }
 
 // The longest part of a text that can be looked for in bytes.
@@ -52,9 +58,7 @@ QByteArray BytesOf(QString const& text, bool isAnyCase, LogEncoding const& encod
                 break;
             at += count;
         }
-        const QString part = text.mid(start, at - start);
-        const QByteArray bytes =
-            encoding.kind() == LogEncoding::Utf8 ? part.toUtf8() : part.toLatin1();
+        const QByteArray bytes = Encoded(text.mid(start, at - start), encoding);
         if (bytes.size() > longest.size())
             longest = bytes;
     }
@@ -79,13 +83,14 @@ CandidateSearch::CandidateSearch(LogFilter const& filter, LogEncoding const& enc
     }
     for (QStringMatcher const& term : filter.hidden().matchers())
         m_isEveryLine =
-            !askAbout(term.pattern(), term.caseSensitivity(), encoding, m_always) || m_isEveryLine;
+            !askAbout(term.pattern(), term.caseSensitivity(), encoding, m_hiding) || m_isEveryLine;
 
     const Qt::CaseSensitivity sensitivity = filter.caseSensitivity();
     const QStringList texts =
         filter.isExpression() ? RequiredLiterals(filter.text()) : QStringList(filter.text());
     for (QString const& text : texts)
         askAbout(text, sensitivity, encoding, m_required);
+    m_isWhole = m_isWhole && (filter.text().isEmpty() || !filter.isExpression());
     for (QStringMatcher const& term : filter.required().matchers())
         askAbout(term.pattern(), term.caseSensitivity(), encoding, m_required);
 
@@ -100,6 +105,7 @@ bool CandidateSearch::askAbout(QString const& text, Qt::CaseSensitivity sensitiv
 {
     const bool isAnyCase = sensitivity == Qt::CaseInsensitive;
     const QByteArray bytes = BytesOf(text, isAnyCase, encoding);
+    m_isWhole = m_isWhole && bytes == Encoded(text, encoding);
     if (bytes.isEmpty())
         return false;
     literals.emplace_back(bytes, isAnyCase);
@@ -108,18 +114,24 @@ bool CandidateSearch::askAbout(QString const& text, Qt::CaseSensitivity sensitiv
     const QByteArray lower = bytes.toLower();
     for (ushort other : {LongS, KelvinSign}) {
         if (lower.contains(other == LongS ? 's' : 'k'))
-            m_always.emplace_back(QString(QChar(other)).toUtf8(), false);
+            m_unclear.emplace_back(QString(QChar(other)).toUtf8(), false);
     }
     return true;
 }
 
-bool CandidateSearch::IsCandidate(char const* line, int length) const
+std::optional<LogFilter::Match> CandidateSearch::Answer(char const* line, int length) const
 {
     const auto isIn = [&](ByteLiteral const& literal) {
         return literal.IsIn(line, length);
     };
-    return m_isEveryLine || std::any_of(m_always.begin(), m_always.end(), isIn) ||
-           (!m_required.empty() && std::all_of(m_required.begin(), m_required.end(), isIn));
+    const std::optional<LogFilter::Match> unknown;
+    if (m_isEveryLine || std::any_of(m_unclear.begin(), m_unclear.end(), isIn))
+        return unknown;
+    if (std::any_of(m_hiding.begin(), m_hiding.end(), isIn))
+        return m_isWhole ? LogFilter::Hidden : unknown;
+    if (m_required.empty() || !std::all_of(m_required.begin(), m_required.end(), isIn))
+        return m_answer;
+    return m_isWhole ? LogFilter::Yes : unknown;
 }
 
 char const* CandidateSearch::Find(char const* at, char const* end) const
@@ -137,7 +149,9 @@ char const* CandidateSearch::Find(char const* at, char const* end) const
         };
         if (!m_required.empty())
             find(m_required.front());
-        for (ByteLiteral const& literal : m_always)
+        for (ByteLiteral const& literal : m_hiding)
+            find(literal);
+        for (ByteLiteral const& literal : m_unclear)
             find(literal);
         if (found != windowEnd)
             return found;
@@ -152,8 +166,10 @@ void CandidateSearch::Learn(char const* sample, int length)
     ByteLiteral::Frequencies frequencies = {};
     for (int i = 0; i < length; ++i)
         ++frequencies[static_cast<unsigned char>(sample[i])];
-    for (ByteLiteral& literal : m_always)
-        literal.Learn(frequencies);
+    for (std::vector<ByteLiteral>* literals : {&m_hiding, &m_unclear}) {
+        for (ByteLiteral& literal : *literals)
+            literal.Learn(frequencies);
+    }
 
     std::vector<std::pair<int, ByteLiteral>> counted;
     for (ByteLiteral& literal : m_required) {

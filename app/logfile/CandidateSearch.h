@@ -7,6 +7,7 @@
 #include "app/logfile/LogEncoding.h"
 #include "app/logfile/LogFilter.h"
 
+#include <optional>
 #include <vector>
 
 namespace Velocor {
@@ -20,8 +21,8 @@ namespace Velocor {
 /// A plain value; any thread.
 ///
 ///     CandidateSearch search(filter, encoding);
-///     match = search.IsCandidate(line, length) ? filter.Find(encoding.Decode(line, length))
-///                                              : search.answer();
+///     known = search.Answer(line, length);
+///     match = known ? *known : filter.Find(encoding.Decode(line, length));
 class CandidateSearch
 {
 public:
@@ -31,8 +32,10 @@ public:
     /// What the filter finds in every line that is no candidate: Yes or No.
     LogFilter::Match answer() const { return m_answer; }
 
+    /// What the filter finds in a line, if its bytes tell; otherwise it has to be asked.
+    ///
     /// @param line  without its line end
-    bool IsCandidate(char const* line, int length) const;
+    std::optional<LogFilter::Match> Answer(char const* line, int length) const;
 
     /// Finds the first line in [at, end) that may be a candidate.
     ///
@@ -49,8 +52,10 @@ private:
 
     LogFilter::Match m_answer = LogFilter::Yes;
     bool m_isEveryLine = false;
+    bool m_isWhole = true;               // the literals are all of the filter
     std::vector<ByteLiteral> m_required; // without one of them, a line is no candidate ...
-    std::vector<ByteLiteral> m_always;   // ... unless it has one of these
+    std::vector<ByteLiteral> m_hiding;   // ... unless it has one of these ...
+    std::vector<ByteLiteral> m_unclear;  // ... or of these, which may equal an ASCII letter
 };
 
 } // namespace Velocor

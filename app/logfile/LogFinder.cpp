@@ -114,9 +114,10 @@ bool LogFinder::search(LogLineReader& reader, size_t from, size_t to, bool isRep
         if (start < 0)
             continue; // a heading
         const QByteArray line = reader.Line(start);
-        LogFilter::Match match = candidates.answer();
-        if (candidates.IsCandidate(line.constData(), line.size()))
-            match = m_request.text.Find(encoding.Decode(line.constData(), line.size()));
+        const std::optional<LogFilter::Match> known =
+            candidates.Answer(line.constData(), line.size());
+        const LogFilter::Match match =
+            known ? *known : m_request.text.Find(encoding.Decode(line.constData(), line.size()));
         if (match == LogFilter::TooLong) {
             m_slowStart = start;
             m_found.clear();

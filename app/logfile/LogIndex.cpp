@@ -200,8 +200,9 @@ LogFilter::Match LogIndex::matchOf(char const* line, int length, size_t index)
     if (m_slowLine > 0)
         return LogFilter::Yes;
     length = std::min(length, LineLimit);
-    if (!m_search.IsCandidate(line, length))
-        return m_search.answer();
+    const std::optional<LogFilter::Match> known = m_search.Answer(line, length);
+    if (known)
+        return *known;
     const LogFilter::Match match =
         m_filter.Find(m_parser.fileType().encoding.narrowed().Decode(line, length));
     if (match == LogFilter::TooLong)

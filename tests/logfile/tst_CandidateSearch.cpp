@@ -54,6 +54,8 @@ class tst_CandidateSearch : public QObject
 private slots:
     void candidates_data();
     void candidates();
+    void withoutDecoding_data();
+    void withoutDecoding();
     void answers_data();
     void answers();
     void places_data();
@@ -154,12 +156,60 @@ void tst_CandidateSearch::candidates()
     QFETCH(bool, isCandidate);
     CandidateSearch search(filter, encoding);
     for (bool hasLearned : {false, true}) {
-        QCOMPARE(search.IsCandidate(line.constData(), line.size()), isCandidate);
-        if (!isCandidate)
-            QCOMPARE(filter.Find(encoding.Decode(line.constData(), line.size())), search.answer());
+        const std::optional<LogFilter::Match> known = search.Answer(line.constData(), line.size());
+        QCOMPARE(known != search.answer(), isCandidate);
+        if (known)
+            QCOMPARE(*known, filter.Find(encoding.Decode(line.constData(), line.size())));
         if (!hasLearned)
             search.Learn(line.constData(), line.size());
     }
+}
+
+void tst_CandidateSearch::withoutDecoding_data()
+{
+    QTest::addColumn<LogFilter>("filter");
+    QTest::addColumn<QByteArray>("line");
+    QTest::addColumn<bool>("isKnown");
+    const auto row = [](char const* name, LogFilter const& filter, char const* line, bool isKnown) {
+        QTest::newRow(name) << filter << QByteArray(line) << isKnown;
+    };
+    const QString mark(QChar::ByteOrderMark);
+    row("a text", exactly("full"), "disk full", true);
+    row("a text that is not ASCII", exactly(QString::fromUtf8("é")), "caf\xC3\xA9", true);
+    row("a text in any case", inAnyCase("disk full"), "DISK FULL", true);
+    row("not quite ASCII", inAnyCase("disk full"), "DISK FULL \xE2\x84\xAA", false);
+    row("a text in any case that is not ASCII", inAnyCase(QString::fromUtf8("caé")), "ca\xC3\xA9",
+        false);
+    row("part of a text", exactly(QString(QChar(0xFFFD)) + "a"),
+        "\xFF"
+        "a",
+        false);
+    row("a byte order mark, which may be removed", exactly(mark + "a"),
+        "\xEF\xBB\xBF"
+        "a",
+        false);
+    row("an expression", matching("full"), "disk full", false);
+    row("a required term", withTerms("full", "disk", ""), "disk full", true);
+    row("a hidden term", withTerms("full", "", "disk"), "disk full", true);
+    row(
+        "a hidden term, and an expression",
+        [] {
+            LogFilter filter = matching("full");
+            filter.SetTerms(LogTerms(), LogTerms("disk", true));
+            return filter;
+        }(),
+        "disk full", false);
+}
+
+void tst_CandidateSearch::withoutDecoding()
+{
+    QFETCH(LogFilter, filter);
+    QFETCH(QByteArray, line);
+    const std::optional<LogFilter::Match> known =
+        CandidateSearch(filter, utf8).Answer(line.constData(), line.size());
+    QTEST(known.has_value(), "isKnown");
+    if (known)
+        QCOMPARE(*known, filter.Find(utf8.Decode(line.constData(), line.size())));
 }
 
 void tst_CandidateSearch::answers_data()
