@@ -54,15 +54,17 @@ extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
     parser.SetFileType(type);
     const LogRows rows = RowsOf(parser, file, piece);
     const LogRows whole = RowsOf(parser, file, file.size() + 1);
-    Require(rows.starts == whole.starts && rows.marks == whole.marks);
-    Require(!type.isForeign || rows.earlier == 0);
+    Require(rows.size() == whole.size());
+    for (size_t row = 0; row < rows.size(); ++row)
+        Require(rows.start(row) == whole.start(row) && rows.mark(row) == whole.mark(row));
+    Require(!type.isForeign || rows.earlier() == 0);
     Require(file.isEmpty() == (whole.size() == 0));
-    Require(whole.size() == 0 || whole.starts[0] == 0);
+    Require(whole.size() == 0 || whole.start(0) == 0);
 
     for (size_t row = 0; type.isForeign && row < rows.size(); ++row) {
-        const int start = static_cast<int>(rows.starts[row]);
+        const int start = static_cast<int>(rows.start(row));
         const bool isLast = row + 1 == rows.size();
-        const int next = isLast ? file.size() : static_cast<int>(rows.starts[row + 1]);
+        const int next = isLast ? file.size() : static_cast<int>(rows.start(row + 1));
         Require(next > start);
         QByteArray line = file.mid(start, next - start);
         char const* const lineEnd =
@@ -73,7 +75,7 @@ extern "C" int LLVMFuzzerTestOneInput(uint8_t const* data, size_t size)
         line.truncate(type.encoding.WithoutReturn(line.constData(), line.size()));
         CheckParts(line);
         const LogEntry entry = parser.Parse(line);
-        const quint8 mark = rows.marks[row];
+        const quint8 mark = rows.mark(row);
         Require(entry.isEntry || entry.severity == LogEntry::None);
         Require(entry.isEntry ? (mark & LogRows::SeverityMask) == entry.severity
                               : row == 0 || (mark & LogRows::Continued));

@@ -5,6 +5,9 @@
 
 #include <QString>
 
+#include <array>
+#include <cstddef>
+
 namespace Velocor {
 
 /// One line of a log file, split into its parts. A plain record.
@@ -19,5 +22,8 @@ struct LogEntry
     QString message;      ///< the rest of the line, or the whole line if it is not an entry
     bool isEntry = false; ///< false if it continues the entry above or is torn
 };
+
+/// Numbers of entries by LogEntry::Severity.
+using LogCounts = std::array<size_t, LogEntry::None + 1>;
 
 } // namespace Velocor

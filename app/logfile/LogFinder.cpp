@@ -72,17 +72,17 @@ bool LogFinder::findChanged(LogLineReader& reader, LogHits const& before)
     LogRows const& now = *m_request.rows;
     const size_t changedEnd = change.changeAt + change.inserted;
     const qint64 offset =
-        static_cast<qint64>(now.earlier) - static_cast<qint64>(before.rows->earlier);
+        static_cast<qint64>(now.earlier()) - static_cast<qint64>(before.rows->earlier());
     // The last line may have been incomplete: same start, but another text.
     const size_t tail = std::max<size_t>(change.changedTail, 1);
-    const size_t newestBefore = before.rows->size() - before.rows->earlier;
+    const size_t newestBefore = before.rows->size() - before.rows->earlier();
     const size_t same = newestBefore > tail ? newestBefore - tail : 0;
 
     keep(*before.hits, 0, change.changeAt, 0);
     if (!search(reader, change.changeAt, changedEnd, false))
         return true;
-    keep(*before.hits, change.changeAt + change.removed, before.rows->earlier + same, offset);
-    if (search(reader, now.earlier + same, now.size(), false))
+    keep(*before.hits, change.changeAt + change.removed, before.rows->earlier() + same, offset);
+    if (search(reader, now.earlier() + same, now.size(), false))
         report(now.size(), true);
     return true;
 }
@@ -101,6 +101,7 @@ bool LogFinder::search(LogLineReader& reader, size_t from, size_t to, bool isRep
     LogRows const& rows = *m_request.rows;
     LogEncoding const& encoding = m_request.type.encoding;
     const CandidateSearch candidates(m_request.text, encoding);
+    LogRows::Reader starts(rows);
     QElapsedTimer sinceReport;
     sinceReport.start();
     for (size_t row = from; row < to; ++row) {
@@ -110,7 +111,7 @@ bool LogFinder::search(LogLineReader& reader, size_t from, size_t to, bool isRep
             report(row, false);
             sinceReport.start();
         }
-        const qint64 start = rows.starts[row];
+        const qint64 start = starts.start(row);
         if (start < 0)
             continue; // a heading
         const QByteArray line = reader.Line(start);

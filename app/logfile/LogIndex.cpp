@@ -32,17 +32,12 @@ LogEntry::Severity SeverityOf(quint8 mark)
     return static_cast<LogEntry::Severity>(mark & LogRows::SeverityMask);
 }
 
-template <class T>
-void MoveTail(std::vector<T>& from, size_t first, std::vector<T>& to)
+bool ShowsAll(LogFilter const& filter)
 {
-    to.assign(from.begin() + static_cast<std::ptrdiff_t>(first), from.end());
-    from.resize(first);
-}
-
-template <class T>
-void AppendTail(std::vector<T>& to, std::vector<T> const& from, size_t first)
-{
-    to.insert(to.end(), from.begin() + static_cast<std::ptrdiff_t>(first), from.end());
+    bool showsAll = !filter.hasText();
+    for (int severity = LogEntry::Trace; severity <= LogEntry::None; ++severity)
+        showsAll = showsAll && filter.Shows(static_cast<LogEntry::Severity>(severity));
+    return showsAll;
 }
 
 } // namespace
@@ -57,7 +52,7 @@ LogIndex::LogIndex(LogLineParser const& parser, LogFilter const& filter, bool is
 // The first line that the next pass reads again.
 size_t LogIndex::resumeLine() const
 {
-    const size_t end = m_runs.size() > 1 ? m_runs[1].firstLine : m_starts.size();
+    const size_t end = m_runs.size() > 1 ? m_runs[1].firstLine : m_lines.size();
     const size_t settled = m_lastIsComplete || m_runs.size() > 1 ? end : end - 1;
     if (!m_newestIsTimed)
         return settled;
@@ -67,12 +62,27 @@ size_t LogIndex::resumeLine() const
     return std::min(afterTimed, settled);
 }
 
+void LogIndex::count(size_t line, int step)
+{
+    const quint8 mark = m_lines.mark(line);
+    if (!(mark & LogRows::Continued))
+        m_counts[SeverityOf(mark)] += static_cast<size_t>(step);
+}
+
+void LogIndex::setMark(size_t line, quint8 mark)
+{
+    count(line, -1);
+    m_lines.SetMark(line, mark);
+    count(line, 1);
+}
+
 void LogIndex::forgetFrom(size_t line)
 {
-    m_starts.resize(line);
-    m_marks.resize(line);
-    m_checks.resize(line);
+    for (size_t forgotten = line; forgotten < m_lines.size(); ++forgotten)
+        count(forgotten, -1);
+    m_lines.Truncate(line);
     m_matches.resize(std::min(line, m_matches.size()));
+    m_entryEnd = entryEndBefore(line);
     m_runs.resize(1);
     if (line == 0) {
         m_runs[0] = Run();
@@ -86,12 +96,12 @@ void LogIndex::forgetFrom(size_t line)
 qint64 LogIndex::resumeOffset() const
 {
     const size_t resume = resumeLine();
-    return resume < m_starts.size() ? m_starts[resume] : m_position;
+    return resume < m_lines.size() ? m_lines.start(resume) : m_position;
 }
 
 qint64 LogIndex::completeOffset() const
 {
-    return m_lastIsComplete || m_starts.empty() ? m_position : m_starts.back();
+    return m_lastIsComplete || m_lines.isEmpty() ? m_position : m_lines.start(m_lines.size() - 1);
 }
 
 qint64 LogIndex::Begin()
@@ -100,7 +110,7 @@ qint64 LogIndex::Begin()
     m_searched = AllLines;
     m_formerEnd = m_position;
     m_knownEnd = completeOffset();
-    m_knownSeam = hasSeam ? m_starts[m_runs[1].firstLine] : -1;
+    m_knownSeam = hasSeam ? m_lines.start(m_runs[1].firstLine) : -1;
     m_isSeamUnchanged = false;
     m_hasMoved = false;
     // What follows a run that was read to its end was added to it, however old it looks. Without a
@@ -125,30 +135,35 @@ qint64 LogIndex::Begin()
 // Sets the lines after the seam aside, but for an incomplete last one.
 void LogIndex::keepKnownLines()
 {
-    m_knownRuns.clear();
-    m_knownStarts.clear();
-    m_knownMarks.clear();
-    m_knownChecks.clear();
-    m_knownMatches.clear();
+    forgetKnownLines();
     if (m_runs.size() < 2)
         return;
 
-    const size_t seam = m_runs[1].firstLine;
+    m_knownFirst = m_runs[1].firstLine;
     m_knownRuns.assign(m_runs.begin() + 1, m_runs.end());
-    for (Run& run : m_knownRuns)
-        run.firstLine -= seam;
-    MoveTail(m_starts, seam, m_knownStarts);
-    MoveTail(m_marks, seam, m_knownMarks);
-    MoveTail(m_checks, seam, m_knownChecks);
-    MoveTail(m_matches, std::min(seam, m_matches.size()), m_knownMatches);
-    if (!m_lastIsComplete) {
-        m_knownStarts.pop_back();
-        m_knownMarks.pop_back();
-        m_knownChecks.pop_back();
-        m_knownMatches.resize(std::min(m_knownMatches.size(), m_knownStarts.size()));
-    }
-    while (m_knownRuns.size() > 1 && m_knownRuns.back().firstLine >= m_knownStarts.size())
+    m_known = m_lines;
+    m_knownMatches = m_matches;
+    if (!m_lastIsComplete)
+        m_known.Truncate(m_known.size() - 1);
+    m_knownMatches.resize(std::min(m_knownMatches.size(), m_known.size()));
+    while (m_knownRuns.size() > 1 && m_knownRuns.back().firstLine >= m_known.size())
         m_knownRuns.pop_back();
+}
+
+void LogIndex::forgetKnownLines()
+{
+    m_knownRuns.clear();
+    m_known = LineTable();
+    m_knownFirst = 0;
+}
+
+// The known line that starts there; if there is none, their end.
+size_t LogIndex::knownLineAt(qint64 start) const
+{
+    if (!hasKnownLines())
+        return m_known.size();
+    const size_t line = m_known.LineAt(start);
+    return line >= m_knownFirst && m_known.start(line) == start ? line : m_known.size();
 }
 
 bool LogIndex::Feed(char const* bytes, int count)
@@ -184,11 +199,7 @@ bool LogIndex::Feed(char const* bytes, int count)
 
 void LogIndex::End()
 {
-    m_knownRuns.clear();
-    m_knownStarts.clear();
-    m_knownMarks.clear();
-    m_knownChecks.clear();
-    m_knownMatches.clear();
+    forgetKnownLines();
     if (m_lineIsPartial)
         addLine(m_partialLine.constData(), m_partialLine.size(), false);
     m_hasLostSeam = m_knownSeam >= 0 && m_runs.size() == 1 && !m_isOneRun;
@@ -210,15 +221,20 @@ LogFilter::Match LogIndex::matchOf(char const* line, int length, size_t index)
     return match;
 }
 
-quint8 LogIndex::markOf(LogLineParser::Parts const& parts) const
+quint8 LogIndex::markOf(LogLineParser::Parts const& parts)
 {
     quint8 mark = LogEntry::None;
-    if (parts.isEntry)
+    const size_t number = m_lines.size();
+    if (parts.isEntry) {
         mark = static_cast<quint8>(parts.severity);
-    else if (m_starts.size() > m_runs.back().firstLine)
-        mark = (m_marks.back() & LogRows::SeverityMask) | LogRows::Continued;
+    } else if (number > m_runs.back().firstLine) {
+        mark = m_lines.mark(number - 1) & LogRows::SeverityMask;
+        mark |= number < m_entryEnd ? LogRows::Continued : LogRows::ContinuedAlone;
+    }
     if (parts.timeKey >= 0)
         mark |= LogRows::Timed;
+    if (!(mark & LogRows::Continued))
+        m_entryEnd = number + (LogRows::BeginsEntry(mark) ? MaximumEntryLines : 1);
     return mark;
 }
 
@@ -255,10 +271,9 @@ bool LogIndex::addLine(char const* line, int length, bool complete)
     if (m_isSeamUnchanged && m_lineStart >= m_formerEnd)
         joinRuns();
     if (m_filter.hasText())
-        m_matches.push_back(matchOf(line, length, m_starts.size()));
-    m_marks.push_back(markOf(parts));
-    m_checks.push_back(check);
-    m_starts.push_back(m_lineStart);
+        m_matches.push_back(matchOf(line, length, m_lines.size()));
+    m_lines.Append(m_lineStart, markOf(parts), check);
+    count(m_lines.size() - 1, 1);
     if (parts.timeKey >= 0 && complete) // an incomplete line is read again
         noteTime(parts);
     return true;
@@ -272,10 +287,10 @@ bool LogIndex::isSeam(LogLineParser::Parts const& parts, qint64 end) const
     Run const& run = m_runs.back();
     const bool changesFormat = parts.hasDate != run.hasDate && run.timedLines > 1;
     const bool isEarlier = parts.hasDate == run.hasDate && isOlder(parts);
-    if (!m_knownStarts.empty())
+    if (hasKnownLines())
         return (changesFormat || isEarlier) && isKnown(parts, end);
 
-    const bool followsRest = m_starts.size() > m_lastTimed + 1;
+    const bool followsRest = m_lines.size() > m_lastTimed + 1;
     // A run logs its settings in the default format, with a date, before it switches to another.
     return (changesFormat && (followsRest || parts.hasDate)) ||
            (isEarlier && (followsRest || parts.timeKey + ClockChange < m_lastTime));
@@ -294,14 +309,14 @@ bool LogIndex::isOlder(LogLineParser::Parts const& parts) const
 // of a torn entry is not: where it was, the newest run writes next.
 bool LogIndex::isKnown(LogLineParser::Parts const& parts, qint64 end) const
 {
-    const auto found = std::lower_bound(m_knownStarts.begin(), m_knownStarts.end(), m_lineStart);
-    if (found == m_knownStarts.end() || *found != m_lineStart)
+    const size_t line = knownLineAt(m_lineStart);
+    if (line == m_known.size())
         return false;
-    const quint8 mark = m_knownMarks[static_cast<size_t>(found - m_knownStarts.begin())];
-    const bool isLast = found + 1 == m_knownStarts.end();
-    return !(mark & LogRows::Torn) && (mark & LogRows::Timed) &&
+    const quint8 mark = m_known.mark(line);
+    const bool isLast = line + 1 == m_known.size();
+    return !LogRows::IsTorn(mark) && (mark & LogRows::Timed) &&
            (mark & LogRows::SeverityMask) == static_cast<quint8>(parts.severity) &&
-           end == (isLast ? m_knownEnd : found[1]);
+           end == (isLast ? m_knownEnd : m_known.start(line + 1));
 }
 
 // The log writes at the end of the file, so whatever looked like a seam was none.
@@ -309,16 +324,19 @@ void LogIndex::joinRuns()
 {
     for (size_t number = 1; number < m_runs.size(); ++number) {
         const size_t first = m_runs[number].firstLine;
-        if (m_marks[first] & LogRows::Torn)
-            m_marks[first] = (m_marks[first - 1] & LogRows::SeverityMask) | LogRows::Continued;
+        if (!LogRows::IsTorn(m_lines.mark(first)))
+            continue;
+        const bool isAlone = first >= entryEndBefore(first);
+        setMark(first, (m_lines.mark(first - 1) & LogRows::SeverityMask) |
+                           (isAlone ? LogRows::ContinuedAlone : LogRows::Continued));
     }
     m_runs.resize(1);
     m_isSeamUnchanged = false;
     m_isOneRun = true;
     m_hasMoved = true;
     m_runHasTimed = true;
-    m_newestLastTimed = m_marks.size() - 1;
-    while (!(m_marks[m_newestLastTimed] & LogRows::Timed))
+    m_newestLastTimed = m_lines.size() - 1;
+    while (!(m_lines.mark(m_newestLastTimed) & LogRows::Timed))
         --m_newestLastTimed; // the first line of each run but the newest follows a timed one
     m_lastTimed = m_newestLastTimed;
 }
@@ -327,11 +345,11 @@ void LogIndex::joinRuns()
 void LogIndex::beginRun(LogLineParser::Parts const& parts)
 {
     Run run;
-    run.firstLine = m_starts.size();
+    run.firstLine = m_lines.size();
     run.hasDate = parts.hasDate;
     if (run.firstLine > m_lastTimed + 1) {
         --run.firstLine;
-        m_marks.back() = LogEntry::None | LogRows::Torn;
+        setMark(run.firstLine, LogEntry::None | LogRows::Torn);
     }
     m_runs.push_back(run);
     m_runHasTimed = false;
@@ -340,31 +358,36 @@ void LogIndex::beginRun(LogLineParser::Parts const& parts)
 // Reuses the lines from the older entry at `start` on, if they are known.
 bool LogIndex::joinKnownLines(qint64 start)
 {
-    const auto found = std::lower_bound(m_knownStarts.begin(), m_knownStarts.end(), start);
-    if (found == m_knownStarts.end() || *found != start || m_runs.size() != 2)
+    const size_t first = knownLineAt(start);
+    if (first == m_known.size() || m_runs.size() != 2)
         return false;
 
     const qint64 seam =
-        m_runs[1].firstLine < m_starts.size() ? m_starts[m_runs[1].firstLine] : start;
+        m_runs[1].firstLine < m_lines.size() ? m_lines.start(m_runs[1].firstLine) : start;
     m_isSeamUnchanged = seam == m_knownSeam;
     m_hasMoved = !m_isSeamUnchanged;
-    const auto first = static_cast<size_t>(found - m_knownStarts.begin());
-    const size_t joint = m_starts.size();
-    AppendTail(m_starts, m_knownStarts, first);
-    AppendTail(m_marks, m_knownMarks, first);
-    AppendTail(m_checks, m_knownChecks, first);
-    AppendTail(m_matches, m_knownMatches, std::min(first, m_knownMatches.size()));
-    for (Run known : m_knownRuns) {
-        if (known.firstLine <= first) {
-            m_runs[1].firstTime = known.firstTime;
-            m_runs[1].hasDate = known.hasDate;
+    const size_t joint = m_lines.size();
+    LineTable::Reader known(m_known);
+    for (size_t line = first; line < m_known.size(); ++line) {
+        m_lines.Append(known.start(line), m_known.mark(line), m_known.check(line));
+        count(m_lines.size() - 1, 1);
+    }
+    if (m_filter.hasText())
+        m_matches.insert(m_matches.end(),
+                         m_knownMatches.begin() + static_cast<std::ptrdiff_t>(first),
+                         m_knownMatches.end());
+    m_entryEnd = entryEndBefore(m_lines.size());
+    for (Run run : m_knownRuns) {
+        if (run.firstLine <= first) {
+            m_runs[1].firstTime = run.firstTime;
+            m_runs[1].hasDate = run.hasDate;
             continue;
         }
-        known.firstLine += joint - first;
-        m_runs.push_back(known);
+        run.firstLine += joint - first;
+        m_runs.push_back(run);
     }
     m_runHasTimed = true;
-    m_lastTimed = m_starts.size() - 1;
+    m_lastTimed = m_lines.size() - 1;
     m_lineIsPartial = false;
     m_partialLine.clear();
     m_seamLimit = 0;
@@ -382,7 +405,7 @@ void LogIndex::noteTime(LogLineParser::Parts const& parts)
     }
     ++run.timedLines;
     m_runHasTimed = true;
-    m_lastTimed = m_starts.size() - 1;
+    m_lastTimed = m_lines.size() - 1;
     m_lastTime = parts.timeKey;
     if (m_runs.size() == 1) {
         m_newestIsTimed = true;
@@ -393,19 +416,7 @@ void LogIndex::noteTime(LogLineParser::Parts const& parts)
 
 qint64 LogIndex::endOf(size_t line) const
 {
-    return line + 1 < m_starts.size() ? m_starts[line + 1] : m_position;
-}
-
-// The line that has the byte at `offset`, which is `from` or one after it.
-size_t LogIndex::lineAt(qint64 offset, size_t from) const
-{
-    size_t step = 1;
-    while (from + step < m_starts.size() && m_starts[from + step] <= offset)
-        step *= 2;
-    const auto first = m_starts.begin() + static_cast<std::ptrdiff_t>(from);
-    const auto last =
-        m_starts.begin() + static_cast<std::ptrdiff_t>(std::min(from + step, m_starts.size()));
-    return static_cast<size_t>(std::upper_bound(first, last, offset) - m_starts.begin()) - 1;
+    return line + 1 < m_lines.size() ? m_lines.start(line + 1) : m_position;
 }
 
 void LogIndex::BeginSearch(LogFilter const& filter)
@@ -413,8 +424,14 @@ void LogIndex::BeginSearch(LogFilter const& filter)
     m_filter = filter;
     m_search = CandidateSearch(filter, m_parser.fileType().encoding.narrowed());
     m_slowLine = 0;
-    m_searched = filter.hasText() && !m_starts.empty() ? 0 : AllLines;
-    m_matches.assign(filter.hasText() ? m_starts.size() : 0, LogFilter::No);
+    m_searched = filter.hasText() && !m_lines.isEmpty() ? 0 : AllLines;
+    m_matches.assign(filter.hasText() ? m_lines.size() : 0, LogFilter::No);
+    m_matches.shrink_to_fit();
+}
+
+qint64 LogIndex::searchOffset() const
+{
+    return m_searched < size() ? m_lines.start(m_searched) : m_position;
 }
 
 qint64 LogIndex::SearchEnd(qint64 size) const
@@ -422,41 +439,44 @@ qint64 LogIndex::SearchEnd(qint64 size) const
     const qint64 start = searchOffset();
     if (m_position - start <= size)
         return m_position;
-    const size_t line = lineAt(start + size, m_searched);
-    return line > m_searched ? m_starts[line]
+    const size_t line = m_lines.LineAt(start + size);
+    return line > m_searched ? m_lines.start(line)
                              : std::min(endOf(line), start + LineLimit + m_lineEnd.size());
 }
 
 bool LogIndex::Search(QByteArray const& lines, qint64 offset)
 {
     const qint64 end = offset + lines.size();
-    if (searchOffset() >= end)
+    const qint64 start = searchOffset();
+    if (start >= end)
         return false;
     if (m_searched == 0)
         m_search.Learn(lines.constData(), lines.size());
 
     // A line in UTF-16 is narrowed before it is searched.
-    char const* const rest = lines.constData() + (searchOffset() - offset);
+    char const* const rest = lines.constData() + (start - offset);
     char const* const restEnd = lines.constEnd();
     const bool isWide = m_parser.fileType().encoding.isWide();
     char const* const found = isWide ? rest : m_search.Find(rest, restEnd);
     const bool isFound = found != restEnd;
-    const qint64 place = searchOffset() + (found - rest) - (isFound ? 0 : 1);
-    const size_t next = lineAt(place, m_searched) + (isFound ? 0 : 1);
+    const size_t next =
+        isFound ? m_lines.LineAt(start + (found - rest)) : m_lines.LineAt(end - 1) + 1;
     for (; m_searched < next; ++m_searched)
         m_matches[m_searched] = m_search.answer();
     if (isFound)
-        searchLine(lines.constData() + (searchOffset() - offset));
-    if (m_searched >= m_starts.size() || m_slowLine > 0)
+        searchLine(lines, offset);
+    if (m_searched >= m_lines.size() || m_slowLine > 0)
         m_searched = AllLines;
     return searchOffset() < end;
 }
 
-// Asks the filter about the next line.
-void LogIndex::searchLine(char const* line)
+// Searches the next of these lines.
+void LogIndex::searchLine(QByteArray const& lines, qint64 offset)
 {
-    const bool complete = m_lastIsComplete || m_searched + 1 < m_starts.size();
-    const qint64 whole = endOf(m_searched) - searchOffset() - (complete ? 1 : 0);
+    const qint64 start = searchOffset();
+    const bool complete = m_lastIsComplete || m_searched + 1 < m_lines.size();
+    const qint64 whole = endOf(m_searched) - start - (complete ? 1 : 0);
+    char const* line = lines.constData() + (start - offset);
     int length =
         contentLength(line, static_cast<int>(std::min<qint64>(whole, LineLimit)), complete);
     QByteArray narrow;
@@ -473,7 +493,8 @@ bool LogIndex::isEntryMatched(size_t first, size_t end) const
         return true;
     bool isMatched = false;
     for (size_t line = first; line < end; ++line) {
-        if (line > first && !(m_marks[line] & LogRows::Continued))
+        const quint8 mark = m_lines.mark(line);
+        if (line > first && (!(mark & LogRows::Continued) || LogRows::IsAlone(mark)))
             break;
         if (m_matches[line] == LogFilter::Hidden)
             return false;
@@ -482,64 +503,121 @@ bool LogIndex::isEntryMatched(size_t first, size_t end) const
     return isMatched;
 }
 
-void LogIndex::addRow(size_t line, int flags, LogRows& rows) const
+// Of a line that belongs to no entry, the line itself.
+size_t LogIndex::firstLineOfEntry(size_t line) const
 {
-    const auto mark = static_cast<quint8>(m_marks[line] | flags);
-    rows.add(m_starts[line], mark, m_checks[line]);
-    if (LogSeverities::IsProblem(SeverityOf(mark)) && !(mark & LogRows::Continued))
-        ++rows.problems;
+    while ((m_lines.mark(line) & LogRows::Continued) && !LogRows::IsAlone(m_lines.mark(line)))
+        --line;
+    return line;
+}
+
+// Up to where lines without a stamp would belong to the entry of the line before this one.
+size_t LogIndex::entryEndBefore(size_t line) const
+{
+    if (line == 0)
+        return 0;
+    const size_t first = firstLineOfEntry(line - 1);
+    return first + (LogRows::BeginsEntry(m_lines.mark(first)) ? MaximumEntryLines : 1);
+}
+
+size_t LogIndex::endOfRun(size_t number) const
+{
+    return number + 1 == m_runs.size() ? m_lines.size() : m_runs[number + 1].firstLine;
+}
+
+void LogIndex::addRest(Rest rest, LogFilter const& filter, LogRows& rows) const
+{
+    const auto context = static_cast<size_t>(filter.context());
+    bool isMatched = false;
+    for (size_t line = rest.from; line < rest.end; ++line) {
+        const quint8 mark = m_lines.mark(line);
+        const bool isAlone = LogRows::IsAlone(mark);
+        if (!(mark & LogRows::Continued) || isAlone)
+            isMatched = isEntryMatched(line, isAlone ? line + 1 : rest.end);
+        if (isMatched && filter.Shows(SeverityOf(mark))) {
+            rest.next = std::max(rest.next, line - std::min(line, context));
+            for (; rest.next < line; ++rest.next)
+                rows.AddLine(rest.next, true);
+            rows.AddLine(line, false);
+            rest.contextEnd = line + context + 1;
+        } else if (line < rest.contextEnd) {
+            rows.AddLine(line, true);
+        } else {
+            continue;
+        }
+        rest.next = line + 1;
+    }
 }
 
 void LogIndex::addRun(size_t number, LogFilter const& filter, LogRows& rows) const
 {
-    const bool isLast = number + 1 == m_runs.size();
-    const size_t end = isLast ? m_starts.size() : m_runs[number + 1].firstLine;
-    const auto context = static_cast<size_t>(filter.context());
-    size_t entryEnd = 0; // at most
-    bool isMatched = false;
-    size_t next = m_runs[number].firstLine; // the first line not added yet
-    size_t contextEnd = next;               // up to here, lines follow a hit
-    for (size_t line = next; line < end; ++line) {
-        const quint8 mark = m_marks[line];
-        const bool isContinued = mark & LogRows::Continued;
-        const bool isAlone = isContinued && line >= entryEnd;
-        if (!isContinued)
-            entryEnd = LogRows::BeginsEntry(mark) ? line + MaximumEntryLines : line + 1;
-        if (!isContinued || isAlone)
-            isMatched = isEntryMatched(line, isAlone ? line + 1 : std::min(entryEnd, end));
-        if (isMatched && filter.Shows(SeverityOf(mark))) {
-            for (next = std::max(next, line - std::min(line, context)); next < line; ++next)
-                addRow(next, LogRows::Context | LogRows::Alone, rows);
-            addRow(line, isAlone ? LogRows::Alone : 0, rows);
-            contextEnd = line + context + 1;
-        } else if (line < contextEnd) {
-            addRow(line, LogRows::Context | LogRows::Alone, rows);
-        } else {
-            continue;
-        }
-        next = line + 1;
+    const size_t first = m_runs[number].firstLine;
+    const size_t end = endOfRun(number);
+    if (!ShowsAll(filter))
+        addRest({first, end, first, first}, filter, rows);
+    else if (m_runs.size() == 1)
+        rows.AddLines(first, end, countProblems());
+    else
+        rows.AddLines(first, end);
+}
+
+size_t LogIndex::countProblems() const
+{
+    size_t problems = 0;
+    for (int severity = LogEntry::Trace; severity <= LogEntry::None; ++severity) {
+        if (LogSeverities::IsProblem(static_cast<LogEntry::Severity>(severity)))
+            problems += m_counts[static_cast<size_t>(severity)];
     }
+    return problems;
 }
 
 LogRows LogIndex::Rows(LogFilter const& filter) const
 {
-    LogRows rows;
-    rows.starts.reserve(m_starts.size() + 2);
-    rows.marks.reserve(m_starts.size() + 2);
-    rows.checks.reserve(m_starts.size() + 2);
+    LogRows rows(m_lines, endOfRun(0), completeOffset(), m_position);
     if (filter.earlierRuns() && m_runs.size() > 1) {
-        rows.add(LogRows::EarlierHeading, LogEntry::None);
+        rows.AddHeading(LogRows::EarlierHeading);
         for (size_t number = m_runs.size() - 1; number > 0; --number)
             addRun(number, filter, rows);
-        rows.earlier = rows.size() > 1 ? rows.size() : 0;
-        if (rows.earlier == 0)
-            rows = LogRows();
-        else
-            rows.add(LogRows::NewestHeading, LogEntry::None);
+        if (rows.size() > 1) {
+            rows.EndEarlier();
+            rows.AddHeading(LogRows::NewestHeading);
+        } else {
+            rows.Truncate(0);
+        }
     }
     addRun(0, filter, rows);
-    rows.complete = completeOffset();
-    rows.end = m_position;
+    return rows;
+}
+
+// The fast path for following a large file, see docs/performance.md; tst_PlainLogRows compares it
+// with the other one.
+//
+// Where the lines differ, an entry may begin earlier, and whether it matches depends on all of its
+// lines. Lines before it may be the context of what follows; those that were are not taken over.
+LogRows LogIndex::Rows(LogFilter const& filter, LogRows const& before) const
+{
+    if (m_runs.size() > 1 || before.earlier() > 0 || m_slowLine > 0 || ShowsAll(filter))
+        return Rows(filter);
+
+    Rest rest{0, m_lines.size(), 0, 0};
+    rest.from = std::min(before.lines().CountSame(m_lines), before.newestEnd());
+    if (rest.from > 0)
+        rest.from = firstLineOfEntry(rest.from - 1);
+    size_t kept = before.RowOfLine(rest.from);
+    size_t hits = kept; // the rows up to the last one that is no context
+    while (hits > 0 && (before.mark(hits - 1) & LogRows::Context))
+        --hits;
+    if (hits > 0)
+        rest.contextEnd = before.line(hits - 1) + static_cast<size_t>(filter.context()) + 1;
+    while (kept > hits && before.line(kept - 1) >= rest.contextEnd)
+        --kept;
+    if (kept > 0)
+        rest.next = before.line(kept - 1) + 1;
+
+    LogRows rows = before;
+    rows.Truncate(kept);
+    rows.SetLines(m_lines, m_lines.size(), completeOffset(), m_position);
+    addRest(rest, filter, rows);
     return rows;
 }
 

@@ -4,6 +4,8 @@
 #pragma once
 
 #include "app/logfile/CandidateSearch.h"
+#include "app/logfile/LineTable.h"
+#include "app/logfile/LogEntry.h"
 #include "app/logfile/LogFilter.h"
 #include "app/logfile/LogLineParser.h"
 #include "app/logfile/LogRows.h"
@@ -85,7 +87,7 @@ public:
 
     /// The offset of the first line that has not been searched; nextOffset() if there is none or
     /// slowLine() is known.
-    qint64 searchOffset() const { return m_searched < size() ? m_starts[m_searched] : m_position; }
+    qint64 searchOffset() const;
 
     /// How many lines have been searched: all, if no search is under way.
     size_t searchedLines() const { return std::min(m_searched, size()); }
@@ -110,11 +112,21 @@ public:
     /// MaximumEntryLines, and lines that continue no entry, are shown or not by themselves.
     LogRows Rows(LogFilter const& filter) const;
 
+    /// The same, but without looking again at lines that were there before. While there is only one
+    /// run, this takes as long as the number of new lines demands.
+    ///
+    /// @param before  rows of this index with the same filter, of any moment, or none
+    LogRows Rows(LogFilter const& filter, LogRows const& before) const;
+
     /// Where the next pass will begin. Everything before it is final.
     qint64 resumeOffset() const;
 
     /// The number of lines in the file.
-    size_t size() const { return m_starts.size(); }
+    size_t size() const { return m_lines.size(); }
+
+    /// The numbers of entries in the file. None stands for entries without a severity and for other
+    /// lines that do not continue an entry; see LogRows::Continued.
+    LogCounts const& counts() const { return m_counts; }
 
     /// Whether the file was seen growing at its end, so that all of its lines are of one run.
     bool isOneRun() const { return m_isOneRun; }
@@ -124,7 +136,7 @@ public:
 
     /// Whether lines that were found after the seam have not been reached in this pass. Until they
     /// are, Rows() lacks them.
-    bool awaitsKnownLines() const { return !m_knownStarts.empty() && m_runs.size() == 1; }
+    bool awaitsKnownLines() const { return hasKnownLines() && m_runs.size() == 1; }
 
     /// Whether the last pass found no seam, although there had been one. Either the newest run has
     /// overwritten all earlier ones, or it has changed what follows it in a way that a pass over
@@ -166,22 +178,39 @@ private:
         bool hasDate = false;
     };
 
+    // Lines that are not among the rows yet.
+    struct Rest
+    {
+        size_t from;       // the first line to decide about
+        size_t end;        // and the line after the last one
+        size_t next;       // the first line that can still be shown as context
+        size_t contextEnd; // up to here, lines follow a hit
+    };
+
     bool isEntryMatched(size_t first, size_t end) const;
-    void addRow(size_t line, int flags, LogRows& rows) const;
+    size_t firstLineOfEntry(size_t line) const;
+    size_t entryEndBefore(size_t line) const;
+    size_t endOfRun(size_t number) const;
+    void addRest(Rest rest, LogFilter const& filter, LogRows& rows) const;
     void addRun(size_t number, LogFilter const& filter, LogRows& rows) const;
+    size_t countProblems() const;
+    void count(size_t line, int step);
+    void setMark(size_t line, quint8 mark);
+    bool hasKnownLines() const { return m_known.size() > m_knownFirst; }
+    size_t knownLineAt(qint64 start) const;
     size_t resumeLine() const;
     void forgetFrom(size_t line);
     bool addLine(char const* line, int length, bool complete);
-    quint8 markOf(LogLineParser::Parts const& parts) const;
+    quint8 markOf(LogLineParser::Parts const& parts);
     int contentLength(char const* line, int length, bool complete) const;
     LogFilter::Match matchOf(char const* line, int length, size_t index);
     qint64 endOf(size_t line) const;
-    size_t lineAt(qint64 offset, size_t from) const;
-    void searchLine(char const* line);
+    void searchLine(QByteArray const& lines, qint64 offset);
     bool isSeam(LogLineParser::Parts const& parts, qint64 end) const;
     bool isOlder(LogLineParser::Parts const& parts) const;
     bool isKnown(LogLineParser::Parts const& parts, qint64 end) const;
     void keepKnownLines();
+    void forgetKnownLines();
     void joinRuns();
     void beginRun(LogLineParser::Parts const& parts);
     bool joinKnownLines(qint64 start);
@@ -193,11 +222,11 @@ private:
     size_t m_searched = AllLines;
     LogLineEnd m_lineEnd;
 
-    std::vector<qint64> m_starts;
-    std::vector<quint8> m_marks;
-    std::vector<quint16> m_checks;
+    LineTable m_lines;
     std::vector<quint8> m_matches; // a LogFilter::Match for each line; empty without a text
-    std::vector<Run> m_runs;       // newest first, as in the file
+    LogCounts m_counts{};
+    size_t m_entryEnd = 0;   // lines from here on do not belong to the entry above
+    std::vector<Run> m_runs; // newest first, as in the file
     bool m_hasElapsed = false;
     bool m_hasTimes = false;
     bool m_hasSeverities = false;
@@ -229,9 +258,8 @@ private:
     qint64 m_knownEnd = 0;
     qint64 m_knownSeam = -1; // -1: there was none
     bool m_isSeamUnchanged = false;
-    std::vector<qint64> m_knownStarts;
-    std::vector<quint8> m_knownMarks;
-    std::vector<quint16> m_knownChecks;
+    LineTable m_known;       // from m_knownFirst on
+    size_t m_knownFirst = 0; // the first line after the seam
     std::vector<quint8> m_knownMatches;
     std::vector<Run> m_knownRuns;
 };

@@ -50,7 +50,7 @@ class Times
 {
 public:
     Times(LogLocateRequest const& request, std::function<bool()> isCancelled)
-        : m_request(request), m_isCancelled(std::move(isCancelled)),
+        : m_request(request), m_isCancelled(std::move(isCancelled)), m_starts(*request.rows),
           m_count(static_cast<int>(request.rows->size()))
     {
         m_isOpen = m_reader.Open(request.path, request.parser.fileType());
@@ -84,8 +84,8 @@ private:
     LogLineParser::Parts parts(int row)
     {
         const auto position = static_cast<size_t>(row);
-        const qint64 start = m_request.rows->starts[position];
-        if (!m_isOpen || start < 0 || !(m_request.rows->marks[position] & LogRows::Timed))
+        const qint64 start = m_starts.start(position);
+        if (!m_isOpen || start < 0 || !(m_request.rows->mark(position) & LogRows::Timed))
             return LogLineParser::Parts();
         const QByteArray bytes = m_reader.Line(start);
         char const* line = bytes.constData();
@@ -147,6 +147,7 @@ private:
     LogLocateRequest const& m_request;
     std::function<bool()> m_isCancelled;
     LogLineReader m_reader;
+    LogRows::Reader m_starts;
     bool m_isOpen = false;
     int m_count;
 };
@@ -160,7 +161,7 @@ LogLocation LineIn(LogLocateRequest const& request, std::function<bool()> const&
         return location;
     }
     location.row = request.rows->RowNear(start);
-    if (location.row >= 0 && request.rows->starts[static_cast<size_t>(location.row)] != start)
+    if (location.row >= 0 && request.rows->start(static_cast<size_t>(location.row)) != start)
         location.answer = LogLocation::Nearest;
     return location;
 }
@@ -185,7 +186,7 @@ void LogLocator::Locate(LogLocateRequest const& request)
         return;
     location.number = request.number;
     if (location.row >= 0)
-        location.start = request.rows->starts[static_cast<size_t>(location.row)];
+        location.start = request.rows->start(static_cast<size_t>(location.row));
     Q_EMIT located(location);
 }
 

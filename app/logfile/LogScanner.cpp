@@ -185,6 +185,7 @@ bool LogScanner::search(QFile& file)
     QByteArray lines;
     int reported = 0;
     m_isReset = true;
+    m_isOtherText = true;
     m_sinceReport.start();
     m_reportCost = 0;
     m_index.BeginSearch(m_filter);
@@ -402,18 +403,24 @@ void LogScanner::report(bool isPartial)
 {
     LogUpdate update;
     update.request = m_request;
-    update.rows = std::make_shared<LogRows>(m_index.Rows(m_filter));
+    const bool isAllNew = m_isReset || m_isOtherText;
+    update.rows = std::make_shared<LogRows>(isAllNew ? m_index.Rows(m_filter)
+                                                     : m_index.Rows(m_filter, *m_rows));
+    m_isOtherText = !m_isSearched;
     update.isPartial = isPartial;
     update.isReset = m_isReset;
     if (!m_isReset)
         update.Compare(*m_rows);
+    update.counts = m_index.counts();
     const bool nothingNew = !update.isReset && update.removed == 0 && update.inserted == 0 &&
                             update.changedTail == 0 && update.rows->size() == m_rows->size() &&
-                            m_index.searchedLines() == m_lines && m_isPartial == isPartial;
+                            m_index.searchedLines() == m_lines && update.counts == m_counts &&
+                            m_isPartial == isPartial;
     m_isReset = false;
     m_isPartial = isPartial;
     m_rows = update.rows;
     m_lines = m_index.searchedLines();
+    m_counts = update.counts;
     update.exists = m_exists;
     update.error = m_error;
     update.lines = m_lines;

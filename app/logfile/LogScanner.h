@@ -115,9 +115,10 @@ private:
     int m_sliceSize = 1 << 20;
     int m_interval = 200;
     QElapsedTimer m_sinceReport;
-    qint64 m_reportCost = 0;  // milliseconds
-    bool m_isReset = true;    // the next update
-    bool m_isPartial = false; // the last update
+    qint64 m_reportCost = 0;    // milliseconds
+    bool m_isReset = true;      // the next update
+    bool m_isPartial = false;   // the last update
+    bool m_isOtherText = false; // of the filter, than when the last rows were made
 
     QFileSystemWatcher* m_watcher = nullptr;
     QTimer* m_lookTimer = nullptr;
@@ -139,6 +140,7 @@ private:
     qint64 m_anchorEnd = 0;
     QByteArray m_tail;
     size_t m_lines = 0; // as reported
+    LogCounts m_counts{};
 };
 
 } // namespace Velocor

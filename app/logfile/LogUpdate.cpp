@@ -9,38 +9,55 @@ namespace Velocor {
 
 namespace {
 
-bool SameRow(LogRows const& a, size_t i, LogRows const& b, size_t j)
+// Two lists of rows, which are compared row by row.
+class Pair
 {
-    return a.starts[i] == b.starts[j] && a.marks[i] == b.marks[j] && a.checks[i] == b.checks[j];
-}
+public:
+    Pair(LogRows const& before, LogRows const& after)
+        : m_before(before), m_after(after), m_beforeReader(before), m_afterReader(after)
+    {}
+
+    bool isSame(size_t before, size_t after)
+    {
+        return m_before.mark(before) == m_after.mark(after) &&
+               m_before.check(before) == m_after.check(after) &&
+               m_beforeReader.start(before) == m_afterReader.start(after);
+    }
+
+private:
+    LogRows const& m_before;
+    LogRows const& m_after;
+    LogRows::Reader m_beforeReader;
+    LogRows::Reader m_afterReader;
+};
 
 } // namespace
 
 void LogUpdate::Compare(LogRows const& before)
 {
     LogRows const& after = *rows;
-    const size_t newestBefore = before.size() - before.earlier;
-    const size_t newestAfter = after.size() - after.earlier;
-    isReset = (before.earlier == 0) != (after.earlier == 0) || newestAfter < newestBefore;
+    const size_t newestBefore = before.size() - before.earlier();
+    const size_t newestAfter = after.size() - after.earlier();
+    isReset = (before.earlier() == 0) != (after.earlier() == 0) || newestAfter < newestBefore;
     if (isReset)
         return;
 
-    const size_t shorter = std::min(before.earlier, after.earlier);
+    Pair pair(before, after);
+    const size_t shorter = std::min(before.earlier(), after.earlier());
     size_t front = 0;
-    while (front < shorter && SameRow(before, front, after, front))
+    while (front < shorter && pair.isSame(front, front))
         ++front;
     size_t back = 0;
     // cppcheck-suppress knownConditionTrueFalse ; the loop above may stop before `shorter`
     while (back < shorter - front &&
-           SameRow(before, before.earlier - 1 - back, after, after.earlier - 1 - back))
+           pair.isSame(before.earlier() - 1 - back, after.earlier() - 1 - back))
         ++back;
     changeAt = front;
-    removed = before.earlier - front - back;
-    inserted = after.earlier - front - back;
+    removed = before.earlier() - front - back;
+    inserted = after.earlier() - front - back;
 
-    size_t same = 0;
-    while (same < newestBefore &&
-           SameRow(before, before.earlier + same, after, after.earlier + same))
+    size_t same = before.CountSame(after);
+    while (same < newestBefore && pair.isSame(before.earlier() + same, after.earlier() + same))
         ++same;
     changedTail = newestBefore - same;
 }

@@ -32,6 +32,7 @@ struct LogUpdate
     bool exists = true;
     QString error; ///< why the file could not be read; empty if it could
     size_t lines = 0;
+    LogCounts counts{};  ///< of the whole file, whatever the filter; see LogIndex::counts()
     size_t slowLine = 0; ///< see LogIndex::slowLine()
     bool hasElapsed = false;
     bool hasTimes = false;

@@ -146,7 +146,7 @@ QStringList LastLines(QString const& path, int count)
     const LogRows rows = RowsOf(file);
     QStringList lines;
     for (size_t row = rows.size(); row > 0 && lines.size() < count; --row) {
-        const qint64 start = rows.starts[row - 1];
+        const qint64 start = rows.start(row - 1);
         if (start >= 0)
             lines.prepend(LineAt(file, start));
     }

@@ -247,11 +247,11 @@ void tst_LogFinder::wideCharacters()
     LogLineReader reader;
     QVERIFY(reader.Open(m_file, request.type));
     for (size_t line : {size_t(9998), size_t(3), size_t(9999), size_t(0)}) {
-        const qint64 start = request.rows->starts[line];
+        const qint64 start = request.rows->start(line);
         const QByteArray bytes = reader.Line(start);
         QCOMPARE(bytes, Wide(text.split("\r\n")[int(line)] +
                              (line == 9999 ? QString(QChar(0x20ac)) : "")));
-        const qint64 next = line == 9999 ? log.size() : request.rows->starts[line + 1];
+        const qint64 next = line == 9999 ? log.size() : request.rows->start(line + 1);
         QCOMPARE(reader.nextStart(), next);
     }
 }

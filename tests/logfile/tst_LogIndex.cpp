@@ -47,13 +47,13 @@ QStringList Texts(LogIndex const& index, QByteArray const& file,
     QStringList texts;
     const LogRows rows = index.Rows(filter);
     for (size_t row = 0; row < rows.size(); ++row) {
-        const int start = static_cast<int>(rows.starts[row]);
+        const int start = static_cast<int>(rows.start(row));
         if (start < 0) {
             texts.append(start == LogRows::EarlierHeading ? "[earlier]" : "[newest]");
             continue;
         }
         const int end = file.indexOf('\n', start);
-        const QString torn = rows.marks[row] & LogRows::Torn ? "torn: " : "";
+        const QString torn = rows.mark(row) & LogRows::Torn ? "torn: " : "";
         texts.append(torn + QString::fromLatin1(file.mid(start, end < 0 ? -1 : end - start)));
     }
     return texts;
@@ -97,10 +97,14 @@ private slots:
     void anotherText();
     void partOfASearch();
     void textFilterOfLongLines();
+    void slowLineAfterOthers();
+    void entryUntilItGoesOn();
     void textFilterOfEntries_data();
     void textFilterOfEntries();
     void longEntry();
     void problems();
+    void counts_data();
+    void counts();
     void passesOverAWritingRun_data();
     void passesOverAWritingRun();
     void growthAtTheEndMakesOneRun();
@@ -317,9 +321,9 @@ void tst_LogIndex::continuedLinesGoWithTheirEntry()
     const LogRows rows = index.Rows(LogFilter());
     for (size_t row = 0; row < 3; ++row)
         QCOMPARE(rows.severity(row), LogEntry::Error);
-    QCOMPARE(rows.marks[0] & LogRows::Continued, 0);
-    QVERIFY(rows.marks[1] & LogRows::Continued);
-    QCOMPARE(rows.problems, size_t(1));
+    QCOMPARE(rows.mark(0) & LogRows::Continued, 0);
+    QVERIFY(rows.mark(1) & LogRows::Continued);
+    QCOMPARE(rows.problems(), size_t(1));
 }
 
 void tst_LogIndex::textFilter()
@@ -430,12 +434,43 @@ void tst_LogIndex::textFilterOfLongLines()
     QCOMPARE(index.size(), size_t(3));
     const LogRows rows = index.Rows(filter);
     QCOMPARE(rows.size(), size_t(2));
-    QCOMPARE(rows.starts[1], qint64(file.lastIndexOf('\n') + 1));
+    QCOMPARE(rows.start(1), qint64(file.lastIndexOf('\n') + 1));
 
     LogIndex again;
     Pass(again, file, 4099);
     Search(again, file, filter, 4099);
-    QCOMPARE(again.Rows(filter).starts, rows.starts);
+    const LogRows rowsAgain = again.Rows(filter);
+    QCOMPARE(rowsAgain.size(), size_t(2));
+    QCOMPARE(rowsAgain.start(1), rows.start(1));
+}
+
+// From then on all lines match, also those that did not.
+void tst_LogIndex::slowLineAfterOthers()
+{
+    LogFilter filter;
+    QVERIFY(filter.SetText("(a+)+[b-z]$", true, true));
+    LogIndex index{LogLineParser(), filter};
+    QByteArray file = run(3, QTime(9, 0), "X");
+    Pass(index, file, 4096);
+    const LogRows before = index.Rows(filter);
+    QCOMPARE(before.size(), size_t(0));
+    file += entry("09:00:03.000", "Trace", QString(40, 'a') + '-');
+    Pass(index, file, 4096);
+    QCOMPARE(index.slowLine(), size_t(4));
+    QCOMPARE(index.Rows(filter, before).size(), size_t(4));
+}
+
+// What looks like an entry while its last word is not complete is none, and has no more lines.
+void tst_LogIndex::entryUntilItGoesOn()
+{
+    LogIndex index;
+    Pass(index, "a\n5 Error", 4096);
+    QCOMPARE(uint(index.Rows(LogFilter()).mark(1)), uint(LogEntry::Error));
+    Pass(index, "a\n5 Errorless\nb\n", 4096);
+    const LogRows rows = index.Rows(LogFilter());
+    const auto alone = uint(LogEntry::None | LogRows::Continued | LogRows::Alone);
+    QCOMPARE(uint(rows.mark(1)), alone);
+    QCOMPARE(uint(rows.mark(2)), alone);
 }
 
 void tst_LogIndex::textFilterOfEntries_data()
@@ -497,8 +532,8 @@ void tst_LogIndex::longEntry()
     Pass(other, file, 4096);
     const LogRows rows = other.Rows(filter);
     QCOMPARE(Texts(other, file, filter), QStringList("1001th"));
-    QCOMPARE(uint(rows.marks[0]), uint(LogEntry::Error | LogRows::Continued | LogRows::Alone));
-    QCOMPARE(rows.problems, size_t(0));
+    QCOMPARE(uint(rows.mark(0)), uint(LogEntry::Error | LogRows::Continued | LogRows::Alone));
+    QCOMPARE(rows.problems(), size_t(0));
 }
 
 void tst_LogIndex::problems()
@@ -509,7 +544,38 @@ void tst_LogIndex::problems()
         entry("09:00:04.000", "Notification", "e");
     LogIndex index;
     Pass(index, file, 4096);
-    QCOMPARE(index.Rows(LogFilter()).problems, size_t(3));
+    QCOMPARE(index.Rows(LogFilter()).problems(), size_t(3));
+}
+
+void tst_LogIndex::counts_data()
+{
+    QTest::addColumn<QByteArray>("file");
+    QTest::addColumn<QString>("counts"); // from Trace to Fatal, and None
+
+    const auto row = [](char const* name, QByteArray const& file, char const* counts) {
+        QTest::newRow(name) << file << QString(counts);
+    };
+    const QByteArray error = entry("09:00:00.000", "Error", "a");
+    row("an empty file", "", "0 0 0 0 0 0");
+    row("each severity", run(20, QTime(9, 0), "x") + error, "16 0 3 2 0 0");
+    row("continued lines are not counted", error + "more\nand more\n", "0 0 0 1 0 0");
+    row("a line before any entry", "what\n" + error, "0 0 0 1 0 1");
+    row("an entry without a severity", entry("09:00:00.000", "", "?"), "0 0 0 0 0 1");
+    row("an entry without a line end", error + error.trimmed(), "0 0 0 2 0 0");
+    row("earlier runs, and a torn line",
+        error + "n entry\n" + entry("06:00:00.000", "Fatal", "b") + "more\n", "0 0 0 1 1 1");
+}
+
+void tst_LogIndex::counts()
+{
+    QFETCH(QByteArray, file);
+    QFETCH(QString, counts);
+    LogIndex index;
+    Pass(index, file, 4096);
+    QStringList found;
+    for (size_t count : index.counts())
+        found.append(QString::number(count));
+    QCOMPARE(found.join(' '), counts);
 }
 
 void tst_LogIndex::passesOverAWritingRun_data()
@@ -558,7 +624,7 @@ void tst_LogIndex::growthAtTheEndMakesOneRun()
     Pass(index, file, 4096);
     QCOMPARE(Texts(index, file), Lines(file));
     QVERIFY(index.isOneRun());
-    QCOMPARE(index.Rows(LogFilter()).marks[1] & LogRows::Torn, 0);
+    QCOMPARE(index.Rows(LogFilter()).mark(1) & LogRows::Torn, 0);
 
     // Nor is another one looked for.
     file += "continued\n" + entry("01:00:00.000", "Trace", "and back again");
@@ -600,16 +666,16 @@ void tst_LogIndex::checks()
     const LogRows rows = index.Rows(LogFilter());
     QCOMPARE(rows.size(), size_t(7));
     for (size_t row = 0; row < rows.size(); ++row) {
-        const QByteArray text = file.mid(int(rows.starts[row])).split('\n').first();
+        const QByteArray text = file.mid(int(rows.start(row))).split('\n').first();
         const int length = text.endsWith('\r') ? text.size() - 1 : text.size();
-        QCOMPARE(rows.checks[row], LogRows::CheckOf(text.constData(), length));
+        QCOMPARE(rows.check(row), LogRows::CheckOf(text.constData(), length));
     }
-    QCOMPARE(rows.checks[0], rows.checks[2]);
-    QVERIFY(rows.checks[0] != rows.checks[1]);
-    QVERIFY(rows.checks[0] != rows.checks[3]);
-    QCOMPARE(rows.checks[4], rows.checks[5]); // only the start counts
-    QCOMPARE(rows.complete, qint64(file.size() - 1));
-    QCOMPARE(rows.end, qint64(file.size()));
+    QCOMPARE(rows.check(0), rows.check(2));
+    QVERIFY(rows.check(0) != rows.check(1));
+    QVERIFY(rows.check(0) != rows.check(3));
+    QCOMPARE(rows.check(4), rows.check(5)); // only the start counts
+    QCOMPARE(rows.complete(), qint64(file.size() - 1));
+    QCOMPARE(rows.end(), qint64(file.size()));
 }
 
 void tst_LogIndex::incompleteLastLine()

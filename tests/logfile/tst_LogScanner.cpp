@@ -65,8 +65,9 @@ public:
     {
         QStringList rows;
         const QByteArray file = TestFiles::read(m_path);
-        for (qint64 start : updates.last().rows->starts) {
-            const int at = static_cast<int>(start);
+        LogRows const& all = *updates.last().rows;
+        for (size_t row = 0; row < all.size(); ++row) {
+            const int at = static_cast<int>(all.start(row));
             rows.append(at < 0 ? QString("[heading]")
                                : QString(file.mid(at, file.indexOf('\n', at) - at)));
         }
@@ -166,6 +167,7 @@ private slots:
     void changesDuringASearch_data();
     void changesDuringASearch();
     void cancelledSearch();
+    void countsOfHiddenEntries();
     void obsoleteFilterOfAMissingFile();
 
 private:
@@ -1008,6 +1010,27 @@ void tst_LogScanner::cancelledSearch()
     reader.scanner.Poll();
     QCOMPARE(reader.updates.size(), 3);
     QCOMPARE(reader.updates.last().rows->size(), size_t(3 << 10));
+}
+
+// The last line becomes an entry of another severity, which is hidden.
+void tst_LogScanner::countsOfHiddenEntries()
+{
+    const QByteArray first = run(3, QTime(8, 0), "of the log's own");
+    const QByteArray error = entry("09:00:00.000", "Error", "a");
+    QVERIFY(TestFiles::write(m_file, first + error.left(error.indexOf("Error")) + "Fatal"));
+    LogFilter filter;
+    filter.SetSeverity(LogEntry::Error, false);
+    filter.SetSeverity(LogEntry::Fatal, false);
+    Reader reader(m_file);
+    reader.Open(1, filter);
+    QCOMPARE(reader.updates.last().counts[LogEntry::Fatal], size_t(1));
+    QVERIFY(TestFiles::write(m_file, first + error));
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 2);
+    QVERIFY(!reader.updates.last().isReset);
+    QCOMPARE(reader.updates.last().rows->size(), size_t(3));
+    QCOMPARE(reader.updates.last().counts[LogEntry::Fatal], size_t(0));
+    QCOMPARE(reader.updates.last().counts[LogEntry::Error], size_t(1));
 }
 
 void tst_LogScanner::obsoleteFilterOfAMissingFile()

@@ -150,8 +150,8 @@ void tst_LogTerms::context()
     const LogRows rows = index.Rows(filter);
     QString found;
     for (size_t row = 0; row < rows.size(); ++row) {
-        const int line = log.left(static_cast<int>(rows.starts[row])).count('\n');
-        found += QChar((rows.marks[row] & LogRows::Context ? 'a' : 'A') + line);
+        const int line = log.left(static_cast<int>(rows.start(row))).count('\n');
+        found += QChar((rows.mark(row) & LogRows::Context ? 'a' : 'A') + line);
     }
     QCOMPARE(found, shown);
 }
@@ -171,8 +171,8 @@ void tst_LogTerms::contextOfSeverities()
     index.End();
     const LogRows rows = index.Rows(filter);
     QCOMPARE(rows.size(), size_t(3));
-    QVERIFY(rows.marks[0] & LogRows::Context);
-    QVERIFY(!(rows.marks[1] & LogRows::Context));
+    QVERIFY(rows.mark(0) & LogRows::Context);
+    QVERIFY(!(rows.mark(1) & LogRows::Context));
 }
 
 QTEST_GUILESS_MAIN(tst_LogTerms)

@@ -9,15 +9,30 @@ using namespace Velocor;
 
 namespace {
 
+// A line of one byte for each letter.
+LineTable Letters(char marked = '\0', quint8 mark = LogEntry::Trace, quint16 check = 0)
+{
+    LineTable lines;
+    for (char letter = 0; letter < 127; ++letter) {
+        const bool isMarked = letter == marked;
+        lines.Append(letter, isMarked ? mark : quint8(LogEntry::Trace), isMarked ? check : 0);
+    }
+    return lines;
+}
+
 // Rows, one letter each: first those of the earlier part. Rows are identified by where they start;
 // here the letter does that.
-std::shared_ptr<LogRows> Rows(char const* earlier, char const* newest)
+std::shared_ptr<LogRows> Rows(char const* earlier, char const* newest,
+                              LineTable const& lines = Letters())
 {
-    auto rows = std::make_shared<LogRows>();
-    const QByteArray all = QByteArray(earlier) + newest;
-    for (char letter : all)
-        rows->add(letter, 0);
-    rows->earlier = qstrlen(earlier);
+    auto rows = std::make_shared<LogRows>(lines);
+    const auto add = [&](char const* letters) {
+        for (; *letters; ++letters)
+            rows->AddLine(static_cast<size_t>(*letters), false);
+    };
+    add(earlier);
+    rows->EndEarlier();
+    add(newest);
     return rows;
 }
 
@@ -88,9 +103,7 @@ void tst_LogUpdate::compare()
 void tst_LogUpdate::marksCount()
 {
     LogUpdate update;
-    const auto after = Rows("", "xy");
-    after->marks[1] = LogRows::Torn;
-    update.rows = after;
+    update.rows = Rows("", "xy", Letters('y', LogRows::Torn));
     update.Compare(*Rows("", "xy"));
     QVERIFY(!update.isReset);
     QCOMPARE(update.changedTail, size_t(1));
@@ -100,9 +113,7 @@ void tst_LogUpdate::marksCount()
 void tst_LogUpdate::checksCount()
 {
     LogUpdate update;
-    const auto after = Rows("", "xyz");
-    after->checks[1] = 1;
-    update.rows = after;
+    update.rows = Rows("", "xyz", Letters('y', LogEntry::Trace, 1));
     update.Compare(*Rows("", "xyz"));
     QVERIFY(!update.isReset);
     QCOMPARE(update.changedTail, size_t(2));

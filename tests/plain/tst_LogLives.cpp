@@ -260,9 +260,11 @@ private:
 void tst_LogLives::compare(Life const& life, View const& view)
 {
     QVector<int> rows;
-    for (qint64 start : view.rows().starts) {
+    LogRows::Reader reader(view.rows());
+    for (size_t row = 0; row < view.rows().size(); ++row) {
+        const int start = static_cast<int>(reader.start(row));
         if (start >= 0)
-            rows.append(static_cast<int>(start));
+            rows.append(start);
     }
     QVector<int> sorted = rows;
     std::sort(sorted.begin(), sorted.end());

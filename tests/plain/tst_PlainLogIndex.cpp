@@ -110,6 +110,41 @@ PlainLine const& parsed(QByteArray const& text, bool readsTimes)
     return *line;
 }
 
+// Rows in vectors.
+struct PlainRows
+{
+    PlainRows() = default;
+
+    explicit PlainRows(LogRows const& rows) : earlier(rows.earlier()), problems(rows.problems())
+    {
+        LogRows::Reader reader(rows);
+        for (size_t row = 0; row < rows.size(); ++row)
+            add(reader.start(row), rows.mark(row), rows.check(row));
+    }
+
+    void add(qint64 start, quint8 mark, quint16 check = 0)
+    {
+        starts.push_back(start);
+        marks.push_back(mark);
+        checks.push_back(check);
+    }
+
+    void putHeadingFirst(qint64 start)
+    {
+        starts.insert(starts.begin(), start);
+        marks.insert(marks.begin(), LogEntry::None);
+        checks.insert(checks.begin(), 0);
+    }
+
+    size_t size() const { return starts.size(); }
+
+    std::vector<qint64> starts;
+    std::vector<quint8> marks;
+    std::vector<quint16> checks;
+    size_t earlier = 0;
+    size_t problems = 0;
+};
+
 // The whole file, split and sorted out again. It may be told which entries were seen after the
 // newest run: by where they start, with their text.
 class PlainIndex
@@ -162,10 +197,17 @@ public:
             run.afterTimed = run.rows.size();
             ++run.timed;
         }
+        for (Run const& run : runs) {
+            for (Row const& row : run.rows) {
+                if (!(row.mark & LogRows::Continued))
+                    ++counts[row.mark & LogRows::SeverityMask];
+            }
+        }
         collect(filter);
     }
 
-    LogRows rows;
+    PlainRows rows;
+    LogCounts counts{};
     size_t lineCount = 0;
     bool hasElapsed = false;
     Entries older; // the entries with a time after the newest run
@@ -224,9 +266,7 @@ private:
             for (size_t i = runs.size() - 1; i > 0; --i)
                 add(runs[i], filter);
             if (rows.size() > 0) {
-                rows.starts.insert(rows.starts.begin(), LogRows::EarlierHeading);
-                rows.marks.insert(rows.marks.begin(), LogEntry::None);
-                rows.checks.insert(rows.checks.begin(), 0);
+                rows.putHeadingFirst(LogRows::EarlierHeading);
                 rows.earlier = rows.size();
                 rows.add(LogRows::NewestHeading, LogEntry::None);
             }
@@ -267,7 +307,7 @@ private:
 };
 
 // Rows as text: where each line begins, and its mark.
-QString Text(LogRows const& rows)
+QString Text(PlainRows const& rows)
 {
     QStringList texts;
     for (size_t i = 0; i < rows.size(); ++i)
@@ -276,7 +316,15 @@ QString Text(LogRows const& rows)
            texts.join(' ');
 }
 
-bool IsSame(LogRows const& left, LogRows const& right)
+QString Text(LogCounts const& counts)
+{
+    QStringList texts;
+    for (size_t count : counts)
+        texts.append(QString::number(count));
+    return texts.join(' ');
+}
+
+bool IsSame(PlainRows const& left, PlainRows const& right)
 {
     return left.starts == right.starts && left.marks == right.marks &&
            left.checks == right.checks && left.earlier == right.earlier &&
@@ -486,10 +534,11 @@ private:
     void compare(LogFilter const& filter)
     {
         const PlainIndex plain(m_passed, m_readsTimes, filter, m_known);
-        const LogRows rows = m_index.Rows(filter);
+        const PlainRows rows(m_index.Rows(filter));
         if (!IsSame(rows, plain.rows))
             same("rows", Text(rows), Text(plain.rows));
         same("lines", m_index.size(), plain.lineCount);
+        same("counts", Text(m_index.counts()), Text(plain.counts));
         same("elapsed", m_index.hasElapsed() || !plain.hasElapsed, true);
     }
 
@@ -592,24 +641,25 @@ private:
         const QByteArray file = m_exists ? m_file : QByteArray();
         const PlainIndex fresh(file, m_readsTimes, m_filter);
         PlainIndex plain(file, m_readsTimes, m_filter, m_known);
-        if (IsSame(*m_rows, fresh.rows))
+        if (IsSame(m_rows, fresh.rows))
             plain = fresh;
-        else if (!IsSame(*m_rows, plain.rows))
-            same("rows", Text(*m_rows), Text(plain.rows));
+        else if (!IsSame(m_rows, plain.rows))
+            same("rows", Text(m_rows), Text(plain.rows));
         m_known = plain.older;
         same("exists", m_update.exists, m_exists);
         same("error", m_update.error, QString());
         same("lines", m_update.lines, plain.lineCount);
+        same("counts", Text(m_update.counts), Text(plain.counts));
     }
 
     // What a view makes of an update.
     void take(LogUpdate const& update)
     {
-        LogRows const& after = *update.rows;
+        const PlainRows after(*update.rows);
         if (!update.isReset) {
-            LogRows const& before = *m_rows;
-            LogRows shown;
-            const auto add = [&](LogRows const& rows, size_t from, size_t to) {
+            PlainRows const& before = m_rows;
+            PlainRows shown;
+            const auto add = [&](PlainRows const& rows, size_t from, size_t to) {
                 for (size_t i = from; i < to; ++i)
                     shown.add(rows.starts[i], rows.marks[i], rows.checks[i]);
             };
@@ -624,7 +674,7 @@ private:
         }
         same("request", update.request, m_request);
         m_update = update;
-        m_rows = update.rows;
+        m_rows = after;
     }
 
     void truncate()
@@ -690,7 +740,7 @@ private:
     LogScanner m_scanner;
     LogUpdate m_update;
     PlainIndex::Entries m_known; // perhaps, to the scanner
-    std::shared_ptr<LogRows const> m_rows = std::make_shared<LogRows>();
+    PlainRows m_rows;
     bool m_exists = false;
     bool m_isOpen = false;
     int m_request = 0;

@@ -213,6 +213,15 @@ void withoutHalves(QString& text)
     }
 }
 
+std::vector<qint64> startsOf(LogIndex const& index, LogFilter const& filter)
+{
+    const LogRows rows = index.Rows(filter);
+    std::vector<qint64> starts;
+    for (size_t row = 0; row < rows.size(); ++row)
+        starts.push_back(rows.start(row));
+    return starts;
+}
+
 QStringList words(QString const& text)
 {
     QStringList result = text.split(' ');
@@ -395,11 +404,10 @@ void tst_PlainSearch::indexes()
             while (searched.Search(lines, offset)) {}
         }
         const QString text = told(filter, encoding, file);
-        const LogRows rows = fresh.Rows(filter);
-        const LogRows again = searched.Rows(filter);
-        QVERIFY2(rows.starts == again.starts && rows.marks == again.marks, qPrintable(text));
+        const std::vector<qint64> rows = startsOf(fresh, filter);
+        QVERIFY2(rows == startsOf(searched, filter), qPrintable(text));
         QVERIFY2(fresh.slowLine() == searched.slowLine(), qPrintable(text));
-        QVERIFY2(rows.starts == expected, qPrintable(text));
+        QVERIFY2(rows == expected, qPrintable(text));
         shown += int(rows.size());
     }
     QVERIFY(shown > 0);

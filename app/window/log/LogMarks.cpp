@@ -12,15 +12,6 @@
 
 namespace Velocor {
 
-namespace {
-
-size_t BitOf(qint64 start)
-{
-    return static_cast<size_t>(start) & 0xffff;
-}
-
-} // namespace
-
 LogMarks::LogMarks(LogModel* model, QObject* parent)
     : QObject(parent), m_model(model), m_rows(std::make_shared<std::vector<int>>())
 {
@@ -108,12 +99,9 @@ void LogMarks::take(int request, QVector<LogMark> const& marks)
 void LogMarks::update()
 {
     QHash<qint64, QString> notes;
-    m_starts.reset();
     for (LogMark const& mark : qAsConst(m_marks)) {
-        if (!mark.isFound)
-            continue;
-        notes.insert(mark.start, mark.note);
-        m_starts.set(BitOf(mark.start));
+        if (mark.isFound)
+            notes.insert(mark.start, mark.note);
     }
     m_model->SetMarks(notes);
     auto rows = std::make_shared<std::vector<int>>();
@@ -124,13 +112,18 @@ void LogMarks::update()
     Q_EMIT changed();
 }
 
+// Adds the rows of marked lines from this row on.
 void LogMarks::addRows(std::vector<int>& rows, int from) const
 {
-    const int count = m_model->rowCount();
-    for (int row = from; row < count; ++row) {
-        if (m_starts.test(BitOf(m_model->LineStart(row))) && indexOf(row) >= 0)
-            rows.push_back(row);
+    std::vector<int> added;
+    for (LogMark const& mark : m_marks) {
+        const int row = mark.isFound ? m_model->RowNear(mark.start) : -1;
+        if (row >= from && m_model->LineStart(row) == mark.start)
+            added.push_back(row);
     }
+    std::sort(added.begin(), added.end());
+    added.erase(std::unique(added.begin(), added.end()), added.end());
+    rows.insert(rows.end(), added.begin(), added.end());
 }
 
 int LogMarks::indexOf(int row) const

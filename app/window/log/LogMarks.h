@@ -8,7 +8,6 @@
 #include <QObject>
 #include <QThread>
 
-#include <bitset>
 #include <memory>
 #include <vector>
 
@@ -80,7 +79,6 @@ private:
     int m_request = 0;
     QString m_path;
     QVector<LogMark> m_marks;
-    std::bitset<65536> m_starts; // which of the lowest bits of starts are those of marked lines
     std::shared_ptr<std::vector<int> const> m_rows;
     int m_rowCount = 0;       // rows looked at
     bool m_wasReset = false;  // the file may be another one

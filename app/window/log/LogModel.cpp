@@ -225,7 +225,7 @@ int LogModel::FindProblem(int row, int step) const
     for (row += step; row >= 0 && row < m_rowCount; row += step) {
         const auto position = static_cast<size_t>(row);
         if (LogSeverities::IsProblem(rows.severity(position)) &&
-            !(rows.marks[position] & LogRows::Continued))
+            !(rows.mark(position) & LogRows::Continued))
             return row;
     }
     return -1;
@@ -233,7 +233,7 @@ int LogModel::FindProblem(int row, int step) const
 
 bool LogModel::isHeading(int row) const
 {
-    return m_state.rows->starts[static_cast<size_t>(row)] < 0;
+    return m_state.rows->isHeading(static_cast<size_t>(row));
 }
 
 bool LogModel::openFile() const
@@ -248,13 +248,13 @@ bool LogModel::openFile() const
 QByteArray LogModel::readBytes(int row, qint64 limit) const
 {
     LogRows const& rows = *m_state.rows;
-    const qint64 start = rows.starts[static_cast<size_t>(row)];
+    const qint64 start = rows.start(static_cast<size_t>(row));
     if (!openFile() || !m_file.seek(start))
         return QByteArray();
 
     // A last line may have got longer since.
     const qint64 most = limit + LongestLineEnd;
-    const qint64 length = start < rows.complete ? most : std::min(most, rows.end - start);
+    const qint64 length = start < rows.complete() ? most : std::min(most, rows.end() - start);
     const qint64 first = std::min<qint64>(length, 1024);
     const LogLineEnd lineEnd = m_parser.fileType().lineEnd();
     QByteArray bytes = m_file.read(first);
@@ -274,9 +274,9 @@ QByteArray LogModel::readBytes(int row, qint64 limit) const
 qint64 LogModel::lengthOf(int row) const
 {
     LogRows const& rows = *m_state.rows;
-    const qint64 start = rows.starts[static_cast<size_t>(row)];
+    const qint64 start = rows.start(static_cast<size_t>(row));
     const qint64 most =
-        start < rows.complete ? MeasuredLength : std::min(MeasuredLength, rows.end - start);
+        start < rows.complete() ? MeasuredLength : std::min(MeasuredLength, rows.end() - start);
     if (!openFile() || !m_file.seek(start))
         return 0;
     const LogLineEnd lineEnd = m_parser.fileType().lineEnd();
@@ -304,8 +304,8 @@ LogModel::Line LogModel::readLine(int row) const
     bool isCut = bytes.size() > limit;
     bytes.truncate(limit);
     line.start = bytes.left(LogRows::CheckedLength);
-    line.check = m_state.rows->checks[position];
-    line.isTorn = m_state.rows->marks[position] & LogRows::Torn;
+    line.check = m_state.rows->check(position);
+    line.isTorn = m_state.rows->mark(position) & LogRows::Torn;
     line.isGone = LogRows::CheckOf(line.start.constData(), line.start.size()) != line.check;
     if (line.isGone)
         line.entry.message = GoneText();
@@ -323,9 +323,9 @@ LogModel::Line LogModel::readLine(int row) const
 LogModel::Line const* LogModel::knownLine(int row) const
 {
     const auto position = static_cast<size_t>(row);
-    Line const* known = m_lines.object(m_state.rows->starts[position]);
-    const bool isTorn = m_state.rows->marks[position] & LogRows::Torn;
-    return known && known->check == m_state.rows->checks[position] && known->isTorn == isTorn
+    Line const* known = m_lines.object(m_state.rows->start(position));
+    const bool isTorn = m_state.rows->mark(position) & LogRows::Torn;
+    return known && known->check == m_state.rows->check(position) && known->isTorn == isTorn
                ? known
                : nullptr;
 }
@@ -335,7 +335,7 @@ LogModel::Line const& LogModel::line(int row) const
     if (Line const* known = knownLine(row))
         return *known;
     auto* read = new Line(readLine(row));
-    m_lines.insert(m_state.rows->starts[static_cast<size_t>(row)], read);
+    m_lines.insert(m_state.rows->start(static_cast<size_t>(row)), read);
     return *read;
 }
 
@@ -369,9 +369,8 @@ QString LogModel::MessageText(int row) const
 
 QPair<int, int> LogModel::EntryRows(int row) const
 {
-    std::vector<quint8> const& marks = m_state.rows->marks;
-    const auto continues = [&](int other) {
-        const quint8 mark = marks[static_cast<size_t>(other)];
+    const auto continues = [this](int other) {
+        const quint8 mark = m_state.rows->mark(static_cast<size_t>(other));
         return (mark & LogRows::Continued) && !(mark & LogRows::Alone);
     };
     int first = row;
@@ -410,7 +409,7 @@ bool LogModel::IsGone(int row) const
 
 QString LogModel::headingText(int row) const
 {
-    const qint64 start = m_state.rows->starts[static_cast<size_t>(row)];
+    const qint64 start = m_state.rows->start(static_cast<size_t>(row));
     if (start == LogRows::EarlierHeading)
         return tr("Earlier");
     return m_isCurrent ? tr("This run") : tr("Latest run in this file");
@@ -440,7 +439,7 @@ QString LogModel::toolTip(int row, int column) const
     const QString note = m_marks.value(LineStart(row));
     if (!note.isEmpty() && column != MessageColumn)
         return tr("Note: %1").arg(note);
-    if (m_state.rows->marks[static_cast<size_t>(row)] & LogRows::Torn)
+    if (m_state.rows->mark(static_cast<size_t>(row)) & LogRows::Torn)
         return tr("Remainder of an entry that a later run overwrote");
     if (column != MessageColumn)
         return QString();
@@ -484,11 +483,11 @@ QVariant LogModel::data(QModelIndex const& index, int role) const
     case HeadingRole:
         return isHeading(row);
     case EarlierRole:
-        return static_cast<size_t>(row) < m_state.rows->earlier;
+        return static_cast<size_t>(row) < m_state.rows->earlier();
     case MarkedRole:
         return m_marks.contains(LineStart(row));
     case ContextRole:
-        return bool(m_state.rows->marks[static_cast<size_t>(row)] & LogRows::Context);
+        return bool(m_state.rows->mark(static_cast<size_t>(row)) & LogRows::Context);
     case NoteRole:
         return m_marks.value(LineStart(row));
     default:

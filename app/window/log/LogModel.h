@@ -81,7 +81,7 @@ public:
     int FindProblem(int row, int step) const;
 
     /// Where the line of a row starts in the file; negative for a heading.
-    qint64 LineStart(int row) const { return m_state.rows->starts[static_cast<size_t>(row)]; }
+    qint64 LineStart(int row) const { return m_state.rows->start(static_cast<size_t>(row)); }
 
     /// The row whose line starts there or, if it is filtered out, as near to it as possible; -1 if
     /// there are no lines.

@@ -551,8 +551,9 @@ QVector<qint64> LogPanel::LineStarts() const
 {
     QVector<qint64> starts;
     starts.reserve(m_model->rowCount());
+    LogRows::Reader reader(*m_model->state().rows);
     for (int row = 0; row < m_model->rowCount(); ++row) {
-        const qint64 start = m_model->LineStart(row);
+        const qint64 start = reader.start(static_cast<size_t>(row));
         if (start >= 0) // not a heading
             starts.append(start);
     }
@@ -603,11 +604,11 @@ QString LogPanel::summary() const
     const QLocale locale;
     const auto lines = static_cast<qlonglong>(state.lines);
     qlonglong shown = m_model->rowCount();
-    if (state.rows->earlier > 0)
+    if (state.rows->earlier() > 0)
         shown -= 2; // headings
     const QString all = lines == 1 ? tr("1 line") : tr("%1 lines").arg(locale.toString(lines));
     QString text = shown < lines ? tr("%1 of %2").arg(locale.toString(shown), all) : all;
-    const auto problems = static_cast<qlonglong>(state.rows->problems);
+    const auto problems = static_cast<qlonglong>(state.rows->problems());
     text += separator +
             (problems == 1 ? tr("1 problem") : tr("%1 problems").arg(locale.toString(problems)));
     if (isReading)

@@ -129,7 +129,7 @@ LogSearch::Answer LogSearch::Next(int row, int step, int& hit) const
     else
         found = isAhead ? *(from - 1) : hits.back();
     if (!isComplete() && (found >= m_model->rowCount() ||
-                          m_model->LineStart(found) != m_hits.rows->starts[size_t(found)]))
+                          m_model->LineStart(found) != m_hits.rows->start(size_t(found))))
         return Answer::Unknown;
     hit = found;
     return isAhead ? Answer::Ahead : Answer::Wrapped;

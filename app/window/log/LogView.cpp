@@ -237,7 +237,7 @@ void LogView::fitTimes()
 // A heading spans all columns.
 void LogView::updateHeadings()
 {
-    const int earlier = static_cast<int>(m_model->state().rows->earlier);
+    const int earlier = static_cast<int>(m_model->state().rows->earlier());
     if (earlier == m_earlierRows)
         return;
     clearSpans();

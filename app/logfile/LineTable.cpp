@@ -1,0 +1,228 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/logfile/LineTable.h"
+
+#include <algorithm>
+#include <cstring>
+
+namespace Velocor {
+
+namespace {
+
+// A length of less than 254 is one byte; others follow such a byte.
+constexpr quint8 InTwoBytes = 254;
+constexpr quint8 InEightBytes = 255;
+
+template <class T>
+void PutBytes(std::vector<quint8>& to, quint8 size, T length)
+{
+    quint8 bytes[sizeof(T)];
+    std::memcpy(bytes, &length, sizeof(T));
+    to.push_back(size);
+    to.insert(to.end(), std::begin(bytes), std::end(bytes));
+}
+
+template <class T>
+qint64 TakeBytes(quint8 const*& at)
+{
+    T length = 0;
+    std::memcpy(&length, at, sizeof(T));
+    at += sizeof(T);
+    return static_cast<qint64>(length);
+}
+
+void PutLength(std::vector<quint8>& to, qint64 length)
+{
+    if (length < InTwoBytes)
+        to.push_back(static_cast<quint8>(length));
+    else if (length <= 0xffff)
+        PutBytes(to, InTwoBytes, static_cast<quint16>(length));
+    else
+        PutBytes(to, InEightBytes, length);
+}
+
+qint64 TakeLength(quint8 const*& at)
+{
+    const quint8 first = *at++;
+    if (first < InTwoBytes)
+        return first;
+    return first == InTwoBytes ? TakeBytes<quint16>(at) : TakeBytes<qint64>(at);
+}
+
+} // namespace
+
+// Also finds where the length of the line is.
+qint64 LineTable::Block::start(size_t line, size_t& position) const
+{
+    Group const& group = groups[line / GroupSize];
+    qint64 start = group.start;
+    quint8 const* at = lengths.data() + group.position;
+    for (size_t left = line % GroupSize; left > 0; --left)
+        start += TakeLength(at);
+    position = static_cast<size_t>(at - lengths.data());
+    return start;
+}
+
+size_t LineTable::Block::lineAt(qint64 offset) const
+{
+    const auto after =
+        std::upper_bound(groups.begin(), groups.end(), offset,
+                         [](qint64 value, Group const& group) { return value < group.start; });
+    const auto group = after == groups.begin() ? after : after - 1;
+    const auto first = static_cast<size_t>(group - groups.begin()) * GroupSize;
+    const size_t last = std::min(first + GroupSize, checks.size()) - 1;
+    qint64 start = group->start;
+    quint8 const* at = lengths.data() + group->position;
+    for (size_t line = first; line < last; ++line) {
+        start += TakeLength(at);
+        if (start > offset)
+            return line;
+    }
+    return last;
+}
+
+// The block must have the line.
+void LineTable::Block::truncate(size_t line)
+{
+    if (line == 0) {
+        *this = Block();
+        return;
+    }
+    size_t position = 0;
+    start(line - 1, position);
+    groups.resize((line - 1) / GroupSize + 1);
+    lengths.resize(position);
+    marks.resize(line);
+    checks.resize(line);
+}
+
+// Half a byte for a mark, for the goal for memory in docs/performance.md; tst_PlainLineTable
+// compares. There are few different ones; with too many, it has a byte.
+void LineTable::Block::pack()
+{
+    std::vector<quint8> found;
+    std::vector<quint8> packed((marks.size() + 1) / 2);
+    for (size_t line = 0; line < marks.size() && found.size() <= 16; ++line) {
+        const auto number = std::find(found.begin(), found.end(), marks[line]) - found.begin();
+        if (static_cast<size_t>(number) == found.size())
+            found.push_back(marks[line]);
+        packed[line / 2] |= static_cast<quint8>(number << (line % 2 * 4));
+    }
+    if (found.size() <= 16) {
+        palette = std::move(found);
+        marks = std::move(packed);
+    }
+    groups.shrink_to_fit();
+    lengths.shrink_to_fit();
+    marks.shrink_to_fit();
+    palette.shrink_to_fit();
+    checks.shrink_to_fit();
+}
+
+void LineTable::Block::unpack()
+{
+    std::vector<quint8> unpacked(checks.size());
+    for (size_t line = 0; line < unpacked.size(); ++line)
+        unpacked[line] = mark(line);
+    marks = std::move(unpacked);
+    palette.clear();
+}
+
+qint64 LineTable::start(size_t line) const
+{
+    size_t position = 0;
+    return block(line).start(line % BlockSize, position);
+}
+
+void LineTable::Append(qint64 start, quint8 mark, quint16 check)
+{
+    if (m_last.checks.size() == BlockSize) {
+        m_last.pack();
+        m_full.Append(std::move(m_last));
+        m_last = Block();
+    }
+    if (!m_last.checks.empty())
+        PutLength(m_last.lengths, start - m_lastStart);
+    if (m_last.checks.size() % GroupSize == 0)
+        m_last.groups.push_back({start, m_last.lengths.size()});
+    m_last.marks.push_back(mark);
+    m_last.checks.push_back(check);
+    m_lastStart = start;
+}
+
+void LineTable::SetMark(size_t line, quint8 mark)
+{
+    const size_t position = line / BlockSize;
+    if (position >= m_full.size()) {
+        m_last.marks[line % BlockSize] = mark;
+        return;
+    }
+    Block changed = m_full.at(position);
+    changed.unpack();
+    changed.marks[line % BlockSize] = mark;
+    changed.pack();
+    m_full.Replace(position, std::move(changed));
+}
+
+void LineTable::Truncate(size_t line)
+{
+    if (line >= size())
+        return;
+    const size_t position = line / BlockSize;
+    if (position < m_full.size()) {
+        m_last = m_full.at(position);
+        m_last.unpack();
+        m_full.Truncate(position);
+    }
+    m_last.truncate(line % BlockSize);
+    m_lastStart = line > 0 ? start(line - 1) : 0;
+}
+
+size_t LineTable::LineAt(qint64 offset) const
+{
+    // The last block that starts at the offset or before it.
+    size_t position = m_full.size();
+    if (position > 0 && (m_last.groups.empty() || m_last.groups.front().start > offset)) {
+        size_t end = position;
+        position = 0;
+        while (end - position > 1) {
+            const size_t middle = position + (end - position) / 2;
+            if (m_full.at(middle).groups.front().start > offset)
+                end = middle;
+            else
+                position = middle;
+        }
+    }
+    const size_t first = position * BlockSize;
+    return first + block(first).lineAt(offset);
+}
+
+size_t LineTable::CountSame(LineTable const& other) const
+{
+    const size_t end = std::min(size(), other.size());
+    Reader reader(*this);
+    Reader otherReader(other);
+    size_t line = std::min(end, m_full.CountShared(other.m_full) * BlockSize);
+    while (line < end && mark(line) == other.mark(line) && check(line) == other.check(line) &&
+           reader.start(line) == otherReader.start(line))
+        ++line;
+    return line;
+}
+
+qint64 LineTable::Reader::start(size_t line)
+{
+    if (line - m_first >= m_count) {
+        m_first = line - line % GroupSize;
+        m_count = std::min(m_lines->size() - m_first, GroupSize);
+        Block const& block = m_lines->block(line);
+        Group const& group = block.groups[m_first % BlockSize / GroupSize];
+        quint8 const* at = block.lengths.data() + group.position;
+        m_starts[0] = group.start;
+        for (size_t next = 1; next < m_count; ++next)
+            m_starts[next] = m_starts[next - 1] + TakeLength(at);
+    }
+    return m_starts[line - m_first];
+}
+
+} // namespace Velocor
