@@ -444,44 +444,49 @@ qint64 LogIndex::SearchEnd(qint64 size) const
                              : std::min(endOf(line), start + LineLimit + m_lineEnd.size());
 }
 
-bool LogIndex::Search(QByteArray const& lines, qint64 offset)
+void LogIndex::Search(QByteArray const& lines, std::function<bool()> const& goesOn)
 {
-    const qint64 end = offset + lines.size();
-    const qint64 start = searchOffset();
-    if (start >= end)
-        return false;
     if (m_searched == 0)
         m_search.Learn(lines.constData(), lines.size());
-
-    // A line in UTF-16 is narrowed before it is searched.
-    char const* const rest = lines.constData() + (start - offset);
-    char const* const restEnd = lines.constEnd();
+    LineTable::Reader starts(m_lines);
+    const auto startOf = [&](size_t line) {
+        return line < m_lines.size() ? starts.start(line) : m_position;
+    };
     const bool isWide = m_parser.fileType().encoding.isWide();
-    char const* const found = isWide ? rest : m_search.Find(rest, restEnd);
-    const bool isFound = found != restEnd;
-    const size_t next =
-        isFound ? m_lines.LineAt(start + (found - rest)) : m_lines.LineAt(end - 1) + 1;
-    for (; m_searched < next; ++m_searched)
-        m_matches[m_searched] = m_search.answer();
-    if (isFound)
-        searchLine(lines, offset);
+    const qint64 offset = searchOffset();
+    const qint64 end = offset + lines.size();
+    for (qint64 start = offset; start < end; start = startOf(m_searched)) {
+        char const* const rest = lines.constData() + (start - offset);
+        // A line in UTF-16 is narrowed before it is searched.
+        char const* const found = isWide ? rest : m_search.Find(rest, lines.constEnd());
+        const bool isFound = found != lines.constEnd();
+        const qint64 place = start + (found - rest) - (isFound ? 0 : 1);
+        const bool isInFirst = place < startOf(m_searched + 1);
+        const size_t next = (isInFirst ? m_searched : m_lines.LineAt(place)) + (isFound ? 0 : 1);
+        for (; m_searched < next; ++m_searched)
+            m_matches[m_searched] = m_search.answer();
+        if (!isFound)
+            break;
+        const qint64 lineStart = startOf(m_searched);
+        searchLine(lines.constData() + (lineStart - offset), startOf(m_searched + 1) - lineStart);
+        if (m_slowLine > 0 || !goesOn())
+            break;
+    }
     if (m_searched >= m_lines.size() || m_slowLine > 0)
         m_searched = AllLines;
-    return searchOffset() < end;
 }
 
-// Searches the next of these lines.
-void LogIndex::searchLine(QByteArray const& lines, qint64 offset)
+// Searches the next line.
+//
+// @param length  with the line end
+void LogIndex::searchLine(char const* line, qint64 length)
 {
-    const qint64 start = searchOffset();
     const bool complete = m_lastIsComplete || m_searched + 1 < m_lines.size();
-    const qint64 whole = endOf(m_searched) - start - (complete ? 1 : 0);
-    char const* line = lines.constData() + (start - offset);
-    int length =
-        contentLength(line, static_cast<int>(std::min<qint64>(whole, LineLimit)), complete);
+    const qint64 limited = std::min<qint64>(length - (complete ? 1 : 0), LineLimit);
+    int size = contentLength(line, static_cast<int>(limited), complete);
     QByteArray narrow;
-    m_parser.fileType().encoding.Narrow(line, length, narrow);
-    m_matches[m_searched] = matchOf(line, length, m_searched);
+    m_parser.fileType().encoding.Narrow(line, size, narrow);
+    m_matches[m_searched] = matchOf(line, size, m_searched);
     ++m_searched;
 }
 

@@ -13,6 +13,7 @@
 #include <QByteArray>
 
 #include <algorithm>
+#include <functional>
 #include <limits>
 #include <vector>
 
@@ -79,9 +80,8 @@ public:
     ///
     ///     index.BeginSearch(filter);
     ///     while (index.searchOffset() < index.nextOffset()) {
-    ///         const qint64 offset = index.searchOffset();
-    ///         lines = bytesOfFile(offset, index.SearchEnd(1 << 20));
-    ///         while (index.Search(lines, offset)) {}
+    ///         lines = bytesOfFile(index.searchOffset(), index.SearchEnd(1 << 20));
+    ///         index.Search(lines, [] { return true; });
     ///     }
     void BeginSearch(LogFilter const& filter);
 
@@ -96,13 +96,12 @@ public:
     /// one line if that is longer. What follows LineLimit in such a line is left out.
     qint64 SearchEnd(qint64 size) const;
 
-    /// Searches on to the next line that the filter has to be asked about, and asks it.
+    /// Searches the next lines.
     ///
-    /// @param lines  the bytes of the file from `offset` to SearchEnd() when it was called; the
-    ///               same in all calls until this returns false
-    /// @param offset  searchOffset() at that time
-    /// @return false if all of these lines have been searched
-    bool Search(QByteArray const& lines, qint64 offset);
+    /// @param lines  the bytes of the file from searchOffset() to SearchEnd()
+    /// @param goesOn  called after each line that the filter was asked about; false stops the
+    /// search
+    void Search(QByteArray const& lines, std::function<bool()> const& goesOn);
 
     /// Where the last complete line ends; after it the file may still change.
     qint64 completeOffset() const;
@@ -205,7 +204,7 @@ private:
     int contentLength(char const* line, int length, bool complete) const;
     LogFilter::Match matchOf(char const* line, int length, size_t index);
     qint64 endOf(size_t line) const;
-    void searchLine(QByteArray const& lines, qint64 offset);
+    void searchLine(char const* line, qint64 length);
     bool isSeam(LogLineParser::Parts const& parts, qint64 end) const;
     bool isOlder(LogLineParser::Parts const& parts) const;
     bool isKnown(LogLineParser::Parts const& parts, qint64 end) const;

@@ -194,7 +194,7 @@ bool LogScanner::search(QFile& file)
         lines.resize(static_cast<int>(m_index.SearchEnd(m_sliceSize) - offset));
         if (!file.seek(offset) || file.read(lines.data(), lines.size()) != lines.size())
             return false;
-        while (isCurrentRequest() && m_index.Search(lines, offset)) {}
+        m_index.Search(lines, [this] { return isCurrentRequest(); });
         if (!isCurrentRequest())
             return true;
         reported = reportProgress(offset + lines.size(), end, reported);

@@ -36,7 +36,7 @@ void Search(LogIndex& index, QByteArray const& file, LogFilter const& filter, in
         const qint64 offset = index.searchOffset();
         const auto length = static_cast<int>(index.SearchEnd(slice) - offset);
         const QByteArray lines = file.mid(static_cast<int>(offset), length);
-        while (index.Search(lines, offset)) {}
+        index.Search(lines, [] { return true; });
     }
 }
 
@@ -413,11 +413,20 @@ void tst_LogIndex::partOfASearch()
     QCOMPARE(Texts(index, file, filter), QStringList());
     const QByteArray first = file.left(static_cast<int>(index.SearchEnd(500)));
     QVERIFY(first.size() <= 500 && first.endsWith('\n'));
-    while (index.Search(first, 0)) {}
+    index.Search(first, [] { return true; });
     QCOMPARE(Texts(index, file, filter), Lines(first));
     QCOMPARE(index.searchedLines(), size_t(Lines(first).size()));
     QCOMPARE(index.searchOffset(), qint64(first.size()));
     QCOMPARE(index.size(), size_t(30));
+
+    // It can be stopped after each line that matches.
+    QVERIFY(filter.SetText("newer 2", false, true));
+    index.BeginSearch(filter);
+    index.Search(file, [] { return false; });
+    QCOMPARE(index.searchedLines(), size_t(3));
+    index.Search(file.mid(static_cast<int>(index.searchOffset())), [] { return true; });
+    QCOMPARE(index.searchedLines(), size_t(30));
+    QCOMPARE(Texts(index, file, filter).size(), 11);
 }
 
 // Read in many pieces, and searched as a whole.
