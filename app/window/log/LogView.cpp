@@ -25,7 +25,7 @@
 namespace Velocor {
 
 LogView::LogView(LogModel* model, QWidget* parent)
-    : QTableView(parent), m_model(model), m_delegate(new LogDelegate(this)),
+    : UniformTable(parent), m_model(model), m_delegate(new LogDelegate(this)),
       m_ticks(new TickScrollBar(this))
 {
     setUp();
@@ -44,15 +44,10 @@ void LogView::setUp()
     setSelectionBehavior(SelectRows);
     setSelectionMode(ExtendedSelection);
     setEditTriggers(NoEditTriggers);
-    setShowGrid(false);
     setWordWrap(false);
     setTabKeyNavigation(false);
-    setVerticalScrollMode(ScrollPerItem);
-    setHorizontalScrollMode(ScrollPerPixel);
     setTextElideMode(Qt::ElideRight);
     setAlternatingRowColors(true);
-    verticalHeader()->hide();
-    verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
     horizontalHeader()->setStretchLastSection(true);
     horizontalHeader()->setHighlightSections(false);
     horizontalHeader()->setSectionsMovable(false);
@@ -66,8 +61,7 @@ void LogView::setUp()
 
 void LogView::setRowHeight()
 {
-    verticalHeader()->setMinimumSectionSize(1);
-    verticalHeader()->setDefaultSectionSize(RowHeight(fontMetrics()));
+    SetRowHeight(RowHeight(fontMetrics()));
 }
 
 void LogView::SetDefaultWidths()
@@ -86,7 +80,7 @@ void LogView::SetDefaultWidths()
 
 void LogView::changeEvent(QEvent* event)
 {
-    QTableView::changeEvent(event);
+    UniformTable::changeEvent(event);
     if (event->type() != QEvent::FontChange && event->type() != QEvent::StyleChange)
         return;
     setRowHeight();
@@ -100,7 +94,7 @@ void LogView::changeEvent(QEvent* event)
 // A lower view would show the same first row, and no longer the newest one.
 void LogView::resizeEvent(QResizeEvent* event)
 {
-    QTableView::resizeEvent(event);
+    UniformTable::resizeEvent(event);
     if (!m_following)
         return;
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
@@ -112,7 +106,7 @@ void LogView::resizeEvent(QResizeEvent* event)
 void LogView::focusInEvent(QFocusEvent* event)
 {
     const bool hadCurrent = currentIndex().isValid();
-    QTableView::focusInEvent(event);
+    UniformTable::focusInEvent(event);
     if (!hadCurrent)
         selectionModel()->clearCurrentIndex();
 }
@@ -151,7 +145,7 @@ void LogView::noteScrolled(int value)
 void LogView::rowsInserted(QModelIndex const& parent, int first, int last)
 {
     const bool above = !m_following && first < rowAt(0);
-    QTableView::rowsInserted(parent, first, last);
+    UniformTable::rowsInserted(parent, first, last);
     if (!above)
         return;
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
@@ -162,7 +156,7 @@ void LogView::rowsInserted(QModelIndex const& parent, int first, int last)
 void LogView::rowsAboutToBeRemoved(QModelIndex const& parent, int first, int last)
 {
     const int top = rowAt(0);
-    QTableView::rowsAboutToBeRemoved(parent, first, last);
+    UniformTable::rowsAboutToBeRemoved(parent, first, last);
     if (m_following || first >= top)
         return;
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
@@ -178,7 +172,6 @@ void LogView::afterRefresh()
     setColumnHidden(LogModel::SeverityColumn, !state.hasSeverities && state.lines > 0);
     setColumnHidden(LogModel::ElapsedColumn, !state.hasElapsed);
     fitTimes();
-    updateHeadings();
     m_ticks->SetRowCount(m_model->rowCount());
     restoreCurrent();
     if (m_following) {
@@ -234,18 +227,11 @@ void LogView::fitTimes()
     setColumnWidth(LogModel::TimeColumn, std::max(columnWidth(LogModel::TimeColumn), width));
 }
 
-// A heading spans all columns.
-void LogView::updateHeadings()
+// The headings.
+bool LogView::isSpanning(int row) const
 {
     const int earlier = static_cast<int>(m_model->state().rows->earlier());
-    if (earlier == m_earlierRows)
-        return;
-    clearSpans();
-    m_earlierRows = earlier;
-    if (earlier == 0)
-        return;
-    setSpan(0, 0, 1, LogModel::ColumnCount);
-    setSpan(earlier, 0, 1, LogModel::ColumnCount);
+    return earlier > 0 && (row == 0 || row == earlier);
 }
 
 int LogView::StartRow(int step) const
@@ -351,7 +337,7 @@ void LogView::UpdateMarks()
 
 void LogView::paintEvent(QPaintEvent* event)
 {
-    QTableView::paintEvent(event);
+    UniformTable::paintEvent(event);
     if (m_placeholder.isEmpty() || m_model->rowCount() > 0)
         return;
     QPainter painter(viewport());

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include <QTableView>
+#include "app/window/widgets/UniformTable.h"
 
 namespace Velocor {
 
@@ -17,7 +17,7 @@ class TickScrollBar;
 /// Following stops when the user scrolls away from the end and resumes on scrolling back to it. The
 /// current line stays current and in view when the filter changes; if it is filtered out, the
 /// nearest one takes its place.
-class LogView : public QTableView
+class LogView : public UniformTable
 {
     Q_OBJECT
 
@@ -83,6 +83,7 @@ Q_SIGNALS:
     void menuRequested(QPoint const& position, QModelIndex const& cell);
 
 protected:
+    bool isSpanning(int row) const override;
     void paintEvent(QPaintEvent* event) override;
     void contextMenuEvent(QContextMenuEvent* event) override;
     void changeEvent(QEvent* event) override;
@@ -100,7 +101,6 @@ private:
     int firstColumn() const;
     void setRowHeight();
     void fitTimes();
-    void updateHeadings();
 
     LogModel* m_model;
     LogDelegate* m_delegate;
@@ -109,7 +109,6 @@ private:
     QString m_fittedPath;
     bool m_following = true;
     bool m_scrollingItself = false;
-    int m_earlierRows = -1;
 
     // The current line and its distance from the top, while the rows are replaced.
     QString m_keptPath;

@@ -1,0 +1,380 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/widgets/UniformTable.h"
+
+#include <QAbstractButton>
+#include <QCursor>
+#include <QHeaderView>
+#include <QPaintEvent>
+#include <QPainter>
+#include <QScopedValueRollback>
+#include <QScrollBar>
+
+#include <algorithm>
+
+namespace Velocor {
+
+namespace {
+
+// As many as QTableView measures.
+constexpr int MeasuredRows = 1000;
+
+// A vertical header without rows, whatever the model has: it would keep a record of each.
+class HeaderWithoutRows : public QHeaderView
+{
+public:
+    explicit HeaderWithoutRows(QWidget* parent) : QHeaderView(Qt::Vertical, parent) { hide(); }
+
+    void setModel(QAbstractItemModel* /*model*/) override {}
+    void setSelectionModel(QItemSelectionModel* /*selectionModel*/) override {}
+    void setRootIndex(QModelIndex const& /*index*/) override {}
+};
+
+} // namespace
+
+UniformTable::UniformTable(QWidget* parent) : QTableView(parent)
+{
+    setVerticalHeader(new HeaderWithoutRows(this));
+    verticalHeader()->hide();
+    setShowGrid(false);
+    setVerticalScrollMode(ScrollPerItem);
+    setHorizontalScrollMode(ScrollPerPixel);
+    if (auto* corner = findChild<QAbstractButton*>())
+        corner->hide();
+}
+
+void UniformTable::setModel(QAbstractItemModel* newModel)
+{
+    for (QMetaObject::Connection const& connection : qAsConst(m_connections))
+        disconnect(connection);
+    m_connections.clear();
+    QTableView::setModel(newModel);
+    if (!newModel)
+        return;
+    // Usually, the vertical header does so.
+    const auto layOut = [this] {
+        scheduleDelayedItemsLayout();
+    };
+    m_connections.append(connect(newModel, &QAbstractItemModel::rowsRemoved, this, layOut));
+    m_connections.append(connect(newModel, &QAbstractItemModel::modelReset, this, layOut));
+}
+
+void UniformTable::rowsInserted(QModelIndex const& parent, int first, int last)
+{
+    QTableView::rowsInserted(parent, first, last);
+    scheduleDelayedItemsLayout();
+}
+
+void UniformTable::SetRowHeight(int height)
+{
+    m_rowHeight = std::max(1, height);
+    scheduleDelayedItemsLayout();
+}
+
+int UniformTable::rowHeight(int /*row*/) const
+{
+    return m_rowHeight;
+}
+
+int UniformTable::rowCount() const
+{
+    return model() ? model()->rowCount(rootIndex()) : 0;
+}
+
+// Whole ones.
+int UniformTable::rowsInView() const
+{
+    return std::max(1, viewport()->height() / m_rowHeight);
+}
+
+bool UniformTable::isSpanning(int /*row*/) const
+{
+    return false;
+}
+
+bool UniformTable::isIndexHidden(QModelIndex const& index) const
+{
+    return isSpanning(index.row()) ? index.column() > 0 : isColumnHidden(index.column());
+}
+
+int UniformTable::verticalOffset() const
+{
+    return -topOf(0);
+}
+
+// Where a row starts in the viewport. At the end of the table, the last row ends with it; before,
+// the first row in view starts with it.
+int UniformTable::topOf(int row) const
+{
+    QScrollBar const* const bar = verticalScrollBar();
+    const bool isAtEnd = bar->maximum() > 0 && bar->value() == bar->maximum();
+    const int rest = viewport()->height() - (rowCount() - bar->value()) * m_rowHeight;
+    const int shift = isAtEnd && rest > 0 && rest < m_rowHeight ? rest : 0;
+    return (row - bar->value()) * m_rowHeight + shift;
+}
+
+// The row that would be there if there were rows without end.
+int UniformTable::rowPast(int y) const
+{
+    const int first = verticalScrollBar()->value();
+    const int below = y - topOf(first);
+    return first + (below >= 0 ? below / m_rowHeight : -((m_rowHeight - 1 - below) / m_rowHeight));
+}
+
+int UniformTable::rowAt(int y) const
+{
+    const int row = rowPast(y);
+    return row >= 0 && row < rowCount() ? row : -1;
+}
+
+QRect UniformTable::visualRect(QModelIndex const& index) const
+{
+    if (!index.isValid() || index.model() != model())
+        return QRect();
+    if (!isSpanning(index.row()) && isColumnHidden(index.column()))
+        return QRect();
+    const int y = topOf(index.row());
+    const auto rectOf = [&](int column) {
+        return QRect(columnViewportPosition(column), y, columnWidth(column), m_rowHeight);
+    };
+    return isSpanning(index.row()) ? rectOf(edgeColumn(1)) | rectOf(edgeColumn(-1))
+                                   : rectOf(index.column());
+}
+
+QModelIndex UniformTable::indexAt(QPoint const& position) const
+{
+    const int row = rowAt(position.y());
+    const int column = columnAt(position.x());
+    if (row < 0 || column < 0)
+        return QModelIndex();
+    return model()->index(row, isSpanning(row) ? 0 : column, rootIndex());
+}
+
+void UniformTable::scrollTo(QModelIndex const& index, ScrollHint hint)
+{
+    if (!index.isValid() || index.model() != model() || isIndexHidden(index))
+        return;
+    const QSize view = viewport()->size();
+    QScrollBar* const across = horizontalScrollBar();
+    const int left = horizontalHeader()->sectionPosition(index.column());
+    const int width = visualRect(index).width();
+    if (hint == PositionAtCenter)
+        across->setValue(left - (view.width() - width) / 2);
+    else if (left < across->value() || width > view.width())
+        across->setValue(left);
+    else if (left + width > across->value() + view.width())
+        across->setValue(left + width - view.width());
+
+    const int row = index.row();
+    const int top = verticalScrollBar()->value();
+    if (hint == PositionAtTop || (hint == EnsureVisible && row < top))
+        verticalScrollBar()->setValue(row);
+    else if (hint == PositionAtBottom || (hint == EnsureVisible && row >= top + rowsInView()))
+        verticalScrollBar()->setValue(row - rowsInView() + 1);
+    else if (hint == PositionAtCenter)
+        verticalScrollBar()->setValue(row - std::max(1, view.height() / 2 / m_rowHeight) + 1);
+    update(index);
+}
+
+void UniformTable::scrollContentsBy(int dx, int /*dy*/)
+{
+    if (dx != 0)
+        horizontalHeader()->setOffset(horizontalScrollBar()->value());
+    viewport()->update();
+}
+
+void UniformTable::updateGeometries()
+{
+    if (m_isUpdatingGeometries)
+        return;
+    const QScopedValueRollback<bool> guard(m_isUpdatingGeometries, true);
+    QHeaderView* const header = horizontalHeader();
+    int height = 0;
+    if (!header->isHidden())
+        height = std::min(std::max(header->minimumHeight(), header->sizeHint().height()),
+                          header->maximumHeight());
+    setViewportMargins(0, height, 0, 0);
+    updateScrollBars();
+    const QRect view = viewport()->geometry();
+    header->setGeometry(view.left(), view.top() - height, view.width(), height);
+    updateScrollBars(); // the last column takes the width that is left
+    header->setOffset(horizontalScrollBar()->value());
+    // Not that of QTableView, which asks the vertical header.
+    QAbstractItemView::updateGeometries(); // NOLINT(bugprone-parent-virtual-call)
+}
+
+// A scroll bar that appears may take away the space that made the other one needless.
+void UniformTable::updateScrollBars()
+{
+    const int length = horizontalHeader()->length();
+    const QSize most = maximumViewportSize();
+    const bool fitsAll = most.width() >= length && most.height() / m_rowHeight >= rowCount();
+    const int width = fitsAll ? most.width() : viewport()->width();
+    horizontalScrollBar()->setPageStep(width);
+    horizontalScrollBar()->setRange(0, std::max(0, length - width));
+    horizontalScrollBar()->setSingleStep(
+        std::max(2, width / std::max(1, horizontalHeader()->count() + 1)));
+
+    const int rows = std::min(fitsAll ? rowCount() : rowsInView(), rowCount());
+    verticalScrollBar()->setPageStep(rows);
+    verticalScrollBar()->setRange(0, std::max(0, rowCount() - rows));
+    verticalScrollBar()->setSingleStep(1);
+}
+
+int UniformTable::sizeHintForColumn(int column) const
+{
+    ensurePolished();
+    const QStyleOptionViewItem option = viewOptions();
+    // Those in view, and as many before as after them.
+    const int before = (MeasuredRows - rowsInView()) / 2;
+    const int first =
+        std::max(0, std::min(verticalScrollBar()->value() - before, rowCount() - MeasuredRows));
+    const int end = std::min(rowCount(), first + MeasuredRows);
+    int width = 0;
+    for (int row = first; row < end; ++row) {
+        const QModelIndex index = model()->index(row, column, rootIndex());
+        if (!isSpanning(row))
+            width = std::max(width, itemDelegate(index)->sizeHint(option, index).width());
+    }
+    return width;
+}
+
+int UniformTable::neighborColumn(int column, int step) const
+{
+    const int count = horizontalHeader()->count();
+    for (int next = column + step; next >= 0 && next < count; next += step) {
+        if (!isColumnHidden(next))
+            return next;
+    }
+    return column;
+}
+
+// The first (step 1) or last (step -1) column that is shown.
+int UniformTable::edgeColumn(int step) const
+{
+    return step > 0 ? neighborColumn(-1, 1) : neighborColumn(horizontalHeader()->count(), -1);
+}
+
+QModelIndex UniformTable::moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers)
+{
+    const int last = rowCount() - 1;
+    if (last < 0 || edgeColumn(1) < 0)
+        return QModelIndex();
+    const QModelIndex current = currentIndex();
+    if (!current.isValid())
+        return model()->index(0, edgeColumn(1), rootIndex());
+
+    int row = current.row();
+    int column = current.column();
+    if (isColumnHidden(column))
+        column = neighborColumn(column, -1);
+    const int page = rowsInView();
+    const int forward = isRightToLeft() ? -1 : 1;
+    switch (action) {
+    case MoveUp:
+        row = std::max(0, row - 1);
+        break;
+    case MoveDown:
+        row = std::min(last, row + 1);
+        break;
+    case MovePageUp:
+        row = std::max(0, row - page);
+        break;
+    case MovePageDown:
+        row = std::min(last, row + page);
+        break;
+    case MovePrevious:
+    case MoveLeft:
+        column = neighborColumn(column, -forward);
+        break;
+    case MoveNext:
+    case MoveRight:
+        column = neighborColumn(column, forward);
+        break;
+    case MoveHome:
+        column = edgeColumn(1);
+        if (modifiers & Qt::ControlModifier)
+            row = 0;
+        break;
+    case MoveEnd:
+        column = edgeColumn(-1);
+        if (modifiers & Qt::ControlModifier)
+            row = last;
+        break;
+    }
+    return model()->index(row, isSpanning(row) ? 0 : column, rootIndex());
+}
+
+void UniformTable::setSelection(QRect const& rect, QItemSelectionModel::SelectionFlags command)
+{
+    const QRect area = rect.normalized();
+    const QModelIndex first = indexAt(area.topLeft());
+    const QModelIndex last = indexAt(area.bottomRight());
+    if (!selectionModel() || !first.isValid() || !last.isValid())
+        return;
+    selectionModel()->select(QItemSelection(first, last), command);
+}
+
+QRegion UniformTable::visualRegionForSelection(QItemSelection const& selection) const
+{
+    QRegion region;
+    for (QItemSelectionRange const& range : selection) {
+        const int first = std::max(rowPast(0), range.top());
+        const int last = std::min(rowPast(viewport()->height()), range.bottom());
+        if (first <= last)
+            region += QRect(0, topOf(first), viewport()->width(), (last - first + 1) * m_rowHeight);
+    }
+    return region;
+}
+
+void UniformTable::paintEvent(QPaintEvent* event)
+{
+    if (rowCount() == 0 || horizontalHeader()->count() == 0)
+        return;
+    const bool isHovered = viewport()->testAttribute(Qt::WA_Hover) && viewport()->underMouse();
+    m_hovered = isHovered ? indexAt(viewport()->mapFromGlobal(QCursor::pos())) : QModelIndex();
+    QPainter painter(viewport());
+    const QStyleOptionViewItem option = viewOptions();
+    const QRect area = event->rect();
+    const int first = std::max(0, rowPast(area.top()));
+    const int last = std::min(rowCount() - 1, rowPast(area.bottom()));
+    for (int row = first; row <= last; ++row)
+        paintRow(painter, option, row);
+    m_hovered = QModelIndex();
+}
+
+void UniformTable::paintRow(QPainter& painter, QStyleOptionViewItem const& option, int row)
+{
+    QStyleOptionViewItem cell = option;
+    if (alternatingRowColors() && row % 2 == 1)
+        cell.features |= QStyleOptionViewItem::Alternate;
+    const int columns = isSpanning(row) ? 1 : horizontalHeader()->count();
+    for (int column = 0; column < columns; ++column) {
+        const QModelIndex index = model()->index(row, column, rootIndex());
+        cell.rect = visualRect(index);
+        if (cell.rect.intersects(viewport()->rect()))
+            paintCell(painter, cell, index);
+    }
+}
+
+// As QTableView does it.
+void UniformTable::paintCell(QPainter& painter, QStyleOptionViewItem option,
+                             QModelIndex const& index)
+{
+    if (selectionModel() && selectionModel()->isSelected(index))
+        option.state |= QStyle::State_Selected;
+    if (index == m_hovered)
+        option.state |= QStyle::State_MouseOver;
+    if (option.state & QStyle::State_Enabled) {
+        const bool isEnabled = model()->flags(index) & Qt::ItemIsEnabled;
+        option.state.setFlag(QStyle::State_Enabled, isEnabled);
+        option.palette.setCurrentColorGroup(isEnabled ? QPalette::Normal : QPalette::Disabled);
+    }
+    if (index == currentIndex() && (hasFocus() || viewport()->hasFocus()))
+        option.state |= QStyle::State_HasFocus;
+    style()->drawPrimitive(QStyle::PE_PanelItemViewRow, &option, &painter, this);
+    itemDelegate(index)->paint(&painter, option, index);
+}
+
+} // namespace Velocor

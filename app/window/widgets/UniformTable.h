@@ -1,0 +1,74 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include <QTableView>
+#include <QVector>
+
+namespace Velocor {
+
+/// A table for any number of rows, all of the same height.
+///
+/// QTableView keeps the position of each row, and computes all of them again when a row is added.
+/// This table computes them when they are needed: rows take neither memory nor time, for the goals
+/// for the log view in docs/performance.md. tst_PlainUniformTable compares the two. Rows can be
+/// neither hidden, moved, nor resized; there is no vertical header and no grid, and columns scroll
+/// by pixels, rows by rows. A row may span all columns.
+///
+/// rowAt() and rowHeight() are not virtual in QTableView: call them on this class.
+class UniformTable : public QTableView
+{
+    Q_OBJECT
+
+public:
+    explicit UniformTable(QWidget* parent = nullptr);
+
+    void setModel(QAbstractItemModel* model) override;
+
+    /// Sets the height of all rows, in pixels.
+    void SetRowHeight(int height);
+
+    /// The height of any row.
+    int rowHeight(int row = 0) const;
+
+    /// The row at a position in the viewport; -1 if there is none.
+    int rowAt(int y) const;
+
+    QRect visualRect(QModelIndex const& index) const override;
+    void scrollTo(QModelIndex const& index, ScrollHint hint = EnsureVisible) override;
+    QModelIndex indexAt(QPoint const& position) const override;
+
+protected:
+    /// Whether the first cell of a row spans all columns. The others are not shown.
+    virtual bool isSpanning(int row) const;
+
+    void paintEvent(QPaintEvent* event) override;
+    void updateGeometries() override;
+    void scrollContentsBy(int dx, int dy) override;
+    void rowsInserted(QModelIndex const& parent, int first, int last) override;
+    int verticalOffset() const override;
+    int sizeHintForColumn(int column) const override;
+    QModelIndex moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) override;
+    void setSelection(QRect const& rect, QItemSelectionModel::SelectionFlags command) override;
+    QRegion visualRegionForSelection(QItemSelection const& selection) const override;
+    bool isIndexHidden(QModelIndex const& index) const override;
+
+private:
+    int rowCount() const;
+    int rowsInView() const;
+    int topOf(int row) const;
+    int rowPast(int y) const;
+    void updateScrollBars();
+    int neighborColumn(int column, int step) const;
+    int edgeColumn(int step) const;
+    void paintRow(QPainter& painter, QStyleOptionViewItem const& option, int row);
+    void paintCell(QPainter& painter, QStyleOptionViewItem option, QModelIndex const& index);
+
+    QVector<QMetaObject::Connection> m_connections; // to the model
+    int m_rowHeight = 20;
+    bool m_isUpdatingGeometries = false;
+    QModelIndex m_hovered; // while painting
+};
+
+} // namespace Velocor
