@@ -42,6 +42,7 @@ dictionary() {
     config_text | config_values) echo values.dict ;;
     foreign_log) echo foreign.dict ;;
     log_line) echo log.dict ;;
+    log_search) echo expression.dict ;;
     *) echo xml.dict ;;
     esac
 }
@@ -52,7 +53,7 @@ longest() {
     screen_fit) echo 24 ;;
     config_text) echo 64 ;;
     config_values | mru_list) echo 128 ;;
-    error_handler | log_files | log_line | xml_writers) echo 256 ;;
+    error_handler | log_files | log_line | log_search | xml_writers) echo 256 ;;
     foreign_log) echo 512 ;;
     config_load | start) echo 1024 ;;
     *) echo 4096 ;; # more than a thousand levels

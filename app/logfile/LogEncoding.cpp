@@ -123,7 +123,9 @@ QString LogEncoding::Decode(char const* bytes, int length) const
 {
     if (m_kind == Automatic || m_kind == Latin1)
         return QString::fromLatin1(bytes, length);
-    QString text = isWide() ? decodeWide(bytes, length) : QString::fromUtf8(bytes, length);
+    if (m_kind == Utf8)
+        return QString::fromUtf8(bytes, length); // removes the mark itself
+    QString text = decodeWide(bytes, length);
     if (text.startsWith(QChar(QChar::ByteOrderMark)))
         text.remove(0, 1);
     return text;

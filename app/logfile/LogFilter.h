@@ -55,6 +55,10 @@ public:
         return !m_text.isEmpty() || !m_required.isEmpty() || !m_hidden.isEmpty();
     }
     bool isExpression() const { return m_isExpression; }
+    QString const& text() const { return m_text; }
+    Qt::CaseSensitivity caseSensitivity() const { return m_matcher.caseSensitivity(); }
+    LogTerms const& required() const { return m_required; }
+    LogTerms const& hidden() const { return m_hidden; }
 
     enum Match {
         Yes,

@@ -3,6 +3,7 @@
 
 #include "app/logfile/LogFinder.h"
 
+#include "app/logfile/CandidateSearch.h"
 #include "app/logfile/LogLineReader.h"
 #include "app/logfile/LogUpdate.h"
 
@@ -98,6 +99,8 @@ void LogFinder::keep(std::vector<int> const& before, size_t from, size_t to, qin
 bool LogFinder::search(LogLineReader& reader, size_t from, size_t to, bool isReported)
 {
     LogRows const& rows = *m_request.rows;
+    LogEncoding const& encoding = m_request.type.encoding;
+    const CandidateSearch candidates(m_request.text, encoding);
     LogRows::Reader starts(rows);
     QElapsedTimer sinceReport;
     sinceReport.start();
@@ -112,8 +115,10 @@ bool LogFinder::search(LogLineReader& reader, size_t from, size_t to, bool isRep
         if (start < 0)
             continue; // a heading
         const QByteArray line = reader.Line(start);
+        const std::optional<LogFilter::Match> known =
+            candidates.Answer(line.constData(), line.size());
         const LogFilter::Match match =
-            m_request.text.Find(m_request.type.encoding.Decode(line.constData(), line.size()));
+            known ? *known : m_request.text.Find(encoding.Decode(line.constData(), line.size()));
         if (match == LogFilter::TooLong) {
             m_slowStart = start;
             m_found.clear();

@@ -7,7 +7,6 @@
 #include "app/logfile/Milliseconds.h"
 
 #include <algorithm>
-#include <cstring>
 #include <limits>
 
 namespace Velocor {
@@ -28,9 +27,6 @@ constexpr qint64 HalfADay = 12 * Milliseconds::Hour;
 // be given in minutes.
 constexpr qint64 ClockChange = 61 * Milliseconds::Minute;
 
-// The flags of a mark that the text filter sets.
-constexpr quint8 OfText = LogRows::Unmatched | LogRows::Hidden;
-
 LogEntry::Severity SeverityOf(quint8 mark)
 {
     return static_cast<LogEntry::Severity>(mark & LogRows::SeverityMask);
@@ -47,8 +43,8 @@ bool ShowsAll(LogFilter const& filter)
 } // namespace
 
 LogIndex::LogIndex(LogLineParser const& parser, LogFilter const& filter, bool isOneRun)
-    : m_parser(parser), m_filter(filter), m_lineEnd(parser.fileType().lineEnd()),
-      m_isOneRun(isOneRun || parser.fileType().isForeign)
+    : m_parser(parser), m_filter(filter), m_search(filter, parser.fileType().encoding.narrowed()),
+      m_lineEnd(parser.fileType().lineEnd()), m_isOneRun(isOneRun || parser.fileType().isForeign)
 {
     m_runs.emplace_back();
 }
@@ -85,6 +81,7 @@ void LogIndex::forgetFrom(size_t line)
     for (size_t forgotten = line; forgotten < m_lines.size(); ++forgotten)
         count(forgotten, -1);
     m_lines.Truncate(line);
+    m_matches.resize(std::min(line, m_matches.size()));
     m_entryEnd = entryEndBefore(line);
     m_runs.resize(1);
     if (line == 0) {
@@ -110,6 +107,7 @@ qint64 LogIndex::completeOffset() const
 qint64 LogIndex::Begin()
 {
     const bool hasSeam = m_runs.size() > 1;
+    m_searched = AllLines;
     m_formerEnd = m_position;
     m_knownEnd = completeOffset();
     m_knownSeam = hasSeam ? m_lines.start(m_runs[1].firstLine) : -1;
@@ -144,8 +142,10 @@ void LogIndex::keepKnownLines()
     m_knownFirst = m_runs[1].firstLine;
     m_knownRuns.assign(m_runs.begin() + 1, m_runs.end());
     m_known = m_lines;
+    m_knownMatches = m_matches;
     if (!m_lastIsComplete)
         m_known.Truncate(m_known.size() - 1);
+    m_knownMatches.resize(std::min(m_knownMatches.size(), m_known.size()));
     while (m_knownRuns.size() > 1 && m_knownRuns.back().firstLine >= m_known.size())
         m_knownRuns.pop_back();
 }
@@ -168,6 +168,8 @@ size_t LogIndex::knownLineAt(qint64 start) const
 
 bool LogIndex::Feed(char const* bytes, int count)
 {
+    if (m_position == 0)
+        m_search.Learn(bytes, count);
     char const* at = bytes;
     char const* const end = bytes + count;
     while (at != end) {
@@ -203,21 +205,23 @@ void LogIndex::End()
     m_hasLostSeam = m_knownSeam >= 0 && m_runs.size() == 1 && !m_isOneRun;
 }
 
-// What the text filter says of a line: flags of its mark.
-quint8 LogIndex::textMarkOf(char const* line, int length)
+// Whether the line with this index matches the text filter.
+LogFilter::Match LogIndex::matchOf(char const* line, int length, size_t index)
 {
-    if (!m_filter.hasText() || m_slowLine > 0)
-        return 0;
+    if (m_slowLine > 0)
+        return LogFilter::Yes;
+    length = std::min(length, LineLimit);
+    const std::optional<LogFilter::Match> known = m_search.Answer(line, length);
+    if (known)
+        return *known;
     const LogFilter::Match match =
         m_filter.Find(m_parser.fileType().encoding.narrowed().Decode(line, length));
     if (match == LogFilter::TooLong)
-        m_slowLine = m_lines.size() + 1;
-    if (match == LogFilter::Hidden)
-        return LogRows::Unmatched | LogRows::Hidden;
-    return match == LogFilter::Yes ? 0 : LogRows::Unmatched;
+        m_slowLine = index + 1;
+    return match;
 }
 
-quint8 LogIndex::markOf(LogLineParser::Parts const& parts, char const* line, int length)
+quint8 LogIndex::markOf(LogLineParser::Parts const& parts)
 {
     quint8 mark = LogEntry::None;
     const size_t number = m_lines.size();
@@ -231,17 +235,25 @@ quint8 LogIndex::markOf(LogLineParser::Parts const& parts, char const* line, int
         mark |= LogRows::Timed;
     if (!(mark & LogRows::Continued))
         m_entryEnd = number + (LogRows::BeginsEntry(mark) ? MaximumEntryLines : 1);
-    return mark | textMarkOf(line, length);
+    return mark;
+}
+
+// The length of a line without its line end.
+//
+// @param length  without the last byte of the line end
+int LogIndex::contentLength(char const* line, int length, bool complete) const
+{
+    if (complete)
+        length = std::max(0, length + 1 - m_lineEnd.size());
+    return m_parser.fileType().encoding.WithoutReturn(line, length);
 }
 
 // Returns false if the lines up to the new position are known.
 bool LogIndex::addLine(char const* line, int length, bool complete)
 {
     const qint64 end = m_lineStart + length + 1;
-    if (complete)
-        length = std::max(0, length + 1 - m_lineEnd.size());
     LogEncoding const& encoding = m_parser.fileType().encoding;
-    length = encoding.WithoutReturn(line, length);
+    length = contentLength(line, length, complete);
     const quint16 check = LogRows::CheckOf(line, length);
     QByteArray narrow;
     encoding.Narrow(line, length, narrow);
@@ -258,7 +270,9 @@ bool LogIndex::addLine(char const* line, int length, bool complete)
     }
     if (m_isSeamUnchanged && m_lineStart >= m_formerEnd)
         joinRuns();
-    m_lines.Append(m_lineStart, markOf(parts, line, std::min(length, LineLimit)), check);
+    if (m_filter.hasText())
+        m_matches.push_back(matchOf(line, length, m_lines.size()));
+    m_lines.Append(m_lineStart, markOf(parts), check);
     count(m_lines.size() - 1, 1);
     if (parts.timeKey >= 0 && complete) // an incomplete line is read again
         noteTime(parts);
@@ -310,11 +324,10 @@ void LogIndex::joinRuns()
 {
     for (size_t number = 1; number < m_runs.size(); ++number) {
         const size_t first = m_runs[number].firstLine;
-        const quint8 mark = m_lines.mark(first);
-        if (!LogRows::IsTorn(mark))
+        if (!LogRows::IsTorn(m_lines.mark(first)))
             continue;
         const bool isAlone = first >= entryEndBefore(first);
-        setMark(first, (m_lines.mark(first - 1) & LogRows::SeverityMask) | (mark & OfText) |
+        setMark(first, (m_lines.mark(first - 1) & LogRows::SeverityMask) |
                            (isAlone ? LogRows::ContinuedAlone : LogRows::Continued));
     }
     m_runs.resize(1);
@@ -336,8 +349,7 @@ void LogIndex::beginRun(LogLineParser::Parts const& parts)
     run.hasDate = parts.hasDate;
     if (run.firstLine > m_lastTimed + 1) {
         --run.firstLine;
-        const quint8 ofText = m_lines.mark(run.firstLine) & OfText;
-        setMark(run.firstLine, LogEntry::None | LogRows::Torn | ofText);
+        setMark(run.firstLine, LogEntry::None | LogRows::Torn);
     }
     m_runs.push_back(run);
     m_runHasTimed = false;
@@ -360,6 +372,10 @@ bool LogIndex::joinKnownLines(qint64 start)
         m_lines.Append(known.start(line), m_known.mark(line), m_known.check(line));
         count(m_lines.size() - 1, 1);
     }
+    if (m_filter.hasText())
+        m_matches.insert(m_matches.end(),
+                         m_knownMatches.begin() + static_cast<std::ptrdiff_t>(first),
+                         m_knownMatches.end());
     m_entryEnd = entryEndBefore(m_lines.size());
     for (Run run : m_knownRuns) {
         if (run.firstLine <= first) {
@@ -398,18 +414,96 @@ void LogIndex::noteTime(LogLineParser::Parts const& parts)
     }
 }
 
+qint64 LogIndex::endOf(size_t line) const
+{
+    return line + 1 < m_lines.size() ? m_lines.start(line + 1) : m_position;
+}
+
+void LogIndex::BeginSearch(LogFilter const& filter)
+{
+    m_filter = filter;
+    m_search = CandidateSearch(filter, m_parser.fileType().encoding.narrowed());
+    m_slowLine = 0;
+    m_searched = filter.hasText() && !m_lines.isEmpty() ? 0 : AllLines;
+    m_matches.assign(filter.hasText() ? m_lines.size() : 0, LogFilter::No);
+    m_matches.shrink_to_fit();
+}
+
+qint64 LogIndex::searchOffset() const
+{
+    return m_searched < size() ? m_lines.start(m_searched) : m_position;
+}
+
+qint64 LogIndex::SearchEnd(qint64 size) const
+{
+    const qint64 start = searchOffset();
+    if (m_position - start <= size)
+        return m_position;
+    const size_t line = m_lines.LineAt(start + size);
+    return line > m_searched ? m_lines.start(line)
+                             : std::min(endOf(line), start + LineLimit + m_lineEnd.size());
+}
+
+void LogIndex::Search(QByteArray const& lines, std::function<bool()> const& goesOn)
+{
+    if (m_searched == 0)
+        m_search.Learn(lines.constData(), lines.size());
+    LineTable::Reader starts(m_lines);
+    const auto startOf = [&](size_t line) {
+        return line < m_lines.size() ? starts.start(line) : m_position;
+    };
+    const bool isWide = m_parser.fileType().encoding.isWide();
+    const qint64 offset = searchOffset();
+    const qint64 end = offset + lines.size();
+    for (qint64 start = offset; start < end; start = startOf(m_searched)) {
+        char const* const rest = lines.constData() + (start - offset);
+        // A line in UTF-16 is narrowed before it is searched.
+        char const* const found = isWide ? rest : m_search.Find(rest, lines.constEnd());
+        const bool isFound = found != lines.constEnd();
+        const qint64 place = start + (found - rest) - (isFound ? 0 : 1);
+        const bool isInFirst = place < startOf(m_searched + 1);
+        const size_t next = (isInFirst ? m_searched : m_lines.LineAt(place)) + (isFound ? 0 : 1);
+        for (; m_searched < next; ++m_searched)
+            m_matches[m_searched] = m_search.answer();
+        if (!isFound)
+            break;
+        const qint64 lineStart = startOf(m_searched);
+        searchLine(lines.constData() + (lineStart - offset), startOf(m_searched + 1) - lineStart);
+        if (m_slowLine > 0 || !goesOn())
+            break;
+    }
+    if (m_searched >= m_lines.size() || m_slowLine > 0)
+        m_searched = AllLines;
+}
+
+// Searches the next line.
+//
+// @param length  with the line end
+void LogIndex::searchLine(char const* line, qint64 length)
+{
+    const bool complete = m_lastIsComplete || m_searched + 1 < m_lines.size();
+    const qint64 limited = std::min<qint64>(length - (complete ? 1 : 0), LineLimit);
+    int size = contentLength(line, static_cast<int>(limited), complete);
+    QByteArray narrow;
+    m_parser.fileType().encoding.Narrow(line, size, narrow);
+    m_matches[m_searched] = matchOf(line, size, m_searched);
+    ++m_searched;
+}
+
 // Whether a line from the first one of an entry on matches the text, and none has a term that
 // hides.
 bool LogIndex::isEntryMatched(size_t first, size_t end) const
 {
-    bool isMatched = m_slowLine > 0;
-    for (size_t line = first; line < end && m_slowLine == 0; ++line) {
+    if (m_slowLine > 0 || m_matches.empty())
+        return true;
+    bool isMatched = false;
+    for (size_t line = first; line < end; ++line) {
         const quint8 mark = m_lines.mark(line);
         if (line > first && (!(mark & LogRows::Continued) || LogRows::IsAlone(mark)))
             break;
-        if (mark & LogRows::Hidden)
+        if (m_matches[line] == LogFilter::Hidden)
             return false;
-        isMatched = isMatched || !(mark & LogRows::Unmatched);
+        isMatched = isMatched || m_matches[line] == LogFilter::Yes;
     }
     return isMatched;
 }

@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "app/logfile/CandidateSearch.h"
 #include "app/logfile/LineTable.h"
 #include "app/logfile/LogEntry.h"
 #include "app/logfile/LogFilter.h"
@@ -11,6 +12,9 @@
 
 #include <QByteArray>
 
+#include <algorithm>
+#include <functional>
+#include <limits>
 #include <vector>
 
 namespace Velocor {
@@ -67,6 +71,37 @@ public:
 
     /// Ends the pass at the end of the file; a last line without a line end counts as a line.
     void End();
+
+    /// Starts to search the known lines for the text of another filter, which Rows() then needs.
+    ///
+    /// Only between two passes. The bytes from searchOffset() on have to be fed to Search(), until
+    /// it is nextOffset(). Rows() lacks the lines that have not been searched, as it lacks those
+    /// that have not been read in a first pass.
+    ///
+    ///     index.BeginSearch(filter);
+    ///     while (index.searchOffset() < index.nextOffset()) {
+    ///         lines = bytesOfFile(index.searchOffset(), index.SearchEnd(1 << 20));
+    ///         index.Search(lines, [] { return true; });
+    ///     }
+    void BeginSearch(LogFilter const& filter);
+
+    /// The offset of the first line that has not been searched; nextOffset() if there is none or
+    /// slowLine() is known.
+    qint64 searchOffset() const;
+
+    /// How many lines have been searched: all, if no search is under way.
+    size_t searchedLines() const { return std::min(m_searched, size()); }
+
+    /// The end of the bytes to search next: of whole lines of up to `size` bytes together, or of
+    /// one line if that is longer. What follows LineLimit in such a line is left out.
+    qint64 SearchEnd(qint64 size) const;
+
+    /// Searches the next lines.
+    ///
+    /// @param lines  the bytes of the file from searchOffset() to SearchEnd()
+    /// @param goesOn  called after each line that the filter was asked about; false stops the
+    /// search
+    void Search(QByteArray const& lines, std::function<bool()> const& goesOn);
 
     /// Where the last complete line ends; after it the file may still change.
     qint64 completeOffset() const;
@@ -132,6 +167,8 @@ public:
     static constexpr int PartsLimit = 64 * 1024;
 
 private:
+    static constexpr size_t AllLines = std::numeric_limits<size_t>::max();
+
     struct Run
     {
         size_t firstLine = 0;
@@ -163,8 +200,11 @@ private:
     size_t resumeLine() const;
     void forgetFrom(size_t line);
     bool addLine(char const* line, int length, bool complete);
-    quint8 markOf(LogLineParser::Parts const& parts, char const* line, int length);
-    quint8 textMarkOf(char const* line, int length);
+    quint8 markOf(LogLineParser::Parts const& parts);
+    int contentLength(char const* line, int length, bool complete) const;
+    LogFilter::Match matchOf(char const* line, int length, size_t index);
+    qint64 endOf(size_t line) const;
+    void searchLine(char const* line, qint64 length);
     bool isSeam(LogLineParser::Parts const& parts, qint64 end) const;
     bool isOlder(LogLineParser::Parts const& parts) const;
     bool isKnown(LogLineParser::Parts const& parts, qint64 end) const;
@@ -177,9 +217,12 @@ private:
 
     LogLineParser m_parser;
     LogFilter m_filter;
+    CandidateSearch m_search;
+    size_t m_searched = AllLines;
     LogLineEnd m_lineEnd;
 
     LineTable m_lines;
+    std::vector<quint8> m_matches; // a LogFilter::Match for each line; empty without a text
     LogCounts m_counts{};
     size_t m_entryEnd = 0;   // lines from here on do not belong to the entry above
     std::vector<Run> m_runs; // newest first, as in the file
@@ -216,6 +259,7 @@ private:
     bool m_isSeamUnchanged = false;
     LineTable m_known;       // from m_knownFirst on
     size_t m_knownFirst = 0; // the first line after the seam
+    std::vector<quint8> m_knownMatches;
     std::vector<Run> m_knownRuns;
 };
 

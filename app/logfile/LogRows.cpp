@@ -14,8 +14,7 @@ namespace {
 // The mark of a row by that of its line.
 quint8 RowMark(quint8 lineMark)
 {
-    const quint8 mark = lineMark & ~(LogRows::Unmatched | LogRows::Hidden);
-    return LogRows::IsAlone(mark) ? (mark & ~LogRows::Torn) | LogRows::Alone : mark;
+    return LogRows::IsAlone(lineMark) ? (lineMark & ~LogRows::Torn) | LogRows::Alone : lineMark;
 }
 
 bool IsProblemMark(quint8 mark)

@@ -46,11 +46,6 @@ public:
     static constexpr quint8 Context = 0x40;   ///< shown only because it is near a line that matches
     static constexpr quint8 Alone = 0x80;     ///< continued, but not shown along with its entry
 
-    /// In a LineTable, instead of the last two: the line does not match the text filter, or has a
-    /// term that hides it.
-    static constexpr quint8 Unmatched = 0x40;
-    static constexpr quint8 Hidden = 0x80;
-
     /// In a LineTable, instead of Alone. A line that is continued is not torn.
     static constexpr quint8 ContinuedAlone = Continued | Torn;
 

@@ -148,18 +148,60 @@ void LogScanner::look()
 
 void LogScanner::SetFilter(int request, LogFilter const& filter)
 {
-    const bool sameText = filter.HasSameText(m_filter);
+    m_isSearched = m_isSearched && filter.HasSameText(m_filter);
     m_request = request;
     m_filter = filter;
-    if (!isCurrentRequest()) {
-        m_complete = m_complete && sameText; // the text has not been searched for yet
-    } else if (sameText && m_complete) {
+    if (isCurrentRequest() && isComplete()) {
         m_isReset = true;
         report();
-    } else {
+    } else if (isCurrentRequest() && !searchAgain()) {
         readFromStart(m_index.isOneRun());
     }
     noteChange(); // which may have been overlooked because of this request
+}
+
+// Searches the lines that are known for another text, and reads what the file has got since.
+// Returns false if it has to be read from the start.
+bool LogScanner::searchAgain()
+{
+    QFile file(m_path);
+    if (!m_complete || !m_exists || !QFileInfo(m_path).isFile() ||
+        !file.open(QIODevice::ReadOnly) || !isSameFile(file) || !search(file))
+        return false;
+    if (!isCurrentRequest())
+        return true;
+    m_isSearched = true;
+    if (looksUnchanged())
+        report();
+    else
+        readChanges(file);
+    return true;
+}
+
+// Returns false if the file was truncated meanwhile.
+bool LogScanner::search(QFile& file)
+{
+    const qint64 end = m_index.nextOffset();
+    QByteArray lines;
+    int reported = 0;
+    m_isReset = true;
+    m_isOtherText = true;
+    m_sinceReport.start();
+    m_reportCost = 0;
+    m_index.BeginSearch(m_filter);
+    while (m_index.searchOffset() < end) {
+        const qint64 offset = m_index.searchOffset();
+        lines.resize(static_cast<int>(m_index.SearchEnd(m_sliceSize) - offset));
+        if (!file.seek(offset) || file.read(lines.data(), lines.size()) != lines.size())
+            return false;
+        m_index.Search(lines, [this] { return isCurrentRequest(); });
+        if (!isCurrentRequest())
+            return true;
+        reported = reportProgress(offset + lines.size(), end, reported);
+        if (m_index.searchOffset() < end)
+            reportPart();
+    }
+    return true;
 }
 
 void LogScanner::startOver(bool isOneRun)
@@ -173,6 +215,7 @@ void LogScanner::startOver(bool isOneRun)
     m_size = 0;
     m_modified = QDateTime();
     m_complete = false;
+    m_isSearched = true; // line by line, while they are read
 }
 
 void LogScanner::readFromStart(bool isOneRun)
@@ -222,11 +265,7 @@ bool LogScanner::readFrom(QFile& file)
             more = file.seek(m_index.nextOffset());
         if (!isCurrentRequest())
             return false;
-        const int percent = size > 0 ? static_cast<int>(file.pos() * 100 / size) : 100;
-        if (percent >= reported + 10) {
-            reported = percent;
-            Q_EMIT progressed(m_request, percent);
-        }
+        reported = reportProgress(file.pos(), size, reported);
         if (file.pos() < end)
             reportPart();
     }
@@ -234,6 +273,16 @@ bool LogScanner::readFrom(QFile& file)
     noteFile(file);
     m_complete = file.size() >= m_size; // otherwise it was truncated meanwhile
     return true;
+}
+
+// Tells every ten percent, and returns which was told last.
+int LogScanner::reportProgress(qint64 offset, qint64 size, int reported)
+{
+    const int percent = size > 0 ? static_cast<int>(offset * 100 / size) : 100;
+    if (percent < reported + 10)
+        return reported;
+    Q_EMIT progressed(m_request, percent);
+    return percent;
 }
 
 // Feeds what was read. Returns false if reading must go on elsewhere.
@@ -315,17 +364,17 @@ bool LogScanner::looksUnchanged() const
 
 void LogScanner::Poll()
 {
-    if (m_path.isEmpty() || !isCurrentRequest() || (m_complete && looksUnchanged())) {
+    if (m_path.isEmpty() || !isCurrentRequest() || (isComplete() && looksUnchanged())) {
         Q_EMIT polled();
         return;
     }
 
     QFile file(m_path);
     const bool opened = QFileInfo(m_path).isFile() && file.open(QIODevice::ReadOnly);
-    if (!opened && (m_exists || !m_complete)) {
+    if (!opened && (m_exists || !isComplete())) {
         m_error = ErrorOf(file);
         reportMissing();
-    } else if (opened && (!m_complete || !m_exists || !isSameFile(file))) {
+    } else if (opened && (!isComplete() || !m_exists || !isSameFile(file))) {
         readFromStart(false);
     } else if (opened) {
         readChanges(file);
@@ -354,8 +403,10 @@ void LogScanner::report(bool isPartial)
 {
     LogUpdate update;
     update.request = m_request;
-    update.rows = std::make_shared<LogRows>(m_isReset ? m_index.Rows(m_filter)
-                                                      : m_index.Rows(m_filter, *m_rows));
+    const bool isAllNew = m_isReset || m_isOtherText;
+    update.rows = std::make_shared<LogRows>(isAllNew ? m_index.Rows(m_filter)
+                                                     : m_index.Rows(m_filter, *m_rows));
+    m_isOtherText = !m_isSearched;
     update.isPartial = isPartial;
     update.isReset = m_isReset;
     if (!m_isReset)
@@ -363,12 +414,12 @@ void LogScanner::report(bool isPartial)
     update.counts = m_index.counts();
     const bool nothingNew = !update.isReset && update.removed == 0 && update.inserted == 0 &&
                             update.changedTail == 0 && update.rows->size() == m_rows->size() &&
-                            m_index.size() == m_lines && update.counts == m_counts &&
+                            m_index.searchedLines() == m_lines && update.counts == m_counts &&
                             m_isPartial == isPartial;
     m_isReset = false;
     m_isPartial = isPartial;
     m_rows = update.rows;
-    m_lines = m_index.size();
+    m_lines = m_index.searchedLines();
     m_counts = update.counts;
     update.exists = m_exists;
     update.error = m_error;

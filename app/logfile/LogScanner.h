@@ -82,9 +82,13 @@ Q_SIGNALS:
 
 private:
     bool isCurrentRequest() const { return m_currentRequest == m_request; }
+    bool isComplete() const { return m_complete && m_isSearched; }
     void readFromStart(bool isOneRun);
+    bool searchAgain();
+    bool search(QFile& file);
     bool readFrom(QFile& file);
     bool feed(QByteArray const& slice, qint64 count);
+    int reportProgress(qint64 offset, qint64 size, int reported);
     void readChanges(QFile& file);
     bool looksUnchanged() const;
     bool isSameFile(QFile& file) const;
@@ -111,9 +115,10 @@ private:
     int m_sliceSize = 1 << 20;
     int m_interval = 200;
     QElapsedTimer m_sinceReport;
-    qint64 m_reportCost = 0;  // milliseconds
-    bool m_isReset = true;    // the next update
-    bool m_isPartial = false; // the last update
+    qint64 m_reportCost = 0;    // milliseconds
+    bool m_isReset = true;      // the next update
+    bool m_isPartial = false;   // the last update
+    bool m_isOtherText = false; // of the filter, than when the last rows were made
 
     QFileSystemWatcher* m_watcher = nullptr;
     QTimer* m_lookTimer = nullptr;
@@ -125,7 +130,8 @@ private:
     int m_lookDelay = 0; // milliseconds
 
     bool m_exists = false;
-    bool m_complete = false;
+    bool m_complete = false;  // the lines of the index
+    bool m_isSearched = true; // all of them, for the text of the filter
     QString m_error;
     qint64 m_size = 0;
     QDateTime m_modified;

@@ -36,6 +36,9 @@ public:
     /// Where the terms are in a text: start and length.
     QVector<QPair<int, int>> Ranges(QString const& text) const;
 
+    /// One for each term.
+    QVector<QStringMatcher> const& matchers() const { return m_matchers; }
+
     bool operator==(LogTerms const& other) const;
 
     /// The terms in what a user has typed.

@@ -39,6 +39,7 @@ private slots:
     void detect();
     void decode_data();
     void decode();
+    void secondMark();
     void validUtf8();
     void lineEnds_data();
     void lineEnds();
@@ -122,6 +123,18 @@ void tst_LogEncoding::decode()
     encoding.Narrow(line, length, buffer);
     QCOMPARE(encoding.narrowed().Decode(line, length), text);
     QVERIFY(encoding.kind() == LogEncoding::Latin1 || !QByteArray(line, length).contains('\0'));
+}
+
+// Only the first one is no text.
+void tst_LogEncoding::secondMark()
+{
+    const QString mark(QChar::ByteOrderMark);
+    for (LogEncoding encoding : {LogEncoding::Utf8, LogEncoding::Utf16Le, LogEncoding::Utf16Be}) {
+        const QString text = mark + mark + "a";
+        const QByteArray bytes =
+            encoding.isWide() ? Wide(text, encoding) : QByteArray(text.toUtf8());
+        QCOMPARE(encoding.Decode(bytes.constData(), bytes.size()), mark + "a");
+    }
 }
 
 // As Qt decides it.

@@ -28,6 +28,18 @@ void Pass(LogIndex& index, QByteArray const& file, int slice)
     index.End();
 }
 
+// A search of the known lines, in slices of the given size.
+void Search(LogIndex& index, QByteArray const& file, LogFilter const& filter, int slice)
+{
+    index.BeginSearch(filter);
+    while (index.searchOffset() < index.nextOffset()) {
+        const qint64 offset = index.searchOffset();
+        const auto length = static_cast<int>(index.SearchEnd(slice) - offset);
+        const QByteArray lines = file.mid(static_cast<int>(offset), length);
+        index.Search(lines, [] { return true; });
+    }
+}
+
 // The rows as texts: the lines of the file, and the headings in brackets.
 QStringList Texts(LogIndex const& index, QByteArray const& file,
                   LogFilter const& filter = LogFilter())
@@ -81,6 +93,9 @@ private slots:
     void filter();
     void continuedLinesGoWithTheirEntry();
     void textFilter();
+    void anotherText_data();
+    void anotherText();
+    void partOfASearch();
     void textFilterOfLongLines();
     void slowLineAfterOthers();
     void entryUntilItGoesOn();
@@ -321,6 +336,99 @@ void tst_LogIndex::textFilter()
     QCOMPARE(Texts(index, file, filter).size(), 11);
 }
 
+void tst_LogIndex::anotherText_data()
+{
+    QTest::addColumn<QByteArray>("file");
+    QTest::addColumn<QString>("before");
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<bool>("isExpression");
+    const auto row = [](char const* name, QByteArray const& file, char const* before,
+                        char const* text, bool isExpression = false) {
+        QTest::newRow(name) << file << QString(before) << QString(text) << isExpression;
+    };
+    const QByteArray file = run(30, QTime(9, 0), "newer");
+    row("found", file, "", "newer 2");
+    row("found, other than before", file, "newer 1", "newer 2");
+    row("not found", file, "newer 1", "absent");
+    row("no text any more", file, "newer 1", "");
+    row("expression", file, "newer 1", "r [12]", true);
+    row("expression without a text", file, "newer 1", "\\d{2}$", true);
+    row("the last line", file, "", "newer 29");
+    row("an incomplete last line", file + "end", "", "end");
+    row("runs", writtenOver(run(30, QTime(8, 0), "older"), run(10, QTime(9, 0), "newer")), "newer",
+        "r 2");
+    row("entries of several lines", entry("09:00:00.000", "Error", "a") + "stack\ntrace\n" + file,
+        "newer", "stack");
+    row("an expression that takes too long",
+        file + entry("10:00:00.000", "Trace", QString(200, 'a') + "1") + file, "newer",
+        "(a+)+[b-z]$", true);
+    row("an expression that took too long",
+        file + entry("10:00:00.000", "Trace", QString(200, 'a') + "1") + file, "(a+)+[b-z]$",
+        "newer 2");
+    row("no line", "", "", "a");
+}
+
+// Another text is found in the lines that are known, as if they were read again.
+void tst_LogIndex::anotherText()
+{
+    QFETCH(QByteArray, file);
+    QFETCH(QString, before);
+    QFETCH(QString, text);
+    QFETCH(bool, isExpression);
+    LogFilter filter;
+    QVERIFY(filter.SetText(text, isExpression, true));
+    LogFilter filterBefore;
+    QVERIFY(filterBefore.SetText(before, before.startsWith('('), true));
+    LogIndex fresh{LogLineParser(), filter};
+    Pass(fresh, file, 1000);
+    for (int slice : {1, 100, 1000000}) {
+        LogIndex index{LogLineParser(), filterBefore};
+        Pass(index, file, 1000);
+        Search(index, file, filter, slice);
+        QCOMPARE(Texts(index, file, filter), Texts(fresh, file, filter));
+        QCOMPARE(index.slowLine(), fresh.slowLine());
+        QCOMPARE(index.slowLine(), size_t(text.startsWith('(') ? 31 : 0));
+        QCOMPARE(index.searchedLines(), fresh.size());
+
+        // Later lines are searched for it, too.
+        const QByteArray more = file + entry("11:00:00.000", "Trace", "newer 2");
+        Pass(index, more, 1000);
+        Pass(fresh, more, 1000);
+        QCOMPARE(Texts(index, more, filter), Texts(fresh, more, filter));
+        fresh = LogIndex(LogLineParser(), filter);
+        Pass(fresh, file, 1000);
+    }
+}
+
+// Lines that have not been searched are not shown.
+void tst_LogIndex::partOfASearch()
+{
+    const QByteArray file = run(30, QTime(9, 0), "newer");
+    LogIndex index;
+    Pass(index, file, 1000);
+    LogFilter filter;
+    QVERIFY(filter.SetText("newer", false, true));
+    index.BeginSearch(filter);
+    QCOMPARE(index.searchedLines(), size_t(0));
+    QCOMPARE(Texts(index, file, filter), QStringList());
+    const QByteArray first = file.left(static_cast<int>(index.SearchEnd(500)));
+    QVERIFY(first.size() <= 500 && first.endsWith('\n'));
+    index.Search(first, [] { return true; });
+    QCOMPARE(Texts(index, file, filter), Lines(first));
+    QCOMPARE(index.searchedLines(), size_t(Lines(first).size()));
+    QCOMPARE(index.searchOffset(), qint64(first.size()));
+    QCOMPARE(index.size(), size_t(30));
+
+    // It can be stopped after each line that matches.
+    QVERIFY(filter.SetText("newer 2", false, true));
+    index.BeginSearch(filter);
+    index.Search(file, [] { return false; });
+    QCOMPARE(index.searchedLines(), size_t(3));
+    index.Search(file.mid(static_cast<int>(index.searchOffset())), [] { return true; });
+    QCOMPARE(index.searchedLines(), size_t(30));
+    QCOMPARE(Texts(index, file, filter).size(), 11);
+}
+
 // Read in many pieces, and searched as a whole.
 void tst_LogIndex::textFilterOfLongLines()
 {
@@ -336,6 +444,13 @@ void tst_LogIndex::textFilterOfLongLines()
     const LogRows rows = index.Rows(filter);
     QCOMPARE(rows.size(), size_t(2));
     QCOMPARE(rows.start(1), qint64(file.lastIndexOf('\n') + 1));
+
+    LogIndex again;
+    Pass(again, file, 4099);
+    Search(again, file, filter, 4099);
+    const LogRows rowsAgain = again.Rows(filter);
+    QCOMPARE(rowsAgain.size(), size_t(2));
+    QCOMPARE(rowsAgain.start(1), rows.start(1));
 }
 
 // From then on all lines match, also those that did not.

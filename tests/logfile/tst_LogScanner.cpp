@@ -161,6 +161,12 @@ private slots:
     void obsoleteFilter_data();
     void obsoleteFilter();
     void sameTextReadsNothing();
+    void anotherTextKeepsTheLines();
+    void changesBeforeAnotherText_data();
+    void changesBeforeAnotherText();
+    void changesDuringASearch_data();
+    void changesDuringASearch();
+    void cancelledSearch();
     void countsOfHiddenEntries();
     void obsoleteFilterOfAMissingFile();
 
@@ -887,6 +893,123 @@ void tst_LogScanner::sameTextReadsNothing()
     QCOMPARE(reader.updates.size(), 2);
     QVERIFY(reader.updates.last().exists);
     QCOMPARE(reader.updates.last().rows->size(), size_t(1));
+}
+
+// For another text, lines are searched but not looked for again.
+void tst_LogScanner::anotherTextKeepsTheLines()
+{
+    const QByteArray file = run(60, QTime(9, 0), "x");
+    QVERIFY(TestFiles::write(m_file, file));
+    const QDateTime before = QDateTime::currentDateTime().addSecs(-3600);
+    QVERIFY(SetTime(m_file, before));
+    Reader reader(m_file);
+    reader.Open(1);
+
+    // Nobody can see this change but who reads all of the file.
+    QByteArray changed = file;
+    const int place = file.indexOf("x 30");
+    changed.replace(place, 4, "y\n30");
+    QVERIFY(TestFiles::write(m_file, changed));
+    QVERIFY(SetTime(m_file, before));
+    reader.SetFilter(2, With("y"));
+    QCOMPARE(reader.updates.size(), 2);
+    QCOMPARE(reader.updates.last().rows->size(), size_t(1));
+    QCOMPARE(reader.updates.last().lines, size_t(60));
+}
+
+void tst_LogScanner::changesBeforeAnotherText_data()
+{
+    QTest::addColumn<QByteArray>("after");
+    const QByteArray file = Long("a", "c", "e");
+    QTest::newRow("none") << file;
+    QTest::newRow("lines were added") << file + entry("10:00:00.000", "Trace", "d again");
+    QTest::newRow("the last line was completed") << file.left(file.size() - 1);
+    QTest::newRow("it was truncated") << file.left(file.size() / 2);
+    QTest::newRow("another first line") << Long("d", "c", "e");
+    QTest::newRow("another last line") << Long("a", "c", "d");
+    QTest::newRow("another file") << entry("08:00:00.000", "Trace", "d").repeated(100);
+    QTest::newRow("a new run") << writtenOver(file, entry("11:00:00.000", "Trace", "d again"));
+    QTest::newRow("another middle") << Long("a", "d", "e");
+}
+
+// The rows are those of the file as it is now.
+void tst_LogScanner::changesBeforeAnotherText()
+{
+    QFETCH(QByteArray, after);
+    const QByteArray file = Long("a", "c", "e");
+    const bool isCompleted = !after.endsWith('\n') && after.size() + 1 == file.size();
+    QVERIFY(TestFiles::write(m_file, isCompleted ? after : file));
+    Reader reader(m_file);
+    reader.Open(1);
+    QVERIFY(TestFiles::write(m_file, isCompleted ? file : after));
+    reader.SetFilter(2, With("d"));
+    QCOMPARE(reader.updates.size(), 2);
+    QVERIFY(reader.updates.last().isReset && !reader.updates.last().isPartial);
+    Reader fresh(m_file);
+    fresh.Open(1, With("d"));
+    QCOMPARE(reader.Rows(), fresh.Rows());
+    QCOMPARE(reader.updates.last().lines, fresh.updates.last().lines);
+}
+
+void tst_LogScanner::changesDuringASearch_data()
+{
+    QTest::addColumn<int>("size"); // of a file of 3 MiB
+    QTest::newRow("truncated") << 1000;
+    QTest::newRow("truncated after what was searched") << (5 << 19);
+    QTest::newRow("grown") << (4 << 20);
+}
+
+void tst_LogScanner::changesDuringASearch()
+{
+    QFETCH(int, size);
+    const QByteArray line = QByteArray(1023, 'x') + '\n';
+    QVERIFY(TestFiles::write(m_file, line.repeated(3 << 10)));
+    Reader reader(m_file);
+    reader.Open(1);
+    bool isChanged = false;
+    reader.onProgress = [&](int) {
+        isChanged = isChanged || TestFiles::write(m_file, line.repeated(size / 1024));
+    };
+    reader.SetFilter(2, With("x"));
+    QVERIFY(isChanged);
+    QCOMPARE(reader.updates.size(), 2);
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.last().rows->size(), size_t(size / 1024));
+    QCOMPARE(reader.updates.last().lines, size_t(size / 1024));
+}
+
+// A text that is superseded while it is searched for is never answered.
+void tst_LogScanner::cancelledSearch()
+{
+    const QByteArray line = QByteArray(1023, 'x') + '\n';
+    QVERIFY(TestFiles::write(m_file, line.repeated(3 << 10) + "y\n"));
+    QVERIFY(SetTime(m_file, QDateTime::currentDateTime().addSecs(-3600)));
+    Reader reader(m_file);
+    reader.Open(1);
+    reader.progress.clear();
+    reader.onProgress = [&](int) {
+        reader.scanner.SetCurrentRequest(3);
+    };
+    reader.SetFilter(2, With("x"));
+    QCOMPARE(reader.progress.size(), 1);
+    QCOMPARE(reader.updates.size(), 1);
+    reader.scanner.Poll(); // not its business
+    QCOMPARE(reader.updates.size(), 1);
+    reader.onProgress = nullptr;
+    reader.SetFilter(3, With("y"));
+    QCOMPARE(reader.updates.size(), 2);
+    QCOMPARE(reader.Rows(), QStringList("y"));
+
+    // If it becomes current again, the next poll answers it.
+    reader.onProgress = [&](int) {
+        reader.scanner.SetCurrentRequest(5);
+    };
+    reader.SetFilter(4, With("x"));
+    reader.onProgress = nullptr;
+    reader.scanner.SetCurrentRequest(4);
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 3);
+    QCOMPARE(reader.updates.last().rows->size(), size_t(3 << 10));
 }
 
 // The last line becomes an entry of another severity, which is hidden.

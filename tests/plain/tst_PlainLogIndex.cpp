@@ -33,6 +33,9 @@ namespace {
 
 const QStringList SeverityNames({"Trace", "Notification", "Warning", "Error", "Fatal"});
 
+// In a mark: the text filter does not match the line.
+constexpr quint8 Unmatched = 0x40;
+
 // A line by regular expressions.
 struct PlainLine
 {
@@ -183,7 +186,7 @@ public:
             if (line.isTimed)
                 row.mark |= LogRows::Timed;
             if (filter.hasText() && !filter.Matches(QString::fromLatin1(line.text)))
-                row.mark |= LogRows::Unmatched;
+                row.mark |= Unmatched;
             run.rows.push_back(row);
             if (!line.isTimed)
                 continue;
@@ -250,7 +253,7 @@ private:
         if (run.rows.size() > run.afterTimed) {
             Row torn = run.rows.back();
             run.rows.pop_back();
-            torn.mark = (torn.mark & LogRows::Unmatched) | LogRows::Torn | LogEntry::None;
+            torn.mark = (torn.mark & Unmatched) | LogRows::Torn | LogEntry::None;
             torn.isEntry = false;
             next.rows.push_back(torn);
         }
@@ -287,14 +290,13 @@ private:
                 groups.push_back({row});
         }
         for (std::vector<Row> const& group : groups) {
-            const bool isMatched = std::any_of(group.begin(), group.end(), [](Row const& row) {
-                return !(row.mark & LogRows::Unmatched);
-            });
+            const bool isMatched = std::any_of(
+                group.begin(), group.end(), [](Row const& row) { return !(row.mark & Unmatched); });
             for (Row const& row : group) {
                 const auto severity = LogEntry::Severity(row.mark & LogRows::SeverityMask);
                 if (!isMatched || !filter.Shows(severity))
                     continue;
-                rows.add(row.start, quint8(row.mark & ~LogRows::Unmatched), row.check);
+                rows.add(row.start, quint8(row.mark & ~Unmatched), row.check);
                 const bool isProblem = severity >= LogEntry::Warning && severity <= LogEntry::Fatal;
                 rows.problems += isProblem && !(row.mark & LogRows::Continued);
             }
