@@ -148,6 +148,7 @@ private:
     LogLineParser m_parser;
     LogFilter m_filter;
     LogLineEnd m_lineEnd;
+    LogLineParser::Beginnings m_beginnings;
 
     std::vector<qint64> m_starts;
     std::vector<quint8> m_marks;
