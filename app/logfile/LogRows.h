@@ -3,9 +3,9 @@
 
 #pragma once
 
+#include "app/logfile/LineCheck.h"
 #include "app/logfile/LogEntry.h"
 
-#include <QHashFunctions>
 #include <QtGlobal>
 
 #include <algorithm>
@@ -73,9 +73,7 @@ struct LogRows
     /// @param line  without its line end
     static quint16 CheckOf(char const* line, int length)
     {
-        constexpr uint Seed = 1; // with 0, Qt takes a function that goes byte by byte
-        const auto checked = static_cast<size_t>(std::min(length, CheckedLength));
-        return static_cast<quint16>(qHashBits(line, checked, Seed));
+        return LineCheck(line, static_cast<size_t>(std::min(length, CheckedLength)));
     }
 
     /// The row whose line starts there or, if there is none, as near to it as possible; -1 without
