@@ -4,46 +4,23 @@
 // How often the program wakes up while nothing happens, beside a window in which nothing is.
 
 #include "support/Measurements.h"
+#include "support/Processes.h"
 #include "support/ScratchFolder.h"
 
 #include <QCoreApplication>
-#include <QDir>
-#include <QProcess>
 
 #include <chrono>
 #include <thread>
 
 namespace {
 
-// The times that the threads of a process gave up the processor by themselves: each is followed by
-// a wake-up.
-int WakeUps(qint64 process)
-{
-    int count = 0;
-    const QString tasks = QStringLiteral("/proc/%1/task/").arg(process);
-    const QStringList threads = QDir(tasks).entryList(QDir::Dirs | QDir::NoDotAndDotDot);
-    for (QString const& thread : threads) {
-        const QByteArray key = "\nvoluntary_ctxt_switches:";
-        const QByteArray status = ReadAll(tasks + thread + "/status");
-        const int start = status.indexOf(key) + key.size();
-        count += status.mid(start, status.indexOf('\n', start) - start).trimmed().toInt();
-    }
-    return count;
-}
-
 double WakeUpsPerSecond(QString const& program, int seconds)
 {
-    QProcess process;
-    process.start(program, QStringList());
-    Require(process.waitForStarted(), program + QStringLiteral(" does not start"));
+    const RunningProcess process({program});
     std::this_thread::sleep_for(std::chrono::seconds(3));
-    const int before = WakeUps(process.processId());
+    const int before = process.wakeUps();
     std::this_thread::sleep_for(std::chrono::seconds(seconds));
-    const int count = WakeUps(process.processId()) - before;
-    Require(process.state() == QProcess::Running, program + QStringLiteral(" ended by itself"));
-    process.kill();
-    process.waitForFinished();
-    return double(count) / seconds;
+    return double(process.wakeUps() - before) / seconds;
 }
 
 } // namespace

@@ -94,7 +94,7 @@ Start StartOnce(Program const& program)
 // bench_start RESULTS ROUNDS
 int main(int argc, char** argv)
 {
-    Require(argc == 3, QStringLiteral("usage: bench_start RESULTS ROUNDS"));
+    Require(argc >= 3, QStringLiteral("usage: bench_start RESULTS ROUNDS"));
     ::setenv("QT_QPA_PLATFORM", "xcb", 1);
     ::setenv("QT_PLUGIN_PATH", VELOCOR_PROBE_PLUGINS, 1);
     ::setenv("QT_QPA_GENERIC_PLUGINS", "startprobe", 1);

@@ -38,10 +38,13 @@ class Goal:
 
 
 class Limit:
-    """`what` takes at most `nanoseconds` in each of `groups`."""
+    """`what` needs at most `most`, in `unit`, in each of `groups` or, if their names begin with
+    "...", in all groups whose names end like that. In groups of rows, it is about a `column`.
+    `quick`: whether it is also a goal for a quick run."""
 
-    def __init__(self, groups, what, nanoseconds):
-        self.groups, self.what, self.nanoseconds = groups, what, nanoseconds
+    def __init__(self, groups, what, most, unit="ns", column=None, quick=False):
+        self.groups, self.what, self.most, self.unit = groups, what, most, unit
+        self.column, self.quick = column, quick
         self.given_up = None
 
 
@@ -60,6 +63,10 @@ LOADS = ["load 20x50 values", "load 200x500 values"]
 SAVES = ["save 20x50 values", "save 200x500 values"]
 WRITES = ["document to file", "document to bytes"]
 LARGE_LOG = ["log of 100 MB, 1,000,000 lines"]
+GIANT_LOG = "log of 1 GiB, "
+FOLLOWING = "following 50 lines a second, share of a processor"
+WRITTEN = "a line written until it is seen"
+LONGEST_TURN = "longest turn of the event loop, 10,000 lines a second"
 PARSES = ["parse generated document", "parse shared MIME database"]
 
 SECTIONS = {
@@ -121,12 +128,26 @@ SECTIONS = {
     ),
     "window": Section(
         "The view of a large log",
-        [("bench_window", "display")],
+        [
+            ("bench_window", "display"),
+            ("bench_log_index", "google"),
+            ("bench_large_log", "display"),
+        ],
         (5, 2),
+        unit="line",
         goals=[
-            Limit(LARGE_LOG, "open", 2e9),
-            Limit(LARGE_LOG, "longest moment", 50e6),
-            Limit(LARGE_LOG, "scroll", 16e6),
+            Limit(LARGE_LOG, "open", 2e9, quick=True),
+            Limit(LARGE_LOG, "longest moment", 50e6, quick=True),
+            Limit(LARGE_LOG, "scroll", 16e6, quick=True),
+            Limit([GIANT_LOG + "opening, processor time"], "velocor, log view", 0.6e9),
+            Limit([GIANT_LOG + "memory a line"], "velocor, log view", 4, "bytes"),
+            Limit([GIANT_LOG + "filter by text, processor time"], "velocor", 0.5e9),
+            Limit([GIANT_LOG + "filter by expression, processor time"], "velocor", 0.8e9),
+            Limit([GIANT_LOG + FOLLOWING], "velocor", 2, "%"),
+            Limit([GIANT_LOG + "wake-ups while nothing happens"], "velocor", 0, "", "a second"),
+            Limit([GIANT_LOG + WRITTEN], "velocor", 60e6, "ns", "p99.9"),
+            Limit(["..., first page"], "velocor", 50e6, quick=True),
+            Limit(["..., " + LONGEST_TURN], "velocor", 16e6, quick=True),
         ],
     ),
     "growth": Section("Cost as work grows", [("bench_growth", "google")], (5, 2)),
@@ -239,7 +260,7 @@ def run_program(program, kind, repetitions, quick, home):
     else:
         display, variables["DISPLAY"] = start_display()
         try:
-            command = [program, results, str(repetitions)]
+            command = [program, results, str(repetitions), *quick_flag]
             subprocess.run(command, env=variables, check=True)
         finally:
             display.terminate()
@@ -270,8 +291,10 @@ def three_digits(value):
 
 
 def formatted(value, unit):
+    if unit == "KiB":
+        return f"{value / 1024:.1f} MiB"
     if unit != "ns":
-        return f"{value / 1024:.1f} MiB" if unit == "KiB" else f"{value:.0f} {unit}"
+        return f"{three_digits(value)} {unit}".strip()
     for factor, name in ((1e9, "s"), (1e6, "ms"), (1e3, "µs")):
         if value >= factor:
             return f"{three_digits(value / factor)} {name}"
@@ -366,12 +389,23 @@ def measurement(samples, group, start):
     return name, samples.median(group, name)
 
 
+def limited(goal, samples, group):
+    if not goal.column:
+        return measurement(samples, group, goal.what)
+    for name, columns in samples.rows.get(group, {}).items():
+        if name.startswith(goal.what):
+            value = next(value for column, value, _ in columns if column == goal.column)
+            return f"{name}, {goal.column}", value
+    return sys.exit(f"bench: no row for a goal of '{group}'")
+
+
 def judge(goal, samples, group):
     """The goal as text, the measured value, and whether the goal is reached."""
-    what, value = measurement(samples, group, goal.what)
     if isinstance(goal, Limit):
-        limit = formatted(goal.nanoseconds, "ns")
-        return f"{what}: at most {limit}", formatted(value, "ns"), value <= goal.nanoseconds
+        what, value = limited(goal, samples, group)
+        wanted = f"{what}: at most {formatted(goal.most, goal.unit)}"
+        return wanted, formatted(value, goal.unit), value <= goal.most
+    what, value = measurement(samples, group, goal.what)
     other, other_value = measurement(samples, group, goal.other)
     reference = FLOOR if goal.other == FLOOR else other
     ratio = value / other_value
@@ -379,10 +413,20 @@ def judge(goal, samples, group):
     return wanted, f"{ratio:.2f}", ratio <= goal.factor
 
 
-def goal_lines(section, samples):
+def groups_of(goal, samples):
+    for group in goal.groups:
+        if group.startswith("..."):
+            yield from (name for name in samples.groups if name.endswith(group[3:]))
+        else:
+            yield group
+
+
+def goal_lines(section, samples, quick):
     lines = []
     for goal in section.goals:
-        for group in goal.groups:
+        if quick and isinstance(goal, Limit) and not goal.quick:
+            continue
+        for group in groups_of(goal, samples):
             wanted, value, reached = judge(goal, samples, group)
             verdict = "reached" if reached else "NOT REACHED"
             if goal.given_up and not reached:
@@ -420,7 +464,7 @@ def titled(group, text, charts):
     return f"### {title}\n\n{picture if group in charts else ''}{text}"
 
 
-def report(name, section, samples, charts):
+def report(name, section, samples, charts, quick):
     if name == "growth":
         parts = [growth_table(samples)]
     else:
@@ -429,7 +473,7 @@ def report(name, section, samples, charts):
             for group in samples.groups
         ]
     parts += [titled(group, rows_table(rows), charts) for group, rows in samples.rows.items()]
-    goals = goal_lines(section, samples)
+    goals = goal_lines(section, samples, quick)
     return "\n".join([f"## {section.title}\n", *parts] + ([goals] if goals else []))
 
 
@@ -456,7 +500,8 @@ def value_in(path, key):
 def versions():
     packages = (
         "libqt5core5a libspdlog-dev liblog4cplus-dev liblog4cxx-dev libboost-dev "
-        "libgoogle-glog-dev libkf5config-dev libpugixml-dev libxml2-dev libbenchmark-dev"
+        "libgoogle-glog-dev libkf5config-dev libpugixml-dev libxml2-dev libbenchmark-dev "
+        "coreutils grep ripgrep ugrep lnav glogg"
     ).split()
     query = ["dpkg-query", "-W", "-f=${Package} ${Version}\n", *packages]
     result = subprocess.run(query, capture_output=True, text=True, check=False)
@@ -512,7 +557,7 @@ def main():
         samples = measure(section, options.programs, options)
         if options.write_doc and name != "growth":
             charts.update(charts_of(samples))
-        parts.append(report(name, section, samples, charts))
+        parts.append(report(name, section, samples, charts, options.quick))
         print(parts[-1], flush=True)
     if options.write_doc:
         bench_charts.write(CHARTS, charts)

@@ -8,7 +8,7 @@
 #     scripts/install-packages.sh build          to build the program
 #     scripts/install-packages.sh wayland        Qt's platform plug-in for Wayland
 #     scripts/install-packages.sh build test     and to run its tests
-#     scripts/install-packages.sh build bench    and the libraries that ./bench compares with
+#     scripts/install-packages.sh build bench    and what ./bench compares with
 #     scripts/install-packages.sh build fuzz     and clang with its fuzzing runtime
 #     scripts/install-packages.sh build lint     and to check format and lint
 #     scripts/install-packages.sh build package  and to validate and build the package
@@ -29,7 +29,7 @@ packages_of() {
     */bench)
         echo python3 xvfb xauth shared-mime-info libbenchmark-dev libspdlog-dev liblog4cplus-dev \
             liblog4cxx-dev libboost-dev libboost-log-dev libgoogle-glog-dev libkf5config-dev \
-            libpugixml-dev libxml2-dev
+            libpugixml-dev libxml2-dev grep ripgrep ugrep lnav glogg
         ;;
     */fuzz) echo clang-14 libclang-rt-14-dev ;;
     */package) echo dpkg-dev desktop-file-utils appstream man-db ;;

@@ -210,9 +210,10 @@ private:
     // message.
     bool readAccess()
     {
-        auto const* bracket =
-            static_cast<char const*>(std::memchr(m_text, '[', static_cast<size_t>(m_length)));
-        const auto at = static_cast<int>((bracket ? bracket + 1 : m_text) - m_text);
+        // Not std::memchr(): gcc warns in a release build, because the length is an int.
+        char const* const end = m_text + m_length;
+        char const* const bracket = std::find(m_text, end, '[');
+        const auto at = static_cast<int>((bracket != end ? bracket + 1 : m_text) - m_text);
         return at > 1 && m_length - at > 12 && m_text[at + 2] == '/' && m_text[at + 6] == '/' &&
                readStampWithin(at);
     }

@@ -189,7 +189,8 @@ bool LogIndex::Feed(char const* bytes, int count)
             break;
         at = lineEnd + 1;
         m_lineStart = m_position + (at - bytes);
-        m_partialLine.clear();
+        if (m_lineIsPartial)
+            m_partialLine.clear();
         m_lineIsPartial = false;
     }
     m_lastByte = count > 0 ? end[-1] : m_lastByte;
@@ -257,7 +258,8 @@ bool LogIndex::addLine(char const* line, int length, bool complete)
     const quint16 check = LogRows::CheckOf(line, length);
     QByteArray narrow;
     encoding.Narrow(line, length, narrow);
-    const LogLineParser::Parts parts = m_parser.Find(line, std::min(length, PartsLimit));
+    const LogLineParser::Parts parts =
+        m_parser.Find(line, std::min(length, PartsLimit), m_beginnings);
     m_hasElapsed = m_hasElapsed || parts.elapsedLength > 0;
     m_hasTimes = m_hasTimes || parts.timeLength > 0;
     m_hasSeverities = m_hasSeverities || parts.severity != LogEntry::None;

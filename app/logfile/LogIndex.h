@@ -220,6 +220,7 @@ private:
     CandidateSearch m_search;
     size_t m_searched = AllLines;
     LogLineEnd m_lineEnd;
+    LogLineParser::Beginnings m_beginnings;
 
     LineTable m_lines;
     std::vector<quint8> m_matches; // a LogFilter::Match for each line; empty without a text

@@ -81,10 +81,12 @@ LogLineParser::Name const* LogLineParser::nameAt(char const* text, int length) c
     return nullptr;
 }
 
-bool LogLineParser::findByFormat(char const* line, int length, Parts& parts) const
+bool LogLineParser::findByFormat(char const* line, int length, Beginnings* last, Parts& parts) const
 {
-    for (LogTimeReader const& reader : m_readers) {
-        const LogTimeReader::Stamp stamp = reader.Read(line, length);
+    for (size_t i = 0; i < m_readers.size(); ++i) {
+        LogTimeReader const& reader = m_readers[i];
+        const LogTimeReader::Stamp stamp =
+            last ? reader.Read(line, length, (*last)[i]) : reader.Read(line, length);
         const int blank = stamp.length;
         if (blank < 0 || blank >= length || line[blank] != ' ')
             continue;
@@ -145,22 +147,38 @@ void LogLineParser::findElapsed(char const* line, int length, Parts& parts) cons
     }
 }
 
-LogLineParser::Parts LogLineParser::FindOwn(char const* line, int length) const
+LogLineParser::Parts LogLineParser::findOwn(char const* line, int length, Beginnings* last) const
 {
     Parts parts;
     length = std::min(length, SearchLimit);
-    if (findByFormat(line, length, parts) || findByName(line, length, parts))
+    if (findByFormat(line, length, last, parts) || findByName(line, length, parts))
         findElapsed(line, length, parts);
     return parts;
 }
 
+LogLineParser::Parts LogLineParser::FindOwn(char const* line, int length) const
+{
+    return findOwn(line, length, nullptr);
+}
+
 LogLineParser::Parts LogLineParser::Find(char const* line, int length) const
 {
+    return find(line, length, nullptr);
+}
+
+LogLineParser::Parts LogLineParser::Find(char const* line, int length, Beginnings& last) const
+{
+    last.resize(m_readers.size());
+    return find(line, length, &last);
+}
+
+LogLineParser::Parts LogLineParser::find(char const* line, int length, Beginnings* last) const
+{
     if (!m_type.isForeign)
-        return FindOwn(line, length);
+        return findOwn(line, length, last);
     const ForeignLine foreign = ForeignLine::Read(line, length, m_type.latest);
     if (!foreign.isEntry)
-        return FindOwn(line, length);
+        return findOwn(line, length, last);
     Parts parts;
     parts.isEntry = true;
     parts.severity = foreign.severity;

@@ -67,6 +67,14 @@ public:
     ///              log's own the start is enough
     Parts Find(char const* line, int length) const;
 
+    /// How the last stamps began, by format. For one parser, and for one thread at a time.
+    using Beginnings = std::vector<LogTimeReader::Beginning>;
+
+    /// The same, faster for many lines, one after the other.
+    ///
+    /// @param last  empty before the first line
+    Parts Find(char const* line, int length, Beginnings& last) const;
+
     /// Finds the parts of a line of the log's own, whatever the file is.
     Parts FindOwn(char const* line, int length) const;
 
@@ -87,7 +95,9 @@ private:
     };
 
     Name const* nameAt(char const* text, int length) const;
-    bool findByFormat(char const* line, int length, Parts& parts) const;
+    Parts find(char const* line, int length, Beginnings* last) const;
+    Parts findOwn(char const* line, int length, Beginnings* last) const;
+    bool findByFormat(char const* line, int length, Beginnings* last, Parts& parts) const;
     bool findByName(char const* line, int length, Parts& parts) const;
     void findElapsed(char const* line, int length, Parts& parts) const;
     bool parseForeign(char const* line, int length, LogEntry& entry) const;

@@ -3,11 +3,11 @@
 
 #pragma once
 
+#include "app/logfile/LineCheck.h"
 #include "app/logfile/LineNumbers.h"
 #include "app/logfile/LineTable.h"
 #include "app/logfile/LogEntry.h"
 
-#include <QHashFunctions>
 #include <QtGlobal>
 
 #include <algorithm>
@@ -73,8 +73,7 @@ public:
     /// @param line  without its line end
     static quint16 CheckOf(char const* line, int length)
     {
-        const auto checked = static_cast<size_t>(std::min(length, CheckedLength));
-        return static_cast<quint16>(qHashBits(line, checked));
+        return LineCheck(line, static_cast<size_t>(std::min(length, CheckedLength)));
     }
 
     LogRows() = default;

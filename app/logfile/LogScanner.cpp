@@ -66,6 +66,7 @@ void LogScanner::Open(int request, QString const& path, LogLineParser const& par
                       LogFilter const& filter)
 {
     m_request = request;
+    m_isNewFile = path != m_path;
     m_path = path;
     m_parser = parser;
     m_filter = filter;
@@ -382,16 +383,18 @@ void LogScanner::Poll()
     Q_EMIT polled(); // NOLINT(readability-misleading-indentation): Q_EMIT is empty
 }
 
-void LogScanner::SetPace(int sliceSize, int interval)
+void LogScanner::SetPace(int sliceSize, int interval, int firstInterval)
 {
     m_sliceSize = sliceSize;
     m_interval = interval;
+    m_firstInterval = firstInterval;
 }
 
 // Most of the time is for reading, even if the rows are many.
 void LogScanner::reportPart()
 {
-    if (m_sinceReport.elapsed() < std::max<qint64>(m_interval, 4 * m_reportCost) ||
+    const int interval = m_isNewFile ? m_firstInterval : m_interval;
+    if (m_sinceReport.elapsed() < std::max<qint64>(interval, 4 * m_reportCost) ||
         m_index.awaitsKnownLines())
         return;
     m_sinceReport.start();
@@ -417,6 +420,7 @@ void LogScanner::report(bool isPartial)
                             m_index.searchedLines() == m_lines && update.counts == m_counts &&
                             m_isPartial == isPartial;
     m_isReset = false;
+    m_isNewFile = false;
     m_isPartial = isPartial;
     m_rows = update.rows;
     m_lines = m_index.searchedLines();

@@ -55,7 +55,9 @@ public:
     ///
     /// @param sliceSize  in bytes
     /// @param interval  in milliseconds; 0: after each slice
-    void SetPace(int sliceSize, int interval);
+    /// @param firstInterval  for the first part of a file that has not been shown before
+    void SetPace(int sliceSize, int interval, int firstInterval);
+    void SetPace(int sliceSize, int interval) { SetPace(sliceSize, interval, interval); }
 
     /// The interval between checks for changes where the system does not tell of them, and the
     /// longest delay where it does, in milliseconds.
@@ -112,8 +114,10 @@ private:
     LogIndex m_index;
     std::shared_ptr<LogRows const> m_rows;
 
-    int m_sliceSize = 1 << 20;
+    int m_sliceSize = 1 << 17; // stays in the processor's cache
     int m_interval = 200;
+    int m_firstInterval = 10;
+    bool m_isNewFile = false; // nothing of it has been reported
     QElapsedTimer m_sinceReport;
     qint64 m_reportCost = 0;    // milliseconds
     bool m_isReset = true;      // the next update

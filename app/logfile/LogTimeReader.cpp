@@ -75,6 +75,30 @@ LogTimeReader::LogTimeReader(QString const& format) : m_fractionOfSecond(WritesF
     m_hasDate = (found[Year] || found[ShortYear]) && found[Month] && found[Day];
     m_hasTime = found[Hour] && found[Minute];
     m_resolution = found[Fraction] ? 1 : found[Second] ? 1000 : MinuteLength;
+    m_secondsToken = m_hasTime ? secondsToken() : 0;
+}
+
+// The first token for seconds or their fraction, if only those and text follow, and numbers and
+// text come before it: whatever follows those, they are read in the same way. (A number that is
+// shorter than it may be ends at text, because seconds begin with a digit.) 0 if there is no such
+// token.
+size_t LogTimeReader::secondsToken() const
+{
+    const auto isSeconds = [](Token const& token) {
+        return token.field == Second || token.field == Fraction;
+    };
+    const auto isText = [](Token const& token) {
+        return token.kind == Exactly;
+    };
+    const auto first = std::find_if(m_tokens.begin(), m_tokens.end(), isSeconds);
+    const bool isLast = std::all_of(first, m_tokens.end(), [&](Token const& token) {
+        return isSeconds(token) || isText(token);
+    });
+    const bool isFixed = std::all_of(m_tokens.begin(), first, [&](Token const& token) {
+        return token.kind == Number || isText(token);
+    });
+    const bool isFound = first != m_tokens.end() && isLast && isFixed;
+    return isFound ? static_cast<size_t>(first - m_tokens.begin()) : 0;
 }
 
 void LogTimeReader::parseFormat(QString const& format)
@@ -219,15 +243,53 @@ LogTimeReader::Stamp LogTimeReader::Read(char const* text, int length) const
     }
 
     stamp.length = static_cast<int>(at - text);
-    if (!m_hasTime)
+    if (m_hasTime)
+        stamp.key = keyOf(values);
+    return stamp;
+}
+
+// For the goal "opening" in docs/performance.md. tst_PlainLineParser compares it with the other.
+LogTimeReader::Stamp LogTimeReader::Read(char const* text, int length, Beginning& last) const
+{
+    if (m_secondsToken == 0)
+        return Read(text, length);
+    const bool isKnown = last.length > 0 && length >= last.length &&
+                         std::memcmp(text, last.text.data(), static_cast<size_t>(last.length)) == 0;
+    Stamp stamp;
+    Values values;
+    char const* at = isKnown ? text + last.length : text;
+    char const* const end = text + length;
+    char const* seconds = at;
+    for (size_t i = isKnown ? m_secondsToken : 0; i < m_tokens.size(); ++i) {
+        if (i == m_secondsToken)
+            seconds = at;
+        if (!readToken(m_tokens[i], at, end, values))
+            return stamp;
+    }
+    stamp.length = static_cast<int>(at - text);
+    const qint64 inMinute = values.number[Second] * 1000 + values.number[Fraction];
+    if (isKnown) {
+        stamp.key = last.key + inMinute;
         return stamp;
+    }
+    stamp.key = keyOf(values);
+    last.length = 0;
+    if (seconds - text <= static_cast<std::ptrdiff_t>(last.text.size())) {
+        last.length = static_cast<int>(seconds - text);
+        last.key = stamp.key - inMinute;
+        std::copy(text, seconds, last.text.begin());
+    }
+    return stamp;
+}
+
+qint64 LogTimeReader::keyOf(Values const& values) const
+{
     int const* number = values.number;
     qint64 key = DayNumber(number[Year] + number[ShortYear], number[Month], number[Day]);
     key = key * 24 + number[Hour] + number[HalfDay];
     key = key * 60 + number[Minute];
     key = key * 60 + number[Second];
-    stamp.key = key * 1000 + number[Fraction];
-    return stamp;
+    return key * 1000 + number[Fraction];
 }
 
 bool LogTimeReader::readToken(Token const& token, char const*& at, char const* end,

@@ -6,6 +6,7 @@
 #include <QByteArray>
 #include <QString>
 
+#include <array>
 #include <vector>
 
 namespace Velocor {
@@ -34,6 +35,20 @@ public:
 
     /// Reads the time stamp at the start of a line, in Latin-1.
     Stamp Read(char const* text, int length) const;
+
+    /// How a stamp began: the part before its seconds, which the next stamp in a log usually has,
+    /// too.
+    struct Beginning
+    {
+        std::array<char, 24> text = {};
+        int length = 0; ///< 0: unknown
+        qint64 key = 0; ///< what it adds to the key
+    };
+
+    /// The same, faster for stamps of the same minute.
+    ///
+    /// @param last  of the last stamp that this reader has read, or unknown; is set
+    Stamp Read(char const* text, int length, Beginning& last) const;
 
     /// Whether time stamps have a year, month and day; without them, keys restart at midnight.
     bool hasDate() const { return m_hasDate; }
@@ -64,12 +79,15 @@ private:
     void addMonthName();
     void addNumber(Field field, int minimum, int maximum);
     int addQuoted(QString const& format, int position);
+    size_t secondsToken() const;
+    qint64 keyOf(Values const& values) const;
     bool readToken(Token const& token, char const*& at, char const* end, Values& values) const;
     bool readNumber(Token const& token, char const*& at, char const* end, Values& values) const;
     bool readMonth(char const*& at, char const* end, Values& values) const;
 
     std::vector<Token> m_tokens;
     std::vector<QByteArray> m_monthNames; // long and short names alternate, January first
+    size_t m_secondsToken = 0;            // 0: stamps have no beginning that can be known
     bool m_hasDate = false;
     int m_resolution = 1;
     bool m_hasTime = false;

@@ -144,6 +144,7 @@ private slots:
     void progress();
     void partsOfALongPass_data();
     void partsOfALongPass();
+    void firstPartComesSooner();
     void growsWhileItIsRead();
     void watched_data();
     void watched();
@@ -525,6 +526,25 @@ void tst_LogScanner::partsOfALongPass()
         QVERIFY(!update.isReset);
     QVERIFY(reader.updates.first().isPartial && !reader.updates.last().isPartial);
     QCOMPARE(reader.updates.last().lines, size_t(600));
+}
+
+// Nobody has seen the file yet; reading it again should not change what is shown more than once.
+void tst_LogScanner::firstPartComesSooner()
+{
+    QVERIFY(TestFiles::write(m_file, run(300, QTime(9, 0), "x")));
+    Reader reader(m_file);
+    reader.scanner.SetPace(1000, std::numeric_limits<int>::max(), 0);
+    reader.Open(1);
+    QCOMPARE(reader.updates.size(), 2);
+    QVERIFY(reader.updates[0].isPartial);
+    QVERIFY(reader.updates[0].lines > 0);
+    QVERIFY(!reader.updates[1].isPartial);
+    QCOMPARE(reader.updates[1].lines, size_t(300));
+
+    reader.Open(2);
+    QCOMPARE(reader.updates.size(), 3);
+    reader.SetFilter(3, With("9"));
+    QCOMPARE(reader.updates.size(), 4);
 }
 
 // However fast that is, a pass ends, and the next one goes on from there.

@@ -1,0 +1,223 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// Compares what is found in a line when the beginning of the stamp before it is known with what is
+// found without: for stamps in all kinds of formats, all of a day, and lines of all kinds.
+
+#include "app/logfile/LogLineParser.h"
+
+#include "Rounds.h"
+
+#include <QDateTime>
+#include <QtTest>
+
+#include <random>
+
+using namespace Velocor;
+
+class tst_PlainLineParser : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void everyFormat_data();
+    void everyFormat();
+    void everyStampOfADay();
+    void lines_data();
+    void lines();
+    void cleanupTestCase();
+
+private:
+    int m_stamps = 0;
+    int m_lines = 0;
+};
+
+namespace {
+
+class Random
+{
+public:
+    int below(int limit) { return int(m_random() % unsigned(limit)); }
+    bool once(int times) { return below(times) == 0; }
+
+    // Mostly a little later than the one before.
+    QDateTime moment()
+    {
+        static qint64 const steps[] = {0, 1, 15, 999, 1000, 30000, 60000, 3600000, -1, -70000};
+        m_time += steps[below(once(8) ? 10 : 6)];
+        if (once(200))
+            m_time += (below(2000) - 1000) * qint64(86400000);
+        return QDateTime::fromMSecsSinceEpoch(m_time, Qt::UTC);
+    }
+
+    // As a line that was torn, or that something else wrote.
+    QByteArray damaged(QByteArray text)
+    {
+        static char const characters[] = "0159 :.-,xT";
+        const int at = below(text.size() + 1);
+        const char character = characters[below(int(sizeof characters) - 1)];
+        switch (below(5)) {
+        case 0:
+            return text.left(at);
+        case 1:
+            return text.mid(at);
+        case 2:
+            return text.insert(at, character);
+        case 3:
+            return text.remove(at, 1);
+        default:
+            return at < text.size() ? text.replace(at, 1, &character, 1) : text;
+        }
+    }
+
+private:
+    std::mt19937 m_random{Rounds::seed()};
+    qint64 m_time = 1772496000000; // 3 March 2026
+};
+
+bool IsSame(LogTimeReader::Stamp const& one, LogTimeReader::Stamp const& other)
+{
+    return one.length == other.length && one.key == other.key;
+}
+
+bool IsSame(LogLineParser::Parts const& one, LogLineParser::Parts const& other)
+{
+    return one.timeLength == other.timeLength && one.timeKey == other.timeKey &&
+           one.hasDate == other.hasDate && one.resolution == other.resolution &&
+           one.severity == other.severity && one.elapsed == other.elapsed &&
+           one.elapsedLength == other.elapsedLength && one.message == other.message &&
+           one.isEntry == other.isEntry;
+}
+
+} // namespace
+
+void tst_PlainLineParser::everyFormat_data()
+{
+    QTest::addColumn<QString>("format");
+    for (char const* format : {"yyyy-MM-dd hh:mm:ss.z",
+                               "yyyy-MM-dd hh:mm:ss.zzz",
+                               "yyyy-MM-dd hh:mm:ss",
+                               "yyyy-MM-dd hh:mm",
+                               "hh:mm:ss.zzz",
+                               "hh:mm:ss",
+                               "h:m:s",
+                               "d.M.yy h:m:s.z",
+                               "yyyyMMddhhmmss",
+                               "yyyyMMdd-hhmm-ss,z",
+                               "hh:mm:ss dd.MM.yyyy",
+                               "ddd MMM d hh:mm:ss yyyy",
+                               "d MMMM yyyy hh:mm:ss",
+                               "h:mm ap ss.z",
+                               "h:mm:ss ap",
+                               "hh:mm:ss t",
+                               "ss.zzz",
+                               "z",
+                               "'at' s",
+                               "hh'h'mm'm'ss's'z",
+                               "'it is' hh:mm 'and' ss 'seconds'",
+                               "mm:ss",
+                               "hms",
+                               "hh:mm:ss ss",
+                               "hh:mm s's' s",
+                               "yyyyyy-MM-dd hh:mm:ss",
+                               "'a very long text before it' hh:mm:ss",
+                               "dd hh:mm",
+                               ""})
+        QTest::newRow(format) << QString(format);
+}
+
+void tst_PlainLineParser::everyFormat()
+{
+    QFETCH(QString, format);
+    const LogTimeReader reader(format);
+    LogTimeReader::Beginning last;
+    Random random;
+    const int count = Rounds::count(3000, 300000);
+    for (int i = 0; i < count; ++i, ++m_stamps) {
+        QByteArray text = random.moment().toString(format).toLatin1();
+        if (random.once(2))
+            text += " Trace x";
+        if (random.once(4))
+            text = random.damaged(text);
+        const LogTimeReader::Stamp plain = reader.Read(text.constData(), text.size());
+        const LogTimeReader::Stamp stamp = reader.Read(text.constData(), text.size(), last);
+        if (!IsSame(stamp, plain))
+            QFAIL(qPrintable(QStringLiteral("\"%1\" is read as %2, not as %3")
+                                 .arg(QString::fromLatin1(text))
+                                 .arg(stamp.key)
+                                 .arg(plain.key)));
+    }
+}
+
+// At usual size, some milliseconds of each second.
+void tst_PlainLineParser::everyStampOfADay()
+{
+    const LogTimeReader reader(QStringLiteral("yyyy-MM-dd hh:mm:ss.z"));
+    LogTimeReader::Beginning last;
+    const int step = Rounds::count(499, 1);
+    for (int time = 0; time < 24 * 60 * 60 * 1000; time += step, ++m_stamps) {
+        char text[32];
+        const int length =
+            std::snprintf(text, sizeof text, "2026-03-03 %02d:%02d:%02d.%03d", time / 3600000,
+                          time / 60000 % 60, time / 1000 % 60, time % 1000);
+        if (!IsSame(reader.Read(text, length, last), reader.Read(text, length)))
+            QFAIL(text);
+    }
+}
+
+void tst_PlainLineParser::lines_data()
+{
+    QTest::addColumn<QStringList>("formats");
+    QTest::addColumn<bool>("isForeign");
+    QTest::newRow("default format") << QStringList() << false;
+    QTest::newRow("time alone") << QStringList("hh:mm:ss") << false;
+    QTest::newRow("several formats")
+        << QStringList({"hh:mm:ss.zzz", "dd.MM.yyyy hh:mm", "d MMM hh:mm:ss"}) << false;
+    QTest::newRow("formats that begin alike")
+        << QStringList({"hh:mm:ss.zzz", "hh:mm:ss", "hh:mm 'Uhr'"}) << false;
+    QTest::newRow("another program's") << QStringList() << true;
+}
+
+void tst_PlainLineParser::lines()
+{
+    QFETCH(QStringList, formats);
+    QFETCH(bool, isForeign);
+    static char const* const severities[] = {
+        " Trace", " Notification", " Warning", " Error",   " Fatal", " ",
+        "",       " INFO",         " Traced",  " warning:"};
+    static char const* const messages[] = {
+        " text", " dT:[12] text", " dT:[-5]", "  more", " dT:[] text", "", " dT:[12]x", " [12] x"};
+    LogLineParser parser(formats, {"dT:", "["});
+    LogFileType type;
+    type.isForeign = isForeign;
+    type.latest = QDate(2026, 3, 3);
+    parser.SetFileType(type);
+    formats.append("yyyy-MM-dd hh:mm:ss.z");
+    if (isForeign)
+        formats.append({"yyyy-MM-ddThh:mm:ss.zzzZ", "MMM dd hh:mm:ss", "[hh:mm:ss]"});
+
+    LogLineParser::Beginnings last;
+    Random random;
+    const int count = Rounds::count(20000, 1000000);
+    for (int i = 0; i < count; ++i, ++m_lines) {
+        QByteArray line =
+            random.moment().toString(formats.at(random.below(formats.size()))).toLatin1();
+        if (random.once(10))
+            line = "it goes on";
+        line += severities[random.below(random.once(3) ? 10 : 5)];
+        line += messages[random.below(8)];
+        if (random.once(5))
+            line = random.damaged(line);
+        const LogLineParser::Parts plain = parser.Find(line.constData(), line.size());
+        if (!IsSame(parser.Find(line.constData(), line.size(), last), plain))
+            QFAIL(qPrintable("different parts: " + line));
+    }
+}
+
+void tst_PlainLineParser::cleanupTestCase()
+{
+    std::printf("plain line parser: %d stamps and %d lines compared\n", m_stamps, m_lines);
+}
+
+QTEST_APPLESS_MAIN(tst_PlainLineParser)
+#include "tst_PlainLineParser.moc"
