@@ -5,6 +5,7 @@
 #include "log/LogFileTest.h"
 #include "log/LogFolder.h"
 #include "support/MessageCapture.h"
+#include "support/OpenFiles.h"
 #include "support/PrivateField.h"
 #include "support/TestFiles.h"
 
@@ -59,15 +60,6 @@ private:
 };
 
 PRIVATE_FIELD(Extension, TorkLog, QString, m_fileExtension);
-
-namespace {
-
-int openFileCount()
-{
-    return QDir("/proc/self/fd").entryList(QDir::AllEntries | QDir::System).size();
-}
-
-} // namespace
 
 void tst_TorkLogFiles::init()
 {

@@ -8,6 +8,7 @@
 #include "log/LogFolder.h"
 #include "reliability/FaultyFiles.h"
 #include "support/ChildProcess.h"
+#include "support/OpenFiles.h"
 #include "support/TestFiles.h"
 
 #include <QtTest>
@@ -33,11 +34,6 @@ private slots:
 };
 
 namespace {
-
-int openFiles()
-{
-    return QDir("/proc/self/fd").entryList(QDir::AllEntries | QDir::System).size();
-}
 
 void makeFiles(LogFolder const& folder, QStringList const& files)
 {
@@ -182,13 +178,13 @@ int rotates(QStringList const& arguments)
     TestFiles::write(folder.logs() + "app.log", "text");
     TorkLog log;
     folder.prepare(log, "app");
-    const int before = openFiles();
+    const int before = openFileCount();
     FaultyFiles files(folder.root());
     if (arguments.at(0) == "folder that does not open")
         files.failAt(3, FaultyFiles::Once, EMFILE, "open");
     log.deleteOldFiles();
     files.mend();
-    std::printf("%d %s|%s", openFiles() - before, qPrintable(folder.listing().join(' ')),
+    std::printf("%d %s|%s", openFileCount() - before, qPrintable(folder.listing().join(' ')),
                 qPrintable(QFileInfo(files.path()).fileName()));
     return 0;
 }
