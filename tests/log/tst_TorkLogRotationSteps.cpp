@@ -24,6 +24,7 @@ class tst_TorkLogRotationSteps : public QObject
 private slots:
     void folderThatCannotBeListed_data();
     void folderThatCannotBeListed();
+    void fullFileAppearsMeanwhile();
     void copyThatFails_data();
     void copyThatFails();
     void copyIsWrittenBeforeItIsSynced();
@@ -82,6 +83,22 @@ void tst_TorkLogRotationSteps::folderThatCannotBeListed()
     files.mend();
     QVERIFY(files.reached());
     QTEST(folder.listing(), "after");
+}
+
+// Another program makes the folder and fills a log before this one does.
+void tst_TorkLogRotationSteps::fullFileAppearsMeanwhile()
+{
+    LogFolder folder;
+    const QString logs = folder.root() + "new/";
+    TorkLog log;
+    folder.prepare(log, "app", 10);
+    log.setOutputPath(logs);
+
+    FaultyFiles files(folder.root());
+    files.before("mkdir", 1, [&] { TestFiles::write(logs + "app.log", "of the other one\n"); });
+    log.write(QStringLiteral("entry\n"));
+    QCOMPARE(TestFiles::listing(logs),
+             QStringList({"app.log: entry\n", "app.log.1: of the other one\n"}));
 }
 
 // The current file is gone all the same, but nothing that is not whole gets its number.

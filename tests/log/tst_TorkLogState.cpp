@@ -63,6 +63,8 @@ PRIVATE_FIELD(Writing, TorkLog, int, m_writing);
 PRIVATE_FIELD(Format, TorkLog, QString, m_dateTimeFormat);
 PRIVATE_FIELD(Prefix, TorkLog, QString, m_elapsedTimePrefix);
 PRIVATE_FIELD(Mutex, TorkLog, QMutex, m_mutex);
+using TextSetter = void(QString const&);
+PRIVATE_FIELD(SetFilePrefix, TorkLog, TextSetter, setFilePrefix);
 
 namespace {
 
@@ -240,6 +242,7 @@ void tst_TorkLogState::waitsForTheLock_data()
     row("dateTimeFormat", [](TorkLog& log) { log.dateTimeFormat(); });
     row("elapsedTimePrefix", [](TorkLog& log) { log.elapsedTimePrefix(); });
     row("filePrefix", [](TorkLog& log) { log.filePrefix(); });
+    row("setFilePrefix", [](TorkLog& log) { (log.*privateField(SetFilePrefix()))("x"); });
 }
 Q_DECLARE_METATYPE(std::function<void(TorkLog&)>)
 

@@ -36,6 +36,7 @@ private slots:
     void otherAppendsMeanwhile();
     void overwritesOldText_data();
     void overwritesOldText();
+    void overwritesOldTextOnAnOlderSystem();
     void appendsWhileAnotherKeepsItOut();
     void makesRoom_data();
     void makesRoom();
@@ -220,6 +221,21 @@ void tst_TorkLogWriter::overwritesOldText()
     append(path(), "other, longer\n");
     write(writer, "entry4\n");
     QCOMPARE(TestFiles::read(path()), expected + "entry4\nlonger\n");
+}
+
+// Older systems do not have the call that asks for the size alone.
+void tst_TorkLogWriter::overwritesOldTextOnAnOlderSystem()
+{
+    QVERIFY(TestFiles::write(path(), "old text\n"));
+    FaultyFiles files(m_folder->path());
+    TorkLogWriter writer;
+    QCOMPARE(writer.open(path()), QString());
+
+    files.failAt(1, FaultyFiles::Once, ENOSYS, "stat");
+    write(writer, "entry\n");
+    files.mend();
+    QVERIFY(files.reached());
+    QCOMPARE(TestFiles::read(path()), QByteArray("entry\nxt\n"));
 }
 
 // The other one may cut the file down, so no place in it is safe but its end.
