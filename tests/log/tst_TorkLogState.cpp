@@ -39,6 +39,7 @@ private slots:
     void stampsWaitForTheirLock();
     void formatChangedWhileTheEntryWaits();
     void prefixChangedWhileTheEntryWaits();
+    void settingsChangedWhileTheSaveWaits();
     void qtIsReadyBeforeTheFirstFork();
     void stampKeptAtMidnight_data();
     void stampKeptAtMidnight();
@@ -325,6 +326,24 @@ void tst_TorkLogState::prefixChangedWhileTheEntryWaits()
         mutex.unlock();
     }
     QVERIFY(TestFiles::read(folder.logs() + "app.log").endsWith("T Trace later:[0] second\n"));
+}
+
+// A thread that saves the settings waits for them, and not only for the folder's name.
+void tst_TorkLogState::settingsChangedWhileTheSaveWaits()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+
+    QMutex& mutex = log.*privateField(Mutex());
+    mutex.lock();
+    {
+        const OtherThread other([&log] { log.savePreferences(); });
+        other.waits();
+        log.*privateField(Prefix()) = "later:";
+        mutex.unlock();
+    }
+    QVERIFY(TestFiles::read(folder.settingsFile()).contains("later:"));
 }
 
 // Qt makes it under a lock that a child of fork() would inherit.
