@@ -326,7 +326,7 @@ def try_all(mutants, sources, desks, wanted):
         return [m for m in which if not known[m["key"]]["by"] and state not in known[m["key"]]["survived"]]
 
     for stage in 0, 1:
-        left = open_ones(mutants, None)
+        left = [m for m in open_ones(mutants, None) if stage == 0 or what(m) not in accepted()]
         if not left:
             break
         reached, state = record("plain", desks, sources, build_tests(left, stage, len(desks)), wanted)

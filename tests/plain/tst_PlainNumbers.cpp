@@ -20,8 +20,6 @@ class tst_PlainNumbers : public QObject
 private slots:
     void everyShortText();
     void randomTexts();
-    void partsOfTexts_data();
-    void partsOfTexts();
     void namesWithSpaces();
     void cleanupTestCase();
 
@@ -91,24 +89,6 @@ void tst_PlainNumbers::randomTexts()
                         QChar(static_cast<ushort>(random() % 0x80 + 1)));
         compare(text);
     }
-}
-
-// A text in the middle of another, which is not copied: what is around it does not count.
-void tst_PlainNumbers::partsOfTexts_data()
-{
-    QTest::addColumn<QString>("whole");
-    QTest::newRow("after a minus") << "-5";
-    QTest::newRow("after a digit") << "15";
-    QTest::newRow("before a digit") << "x51";
-    QTest::newRow("before a minus") << "x5-";
-}
-
-void tst_PlainNumbers::partsOfTexts()
-{
-    QFETCH(QString, whole);
-    const int at = whole.indexOf('5');
-    compare(QString::fromRawData(whole.constData() + at, 1));
-    m_file.Clear(); // it refers to the text
 }
 
 // Sections and keys with spaces anywhere, so that some of them become equal.
