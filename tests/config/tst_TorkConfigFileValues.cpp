@@ -327,6 +327,7 @@ void tst_TorkConfigFileValues::readInt_data()
     QTest::newRow("separator") << "1,000" << false << 7;
     QTest::newRow("two signs") << "--1" << false << 7;
     QTest::newRow("no digit before the point") << ".5" << false << 7;
+    QTest::newRow("character after 9") << "1:" << false << 7;
     QTest::newRow("missing") << QString() << false << 7;
 
     // The 5 of a longer text, which is not copied.
