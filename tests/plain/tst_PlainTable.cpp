@@ -66,9 +66,6 @@ class tst_PlainTable : public QObject
 
 private slots:
     void randomOperations();
-    void referencesIntoTheTable();
-    void keysWithTheSameHash_data();
-    void keysWithTheSameHash();
 
 private:
     int m_compared = 0;
@@ -118,63 +115,6 @@ void tst_PlainTable::randomOperations()
         }
     }
     std::printf("plain table: %d operations, %d whole tables compared\n", operations, m_compared);
-}
-
-// A key or value taken from the table itself is stored in it while it grows.
-void tst_PlainTable::referencesIntoTheTable()
-{
-    TorkOrderedHash<QString> table;
-    table.insert("0", "first");
-    for (int i = 1; i < 1000; ++i) {
-        table.insert(QString::number(i), table.begin()->value);
-        table.insert((table.end() - 1)->key, (table.begin() + i / 2)->value);
-        QCOMPARE(*table.find(QString::number(i)), QString("first"));
-    }
-    QCOMPARE(table.size(), size_t(1000));
-}
-
-// Random keys hardly ever have the same hash, so these are searched for.
-void tst_PlainTable::keysWithTheSameHash_data()
-{
-    QTest::addColumn<int>("longer"); // by how many characters the second key is
-    QTest::newRow("of the same length") << 0;
-    QTest::newRow("of different lengths") << 1;
-}
-
-void tst_PlainTable::keysWithTheSameHash()
-{
-    QFETCH(int, longer);
-    const uint seed = static_cast<uint>(qGlobalQHashSeed());
-    std::mt19937 random(1);
-    const auto key = [&random](int length) {
-        QString text(length, QLatin1Char(' '));
-        for (QChar& character : text)
-            character = QChar(static_cast<ushort>('!' + random() % 90));
-        return text;
-    };
-
-    // One pair of keys in 2^32 collides, so some hundred thousand keys are enough.
-    QHash<uint, QString> byHash;
-    QString one;
-    QString other;
-    for (int i = 0; i < 10000000 && (one.isNull() || one == other); ++i) {
-        const QString shortKey = key(8);
-        const QString longKey = key(8 + longer);
-        one = byHash.value(qHash(longKey, seed));
-        other = longKey;
-        byHash.insert(qHash(shortKey, seed), shortKey);
-    }
-    QVERIFY(!one.isNull() && one != other);
-    QCOMPARE(qHash(one, seed), qHash(other, seed));
-    QCOMPARE(other.length(), one.length() + longer);
-
-    TorkOrderedHash<int> table;
-    table.insert(one, 1);
-    QVERIFY(!table.find(other));
-    table.insert(other, 2);
-    QCOMPARE(table.size(), size_t(2));
-    QCOMPARE(*table.find(one), 1);
-    QCOMPARE(*table.find(other), 2);
 }
 
 QTEST_APPLESS_MAIN(tst_PlainTable)
