@@ -56,7 +56,8 @@ OTHER_SCREENS = "800x600|double_scale"
 # The kinds of change that a sanitizer sees, and the tests that run clean under it.
 SANITIZERS = {"lock": ("tsan", "thread", "tst_(TorkLog|Load)"), "delete": ("asan", "address", "tst_")}
 NUMBERS = 1000  # reserved for each source
-PER_SOURCE = 20  # in a sample
+SAMPLED = ["common/config", "common/log", "common/xml"]  # where the goal is reached: a sample may fail
+PER_SOURCE = 20  # in it
 NOTICED = collections.Counter()
 
 
@@ -400,7 +401,7 @@ def candidates(mutants):
 
 def some_sources(wanted, chance):
     """Sources of one room, chosen by chance, that have enough mutants together."""
-    room = os.path.dirname(chance.choice(targets()))
+    room = chance.choice(SAMPLED)
     names = [name for name in targets() if os.path.dirname(name) == room]
     copy(names)
     chosen = []
