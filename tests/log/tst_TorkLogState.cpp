@@ -40,6 +40,7 @@ private slots:
     void formatChangedWhileTheEntryWaits();
     void prefixChangedWhileTheEntryWaits();
     void settingsChangedWhileTheSaveWaits();
+    void loadedSettingsWaitForTheLock();
     void qtIsReadyBeforeTheFirstFork();
     void stampKeptAtMidnight_data();
     void stampKeptAtMidnight();
@@ -344,6 +345,38 @@ void tst_TorkLogState::settingsChangedWhileTheSaveWaits()
         mutex.unlock();
     }
     QVERIFY(TestFiles::read(folder.settingsFile()).contains("later:"));
+}
+
+// The settings are read without the lock, because that is traced, and set under it.
+void tst_TorkLogState::loadedSettingsWaitForTheLock()
+{
+    LogFolder folder;
+    TorkLog::initialize(folder.logs(), "program", folder.settingsFile(), true);
+    TorkLog log(folder.logs());
+    log.setPreferencesFileName(folder.settingsFile());
+
+    std::atomic<bool> isTracing{false};
+    std::atomic<bool> isLocked{false};
+    s_beforeWriting = [&] {
+        isTracing = true;
+        while (!isLocked)
+            std::this_thread::yield();
+    };
+    bool waited = false;
+    {
+        const OtherThread other([&log] { log.loadPreferences(); });
+        while (!isTracing)
+            std::this_thread::yield();
+        QMutex& mutex = log.*privateField(Mutex());
+        mutex.lock();
+        isLocked = true;
+        waited = other.waits();
+        mutex.unlock();
+    }
+    s_beforeWriting = nullptr;
+    TorkLog::shutdown();
+    QVERIFY(waited);
+    QCOMPARE(log.filePrefix(), QString("program"));
 }
 
 // Qt makes it under a lock that a child of fork() would inherit.
