@@ -40,22 +40,24 @@ WORK = ROOT / "build/mutants"
 COPY = WORK / "source"
 ACCEPTED = ROOT / "tests/mutants-accepted.txt"
 GOALS = {"common": 97, "app": 95}  # percent
-# The folders whose sources are changed, and the tests, or their folders, that may notice.
-PROOFS = " tst_Faults tst_SystemLimits tst_SuddenDeath tst_Load"
+# The folders whose sources are changed, and the tests, or their folders, that may notice: each group
+# is built and run only for what the ones before it did not notice.
+PROOFS = "tst_Faults tst_SystemLimits tst_SuddenDeath tst_Load tst_Life"
 ROOMS = {
-    "common/config": "config plain" + PROOFS,
-    "common/log": "log plain" + PROOFS,
-    "common/xml": "xml config plain hostile",
-    "app/logfile": "logfile window/log window",
-    "app/settingsfile": "settingsfile plain hostile window",
-    "app/runninglog": "runninglog window",
+    "common/config": ("config", "plain", PROOFS),
+    "common/log": ("log", "plain", PROOFS),
+    "common/xml": ("xml", "config plain", "hostile"),
+    "app/logfile": ("logfile", "window/log", "window"),
+    "app/settingsfile": ("settingsfile", "plain hostile", "window"),
+    "app/runninglog": ("runninglog", "window"),
 }
 LEFT_OUT = r"locale|package|memcheck"  # labels; and runs of the same tests on other screens:
 OTHER_SCREENS = "800x600|double_scale"
 # The kinds of change that a sanitizer sees, and the tests that run clean under it.
 SANITIZERS = {"lock": ("tsan", "thread", "tst_(TorkLog|Load)"), "delete": ("asan", "address", "tst_")}
 NUMBERS = 1000  # reserved for each source
-PER_SOURCE = 25  # in a sample
+SAMPLED = ["common/config", "common/log", "common/xml"]  # where the goal is reached: a sample may fail
+PER_SOURCE = 20  # in it
 NOTICED = collections.Counter()
 
 
@@ -134,29 +136,39 @@ def copy(sources):
     configure("plain")
 
 
-def build_all(sources):
-    """Copies the tree, with all mutants in the given sources, and builds its tests."""
+def change(sources, jobs):
+    """Copies the tree, with all mutants in the given sources; returns these and a digest of the texts."""
     copy(sources)
-    with multiprocessing.Pool() as pool:
+    with multiprocessing.Pool(jobs) as pool:
         found = pool.map(find, sources, chunksize=1)
     for name, _, changed in found:
         update(COPY / name, changed)
-    folders = {f for name in sources for f in ROOMS[os.path.dirname(name)].split()}
-    run("ninja", "-C", WORK / "plain", "--quiet",
-        *(f if f.startswith("tst_") else f"tests/{f}/all" for f in sorted(folders)))
     return [mutant for _, mutants, _ in found for mutant in mutants], digest(*(changed for *_, changed in found))
 
 
-def tests(build):
-    """The tests of a build: name, program and environment."""
+def groups_of(mutant):
+    return ROOMS[os.path.dirname(mutant["file"])]
+
+
+def build_tests(mutants, stage, jobs):
+    """Builds the tests that may notice these mutants; returns a pattern of their paths."""
+    names = sorted({name for m in mutants for name in groups_of(m)[stage].split()})
+    run("ninja", "-C", WORK / "plain", f"-j{jobs}", "--quiet",
+        *(name if name.startswith("tst_") else f"tests/{name}/all" for name in names))
+    return "|".join(f"{name}$" if name.startswith("tst_") else f"tests/{name}/" for name in names)
+
+
+def tests(build, pattern):
+    """The tests of a build whose path or name matches: name, program and environment."""
     listed = run("ctest", "--test-dir", WORK / build, "--show-only=json-v1", "-LE", LEFT_OUT, "-E", OTHER_SCREENS,
                  capture_output=True).stdout
     found = {}
     for test in json.loads(listed)["tests"]:
         properties = {p["name"]: p["value"] for p in test["properties"]}
         variables = dict(v.split("=", 1) for v in properties.get("ENVIRONMENT", []))
-        if test["name"].startswith("tst_") and pathlib.Path(test.get("command", ["-"])[-1]).exists():
-            found[test["name"]] = (test["command"][-1], variables)
+        program = test.get("command", ["-"])[-1]
+        if test["name"].startswith("tst_") and re.search(f"/({pattern})", program) and os.path.exists(program):
+            found[test["name"]] = (program, variables)
     return found
 
 
@@ -231,8 +243,8 @@ def in_parallel(desks, work, items):
         pool.shutdown(cancel_futures=True)
 
 
-def record(build, desks, sources, pattern):
-    """For each test function of a build, how long it takes and which mutants it reaches."""
+def record(build, desks, sources, pattern, wanted):
+    """For each function of some tests of a build, how long it takes and which mutants it reaches."""
     def functions(desk, item):
         name, test = item
         kept = WORK / "reached" / (digest(name, sources, hashlib.sha1(open(test[0], "rb").read()).hexdigest()) + ".json")
@@ -258,7 +270,8 @@ def record(build, desks, sources, pattern):
             kept.write_text(json.dumps(found))
         return name, test, json.loads(kept.read_text()), kept.name
 
-    found = in_parallel(desks, functions, sorted(i for i in tests(build).items() if re.match(pattern, i[0])))
+    chosen = sorted(i for i in tests(build, pattern).items() if re.match(wanted, i[0]))
+    found = in_parallel(desks, functions, chosen)
     reaching = {}
     for name, test, times, _ in found:
         for function, (seconds, numbers) in times.items():
@@ -295,38 +308,57 @@ def accepted():
     return set(re.findall(r"^(\S+): (\S+)\n- (.*)\n\+ (.*)\n(?=\S)", ACCEPTED.read_text(), re.M))
 
 
-def try_all(mutants, sources, desks, tests_wanted):
+def try_all(mutants, sources, desks, wanted):
     """Runs the mutants whose result is not known yet; returns the results of all."""
     kept, known = WORK / "results.jsonl", {}
     if kept.exists():
         known = {r["key"]: r for r in map(json.loads, kept.read_text().splitlines())}
-    reaching, state = record("plain", desks, sources, tests_wanted)
-    lock, started, done, out = threading.Lock(), time.monotonic(), itertools.count(1), kept.open("a")
-    # A survivor is tried again when a test changed.
-    open_ones = [m for m in mutants if m["key"] not in known
-                 or not known[m["key"]]["by"] and known[m["key"]]["state"] != state]
+    for mutant in mutants:
+        known.setdefault(mutant["key"], {"key": mutant["key"], "by": None, "reached": False, "survived": []})
+    lock, out = threading.Lock(), kept.open("a")
 
-    def one(desk, mutant):
-        why = notice(desk, mutant["id"], reaching)
-        result = {"key": mutant["key"], "by": why, "state": state, "reached": mutant["id"] in reaching}
+    def note(mutant, **more):
         with lock:
-            out.write(json.dumps(result) + "\n")
+            known[mutant["key"]].update(more)
+            out.write(json.dumps(known[mutant["key"]]) + "\n")
             out.flush()
-            known[mutant["key"]] = result
-            if (number := next(done)) % 25 == 0:
-                print(f"mutants: {number} of {len(open_ones)} in {time.monotonic() - started:.0f} s", flush=True)
 
-    in_parallel(desks, one, open_ones)
+    reaching = {}
+
+    def open_ones(which, state):
+        """Not noticed yet; a survivor is tried again when a test changed."""
+        return [m for m in which if not known[m["key"]]["by"] and state not in known[m["key"]]["survived"]]
+
+    for stage in range(3):
+        left = [m for m in open_ones(mutants, None) if stage < len(groups_of(m))
+                and (stage == 0 or what(m) not in accepted())]
+        if not left:
+            break
+        reached, state = record("plain", desks, sources, build_tests(left, stage, len(desks)), wanted)
+        for number, functions in reached.items():
+            reaching.setdefault(number, []).extend(functions)
+        left = open_ones(left, state)
+        started, done = time.monotonic(), itertools.count(1)
+
+        def one(desk, mutant):
+            result = known[mutant["key"]]
+            note(mutant, by=notice(desk, mutant["id"], reached), survived=[*result["survived"], state],
+                 reached=mutant["id"] in reaching)
+            if (number := next(done)) % 25 == 0:
+                print(f"mutants: {number} of {len(left)} in {time.monotonic() - started:.0f} s", flush=True)
+
+        in_parallel(desks, one, left)
     for kind, (build, sanitizer, pattern) in SANITIZERS.items():
-        left = [m for m in mutants if m["kind"] == kind and not known[m["key"]]["by"] and what(m) not in accepted()]
+        left = [m for m in open_ones(mutants, None) if m["kind"] == kind and what(m) not in accepted()]
         names = {name for m in left for _, name, _, _ in reaching.get(m["id"], []) if re.match(pattern, name)}
         if names:
             configure(build, sanitizer)
-            run("ninja", "-C", WORK / build, "--quiet", *sorted(names))
-            sanitized, _ = record(build, desks, sources, f"({'|'.join(names)})$")
-            for mutant, why in zip(left, in_parallel(desks, lambda desk, m: notice(desk, m["id"], sanitized), left)):
-                known[mutant["key"]]["by"] = why and f"{why} with the {sanitizer} sanitizer"
-                out.write(json.dumps(known[mutant["key"]]) + "\n")
+            run("ninja", "-C", WORK / build, f"-j{len(desks)}", "--quiet", *sorted(names))
+            reached, state = record(build, desks, sources, "|".join(f"{name}$" for name in names), wanted)
+            left = open_ones(left, state)
+            for mutant, why in zip(left, in_parallel(desks, lambda desk, m: notice(desk, m["id"], reached), left)):
+                note(mutant, by=why and f"{why} with the {sanitizer} sanitizer",
+                     survived=[*known[mutant["key"]]["survived"], state])
     out.close()
     return known
 
@@ -362,15 +394,19 @@ def report(mutants, known, is_whole):
     return failed
 
 
-def some(mutants, chance):
-    return chance.sample(mutants, min(len(mutants), PER_SOURCE))
+def candidates(mutants):
+    """What a sample is drawn from: without what needs another build, or nobody could see."""
+    return [m for m in mutants if m["kind"] not in SANITIZERS and what(m) not in accepted()]
 
 
-def some_sources(names, wanted, chance):
-    """Sources chosen by chance that have enough mutants together."""
+def some_sources(wanted, chance):
+    """Sources of one room, chosen by chance, that have enough mutants together."""
+    room = chance.choice(SAMPLED)
+    names = [name for name in targets() if os.path.dirname(name) == room]
+    copy(names)
     chosen = []
     for name in chance.sample(names, len(names)):
-        found = len(find(name)[1]) if wanted > 0 else 0
+        found = len(candidates(find(name)[1])) if wanted > 0 else 0
         if found:
             chosen.append(name)
             wanted -= min(found, PER_SOURCE)
@@ -380,7 +416,7 @@ def some_sources(names, wanted, chance):
 def main():
     parser = argparse.ArgumentParser(prog="mutants", description=__doc__.splitlines()[0])
     parser.add_argument("files", nargs="*", help="sources; all by default")
-    parser.add_argument("--sample", type=int, help="only as many, 25 a source, chosen by the seed")
+    parser.add_argument("--sample", type=int, help=f"only as many, {PER_SOURCE} a source of one room, chosen by the seed")
     parser.add_argument("--seed", type=int, default=1)
     parser.add_argument("--tests", default="", help="a pattern: only these tests")
     parser.add_argument("--jobs", type=int, default=os.cpu_count())
@@ -392,19 +428,17 @@ def main():
     WORK.mkdir(parents=True, exist_ok=True)
     alone = (WORK / "lock").open("w")
     fcntl.flock(alone, fcntl.LOCK_EX)
-    sources = options.files or targets()
     chance = random.Random(options.seed)
-    if options.sample:
-        copy(sources)
-        sources = some_sources(sources, options.sample, chance)
-    mutants, digest_of_sources = build_all(sources)
+    sources = some_sources(options.sample, chance) if options.sample else options.files or targets()
+    mutants, digest_of_sources = change(sources, options.jobs)
     seen = {}
     for mutant in mutants:
-        change = digest((ROOT / mutant["file"]).read_text("latin-1"), *what(mutant)[1:])
-        seen[change] = seen.get(change, 0) + 1
-        mutant["key"] = f"{change}{seen[change]}"
+        key = digest((ROOT / mutant["file"]).read_text("latin-1"), *what(mutant)[1:])
+        seen[key] = seen.get(key, 0) + 1
+        mutant["key"] = f"{key}{seen[key]}"
     if options.sample:
-        mutants = [m for name in sources for m in some([m for m in mutants if m["file"] == name], chance)]
+        drawn = [candidates(m for m in mutants if m["file"] == name) for name in sources]
+        mutants = [m for own in drawn for m in chance.sample(own, min(len(own), PER_SOURCE))]
     desks = [Desk(number) for number in range(options.jobs)]
     try:
         known = try_all(mutants, digest_of_sources, desks, options.tests)
@@ -413,7 +447,7 @@ def main():
             desk.server.terminate()
             desk.server.wait()
             desk.clear()
-    return report(mutants, known, not options.sample)
+    return report(mutants, known, not options.sample and not options.tests)
 
 
 if __name__ == "__main__":

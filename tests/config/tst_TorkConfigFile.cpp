@@ -410,6 +410,11 @@ void tst_TorkConfigFile::currentSectionOf_data()
     row("AppendSection",
         Setup([](TorkConfigFile& file) { file.AppendSection(new TorkConfigFileSection("New")); }),
         "Two");
+    row("AppendSection where none is current", Setup([](TorkConfigFile& file) {
+            file.Clear();
+            file.AppendSection(new TorkConfigFileSection("New"));
+        }),
+        "");
     row("ToXml", Setup([](TorkConfigFile& file) { file.ToXml(); }), "Two");
     row("Clear", Setup([](TorkConfigFile& file) { file.Clear(); }), "");
 }

@@ -78,6 +78,10 @@ private slots:
     void watchesALoad();
     void nullTextIsNoValue();
     void countsIgnorableWhitespace();
+    void rootElementLeftOut();
+    void valueAfterTheEnd();
+    void hearsOfEverything_data();
+    void hearsOfEverything();
     void stepsAfterALoad();
     void stepsAfterALoadThatEndsInAnItem();
 };
@@ -368,7 +372,6 @@ void tst_TorkConfigFileDocHandler::nullTextIsNoValue()
     QCOMPARE(file.keyList("s"), QStringList());
 }
 
-// Also if its handler is still there and would say where the load stopped.
 void tst_TorkConfigFileDocHandler::countsIgnorableWhitespace()
 {
     TorkConfigFileDocHandler handler;
@@ -377,6 +380,117 @@ void tst_TorkConfigFileDocHandler::countsIgnorableWhitespace()
     QCOMPARE(handler.*privateField(IgnorableWhitespace()), 3);
 }
 
+// A handler that leaves the root element out has sections at depth 1 and items at depth 2; a start
+// at each of them ends the wait of an element without text below them.
+void tst_TorkConfigFileDocHandler::rootElementLeftOut()
+{
+    class WithoutRoot : public TorkConfigFileDocHandler
+    {
+    public:
+        using TorkConfigFileDocHandler::TorkConfigFileDocHandler;
+        bool startElement(QString const& uri, QString const& name, QString const& qName,
+                          QXmlAttributes const& attributes) override
+        {
+            return name == "r" ||
+                   TorkConfigFileDocHandler::startElement(uri, name, qName, attributes);
+        }
+        bool endElement(QString const& uri, QString const& name, QString const& qName) override
+        {
+            return name == "r" || TorkConfigFileDocHandler::endElement(uri, name, qName);
+        }
+    };
+
+    TorkConfigFile file{QString()};
+    QByteArray document("<r><s><k><d/></k></s><t>text</t></r>");
+    QBuffer buffer(&document);
+    WithoutRoot handler(&file);
+    QVERIFY(file.LoadFrom(&buffer, handler));
+    QCOMPARE(file.sectionList(), QStringList("k"));
+    QCOMPARE(file.keyList("k"), QStringList());
+}
+
+// An element that has ended has no name any more, so its late value has an empty key.
+void tst_TorkConfigFileDocHandler::valueAfterTheEnd()
+{
+    class Late : public TorkConfigFileDocHandler
+    {
+    public:
+        explicit Late(TorkConfigFile& file) : TorkConfigFileDocHandler(&file), m_file(file) {}
+        bool endElement(QString const& uri, QString const& name, QString const& qName) override
+        {
+            const bool goesOn = TorkConfigFileDocHandler::endElement(uri, name, qName);
+            QString late("late");
+            return m_file.ProcessContent(late) && goesOn;
+        }
+
+    private:
+        TorkConfigFile& m_file;
+    };
+
+    TorkConfigFile file{QString()};
+    QByteArray document("<r><s><k/></s></r>");
+    QBuffer buffer(&document);
+    Late handler(file);
+    QVERIFY(file.LoadFrom(&buffer, handler));
+    QCOMPARE(file.keyList("s"), QStringList(""));
+}
+
+// What is no element or text, and why a load failed, also if it was not the reader that gave up.
+void tst_TorkConfigFileDocHandler::hearsOfEverything_data()
+{
+    QTest::addColumn<QByteArray>("document");
+    QTest::addColumn<QStringList>("expected");
+
+    QTest::newRow("comment") << QByteArray("<r><!--c--></r>") << QStringList("comment c");
+    QTest::newRow("CDATA section") << QByteArray("<r><s><k><![CDATA[v]]></k></s></r>")
+                                   << QStringList({"CDATA starts", "CDATA ends"});
+    QTest::newRow("document type")
+        << QByteArray("<!DOCTYPE r><r/>") << QStringList({"type r starts", "type ends"});
+    QTest::newRow("error of the document")
+        << QByteArray("<r></s>") << QStringList("error: tag mismatch");
+    QTest::newRow("too deep") << QByteArray("<e>").repeated(1100)
+                              << QStringList(
+                                     "error: More than 1000 elements are inside each other.");
+}
+
+void tst_TorkConfigFileDocHandler::hearsOfEverything()
+{
+    class Listening : public TorkConfigFileDocHandler
+    {
+    public:
+        using TorkConfigFileDocHandler::TorkConfigFileDocHandler;
+        bool comment(QString const& text) override { return hear("comment " + text); }
+        bool startCDATA() override { return hear("CDATA starts"); }
+        bool endCDATA() override { return hear("CDATA ends"); }
+        bool startDTD(QString const& name, QString const&, QString const&) override
+        {
+            return hear("type " + name + " starts");
+        }
+        bool endDTD() override { return hear("type ends"); }
+        bool fatalError(QXmlParseException const& exception) override
+        {
+            return hear("error: " + exception.message());
+        }
+
+        QStringList heard;
+
+    private:
+        bool hear(QString const& what)
+        {
+            heard.append(what);
+            return true;
+        }
+    };
+
+    QFETCH(QByteArray, document);
+    TorkConfigFile file{QString()};
+    QBuffer buffer(&document);
+    Listening handler(&file);
+    file.LoadFrom(&buffer, handler);
+    QTEST(handler.heard, "expected");
+}
+
+// Also if its handler is still there and would say where the load stopped.
 void tst_TorkConfigFileDocHandler::stepsAfterALoad()
 {
     TorkConfigFile file{QString()};

@@ -6,6 +6,7 @@
 
 #include "common/config/TorkConfigFile.h"
 #include "reliability/FaultyFiles.h"
+#include "support/OpenFiles.h"
 #include "support/TestFiles.h"
 
 #include <QTemporaryDir>
@@ -69,11 +70,6 @@ QString unable(int error)
 }
 
 const QString replaced = "true ";
-
-int openFiles()
-{
-    return QDir("/proc/self/fd").entryList(QDir::AllEntries | QDir::System).size();
-}
 
 // Locks the file of a save that is in progress; returns its descriptor.
 int beginOtherSave(QByteArray const& path)
@@ -158,7 +154,7 @@ void tst_TorkConfigFileSteps::failingCall()
     QVERIFY(TestFiles::write(path(), oldBytes));
     if (leftover)
         QVERIFY(TestFiles::write(path() + ".saving", "leftover"));
-    const int before = openFiles();
+    const int before = openFileCount();
 
     FaultyFiles files(m_folder->path());
     files.failAt(step, lasts ? FaultyFiles::FromThereOn : FaultyFiles::Once, error, call);
@@ -168,7 +164,7 @@ void tst_TorkConfigFileSteps::failingCall()
     QVERIFY(files.reached());
     QCOMPARE(result, outcome);
     QCOMPARE(TestFiles::read(path()), outcome.startsWith("true") ? newBytes : oldBytes);
-    QCOMPARE(openFiles(), before);
+    QCOMPARE(openFileCount(), before);
     QVERIFY(leftover || !QFile::exists(path() + ".saving") || call == "flock");
 }
 
@@ -261,11 +257,13 @@ void tst_TorkConfigFileSteps::otherProgram()
     QVERIFY(TestFiles::write(path(), oldBytes));
     if (leftover)
         QVERIFY(TestFiles::write(path() + ".saving", "leftover"));
-    const int before = openFiles();
+    const int before = openFileCount();
 
+    bool hasActed = false;
     int other = -1;
     FaultyFiles files(m_folder->path());
     files.before(call, step, [&] {
+        hasActed = true;
         ::unlink(saving);
         if (begins)
             other = beginOtherSave(saving);
@@ -275,6 +273,7 @@ void tst_TorkConfigFileSteps::otherProgram()
     const QString result = saved(path());
     files.mend();
 
+    QVERIFY(hasActed);
     QVERIFY(!begins || other != -1);
     QVERIFY(failing == 0 || files.reached());
     QCOMPARE(result, outcome);
@@ -282,7 +281,7 @@ void tst_TorkConfigFileSteps::otherProgram()
     QCOMPARE(TestFiles::listing(m_folder->path()).filter(".saving"),
              begins ? QStringList("viewer.cfg.saving: half") : QStringList());
     ::close(other);
-    QCOMPARE(openFiles(), before);
+    QCOMPARE(openFileCount(), before);
 }
 
 // Until it has the old file's rights; there may be passwords in it.
@@ -333,6 +332,7 @@ void tst_TorkConfigFileSteps::isLockedWhileItIsWritten()
         files.failAt(1, FaultyFiles::Once, error, "flock");
     const QString result = saved(path());
 
+    QCOMPARE(files.reached(), error != 0);
     QCOMPARE(result, replaced);
     QCOMPARE(lockError, EWOULDBLOCK);
 }

@@ -326,7 +326,19 @@ void tst_TorkConfigFileValues::readInt_data()
     QTest::newRow("hexadecimal") << "0x10" << false << 7;
     QTest::newRow("separator") << "1,000" << false << 7;
     QTest::newRow("two signs") << "--1" << false << 7;
+    QTest::newRow("no digit before the point") << ".5" << false << 7;
+    QTest::newRow("character after 9") << "1:" << false << 7;
     QTest::newRow("missing") << QString() << false << 7;
+
+    // The 5 of a longer text, which is not copied.
+    const auto five = [](char const* name, char16_t const* text) {
+        const QString stored = QString::fromRawData(reinterpret_cast<QChar const*>(text) + 1, 1);
+        QTest::newRow(name) << stored << true << 5;
+    };
+    five("after a minus", u"-5 ");
+    five("after a digit", u"15 ");
+    five("before a minus", u" 5-");
+    five("before a digit", u" 51");
 }
 
 void tst_TorkConfigFileValues::readInt()

@@ -79,6 +79,8 @@ void tst_TorkConfigText::name_data()
 
     QTest::newRow("letters, digits and signs") << "azAZ-09."
                                                << "azAZ-09.";
+    QTest::newRow("signs beside letters and digits") << "a@[`{/:"
+                                                     << "a_u0040_u005b_u0060_u007b_u002f_u003a";
     QTest::newRow("empty") << ""
                            << "_";
     QTest::newRow("space") << "My file"
@@ -203,7 +205,10 @@ void tst_TorkConfigText::isPlainValue_data()
     QTest::newRow("number of two digits") << "%10" << true;
     QTest::newRow("placeholder") << "%1" << false;
     QTest::newRow("placeholder of two digits") << "%03" << false;
+    QTest::newRow("placeholder before a digit") << "%031" << false;
     QTest::newRow("localized placeholder") << "%L2" << false;
+    QTest::newRow("last character of ASCII") << QString(QChar(0x7f)) << true;
+    QTest::newRow("first character beyond ASCII") << QString(QChar(0x80)) << false;
     QTest::newRow("end of a CDATA section") << "a]]>" << false;
     QTest::newRow("umlaut") << QString::fromUtf8("\xC3\xA4") << false;
     QTest::newRow("empty") << "" << false;

@@ -5,6 +5,7 @@
 #include "log/LogFileTest.h"
 #include "log/LogFolder.h"
 #include "support/MessageCapture.h"
+#include "support/OpenFiles.h"
 #include "support/PrivateField.h"
 #include "support/TestFiles.h"
 
@@ -45,6 +46,7 @@ private slots:
     void locateReturnsTheCurrentFile_data();
     void locateReturnsTheCurrentFile();
     void locateReturnsTheFileWhereEntriesEnd();
+    void locateMakesRoomInTheOpenFile();
     void locateReturnsNullWithoutFile();
     void sizeLimitOnOpening_data();
     void sizeLimitOnOpening();
@@ -59,15 +61,6 @@ private:
 };
 
 PRIVATE_FIELD(Extension, TorkLog, QString, m_fileExtension);
-
-namespace {
-
-int openFileCount()
-{
-    return QDir("/proc/self/fd").entryList(QDir::AllEntries | QDir::System).size();
-}
-
-} // namespace
 
 void tst_TorkLogFiles::init()
 {
@@ -431,6 +424,21 @@ void tst_TorkLogFiles::locateReturnsTheFileWhereEntriesEnd()
     file->write("8\n");
     log.write(QStringLiteral("9\n"));
     QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("12\n34\n56\n7\n8\n9\n"));
+}
+
+void tst_TorkLogFiles::locateMakesRoomInTheOpenFile()
+{
+    LogFolder folder;
+    const QString path = folder.logs() + "app.log";
+    QVERIFY(TestFiles::write(path, "aaaaaaaa\nbbbb\n"));
+    TorkLog log;
+    folder.prepare(log, "app", 10);
+    QVERIFY(log.open(path));
+
+    QFile* file = log.locateLogFile("123456789");
+    QVERIFY(file);
+    QCOMPARE(TestFiles::read(path), QByteArray("bbbb"));
+    QCOMPARE(file->pos(), 4);
 }
 
 void tst_TorkLogFiles::locateReturnsNullWithoutFile()

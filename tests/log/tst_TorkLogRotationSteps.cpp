@@ -8,6 +8,7 @@
 #include "log/LogFolder.h"
 #include "reliability/FaultyFiles.h"
 #include "support/ChildProcess.h"
+#include "support/OpenFiles.h"
 #include "support/TestFiles.h"
 
 #include <QtTest>
@@ -23,6 +24,7 @@ class tst_TorkLogRotationSteps : public QObject
 private slots:
     void folderThatCannotBeListed_data();
     void folderThatCannotBeListed();
+    void fullFileAppearsMeanwhile();
     void copyThatFails_data();
     void copyThatFails();
     void copyIsWrittenBeforeItIsSynced();
@@ -33,11 +35,6 @@ private slots:
 };
 
 namespace {
-
-int openFiles()
-{
-    return QDir("/proc/self/fd").entryList(QDir::AllEntries | QDir::System).size();
-}
 
 void makeFiles(LogFolder const& folder, QStringList const& files)
 {
@@ -86,6 +83,22 @@ void tst_TorkLogRotationSteps::folderThatCannotBeListed()
     files.mend();
     QVERIFY(files.reached());
     QTEST(folder.listing(), "after");
+}
+
+// Another program makes the folder and fills a log before this one does.
+void tst_TorkLogRotationSteps::fullFileAppearsMeanwhile()
+{
+    LogFolder folder;
+    const QString logs = folder.root() + "new/";
+    TorkLog log;
+    folder.prepare(log, "app", 10);
+    log.setOutputPath(logs);
+
+    FaultyFiles files(folder.root());
+    files.before("mkdir", 1, [&] { TestFiles::write(logs + "app.log", "of the other one\n"); });
+    log.write(QStringLiteral("entry\n"));
+    QCOMPARE(TestFiles::listing(logs),
+             QStringList({"app.log: entry\n", "app.log.1: of the other one\n"}));
 }
 
 // The current file is gone all the same, but nothing that is not whole gets its number.
@@ -182,13 +195,13 @@ int rotates(QStringList const& arguments)
     TestFiles::write(folder.logs() + "app.log", "text");
     TorkLog log;
     folder.prepare(log, "app");
-    const int before = openFiles();
+    const int before = openFileCount();
     FaultyFiles files(folder.root());
     if (arguments.at(0) == "folder that does not open")
         files.failAt(3, FaultyFiles::Once, EMFILE, "open");
     log.deleteOldFiles();
     files.mend();
-    std::printf("%d %s|%s", openFiles() - before, qPrintable(folder.listing().join(' ')),
+    std::printf("%d %s|%s", openFileCount() - before, qPrintable(folder.listing().join(' ')),
                 qPrintable(QFileInfo(files.path()).fileName()));
     return 0;
 }

@@ -12,6 +12,12 @@
 
 #include <ctime>
 
+#ifdef Q_OS_LINUX
+#include <sched.h>
+#include <sys/mount.h>
+#include <unistd.h>
+#endif
+
 using namespace LogAtATime;
 
 class tst_TorkLogStamps : public QObject
@@ -30,6 +36,9 @@ private slots:
     void stampAfterDroppedEntry();
     void stampFollowsTheTimeZone_data();
     void stampFollowsTheTimeZone();
+    void longTimeZoneIsNotKept();
+    void unsetTimeZoneIsTheSystems_data();
+    void unsetTimeZoneIsTheSystems();
     void stampInRepeatedHour_data();
     void stampInRepeatedHour();
     void firstEntryIn1970_data();
@@ -257,6 +266,82 @@ void tst_TorkLogStamps::stampFollowsTheTimeZone()
     log.trace("y");
     const QByteArray second = TestFiles::read(folder.logs() + "app.log").split('\n').value(1);
     QCOMPARE(second, expected + " Trace y");
+}
+
+// One character longer than what is kept. The zones differ in that character only, and it equals
+// the first byte of the time of day, which is kept behind the zone.
+void tst_TorkLogStamps::longTimeZoneIsNotKept()
+{
+    LogFolder folder;
+    TorkLog log;
+    log.setOutputPath(folder.logs());
+    folder.configure(log, {{"dateTimeFormat", stampFormat}, {"filePrefix", "app"}});
+    const QByteArray name = '<' + QByteArray(61, 'X') + ">-";
+    TestClock::set(utc(QDate(2021, 3, 3), QTime(23, 0, 0, '2')));
+
+    setZone(name + '1');
+    log.trace("x");
+    setZone(name + '2');
+    log.trace("y");
+    QCOMPARE(TestFiles::read(folder.logs() + "app.log"),
+             QByteArray("2021-03-04 00:00:00.050 Trace x\n2021-03-04 01:00:00.050 Trace y\n"));
+}
+
+namespace {
+
+// Two entries of one moment, with TZ unset before or after it is empty, in a system in Tokyo.
+int changesToOrFromUnset(QStringList const& arguments)
+{
+#ifdef Q_OS_LINUX
+    // A folder that only this process sees.
+    if (unshare(CLONE_NEWNS) != 0 ||
+        mount("none", "/", nullptr, MS_REC | MS_PRIVATE, nullptr) != 0 ||
+        mount("tmpfs", "/etc", "tmpfs", 0, nullptr) != 0 ||
+        symlink("/usr/share/zoneinfo/Asia/Tokyo", "/etc/localtime") != 0)
+        return ChildProcess::skipped;
+
+    TorkLog log;
+    log.setOutputPath(arguments.at(0));
+    log.setPreferencesFileName(arguments.at(1));
+    log.loadPreferences();
+    TestClock::set(utc(QDate(2021, 3, 4), QTime(12, 0)));
+    const bool isUnsetFirst = arguments.at(2) == "from unset";
+    setZone(isUnsetFirst ? QByteArray() : QByteArray(""));
+    log.trace("x");
+    setZone(isUnsetFirst ? QByteArray("") : QByteArray());
+    log.trace("y");
+    return 0;
+#else
+    Q_UNUSED(arguments)
+    return ChildProcess::skipped;
+#endif
+}
+
+} // namespace
+
+// An empty TZ is UTC, wherever the system is.
+void tst_TorkLogStamps::unsetTimeZoneIsTheSystems_data()
+{
+    QTest::addColumn<QByteArray>("expected");
+
+    const QByteArray inTokyo("2021-03-04 21:00:00.000 Trace ");
+    const QByteArray inUtc("2021-03-04 12:00:00.000 Trace ");
+    QTest::newRow("from unset") << inTokyo + "x\n" + inUtc + "y\n";
+    QTest::newRow("to unset") << inUtc + "x\n" + inTokyo + "y\n";
+}
+
+void tst_TorkLogStamps::unsetTimeZoneIsTheSystems()
+{
+    LogFolder folder;
+    QVERIFY(TestFiles::write(
+        folder.settingsFile(),
+        LogFolder::settingsText({{"dateTimeFormat", stampFormat}, {"filePrefix", "app"}})));
+    const ChildProcess::Result child =
+        ChildProcess::run("unset", {folder.logs(), folder.settingsFile(), QTest::currentDataTag()});
+    if (child.wasSkipped())
+        QSKIP("This process cannot have a system of its own.");
+    QVERIFY2(child.ended(), child.report());
+    QTEST(TestFiles::read(folder.logs() + "app.log"), "expected");
 }
 
 void tst_TorkLogStamps::stampInRepeatedHour_data()
@@ -569,9 +654,10 @@ int writesInTheUsersLanguage(QStringList const& arguments)
 
 int main(int argc, char** argv)
 {
-    return ChildProcess::main<tst_TorkLogStamps>(
-        argc, argv,
-        {{"first entry", writesFirstEntry}, {"user's language", writesInTheUsersLanguage}});
+    return ChildProcess::main<tst_TorkLogStamps>(argc, argv,
+                                                 {{"first entry", writesFirstEntry},
+                                                  {"user's language", writesInTheUsersLanguage},
+                                                  {"unset", changesToOrFromUnset}});
 }
 
 #include "tst_TorkLogStamps.moc"

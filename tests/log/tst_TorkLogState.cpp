@@ -39,6 +39,8 @@ private slots:
     void stampsWaitForTheirLock();
     void formatChangedWhileTheEntryWaits();
     void prefixChangedWhileTheEntryWaits();
+    void settingsChangedWhileTheSaveWaits();
+    void loadedSettingsWaitForTheLock();
     void qtIsReadyBeforeTheFirstFork();
     void stampKeptAtMidnight_data();
     void stampKeptAtMidnight();
@@ -63,6 +65,8 @@ PRIVATE_FIELD(Writing, TorkLog, int, m_writing);
 PRIVATE_FIELD(Format, TorkLog, QString, m_dateTimeFormat);
 PRIVATE_FIELD(Prefix, TorkLog, QString, m_elapsedTimePrefix);
 PRIVATE_FIELD(Mutex, TorkLog, QMutex, m_mutex);
+using TextSetter = void(QString const&);
+PRIVATE_FIELD(SetFilePrefix, TorkLog, TextSetter, setFilePrefix);
 
 namespace {
 
@@ -71,19 +75,48 @@ int s_stampsMade = 0;
 int s_categoriesAskedFor = 0;
 std::function<void()> s_beforeWriting;
 
+// Something that another thread does while this object lives.
+class OtherThread
+{
+public:
+    explicit OtherThread(std::function<void()> const& operation)
+        : m_thread([this, operation] {
+              m_number = syscall(SYS_gettid);
+              operation();
+              m_isDone = true;
+          })
+    {}
+    ~OtherThread() { m_thread.join(); }
+    Q_DISABLE_COPY(OtherThread)
+
+    // Whether it waits for something that this thread holds, however slow the machine is: returns
+    // once it sleeps, several times in a row, or is done.
+    bool waits() const
+    {
+        for (int asleep = 0; asleep < 5 && !m_isDone; asleep = sleeps() ? asleep + 1 : 0)
+            std::this_thread::sleep_for(std::chrono::milliseconds(1));
+        return !m_isDone;
+    }
+
+private:
+    bool sleeps() const
+    {
+        QFile status(QString("/proc/self/task/%1/stat").arg(m_number));
+        return status.open(QIODevice::ReadOnly) && status.readAll().contains(") S ");
+    }
+
+    std::atomic<long> m_number{0};
+    std::atomic<bool> m_isDone{false};
+    std::thread m_thread;
+};
+
 // Whether an operation in another thread waits while this one holds the lock.
 bool waits(QMutex& mutex, std::function<void()> const& operation)
 {
-    std::atomic<bool> isDone{false};
     mutex.lock();
-    std::thread other([&] {
-        operation();
-        isDone = true;
-    });
-    std::this_thread::sleep_for(std::chrono::milliseconds(50));
-    const bool waited = !isDone;
+    const OtherThread other(operation);
+    const bool waited = other.waits();
     mutex.unlock();
-    other.join();
     return waited;
 }
 
@@ -186,8 +219,7 @@ void tst_TorkLogState::isWritingWhileALineIsWritten()
     QCOMPARE(log.*privateField(Writing()), 0);
 }
 
-// Whoever needs the lock waits while another thread has it. If one did not, a slow machine might
-// not show it, but no machine fails one that does.
+// Whoever needs the lock waits while another thread has it.
 void tst_TorkLogState::waitsForTheLock_data()
 {
     using Operation = std::function<void(TorkLog&)>;
@@ -212,6 +244,7 @@ void tst_TorkLogState::waitsForTheLock_data()
     row("dateTimeFormat", [](TorkLog& log) { log.dateTimeFormat(); });
     row("elapsedTimePrefix", [](TorkLog& log) { log.elapsedTimePrefix(); });
     row("filePrefix", [](TorkLog& log) { log.filePrefix(); });
+    row("setFilePrefix", [](TorkLog& log) { (log.*privateField(SetFilePrefix()))("x"); });
 }
 Q_DECLARE_METATYPE(std::function<void(TorkLog&)>)
 
@@ -256,11 +289,12 @@ void tst_TorkLogState::formatChangedWhileTheEntryWaits()
 
     QMutex& mutex = log.*privateField(Mutex());
     mutex.lock();
-    std::thread other([&log] { log.trace("entry"); });
-    std::this_thread::sleep_for(std::chrono::milliseconds(50));
-    log.*privateField(Format()) = "'later'";
-    mutex.unlock();
-    other.join();
+    {
+        const OtherThread other([&log] { log.trace("entry"); });
+        other.waits();
+        log.*privateField(Format()) = "'later'";
+        mutex.unlock();
+    }
     QCOMPARE(TestFiles::read(folder.logs() + "app.log"), QByteArray("later Trace entry\n"));
 }
 
@@ -275,23 +309,74 @@ void tst_TorkLogState::prefixChangedWhileTheEntryWaits()
 
     std::atomic<bool> hasStamp{false};
     std::atomic<bool> isLocked{false};
-    std::thread other([&] {
-        log.trace("first");
-        hasStamp = true;
-        while (!isLocked)
+    {
+        const OtherThread other([&] {
+            log.trace("first");
+            hasStamp = true;
+            while (!isLocked)
+                std::this_thread::yield();
+            log.trace("second");
+        });
+        while (!hasStamp)
             std::this_thread::yield();
-        log.trace("second");
-    });
-    while (!hasStamp)
-        std::this_thread::yield();
+        QMutex& mutex = log.*privateField(Mutex());
+        mutex.lock();
+        isLocked = true;
+        other.waits();
+        log.*privateField(Prefix()) = "later:";
+        mutex.unlock();
+    }
+    QVERIFY(TestFiles::read(folder.logs() + "app.log").endsWith("T Trace later:[0] second\n"));
+}
+
+// A thread that saves the settings waits for them, and not only for the folder's name.
+void tst_TorkLogState::settingsChangedWhileTheSaveWaits()
+{
+    LogFolder folder;
+    TorkLog log;
+    folder.prepare(log, "app");
+
     QMutex& mutex = log.*privateField(Mutex());
     mutex.lock();
-    isLocked = true;
-    std::this_thread::sleep_for(std::chrono::milliseconds(50));
-    log.*privateField(Prefix()) = "later:";
-    mutex.unlock();
-    other.join();
-    QVERIFY(TestFiles::read(folder.logs() + "app.log").endsWith("T Trace later:[0] second\n"));
+    {
+        const OtherThread other([&log] { log.savePreferences(); });
+        other.waits();
+        log.*privateField(Prefix()) = "later:";
+        mutex.unlock();
+    }
+    QVERIFY(TestFiles::read(folder.settingsFile()).contains("later:"));
+}
+
+// The settings are read without the lock, because that is traced, and set under it.
+void tst_TorkLogState::loadedSettingsWaitForTheLock()
+{
+    LogFolder folder;
+    TorkLog::initialize(folder.logs(), "program", folder.settingsFile(), true);
+    TorkLog log(folder.logs());
+    log.setPreferencesFileName(folder.settingsFile());
+
+    std::atomic<bool> isTracing{false};
+    std::atomic<bool> isLocked{false};
+    s_beforeWriting = [&] {
+        isTracing = true;
+        while (!isLocked)
+            std::this_thread::yield();
+    };
+    bool waited = false;
+    {
+        const OtherThread other([&log] { log.loadPreferences(); });
+        while (!isTracing)
+            std::this_thread::yield();
+        QMutex& mutex = log.*privateField(Mutex());
+        mutex.lock();
+        isLocked = true;
+        waited = other.waits();
+        mutex.unlock();
+    }
+    s_beforeWriting = nullptr;
+    TorkLog::shutdown();
+    QVERIFY(waited);
+    QCOMPARE(log.filePrefix(), QString("program"));
 }
 
 // Qt makes it under a lock that a child of fork() would inherit.
@@ -516,22 +601,20 @@ void tst_TorkLogState::waitsForTheMessage()
         while (!mayGoOn)
             std::this_thread::yield();
     };
-    std::thread writer([] { qWarning("message"); });
-    while (!isWriting)
-        std::this_thread::yield();
-    std::atomic<bool> isDone{false};
-    std::thread other([&] {
-        if (shutsDown)
-            TorkLog::shutdown();
-        else
-            TorkLog::initialize(folder.logs(), "app", folder.settingsFile(), true);
-        isDone = true;
-    });
-    std::this_thread::sleep_for(std::chrono::milliseconds(50));
-    const bool waited = !isDone;
-    mayGoOn = true;
-    writer.join();
-    other.join();
+    bool waited = false;
+    {
+        const OtherThread writer([] { qWarning("message"); });
+        while (!isWriting)
+            std::this_thread::yield();
+        const OtherThread other([&] {
+            if (shutsDown)
+                TorkLog::shutdown();
+            else
+                TorkLog::initialize(folder.logs(), "app", folder.settingsFile(), true);
+        });
+        waited = other.waits();
+        mayGoOn = true;
+    }
     s_beforeWriting = nullptr;
     TorkLog::shutdown();
     QVERIFY(waited);

@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 
 #include "common/log/TorkLogWriter_p.h"
+#include "log/LockHolder.h"
 #include "reliability/FaultyFiles.h"
 #include "support/ForkedChild.h"
 #include "support/MessageCapture.h"
@@ -35,11 +36,14 @@ private slots:
     void otherAppendsMeanwhile();
     void overwritesOldText_data();
     void overwritesOldText();
+    void overwritesOldTextOnAnOlderSystem();
     void appendsWhileAnotherKeepsItOut();
     void makesRoom_data();
     void makesRoom();
     void otherAppendsWhileItMakesRoom_data();
     void otherAppendsWhileItMakesRoom();
+    void otherAppendsToAFullFile();
+    void keptLinesWaitForTheDisk_data();
     void keptLinesWaitForTheDisk();
     void waitingTextKeepsItsPlace();
     void waitingTextCountsInThePosition();
@@ -219,36 +223,30 @@ void tst_TorkLogWriter::overwritesOldText()
     QCOMPARE(TestFiles::read(path()), expected + "entry4\nlonger\n");
 }
 
+// Older systems do not have the call that asks for the size alone.
+void tst_TorkLogWriter::overwritesOldTextOnAnOlderSystem()
+{
+    QVERIFY(TestFiles::write(path(), "old text\n"));
+    FaultyFiles files(m_folder->path());
+    TorkLogWriter writer;
+    QCOMPARE(writer.open(path()), QString());
+
+    files.failAt(1, FaultyFiles::Once, ENOSYS, "stat");
+    write(writer, "entry\n");
+    files.mend();
+    QVERIFY(files.reached());
+    QCOMPARE(TestFiles::read(path()), QByteArray("entry\nxt\n"));
+}
+
 // The other one may cut the file down, so no place in it is safe but its end.
 void tst_TorkLogWriter::appendsWhileAnotherKeepsItOut()
 {
     QVERIFY(TestFiles::write(path(), "old text\n"));
     TorkLogWriter writer;
     QCOMPARE(writer.open(path()), QString());
-
-    int isLocked[2];
-    int mayEnd[2];
-    QCOMPARE(pipe(isLocked), 0);
-    QCOMPARE(pipe(mayEnd), 0);
-    const pid_t child = fork();
-    if (child == 0) {
-        struct flock whole = {};
-        whole.l_type = F_WRLCK;
-        const int own = ::open(QFile::encodeName(path()), O_RDWR);
-        char byte = ::fcntl(own, F_SETLK, &whole) == 0 ? 'y' : 'n';
-        const bool told = ::write(isLocked[1], &byte, 1) == 1 && ::read(mayEnd[0], &byte, 1) == 1;
-        endForkedChild(told ? 0 : 1);
-    }
-    char locked = 0;
-    QCOMPARE(::read(isLocked[0], &locked, 1), ssize_t(1));
+    const LockHolder other(path());
+    QVERIFY(other.holds());
     write(writer, "entry\n", 10);
-    QCOMPARE(::write(mayEnd[1], "e", 1), ssize_t(1));
-    int status = 0;
-    QCOMPARE(waitpid(child, &status, 0), child);
-    for (int end : {isLocked[0], isLocked[1], mayEnd[0], mayEnd[1]})
-        ::close(end);
-
-    QCOMPARE(locked, 'y');
     QCOMPARE(TestFiles::read(path()), QByteArray("old text\nentry\n"));
 }
 
@@ -309,9 +307,36 @@ void tst_TorkLogWriter::otherAppendsWhileItMakesRoom()
     QTEST(TestFiles::read(path()), "expected");
 }
 
+// That is no old text, although nothing fits any more.
+void tst_TorkLogWriter::otherAppendsToAFullFile()
+{
+    QVERIFY(TestFiles::write(path(), "old\n"));
+    FaultyFiles files(m_folder->path());
+    TorkLogWriter writer;
+    QCOMPARE(writer.open(path()), QString());
+    write(writer, "new\n");
+
+    bool isAppended = false;
+    files.before("lseek", 1, [&] {
+        append(path(), "other\n");
+        isAppended = true;
+    });
+    write(writer, "entry\n", 5);
+    QVERIFY(isAppended);
+    QCOMPARE(TestFiles::read(path()), QByteArray("new\nother\nentry\n"));
+}
+
 // The entry does not go ahead of them.
+void tst_TorkLogWriter::keptLinesWaitForTheDisk_data()
+{
+    QTest::addColumn<int>("failures");
+    QTest::newRow("until they are written again") << 1;
+    QTest::newRow("until the entry is written") << 2;
+}
+
 void tst_TorkLogWriter::keptLinesWaitForTheDisk()
 {
+    QFETCH(int, failures);
     QVERIFY(TestFiles::write(path(), "--\nold1\nold2\n"));
     FaultyFiles files(m_folder->path());
     TorkLogWriter writer;
@@ -319,9 +344,16 @@ void tst_TorkLogWriter::keptLinesWaitForTheDisk()
     write(writer, "1\n");
 
     files.failAt(1, FaultyFiles::Once, EIO, "write");
+    bool failsAgain = false;
+    files.before("write", 2, [&] {
+        failsAgain = failures == 2;
+        if (failsAgain)
+            files.failAt(1, FaultyFiles::Once, EIO, "write");
+    });
     write(writer, "22\n", 10);
     files.mend();
     QVERIFY(files.reached());
+    QCOMPARE(failsAgain, failures == 2);
     QCOMPARE(TestFiles::read(path()), QByteArray("old1old1old222\n"));
 }
 

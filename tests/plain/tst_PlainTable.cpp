@@ -66,7 +66,6 @@ class tst_PlainTable : public QObject
 
 private slots:
     void randomOperations();
-    void referencesIntoTheTable();
 
 private:
     int m_compared = 0;
@@ -116,19 +115,6 @@ void tst_PlainTable::randomOperations()
         }
     }
     std::printf("plain table: %d operations, %d whole tables compared\n", operations, m_compared);
-}
-
-// A key or value taken from the table itself is stored in it while it grows.
-void tst_PlainTable::referencesIntoTheTable()
-{
-    TorkOrderedHash<QString> table;
-    table.insert("0", "first");
-    for (int i = 1; i < 1000; ++i) {
-        table.insert(QString::number(i), table.begin()->value);
-        table.insert((table.end() - 1)->key, (table.begin() + i / 2)->value);
-        QCOMPARE(*table.find(QString::number(i)), QString("first"));
-    }
-    QCOMPARE(table.size(), size_t(1000));
 }
 
 QTEST_APPLESS_MAIN(tst_PlainTable)

@@ -672,6 +672,7 @@ void tst_Faults::diskFullForLong()
         scene.files.limitBytes(step);
         for (int i = 0; i < 1000; ++i)
             write(scene.log, entry(i));
+        CHECK(scene.files.reached());
         scene.files.mend();
         write(scene.log, after);
 
