@@ -12,6 +12,7 @@ import json
 import os
 import pathlib
 import platform
+import re
 import shutil
 import statistics
 import subprocess
@@ -464,7 +465,7 @@ def titled(group, text, charts):
     return f"### {title}\n\n{picture if group in charts else ''}{text}"
 
 
-def report(name, section, samples, charts, quick):
+def report(name, section, samples, charts, quick, moment):
     if name == "growth":
         parts = [growth_table(samples)]
     else:
@@ -474,7 +475,7 @@ def report(name, section, samples, charts, quick):
         ]
     parts += [titled(group, rows_table(rows), charts) for group, rows in samples.rows.items()]
     goals = goal_lines(section, samples, quick)
-    return "\n".join([f"## {section.title}\n", *parts] + ([goals] if goals else []))
+    return "\n".join([f"## {section.title}\n", f"{moment}\n", *parts] + ([goals] if goals else []))
 
 
 # The machine and the date.
@@ -525,13 +526,34 @@ def machine(options):
     )
 
 
-def write_document(text):
+def moment():
+    return (
+        f"Measured on {datetime.date.today().isoformat()}; load when it began: "
+        f"{os.getloadavg()[0]:.1f}"
+    )
+
+
+def with_sections(tables, parts):
+    """The tables of the document with these sections in the place of their former selves."""
+    sections = dict(part.split("\n", 1) for part in parts)
+    heads, *texts = re.split(r"^(?=## )", tables, flags=re.MULTILINE)
+    former = [text.split("\n", 1) for text in texts]
+    missing = set(sections) - {title for title, _ in former}
+    if missing:
+        sys.exit(f"bench: {DOCUMENT} lacks {', '.join(missing)}; write it whole first")
+    return heads + "\n".join(
+        f"{title}\n{sections.get(title, text).rstrip()}\n" for title, text in former
+    )
+
+
+def write_document(parts, is_whole):
     document = DOCUMENT.read_text(encoding="utf-8")
     before, _, rest = document.partition(BEGIN)
-    _, end, after = rest.partition(END)
+    tables, end, after = rest.partition(END)
     if not end:
         sys.exit(f"bench: {DOCUMENT} has no markers for the tables")
-    DOCUMENT.write_text(f"{before}{BEGIN}\n\n{text}\n{END}{after}", encoding="utf-8")
+    text = "\n".join(parts) if is_whole else with_sections(tables.strip(), parts[1:])
+    DOCUMENT.write_text(f"{before}{BEGIN}\n\n{text.rstrip()}\n\n{END}{after}", encoding="utf-8")
 
 
 def main():
@@ -540,28 +562,30 @@ def main():
     parser.add_argument("sections", nargs="*", metavar="SECTION", help=", ".join(SECTIONS))
     parser.add_argument("--quick", action="store_true", help="fewer and smaller measurements")
     parser.add_argument("--cpu", action="store_true", help="processor time, for a busy machine")
-    parser.add_argument("--write-doc", action="store_true", help="write docs/performance.md")
+    parser.add_argument("--write-doc", action="store_true", help="write the tables of docs/performance.md")
     options = parser.parse_intermixed_args()
     names = options.sections or list(SECTIONS)
     unknown = [name for name in names if name not in SECTIONS]
     if unknown:
         parser.error(f"unknown section: {', '.join(unknown)}")
-    if options.write_doc and (options.sections or options.quick or options.cpu):
-        parser.error("--write-doc needs a full run")
+    if options.write_doc and (options.quick or options.cpu):
+        parser.error("--write-doc needs full measurements")
 
     parts = [machine(options) + "\n"]
     charts = {}
     print(parts[0], flush=True)
     for name in names:
         section = SECTIONS[name]
+        begin = moment()
         samples = measure(section, options.programs, options)
         if options.write_doc and name != "growth":
             charts.update(charts_of(samples))
-        parts.append(report(name, section, samples, charts, options.quick))
+        parts.append(report(name, section, samples, charts, options.quick, begin))
         print(parts[-1], flush=True)
     if options.write_doc:
-        bench_charts.write(CHARTS, charts)
-        write_document("\n".join(parts))
+        is_whole = not options.sections
+        bench_charts.write(CHARTS, charts, is_whole)
+        write_document(parts, is_whole)
 
 
 if __name__ == "__main__":

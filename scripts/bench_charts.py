@@ -59,10 +59,10 @@ def chart(rows):
     return "\n".join([*lines, "</svg>", ""])
 
 
-def write(folder, charts):
-    """Replaces the charts of the folder by these: texts by group."""
+def write(folder, charts, is_whole):
+    """Writes charts, texts by group, into the folder; if they are all, others are removed."""
     folder.mkdir(parents=True, exist_ok=True)
-    for old in folder.glob("*.svg"):
+    for old in folder.glob("*.svg") if is_whole else ():
         old.unlink()
     for group, text in charts.items():
         (folder / file_name(group)).write_text(text, encoding="utf-8")
