@@ -82,6 +82,12 @@ void tst_ForeignLine::formats_data()
     row("slashes", "2026/11/22 14:03:02 listening", "2026/11/22 14:03:02", none, "listening");
     row("German date", "22.11.2026 14:03:02 WARNUNG x", "22.11.2026 14:03:02", none, "WARNUNG x");
     row("time only", "14:03:02.5 [warn] x", "14:03:02.5", warning, "x");
+    row("twelve hours, after noon", "11/22/2026 02:03:02 PM ERROR x", "11/22/2026 02:03:02 PM",
+        error, "x");
+    row("twelve hours, one digit", "1/2/2026 9:03:02.5 AM - INFO - x", "1/2/2026 9:03:02.5 AM",
+        note, "x");
+    row("java.util.logging", "Nov 22, 2026 2:03:02 PM a.B main", "Nov 22, 2026 2:03:02 PM", none,
+        "a.B main");
     row("time alone", "2026-11-22 14:03:02", "2026-11-22 14:03:02", none, "");
 
     row("stamp and level in brackets", "[2026-11-22 14:03:02.123] [error] x",
