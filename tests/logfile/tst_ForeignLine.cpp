@@ -121,6 +121,14 @@ void tst_ForeignLine::formats_data()
         "web:1] 500 GET /");
     row("Android", "11-22 14:03:02.123  1200  1203 E Camera: lost", "11-22 14:03:02.123", error,
         "1200  1203 E Camera: lost");
+    row("colors of a terminal",
+        "\x1b[32m2026-11-22 14:03:02\x1b[0m \x1b[1;31mERROR\x1b[0m disk full",
+        "2026-11-22 14:03:02", error, "disk full");
+    row("a color around all", "\x1b[33m[2026-11-22 14:03:02] [warn] x", "2026-11-22 14:03:02",
+        warning, "x");
+    row("a color around the level", "\x1b[31m[ERROR]\x1b[0m x", "", error, "x");
+    row("colors within the message", "2026-11-22 14:03:02 INFO a \x1b[1mb\x1b[0m",
+        "2026-11-22 14:03:02", note, "a \x1b[1mb\x1b[0m");
     row("Redis", "71:M 22 Nov 2026 14:03:02.123 * Ready", "22 Nov 2026 14:03:02.123", none,
         "71:M 22 Nov 2026 14:03:02.123 * Ready");
     row("MySQL", "2026-11-22T14:03:02.123456Z 0 [Warning] [MY-010068] [Server] x",
