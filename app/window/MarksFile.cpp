@@ -9,6 +9,7 @@
 
 #include <QDir>
 #include <QFileInfo>
+#include <QSet>
 #include <QStringList>
 
 namespace Velocor {
@@ -77,11 +78,31 @@ QVector<LogMark> MarksFile::Marks(QString const& path)
 {
     QString error;
     const QVector<Log> logs = read(error);
+    QVector<LogMark>& known = m_known[path];
+    known.clear();
     for (Log const& log : logs) {
         if (log.path == path)
-            return log.marks;
+            known = log.marks;
     }
-    return QVector<LogMark>();
+    return known;
+}
+
+// With the marks in the file that another program has added. Only the line tells: its neighbors and
+// its place change with the log.
+QVector<LogMark> MarksFile::withOthers(QString const& path, QVector<LogMark> const& marks,
+                                       QVector<Log> const& logs) const
+{
+    QSet<QByteArray> mine;
+    for (LogMark const& mark : m_known.value(path) + marks)
+        mine.insert(mark.line);
+    QVector<LogMark> all = marks;
+    for (Log const& log : logs) {
+        for (LogMark const& mark : log.marks) {
+            if (log.path == path && !mine.contains(mark.line))
+                all.append(mark);
+        }
+    }
+    return all;
 }
 
 QString MarksFile::SetMarks(QString const& path, QVector<LogMark> const& marks)
@@ -90,11 +111,12 @@ QString MarksFile::SetMarks(QString const& path, QVector<LogMark> const& marks)
     QVector<Log> logs = read(error);
     if (!error.isEmpty())
         return error;
+    const QVector<LogMark> all = withOthers(path, marks, logs);
     logs.erase(
         std::remove_if(logs.begin(), logs.end(), [&](Log const& log) { return log.path == path; }),
         logs.end());
-    if (!marks.isEmpty())
-        logs.prepend({path, marks});
+    if (!all.isEmpty())
+        logs.prepend({path, all});
 
     TorkConfigFile file(m_fileName);
     for (int i = 0; i < logs.size() && i < MaximumFiles; ++i) {
@@ -107,7 +129,10 @@ QString MarksFile::SetMarks(QString const& path, QVector<LogMark> const& marks)
                            TorkConfigText::EncodeValue(TextOf(mark)));
     }
     QDir().mkpath(QFileInfo(m_fileName).path());
-    return file.SaveAtomically() ? QString() : file.m_lastError;
+    if (!file.SaveAtomically())
+        return file.m_lastError;
+    m_known[path] = marks;
+    return QString();
 }
 
 } // namespace Velocor

@@ -5,12 +5,15 @@
 
 #include "app/window/log/LogMarkStore.h"
 
+#include <QHash>
+
 namespace Velocor {
 
 /// The marks of log files, in the settings file "marks.cfg" in the data directory.
 ///
-/// The file is read before it is written, so that several windows can share it. A malformed file is
-/// never overwritten. Keys and values: docs/window.md. GUI thread.
+/// The file is read before it is written, so that several programs can share it, and marks that
+/// another one has added to the same log meanwhile are kept. A malformed file is never overwritten.
+/// Keys and values: docs/window.md. GUI thread.
 class MarksFile : public LogMarkStore
 {
 public:
@@ -31,8 +34,11 @@ private:
     };
 
     QVector<Log> read(QString& error) const;
+    QVector<LogMark> withOthers(QString const& path, QVector<LogMark> const& marks,
+                                QVector<Log> const& logs) const;
 
     QString m_fileName;
+    QHash<QString, QVector<LogMark>> m_known; // of a log: what the caller has got or set last
 };
 
 } // namespace Velocor
