@@ -11,6 +11,7 @@
 
 #include <QFile>
 #include <QFileInfo>
+#include <QRegularExpression>
 #include <QTabBar>
 #include <QToolButton>
 
@@ -109,13 +110,16 @@ SettingsEditor* FileTabs::addEditor(QString const& path)
 
 bool FileTabs::IsSettingsFile(QString const& path)
 {
+    // The priority of a line from syslog; no element has such a name.
+    static const QRegularExpression priority(QStringLiteral("^<[0-9]{1,3}>"));
     QFile file(path);
     if (!QFileInfo(path).isFile() || !file.open(QIODevice::ReadOnly))
         return false;
     QByteArray start = file.read(1024);
     if (start.startsWith("\xEF\xBB\xBF"))
         start.remove(0, 3);
-    return start.trimmed().startsWith('<');
+    start = start.trimmed();
+    return start.startsWith('<') && !priority.match(QString::fromLatin1(start)).hasMatch();
 }
 
 int FileTabs::positionOf(QString const& path) const

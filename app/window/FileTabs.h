@@ -29,7 +29,8 @@ public:
 
     /// Shows a file in a new tab, or in its existing tab.
     ///
-    /// A file that begins with "<" is treated as a settings file, any other as a log.
+    /// A file that begins with "<" is treated as a settings file, unless that is the priority of a
+    /// line from syslog, such as "<34>"; any other as a log.
     void OpenFile(QString const& path);
 
     /// Opens a file like OpenFile(), without going to its tab.

@@ -241,6 +241,11 @@ void tst_MainWindow::opensBySettings()
     QVERIFY(isSettings("\xEF\xBB\xBF<a/>"));
     QVERIFY(!isSettings(""));
     QVERIFY(!isSettings("2025-03-03 <a/>"));
+    QVERIFY(!isSettings("<34>Nov 22 14:03:02 host su: text\n"));
+    QVERIFY(!isSettings("<165>1 2026-11-22T14:03:02.003Z host app - ID47 - text\n"));
+    QVERIFY(isSettings("<3"));
+    QVERIFY(isSettings("<>"));
+    QVERIFY(isSettings("<1234></1234>"));
     QVERIFY(!FileTabs::IsSettingsFile(folder.filePath("none")));
 }
 
