@@ -9,6 +9,7 @@
 #include "app/window/widgets/PlainText.h"
 #include "app/window/widgets/SeverityIcons.h"
 
+#include <QAction>
 #include <QFile>
 #include <QFileInfo>
 #include <QRegularExpression>
@@ -32,8 +33,23 @@ FileTabs::FileTabs(LogMarkStore* marks, QWidget* parent) : QTabWidget(parent), m
     tabBar()->setAccessibleName(tr("Open files"));
     m_ownLog = addLog(QString());
     setTabText(0, tr("Log"));
+    addStepAction(tr("Next Tab"), QKeySequence::NextChild, Qt::Key_PageDown, 1);
+    addStepAction(tr("Previous Tab"), QKeySequence::PreviousChild, Qt::Key_PageUp, -1);
     connect(this, &QTabWidget::currentChanged, this, &FileTabs::stateChanged);
     connect(this, &FileTabs::stateChanged, this, &FileTabs::updateTitles);
+}
+
+// QTabWidget has keys, too, but a selection box in a page takes them.
+void FileTabs::addStepAction(QString const& text, QKeySequence::StandardKey keys, Qt::Key key,
+                             int step)
+{
+    auto* action = new QAction(text, this);
+    QList<QKeySequence> shortcuts = QKeySequence::keyBindings(keys);
+    shortcuts.append(QKeySequence(Qt::CTRL | key));
+    action->setShortcuts(shortcuts);
+    connect(action, &QAction::triggered, this,
+            [this, step] { goTo(widget((currentIndex() + step + count()) % count())); });
+    addAction(action);
 }
 
 QString FileTabs::PathOf(QWidget const* page)

@@ -4,6 +4,7 @@
 #pragma once
 
 #include <QFont>
+#include <QKeySequence>
 #include <QString>
 #include <QStringList>
 #include <QTabWidget>
@@ -88,6 +89,7 @@ private:
     void closeTab(int position);
     void goTo(QWidget* page);
     void updateTitles();
+    void addStepAction(QString const& text, QKeySequence::StandardKey keys, Qt::Key key, int step);
     int positionOf(QString const& path) const;
     void addCloseButton(QWidget* page, QString const& name);
 

@@ -15,6 +15,7 @@
 
 #include <QAbstractButton>
 #include <QClipboard>
+#include <QComboBox>
 #include <QDesktopServices>
 #include <QDropEvent>
 #include <QFileDialog>
@@ -79,6 +80,8 @@ private slots:
     void opensNoFolder();
 
     void opensFiles();
+    void goesFromTabToTab_data();
+    void goesFromTabToTab();
     void openDialog();
     void opensBySettings();
     void recentFiles();
@@ -212,6 +215,49 @@ void tst_MainWindow::opensFiles()
     QVERIFY(!Action(*window, "Close Tab")->isEnabled());
     tabs->CloseCurrent();
     QCOMPARE(tabs->count(), 1);
+}
+
+void tst_MainWindow::goesFromTabToTab_data()
+{
+    QTest::addColumn<Qt::Key>("onward");
+    QTest::addColumn<Qt::Key>("back");
+    QTest::newRow("tab") << Qt::Key_Tab << Qt::Key_Backtab;
+    QTest::newRow("page") << Qt::Key_PageDown << Qt::Key_PageUp;
+}
+
+// From any control, and with the keyboard in the page that is shown.
+void tst_MainWindow::goesFromTabToTab()
+{
+    QFETCH(Qt::Key, onward);
+    QFETCH(Qt::Key, back);
+    const WindowTest test(run(100, QTime(9, 0), "x"));
+    for (char const* name : {"a.log", "b.log"})
+        TestFiles::write(test.folder() + name, run(100, QTime(9, 0), "x"));
+    TestFiles::write(test.folder() + "c.cfg", Settings);
+    const auto window = WindowTest::show();
+    auto* tabs = window->findChild<FileTabs*>();
+    for (char const* name : {"a.log", "b.log", "c.cfg"})
+        tabs->OpenFile(test.folder() + name);
+    const auto press = [&](Qt::Key key) {
+        const bool isBacktab = key == Qt::Key_Backtab;
+        QTest::keyClick(QApplication::focusWidget(), key,
+                        Qt::ControlModifier | (isBacktab ? Qt::ShiftModifier : Qt::NoModifier));
+        QVERIFY(tabs->currentWidget()->isAncestorOf(QApplication::focusWidget()));
+    };
+    for (int expected : {0, 1, 2, 3, 0, 1}) {
+        press(onward);
+        QCOMPARE(tabs->currentIndex(), expected);
+        if (tabs->currentLog())
+            QVERIFY(View(*window)->hasFocus());
+    }
+    Child<QComboBox>(tabs->currentWidget(), "Log file")->setFocus();
+    for (int expected : {0, 3, 2}) {
+        press(back);
+        QCOMPARE(tabs->currentIndex(), expected);
+    }
+    Child<QLineEdit>(tabs->currentWidget(), "Filter by text")->setFocus();
+    press(onward);
+    QCOMPARE(tabs->currentIndex(), 3);
 }
 
 void tst_MainWindow::openDialog()
