@@ -89,6 +89,7 @@ private slots:
     void problems();
     void noProblems();
     void problemsStartInView();
+    void selectionStartsAtTheJump();
     void currentLineStays();
     void slowExpression();
     void currentLine();
@@ -683,6 +684,21 @@ void tst_LogInWindow::problemsStartInView()
 }
 
 // Whatever the filter shows and hides, the line that the user looks at stays where it is.
+void tst_LogInWindow::selectionStartsAtTheJump()
+{
+    const WindowTest test(run(200, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 200, Patience);
+    LogView* view = View(*window);
+    QTest::keyClick(view, Qt::Key_Home);
+    QTest::keyClick(window.get(), Qt::Key_F8);
+    const int row = view->currentIndex().row();
+    QVERIFY(row > 2);
+    QTest::keyClick(view, Qt::Key_Up, Qt::ShiftModifier);
+    QTest::keyClick(view, Qt::Key_Up, Qt::ShiftModifier);
+    QCOMPARE(view->SelectedRows(), QList<int>({row - 2, row - 1, row}));
+}
+
 void tst_LogInWindow::currentLineStays()
 {
     QByteArray log;

@@ -214,8 +214,7 @@ void LogView::restoreCurrent()
     if (row < 0 || isOther || currentIndex().isValid())
         return;
     const QModelIndex index = m_model->index(row, firstColumn());
-    selectionModel()->setCurrentIndex(index, QItemSelectionModel::ClearAndSelect |
-                                                 QItemSelectionModel::Rows);
+    select(index);
     if (row + 1 < m_model->rowCount())
         SetFollowing(false);
     updateGeometries(); // updates the scroll bar's range
@@ -281,12 +280,22 @@ LogView::Jump LogView::GoToProblem(int step)
     return jump;
 }
 
+// Makes a row current and selects it, whatever keys are held: Shift would extend the selection.
+// Shift and an arrow key extend it from here then, which only the view's own method sees to.
+void LogView::select(QModelIndex const& index)
+{
+    const SelectionMode mode = selectionMode();
+    setSelectionMode(NoSelection);
+    setCurrentIndex(index);
+    setSelectionMode(mode);
+    selectionModel()->select(index,
+                             QItemSelectionModel::ClearAndSelect | QItemSelectionModel::Rows);
+}
+
 void LogView::GoToRow(int row)
 {
-    // Whatever keys are held: Shift would extend the selection.
     const QModelIndex index = m_model->index(row, firstColumn());
-    selectionModel()->setCurrentIndex(index, QItemSelectionModel::ClearAndSelect |
-                                                 QItemSelectionModel::Rows);
+    select(index);
     scrollTo(index, PositionAtCenter);
     if (row + 1 < m_model->rowCount())
         SetFollowing(false);

@@ -98,6 +98,7 @@ private:
     void noteCurrent();
     void restoreCurrent();
     int firstColumn() const;
+    void select(QModelIndex const& index);
     void setRowHeight();
     void fitTimes();
     void updateHeadings();
