@@ -240,7 +240,7 @@ void tst_ForeignLine::severities_data()
     rows(LogEntry::Fatal, {"EMERG", "PANIC", "ALERT", "CRIT", "CRITICAL", "FATAL"});
     rows(LogEntry::Error, {"ERROR", "ERR", "SEVERE"});
     rows(LogEntry::Warning, {"WARNING", "WARN"});
-    rows(LogEntry::Notification, {"NOTICE", "INFO", "LOG"});
+    rows(LogEntry::Notification, {"NOTICE", "INFO", "LOG", "SUCCESS"});
     rows(LogEntry::Trace, {"DEBUG", "TRACE", "VERBOSE", "FINE", "FINEST"});
     rows(LogEntry::None, {"INFOS", "XERROR", "GET", "ER"});
 }
@@ -268,6 +268,7 @@ void tst_ForeignLine::noEntries_data()
     row("stack trace of Python", "  File \"a.py\", line 12, in f");
     row("indented stamp of more than a blank", "    2026-11-22 14:03:02 x");
     row("everyday word", "Note that this is text");
+    row("hour of more than twelve with PM", "11/22/2026 14:03:02 PM x");
     row("severity in small letters", "error in line 3");
     row("list", "[1] a source");
     row("list of letters", "[x] done");
@@ -312,6 +313,8 @@ void tst_ForeignLine::keys_data()
     row("different formats", "Nov 22 14:03:02 x", "[Sun Nov 22 14:03:03.5 2026] x", 1500);
     row("with the log's own", "2026-11-22 14:03:02.100 x", "2026-11-22T14:03:02.200 x", 100);
     row("seconds since the start", "[    1.250000] x", "[   12.345] x", 11095);
+    row("twelve hours", "11/22/2026 2:03:02 PM x", "2026-11-22 14:03:02 x", 0);
+    row("noon and midnight", "11/22/2026 12:00:00 AM x", "11/22/2026 12:00:00 PM x", day / 2);
     row("compact", "I1122 14:03:02.000000 x", "E20261122 14:03:02.500 x", 500);
 }
 
