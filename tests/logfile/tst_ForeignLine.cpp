@@ -314,7 +314,8 @@ void tst_ForeignLine::keys_data()
     row("with the log's own", "2026-11-22 14:03:02.100 x", "2026-11-22T14:03:02.200 x", 100);
     row("seconds since the start", "[    1.250000] x", "[   12.345] x", 11095);
     row("twelve hours", "11/22/2026 2:03:02 PM x", "2026-11-22 14:03:02 x", 0);
-    row("noon and midnight", "11/22/2026 12:00:00 AM x", "11/22/2026 12:00:00 PM x", day / 2);
+    row("after midnight", "11/22/2026 12:30:00 AM x", "2026-11-22 00:30:00 x", 0);
+    row("after noon", "11/22/2026 12:30:00 PM x", "2026-11-22 12:30:00 x", 0);
     row("compact", "I1122 14:03:02.000000 x", "E20261122 14:03:02.500 x", 500);
 }
 
