@@ -156,6 +156,7 @@ void LogPanel::connectAll()
         if (!message.isEmpty())
             Q_EMIT messageReported(message);
     });
+    connect(m_goTo, &LogGoTo::started, this, &LogPanel::messageReported);
     connect(m_marks, &LogMarks::changed, this, &LogPanel::showMarks);
     m_line->setContextMenuPolicy(Qt::CustomContextMenu);
     connect(m_line, &QWidget::customContextMenuRequested, this, &LogPanel::showLineMenu);
