@@ -437,6 +437,7 @@ void tst_MainWindow::listsShortcuts()
     QVERIFY(actions > 15);
     QVERIFY2(list.contains(QRegularExpression("(?m)^  Ctrl\\+4 +Show Error$")), qPrintable(list));
     QCOMPARE(list.count("Show Error"), 1);
+    QVERIFY2(list.contains(QRegularExpression("(?m)^  Ctrl\\+Tab +Next Tab$")), qPrintable(list));
 }
 
 void tst_MainWindow::opensTheManual()
