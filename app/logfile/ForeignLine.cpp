@@ -131,6 +131,21 @@ qint64 EpochOf(char const* number, int length)
     return milliseconds;
 }
 
+// The length of the escape sequences at the start of a text that set colors, such as "\x1b[1;31m".
+int ColorsLength(char const* text, int length)
+{
+    int colors = 0;
+    for (int at = 0; at + 1 < length && text[at] == '\x1b' && text[at + 1] == '['; at = colors) {
+        at += 2;
+        while (at < length && (IsAsciiDigit(text[at]) || text[at] == ';'))
+            ++at;
+        if (at == length || text[at] != 'm')
+            break;
+        colors = at + 1;
+    }
+    return colors;
+}
+
 // Splits lines that start with a stamp or a severity.
 class Words
 {
@@ -333,10 +348,14 @@ private:
             ++m_at;
     }
 
-    // What stands between a stamp, a severity and a message.
+    // What is between a stamp, a severity and a message.
     void skipSeparators()
     {
         while (m_at < m_length) {
+            const int colors = ColorsLength(m_text + m_at, m_length - m_at);
+            m_at += colors;
+            if (colors > 0)
+                continue;
             const bool isApart = m_at + 1 == m_length || IsBlank(m_text[m_at + 1]);
             const char c = m_text[m_at];
             if (!IsBlank(c) && c != ',' && c != '|' && c != ':' && !(c == '-' && isApart))
@@ -391,7 +410,7 @@ private:
         const int length = at - m_at;
         if (after == ':')
             return LevelNames::Named(m_text + m_at, length);
-        if (!IsBlank(after) && after != '|' && after != ']' && after != ',')
+        if (!IsBlank(after) && after != '|' && after != ']' && after != ',' && after != '\x1b')
             return LogEntry::None;
         const bool anyCase = isFirst && !LevelNames::IsEveryday(m_text + m_at, length);
         return LevelNames::Named(m_text + m_at, length,
@@ -479,6 +498,15 @@ private:
     bool m_hasIds = false;
     ForeignLine m_line;
 };
+
+ForeignLine ReadWords(char const* line, int length, QDate const& latest)
+{
+    const int colors = ColorsLength(line, std::min(length, SearchLimit));
+    ForeignLine result = Words(line + colors, length - colors, latest).read();
+    result.time.start += colors;
+    result.message.start += colors;
+    return result;
+}
 
 // Splits entries whose parts have names.
 class Named
@@ -588,7 +616,7 @@ ForeignLine ForeignLine::Read(char const* line, int length, QDate const& latest)
     else if (IsLogfmt(line, length))
         result = Named(line, length, latest).read(LogfmtFields(line, length));
     else
-        result = Words(line, length, latest).read();
+        result = ReadWords(line, length, latest);
     if (result.isEntry)
         return result;
     ForeignLine none;

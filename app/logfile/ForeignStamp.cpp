@@ -17,7 +17,8 @@ namespace {
 
 // Y, y: year of four or two digits; M, D, h, m, s: two digits; d: day of the month, padded with a
 // blank or not at all; N, W: English name of month or weekday; f: a fraction of the second, if any;
-// z: a time zone, if any; U: seconds since 1970, with a fraction. Anything else is literal.
+// z: a time zone, if any; U: seconds since 1970, with a fraction; o, H: month or hour of one or two
+// digits; p: AM or PM. Anything else is literal.
 constexpr char const* Patterns[] = {
     "Y-M-DTh:m:sfz",   // ISO 8601
     "Y-M-D h:m:sfz",   // most programs
@@ -37,7 +38,9 @@ constexpr char const* Patterns[] = {
     "N d h:m:sf",   // RFC 3164
     "d N Y h:m:sf", // Redis
     "h:m:sf",
-    "U", // journalctl --output=short-unix
+    "o/d/Y H:m:sf p",  // without p, the day might come first
+    "N d, Y H:m:sf p", // java.util.logging
+    "U",               // journalctl --output=short-unix
 };
 
 // Android; also a plain date without a year.
@@ -115,6 +118,12 @@ private:
             return readNumber(2, m_minute);
         case 's':
             return readNumber(2, m_second);
+        case 'o':
+            return readNumber(std::max(1, digits(2)), m_month) && m_month > 0;
+        case 'H':
+            return readNumber(std::max(1, digits(2)), m_hour) && m_hour >= 1 && m_hour <= 12;
+        case 'p':
+            return readHalfOfDay();
         case 'N':
             return readName(Months, m_month);
         case 'W':
@@ -163,6 +172,15 @@ private:
         if (m_at != m_end && *m_at == ' ')
             ++m_at;
         return readNumber(std::max(1, digits(2)), m_day);
+    }
+
+    bool readHalfOfDay()
+    {
+        if (m_end - m_at < 2 || (*m_at != 'A' && *m_at != 'P') || m_at[1] != 'M')
+            return false;
+        m_hour = m_hour % 12 + (*m_at == 'P' ? 12 : 0);
+        m_at += 2;
+        return true;
     }
 
     bool readName(char const* names, int& number)

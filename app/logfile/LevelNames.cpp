@@ -40,6 +40,7 @@ constexpr Level Levels[] = {
     {"INFORMATION", LogEntry::Notification, true},
     {"INFORMATIONAL", LogEntry::Notification, false},
     {"LOG", LogEntry::Notification, true},
+    {"SUCCESS", LogEntry::Notification, true},
     {"CONFIG", LogEntry::Notification, true},
     {"DEBUG", LogEntry::Trace, false},
     {"DEBUG1", LogEntry::Trace, false},

@@ -3,6 +3,7 @@
 
 #include "app/logfile/LogPlace.h"
 
+#include "app/logfile/ForeignStamp.h"
 #include "app/logfile/LogTimeReader.h"
 #include "app/logfile/Milliseconds.h"
 
@@ -93,6 +94,16 @@ LogPlace DateTimeOf(QRegularExpressionMatch const& match)
                  reader.Read(midnight.constData(), midnight.size()).key + time.value);
 }
 
+// A time stamp as another program writes it, copied from its log.
+LogPlace StampIn(QString const& text)
+{
+    const QByteArray bytes = text.toLatin1();
+    const ForeignStamp stamp =
+        ForeignStamp::Read(bytes.constData(), bytes.size(), QDate::currentDate());
+    const bool isAll = stamp.length > 0 && stamp.length == bytes.size();
+    return isAll && stamp.hasDate ? Right(LogPlace::DateTime, stamp.key) : LogPlace();
+}
+
 } // namespace
 
 LogPlace LogPlace::Parse(QString const& text)
@@ -119,6 +130,9 @@ LogPlace LogPlace::Parse(QString const& text)
     match = dateTime.match(typed);
     if (match.hasMatch())
         return DateTimeOf(match);
+    const LogPlace stamp = StampIn(typed);
+    if (stamp.kind != Invalid)
+        return stamp;
     return Wrong(QObject::tr("Neither a line number nor a time."));
 }
 

@@ -14,6 +14,7 @@ namespace Velocor {
 /// | `214` | a line of the file, starting at 1 |
 /// | `14:03`, `14:03:02`, `14:03:02.5` | a time of day |
 /// | `2026-11-20`, `2026-11-20 14:03`, `2026-11-20T14:03:02` | a date, or a date and a time |
+/// | `Nov 20 14:03:02`, `20/Nov/2026:14:03:02 +0100`, ... | a date and a time, see ForeignStamp |
 /// | `+5m`, `-30s`, `+2h`, `+1d`, `-500ms` | an interval from the current entry |
 ///
 /// A plain value.

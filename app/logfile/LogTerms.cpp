@@ -25,8 +25,13 @@ QStringList LogTerms::Split(QString const& typed)
             terms.append(term);
         term.clear();
     };
-    for (const QChar c : typed) {
-        if (c == QLatin1Char('"')) {
+    for (int i = 0; i < typed.size(); ++i) {
+        const QChar c = typed.at(i);
+        const bool isQuote = c == QLatin1Char('"');
+        if (isQuote && isQuoted && i + 1 < typed.size() && typed.at(i + 1) == c) {
+            term += c;
+            ++i;
+        } else if (isQuote) {
             end();
             isQuoted = !isQuoted;
         } else if (c.isSpace() && !isQuoted) {
@@ -42,10 +47,10 @@ QStringList LogTerms::Split(QString const& typed)
 QString LogTerms::Quoted(QString const& term)
 {
     QString text = term;
-    text.replace(QLatin1Char('"'), QLatin1Char(' '));
-    const bool hasBlank =
-        std::any_of(text.begin(), text.end(), [](QChar c) { return c.isSpace(); });
-    return hasBlank ? QLatin1Char('"') + text + QLatin1Char('"') : text;
+    text.replace(QLatin1Char('"'), QLatin1String("\"\""));
+    const bool isPlain = std::none_of(term.begin(), term.end(),
+                                      [](QChar c) { return c.isSpace() || c == QLatin1Char('"'); });
+    return isPlain ? text : QLatin1Char('"') + text + QLatin1Char('"');
 }
 
 bool LogTerms::AreAllIn(QString const& line) const

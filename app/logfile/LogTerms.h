@@ -12,9 +12,10 @@
 namespace Velocor {
 
 /// Several texts to look for in lines, typed in one field: separated by blanks, or in double quotes
-/// if they have blanks themselves.
+/// if they have blanks or quotes themselves, which are then doubled.
 ///
 ///     disk "not found"    two terms: disk, not found
+///     "no ""x"" here"     one term: no "x" here
 ///
 /// A plain value; any thread may use its own copy.
 class LogTerms
@@ -44,8 +45,7 @@ public:
     /// The terms in what a user has typed.
     static QStringList Split(QString const& typed);
 
-    /// What a user would type for one term. Double quotes cannot be typed within a term: they
-    /// become blanks.
+    /// What a user would type for one term that is not empty.
     static QString Quoted(QString const& term);
 
 private:

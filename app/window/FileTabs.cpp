@@ -10,8 +10,10 @@
 #include "app/window/widgets/PlainText.h"
 #include "app/window/widgets/SeverityIcons.h"
 
+#include <QAction>
 #include <QFile>
 #include <QFileInfo>
+#include <QRegularExpression>
 #include <QTabBar>
 #include <QToolButton>
 
@@ -34,8 +36,23 @@ FileTabs::FileTabs(LogMarkStore* marks, QWidget* parent)
     connect(m_highlightRules.get(), &HighlightRules::stopped, this, &FileTabs::messageReported);
     m_ownLog = addLog(QString());
     setTabText(0, tr("Log"));
+    addStepAction(tr("Next Tab"), QKeySequence::NextChild, Qt::Key_PageDown, 1);
+    addStepAction(tr("Previous Tab"), QKeySequence::PreviousChild, Qt::Key_PageUp, -1);
     connect(this, &QTabWidget::currentChanged, this, &FileTabs::stateChanged);
     connect(this, &FileTabs::stateChanged, this, &FileTabs::updateTitles);
+}
+
+// QTabWidget has keys, too, but a selection box in a page takes them.
+void FileTabs::addStepAction(QString const& text, QKeySequence::StandardKey keys, Qt::Key key,
+                             int step)
+{
+    auto* action = new QAction(text, this);
+    QList<QKeySequence> shortcuts = QKeySequence::keyBindings(keys);
+    shortcuts.append(QKeySequence(Qt::CTRL | key));
+    action->setShortcuts(shortcuts);
+    connect(action, &QAction::triggered, this,
+            [this, step] { goTo(widget((currentIndex() + step + count()) % count())); });
+    addAction(action);
 }
 
 QString FileTabs::PathOf(QWidget const* page)
@@ -114,13 +131,16 @@ SettingsEditor* FileTabs::addEditor(QString const& path)
 
 bool FileTabs::IsSettingsFile(QString const& path)
 {
+    // The priority of a line from syslog; no element has such a name.
+    static const QRegularExpression priority(QStringLiteral("^<[0-9]{1,3}>"));
     QFile file(path);
     if (!QFileInfo(path).isFile() || !file.open(QIODevice::ReadOnly))
         return false;
     QByteArray start = file.read(1024);
     if (start.startsWith("\xEF\xBB\xBF"))
         start.remove(0, 3);
-    return start.trimmed().startsWith('<');
+    start = start.trimmed();
+    return start.startsWith('<') && !priority.match(QString::fromLatin1(start)).hasMatch();
 }
 
 int FileTabs::positionOf(QString const& path) const

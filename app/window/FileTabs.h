@@ -4,6 +4,7 @@
 #pragma once
 
 #include <QFont>
+#include <QKeySequence>
 #include <QString>
 #include <QStringList>
 #include <QTabWidget>
@@ -30,7 +31,8 @@ public:
 
     /// Shows a file in a new tab, or in its existing tab.
     ///
-    /// A file that begins with "<" is treated as a settings file, any other as a log.
+    /// A file that begins with "<" is treated as a settings file, unless that is the priority of a
+    /// line from syslog, such as "<34>"; any other as a log.
     void OpenFile(QString const& path);
 
     /// Opens a file like OpenFile(), without going to its tab.
@@ -97,6 +99,7 @@ private:
     void closeTab(int position);
     void goTo(QWidget* page);
     void updateTitles();
+    void addStepAction(QString const& text, QKeySequence::StandardKey keys, Qt::Key key, int step);
     int positionOf(QString const& path) const;
     void addCloseButton(QWidget* page, QString const& name);
 

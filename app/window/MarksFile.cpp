@@ -9,6 +9,7 @@
 
 #include <QDir>
 #include <QFileInfo>
+#include <QSet>
 #include <QStringList>
 
 namespace Velocor {
@@ -102,14 +103,35 @@ MarksFile::Log MarksFile::find(QString const& path) const
 
 QVector<LogMark> MarksFile::Marks(QString const& path)
 {
-    return find(path).marks;
+    QVector<LogMark>& known = m_known[path];
+    known = find(path).marks;
+    return known;
+}
+
+// With the marks in the file that another program has added. Only the line tells: its neighbors and
+// its place change with the log.
+QVector<LogMark> MarksFile::withOthers(QString const& path, QVector<LogMark> const& marks,
+                                       QVector<LogMark> const& inFile) const
+{
+    QSet<QByteArray> mine;
+    for (LogMark const& mark : m_known.value(path) + marks)
+        mine.insert(mark.line);
+    QVector<LogMark> all = marks;
+    for (LogMark const& mark : inFile) {
+        if (!mine.contains(mark.line))
+            all.append(mark);
+    }
+    return all;
 }
 
 QString MarksFile::SetMarks(QString const& path, QVector<LogMark> const& marks)
 {
     Log log = find(path);
-    log.marks = marks;
-    return replace(log);
+    log.marks = withOthers(path, marks, log.marks);
+    const QString error = replace(log);
+    if (error.isEmpty())
+        m_known[path] = marks;
+    return error;
 }
 
 LogEncoding MarksFile::Encoding(QString const& path)

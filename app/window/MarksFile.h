@@ -5,12 +5,15 @@
 
 #include "app/window/log/LogMarkStore.h"
 
+#include <QHash>
+
 namespace Velocor {
 
 /// The marks and encodings of log files, in the settings file "marks.cfg" in the data directory.
 ///
-/// The file is read before it is written, so that several windows can share it. A malformed file is
-/// never overwritten. Keys and values: docs/window.md. GUI thread.
+/// The file is read before it is written, so that several programs can share it, and marks that
+/// another one has added to the same log meanwhile are kept. A malformed file is never overwritten.
+/// Keys and values: docs/window.md. GUI thread.
 class MarksFile : public LogMarkStore
 {
 public:
@@ -36,8 +39,11 @@ private:
     QVector<Log> read(QString& error) const;
     Log find(QString const& path) const;
     QString replace(Log const& log) const;
+    QVector<LogMark> withOthers(QString const& path, QVector<LogMark> const& marks,
+                                QVector<LogMark> const& inFile) const;
 
     QString m_fileName;
+    QHash<QString, QVector<LogMark>> m_known; // of a log: what the caller has got or set last
 };
 
 } // namespace Velocor

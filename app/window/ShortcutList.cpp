@@ -10,6 +10,7 @@
 #include <QMap>
 #include <QMenu>
 #include <QMenuBar>
+#include <QTabWidget>
 
 namespace Velocor {
 
@@ -56,6 +57,15 @@ QString ButtonLines(QMainWindow const* window)
     return lines;
 }
 
+QString TabLines(QMainWindow const* window)
+{
+    QString lines;
+    const QList<QAction*> actions = window->findChild<QTabWidget*>()->actions();
+    for (QAction const* action : actions)
+        lines += KeyLine(action->shortcut(), action->text());
+    return lines;
+}
+
 } // namespace
 
 QString ShortcutList(QMainWindow const* window)
@@ -64,6 +74,8 @@ QString ShortcutList(QMainWindow const* window)
     const QList<QAction*> menus = window->menuBar()->actions();
     for (QAction const* menu : menus)
         list += Heading(menu->text()) + MenuLines(menu->menu()) + QLatin1Char('\n');
+    list += QCoreApplication::translate("ShortcutList", "Tabs\n") + TabLines(window) +
+            QLatin1Char('\n');
     return list + QCoreApplication::translate("ShortcutList", "Buttons\n") + ButtonLines(window);
 }
 

@@ -82,6 +82,12 @@ void tst_ForeignLine::formats_data()
     row("slashes", "2026/11/22 14:03:02 listening", "2026/11/22 14:03:02", none, "listening");
     row("German date", "22.11.2026 14:03:02 WARNUNG x", "22.11.2026 14:03:02", none, "WARNUNG x");
     row("time only", "14:03:02.5 [warn] x", "14:03:02.5", warning, "x");
+    row("twelve hours, after noon", "11/22/2026 02:03:02 PM ERROR x", "11/22/2026 02:03:02 PM",
+        error, "x");
+    row("twelve hours, one digit", "1/2/2026 9:03:02.5 AM - INFO - x", "1/2/2026 9:03:02.5 AM",
+        note, "x");
+    row("java.util.logging", "Nov 22, 2026 2:03:02 PM a.B main", "Nov 22, 2026 2:03:02 PM", none,
+        "a.B main");
     row("time alone", "2026-11-22 14:03:02", "2026-11-22 14:03:02", none, "");
 
     row("stamp and level in brackets", "[2026-11-22 14:03:02.123] [error] x",
@@ -115,6 +121,14 @@ void tst_ForeignLine::formats_data()
         "web:1] 500 GET /");
     row("Android", "11-22 14:03:02.123  1200  1203 E Camera: lost", "11-22 14:03:02.123", error,
         "1200  1203 E Camera: lost");
+    row("colors of a terminal",
+        "\x1b[32m2026-11-22 14:03:02\x1b[0m \x1b[1;31mERROR\x1b[0m disk full",
+        "2026-11-22 14:03:02", error, "disk full");
+    row("a color around all", "\x1b[33m[2026-11-22 14:03:02] [warn] x", "2026-11-22 14:03:02",
+        warning, "x");
+    row("a color around the level", "\x1b[31m[ERROR]\x1b[0m x", "", error, "x");
+    row("colors within the message", "2026-11-22 14:03:02 INFO a \x1b[1mb\x1b[0m",
+        "2026-11-22 14:03:02", note, "a \x1b[1mb\x1b[0m");
     row("Redis", "71:M 22 Nov 2026 14:03:02.123 * Ready", "22 Nov 2026 14:03:02.123", none,
         "71:M 22 Nov 2026 14:03:02.123 * Ready");
     row("MySQL", "2026-11-22T14:03:02.123456Z 0 [Warning] [MY-010068] [Server] x",
@@ -226,7 +240,7 @@ void tst_ForeignLine::severities_data()
     rows(LogEntry::Fatal, {"EMERG", "PANIC", "ALERT", "CRIT", "CRITICAL", "FATAL"});
     rows(LogEntry::Error, {"ERROR", "ERR", "SEVERE"});
     rows(LogEntry::Warning, {"WARNING", "WARN"});
-    rows(LogEntry::Notification, {"NOTICE", "INFO", "LOG"});
+    rows(LogEntry::Notification, {"NOTICE", "INFO", "LOG", "SUCCESS"});
     rows(LogEntry::Trace, {"DEBUG", "TRACE", "VERBOSE", "FINE", "FINEST"});
     rows(LogEntry::None, {"INFOS", "XERROR", "GET", "ER"});
 }
@@ -254,6 +268,7 @@ void tst_ForeignLine::noEntries_data()
     row("stack trace of Python", "  File \"a.py\", line 12, in f");
     row("indented stamp of more than a blank", "    2026-11-22 14:03:02 x");
     row("everyday word", "Note that this is text");
+    row("hour of more than twelve with PM", "11/22/2026 14:03:02 PM x");
     row("severity in small letters", "error in line 3");
     row("list", "[1] a source");
     row("list of letters", "[x] done");
@@ -298,6 +313,9 @@ void tst_ForeignLine::keys_data()
     row("different formats", "Nov 22 14:03:02 x", "[Sun Nov 22 14:03:03.5 2026] x", 1500);
     row("with the log's own", "2026-11-22 14:03:02.100 x", "2026-11-22T14:03:02.200 x", 100);
     row("seconds since the start", "[    1.250000] x", "[   12.345] x", 11095);
+    row("twelve hours", "11/22/2026 2:03:02 PM x", "2026-11-22 14:03:02 x", 0);
+    row("after midnight", "11/22/2026 12:30:00 AM x", "2026-11-22 00:30:00 x", 0);
+    row("after noon", "11/22/2026 12:30:00 PM x", "2026-11-22 12:30:00 x", 0);
     row("compact", "I1122 14:03:02.000000 x", "E20261122 14:03:02.500 x", 500);
 }
 

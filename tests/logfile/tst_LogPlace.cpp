@@ -26,6 +26,7 @@ private slots:
     void places();
     void dates_data();
     void dates();
+    void dateWithoutYear();
     void errors_data();
     void errors();
 };
@@ -84,6 +85,13 @@ void tst_LogPlace::dates_data()
     row("2026-11-20  14:03:02", "2026-11-20 14:03:02.000");
     row("2026-11-20T14:03:02.5", "2026-11-20 14:03:02.500");
     row("2024-02-29 23:59", "2024-02-29 23:59:00.000");
+    // As other programs' logs have them.
+    row("2026/11/20 14:03:02", "2026-11-20 14:03:02.000");
+    row("20.11.2026 14:03:02,5", "2026-11-20 14:03:02.500");
+    row("20/Nov/2026:14:03:02 +0100", "2026-11-20 14:03:02.000");
+    row("2026-11-20T14:03:02.5Z", "2026-11-20 14:03:02.500");
+    row("Fri Nov 20 14:03:02.123456 2026", "2026-11-20 14:03:02.123");
+    row("Nov 20, 2026 2:03:02 PM", "2026-11-20 14:03:02.000");
 }
 
 // The same instant as in an entry of the log.
@@ -95,6 +103,23 @@ void tst_LogPlace::dates()
     const LogPlace place = LogPlace::Parse(text);
     QCOMPARE(int(place.kind), int(LogPlace::DateTime));
     QCOMPARE(place.value, reader.Read(stamp.constData(), stamp.size()).key);
+}
+
+// The latest such day; a few days ahead, since the newest entries may be newer than the clock.
+void tst_LogPlace::dateWithoutYear()
+{
+    const LogTimeReader reader("yyyy-MM-dd hh:mm:ss");
+    const QLocale english(QLocale::C);
+    const QDate today = QDate::currentDate();
+    for (int days : {0, 1, 100, 300}) {
+        const QDate day = today.addDays(-days);
+        if (day.day() == 29 && day.month() == 2)
+            continue; // the year before may have no such day
+        const LogPlace place = LogPlace::Parse(english.toString(day, "MMM dd 14:03:02"));
+        const QByteArray stamp = day.toString("yyyy-MM-dd 14:03:02").toLatin1();
+        QCOMPARE(int(place.kind), int(LogPlace::DateTime));
+        QCOMPARE(place.value, reader.Read(stamp.constData(), stamp.size()).key);
+    }
 }
 
 void tst_LogPlace::errors_data()
@@ -115,7 +140,8 @@ void tst_LogPlace::errors_data()
     row("+5", "Add a unit: +5s, +5m, +5h or +5d.");
     row("+1234567890s", "The interval is too long.");
     for (char const* text : {"x", "14:", "14:3", "14:03:", "14:03:02.", "+", "+5y", "5m", "1,000",
-                             "2026-11-20 x", "2026-11-2", "-", "14:03\n15:04", "\xD9\xA1"})
+                             "2026-11-20 x", "2026-11-2", "-", "Nov 20 14:03:02 x", "Nov 20",
+                             "2026-11-32T14:03:02Z", "14:03\n15:04", "\xD9\xA1"})
         row(text, "Neither a line number nor a time.");
 }
 

@@ -42,6 +42,9 @@ void tst_LogTerms::split_data()
     QTest::newRow("open quote") << "a \"b c" << QStringList({"a", "b c"});
     QTest::newRow("empty quotes") << "a \"\" b" << QStringList({"a", "b"});
     QTest::newRow("quote within a word") << "a\"b c\"d" << QStringList({"a", "b c", "d"});
+    QTest::newRow("doubled quote within quotes")
+        << "\"a \"\"b\"\" c\" d" << QStringList({"a \"b\" c", "d"});
+    QTest::newRow("only a quote") << "\"\"\"\"" << QStringList({"\""});
     QTest::newRow("minus is no sign") << "-5" << QStringList({"-5"});
 }
 
@@ -61,7 +64,9 @@ void tst_LogTerms::quoted_data()
     QTest::newRow("words") << "disk full"
                            << "\"disk full\"";
     QTest::newRow("quotes") << "a\"b"
-                            << "\"a b\"";
+                            << "\"a\"\"b\"";
+    QTest::newRow("quotes at both ends") << "\"a b\""
+                                         << "\"\"\"a b\"\"\"";
     QTest::newRow("tab") << "a\tb"
                          << "\"a\tb\"";
 }
@@ -71,7 +76,7 @@ void tst_LogTerms::quoted()
     QFETCH(QString, term);
     QFETCH(QString, typed);
     QCOMPARE(LogTerms::Quoted(term), typed);
-    QCOMPARE(LogTerms::Split(typed).size(), 1);
+    QCOMPARE(LogTerms::Split(typed), QStringList(term));
 }
 
 void tst_LogTerms::matches()

@@ -92,6 +92,7 @@ private slots:
     void context();
     void contextIsDimmed();
     void clears();
+    void escapeGoesToTheTable();
     void filterByThis();
     void hideThis();
     void severityOfTheMenu();
@@ -241,6 +242,24 @@ void tst_FilterInWindow::clears()
     QCOMPARE(Child<QComboBox>(window.get(), "Least severity")->currentIndex(), 0);
     QCOMPARE(Child<QComboBox>(window.get(), "Lines of context")->currentIndex(), 0);
     QCOMPARE(Child<QToolButton>(window.get(), "More filters")->text(), QString("More"));
+}
+
+void tst_FilterInWindow::escapeGoesToTheTable()
+{
+    const WindowTest test(Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    Type(*window, "red");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    QTest::keyClick(Field(*window), Qt::Key_Escape);
+    QVERIFY(View(*window)->hasFocus());
+    QCOMPARE(Field(*window)->text(), QString("red"));
+    Click(Child<QToolButton>(window.get(), "More filters"));
+    for (char const* name : {"Terms that lines also contain", "Terms of lines to hide"}) {
+        Field(*window, name)->setFocus();
+        QTest::keyClick(Field(*window, name), Qt::Key_Escape);
+        QVERIFY2(View(*window)->hasFocus(), name);
+    }
 }
 
 void tst_FilterInWindow::filterByThis()

@@ -8,6 +8,7 @@
 
 #include "app/window/log/GoToDialog.h"
 #include "app/window/log/LogFindBar.h"
+#include "app/window/log/LogGoTo.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogSearch.h"
 #include "app/window/log/LogView.h"
@@ -93,6 +94,7 @@ private slots:
     void jumpsWhenFound();
     void goesToALine();
     void goesToATime();
+    void saysThatItLooksForATime();
     void goToSaysWhatIsWrong();
 };
 
@@ -445,6 +447,23 @@ void tst_FindInWindow::goesToATime()
     GoTo(*window, "10:00");
     QTRY_COMPARE_WITH_TIMEOUT(view->currentIndex().row(), 299, Patience);
     QCOMPARE(Status(*window), QString("The lines shown end before that"));
+}
+
+// The times of many rows are read from the file.
+void tst_FindInWindow::saysThatItLooksForATime()
+{
+    const WindowTest test(run(LogGoTo::ManyRows, QTime(0, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), int(LogGoTo::ManyRows), Patience);
+    QStringList messages;
+    connect(Panel(*window), &LogPanel::messageReported, this,
+            [&](QString const& message) { messages.append(message); });
+    GoTo(*window, "0:01");
+    QTRY_COMPARE_WITH_TIMEOUT(View(*window)->currentIndex().row(), 60, Patience);
+    QCOMPARE(messages, QStringList({"Looking for that time...", "Found"}));
+    GoTo(*window, "90");
+    QTRY_COMPARE_WITH_TIMEOUT(View(*window)->currentIndex().row(), 89, Patience);
+    QCOMPARE(messages.size(), 2);
 }
 
 void tst_FindInWindow::goToSaysWhatIsWrong()

@@ -80,6 +80,11 @@ private slots:
     void problems();
     void noProblems();
     void problemsStartInView();
+    void firstKey_data();
+    void firstKey();
+    void firstKeyInTheMiddle();
+    void homeAndEnd();
+    void selectionStartsAtTheJump();
     void currentLineStays();
     void slowExpression();
     void currentLine();
@@ -654,6 +659,96 @@ void tst_LogInWindow::problemsStartInView()
 }
 
 // Whatever the filter shows and hides, the line that the user looks at stays where it is.
+void tst_LogInWindow::firstKey_data()
+{
+    QTest::addColumn<Qt::Key>("key");
+    QTest::addColumn<int>("least");
+    QTest::addColumn<int>("most");
+    QTest::newRow("up") << Qt::Key_Up << 499 << 499;
+    QTest::newRow("down") << Qt::Key_Down << 499 << 499;
+    QTest::newRow("page up") << Qt::Key_PageUp << 400 << 498;
+    QTest::newRow("page down") << Qt::Key_PageDown << 499 << 499;
+    QTest::newRow("home") << Qt::Key_Home << 0 << 0;
+    QTest::newRow("end") << Qt::Key_End << 499 << 499;
+}
+
+// Nothing is selected, and the newest line is in view: a key starts from there.
+void tst_LogInWindow::firstKey()
+{
+    QFETCH(Qt::Key, key);
+    QFETCH(int, least);
+    QFETCH(int, most);
+    const WindowTest test(run(500, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 500, Patience);
+    LogView* view = View(*window);
+    QVERIFY(view->hasFocus());
+    QVERIFY(!view->currentIndex().isValid());
+    QTest::keyClick(view, key);
+    const int row = view->currentIndex().row();
+    QVERIFY2(row >= least && row <= most, qPrintable(QString::number(row)));
+    QCOMPARE(view->selectionModel()->selectedRows().size(), 1);
+    QVERIFY(view->viewport()->rect().contains(RowCentre(view, row)));
+}
+
+void tst_LogInWindow::firstKeyInTheMiddle()
+{
+    const WindowTest test(run(500, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 500, Patience);
+    LogView* view = View(*window);
+    view->verticalScrollBar()->setValue(200);
+    QTest::keyClick(view, Qt::Key_Down);
+    QCOMPARE(view->currentIndex().row(), 200);
+    view->selectionModel()->clear();
+    view->verticalScrollBar()->setValue(200);
+    QTest::keyClick(view, Qt::Key_Up);
+    const int last = view->currentIndex().row();
+    QVERIFY(last > 203 && last < 300);
+    QVERIFY(view->visualRect(view->currentIndex()).bottom() < view->viewport()->height());
+}
+
+void tst_LogInWindow::homeAndEnd()
+{
+    const WindowTest test(
+        writtenOver(run(90, QTime(17, 0), "older", true), run(40, QTime(9, 0), "newer")));
+    const auto window = WindowTest::show();
+    QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) > 40, Patience);
+    LogView* view = View(*window);
+    const int last = Rows(*window) - 1;
+    view->GoToRow(50);
+    const auto selected = [&] {
+        QList<int> rows = view->SelectedRows();
+        return rows.size() == 1 ? rows.first() : -1;
+    };
+    for (Qt::KeyboardModifiers held : {Qt::NoModifier, Qt::ControlModifier}) {
+        QTest::keyClick(view, Qt::Key_End, held);
+        QCOMPARE(view->currentIndex().row(), last);
+        QCOMPARE(selected(), last);
+        QTest::keyClick(view, Qt::Key_Home, held);
+        QCOMPARE(view->currentIndex().row(), 1); // below the heading
+        QCOMPARE(selected(), 1);
+    }
+    view->GoToRow(last - 4);
+    QTest::keyClick(view, Qt::Key_End, Qt::ShiftModifier);
+    QCOMPARE(view->SelectedRows().size(), 5);
+}
+
+void tst_LogInWindow::selectionStartsAtTheJump()
+{
+    const WindowTest test(run(200, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 200, Patience);
+    LogView* view = View(*window);
+    QTest::keyClick(view, Qt::Key_Home);
+    QTest::keyClick(window.get(), Qt::Key_F8);
+    const int row = view->currentIndex().row();
+    QVERIFY(row > 2);
+    QTest::keyClick(view, Qt::Key_Up, Qt::ShiftModifier);
+    QTest::keyClick(view, Qt::Key_Up, Qt::ShiftModifier);
+    QCOMPARE(view->SelectedRows(), QList<int>({row - 2, row - 1, row}));
+}
+
 void tst_LogInWindow::currentLineStays()
 {
     QByteArray log;

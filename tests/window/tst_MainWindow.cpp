@@ -16,6 +16,7 @@
 
 #include <QAbstractButton>
 #include <QClipboard>
+#include <QComboBox>
 #include <QDesktopServices>
 #include <QDropEvent>
 #include <QFileDialog>
@@ -75,6 +76,8 @@ private slots:
     void opensNoFolder();
 
     void opensFiles();
+    void goesFromTabToTab_data();
+    void goesFromTabToTab();
     void openDialog();
     void opensBySettings();
     void recentFiles();
@@ -195,6 +198,49 @@ void tst_MainWindow::opensFiles()
     QCOMPARE(tabs->count(), 1);
 }
 
+void tst_MainWindow::goesFromTabToTab_data()
+{
+    QTest::addColumn<Qt::Key>("onward");
+    QTest::addColumn<Qt::Key>("back");
+    QTest::newRow("tab") << Qt::Key_Tab << Qt::Key_Backtab;
+    QTest::newRow("page") << Qt::Key_PageDown << Qt::Key_PageUp;
+}
+
+// From any control, and with the keyboard in the page that is shown.
+void tst_MainWindow::goesFromTabToTab()
+{
+    QFETCH(Qt::Key, onward);
+    QFETCH(Qt::Key, back);
+    const WindowTest test(run(100, QTime(9, 0), "x"));
+    for (char const* name : {"a.log", "b.log"})
+        TestFiles::write(test.folder() + name, run(100, QTime(9, 0), "x"));
+    TestFiles::write(test.folder() + "c.cfg", Settings);
+    const auto window = WindowTest::show();
+    auto* tabs = window->findChild<FileTabs*>();
+    for (char const* name : {"a.log", "b.log", "c.cfg"})
+        tabs->OpenFile(test.folder() + name);
+    const auto press = [&](Qt::Key key) {
+        const bool isBacktab = key == Qt::Key_Backtab;
+        QTest::keyClick(QApplication::focusWidget(), key,
+                        Qt::ControlModifier | (isBacktab ? Qt::ShiftModifier : Qt::NoModifier));
+        QVERIFY(tabs->currentWidget()->isAncestorOf(QApplication::focusWidget()));
+    };
+    for (int expected : {0, 1, 2, 3, 0, 1}) {
+        press(onward);
+        QCOMPARE(tabs->currentIndex(), expected);
+        if (tabs->currentLog())
+            QVERIFY(View(*window)->hasFocus());
+    }
+    Child<QComboBox>(tabs->currentWidget(), "Log file")->setFocus();
+    for (int expected : {0, 3, 2}) {
+        press(back);
+        QCOMPARE(tabs->currentIndex(), expected);
+    }
+    Child<QLineEdit>(tabs->currentWidget(), "Filter by text")->setFocus();
+    press(onward);
+    QCOMPARE(tabs->currentIndex(), 3);
+}
+
 void tst_MainWindow::openDialog()
 {
     const WindowTest test;
@@ -222,6 +268,11 @@ void tst_MainWindow::opensBySettings()
     QVERIFY(isSettings("\xEF\xBB\xBF<a/>"));
     QVERIFY(!isSettings(""));
     QVERIFY(!isSettings("2025-03-03 <a/>"));
+    QVERIFY(!isSettings("<34>Nov 22 14:03:02 host su: text\n"));
+    QVERIFY(!isSettings("<165>1 2026-11-22T14:03:02.003Z host app - ID47 - text\n"));
+    QVERIFY(isSettings("<3"));
+    QVERIFY(isSettings("<>"));
+    QVERIFY(isSettings("<1234></1234>"));
     QVERIFY(!FileTabs::IsSettingsFile(folder.filePath("none")));
 }
 
@@ -367,6 +418,7 @@ void tst_MainWindow::listsShortcuts()
     QVERIFY(actions > 15);
     QVERIFY2(list.contains(QRegularExpression("(?m)^  Ctrl\\+4 +Show Error$")), qPrintable(list));
     QCOMPARE(list.count("Show Error"), 1);
+    QVERIFY2(list.contains(QRegularExpression("(?m)^  Ctrl\\+Tab +Next Tab$")), qPrintable(list));
 }
 
 void tst_MainWindow::opensTheManual()

@@ -82,6 +82,7 @@ private slots:
     void contextMenu();
     void selectionInTheLineStays();
     void fileIsBounded();
+    void twoWindows();
     void damagedFile();
     void hostileNotes();
     void encodings();
@@ -310,6 +311,42 @@ void tst_MarksInWindow::fileIsBounded()
     QVector<LogMark> many(LogMark::MaximumMarks + 1, mark);
     QCOMPARE(file.SetMarks("/many", many), QString());
     QCOMPARE(file.Marks("/many").size(), int(LogMark::MaximumMarks));
+}
+
+// Both have the same log open; what one adds is not lost when the other saves.
+void tst_MarksInWindow::twoWindows()
+{
+    const WindowTest test;
+    const auto mark = [](QByteArray const& line, QString const& note) {
+        LogMark made;
+        made.line = line;
+        made.note = note;
+        return made;
+    };
+    const auto saved = [&] {
+        QStringList lines;
+        const QVector<LogMark> marks = MarksFile(test.folder()).Marks("/log");
+        for (LogMark const& one : marks)
+            lines.append(QString::fromLatin1(one.line) + '=' + one.note);
+        lines.sort();
+        return lines.join(' ');
+    };
+    const LogMark common = mark("1:c", "common");
+    MarksFile first(test.folder());
+    QCOMPARE(first.SetMarks("/log", {common}), QString());
+    MarksFile second(test.folder());
+    QCOMPARE(second.Marks("/log").size(), 1);
+    QCOMPARE(first.SetMarks("/log", {common, mark("1:a", "first")}), QString());
+    QCOMPARE(second.SetMarks("/log", {common, mark("1:b", "second")}), QString());
+    QCOMPARE(saved(), QString("1:a=first 1:b=second 1:c=common"));
+    // Once more, with marks that came from the other one.
+    QCOMPARE(second.SetMarks("/log", {mark("1:b", "changed")}), QString());
+    QCOMPARE(saved(), QString("1:a=first 1:b=changed"));
+    QCOMPARE(first.SetMarks("/log", {}), QString());
+    QCOMPARE(saved(), QString("1:b=changed"));
+    // Both mark the same line.
+    QCOMPARE(first.SetMarks("/log", {mark("1:b", "mine")}), QString());
+    QCOMPARE(saved(), QString("1:b=mine"));
 }
 
 void tst_MarksInWindow::damagedFile()

@@ -236,6 +236,15 @@ bool LogFilterBar::eventFilter(QObject* watched, QEvent* event)
     return QWidget::eventFilter(watched, event);
 }
 
+// Otherwise the way from the text to the lines would lead through all other controls.
+void LogFilterBar::keyPressEvent(QKeyEvent* event)
+{
+    if (event->key() == Qt::Key_Escape && parentWidget())
+        parentWidget()->setFocus(); // passed on to the table
+    else
+        QWidget::keyPressEvent(event);
+}
+
 QCheckBox* LogFilterBar::makeOption(QString const& text, QString const& name,
                                     QString const& toolTip)
 {

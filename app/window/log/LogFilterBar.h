@@ -69,6 +69,7 @@ Q_SIGNALS:
     void filterChanged();
 
 protected:
+    void keyPressEvent(QKeyEvent* event) override;
     bool eventFilter(QObject* watched, QEvent* event) override;
 
 private:

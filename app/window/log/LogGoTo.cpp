@@ -62,6 +62,9 @@ void LogGoTo::Find(LogPlace const& place, int currentRow)
     request.place = place;
     request.rows = m_model->state().rows;
     request.currentRow = currentRow;
+    m_isLong = place.kind != LogPlace::Line && m_model->rowCount() >= ManyRows;
+    if (m_isLong)
+        Q_EMIT started(tr("Looking for that time..."));
     m_locator->SetCurrentRequest(m_number);
     Q_EMIT locateRequested(request);
 }
@@ -74,7 +77,10 @@ void LogGoTo::take(LogLocation const& location)
     int row = location.row;
     if (row >= 0 && (row >= m_model->rowCount() || m_model->LineStart(row) != location.start))
         row = m_model->RowNear(location.start);
-    Q_EMIT arrived(row, MessageOf(location.answer));
+    QString message = MessageOf(location.answer);
+    if (message.isEmpty() && m_isLong)
+        message = tr("Found"); // instead of what is said at the start
+    Q_EMIT arrived(row, message);
 }
 
 } // namespace Velocor

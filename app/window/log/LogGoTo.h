@@ -27,11 +27,18 @@ public:
     /// @param currentRow  -1 if there is none
     void Find(LogPlace const& place, int currentRow);
 
+    /// From how many rows on a time is announced as being looked for: the times are read from the
+    /// file.
+    static constexpr int ManyRows = 100000;
+
 Q_SIGNALS:
     /// The row of the place; -1 if there is none.
     ///
     /// @param message  what the user should know; may be empty
     void arrived(int row, QString const& message);
+
+    /// It may take a while.
+    void started(QString const& message);
 
     // To the locator's thread.
     void locateRequested(Velocor::LogLocateRequest const& request);
@@ -44,6 +51,7 @@ private:
     QThread m_thread;
     LogLocator* m_locator = nullptr;
     int m_number = 0;
+    bool m_isLong = false;
 };
 
 } // namespace Velocor

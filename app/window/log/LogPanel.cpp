@@ -105,6 +105,7 @@ void LogPanel::connectParts()
         if (!message.isEmpty())
             Q_EMIT messageReported(message);
     });
+    connect(m_goTo, &LogGoTo::started, this, &LogPanel::messageReported);
 }
 
 void LogPanel::connectView()

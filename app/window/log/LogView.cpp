@@ -108,6 +108,54 @@ void LogView::focusInEvent(QFocusEvent* event)
         selectionModel()->clearCurrentIndex();
 }
 
+// With Ctrl, Qt makes the row current without selecting it, so that another one would be copied.
+void LogView::keyPressEvent(QKeyEvent* event)
+{
+    const bool isEnd = event->key() == Qt::Key_Home || event->key() == Qt::Key_End;
+    if (!isEnd || !(event->modifiers() & Qt::ControlModifier)) {
+        QTableView::keyPressEvent(event);
+        return;
+    }
+    QKeyEvent plain(event->type(), event->key(), event->modifiers() & ~Qt::ControlModifier);
+    QTableView::keyPressEvent(&plain);
+    event->setAccepted(plain.isAccepted());
+}
+
+// Home and End go to the first and the last row, not to the ends of a row. While no row is current,
+// Qt starts at the first one, however far away that is; the user looks at others.
+QModelIndex LogView::moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers)
+{
+    const int count = m_model->rowCount();
+    if (count > 0 && action == MoveHome) {
+        const QModelIndex first = m_model->index(0, firstColumn());
+        const bool isHeading = !(m_model->flags(first) & Qt::ItemIsSelectable);
+        return isHeading && count > 1 ? first.sibling(1, firstColumn()) : first;
+    }
+    if (count > 0 && action == MoveEnd)
+        return m_model->index(count - 1, firstColumn());
+    if (count == 0 || currentIndex().isValid())
+        return QTableView::moveCursor(action, modifiers);
+    const bool isDownward = action == MoveDown || action == MoveNext || action == MovePageDown;
+    const int row = isDownward && !m_following ? rowAt(0) : lastRowInView();
+    const QModelIndex start = m_model->index(row, firstColumn());
+    if (action != MovePageUp && action != MovePageDown)
+        return start;
+    selectionModel()->setCurrentIndex(start, QItemSelectionModel::NoUpdate);
+    const QModelIndex target = QTableView::moveCursor(action, modifiers);
+    selectionModel()->clearCurrentIndex(); // or Qt would not select the start
+    return target;
+}
+
+// The last row that is in view as a whole.
+int LogView::lastRowInView() const
+{
+    const int row = rowAt(viewport()->height() - 1);
+    if (row < 0)
+        return m_model->rowCount() - 1;
+    const int bottom = rowViewportPosition(row) + rowHeight(row);
+    return bottom > viewport()->height() && row > rowAt(0) ? row - 1 : row;
+}
+
 // The key opens the menu at the current row, not in the middle of the table.
 void LogView::contextMenuEvent(QContextMenuEvent* event)
 {
@@ -222,8 +270,7 @@ void LogView::restoreCurrent()
     if (row < 0 || isOther || currentIndex().isValid())
         return;
     const QModelIndex index = m_model->index(row, firstColumn());
-    selectionModel()->setCurrentIndex(index, QItemSelectionModel::ClearAndSelect |
-                                                 QItemSelectionModel::Rows);
+    select(index);
     if (row + 1 < m_model->rowCount())
         SetFollowing(false);
     updateGeometries(); // updates the scroll bar's range
@@ -284,12 +331,22 @@ LogView::Jump LogView::GoToProblem(int step)
     return jump;
 }
 
+// Makes a row current and selects it, whatever keys are held: Shift would extend the selection.
+// Shift and an arrow key extend it from here then, which only the view's own method sees to.
+void LogView::select(QModelIndex const& index)
+{
+    const SelectionMode mode = selectionMode();
+    setSelectionMode(NoSelection);
+    setCurrentIndex(index);
+    setSelectionMode(mode);
+    selectionModel()->select(index,
+                             QItemSelectionModel::ClearAndSelect | QItemSelectionModel::Rows);
+}
+
 void LogView::GoToRow(int row)
 {
-    // Whatever keys are held: Shift would extend the selection.
     const QModelIndex index = m_model->index(row, firstColumn());
-    selectionModel()->setCurrentIndex(index, QItemSelectionModel::ClearAndSelect |
-                                                 QItemSelectionModel::Rows);
+    select(index);
     scrollTo(index, PositionAtCenter);
     if (row + 1 < m_model->rowCount())
         SetFollowing(false);

@@ -93,6 +93,8 @@ protected:
     void changeEvent(QEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
     void focusInEvent(QFocusEvent* event) override;
+    void keyPressEvent(QKeyEvent* event) override;
+    QModelIndex moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) override;
     void rowsInserted(QModelIndex const& parent, int first, int last) override;
     void rowsAboutToBeRemoved(QModelIndex const& parent, int first, int last) override;
 
@@ -105,6 +107,8 @@ private:
     void noteCurrent();
     void restoreCurrent();
     int firstColumn() const;
+    int lastRowInView() const;
+    void select(QModelIndex const& index);
     void setRowHeight();
     void fitTimes();
 
