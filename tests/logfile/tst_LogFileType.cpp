@@ -43,9 +43,9 @@ Indexed IndexOf(QByteArray const& file, int piece)
     index.End();
     Indexed result{{}, index.Rows(LogFilter()), index.hasTimes(), index.hasSeverities()};
     for (size_t row = 0; row < result.marks.size(); ++row) {
-        const int start = static_cast<int>(result.marks.starts[row]);
+        const int start = static_cast<int>(result.marks.start(row));
         const bool isLast = row + 1 == result.marks.size();
-        const int end = isLast ? file.size() : static_cast<int>(result.marks.starts[row + 1]);
+        const int end = isLast ? file.size() : static_cast<int>(result.marks.start(row + 1));
         result.rows += parser.Text(file.mid(start, end - start));
     }
     return result;
@@ -188,10 +188,10 @@ void tst_LogFileType::oneRun()
 {
     QFETCH(QByteArray, file);
     const Indexed index = IndexOf(file, 4096);
-    QCOMPARE(index.marks.earlier, size_t(0));
+    QCOMPARE(index.marks.earlier(), size_t(0));
     QCOMPARE(index.marks.size(), size_t(3));
-    QVERIFY(index.marks.marks[0] & LogRows::Timed);
-    QVERIFY(index.marks.marks[1] & LogRows::Continued);
+    QVERIFY(index.marks.mark(0) & LogRows::Timed);
+    QVERIFY(index.marks.mark(1) & LogRows::Continued);
 }
 
 void tst_LogFileType::everyLine_data()
