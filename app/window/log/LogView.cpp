@@ -113,11 +113,11 @@ void LogView::keyPressEvent(QKeyEvent* event)
 {
     const bool isEnd = event->key() == Qt::Key_Home || event->key() == Qt::Key_End;
     if (!isEnd || !(event->modifiers() & Qt::ControlModifier)) {
-        QTableView::keyPressEvent(event);
+        WrappingTable::keyPressEvent(event);
         return;
     }
     QKeyEvent plain(event->type(), event->key(), event->modifiers() & ~Qt::ControlModifier);
-    QTableView::keyPressEvent(&plain);
+    WrappingTable::keyPressEvent(&plain);
     event->setAccepted(plain.isAccepted());
 }
 
@@ -134,14 +134,14 @@ QModelIndex LogView::moveCursor(CursorAction action, Qt::KeyboardModifiers modif
     if (count > 0 && action == MoveEnd)
         return m_model->index(count - 1, firstColumn());
     if (count == 0 || currentIndex().isValid())
-        return QTableView::moveCursor(action, modifiers);
+        return WrappingTable::moveCursor(action, modifiers);
     const bool isDownward = action == MoveDown || action == MoveNext || action == MovePageDown;
     const int row = isDownward && !m_following ? rowAt(0) : lastRowInView();
     const QModelIndex start = m_model->index(row, firstColumn());
     if (action != MovePageUp && action != MovePageDown)
         return start;
     selectionModel()->setCurrentIndex(start, QItemSelectionModel::NoUpdate);
-    const QModelIndex target = QTableView::moveCursor(action, modifiers);
+    const QModelIndex target = WrappingTable::moveCursor(action, modifiers);
     selectionModel()->clearCurrentIndex(); // or Qt would not select the start
     return target;
 }
@@ -152,8 +152,8 @@ int LogView::lastRowInView() const
     const int row = rowAt(viewport()->height() - 1);
     if (row < 0)
         return m_model->rowCount() - 1;
-    const int bottom = rowViewportPosition(row) + rowHeight(row);
-    return bottom > viewport()->height() && row > rowAt(0) ? row - 1 : row;
+    const int bottom = visualRect(m_model->index(row, firstColumn())).bottom();
+    return bottom >= viewport()->height() && row > rowAt(0) ? row - 1 : row;
 }
 
 // The key opens the menu at the current row, not in the middle of the table.
