@@ -105,7 +105,9 @@ private:
     Block const& block(size_t line) const
     {
         const size_t position = line / BlockSize;
-        return position < m_full.size() ? m_full.at(position) : m_last;
+        if (position < m_full.size())
+            return m_full.at(position);
+        return m_last;
     }
 
     SharedBlocks<Block> m_full;

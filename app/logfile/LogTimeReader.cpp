@@ -282,7 +282,7 @@ LogTimeReader::Stamp LogTimeReader::Read(char const* text, int length, Beginning
     return stamp;
 }
 
-qint64 LogTimeReader::keyOf(Values const& values) const
+qint64 LogTimeReader::keyOf(Values const& values)
 {
     int const* number = values.number;
     qint64 key = DayNumber(number[Year] + number[ShortYear], number[Month], number[Day]);

@@ -80,7 +80,7 @@ private:
     void addNumber(Field field, int minimum, int maximum);
     int addQuoted(QString const& format, int position);
     size_t secondsToken() const;
-    qint64 keyOf(Values const& values) const;
+    static qint64 keyOf(Values const& values);
     bool readToken(Token const& token, char const*& at, char const* end, Values& values) const;
     bool readNumber(Token const& token, char const*& at, char const* end, Values& values) const;
     bool readMonth(char const*& at, char const* end, Values& values) const;

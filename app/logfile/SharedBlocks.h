@@ -16,8 +16,12 @@ namespace Velocor {
 template <class Block>
 class SharedBlocks
 {
+    using Pointers = std::vector<std::shared_ptr<Block const>>;
+
 public:
+    // cppcheck-suppress functionStatic ; it overlooks that m_blocks is read
     size_t size() const { return m_blocks ? m_blocks->size() : 0; }
+    // cppcheck-suppress functionStatic ; it overlooks that m_blocks is read
     Block const& at(size_t position) const { return *(*m_blocks)[position]; }
 
     /// Copies of the sequence do not change.
@@ -55,8 +59,7 @@ public:
     }
 
 private:
-    using Pointers = std::vector<std::shared_ptr<Block const>>;
-
+    // cppcheck-suppress functionStatic ; it overlooks that m_blocks is read
     Pointers firstOnes(size_t count, size_t more) const
     {
         Pointers blocks;

@@ -25,7 +25,7 @@ class UniformTable : public QTableView
 public:
     explicit UniformTable(QWidget* parent = nullptr);
 
-    void setModel(QAbstractItemModel* model) override;
+    void setModel(QAbstractItemModel* newModel) override;
 
     /// Sets the height of all rows, in pixels.
     void SetRowHeight(int height);
