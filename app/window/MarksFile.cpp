@@ -114,7 +114,8 @@ QVector<LogMark> MarksFile::withOthers(QString const& path, QVector<LogMark> con
                                        QVector<LogMark> const& inFile) const
 {
     QSet<QByteArray> mine;
-    for (LogMark const& mark : m_known.value(path) + marks)
+    const QVector<LogMark> known = m_known.value(path) + marks;
+    for (LogMark const& mark : known)
         mine.insert(mark.line);
     QVector<LogMark> all = marks;
     for (LogMark const& mark : inFile) {
