@@ -36,19 +36,20 @@ FileTabs::FileTabs(LogMarkStore* marks, QWidget* parent)
     connect(m_highlightRules.get(), &HighlightRules::stopped, this, &FileTabs::messageReported);
     m_ownLog = addLog(QString());
     setTabText(0, tr("Log"));
-    addStepAction(tr("Next Tab"), QKeySequence::NextChild, Qt::Key_PageDown, 1);
-    addStepAction(tr("Previous Tab"), QKeySequence::PreviousChild, Qt::Key_PageUp, -1);
+    addStepAction(tr("Next Tab"), QKeySequence::NextChild, QKeySequence(tr("Ctrl+PgDown")), 1);
+    addStepAction(tr("Previous Tab"), QKeySequence::PreviousChild, QKeySequence(tr("Ctrl+PgUp")),
+                  -1);
     connect(this, &QTabWidget::currentChanged, this, &FileTabs::stateChanged);
     connect(this, &FileTabs::stateChanged, this, &FileTabs::updateTitles);
 }
 
 // QTabWidget has keys, too, but a selection box in a page takes them.
-void FileTabs::addStepAction(QString const& text, QKeySequence::StandardKey keys, Qt::Key key,
-                             int step)
+void FileTabs::addStepAction(QString const& text, QKeySequence::StandardKey keys,
+                             QKeySequence const& other, int step)
 {
     auto* action = new QAction(text, this);
     QList<QKeySequence> shortcuts = QKeySequence::keyBindings(keys);
-    shortcuts.append(QKeySequence(Qt::CTRL | key));
+    shortcuts.append(other);
     action->setShortcuts(shortcuts);
     connect(action, &QAction::triggered, this,
             [this, step] { goTo(widget((currentIndex() + step + count()) % count())); });

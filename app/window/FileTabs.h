@@ -99,7 +99,8 @@ private:
     void closeTab(int position);
     void goTo(QWidget* page);
     void updateTitles();
-    void addStepAction(QString const& text, QKeySequence::StandardKey keys, Qt::Key key, int step);
+    void addStepAction(QString const& text, QKeySequence::StandardKey keys,
+                       QKeySequence const& other, int step);
     int positionOf(QString const& path) const;
     void addCloseButton(QWidget* page, QString const& name);
 
