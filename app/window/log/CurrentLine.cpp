@@ -4,16 +4,16 @@
 #include "app/window/log/CurrentLine.h"
 
 #include "app/window/widgets/ElidedLabel.h"
+#include "app/window/widgets/LongText.h"
 #include "app/window/widgets/PlainText.h"
 
 #include <QMenu>
-#include <QPlainTextEdit>
 #include <QVBoxLayout>
 
 namespace Velocor {
 
 CurrentLine::CurrentLine(QWidget* parent)
-    : QWidget(parent), m_note(new ElidedLabel(Qt::ElideRight)), m_text(new QPlainTextEdit)
+    : QWidget(parent), m_note(new ElidedLabel(Qt::ElideRight)), m_text(new LongText)
 {
     m_note->setAccessibleName(tr("Note on the current line"));
     m_note->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
@@ -37,7 +37,7 @@ CurrentLine::CurrentLine(QWidget* parent)
 
 void CurrentLine::SetText(QString const& text)
 {
-    m_text->setPlainText(text);
+    m_text->SetText(text);
 }
 
 void CurrentLine::SetNote(QString const& note)
@@ -67,7 +67,7 @@ void CurrentLine::showMenu(QPoint const& position)
 {
     QMenu* menu = m_text->createStandardContextMenu();
     menu->setAttribute(Qt::WA_DeleteOnClose);
-    const QString selected = m_text->textCursor().selectedText();
+    const QString selected = m_text->SelectedText();
     menu->addSeparator();
     const auto add = [&](QString const& text, void (CurrentLine::*request)(QString const&)) {
         QAction* action =

@@ -6,11 +6,10 @@
 #include <QString>
 #include <QWidget>
 
-class QPlainTextEdit;
-
 namespace Velocor {
 
 class ElidedLabel;
+class LongText;
 
 /// The pane below a log with the full text of the current line, and the note on it. GUI thread.
 class CurrentLine : public QWidget
@@ -45,7 +44,7 @@ private:
     void showMenu(QPoint const& position);
 
     ElidedLabel* m_note;
-    QPlainTextEdit* m_text;
+    LongText* m_text;
 };
 
 } // namespace Velocor
