@@ -22,6 +22,7 @@ class tst_PlainUniformTable : public QObject
 
 private slots:
     void tables();
+    void moreRowsThanPixels();
 };
 
 namespace {
@@ -318,6 +319,46 @@ private:
 void tst_PlainUniformTable::tables()
 {
     Program::compare<Tables>("uniform table", Rounds::count(1500, 50000, 500000), 60);
+}
+
+// Together they are higher than an int can tell, which QTableView cannot show.
+void tst_PlainUniformTable::moreRowsThanPixels()
+{
+    class Rows : public QAbstractTableModel
+    {
+    public:
+        int rowCount(QModelIndex const& parent = QModelIndex()) const override
+        {
+            return parent.isValid() ? 0 : 1000000000;
+        }
+        int columnCount(QModelIndex const& /*parent*/ = QModelIndex()) const override { return 1; }
+        QVariant data(QModelIndex const& index, int role) const override
+        {
+            return role == Qt::DisplayRole ? QVariant(index.row()) : QVariant();
+        }
+    };
+    Rows rows;
+    Uniform table;
+    table.SetRowHeight(RowHeight);
+    table.setModel(&rows);
+    table.resize(300, 200);
+    table.show();
+    QCoreApplication::processEvents();
+    const QModelIndex first = rows.index(0, 0);
+    const QModelIndex middle = rows.index(500000000, 0);
+    const QModelIndex last = rows.index(rows.rowCount() - 1, 0);
+    QCOMPARE(table.visualRect(first).top(), 0);
+    QVERIFY(table.visualRect(last).top() > 1000000);
+    table.scrollToBottom();
+    QCOMPARE(table.visualRect(last).bottom() + 1, table.viewport()->height());
+    QCOMPARE(table.rowAt(table.viewport()->height() - 1), last.row());
+    QVERIFY(table.visualRect(first).top() < -1000000);
+    table.scrollTo(middle, QAbstractItemView::PositionAtTop);
+    QCOMPARE(table.visualRect(middle).top(), 0);
+    QCOMPARE(table.rowAt(0), middle.row());
+    QVERIFY(table.visualRect(first).top() < -1000000);
+    QVERIFY(table.visualRect(last).top() > 1000000);
+    table.grab();
 }
 
 QTEST_MAIN(tst_PlainUniformTable)

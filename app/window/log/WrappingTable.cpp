@@ -108,7 +108,7 @@ int WrappingTable::topOf(int row) const
         y += heightOf(next++);
     while (next > row && next > 0 && y >= -page)
         y -= heightOf(--next);
-    return y + (row - next) * usualHeight();
+    return withinInt(y + heightOfRows(row - next));
 }
 
 int WrappingTable::rowPast(int y) const

@@ -12,6 +12,7 @@
 #include <QScrollBar>
 
 #include <algorithm>
+#include <limits>
 
 namespace Velocor {
 
@@ -119,9 +120,22 @@ int UniformTable::topOf(int row) const
 {
     QScrollBar const* const bar = verticalScrollBar();
     const bool isAtEnd = bar->maximum() > 0 && bar->value() == bar->maximum();
-    const int rest = viewport()->height() - (rowCount() - bar->value()) * m_rowHeight;
-    const int shift = isAtEnd && rest > 0 && rest < m_rowHeight ? rest : 0;
-    return (row - bar->value()) * m_rowHeight + shift;
+    const qint64 rest = viewport()->height() - heightOfRows(rowCount() - bar->value());
+    const qint64 shift = isAtEnd && rest > 0 && rest < m_rowHeight ? rest : 0;
+    return withinInt(heightOfRows(row - bar->value()) + shift);
+}
+
+qint64 UniformTable::heightOfRows(int count) const
+{
+    return qint64(count) * m_rowHeight;
+}
+
+// A hundred million rows are higher than an int can tell. Far outside the viewport, it does not
+// matter how far.
+int UniformTable::withinInt(qint64 y)
+{
+    constexpr qint64 FarOutside = std::numeric_limits<int>::max() / 2;
+    return static_cast<int>(qBound(-FarOutside, y, FarOutside));
 }
 
 // The row that would be there if there were rows without end.

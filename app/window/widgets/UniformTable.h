@@ -70,6 +70,12 @@ protected:
     /// The height that SetRowHeight() was given.
     int usualHeight() const { return m_rowHeight; }
 
+    /// The height of so many rows of usual height; negative for a negative number.
+    qint64 heightOfRows(int count) const;
+
+    /// A position as a widget takes it. Positions far outside are moved nearer.
+    static int withinInt(qint64 y);
+
     void paintEvent(QPaintEvent* event) override;
     void updateGeometries() override;
     void scrollContentsBy(int dx, int dy) override;
