@@ -19,8 +19,7 @@ void LongText::SetText(QString const& text)
     QString shown;
     shown.reserve(text.size() + text.size() / MaximumPart + 1);
     int length = 0; // of the part
-    for (int at = 0; at < text.size(); ++at) {
-        const QChar c = text.at(at);
+    for (const QChar c : text) {
         if (length >= MaximumPart && c != QLatin1Char('\n') && !c.isLowSurrogate()) {
             m_breaks.append(shown.size());
             shown += QLatin1Char('\n');
