@@ -52,22 +52,37 @@ public:
     }
 
     /// Runs a function with the next modal dialog, soon after it appears. The dialog is closed if
-    /// the test fails in the meantime; otherwise it would block everything else.
+    /// the test fails in the meantime, or if it is still open after a long time; otherwise it would
+    /// block everything else.
     template <class Dialog>
     static void whenShown(std::function<void(Dialog*)> const& work)
     {
         auto* timer = new QTimer(qApp);
         timer->setObjectName(waiting());
-        QObject::connect(timer, &QTimer::timeout, timer, [timer, work] {
+        QPointer<Dialog> seen;
+        QObject::connect(timer, &QTimer::timeout, timer, [timer, work, seen]() mutable {
             auto* dialog = qobject_cast<Dialog*>(QApplication::activeModalWidget());
             if (!dialog || !dialog->isVisible())
                 return;
+            // The first time, it may still be on its way to its event loop: a dialog that is closed
+            // before that stays in it for good.
+            if (seen != dialog) {
+                seen = dialog;
+                return;
+            }
             timer->stop();
             timer->deleteLater();
-            const QPointer<Dialog> open(dialog);
             work(dialog);
-            if (QTest::currentTestFailed() && open)
-                open->reject();
+            if (!seen)
+                return;
+            if (QTest::currentTestFailed())
+                seen->reject();
+            QTimer::singleShot(Patience, dialog, [dialog] {
+                if (!dialog->isVisible())
+                    return;
+                qWarning("the %s is still open", dialog->metaObject()->className());
+                dialog->reject();
+            });
         });
         timer->start(20);
     }
