@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "app/logfile/SharedBlocks.h"
+#include "app/logfile/GrowingBlocks.h"
 
 #include <QtGlobal>
 
@@ -17,42 +17,23 @@ namespace Velocor {
 class LineNumbers
 {
 public:
-    size_t size() const { return m_full.size() * BlockSize + m_last.size(); }
+    size_t size() const { return m_blocks.size(); }
 
     quint32 at(size_t position) const
     {
-        const size_t block = position / BlockSize;
-        return (block < m_full.size() ? m_full.at(block) : m_last)[position % BlockSize];
+        return m_blocks.at(position).numbers[position % BlockSize];
     }
 
-    void Append(quint32 number)
-    {
-        if (m_last.size() == BlockSize) {
-            m_last.shrink_to_fit();
-            m_full.Append(std::move(m_last));
-            m_last = std::vector<quint32>();
-        }
-        m_last.push_back(number);
-    }
+    void Append(quint32 number) { m_blocks.Grow().numbers.push_back(number); }
 
     /// Removes the numbers from this position on.
-    void Truncate(size_t count)
-    {
-        const size_t block = count / BlockSize;
-        if (count >= size())
-            return;
-        if (block < m_full.size()) {
-            m_last = m_full.at(block);
-            m_full.Truncate(block);
-        }
-        m_last.resize(count % BlockSize);
-    }
+    void Truncate(size_t count) { m_blocks.Truncate(count); }
 
     /// How many of the first numbers are the same in another list. Shared blocks are not compared.
     size_t CountSame(LineNumbers const& other) const
     {
         const size_t end = std::min(size(), other.size());
-        size_t count = std::min(end, m_full.CountShared(other.m_full) * BlockSize);
+        size_t count = m_blocks.CountShared(other.m_blocks);
         while (count < end && at(count) == other.at(count))
             ++count;
         return count;
@@ -62,10 +43,17 @@ public:
     static constexpr size_t BlockSize = 16384;
 
 private:
-    using Block = std::vector<quint32>;
+    struct Block
+    {
+        std::vector<quint32> numbers;
 
-    SharedBlocks<Block> m_full;
-    Block m_last;
+        void reserve() {} // most lists are short
+        void truncate(size_t count) { numbers.resize(count); }
+        void pack() { numbers.shrink_to_fit(); }
+        void unpack() {}
+    };
+
+    GrowingBlocks<Block, BlockSize> m_blocks;
 };
 
 } // namespace Velocor

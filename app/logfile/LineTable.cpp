@@ -82,6 +82,15 @@ size_t LineTable::Block::lineAt(qint64 offset) const
     return last;
 }
 
+// For lines of usual length, so that packing need not move anything but the marks.
+void LineTable::Block::reserve()
+{
+    groups.reserve(BlockSize / GroupSize);
+    lengths.reserve(BlockSize - 1);
+    marks.reserve(BlockSize);
+    checks.reserve(BlockSize);
+}
+
 // The block must have the line.
 void LineTable::Block::truncate(size_t line)
 {
@@ -101,15 +110,20 @@ void LineTable::Block::truncate(size_t line)
 // compares. There are few different ones; with too many, it has a byte.
 void LineTable::Block::pack()
 {
+    constexpr quint8 Most = 16;
+    quint8 numbers[256]; // of the marks, from 1 on
+    std::fill(std::begin(numbers), std::end(numbers), quint8(0));
     std::vector<quint8> found;
     std::vector<quint8> packed((marks.size() + 1) / 2);
-    for (size_t line = 0; line < marks.size() && found.size() <= 16; ++line) {
-        const auto number = std::find(found.begin(), found.end(), marks[line]) - found.begin();
-        if (static_cast<size_t>(number) == found.size())
+    for (size_t line = 0; line < marks.size() && found.size() <= Most; ++line) {
+        quint8& number = numbers[marks[line]];
+        if (number == 0) {
             found.push_back(marks[line]);
-        packed[line / 2] |= static_cast<quint8>(number << (line % 2 * 4));
+            number = static_cast<quint8>(found.size());
+        }
+        packed[line / 2] |= static_cast<quint8>((number - 1) << (line % 2 * 4));
     }
-    if (found.size() <= 16) {
+    if (found.size() <= Most) {
         palette = std::move(found);
         marks = std::move(packed);
     }
@@ -132,70 +146,49 @@ void LineTable::Block::unpack()
 qint64 LineTable::start(size_t line) const
 {
     size_t position = 0;
-    return block(line).start(line % BlockSize, position);
+    return m_blocks.at(line).start(line % BlockSize, position);
 }
 
 void LineTable::Append(qint64 start, quint8 mark, quint16 check)
 {
-    if (m_last.checks.size() == BlockSize) {
-        m_last.pack();
-        m_full.Append(std::move(m_last));
-        m_last = Block();
-    }
-    if (!m_last.checks.empty())
-        PutLength(m_last.lengths, start - m_lastStart);
-    if (m_last.checks.size() % GroupSize == 0)
-        m_last.groups.push_back({start, m_last.lengths.size()});
-    m_last.marks.push_back(mark);
-    m_last.checks.push_back(check);
+    const size_t position = size() % BlockSize;
+    Block& last = m_blocks.Grow();
+    if (position > 0)
+        PutLength(last.lengths, start - m_lastStart);
+    if (position % GroupSize == 0)
+        last.groups.push_back({start, last.lengths.size()});
+    last.marks.push_back(mark);
+    last.checks.push_back(check);
     m_lastStart = start;
 }
 
 void LineTable::SetMark(size_t line, quint8 mark)
 {
-    const size_t position = line / BlockSize;
-    if (position >= m_full.size()) {
-        m_last.marks[line % BlockSize] = mark;
-        return;
-    }
-    Block changed = m_full.at(position);
-    changed.unpack();
-    changed.marks[line % BlockSize] = mark;
-    changed.pack();
-    m_full.Replace(position, std::move(changed));
+    m_blocks.Edit(line, [=](Block& block) { block.marks[line % BlockSize] = mark; });
 }
 
 void LineTable::Truncate(size_t line)
 {
     if (line >= size())
         return;
-    const size_t position = line / BlockSize;
-    if (position < m_full.size()) {
-        m_last = m_full.at(position);
-        m_last.unpack();
-        m_full.Truncate(position);
-    }
-    m_last.truncate(line % BlockSize);
+    m_blocks.Truncate(line);
     m_lastStart = line > 0 ? start(line - 1) : 0;
 }
 
 size_t LineTable::LineAt(qint64 offset) const
 {
     // The last block that starts at the offset or before it.
-    size_t position = m_full.size();
-    if (position > 0 && (m_last.groups.empty() || m_last.groups.front().start > offset)) {
-        size_t end = position;
-        position = 0;
-        while (end - position > 1) {
-            const size_t middle = position + (end - position) / 2;
-            if (m_full.at(middle).groups.front().start > offset)
-                end = middle;
-            else
-                position = middle;
-        }
+    size_t position = 0;
+    size_t end = (size() - 1) / BlockSize + 1;
+    while (end - position > 1) {
+        const size_t middle = position + (end - position) / 2;
+        if (m_blocks.at(middle * BlockSize).groups.front().start > offset)
+            end = middle;
+        else
+            position = middle;
     }
     const size_t first = position * BlockSize;
-    return first + block(first).lineAt(offset);
+    return first + m_blocks.at(first).lineAt(offset);
 }
 
 size_t LineTable::CountSame(LineTable const& other) const
@@ -203,7 +196,7 @@ size_t LineTable::CountSame(LineTable const& other) const
     const size_t end = std::min(size(), other.size());
     Reader reader(*this);
     Reader otherReader(other);
-    size_t line = std::min(end, m_full.CountShared(other.m_full) * BlockSize);
+    size_t line = m_blocks.CountShared(other.m_blocks);
     while (line < end && mark(line) == other.mark(line) && check(line) == other.check(line) &&
            reader.start(line) == otherReader.start(line))
         ++line;
@@ -215,7 +208,7 @@ qint64 LineTable::Reader::start(size_t line)
     if (line - m_first >= m_count) {
         m_first = line - line % GroupSize;
         m_count = std::min(m_lines->size() - m_first, GroupSize);
-        Block const& block = m_lines->block(line);
+        Block const& block = m_lines->m_blocks.at(line);
         Group const& group = block.groups[m_first % BlockSize / GroupSize];
         quint8 const* at = block.lengths.data() + group.position;
         m_starts[0] = group.start;

@@ -3,7 +3,7 @@
 
 #pragma once
 
-#include "app/logfile/SharedBlocks.h"
+#include "app/logfile/GrowingBlocks.h"
 
 #include <QtGlobal>
 
@@ -30,13 +30,13 @@ class LineTable
     static constexpr size_t GroupSize = 128;
 
 public:
-    size_t size() const { return m_full.size() * BlockSize + m_last.checks.size(); }
+    size_t size() const { return m_blocks.size(); }
     bool isEmpty() const { return size() == 0; }
 
     /// Where a line starts in the file, in bytes. Takes longer than the other two; see Reader.
     qint64 start(size_t line) const;
-    quint8 mark(size_t line) const { return block(line).mark(line % BlockSize); }
-    quint16 check(size_t line) const { return block(line).checks[line % BlockSize]; }
+    quint8 mark(size_t line) const { return m_blocks.at(line).mark(line % BlockSize); }
+    quint16 check(size_t line) const { return m_blocks.at(line).checks[line % BlockSize]; }
 
     /// Adds a line.
     ///
@@ -97,21 +97,13 @@ private:
         }
         qint64 start(size_t line, size_t& position) const;
         size_t lineAt(qint64 offset) const;
+        void reserve();
         void truncate(size_t line);
         void pack();
         void unpack();
     };
 
-    Block const& block(size_t line) const
-    {
-        const size_t position = line / BlockSize;
-        if (position < m_full.size())
-            return m_full.at(position);
-        return m_last;
-    }
-
-    SharedBlocks<Block> m_full;
-    Block m_last;
+    GrowingBlocks<Block, BlockSize> m_blocks;
     qint64 m_lastStart = 0; // of the last line
 };
 

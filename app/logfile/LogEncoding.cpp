@@ -131,14 +131,13 @@ QString LogEncoding::Decode(char const* bytes, int length) const
     return text;
 }
 
-void LogEncoding::Narrow(char const*& line, int& length, QByteArray& buffer) const
+void LogEncoding::narrowUnicode(char const*& line, int& length, QByteArray& buffer) const
 {
     if (isWide()) {
         buffer = Decode(line, length).toUtf8();
         line = buffer.constData();
         length = buffer.size();
-    } else if (m_kind == Utf8 && length >= Utf8MarkLength &&
-               std::memcmp(line, Utf8Mark, Utf8MarkLength) == 0) {
+    } else if (length >= Utf8MarkLength && std::memcmp(line, Utf8Mark, Utf8MarkLength) == 0) {
         line += Utf8MarkLength;
         length -= Utf8MarkLength;
     }

@@ -43,7 +43,11 @@ public:
     /// Replaces a line by one that has ASCII in single bytes, without a byte order mark.
     ///
     /// @param line  points into `buffer` afterwards if the bytes had to be changed
-    void Narrow(char const*& line, int& length, QByteArray& buffer) const;
+    void Narrow(char const*& line, int& length, QByteArray& buffer) const
+    {
+        if (m_kind != Automatic && m_kind != Latin1)
+            narrowUnicode(line, length, buffer);
+    }
 
     /// The length of a line without a carriage return at its end, in bytes.
     int WithoutReturn(char const* line, int length) const
@@ -63,6 +67,7 @@ public:
     bool operator!=(LogEncoding const& other) const { return m_kind != other.m_kind; }
 
 private:
+    void narrowUnicode(char const*& line, int& length, QByteArray& buffer) const;
     QString decodeWide(char const* bytes, int length) const;
 
     Kind m_kind;

@@ -62,24 +62,23 @@ size_t LogIndex::resumeLine() const
     return std::min(afterTimed, settled);
 }
 
-void LogIndex::count(size_t line, int step)
+void LogIndex::count(quint8 mark, int step)
 {
-    const quint8 mark = m_lines.mark(line);
     if (!(mark & LogRows::Continued))
         m_counts[SeverityOf(mark)] += static_cast<size_t>(step);
 }
 
 void LogIndex::setMark(size_t line, quint8 mark)
 {
-    count(line, -1);
+    count(m_lines.mark(line), -1);
     m_lines.SetMark(line, mark);
-    count(line, 1);
+    count(mark, 1);
 }
 
 void LogIndex::forgetFrom(size_t line)
 {
     for (size_t forgotten = line; forgotten < m_lines.size(); ++forgotten)
-        count(forgotten, -1);
+        count(m_lines.mark(forgotten), -1);
     m_lines.Truncate(line);
     m_matches.resize(std::min(line, m_matches.size()));
     m_entryEnd = entryEndBefore(line);
@@ -274,8 +273,9 @@ bool LogIndex::addLine(char const* line, int length, bool complete)
         joinRuns();
     if (m_filter.hasText())
         m_matches.push_back(matchOf(line, length, m_lines.size()));
-    m_lines.Append(m_lineStart, markOf(parts), check);
-    count(m_lines.size() - 1, 1);
+    const quint8 mark = markOf(parts);
+    m_lines.Append(m_lineStart, mark, check);
+    count(mark, 1);
     if (parts.timeKey >= 0 && complete) // an incomplete line is read again
         noteTime(parts);
     return true;
@@ -289,8 +289,10 @@ bool LogIndex::isSeam(LogLineParser::Parts const& parts, qint64 end) const
     Run const& run = m_runs.back();
     const bool changesFormat = parts.hasDate != run.hasDate && run.timedLines > 1;
     const bool isEarlier = parts.hasDate == run.hasDate && isOlder(parts);
+    if (!changesFormat && !isEarlier)
+        return false;
     if (hasKnownLines())
-        return (changesFormat || isEarlier) && isKnown(parts, end);
+        return isKnown(parts, end);
 
     const bool followsRest = m_lines.size() > m_lastTimed + 1;
     // A run logs its settings in the default format, with a date, before it switches to another.
@@ -372,7 +374,7 @@ bool LogIndex::joinKnownLines(qint64 start)
     LineTable::Reader known(m_known);
     for (size_t line = first; line < m_known.size(); ++line) {
         m_lines.Append(known.start(line), m_known.mark(line), m_known.check(line));
-        count(m_lines.size() - 1, 1);
+        count(m_known.mark(line), 1);
     }
     if (m_filter.hasText())
         m_matches.insert(m_matches.end(),

@@ -193,7 +193,7 @@ private:
     void addRest(Rest rest, LogFilter const& filter, LogRows& rows) const;
     void addRun(size_t number, LogFilter const& filter, LogRows& rows) const;
     size_t countProblems() const;
-    void count(size_t line, int step);
+    void count(quint8 mark, int step);
     void setMark(size_t line, quint8 mark);
     bool hasKnownLines() const { return m_known.size() > m_knownFirst; }
     size_t knownLineAt(qint64 start) const;

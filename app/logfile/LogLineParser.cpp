@@ -133,7 +133,7 @@ void LogLineParser::findElapsed(char const* line, int length, Parts& parts) cons
     const int restLength = length - parts.message;
     for (QByteArray const& prefix : m_elapsedPrefixes) {
         const int size = prefix.size();
-        if (restLength < size ||
+        if (restLength < size || *rest != prefix.at(0) ||
             std::memcmp(rest, prefix.constData(), static_cast<size_t>(size)) != 0)
             continue;
         const int number = NumberInBrackets(rest + size, restLength - size);
@@ -147,18 +147,18 @@ void LogLineParser::findElapsed(char const* line, int length, Parts& parts) cons
     }
 }
 
-LogLineParser::Parts LogLineParser::findOwn(char const* line, int length, Beginnings* last) const
+void LogLineParser::findOwn(char const* line, int length, Beginnings* last, Parts& parts) const
 {
-    Parts parts;
     length = std::min(length, SearchLimit);
     if (findByFormat(line, length, last, parts) || findByName(line, length, parts))
         findElapsed(line, length, parts);
-    return parts;
 }
 
 LogLineParser::Parts LogLineParser::FindOwn(char const* line, int length) const
 {
-    return findOwn(line, length, nullptr);
+    Parts parts;
+    findOwn(line, length, nullptr, parts);
+    return parts;
 }
 
 LogLineParser::Parts LogLineParser::Find(char const* line, int length) const
@@ -168,18 +168,16 @@ LogLineParser::Parts LogLineParser::Find(char const* line, int length) const
 
 LogLineParser::Parts LogLineParser::Find(char const* line, int length, Beginnings& last) const
 {
-    last.resize(m_readers.size());
+    if (last.empty())
+        last.resize(m_readers.size());
     return find(line, length, &last);
 }
 
-LogLineParser::Parts LogLineParser::find(char const* line, int length, Beginnings* last) const
+bool LogLineParser::findForeign(char const* line, int length, Parts& parts) const
 {
-    if (!m_type.isForeign)
-        return findOwn(line, length, last);
     const ForeignLine foreign = ForeignLine::Read(line, length, m_type.latest);
     if (!foreign.isEntry)
-        return findOwn(line, length, last);
-    Parts parts;
+        return false;
     parts.isEntry = true;
     parts.severity = foreign.severity;
     parts.timeLength = foreign.time.length;
@@ -187,6 +185,14 @@ LogLineParser::Parts LogLineParser::find(char const* line, int length, Beginning
     parts.hasDate = foreign.hasDate;
     parts.resolution = foreign.resolution;
     parts.message = foreign.message.start;
+    return true;
+}
+
+LogLineParser::Parts LogLineParser::find(char const* line, int length, Beginnings* last) const
+{
+    Parts parts;
+    if (!m_type.isForeign || !findForeign(line, length, parts))
+        findOwn(line, length, last, parts);
     return parts;
 }
 

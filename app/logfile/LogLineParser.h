@@ -96,7 +96,8 @@ private:
 
     Name const* nameAt(char const* text, int length) const;
     Parts find(char const* line, int length, Beginnings* last) const;
-    Parts findOwn(char const* line, int length, Beginnings* last) const;
+    void findOwn(char const* line, int length, Beginnings* last, Parts& parts) const;
+    bool findForeign(char const* line, int length, Parts& parts) const;
     bool findByFormat(char const* line, int length, Beginnings* last, Parts& parts) const;
     bool findByName(char const* line, int length, Parts& parts) const;
     void findElapsed(char const* line, int length, Parts& parts) const;

@@ -231,106 +231,43 @@ void LogTimeReader::addMonthName()
     }
 }
 
-LogTimeReader::Stamp LogTimeReader::Read(char const* text, int length) const
-{
-    Stamp stamp;
-    Values values;
-    char const* at = text;
-    char const* const end = text + length;
-    for (Token const& token : m_tokens) {
-        if (!readToken(token, at, end, values))
-            return stamp;
-    }
-
-    stamp.length = static_cast<int>(at - text);
-    if (m_hasTime)
-        stamp.key = keyOf(values);
-    return stamp;
-}
-
-// For the goal "opening" in docs/performance.md. tst_PlainLineParser compares it with the other.
-LogTimeReader::Stamp LogTimeReader::Read(char const* text, int length, Beginning& last) const
-{
-    if (m_secondsToken == 0)
-        return Read(text, length);
-    const bool isKnown = last.length > 0 && length >= last.length &&
-                         std::memcmp(text, last.text.data(), static_cast<size_t>(last.length)) == 0;
-    Stamp stamp;
-    Values values;
-    char const* at = isKnown ? text + last.length : text;
-    char const* const end = text + length;
-    char const* seconds = at;
-    for (size_t i = isKnown ? m_secondsToken : 0; i < m_tokens.size(); ++i) {
-        if (i == m_secondsToken)
-            seconds = at;
-        if (!readToken(m_tokens[i], at, end, values))
-            return stamp;
-    }
-    stamp.length = static_cast<int>(at - text);
-    const qint64 inMinute = values.number[Second] * 1000 + values.number[Fraction];
-    if (isKnown) {
-        stamp.key = last.key + inMinute;
-        return stamp;
-    }
-    stamp.key = keyOf(values);
-    last.length = 0;
-    if (seconds - text <= static_cast<std::ptrdiff_t>(last.text.size())) {
-        last.length = static_cast<int>(seconds - text);
-        last.key = stamp.key - inMinute;
-        std::copy(text, seconds, last.text.begin());
-    }
-    return stamp;
-}
-
 qint64 LogTimeReader::keyOf(Values const& values)
 {
     int const* number = values.number;
     qint64 key = DayNumber(number[Year] + number[ShortYear], number[Month], number[Day]);
     key = key * 24 + number[Hour] + number[HalfDay];
     key = key * 60 + number[Minute];
-    key = key * 60 + number[Second];
-    return key * 1000 + number[Fraction];
+    return key * MinuteLength + inMinute(values);
 }
 
-bool LogTimeReader::readToken(Token const& token, char const*& at, char const* end,
-                              Values& values) const
+int LogTimeReader::inMinute(Values const& values)
 {
-    switch (token.kind) {
-    case Exactly:
-        if (end - at < token.text.size() ||
-            std::memcmp(at, token.text.constData(), static_cast<size_t>(token.text.size())) != 0)
-            return false;
-        at += token.text.size();
-        return true;
-    case Number:
-        return readNumber(token, at, end, values);
-    case MonthName:
-        return readMonth(at, end, values);
-    case Word:
-        break;
-    }
+    return values.number[Second] * 1000 + values.number[Fraction];
+}
 
-    char const* const start = at;
-    while (at != end && IsWordCharacter(*at))
-        ++at;
-    if (token.field == HalfDay && at != start) {
-        const bool afternoon = *start == 'p' || *start == 'P';
-        const bool twelve = values.number[Hour] == 12;
-        values.number[HalfDay] = afternoon ? (twelve ? 0 : 12) : (twelve ? -12 : 0);
+bool LogTimeReader::readText(Token const& token, char const*& at, char const* end)
+{
+    char const* const text = token.text.constData();
+    const int size = token.text.size();
+    if (end - at < size)
+        return false;
+    // Mostly of one character, for which a call would take longer.
+    for (int i = 0; i < size; ++i) {
+        if (at[i] != text[i])
+            return false;
     }
-    return at != start;
+    at += size;
+    return true;
 }
 
 bool LogTimeReader::readNumber(Token const& token, char const*& at, char const* end,
                                Values& values) const
 {
+    char const* const start = at;
     int value = 0;
-    int digits = 0;
-    while (at != end && digits < token.maximum && IsAsciiDigit(*at)) {
+    for (; at != end && at - start < token.maximum && IsAsciiDigit(*at); ++at)
         value = value * 10 + (*at - '0');
-        ++at;
-        ++digits;
-    }
+    const auto digits = static_cast<int>(at - start);
     if (digits < token.minimum)
         return false;
     if (token.field == Fraction && m_fractionOfSecond)
@@ -351,6 +288,78 @@ bool LogTimeReader::readMonth(char const*& at, char const* end, Values& values) 
         return true;
     }
     return false;
+}
+
+bool LogTimeReader::readWord(Token const& token, char const*& at, char const* end, Values& values)
+{
+    char const* const start = at;
+    while (at != end && IsWordCharacter(*at))
+        ++at;
+    if (token.field == HalfDay && at != start) {
+        const bool afternoon = *start == 'p' || *start == 'P';
+        const bool twelve = values.number[Hour] == 12;
+        values.number[HalfDay] = afternoon ? (twelve ? 0 : 12) : (twelve ? -12 : 0);
+    }
+    return at != start;
+}
+
+bool LogTimeReader::readTokens(size_t first, size_t last, char const*& at, char const* end,
+                               Values& values) const
+{
+    for (size_t i = first; i < last; ++i) {
+        Token const& token = m_tokens[i];
+        const bool isRead = token.kind == Number      ? readNumber(token, at, end, values)
+                            : token.kind == Exactly   ? readText(token, at, end)
+                            : token.kind == MonthName ? readMonth(at, end, values)
+                                                      : readWord(token, at, end, values);
+        if (!isRead)
+            return false;
+    }
+    return true;
+}
+
+LogTimeReader::Stamp LogTimeReader::Read(char const* text, int length) const
+{
+    Stamp stamp;
+    Values values;
+    char const* at = text;
+    if (!readTokens(0, m_tokens.size(), at, text + length, values))
+        return stamp;
+    stamp.length = static_cast<int>(at - text);
+    if (m_hasTime)
+        stamp.key = keyOf(values);
+    return stamp;
+}
+
+// For the goal "opening" in docs/performance.md. tst_PlainLineParser compares it with the other.
+LogTimeReader::Stamp LogTimeReader::Read(char const* text, int length, Beginning& last) const
+{
+    if (m_secondsToken == 0)
+        return Read(text, length);
+    const bool isKnown = last.length > 0 && length >= last.length &&
+                         std::memcmp(text, last.text.data(), static_cast<size_t>(last.length)) == 0;
+    Stamp stamp;
+    Values values;
+    char const* at = isKnown ? text + last.length : text;
+    char const* const end = text + length;
+    if (!isKnown && !readTokens(0, m_secondsToken, at, end, values))
+        return stamp;
+    char const* const seconds = at;
+    if (!readTokens(m_secondsToken, m_tokens.size(), at, end, values))
+        return stamp;
+    stamp.length = static_cast<int>(at - text);
+    if (isKnown) {
+        stamp.key = last.key + inMinute(values);
+        return stamp;
+    }
+    stamp.key = keyOf(values);
+    last.length = 0;
+    if (seconds - text <= static_cast<std::ptrdiff_t>(last.text.size())) {
+        last.length = static_cast<int>(seconds - text);
+        last.key = stamp.key - inMinute(values);
+        std::copy(text, seconds, last.text.begin());
+    }
+    return stamp;
 }
 
 } // namespace Velocor

@@ -81,9 +81,13 @@ private:
     int addQuoted(QString const& format, int position);
     size_t secondsToken() const;
     static qint64 keyOf(Values const& values);
-    bool readToken(Token const& token, char const*& at, char const* end, Values& values) const;
+    static int inMinute(Values const& values);
+    bool readTokens(size_t first, size_t last, char const*& at, char const* end,
+                    Values& values) const;
+    static bool readText(Token const& token, char const*& at, char const* end);
     bool readNumber(Token const& token, char const*& at, char const* end, Values& values) const;
     bool readMonth(char const*& at, char const* end, Values& values) const;
+    static bool readWord(Token const& token, char const*& at, char const* end, Values& values);
 
     std::vector<Token> m_tokens;
     std::vector<QByteArray> m_monthNames; // long and short names alternate, January first
