@@ -10,6 +10,8 @@ namespace Velocor {
 
 namespace {
 
+constexpr int LeastTextPerControl = 20; // characters
+
 // Whose format lines are in.
 class Owner
 {
@@ -46,6 +48,22 @@ private:
     bool m_mayBeForeign = false;
 };
 
+// More than text has with the colors and the overwritten progress bars of terminals. A run of zeros
+// counts once: after a power failure, a log may have a long one.
+bool HasManyControls(QByteArray const& head)
+{
+    int controls = 0;
+    char before = '\1';
+    for (const char c : head) {
+        const bool isText =
+            static_cast<uchar>(c) >= 0x20 || (c >= '\a' && c <= '\r') || c == '\x1B';
+        if (!isText && (c != '\0' || before != '\0'))
+            ++controls;
+        before = c;
+    }
+    return controls * LeastTextPerControl > head.size();
+}
+
 } // namespace
 
 LogLineEnd LogFileType::lineEnd() const
@@ -61,6 +79,21 @@ bool LogFileType::IsLike(LogFileType const& other) const
 {
     return encoding == other.encoding && isForeign == other.isForeign &&
            isJournal == other.isJournal;
+}
+
+LogFileType::Content LogFileType::ContentOf(QByteArray const& head, LogEncoding encoding)
+{
+    if (head.startsWith("\x1F\x8B\x08"))
+        return Gzip;
+    if (head.startsWith(QByteArray("\xFD"
+                                   "7zXZ\0",
+                                   6)))
+        return Xz;
+    if (head.startsWith("BZh") && head.mid(4, 6) == "1AY&SY")
+        return Bzip2;
+    if (head.startsWith("\x28\xB5\x2F\xFD"))
+        return Zstd;
+    return !encoding.isWide() && HasManyControls(head) ? Binary : Text;
 }
 
 LogFileType LogFileType::Of(QByteArray const& head, LogLineParser const& parser, LogEncoding chosen,
@@ -101,6 +134,7 @@ LogFileType LogFileType::Of(QByteArray const& head, LogLineParser const& parser,
     if (declared == LogEncoding::Automatic)
         type.encoding =
             owner.mayBeOwn() ? LogEncoding(LogEncoding::Latin1) : LogEncoding::Detect(head);
+    type.content = type.isOwn ? Text : ContentOf(head, type.encoding);
     return type;
 }
 

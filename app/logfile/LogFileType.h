@@ -24,6 +24,10 @@ struct LogFileType
     bool isOwn = false;     ///< an entry of the log's own was found
     QDate latest;           ///< see ForeignStamp::Read()
 
+    /// What the file seems to hold; its lines are shown in any case.
+    enum Content { Text, Gzip, Xz, Bzip2, Zstd, Binary };
+    Content content = Text;
+
     /// Where lines or, in a journal export, entries end.
     LogLineEnd lineEnd() const;
 
@@ -43,6 +47,12 @@ struct LogFileType
     /// @param modified  when the file was written last
     static LogFileType Of(QByteArray const& head, LogLineParser const& parser, LogEncoding chosen,
                           QDate const& modified);
+
+    /// What a file seems to hold. Compressed files are told by their first bytes, binary ones by
+    /// their control characters.
+    ///
+    /// @param head  as for Of()
+    static Content ContentOf(QByteArray const& head, LogEncoding encoding);
 
     /// How many bytes are looked at.
     static constexpr int HeadSize = 64 * 1024;

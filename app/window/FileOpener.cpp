@@ -4,7 +4,6 @@
 #include "app/window/FileOpener.h"
 
 #include "app/MruSeparator_p.h"
-#include "app/window/ApplicationProperty.h"
 #include "app/window/FileTabs.h"
 #include "app/window/RecentFiles.h"
 #include "app/window/StandardInput.h"
@@ -77,9 +76,11 @@ QStringList FileOpener::openFiles() const
 
 void FileOpener::Choose()
 {
+    const QFileInfo current(FileTabs::PathOf(m_tabs->currentWidget()));
+    const bool isInput = m_tabs->currentWidget()->findChild<StandardInput*>();
     const QString path = QFileDialog::getOpenFileName(
-        m_window, tr("Open"), ApplicationProperty("DataPath"),
-        tr("Logs and settings (*.log *.log.* *.cfg *.xml);;All files (*)"));
+        m_window, tr("Open"), isInput ? QDir::currentPath() : current.absolutePath(),
+        tr("Logs (*.log *.log.* *.txt);;Settings files (*.cfg *.xml);;All files (*)"));
     if (!path.isEmpty())
         Open(path);
 }

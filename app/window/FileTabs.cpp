@@ -108,6 +108,7 @@ LogPanel* FileTabs::addLog(QString const& path)
     connect(panel, &LogPanel::zoomRequested, this, &FileTabs::zoomRequested);
     panel->SetTextFont(m_textFont);
     panel->SetLineWrap(m_isWrapped);
+    panel->SetLineNumbers(m_hasNumbers);
     if (!path.isEmpty())
         panel->Open(path, false);
     setTabToolTip(addTab(panel, QString()), PlainToolTip(path));
@@ -209,7 +210,7 @@ void FileTabs::closeTab(int position)
         return;
     removeTab(position);
     page->deleteLater();
-    Q_EMIT stateChanged();
+    goTo(currentWidget()); // or nothing would have the focus
 }
 
 bool FileTabs::MayCloseAll()
@@ -241,6 +242,15 @@ void FileTabs::SetLineWrap(bool wrapped)
     for (int i = 0; i < count(); ++i) {
         if (auto* log = qobject_cast<LogPanel*>(widget(i)))
             log->SetLineWrap(wrapped);
+    }
+}
+
+void FileTabs::SetLineNumbers(bool shown)
+{
+    m_hasNumbers = shown;
+    for (int i = 0; i < count(); ++i) {
+        if (auto* log = qobject_cast<LogPanel*>(widget(i)))
+            log->SetLineNumbers(shown);
     }
 }
 

@@ -73,6 +73,9 @@ public:
     /// Wraps the lines of all logs or not.
     void SetLineWrap(bool wrapped);
 
+    /// Shows the numbers of the lines in all logs or not.
+    void SetLineNumbers(bool shown);
+
     /// Marks the tab of the program's log: there is a problem with it.
     void MarkOwnLog(bool marked);
 
@@ -110,6 +113,7 @@ private:
     LogPanel* m_ownLog;
     QFont m_textFont;
     bool m_isWrapped = false;
+    bool m_hasNumbers = false;
 };
 
 } // namespace Velocor

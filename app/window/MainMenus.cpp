@@ -140,6 +140,10 @@ void MainMenus::fillViewMenu(QMenu* menu)
                                      tr("Show program identity and file locations"), [](bool) {});
     m_actions.showToolBar = addSwitch(menu, tr("&Tool Bar"), QKeySequence(tr("Ctrl+Alt+B")),
                                       tr("Show the tool bar"), [](bool) {});
+    m_actions.nextPane = add(menu, tr("&Go to Next Pane"), QKeySequence(tr("F6")),
+                             tr("Go from the filter to the lines, to the full text, ..."), [] {});
+    m_actions.previousPane = add(menu, tr("Go to Prev&ious Pane"), QKeySequence(tr("Shift+F6")),
+                                 tr("Go to the pane before"), [] {});
     menu->addSeparator();
     addMovement(menu);
     menu->addSeparator();
@@ -238,6 +242,10 @@ void MainMenus::fillTextMenu(QMenu* menu)
     m_actions.lineWrap = addSwitch(menu, tr("Line &Wrap"), QKeySequence(tr("Ctrl+Alt+W")),
                                    tr("Show long messages of logs in several lines"),
                                    [this](bool wrapped) { m_targets.tabs->SetLineWrap(wrapped); });
+    m_actions.lineNumbers =
+        addSwitch(menu, tr("Line N&umbers"), QKeySequence(tr("Ctrl+Alt+N")),
+                  tr("Show the numbers of the lines in the file beside logs"),
+                  [this](bool shown) { m_targets.tabs->SetLineNumbers(shown); });
 }
 
 void MainMenus::fillHelpMenu(QMenu* menu)

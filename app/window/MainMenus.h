@@ -34,6 +34,8 @@ struct MenuActions
     QAction* filter = nullptr;
     QAction* showPlaces = nullptr;
     QAction* showToolBar = nullptr;
+    QAction* nextPane = nullptr;
+    QAction* previousPane = nullptr;
     QAction* earlierRuns = nullptr;
     QAction* pause = nullptr;
     QAction* follow = nullptr;
@@ -42,6 +44,7 @@ struct MenuActions
     QAction* reload = nullptr;
     QAction* monospaced = nullptr;
     QAction* lineWrap = nullptr;
+    QAction* lineNumbers = nullptr;
     QAction* reopen = nullptr;
     QActionGroup* encodings = nullptr;
     QList<QAction*> ofLogs; ///< those that need a log in the current tab
@@ -49,7 +52,7 @@ struct MenuActions
 
 /// Fills the menus, and does what their items say.
 ///
-/// The window itself handles `quit`, `showPlaces` and `showToolBar`.
+/// The window itself handles `quit`, `showPlaces`, `showToolBar`, `nextPane` and `previousPane`.
 class MainMenus : public QObject
 {
     Q_OBJECT

@@ -13,6 +13,7 @@
 #include "app/window/LineCommands.h"
 #include "app/window/MainMenus.h"
 #include "app/window/MainToolBar.h"
+#include "app/window/Panes.h"
 #include "app/window/PlacesPanel.h"
 #include "app/window/SelectableMessageBoxes.h"
 #include "app/window/TextFont.h"
@@ -162,6 +163,8 @@ void MainWindow::makeMenus()
     MenuActions const& actions = m_menus->actions();
     connect(actions.quit, &QAction::triggered, this, &MainWindow::close);
     connect(actions.showPlaces, &QAction::triggered, this, &MainWindow::showPlaces);
+    connect(actions.nextPane, &QAction::triggered, this, [this] { GoToPane(panes(), 1); });
+    connect(actions.previousPane, &QAction::triggered, this, [this] { GoToPane(panes(), -1); });
     m_currentTab = std::make_unique<CurrentTab>(m_tabs, actions, m_summary, this);
 }
 
@@ -184,6 +187,17 @@ void MainWindow::makeToolBar()
     m_toolBar->AddTool(actions.showPlaces, ActionIcons::Places);
     addToolBar(m_toolBar);
     connect(actions.showToolBar, &QAction::triggered, m_toolBar, &QToolBar::setVisible);
+}
+
+QList<QWidget*> MainWindow::panes() const
+{
+    QList<QWidget*> all;
+    if (LogPanel const* log = m_tabs->currentLog())
+        all = log->Panes();
+    else
+        all.append(m_tabs->currentWidget());
+    all.append(m_places);
+    return all;
 }
 
 // Made when they are shown for the first time.
@@ -220,6 +234,8 @@ void MainWindow::restoreState()
     actions.monospaced->setChecked(m_textFont->isMonospaced());
     actions.lineWrap->setChecked(m_settings.Flag(QStringLiteral("lineWrap"), false));
     m_tabs->SetLineWrap(actions.lineWrap->isChecked());
+    actions.lineNumbers->setChecked(m_settings.Flag(QStringLiteral("lineNumbers"), false));
+    m_tabs->SetLineNumbers(actions.lineNumbers->isChecked());
     m_tabs->highlightRules()->SetFromText(m_settings.Text(QStringLiteral("highlights")));
     m_tabs->ownLog()->SetColumnWidths(m_settings.Numbers(QStringLiteral("columns")));
     m_tabs->ownLog()->SetPaneSizes(m_settings.Numbers(QStringLiteral("linePane")));
@@ -243,6 +259,7 @@ void MainWindow::saveState()
         m_settings.SetNumbers(QStringLiteral("panes"), m_splitter->sizes());
     m_textFont->Save(m_settings);
     m_settings.SetFlag(QStringLiteral("lineWrap"), actions.lineWrap->isChecked());
+    m_settings.SetFlag(QStringLiteral("lineNumbers"), actions.lineNumbers->isChecked());
     m_settings.SetText(QStringLiteral("highlights"), m_tabs->highlightRules()->ToText());
     m_settings.SetFlag(QStringLiteral("toolBarShown"), actions.showToolBar->isChecked());
     m_settings.SetNumbers(QStringLiteral("columns"), m_tabs->ownLog()->columnWidths());

@@ -71,7 +71,7 @@ private:
     void makeMenus();
     void makeToolBar();
     void showPlaces(bool shown);
-
+    QList<QWidget*> panes() const;
     void restoreFirstState();
     void restoreState();
     void saveState();

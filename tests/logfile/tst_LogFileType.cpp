@@ -64,6 +64,8 @@ private slots:
     void encoding();
     void chosenEncoding();
     void knownOwner();
+    void content_data();
+    void content();
     void oneRun_data();
     void oneRun();
     void everyLine_data();
@@ -153,6 +155,45 @@ void tst_LogFileType::chosenEncoding()
         QCOMPARE(type.encoding.kind(), kind.kind());
         QCOMPARE(type.isForeign, kind == LogEncoding::Utf16Le);
     }
+}
+
+void tst_LogFileType::content_data()
+{
+    QTest::addColumn<QByteArray>("head");
+    QTest::addColumn<int>("content");
+
+    const auto row = [](char const* name, QByteArray const& head, LogFileType::Content content) {
+        QTest::newRow(name) << head << int(content);
+    };
+    QByteArray noise;
+    for (unsigned i = 0; i < 4096; ++i)
+        noise += char((i * 2654435761u) >> 13);
+    const QByteArray line("Nov 22 14:03:02 host x\n");
+    row("text", line, LogFileType::Text);
+    row("empty", "", LogFileType::Text);
+    row("gzip", "\x1F\x8B\x08" + noise, LogFileType::Gzip);
+    row("xz",
+        QByteArray("\xFD"
+                   "7zXZ\0",
+                   6) +
+            noise,
+        LogFileType::Xz);
+    row("bzip2", "BZh91AY&SY" + noise, LogFileType::Bzip2);
+    row("a line that begins like bzip2", "BZh9 is a line\n", LogFileType::Text);
+    row("zstd", "\x28\xB5\x2F\xFD" + noise, LogFileType::Zstd);
+    row("another binary file", noise, LogFileType::Binary);
+    row("UTF-16", Utf16Le(line), LogFileType::Text);
+    row("the log's own, whatever it holds", "2026-11-22 14:03:02.123 Trace x\n" + noise,
+        LogFileType::Text);
+    row("colors and progress", QByteArray("\x1B[1m10%\x1B[0m\b\b\b\r\n").repeated(9),
+        LogFileType::Text);
+    row("zeros after a power failure", line + QByteArray(4096, '\0'), LogFileType::Text);
+}
+
+void tst_LogFileType::content()
+{
+    QFETCH(QByteArray, head);
+    QTEST(int(TypeOf(head).content), "content");
 }
 
 // A torn line may look like anything.

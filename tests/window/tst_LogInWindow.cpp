@@ -101,6 +101,7 @@ private slots:
     void stateOfTheLogCanBeDismissed();
     void rowsAreAlikeEverywhere();
     void emptyTableSaysWhatToDo();
+    void compressedFile();
     void textSize();
     void wheelZooms();
     void monospacedFont();
@@ -1033,6 +1034,22 @@ void tst_LogInWindow::emptyTableSaysWhatToDo()
 
 // For all logs, also those opened later; the rows fit, the columns keep their text, and the newest
 // line stays in view.
+void tst_LogInWindow::compressedFile()
+{
+    const WindowTest test(run(2, QTime(9, 0), "x"));
+    const QString path = test.folder() + "other.log.1.gz";
+    QVERIFY(TestFiles::write(path, QByteArray("\x1F\x8B\x08\x00", 4) + "\n\x93\xED\n"));
+    const auto window = WindowTest::show({path});
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(Child<QLabel>(window.get(), "Kind of file"), Patience);
+    auto const* notice = Child<QLabel>(window.get(), "Kind of file");
+    QVERIFY(notice->isVisible());
+    QVERIFY2(notice->text().endsWith("zcat other.log.1.gz | velocor -"),
+             qPrintable(notice->text()));
+    Click(Child<QPushButton>(window.get(), "Dismiss kind of file"));
+    QVERIFY(!notice->isVisible());
+}
+
 void tst_LogInWindow::textSize()
 {
     const WindowTest test(run(300, QTime(9, 0), "x"));

@@ -7,6 +7,7 @@
 #include "app/window/log/CurrentLine.h"
 #include "app/window/log/GoToDialog.h"
 #include "app/window/log/HighlightRules.h"
+#include "app/window/log/LineNumberMargin.h"
 #include "app/window/log/LogFileBox.h"
 #include "app/window/log/LogFilterBar.h"
 #include "app/window/log/LogFindBar.h"
@@ -18,6 +19,7 @@
 #include "app/window/log/LogView.h"
 #include "app/window/log/RunningLogParser.h"
 #include "app/window/log/WheelZoom.h"
+#include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
 
 #include <QHBoxLayout>
@@ -29,8 +31,9 @@ namespace Velocor {
 
 LogPanel::LogPanel(QWidget* parent)
     : QWidget(parent), m_model(new LogModel(this)), m_view(new LogView(m_model)),
-      m_files(new LogFileBox), m_filterBar(new LogFilterBar), m_findBar(new LogFindBar),
-      m_line(new CurrentLine), m_splitter(new QSplitter(Qt::Vertical)),
+      m_numbers(new LineNumberMargin(m_view)), m_files(new LogFileBox),
+      m_filterBar(new LogFilterBar), m_findBar(new LogFindBar), m_line(new CurrentLine),
+      m_splitter(new QSplitter(Qt::Vertical)),
       m_find(new FindControl(m_model, m_view, m_findBar, this)),
       m_marks(new MarkControl(m_model, m_view, this)),
       m_copier(new LineCopier(m_model, m_view, this)), m_goTo(new LogGoTo(m_model, this))
@@ -112,6 +115,7 @@ void LogPanel::connectView()
 {
     auto* zoom = new WheelZoom(this);
     zoom->Watch(m_view->viewport());
+    zoom->Watch(m_numbers);
     zoom->Watch(m_line->viewport());
     connect(zoom, &WheelZoom::zoomRequested, this, &LogPanel::zoomRequested);
     connect(m_view, &LogView::menuRequested, this, &LogPanel::showMenu);
@@ -126,6 +130,7 @@ void LogPanel::connectModel()
         m_filterBar->ShowSlowLine(m_model->state().slowLine);
         m_filterBar->ShowCounts(m_model->state().counts);
         updatePlaceholder();
+        showContent();
         if (!m_view->currentIndex().isValid())
             showCurrentLine();
         Q_EMIT stateChanged();
@@ -233,10 +238,20 @@ void LogPanel::SetLineWrap(bool wrapped)
     m_view->SetLineWrap(wrapped);
 }
 
+void LogPanel::SetLineNumbers(bool shown)
+{
+    m_numbers->SetShown(shown);
+}
+
 void LogPanel::AddBar(QWidget* bar)
 {
     auto* all = static_cast<QVBoxLayout*>(layout());
     all->insertWidget(all->indexOf(m_splitter), bar);
+}
+
+QList<QWidget*> LogPanel::Panes() const
+{
+    return {m_filterBar, m_view, m_findBar, m_line};
 }
 
 void LogPanel::FocusFilter()
@@ -334,12 +349,25 @@ QString LogPanel::path() const
 
 QString LogPanel::summary() const
 {
-    return LogStateText::Summary(*m_model, m_percent);
+    return LogStateText::Summary(*m_model, m_percent,
+                                 m_view->LineNumber(m_view->currentIndex().row()));
 }
 
 void LogPanel::updatePlaceholder()
 {
     m_view->SetPlaceholder(LogStateText::Placeholder(*m_model, m_percent));
+}
+
+void LogPanel::showContent()
+{
+    const QString notice = LogStateText::ContentNotice(*m_model);
+    if (!m_content && notice.isEmpty())
+        return;
+    if (!m_content) {
+        m_content = new NoticeBar(tr("Kind of file"));
+        AddBar(m_content);
+    }
+    m_content->SetState(notice);
 }
 
 void LogPanel::showCurrentLine()
@@ -348,6 +376,7 @@ void LogPanel::showCurrentLine()
     m_line->SetText(current.isValid() ? m_model->EntryText(current.row(), LogIndex::LineLimit)
                                       : QString());
     m_line->SetNote(m_marks->note());
+    Q_EMIT stateChanged(); // the number of the line
 }
 
 QList<int> LogPanel::columnWidths() const

@@ -22,6 +22,7 @@ namespace Velocor {
 
 class CurrentLine;
 class HighlightRules;
+class LineNumberMargin;
 class LogFileBox;
 class LogFilterBar;
 class LogFindBar;
@@ -29,6 +30,7 @@ class LogGoTo;
 class LogMarkStore;
 class LogModel;
 class LogView;
+class NoticeBar;
 
 /// A log view with its controls: choice of older files, filter, table, and the text of the current
 /// line.
@@ -68,8 +70,14 @@ public:
     /// See LogView::SetLineWrap().
     void SetLineWrap(bool wrapped);
 
+    /// Shows the numbers of the lines in the file beside the rows.
+    void SetLineNumbers(bool shown);
+
     /// Adds a bar above the table. The panel takes ownership.
     void AddBar(QWidget* bar);
+
+    /// Its panes in the order of the screen, some of which may be hidden.
+    QList<QWidget*> Panes() const;
 
     void FocusFilter();
     void ClearFilter();
@@ -156,11 +164,13 @@ private:
     void showFile(QString const& path);
     void showCurrentLine();
     void updatePlaceholder();
+    void showContent();
     void highlight(QString const& text);
     void showMenu(QPoint const& position, QModelIndex const& cell);
 
     LogModel* m_model;
     LogView* m_view;
+    LineNumberMargin* m_numbers;
     LogFileBox* m_files;
     LogFilterBar* m_filterBar;
     LogFindBar* m_findBar;
@@ -170,6 +180,7 @@ private:
     MarkControl* m_marks;
     LineCopier* m_copier;
     LogGoTo* m_goTo;
+    NoticeBar* m_content = nullptr; // null until there is something to tell
     LogMarkStore* m_store = nullptr;
     std::shared_ptr<HighlightRules> m_rules;
     QString m_currentPath; // the log of the running program; empty for other logs

@@ -6,7 +6,10 @@
 #include "app/window/log/LogModel.h"
 
 #include <QCoreApplication>
+#include <QFileInfo>
 #include <QLocale>
+
+#include <algorithm>
 
 namespace Velocor {
 
@@ -17,9 +20,32 @@ struct StateText
     Q_DECLARE_TR_FUNCTIONS(LogStateText)
 };
 
+qulonglong ShownLines(LogModel const& model)
+{
+    const int headings = model.state().rows->earlier() > 0 ? 2 : 0;
+    return static_cast<qulonglong>(model.rowCount() - headings);
+}
+
+QString LinesShown(LogModel const& model)
+{
+    const QLocale locale;
+    const qulonglong lines = model.state().lines;
+    const QString all = lines == 1 ? StateText::tr("1 line")
+                                   : StateText::tr("%1 lines").arg(locale.toString(lines));
+    const qulonglong shown = ShownLines(model);
+    return shown < lines ? StateText::tr("%1 of %2").arg(locale.toString(shown), all) : all;
+}
+
+QString LineOf(LogModel const& model, qulonglong current)
+{
+    const QLocale locale;
+    const qulonglong lines = std::max<qulonglong>(current, model.state().lines);
+    return StateText::tr("Line %1 of %2").arg(locale.toString(current), locale.toString(lines));
+}
+
 } // namespace
 
-QString LogStateText::Summary(LogModel const& model, int percent)
+QString LogStateText::Summary(LogModel const& model, int percent, qulonglong current)
 {
     const bool isReading = model.isReading() && percent < 100;
     LogUpdate const& state = model.state();
@@ -27,22 +53,41 @@ QString LogStateText::Summary(LogModel const& model, int percent)
         return StateText::tr("Reading: %1%").arg(percent);
     const QString separator = QStringLiteral("  %1  ").arg(QChar(0xb7)); // middle dot
     const QLocale locale;
-    const auto lines = static_cast<qlonglong>(state.lines);
-    qlonglong shown = model.rowCount();
-    if (state.rows->earlier() > 0)
-        shown -= 2; // headings
-    const QString all = lines == 1 ? StateText::tr("1 line")
-                                   : StateText::tr("%1 lines").arg(locale.toString(lines));
-    QString text = shown < lines ? StateText::tr("%1 of %2").arg(locale.toString(shown), all) : all;
+    QString text = current > 0 ? LineOf(model, current) : LinesShown(model);
     const auto problems = static_cast<qlonglong>(state.rows->problems());
     text +=
         separator + (problems == 1 ? StateText::tr("1 problem")
                                    : StateText::tr("%1 problems").arg(locale.toString(problems)));
+    if (current > 0 && ShownLines(model) < state.lines)
+        text += separator + StateText::tr("%1 shown").arg(locale.toString(ShownLines(model)));
     if (isReading)
         text += separator + StateText::tr("%1% read").arg(percent);
     if (model.isPaused())
         text += separator + StateText::tr("paused");
     return text;
+}
+
+QString LogStateText::ContentNotice(LogModel const& model)
+{
+    const auto compressed = [&model](char const* program) {
+        return StateText::tr("This looks like a compressed file. To read it: %1 %2 | velocor -")
+            .arg(QLatin1String(program), QFileInfo(model.path()).fileName());
+    };
+    switch (model.state().type.content) {
+    case LogFileType::Gzip:
+        return compressed("zcat");
+    case LogFileType::Xz:
+        return compressed("xzcat");
+    case LogFileType::Bzip2:
+        return compressed("bzcat");
+    case LogFileType::Zstd:
+        return compressed("zstdcat");
+    case LogFileType::Binary:
+        return StateText::tr("This looks like a binary file. Its bytes are shown as text.");
+    case LogFileType::Text:
+        break;
+    }
+    return QString();
 }
 
 QString LogStateText::Placeholder(LogModel const& model, int percent)

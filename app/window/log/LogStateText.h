@@ -4,6 +4,7 @@
 #pragma once
 
 #include <QString>
+#include <QtGlobal>
 
 namespace Velocor {
 
@@ -16,7 +17,11 @@ public:
     /// A short summary of the rows, for the status bar.
     ///
     /// @param percent  how much of the file has been read
-    static QString Summary(LogModel const& model, int percent);
+    /// @param current  the number of the current line in the file; 0 if there is none
+    static QString Summary(LogModel const& model, int percent, qulonglong current);
+
+    /// Says that the file is not text, and how to read it; empty if it seems to be.
+    static QString ContentNotice(LogModel const& model);
 
     /// What to show while there are no rows.
     ///

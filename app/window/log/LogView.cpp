@@ -22,6 +22,14 @@
 
 namespace Velocor {
 
+namespace {
+
+// How far the current line is looked for in a file that was replaced, in rows: this takes no longer
+// than a frame or two.
+constexpr int MaximumMove = 500 * 1000;
+
+} // namespace
+
 LogView::LogView(LogModel* model, QWidget* parent)
     : WrappingTable(new LogDelegate, parent), m_model(model), m_ticks(new TickScrollBar(this))
 {
@@ -111,6 +119,8 @@ void LogView::focusInEvent(QFocusEvent* event)
 // With Ctrl, Qt makes the row current without selecting it, so that another one would be copied.
 void LogView::keyPressEvent(QKeyEvent* event)
 {
+    const bool isSideways = event->key() == Qt::Key_Left || event->key() == Qt::Key_Right;
+    const QScopedValueRollback<bool> guard(m_goesSideways, isSideways);
     const bool isEnd = event->key() == Qt::Key_Home || event->key() == Qt::Key_End;
     if (!isEnd || !(event->modifiers() & Qt::ControlModifier)) {
         WrappingTable::keyPressEvent(event);
@@ -119,6 +129,14 @@ void LogView::keyPressEvent(QKeyEvent* event)
     QKeyEvent plain(event->type(), event->key(), event->modifiers() & ~Qt::ControlModifier);
     WrappingTable::keyPressEvent(&plain);
     event->setAccepted(plain.isAccepted());
+}
+
+void LogView::scrollTo(QModelIndex const& index, ScrollHint hint)
+{
+    const int across = horizontalScrollBar()->value();
+    WrappingTable::scrollTo(index, hint);
+    if (!m_goesSideways)
+        horizontalScrollBar()->setValue(across);
 }
 
 // Home and End go to the first and the last row, not to the ends of a row. While no row is current,
@@ -244,6 +262,14 @@ void LogView::afterRefresh()
     viewport()->update();
 }
 
+// The text as it was when it became current: what was written over cannot be read any more.
+void LogView::currentChanged(QModelIndex const& current, QModelIndex const& previous)
+{
+    WrappingTable::currentChanged(current, previous);
+    m_currentText =
+        current.isValid() ? m_model->LineText(current.row(), LogModel::ShownLimit) : QString();
+}
+
 void LogView::noteCurrent()
 {
     const int row = currentIndex().row();
@@ -251,28 +277,56 @@ void LogView::noteCurrent()
         return;
     m_keptPath = m_model->path();
     m_keptStart = m_model->LineStart(row);
-    m_keptText = m_model->LineText(row, LogModel::ShownLimit);
+    m_keptCheck = m_model->state().rows->check(static_cast<size_t>(row));
+    m_keptText = m_currentText;
     const int visible = viewport()->height() / std::max(1, rowHeight(row)) - 1;
+    m_wasInView = row >= rowAt(0) && row <= rowAt(0) + visible;
     m_keptDistance = qBound(0, row - rowAt(0), std::max(0, visible));
 }
 
-// After the rows were replaced. Another file has its own current line, and so has one whose lines
-// were written over.
+// The row of the line that was current or, if that is filtered out, the nearest one. If the file
+// was replaced, the line may be at another place of it; -1 if it is gone.
+int LogView::keptRow(qint64 start) const
+{
+    LogRows const& rows = *m_model->state().rows;
+    const int near = m_model->RowNear(start);
+    if (near < 0 || rows.lines().isEmpty())
+        return -1;
+    const size_t line = rows.lines().LineAt(start);
+    if (rows.lines().start(line) == start && rows.lines().check(line) == m_keptCheck)
+        return near;
+    const auto isKept = [&](int row) {
+        return row >= 0 && row < m_model->rowCount() &&
+               rows.check(static_cast<size_t>(row)) == m_keptCheck &&
+               m_model->LineText(row, LogModel::ShownLimit) == m_keptText;
+    };
+    for (int distance = 0; distance < MaximumMove; ++distance) {
+        if (isKept(near - distance))
+            return near - distance;
+        if (isKept(near + distance))
+            return near + distance;
+    }
+    return -1;
+}
+
+// After the rows were replaced. Another file has its own current line.
 void LogView::restoreCurrent()
 {
     if (m_keptStart < 0 || m_model->isReading())
         return;
     const qint64 start = m_keptStart;
     m_keptStart = -1;
-    const int row = m_model->path() == m_keptPath ? m_model->RowNear(start) : -1;
-    const bool isOther = row >= 0 && m_model->LineStart(row) == start &&
-                         m_model->LineText(row, LogModel::ShownLimit) != m_keptText;
-    if (row < 0 || isOther || currentIndex().isValid())
+    const int row = m_model->path() == m_keptPath ? keptRow(start) : -1;
+    if (row < 0 || currentIndex().isValid())
         return;
     const QModelIndex index = m_model->index(row, firstColumn());
     select(index);
-    if (row + 1 < m_model->rowCount())
+    if (m_following) {
+        goToEnd();
+        if (!m_wasInView || row >= rowAt(0))
+            return;
         SetFollowing(false);
+    }
     updateGeometries(); // updates the scroll bar's range
     verticalScrollBar()->setValue(row - m_keptDistance);
     if (isWrapped())
@@ -298,6 +352,13 @@ bool LogView::isSpanning(int row) const
     return earlier > 0 && (row == 0 || row == earlier);
 }
 
+// The heading cannot be selected, so no key would lead to it.
+int LogView::topFor(int row, ScrollHint hint) const
+{
+    const int top = WrappingTable::topFor(row, hint);
+    return top == 1 && row == 1 && isSpanning(0) && hint == EnsureVisible ? 0 : top;
+}
+
 int LogView::StartRow(int step) const
 {
     if (currentIndex().isValid())
@@ -315,6 +376,23 @@ int LogView::firstColumn() const
     while (isColumnHidden(column))
         ++column;
     return column;
+}
+
+QModelIndex LogView::FirstCell(int row) const
+{
+    return m_model->index(row, isSpanning(row) ? 0 : firstColumn());
+}
+
+qulonglong LogView::LineNumber(int row) const
+{
+    if (row < 0 || row >= m_model->rowCount() || m_model->LineStart(row) < 0)
+        return 0;
+    return m_model->state().rows->line(static_cast<size_t>(row)) + 1;
+}
+
+qulonglong LogView::LineCount() const
+{
+    return m_model->state().lines;
 }
 
 LogView::Jump LogView::GoToProblem(int step)

@@ -18,8 +18,9 @@ class TickScrollBar;
 /// The table of a log: keeps its position while rows change, or follows the newest entry.
 ///
 /// Following stops when the user scrolls away from the end and resumes on scrolling back to it. The
-/// current line stays current and in view when the filter changes; if it is filtered out, the
-/// nearest one takes its place.
+/// current line stays current when the file is read again, wherever it is then, and when the filter
+/// changes; if it is filtered out, the nearest one takes its place. If it was in view, it stays so,
+/// even if that ends following.
 class LogView : public WrappingTable
 {
     Q_OBJECT
@@ -53,6 +54,16 @@ public:
     /// the rows in view.
     int StartRow(int step) const;
 
+    /// The first cell of a row that is shown.
+    QModelIndex FirstCell(int row) const;
+
+    /// The number of a row's line in the file, starting at 1; 0 for a heading and if there is no
+    /// such row.
+    qulonglong LineNumber(int row) const;
+
+    /// How many lines the file has.
+    qulonglong LineCount() const;
+
     /// Highlights the matches of a text to find.
     void SetFound(LogFilter const& found);
 
@@ -64,6 +75,10 @@ public:
 
     /// The numbers of the selected rows in ascending order, at most MaximumCopiedLines.
     QList<int> SelectedRows() const;
+
+    /// Rows are selected as a whole, so going from row to row does not scroll sideways; the Left
+    /// and Right keys do.
+    void scrollTo(QModelIndex const& index, ScrollHint hint = EnsureVisible) override;
 
     /// The text that is shown while the table is empty.
     void SetPlaceholder(QString const& text);
@@ -88,11 +103,13 @@ Q_SIGNALS:
 
 protected:
     bool isSpanning(int row) const override;
+    int topFor(int row, ScrollHint hint) const override;
     void paintEvent(QPaintEvent* event) override;
     void contextMenuEvent(QContextMenuEvent* event) override;
     void changeEvent(QEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
     void focusInEvent(QFocusEvent* event) override;
+    void currentChanged(QModelIndex const& current, QModelIndex const& previous) override;
     void keyPressEvent(QKeyEvent* event) override;
     QModelIndex moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) override;
     void rowsInserted(QModelIndex const& parent, int first, int last) override;
@@ -105,6 +122,7 @@ private:
     void goToEnd();
     void afterRefresh();
     void noteCurrent();
+    int keptRow(qint64 start) const;
     void restoreCurrent();
     int firstColumn() const;
     int lastRowInView() const;
@@ -118,12 +136,17 @@ private:
     QString m_fittedPath;
     bool m_following = true;
     bool m_scrollingItself = false;
+    bool m_goesSideways = false;
+
+    QString m_currentText;
 
     // The current line and its distance from the top, while the rows are replaced.
     QString m_keptPath;
     QString m_keptText;
     qint64 m_keptStart = -1;
+    quint16 m_keptCheck = 0;
     int m_keptDistance = 0;
+    bool m_wasInView = false;
 };
 
 } // namespace Velocor

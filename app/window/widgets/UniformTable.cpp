@@ -73,6 +73,14 @@ void UniformTable::SetRowHeight(int height)
     scheduleDelayedItemsLayout();
 }
 
+void UniformTable::SetLeftMargin(int width)
+{
+    if (width == m_leftMargin)
+        return;
+    m_leftMargin = width;
+    updateGeometries();
+}
+
 int UniformTable::rowHeight(int row) const
 {
     return heightOf(row);
@@ -223,7 +231,7 @@ void UniformTable::updateGeometries()
     if (!header->isHidden())
         height = std::min(std::max(header->minimumHeight(), header->sizeHint().height()),
                           header->maximumHeight());
-    setViewportMargins(0, height, 0, 0);
+    setViewportMargins(m_leftMargin, height, 0, 0);
     updateScrollBars();
     const QRect view = viewport()->geometry();
     header->setGeometry(view.left(), view.top() - height, view.width(), height);

@@ -30,6 +30,9 @@ public:
     /// Sets the height of all rows, in pixels.
     void SetRowHeight(int height);
 
+    /// Leaves room beside the rows, in pixels.
+    void SetLeftMargin(int width);
+
     /// The height of a row.
     int rowHeight(int row = 0) const;
 
@@ -97,6 +100,7 @@ private:
 
     QVector<QMetaObject::Connection> m_connections; // to the model
     int m_rowHeight = 20;
+    int m_leftMargin = 0;
     bool m_isUpdatingGeometries = false;
     QModelIndex m_hovered; // while painting
 };
