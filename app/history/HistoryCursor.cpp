@@ -93,7 +93,8 @@ bool HistoryCursor::Next()
         m_line = line;
         m_mark = file().rows().mark(m_row);
         ++m_row;
-        m_content = m_lines->Content(line);
+        m_bytes = m_lines->Bytes(line);
+        m_content = m_lines->Content(line, m_bytes);
         if (!m_lines->IsSame(line, m_content))
             continue;
         if (m_withTimes) {

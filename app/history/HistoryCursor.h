@@ -39,6 +39,9 @@ public:
     /// @return valid until the next call of Next()
     QByteArray const& content() const { return m_content; }
 
+    /// The same with its line end, which the last line of a file may lack.
+    QByteArray const& bytes() const { return m_bytes; }
+
     HistoryRun const& run() const { return m_history->runs()[m_run]; }
     HistoryFile const& file() const { return m_lines->file(); }
     size_t line() const { return m_line; } ///< its number in the file, starting at 0
@@ -76,6 +79,7 @@ private:
 
     size_t m_line = 0;
     quint8 m_mark = 0;
+    QByteArray m_bytes;
     QByteArray m_content;
     qint64 m_time = -1;
     qint64 m_key = -1;

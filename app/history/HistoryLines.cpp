@@ -19,16 +19,22 @@ qint64 HistoryLines::start(size_t line)
     return line < m_lines->size() ? m_starts.start(line) : m_file->rows().end();
 }
 
-QByteArray HistoryLines::Content(size_t line)
+QByteArray HistoryLines::Bytes(size_t line)
 {
     const qint64 begin = start(line);
-    const bool isComplete = begin < m_file->rows().complete();
-    const qint64 length = start(line + 1) - begin - (isComplete ? m_lineEnd.size() : 0);
-    const QByteArray bytes =
-        m_bytes.At(begin, static_cast<int>(std::min<qint64>(length, LogIndex::LineLimit)));
+    const qint64 length = start(line + 1) - begin;
+    return m_bytes.At(begin, static_cast<int>(std::min<qint64>(length, LogIndex::LineLimit)));
+}
+
+QByteArray HistoryLines::Content(size_t line, QByteArray const& bytes)
+{
+    const qint64 begin = start(line);
+    const bool isWhole =
+        begin < m_file->rows().complete() && begin + bytes.size() == start(line + 1);
+    const int length = std::max(0, bytes.size() - (isWhole ? m_lineEnd.size() : 0));
     LogEncoding const& encoding = m_file->parser().fileType().encoding;
     return QByteArray::fromRawData(bytes.constData(),
-                                   encoding.WithoutReturn(bytes.constData(), bytes.size()));
+                                   encoding.WithoutReturn(bytes.constData(), length));
 }
 
 bool HistoryLines::IsSame(size_t line, QByteArray const& content) const

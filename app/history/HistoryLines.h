@@ -26,10 +26,17 @@ public:
     /// Where a line starts in the file; where the file ended for the line after the last one.
     qint64 start(size_t line);
 
-    /// A line without its line end, as stored in the file; at most LogIndex::LineLimit bytes.
+    /// A line as stored in the file, with its line end, which the last line may lack; at most
+    /// LogIndex::LineLimit bytes.
     ///
     /// @return refers to memory of this object: valid until the next call
-    QByteArray Content(size_t line);
+    QByteArray Bytes(size_t line);
+
+    /// A line without its line end.
+    ///
+    /// @param bytes  from Bytes(), whose memory the result refers to
+    QByteArray Content(size_t line, QByteArray const& bytes);
+    QByteArray Content(size_t line) { return Content(line, Bytes(line)); }
 
     /// Whether a line is the one that was indexed, so that the log has not overwritten it since.
     bool IsSame(size_t line, QByteArray const& content) const;
