@@ -135,9 +135,12 @@ void tst_HistoryLives::compareMerged(std::vector<std::unique_ptr<ProgramLife>> c
     for (size_t i = 0; i < lives.size(); ++i)
         parts.append(QList<QByteArray>());
     HistoryMerge merge(std::move(cursors));
+    qint64 lastKey = -1;
     qint64 lastTime = 0;
     size_t lastLog = 0;
     while (merge.Next()) {
+        QVERIFY2(merge.cursor().key() >= lastKey, "the order is not that of the keys");
+        lastKey = merge.cursor().key();
         parts[static_cast<int>(merge.log())].append(
             QByteArray(merge.cursor().content().constData(), merge.cursor().content().size()));
         ProgramLife::Line const* written = lives[merge.log()]->written(merge.cursor().content());
