@@ -7,10 +7,8 @@
 #include "app/MruSeparator_p.h"
 
 #include <QAction>
-#include <QCoreApplication>
 #include <QListWidget>
 #include <QMenu>
-#include <QStandardPaths>
 #include <QStringList>
 
 namespace {
@@ -18,17 +16,6 @@ namespace {
 QStringList Entries(QString const& list)
 {
     return list.split(Velocor::MruSeparator);
-}
-
-QString Location(QStandardPaths::StandardLocation location)
-{
-    return QStandardPaths::writableLocation(location) + QLatin1Char('/');
-}
-
-QString BeforeLast(QString const& text, QString const& separator)
-{
-    const int position = text.lastIndexOf(separator);
-    return position < 0 ? text : text.left(position);
 }
 
 // Adds or removes one entry. Returns false if nothing changes.
@@ -46,46 +33,6 @@ bool Update(QStringList& entries, QString const& file, AppUtils::MRUOpCode op)
 }
 
 } // namespace
-
-void AppUtils::SetupRootPath(QString& path)
-{
-    if (!path.isEmpty())
-        return;
-
-    // The executable is in X/Some.app/Contents/MacOS in a bundle, in X/bin otherwise: return X.
-    const QString folder =
-        BeforeLast(QCoreApplication::applicationDirPath(), QStringLiteral("/Contents/MacOS"));
-    path = BeforeLast(folder, QStringLiteral("/")) + QLatin1Char('/');
-}
-
-void AppUtils::SetupProgramPath(QString& path)
-{
-    SetupRootPath(path);
-}
-
-void AppUtils::SetupDataRootPath(QString& path)
-{
-    path = Location(QStandardPaths::DataLocation);
-}
-
-void AppUtils::SetupDocumentPath(QString& path)
-{
-    path = Location(QStandardPaths::DocumentsLocation);
-}
-
-void AppUtils::SetOrganizationAndProduct(QString const& organization, QString const& product)
-{
-    QCoreApplication::setOrganizationName(organization);
-    QCoreApplication::setApplicationName(product);
-}
-
-void AppUtils::SetupPaths(QString const& organization, QString const& product, QString& root,
-                          QString& data)
-{
-    SetOrganizationAndProduct(organization, product);
-    SetupRootPath(root);
-    SetupDataRootPath(data);
-}
 
 bool AppUtils::SetupMRUMenu(QMenu* menu, QString const& list)
 {

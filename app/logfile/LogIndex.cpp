@@ -529,6 +529,14 @@ size_t LogIndex::entryEndBefore(size_t line) const
     return first + (LogRows::BeginsEntry(m_lines.mark(first)) ? MaximumEntryLines : 1);
 }
 
+std::vector<size_t> LogIndex::RunStarts() const
+{
+    std::vector<size_t> starts;
+    for (Run const& run : m_runs)
+        starts.push_back(run.firstLine);
+    return starts;
+}
+
 size_t LogIndex::endOfRun(size_t number) const
 {
     return number + 1 == m_runs.size() ? m_lines.size() : m_runs[number + 1].firstLine;

@@ -127,6 +127,9 @@ public:
     /// lines that do not continue an entry; see LogRows::Continued.
     LogCounts const& counts() const { return m_counts; }
 
+    /// The first line of each run, in the order of the file: the newest run first.
+    std::vector<size_t> RunStarts() const;
+
     /// Whether the file was seen growing at its end, so that all of its lines are of one run.
     bool isOneRun() const { return m_isOneRun; }
 

@@ -1,0 +1,195 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/terminal/LineWriter.h"
+
+#include "app/logfile/LogSeverities.h"
+#include "app/terminal/TextFormats.h"
+
+#include <algorithm>
+
+namespace Velocor {
+
+namespace {
+
+constexpr QLatin1Char Blank(' ');
+
+LogEncoding EncodingOf(HistoryCursor const& cursor)
+{
+    return cursor.file().parser().fileType().encoding;
+}
+
+// The columns of text: those of programs, of their widest name, and the lines.
+class ProgramColumn
+{
+public:
+    ProgramColumn(bool isShown, QStringList const& names) : m_isShown(isShown)
+    {
+        for (QString const& name : names)
+            m_width = std::max(m_width, name.size());
+    }
+
+    QString text(QString const& program) const
+    {
+        return m_isShown ? TextFormats::Harmless(program).leftJustified(m_width) + Blank + Blank
+                         : QString();
+    }
+
+private:
+    bool m_isShown;
+    int m_width = 0;
+};
+
+// The bytes of the lines as they are in the files. Those in UTF-16 become UTF-8: their line ends
+// could not be told from others'.
+class TextLines : public LineWriter
+{
+public:
+    TextLines(ProgramColumn const& programs, OutputBuffer& output)
+        : m_programs(programs), m_output(&output)
+    {}
+
+    void Write(QString const& program, HistoryCursor& cursor) override
+    {
+        m_output->Write(m_programs.text(program).toLocal8Bit());
+        QByteArray const& bytes = cursor.bytes();
+        if (EncodingOf(cursor).isWide()) {
+            m_output->Write(cursor.file().parser().Text(cursor.content()).toUtf8() + '\n');
+            return;
+        }
+        m_output->Write(bytes);
+        if (!bytes.endsWith('\n'))
+            m_output->Write("\n", 1);
+    }
+
+private:
+    ProgramColumn m_programs;
+    OutputBuffer* m_output;
+};
+
+// The same for people at a terminal, which knows one encoding and obeys escape sequences.
+class TerminalLines : public LineWriter
+{
+public:
+    TerminalLines(ProgramColumn const& programs, OutputBuffer& output)
+        : m_programs(programs), m_output(&output)
+    {
+        const QByteArray terminal = qgetenv("TERM");
+        m_isColored = qEnvironmentVariableIsEmpty("NO_COLOR") && terminal != "dumb";
+    }
+
+    void Write(QString const& program, HistoryCursor& cursor) override
+    {
+        const auto severity =
+            static_cast<LogEntry::Severity>(cursor.mark() & LogRows::SeverityMask);
+        const QString line = TextFormats::Harmless(cursor.file().parser().Text(cursor.content()));
+        const QByteArray text = (m_programs.text(program) + line).toLocal8Bit();
+        if (m_isColored && LogSeverities::IsProblem(severity))
+            m_output->Write((severity == LogEntry::Warning ? "\033[33m" : "\033[31m") + text +
+                            "\033[0m\n");
+        else
+            m_output->Write(text + '\n');
+    }
+
+private:
+    ProgramColumn m_programs;
+    OutputBuffer* m_output;
+    bool m_isColored;
+};
+
+class MarkdownLines : public LineWriter
+{
+public:
+    MarkdownLines(ProgramColumn const& programs, OutputBuffer& output)
+        : m_programs(programs), m_output(&output)
+    {}
+
+    void Write(QString const& program, HistoryCursor& cursor) override
+    {
+        const QString line = cursor.file().parser().Text(cursor.content());
+        m_lines += (m_programs.text(program) + line).toUtf8() + '\n';
+    }
+
+    void End() override { m_output->Write(TextFormats::MarkdownBlock(m_lines)); }
+
+private:
+    ProgramColumn m_programs;
+    OutputBuffer* m_output;
+    QByteArray m_lines; // the fence has to be longer than any in them
+};
+
+class CsvLines : public LineWriter
+{
+public:
+    explicit CsvLines(OutputBuffer& output) : m_output(&output)
+    {
+        m_output->Write(TextFormats::CsvRecord(
+            {QStringLiteral("program"), QStringLiteral("file"), QStringLiteral("line"),
+             QStringLiteral("time"), QStringLiteral("severity"), QStringLiteral("elapsed"),
+             QStringLiteral("message")}));
+    }
+
+    void Write(QString const& program, HistoryCursor& cursor) override
+    {
+        const LogEntry entry = cursor.file().parser().Parse(cursor.content());
+        m_output->Write(TextFormats::CsvRecord(
+            {program, cursor.file().path(), QString::number(cursor.line() + 1),
+             TextFormats::Time(cursor.time()),
+             QString::fromLatin1(LogSeverities::LoggedName(entry.severity)), entry.elapsed,
+             entry.message}));
+    }
+
+private:
+    OutputBuffer* m_output;
+};
+
+class JsonLines : public LineWriter
+{
+public:
+    explicit JsonLines(OutputBuffer& output) : m_output(&output) {}
+
+    void Write(QString const& program, HistoryCursor& cursor) override
+    {
+        const LogEntry entry = cursor.file().parser().Parse(cursor.content());
+        QVector<QPair<char const*, QString>> members = {
+            {"program", TextFormats::JsonText(program)},
+            {"file", TextFormats::JsonText(cursor.file().path())},
+            {"line", QString::number(cursor.line() + 1)}};
+        const auto add = [&members](char const* name, QString const& text) {
+            if (!text.isEmpty())
+                members.append({name, TextFormats::JsonText(text)});
+        };
+        add("time", TextFormats::Time(cursor.time()));
+        add("severity", QString::fromLatin1(LogSeverities::LoggedName(entry.severity)));
+        if (!entry.elapsed.isEmpty())
+            members.append({"elapsed", QString::number(entry.elapsed.toLongLong())});
+        members.append({"message", TextFormats::JsonText(entry.message)});
+        m_output->Write(TextFormats::JsonLine(members));
+    }
+
+private:
+    OutputBuffer* m_output;
+};
+
+} // namespace
+
+std::unique_ptr<LineWriter> LineWriter::Make(TerminalOptions const& options, bool isTerminal,
+                                             QStringList const& names, OutputBuffer& output)
+{
+    const ProgramColumn programs(options.showsProgram, names);
+    switch (options.format) {
+    case TerminalOptions::Text:
+        break;
+    case TerminalOptions::Markdown:
+        return std::make_unique<MarkdownLines>(programs, output);
+    case TerminalOptions::Csv:
+        return std::make_unique<CsvLines>(output);
+    case TerminalOptions::Json:
+        return std::make_unique<JsonLines>(output);
+    }
+    if (isTerminal)
+        return std::make_unique<TerminalLines>(programs, output);
+    return std::make_unique<TextLines>(programs, output);
+}
+
+} // namespace Velocor

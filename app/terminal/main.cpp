@@ -1,0 +1,179 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/AppPaths.h"
+#include "app/history/HistoryMerge.h"
+#include "app/history/LogFormats.h"
+#include "app/terminal/LineWriter.h"
+#include "app/terminal/LogSources.h"
+#include "app/terminal/OutputBuffer.h"
+#include "app/terminal/RunTable.h"
+#include "app/terminal/TerminalOptions.h"
+
+#include <QCoreApplication>
+#include <QObject>
+
+#include <cstdio>
+#include <memory>
+#include <unistd.h>
+#include <vector>
+
+namespace {
+
+using namespace Velocor; // NOLINT(google-build-using-namespace): all of this file is about it
+
+// As grep has them.
+enum ExitCode { Found = 0, NothingFound = 1, Trouble = 2 };
+
+class Command
+{
+public:
+    explicit Command(TerminalOptions options)
+        : m_options(std::move(options)), m_sources(m_options.names, m_options.isMerged)
+    {}
+
+    int run();
+
+private:
+    std::unique_ptr<LogHistory> read(LogSource const& source, LogFilter const& filter);
+    void complain(QString const& problem);
+    void printRuns();
+    void printLines();
+    void printOneByOne(LineWriter& writer, bool withTimes);
+    void printMerged(LineWriter& writer);
+    void print(LogSource const& source, HistoryCursor& cursor, LineWriter& writer);
+    bool isInSpan(qint64 time) const;
+
+    TerminalOptions m_options;
+    LogSources m_sources;
+    OutputBuffer m_output;
+    bool m_isFound = false;
+    bool m_hasTrouble = false;
+};
+
+void Command::complain(QString const& problem)
+{
+    m_hasTrouble = true;
+    m_output.Flush(); // so that the complaint comes after the lines before it
+    std::fprintf(stderr, "velocor-log: %s\n", problem.toLocal8Bit().constData());
+}
+
+std::unique_ptr<LogHistory> Command::read(LogSource const& source, LogFilter const& filter)
+{
+    auto history = std::make_unique<LogHistory>(LogFormats::ParserFor(source.path()), filter);
+    source.Read(*history);
+    for (QString const& error : history->errors())
+        complain(error);
+    for (HistoryFile const& file : history->files()) {
+        if (file.slowLine() > 0)
+            complain(QObject::tr("%1: line %2: the expression takes too long, so all lines count "
+                                 "as matches")
+                         .arg(file.path())
+                         .arg(file.slowLine()));
+    }
+    return history;
+}
+
+void Command::printRuns()
+{
+    RunTable table;
+    for (LogSource const& source : m_sources.sources()) {
+        const std::unique_ptr<LogHistory> history = read(source, LogFilter());
+        history->ReadTimes();
+        table.Add(source.name, *history);
+    }
+    if (m_options.isMerged)
+        table.SortByTime();
+    m_isFound = !table.isEmpty();
+    table.Print(m_options.format, m_output);
+}
+
+bool Command::isInSpan(qint64 time) const
+{
+    if (!m_options.hasTimes())
+        return true;
+    return time >= 0 && time >= m_options.since && (m_options.until < 0 || time <= m_options.until);
+}
+
+void Command::print(LogSource const& source, HistoryCursor& cursor, LineWriter& writer)
+{
+    if (!isInSpan(cursor.time()))
+        return;
+    m_isFound = true;
+    writer.Write(source.name, cursor);
+}
+
+// One log after the other, so that only one is in memory.
+void Command::printOneByOne(LineWriter& writer, bool withTimes)
+{
+    for (LogSource const& source : m_sources.sources()) {
+        const std::unique_ptr<LogHistory> history = read(source, m_options.filter);
+        HistoryCursor cursor(*history, withTimes);
+        while (m_output.error() == 0 && cursor.Next())
+            print(source, cursor, writer);
+    }
+}
+
+void Command::printMerged(LineWriter& writer)
+{
+    std::vector<std::unique_ptr<LogHistory>> histories;
+    std::vector<HistoryCursor> cursors;
+    for (LogSource const& source : m_sources.sources()) {
+        histories.push_back(read(source, m_options.filter));
+        cursors.emplace_back(*histories.back(), true);
+    }
+    HistoryMerge merge(std::move(cursors));
+    while (m_output.error() == 0 && merge.Next())
+        print(m_sources.sources().at(static_cast<int>(merge.log())), merge.cursor(), writer);
+}
+
+void Command::printLines()
+{
+    QStringList names;
+    for (LogSource const& source : m_sources.sources())
+        names.append(source.name);
+    const auto writer = LineWriter::Make(m_options, isatty(STDOUT_FILENO) == 1, names, m_output);
+    const bool withTimes = m_options.hasTimes() || m_options.format == TerminalOptions::Csv ||
+                           m_options.format == TerminalOptions::Json;
+    if (m_options.isMerged)
+        printMerged(*writer);
+    else
+        printOneByOne(*writer, withTimes);
+    writer->End();
+}
+
+int Command::run()
+{
+    for (QString const& error : m_sources.errors())
+        complain(error);
+    if (m_options.showsRuns)
+        printRuns();
+    else
+        printLines();
+    if (!m_output.Flush())
+        complain(QObject::tr("Standard output cannot be written: %1")
+                     .arg(qt_error_string(m_output.error())));
+    if (m_hasTrouble)
+        return Trouble;
+    return m_isFound ? Found : NothingFound;
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    const QCoreApplication application(argc, argv);
+    AppPaths::SetOrganizationAndProduct();
+    TerminalOptions options = TerminalOptions::Parse(QCoreApplication::arguments());
+    if (!options.error.isEmpty()) {
+        const QByteArray error = options.error.toLocal8Bit();
+        std::fprintf(stderr, "velocor-log: %s\n", error.constData());
+        return Trouble;
+    }
+    if (!options.answer.isEmpty()) {
+        OutputBuffer output;
+        output.Write(options.answer);
+        return output.Flush() ? Found : Trouble;
+    }
+    return Command(std::move(options)).run();
+}

@@ -1,0 +1,348 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/ProgramRuns.h"
+#include "support/TestFiles.h"
+
+#include <QTemporaryDir>
+#include <QtTest>
+
+#include <csignal>
+#include <sys/stat.h>
+
+namespace {
+
+QByteArray const Notes = "2025-03-03 09:00:00.001 Trace start\n"
+                         "2025-03-03 09:00:01.001 Warning disk\n"
+                         "nearly full\n"
+                         "rest\n"
+                         "2025-03-02 08:00:00.001 Error a\n"
+                         "2025-03-02 08:00:05.001 Notification disk of b, \"x\"\n";
+QByteArray const OlderNotes = "2025-03-01 07:00:00.001 Fatal older\n";
+QByteArray const Mail = "2025-03-02 10:00:00.001 Trace dT:[12] mail\n"
+                        "2025-03-03 09:00:00.501 Error `mail`\n";
+
+QStringList Words(QString const& arguments)
+{
+    return arguments.isEmpty() ? QStringList() : arguments.split(' ');
+}
+
+} // namespace
+
+class tst_VelocorLog : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void initTestCase();
+    void lines_data();
+    void lines();
+    void formats_data();
+    void formats();
+    void runs();
+    void problems_data();
+    void problems();
+    void relativeTimes();
+    void standardInput();
+    void bytesAsInFile_data();
+    void bytesAsInFile();
+    void terminal();
+    void readerThatLeaves();
+    void fullDisk();
+
+private:
+    ProgramResult run(QStringList const& arguments) const
+    {
+        return RunProgram(VELOCOR_LOG, arguments, m_environment);
+    }
+    QString file(QString const& name) const { return m_folder.filePath(name); }
+
+    QTemporaryDir m_folder;
+    QProcessEnvironment m_environment;
+};
+
+void tst_VelocorLog::initTestCase()
+{
+    m_environment = PrivateEnvironment(m_folder.path());
+    m_environment.insert("LC_ALL", "C.UTF-8");
+    const QString family = file("data/yourorganization/");
+    QVERIFY(TestFiles::write(family + "Notes/logs/notes.log", Notes));
+    QVERIFY(TestFiles::write(family + "Notes/logs/notes.log.1", OlderNotes));
+    QVERIFY(TestFiles::write(family + "Mail/logs/mail.log", Mail));
+    QVERIFY(TestFiles::write(file("a.log"), Notes));
+    QVERIFY(TestFiles::write(file("a.log.1"), OlderNotes));
+    QDir::setCurrent(m_folder.path());
+}
+
+// What is printed, as the last letters of the lines.
+void tst_VelocorLog::lines_data()
+{
+    QTest::addColumn<QString>("arguments");
+    QTest::addColumn<QByteArray>("ends");
+    QTest::addColumn<int>("exitCode");
+    const auto row = [](char const* name, char const* arguments, char const* ends,
+                        int exitCode = 0) {
+        QTest::newRow(name) << QString(arguments) << QByteArray(ends) << exitCode;
+    };
+    row("a file alone", "a.log", "ta\"tkl");
+    row("files in the order of the command line", "a.log a.log.1", "ta\"tklr");
+    row("files of one log by age", "--merge a.log a.log.1", "rta\"tkl");
+    row("all of a program's log", "notes", "rta\"tkl");
+    row("two programs", "Mail notes", "l`rta\"tkl");
+    row("by time", "Mail notes --merge", "rta\"lt`kl");
+    row("all programs by time", "--merge", "rta\"lt`kl");
+    row("one severity", "notes --severity error", "a");
+    row("severities", "notes --severity error,fatal", "ra");
+    row("a severity and worse", "notes --severity Warning+", "rakl");
+    row("lines without a severity", "notes --severity none", "t");
+    row("an expression: whole entries", "notes --match (full|older)", "rkl");
+    row("an expression is case-sensitive", "notes --match FULL", "", 1);
+    row("unless it says otherwise", "notes --match (?i)FULL", "kl");
+    row("nothing found", "notes --match nothing", "", 1);
+    row("excluded", "notes --exclude disk --exclude older", "tat");
+    row("context", "notes --match start --context 1", "tk");
+    row("context ends with a run", "a.log --match ^rest --context 1", "ta");
+    row("since", "notes --since 2025-03-03", "tkl");
+    row("since a moment", "notes --since 2025-03-02T08:00:05", "\"tkl");
+    row("until", "notes --until 2025-03-02T08:00:00.001", "rta");
+    row("a span", "--merge --since 2025-03-02T08:00:05 --until 2025-03-03T09:00:00.501", "\"lt`");
+    row("all programs with a filter", "--match mail", "l`");
+}
+
+void tst_VelocorLog::lines()
+{
+    QFETCH(QString, arguments);
+    QFETCH(QByteArray, ends);
+    QFETCH(int, exitCode);
+    const ProgramResult result = run(Words(arguments));
+    QVERIFY(result.finished);
+    QCOMPARE(result.errors, QByteArray());
+    QByteArray found;
+    for (QByteArray const& line : result.output.split('\n'))
+        found += line.right(1);
+    QCOMPARE(found, ends);
+    QCOMPARE(result.exitCode, exitCode);
+}
+
+void tst_VelocorLog::formats_data()
+{
+    QTest::addColumn<QString>("arguments");
+    QTest::addColumn<QByteArray>("output");
+    const QByteArray path = QFile::encodeName(m_folder.path());
+    const QByteArray mail = path + "/data/yourorganization/Mail/logs/mail.log";
+    const QByteArray notes = path + "/data/yourorganization/Notes/logs/notes.log";
+    QTest::newRow("text, as in the files") << "mail" << Mail;
+    QTest::newRow("a column of programs")
+        << "mail notes --program --severity error --merge"
+        << QByteArray("Notes  2025-03-02 08:00:00.001 Error a\n"
+                      "Mail   2025-03-03 09:00:00.501 Error `mail`\n");
+    QTest::newRow("Markdown") << "mail --severity error --format markdown"
+                              << QByteArray("```\n2025-03-03 09:00:00.501 Error `mail`\n```\n");
+    QTest::newRow("CSV")
+        << "mail notes --match (Trace|x) --format csv"
+        << "\"program\",\"file\",\"line\",\"time\",\"severity\",\"elapsed\",\"message\"\r\n"
+           "\"Mail\",\"" +
+               mail +
+               "\",\"1\",\"2025-03-02T10:00:00.001\",\"Trace\",\"12\",\"mail\"\r\n"
+               "\"Notes\",\"" +
+               notes +
+               "\",\"6\",\"2025-03-02T08:00:05.001\",\"Notification\",\"\",\"disk of b, "
+               "\"\"x\"\"\"\r\n"
+               "\"Notes\",\"" +
+               notes + "\",\"1\",\"2025-03-03T09:00:00.001\",\"Trace\",\"\",\"start\"\r\n";
+    QTest::newRow("JSON") << "mail notes --match (dT|full) --format json"
+                          << "{\"program\":\"Mail\",\"file\":\"" + mail +
+                                 "\",\"line\":1,\"time\":\"2025-03-02T10:00:00.001\","
+                                 "\"severity\":\"Trace\",\"elapsed\":12,\"message\":\"mail\"}\n"
+                                 "{\"program\":\"Notes\",\"file\":\"" +
+                                 notes +
+                                 "\",\"line\":2,\"time\":\"2025-03-03T09:00:01.001\","
+                                 "\"severity\":\"Warning\",\"message\":\"disk\"}\n"
+                                 "{\"program\":\"Notes\",\"file\":\"" +
+                                 notes +
+                                 "\",\"line\":3,\"time\":\"2025-03-03T09:00:01.001\","
+                                 "\"message\":\"nearly full\"}\n";
+}
+
+void tst_VelocorLog::formats()
+{
+    QFETCH(QString, arguments);
+    QFETCH(QByteArray, output);
+    const ProgramResult result = run(Words(arguments));
+    QCOMPARE(result.output, output);
+    QCOMPARE(result.exitCode, 0);
+}
+
+void tst_VelocorLog::runs()
+{
+    for (QStringList const& arguments : {QStringList(), QStringList("--runs")}) {
+        const ProgramResult result = run(arguments);
+        QCOMPARE(result.exitCode, 0);
+        const QByteArrayList rows = result.output.split('\n');
+        QCOMPARE(rows.size(), 6);
+        QVERIFY(rows[0].startsWith("program  start "));
+        QVERIFY(rows[1].startsWith("Mail     2025-03-02 10:00:00.001   2025-03-03 09:00:00.501  "
+                                   "       0       1      2  "));
+        QVERIFY(rows[2].startsWith("Notes    2025-03-01 07:00:00.001 "));
+        QVERIFY(rows[2].endsWith("notes.log.1"));
+        QVERIFY(rows[3].startsWith("Notes    <2025-03-02 08:00:00.001  2025-03-02 08:00:05.001  "
+                                   "       0       1      3  "));
+        QVERIFY(rows[4].startsWith("Notes    2025-03-03 09:00:00.001   2025-03-03 09:00:01.001  "
+                                   "       1       0      3  "));
+    }
+    const ProgramResult merged = run({"--runs", "--merge", "--format", "csv", "mail", "notes"});
+    QByteArray order;
+    for (QByteArray const& row : merged.output.split('\n'))
+        order += row.mid(1, 1);
+    QCOMPARE(order, QByteArray("pNNMN"));
+    QCOMPARE(run({"--runs", "nosuch.log"}).exitCode, 2);
+}
+
+void tst_VelocorLog::problems_data()
+{
+    QTest::addColumn<QString>("arguments");
+    QTest::addColumn<QByteArray>("error");
+    const auto row = [](char const* name, char const* arguments, char const* error) {
+        QTest::newRow(name) << QString(arguments) << QByteArray(error);
+    };
+    row("neither a file nor a program", "calendar", "calendar: No such file or program");
+    row("no such file", "./calendar", "./calendar: No such file");
+    row("pipe", "pipe", "pipe: Not a regular file");
+    row("folder", "data", "data: Not a regular file");
+    row("unknown option", "--what", "Unknown option 'what'.");
+    row("severity", "--severity loud", "Not a list of severities: loud");
+    row("expression", "--match (a", "Not a regular expression: ");
+    row("two expressions", "--match a --match b",
+        "--match can be given only once. Use \"(this|that)\".");
+    row("context", "--context x", "Not a number of lines: x");
+    row("negative context", "--context=-1", "Not a number of lines: -1");
+    row("format", "--format xml", "Not a format: xml");
+    row("time", "--since someday", "Not a time: someday");
+    row("lines of runs", "--runs --match x",
+        "--runs lists whole runs, so no lines can be selected.");
+}
+
+void tst_VelocorLog::problems()
+{
+    QFETCH(QString, arguments);
+    QFETCH(QByteArray, error);
+    ::mkfifo("pipe", 0600);
+    const ProgramResult result = run(Words(arguments));
+    QVERIFY(result.finished);
+    // Qt's library words what is wrong with an expression.
+    const bool isWhole = !error.endsWith(' ');
+    QCOMPARE(isWhole ? result.errors : result.errors.left(error.size() + 13),
+             "velocor-log: " + error + (isWhole ? "\n" : ""));
+    QCOMPARE(result.errors.count('\n'), 1);
+    QCOMPARE(result.output, QByteArray());
+    QCOMPARE(result.exitCode, 2);
+    // What can be read is printed all the same.
+    if (!arguments.startsWith("--"))
+        QCOMPARE(run({arguments, "mail"}).output, Mail);
+}
+
+void tst_VelocorLog::relativeTimes()
+{
+    const QDateTime now = QDateTime::currentDateTime();
+    const auto entry = [&now](int hours) {
+        return now.addSecs(hours * 3600).toString("yyyy-MM-dd hh:mm:ss.zzz").toLatin1() +
+               " Trace x\n";
+    };
+    QVERIFY(TestFiles::write("now.log", entry(-5) + entry(-3) + entry(-1)));
+    QCOMPARE(run({"now.log", "--since", "-4h"}).output, entry(-3) + entry(-1));
+    QCOMPARE(run({"now.log", "--until=-2h"}).output, entry(-5) + entry(-3));
+}
+
+void tst_VelocorLog::standardInput()
+{
+    QProcess process;
+    process.setProcessEnvironment(m_environment);
+    process.start(VELOCOR_LOG, {"-", "--match", "a$", "--program"});
+    process.write("2025-03-03 09:00:00.001 Trace a\nb\n2025-03-03 09:00:00.002 Trace c\n");
+    process.closeWriteChannel();
+    QVERIFY(process.waitForFinished());
+    QCOMPARE(process.readAllStandardOutput(),
+             QByteArray("-  2025-03-03 09:00:00.001 Trace a\n-  b\n"));
+    QCOMPARE(process.exitCode(), 0);
+}
+
+void tst_VelocorLog::bytesAsInFile_data()
+{
+    QTest::addColumn<QByteArray>("bytes");
+    QTest::addColumn<QByteArray>("output");
+    const auto row = [](char const* name, QByteArray const& bytes, QByteArray const& output) {
+        QTest::newRow(name) << bytes << output;
+    };
+    row("carriage returns", "a\r\nb\r\n", "a\r\nb\r\n");
+    row("no last line end", "a\nb", "a\nb\n");
+    row("Latin-1", "caf\xe9\n", "caf\xe9\n");
+    row("UTF-8", "caf\xc3\xa9\n", "caf\xc3\xa9\n");
+    row("control characters", "a\033[1m\n", "a\033[1m\n");
+    row("zero bytes", QByteArray("a\0b\n", 4), QByteArray("a\0b\n", 4));
+    row("UTF-16 becomes UTF-8", QByteArray("\xff\xfe\xe9\0\n\0x\0\r\0\n\0", 12), "\xc3\xa9\nx\n");
+    row("empty", "", "");
+}
+
+void tst_VelocorLog::bytesAsInFile()
+{
+    QFETCH(QByteArray, bytes);
+    QFETCH(QByteArray, output);
+    QVERIFY(TestFiles::write("bytes.log", bytes));
+    QCOMPARE(run({"bytes.log"}).output, output);
+}
+
+// script gives the program a terminal, which ends lines with a carriage return, too.
+void tst_VelocorLog::terminal()
+{
+    if (QStandardPaths::findExecutable("script").isEmpty())
+        QSKIP("no script");
+    QVERIFY(TestFiles::write("terminal.log", "2025-03-03 09:00:00.001 Trace a\033[1m caf\xe9\n"
+                                             "2025-03-03 09:00:00.002 Warning b\n"
+                                             "2025-03-03 09:00:00.003 Error c\n"));
+    const auto shown = [this](QString const& name, QString const& value) {
+        QProcessEnvironment environment = m_environment;
+        environment.insert("TERM", "xterm");
+        environment.insert(name, value);
+        return RunProgram("script", {"-qec", QString(VELOCOR_LOG) + " terminal.log", "/dev/null"},
+                          environment)
+            .output;
+    };
+    const QByteArray first = "2025-03-03 09:00:00.001 Trace a\xe2\x90\x9b[1m caf\xc3\xa9\r\n";
+    QCOMPARE(shown("X", "x"), first + "\033[33m2025-03-03 09:00:00.002 Warning b\033[0m\r\n"
+                                      "\033[31m2025-03-03 09:00:00.003 Error c\033[0m\r\n");
+    const QByteArray plain = first + "2025-03-03 09:00:00.002 Warning b\r\n"
+                                     "2025-03-03 09:00:00.003 Error c\r\n";
+    QCOMPARE(shown("NO_COLOR", "1"), plain);
+    QCOMPARE(shown("TERM", "dumb"), plain);
+}
+
+void tst_VelocorLog::readerThatLeaves()
+{
+    QVERIFY(TestFiles::write("long.log", QByteArray("some line\n").repeated(100000)));
+    QProcess shell;
+    shell.setProcessEnvironment(m_environment);
+    shell.start("bash", {"-c", QString(VELOCOR_LOG) + " long.log | head -n 1; "
+                                                      "echo ${PIPESTATUS[0]}"});
+    QVERIFY(shell.waitForFinished());
+    QCOMPARE(shell.readAllStandardOutput(),
+             "some line\n" + QByteArray::number(128 + SIGPIPE) + '\n');
+    QCOMPARE(shell.readAllStandardError(), QByteArray());
+}
+
+void tst_VelocorLog::fullDisk()
+{
+    if (!QFile::exists("/dev/full"))
+        QSKIP("no /dev/full");
+    QProcess process;
+    process.setProcessEnvironment(m_environment);
+    process.setStandardOutputFile("/dev/full");
+    process.start(VELOCOR_LOG, {"mail"});
+    QVERIFY(process.waitForFinished());
+    QCOMPARE(process.readAllStandardError(),
+             QByteArray("velocor-log: Standard output cannot be written: No space left on "
+                        "device\n"));
+    QCOMPARE(process.exitCode(), 2);
+}
+
+QTEST_GUILESS_MAIN(tst_VelocorLog)
+#include "tst_VelocorLog.moc"
