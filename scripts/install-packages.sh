@@ -12,6 +12,7 @@
 #     scripts/install-packages.sh build fuzz     and clang with its fuzzing runtime
 #     scripts/install-packages.sh build lint     and to check format and lint
 #     scripts/install-packages.sh build package  and to validate and build the package
+#     scripts/install-packages.sh build abi      and to compare the binary interface
 #     scripts/install-packages.sh build check    and the other tools of ./check
 set -euo pipefail
 
@@ -33,6 +34,7 @@ packages_of() {
         ;;
     */fuzz) echo clang-14 libclang-rt-14-dev ;;
     */package) echo dpkg-dev desktop-file-utils appstream man-db ;;
+    */abi) echo abigail-tools binutils ;;
     */check) echo clazy cppcheck gcovr valgrind python3 python3-clang-14 ;;
     */lint) echo git clang-format-14 clang-tidy-14 shellcheck ;;
     *)

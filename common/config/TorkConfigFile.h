@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "common/TorkExport.h"
 #include "common/config/TorkConfigFileSection.h"
 
 #include <QScopedPointer>
@@ -51,7 +52,7 @@ class TorkOrderedHash;
 ///     settings.WriteItem("Main Window", "columns", columns + 1);
 ///     if (!settings.SaveAtomically())
 ///         WarningMessage(window, settings.m_lastError, true);
-class TorkConfigFile
+class TORK_EXPORT TorkConfigFile
 {
 public:
     /// Settings under the root element name "VelocorSettings". Does not touch the disk.

@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include "common/TorkExport.h"
+
 #include <QString>
 #include <QStringList>
 #include <QXmlDefaultHandler>
@@ -30,7 +32,7 @@ class TorkConfigFile;
 ///     reader.setContentHandler(&handler);
 ///     if (!reader.parse(source))
 ///         qDebug() << "broken after" << handler.lastOpenedElement();
-class TorkConfigFileDocHandler : public QXmlDefaultHandler
+class TORK_EXPORT TorkConfigFileDocHandler : public QXmlDefaultHandler
 {
 public:
     /// A handler that only tracks the document, without a file to fill.

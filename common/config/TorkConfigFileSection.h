@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include "common/TorkExport.h"
+
 #include <QScopedPointer>
 #include <QString>
 #include <QStringList>
@@ -25,7 +27,7 @@ class TorkOrderedHash;
 ///     section.AddValue("title", "Bookmarks");
 ///     QString title;
 ///     section.FindValue("title", title); // true, "Bookmarks"
-class TorkConfigFileSection
+class TORK_EXPORT TorkConfigFileSection
 {
 public:
     /// A value and the key that it is stored under.

@@ -73,21 +73,6 @@ QString Decoded(Encoder encode, QLatin1Char escape, QString const& encoded, bool
 
 } // namespace
 
-QString TorkUnescaped(QLatin1Char escape, QString const& text)
-{
-    QString unescaped;
-    for (int i = 0; i < text.length(); ++i) {
-        bool isHex = false;
-        ushort unit = 0;
-        if (text.at(i) == escape && text.midRef(i + 1, 1) == QLatin1String("u"))
-            unit = text.midRef(i + 2, HexDigits).toUShort(&isHex, 16);
-        unescaped += isHex ? QChar(unit) : text.at(i);
-        if (isHex)
-            i += 1 + HexDigits;
-    }
-    return unescaped;
-}
-
 bool TorkConfigText::IsPlainValue(QString const& text)
 {
     for (int i = 0; i < text.length(); ++i) {

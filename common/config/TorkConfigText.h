@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include "common/TorkExport.h"
+
 #include <QString>
 
 /// Encodes any text so that it survives in a configuration file, and decodes it again.
@@ -31,7 +33,7 @@
 ///   `_u00350_u0025_u0020of_u0020C_u002b_u002b`.
 ///
 /// Different texts never get the same encoding. Nothing here depends on the locale. Any thread.
-class TorkConfigText
+class TORK_EXPORT TorkConfigText
 {
 public:
     /// Whether a value survives in a file without encoding: at least one character, ASCII

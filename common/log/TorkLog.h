@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include "common/TorkExport.h"
+
 #include <QDateTime>
 #include <QFile>
 #include <QFileInfo>
@@ -38,7 +40,7 @@ class TorkLogWriter;
 ///     TorkLog::initialize("viewer");
 ///     TorkLog::logger()->warning("The index is out of date.");
 ///     qDebug() << "pages" << 3; // an entry of severity Trace
-class TorkLog : public QObject
+class TORK_EXPORT TorkLog : public QObject
 {
     Q_OBJECT
 
@@ -359,5 +361,5 @@ private:
 /// never aborts the program; Qt does that itself after a fatal message.
 ///
 /// @param context  passed on to Qt's default handler only, never written to the log
-void TorkLog_MessageHandler(QtMsgType type, QMessageLogContext const& context,
-                            QString const& message);
+TORK_EXPORT void TorkLog_MessageHandler(QtMsgType type, QMessageLogContext const& context,
+                                        QString const& message);

@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include "common/TorkExport.h"
+
 #include <QObject>
 #include <QString>
 
@@ -24,7 +26,7 @@
 ///             return true;
 ///         }
 ///     };
-class TorkErrorDictionary : public QObject
+class TORK_EXPORT TorkErrorDictionary : public QObject
 {
 public:
     /// @param name  the name of the range

@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include "common/TorkExport.h"
+
 #include <QString>
 #include <QXmlErrorHandler>
 
@@ -21,7 +23,7 @@ class TorkLog;
 ///     reader.setErrorHandler(&errors);
 ///     if (!reader.parse(source))
 ///         WarningMessage(window, errors.errorString(), true);
-class TorkErrorHandler : public QXmlErrorHandler
+class TORK_EXPORT TorkErrorHandler : public QXmlErrorHandler
 {
 public:
     /// A handler without a problem yet.

@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "common/TorkExport.h"
 #include "common/xml/TorkXmlLayout.h"
 
 #include <QFile>
@@ -30,7 +31,7 @@
 ///     writer.WriteElement("title", "Research");
 ///     writer.WriteElementEnd("folder", 1);
 ///     writer.close();
-class TorkXmlFile : public QTextStream, public QXmlInputSource
+class TORK_EXPORT TorkXmlFile : public QTextStream, public QXmlInputSource
 {
 public:
     /// A writer without a file name; call setName() before open().

@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include "common/TorkExport.h"
+
 #include <QScopedPointer>
 #include <QXmlInputSource>
 
@@ -30,7 +32,7 @@ class QXmlSimpleReader;
 ///     source.Watch(reader);
 ///     reader.setContentHandler(&manager);
 ///     reader.parse(source);
-class TorkXmlGuard : public QXmlInputSource
+class TORK_EXPORT TorkXmlGuard : public QXmlInputSource
 {
 public:
     /// Reads from a device, which is not owned and must outlive the guard.

@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "common/TorkExport.h"
 #include "common/xml/TorkXmlLayout.h"
 
 #include <QTextStream>
@@ -24,7 +25,7 @@
 ///     writer.WriteElementCloseAndEnd("bookmark", 1);
 ///     writer.WriteElementEnd("folder", 1);
 ///     writer.flush();
-class TorkXmlStream : public QTextStream, public QXmlInputSource
+class TORK_EXPORT TorkXmlStream : public QTextStream, public QXmlInputSource
 {
 public:
     /// A stream without a device; give it one with setDevice() or setString().

@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "common/TorkExport.h"
 #include "common/xml/TorkXml_ParseState_Base.h"
 
 /// Accepts and drops an element with everything in it, so that a reader can skip what it does not
@@ -15,7 +16,7 @@
 ///             return new BookmarkState(name, ParseManager());
 ///         return new TorkXml_FlushUnknownElement(name, ParseManager());
 ///     }
-class TorkXml_FlushUnknownElement : public TorkXml_ParseState_Base
+class TORK_EXPORT TorkXml_FlushUnknownElement : public TorkXml_ParseState_Base
 {
 public:
     using TorkXml_ParseState_Base::TorkXml_ParseState_Base;

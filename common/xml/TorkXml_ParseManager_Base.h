@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include "common/TorkExport.h"
+
 #include <QSet>
 #include <QString>
 #include <QStringList>
@@ -36,7 +38,7 @@ class TorkXml_ParseState_Base;
 ///     reader.setContentHandler(&bookmarks);
 ///     if (!reader.parse(source))
 ///         bookmarks.FormatErrors(report);
-class TorkXml_ParseManager_Base : public QXmlDefaultHandler
+class TORK_EXPORT TorkXml_ParseManager_Base : public QXmlDefaultHandler
 {
 public:
     /// A manager without states, elements or errors.

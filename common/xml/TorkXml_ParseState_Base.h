@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include "common/TorkExport.h"
+
 #include <QString>
 
 class TorkXml_ParseManager_Base;
@@ -27,7 +29,7 @@ class TorkXml_ParseManager_Base;
 ///     private:
 ///         QString m_title;
 ///     };
-class TorkXml_ParseState_Base
+class TORK_EXPORT TorkXml_ParseState_Base
 {
 public:
     /// A state without an element name and without a manager.

@@ -14,7 +14,7 @@ set(expected
     lib/pkgconfig/tork.pc
     lib/pkgconfig/velocor-frame.pc)
 
-file(GLOB headers RELATIVE "${SOURCE}" "${SOURCE}/app/*.h" "${SOURCE}/common/*/*.h")
+file(GLOB headers RELATIVE "${SOURCE}" "${SOURCE}/app/*.h" "${SOURCE}/common/*.h" "${SOURCE}/common/*/*.h")
 list(FILTER headers EXCLUDE REGEX "_p\\.h$")
 list(TRANSFORM headers PREPEND include/tork/)
 list(APPEND expected ${headers})
