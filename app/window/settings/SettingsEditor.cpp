@@ -4,25 +4,21 @@
 #include "app/window/settings/SettingsEditor.h"
 
 #include "app/settingsfile/SettingsFileReader.h"
-#include "app/settingsfile/SettingsFileWriter.h"
+#include "app/window/settings/MalformedFileView.h"
 #include "app/window/settings/ValueDialog.h"
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
 #include "app/window/widgets/RowHeight.h"
-#include "app/window/widgets/TextDialog.h"
 #include "common/config/TorkConfigText.h"
 
-#include <QFile>
 #include <QFileInfo>
 #include <QHBoxLayout>
 #include <QHeaderView>
 #include <QMessageBox>
-#include <QPlainTextEdit>
 #include <QPushButton>
 #include <QScopedValueRollback>
 #include <QStackedWidget>
 #include <QStyledItemDelegate>
-#include <QTextBlock>
 #include <QTimer>
 #include <QTreeWidget>
 
@@ -32,16 +28,10 @@ namespace Velocor {
 
 namespace {
 
-// The maximum size shown of a malformed file, in bytes.
-constexpr qint64 ShownLimit = 1 << 20;
-
 // The maximum number of characters that a cell shows and edits. Qt would lay out the whole text
 // each time the cell is drawn.
 constexpr int MaximumCellLength = 1000;
 constexpr int ShortenedLength = 200;
-
-// The maximum length of each line in a message box, in characters.
-constexpr int MaximumLossLength = 300;
 
 constexpr int FullTextRole = Qt::UserRole; // the full text of a cell that shows only the start
 constexpr int NameRole = Qt::UserRole + 1; // the name before it was edited
@@ -114,10 +104,11 @@ QString NameHint()
 } // namespace
 
 SettingsEditor::SettingsEditor(QWidget* parent)
-    : QWidget(parent), m_notice(new NoticeBar), m_pages(new QStackedWidget)
+    : QWidget(parent), m_saver(this), m_notice(new NoticeBar), m_pages(new QStackedWidget),
+      m_text(new MalformedFileView)
 {
     m_pages->addWidget(makeTreePage());
-    m_pages->addWidget(makeTextPage());
+    m_pages->addWidget(m_text);
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(8, 8, 8, 8);
     layout->setSpacing(6);
@@ -196,23 +187,12 @@ QWidget* SettingsEditor::makeTreePage()
     return page;
 }
 
-QWidget* SettingsEditor::makeTextPage()
-{
-    m_text = new QPlainTextEdit;
-    m_text->setReadOnly(true);
-    ShowUnwrapped(m_text);
-    m_text->setAccessibleName(tr("File text"));
-    m_text->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
-    return m_text;
-}
-
 void SettingsEditor::Open(QString const& path)
 {
     m_path = path;
-    m_hasBackup = false;
     m_notice->Dismiss();
     const SettingsDocument document = SettingsFileReader::Read(path);
-    m_read = QFileInfo(path).lastModified();
+    m_saver.NoteRead(path, document);
     if (document.isParsed)
         showTree(document);
     else
@@ -223,8 +203,6 @@ void SettingsEditor::Open(QString const& path)
 void SettingsEditor::showTree(SettingsDocument const& document)
 {
     m_rootName = document.rootName;
-    m_fileLosses = document.losses;
-    m_fileLossCount = document.lossCount;
     {
         const QScopedValueRollback<bool> filling(m_filling, true);
         m_tree->clear();
@@ -242,11 +220,11 @@ void SettingsEditor::showTree(SettingsDocument const& document)
     m_remove->setEnabled(m_tree->currentItem());
     m_pages->setCurrentIndex(0);
     setFocusProxy(m_tree);
-    if (m_fileLossCount > 0)
+    if (document.lossCount > 0)
         m_notice->ShowMessage(
-            m_fileLossCount == 1
+            document.lossCount == 1
                 ? tr("Saving would lose 1 item in this file.")
-                : tr("Saving would lose %1 items in this file.").arg(m_fileLossCount));
+                : tr("Saving would lose %1 items in this file.").arg(document.lossCount));
 }
 
 void SettingsEditor::showBroken(SettingsDocument const& document)
@@ -255,22 +233,7 @@ void SettingsEditor::showBroken(SettingsDocument const& document)
     if (document.line > 0)
         message += tr(" (line %1, column %2)").arg(document.line).arg(document.column);
     m_notice->ShowMessage(message);
-
-    QFile file(m_path);
-    if (document.isReadable && file.open(QIODevice::ReadOnly))
-        m_text->setPlainText(QString::fromUtf8(file.read(ShownLimit)));
-    const QTextBlock block = m_text->document()->findBlockByNumber(document.line - 1);
-    if (block.isValid()) {
-        QTextCursor cursor(block);
-        cursor.select(QTextCursor::LineUnderCursor);
-        m_text->setTextCursor(cursor);
-        QTextEdit::ExtraSelection error;
-        error.cursor = QTextCursor(block);
-        error.format.setProperty(QTextFormat::FullWidthSelection, true);
-        error.format.setUnderlineStyle(QTextCharFormat::WaveUnderline);
-        error.format.setUnderlineColor(Qt::red);
-        m_text->setExtraSelections({error});
-    }
+    m_text->ShowFile(m_path, document);
     m_pages->setCurrentIndex(1);
     setFocusProxy(m_text);
 }
@@ -436,54 +399,6 @@ SettingsDocument SettingsEditor::document() const
     return document;
 }
 
-bool SettingsEditor::ask(QString const& text, QString const& details, QString const& acceptText)
-{
-    PlainMessageBox box(QMessageBox::Warning, this, text, QMessageBox::Cancel, details);
-    QPushButton* yes = box.addButton(acceptText, QMessageBox::AcceptRole);
-    box.setDefaultButton(QMessageBox::Cancel);
-    box.exec();
-    return box.clickedButton() == yes;
-}
-
-bool SettingsEditor::confirmLosses()
-{
-    QStringList losses = m_fileLosses + SettingsFileWriter::Losses(document());
-    const int unlisted = m_fileLossCount - m_fileLosses.size();
-    if (losses.isEmpty())
-        return true;
-
-    const int most = 12;
-    const int more = losses.size() - most + unlisted;
-    if (losses.size() > most)
-        losses = losses.mid(0, most);
-    for (QString& loss : losses)
-        loss = Shortened(loss, MaximumLossLength);
-    if (more > 0)
-        losses.append(tr("and %1 more").arg(more));
-    return ask(tr("Saving %1 would lose:").arg(QFileInfo(m_path).fileName()),
-               losses.join(QLatin1Char('\n')), tr("Save Anyway"));
-}
-
-bool SettingsEditor::confirmOverwrite()
-{
-    if (!QFileInfo::exists(m_path) || QFileInfo(m_path).lastModified() == m_read)
-        return true;
-    return ask(tr("%1 was changed by another program.").arg(QFileInfo(m_path).fileName()),
-               tr("Saving would overwrite those changes."), tr("Save Anyway"));
-}
-
-bool SettingsEditor::makeBackup()
-{
-    if (m_hasBackup)
-        return true;
-    QString error;
-    m_hasBackup = SettingsFileWriter::KeepBackup(m_path, &error);
-    if (m_hasBackup)
-        return true;
-    return ask(tr("Cannot back up %1.").arg(QFileInfo(m_path).fileName()), error,
-               tr("Save Without Backup"));
-}
-
 bool SettingsEditor::Save()
 {
     if (m_pages->currentIndex() != 0)
@@ -491,19 +406,8 @@ bool SettingsEditor::Save()
     m_pages->setFocus(); // ends cell editing
     if (!m_modified)
         return true;
-    if (!confirmOverwrite() || !confirmLosses() || !makeBackup())
+    if (!m_saver.Save(document()))
         return false;
-
-    QString error;
-    if (!SettingsFileWriter::Save(m_path, document(), &error)) {
-        PlainMessageBox(QMessageBox::Critical, this,
-                        tr("Could not save %1.\n%2").arg(m_path, error))
-            .exec();
-        return false;
-    }
-    m_read = QFileInfo(m_path).lastModified();
-    m_fileLosses.clear();
-    m_fileLossCount = 0;
     m_notice->Dismiss();
     setModified(false);
     Q_EMIT messageReported(tr("Saved %1").arg(QFileInfo(m_path).fileName()));

@@ -4,11 +4,10 @@
 #pragma once
 
 #include "app/settingsfile/SettingsDocument.h"
+#include "app/window/settings/SettingsSaver.h"
 
-#include <QDateTime>
 #include <QWidget>
 
-class QPlainTextEdit;
 class QPushButton;
 class QStackedWidget;
 class QTreeWidget;
@@ -16,6 +15,7 @@ class QTreeWidgetItem;
 
 namespace Velocor {
 
+class MalformedFileView;
 class NoticeBar;
 
 /// Edits a configuration file as a tree of sections, keys and values.
@@ -64,7 +64,6 @@ Q_SIGNALS:
 
 private:
     QWidget* makeTreePage();
-    QWidget* makeTextPage();
     QPushButton* makeButton(QString const& text, QString const& toolTip);
     void showTree(SettingsDocument const& document);
     void showBroken(SettingsDocument const& document);
@@ -80,26 +79,19 @@ private:
     void addNamed(QTreeWidgetItem* section, QString const& base, QString const& value);
     QStringList namesBeside(QTreeWidgetItem* item) const;
     QString nameProblem(QTreeWidgetItem* item, QString const& name) const;
-    bool confirmLosses();
-    bool confirmOverwrite();
-    bool ask(QString const& text, QString const& details, QString const& acceptText);
-    bool makeBackup();
 
     QString m_path;
     QString m_rootName;
-    QStringList m_fileLosses;
-    int m_fileLossCount = 0;
-    QDateTime m_read; ///< modification time of the file when it was read
     bool m_modified = false;
     bool m_isEditing = false;
     bool m_filling = false;
-    bool m_hasBackup = false;
     bool m_editingLongValue = false;
 
+    SettingsSaver m_saver;
     NoticeBar* m_notice;
     QStackedWidget* m_pages;
+    MalformedFileView* m_text;
     QTreeWidget* m_tree = nullptr;
-    QPlainTextEdit* m_text = nullptr;
     QPushButton* m_addValue = nullptr;
     QPushButton* m_remove = nullptr;
     QPushButton* m_save = nullptr;
