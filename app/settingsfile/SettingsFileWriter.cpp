@@ -69,6 +69,18 @@ void Fill(TorkConfigFile& store, SettingsDocument const& document)
 
 } // namespace
 
+QString SettingsFileWriter::ValueProblem(QString const& value)
+{
+    return TorkConfigText::IsPlainValue(value) ? QString() : ReasonOf(value);
+}
+
+QByteArray SettingsFileWriter::ToBytes(SettingsDocument const& document)
+{
+    TorkConfigFile store(QString(), document.rootName);
+    Fill(store, document);
+    return store.ToXml();
+}
+
 QStringList SettingsFileWriter::Losses(SettingsDocument const& document)
 {
     QStringList losses;
@@ -85,9 +97,8 @@ QStringList SettingsFileWriter::Losses(SettingsDocument const& document)
     }
 
     // Any other loss shows when the text is read back.
-    TorkConfigFile store(QString(), document.rootName);
-    Fill(store, writable);
-    const SettingsValues readBack = SettingsFileReader::ReadBytes(store.ToXml()).AllValues();
+    writable.rootName = document.rootName;
+    const SettingsValues readBack = SettingsFileReader::ReadBytes(ToBytes(writable)).AllValues();
     for (SettingsDocument::Section const& section : qAsConst(writable.sections)) {
         for (SettingsDocument::Item const& item : section.items) {
             if (readBack.value({section.name, item.key}) != item.value)

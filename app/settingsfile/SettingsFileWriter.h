@@ -19,6 +19,13 @@ public:
     /// is written.
     static QStringList Losses(SettingsDocument const& document);
 
+    /// What is wrong with a text as a value: why it would not read back unchanged. Empty if it
+    /// would.
+    static QString ValueProblem(QString const& value);
+
+    /// The bytes that Save() writes.
+    static QByteArray ToBytes(SettingsDocument const& document);
+
     /// Replaces the file with the document, and reads it back to verify that it is complete.
     ///
     /// @param error  receives the reason for a failure

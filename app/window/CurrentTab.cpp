@@ -13,6 +13,7 @@
 
 #include <QActionGroup>
 #include <QFileInfo>
+#include <QMenu>
 
 namespace Velocor {
 
@@ -27,16 +28,37 @@ void CurrentTab::Update()
 {
     updateTitle();
     LogPanel const* log = m_tabs->currentLog();
-    SettingsEditor const* editor = m_tabs->currentEditor();
     for (QAction* action : m_actions.ofLogs)
         action->setEnabled(log != nullptr);
-    m_actions.save->setEnabled(editor && editor->CanSave());
+    updateEditing();
     m_actions.close->setEnabled(m_tabs->currentWidget() != m_tabs->ownLog());
     const QString path = FileTabs::PathOf(m_tabs->currentWidget());
     m_summary->setText(log ? log->summary() : path);
     m_summary->setToolTip(PlainToolTip(log ? QString() : path));
     if (log)
         updateSwitches(log);
+}
+
+void CurrentTab::updateEditing()
+{
+    SettingsEditor* editor = m_tabs->currentEditor();
+    QUndoStack const* changes = editor ? editor->undoStack() : nullptr;
+    m_actions.save->setEnabled(editor && editor->CanSave());
+    m_actions.undo->setEnabled(changes && changes->canUndo());
+    m_actions.redo->setEnabled(changes && changes->canRedo());
+    m_actions.undo->setText(
+        tr("&Undo %1").arg(changes ? changes->undoText() : QString()).trimmed());
+    m_actions.redo->setText(
+        tr("&Redo %1").arg(changes ? changes->redoText() : QString()).trimmed());
+
+    const QList<QAction*> commands = editor ? editor->commands() : QList<QAction*>();
+    if (m_actions.settings->actions() != commands) {
+        m_actions.settings->clear();
+        m_actions.settings->addActions(commands);
+    }
+    m_actions.settings->menuAction()->setEnabled(!commands.isEmpty());
+    if (editor)
+        editor->AddOuterActions({m_actions.undo, m_actions.redo});
 }
 
 void CurrentTab::updateTitle()

@@ -28,6 +28,7 @@ public:
     void Update();
 
 private:
+    void updateEditing();
     void updateTitle();
     void updateSwitches(LogPanel const* log);
 

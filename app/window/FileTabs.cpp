@@ -124,8 +124,7 @@ SettingsEditor* FileTabs::addEditor(QString const& path)
     editor->setAccessibleName(name);
     editor->Open(path);
     connect(editor, &SettingsEditor::messageReported, this, &FileTabs::messageReported);
-    connect(editor, &SettingsEditor::modifiedChanged, this, &FileTabs::stateChanged);
-    connect(editor, &SettingsEditor::canSaveChanged, this, &FileTabs::stateChanged);
+    connect(editor, &SettingsEditor::stateChanged, this, &FileTabs::stateChanged);
     setTabToolTip(addTab(editor, QString()), PlainToolTip(path));
     addCloseButton(editor, name);
     return editor;

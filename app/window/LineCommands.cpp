@@ -8,6 +8,7 @@
 #include "app/window/log/LineSaver.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogPanel.h"
+#include "app/window/settings/SettingsEditor.h"
 
 #include <QApplication>
 #include <QFileDialog>
@@ -31,6 +32,22 @@ void LineCommands::SelectAll()
         return;
     if (LogPanel* log = m_tabs->currentLog())
         log->SelectAll();
+}
+
+void LineCommands::Undo()
+{
+    if (askFocused("undo"))
+        return;
+    if (SettingsEditor* editor = m_tabs->currentEditor())
+        editor->Undo();
+}
+
+void LineCommands::Redo()
+{
+    if (askFocused("redo"))
+        return;
+    if (SettingsEditor* editor = m_tabs->currentEditor())
+        editor->Redo();
 }
 
 // A text field that has the focus does it with its own text, also when invoked from the menu.

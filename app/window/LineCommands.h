@@ -28,6 +28,11 @@ public:
     /// Selects all lines, or if a text field has the focus, its whole text.
     void SelectAll();
 
+    /// Undoes the last change of the settings file, or if a text field has the focus, of its text;
+    /// makes it again.
+    void Undo();
+    void Redo();
+
     /// Asks for a file, and saves the lines in it without blocking the window.
     void Save();
 

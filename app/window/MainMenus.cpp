@@ -90,6 +90,8 @@ void MainMenus::fillFileMenu(QMenu* menu)
 
 void MainMenus::fillEditMenu(QMenu* menu)
 {
+    addUndo(menu);
+    menu->addSeparator();
     addCopying(menu);
     menu->addSeparator();
     addFinding(menu);
@@ -104,6 +106,16 @@ void MainMenus::fillEditMenu(QMenu* menu)
                             tr("Change what is logged and how many log files are kept"),
                             [this] { m_targets.dialogs->ChangeLogSettings(); });
     settings->setMenuRole(QAction::PreferencesRole);
+}
+
+void MainMenus::addUndo(QMenu* menu)
+{
+    m_actions.undo = add(menu, tr("&Undo"), QKeySequence::Undo,
+                         tr("Take back the last change of the settings file"),
+                         [this] { m_targets.lines->Undo(); });
+    m_actions.redo = add(menu, tr("&Redo"), QKeySequence::Redo, tr("Make the last change again"),
+                         [this] { m_targets.lines->Redo(); });
+    m_actions.settings = menu->addMenu(tr("S&ettings File"));
 }
 
 void MainMenus::addCopying(QMenu* menu)

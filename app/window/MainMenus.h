@@ -30,6 +30,9 @@ struct MenuActions
     QAction* save = nullptr;
     QAction* close = nullptr;
     QAction* quit = nullptr;
+    QAction* undo = nullptr;
+    QAction* redo = nullptr;
+    QMenu* settings = nullptr; ///< for the commands of a settings file
     QAction* find = nullptr;
     QAction* filter = nullptr;
     QAction* showPlaces = nullptr;
@@ -81,6 +84,7 @@ private:
 
     void fillFileMenu(QMenu* menu);
     void fillEditMenu(QMenu* menu);
+    void addUndo(QMenu* menu);
     void addCopying(QMenu* menu);
     void addFinding(QMenu* menu);
     void fillViewMenu(QMenu* menu);

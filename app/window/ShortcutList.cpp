@@ -3,6 +3,8 @@
 
 #include "app/window/ShortcutList.h"
 
+#include "app/window/settings/SettingsTree.h"
+
 #include <QAbstractButton>
 #include <QAction>
 #include <QCoreApplication>
@@ -66,6 +68,15 @@ QString TabLines(QMainWindow const* window)
     return lines;
 }
 
+QString SettingsLines()
+{
+    QString lines;
+    const QVector<SettingsCommand> all = SettingsTree::AllCommands();
+    for (SettingsCommand const& command : all)
+        lines += KeyLine(command.keys.first(), command.statusTip);
+    return lines;
+}
+
 } // namespace
 
 QString ShortcutList(QMainWindow const* window)
@@ -74,6 +85,8 @@ QString ShortcutList(QMainWindow const* window)
     const QList<QAction*> menus = window->menuBar()->actions();
     for (QAction const* menu : menus)
         list += Heading(menu->text()) + MenuLines(menu->menu()) + QLatin1Char('\n');
+    list += QCoreApplication::translate("ShortcutList", "Settings files\n") + SettingsLines() +
+            QLatin1Char('\n');
     list += QCoreApplication::translate("ShortcutList", "Tabs\n") + TabLines(window) +
             QLatin1Char('\n');
     return list + QCoreApplication::translate("ShortcutList", "Buttons\n") + ButtonLines(window);

@@ -12,6 +12,7 @@
 #include "app/window/log/HighlightRules.h"
 #include "app/window/log/LogFindBar.h"
 #include "app/window/log/LogPanel.h"
+#include "app/window/settings/SettingsEditor.h"
 #include "common/log/TorkLog.h"
 #include "support/DemoLog.h"
 #include "support/TestFiles.h"
@@ -27,6 +28,7 @@
 #include <QTest>
 #include <QTextStream>
 #include <QTimer>
+#include <QTreeView>
 
 using namespace Velocor;
 
@@ -208,6 +210,22 @@ void TakeHighlights(MainWindow& window, Camera const& camera)
     Trigger(window, "Line Wrap");
 }
 
+// Without changing the file.
+void TakeEditing(MainWindow& window, Camera const& camera)
+{
+    SettingsEditor* editor = window.findChild<FileTabs*>()->currentEditor();
+    auto* tree = editor->findChild<QTreeView*>();
+    tree->setFocus();
+    tree->setCurrentIndex(tree->model()->index(1, 0));
+    QTest::keyClick(tree, Qt::Key_Delete);
+    tree->setCurrentIndex(tree->model()->index(0, 0, tree->model()->index(1, 0)));
+    QTest::keyClick(tree, Qt::Key_F2, Qt::ShiftModifier);
+    QTest::keyClicks(tree->findChild<QLineEdit*>(), "timeout");
+    camera.take(window, "settings-editing");
+    QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Escape);
+    editor->Undo();
+}
+
 void TakeAll(QString const& folder, QString const& suffix)
 {
     const Camera camera(folder, suffix);
@@ -222,6 +240,7 @@ void TakeAll(QString const& folder, QString const& suffix)
 
     window.OpenFile(Home + "viewer.cfg");
     camera.take(window, "settings");
+    TakeEditing(window, camera);
     window.OpenFile(Home + "broken.cfg");
     camera.take(window, "broken-settings");
 

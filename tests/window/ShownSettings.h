@@ -7,7 +7,7 @@
 
 #include "app/window/settings/SettingsEditor.h"
 
-#include <QTreeWidget>
+#include <QTreeView>
 
 /// A program's surroundings, and a window that shows a settings file in its current tab.
 class ShownSettings : public WindowTest
@@ -21,11 +21,11 @@ public:
         window = show();
         window->OpenFile(file);
         editor = window->findChild<Velocor::FileTabs*>()->currentEditor();
-        tree = WindowParts::Child<QTreeWidget>(editor, "Settings");
+        tree = WindowParts::Child<QTreeView>(editor, "Settings");
     }
 
     const QString file;
     std::unique_ptr<Velocor::MainWindow> window;
     Velocor::SettingsEditor* editor = nullptr;
-    QTreeWidget* tree = nullptr;
+    QTreeView* tree = nullptr;
 };

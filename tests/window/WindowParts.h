@@ -14,7 +14,7 @@
 #include <QCheckBox>
 #include <QLineEdit>
 #include <QStatusBar>
-#include <QTreeWidget>
+#include <QTreeView>
 
 /// The parts of a window, found the way assistive technology finds them.
 namespace WindowParts {
@@ -80,21 +80,53 @@ inline QString Status(Velocor::MainWindow const& window)
     return window.statusBar()->currentMessage();
 }
 
-/// Types a text over that of a cell, without ending the editing.
-inline void TypeInto(QTreeWidget* tree, QTreeWidgetItem* item, int column, QString const& text)
+/// A cell of a section in a settings file, or of an item in it.
+inline QModelIndex Cell(QTreeView const* tree, int section, int column = 0)
+{
+    return tree->model()->index(section, column);
+}
+
+inline QModelIndex ItemCell(QTreeView const* tree, int section, int item, int column)
+{
+    return tree->model()->index(item, column, Cell(tree, section));
+}
+
+/// The text that a cell shows.
+inline QString CellText(QTreeView const* tree, int section, int item, int column)
+{
+    return ItemCell(tree, section, item, column).data().toString();
+}
+
+/// Starts editing a cell with the keyboard.
+inline QLineEdit* StartEditing(QTreeView* tree, QModelIndex const& cell)
 {
     tree->setFocus();
-    tree->setCurrentItem(item, column);
-    QTest::keyClick(tree, Qt::Key_F2);
-    QTRY_VERIFY_WITH_TIMEOUT(tree->findChild<QLineEdit*>(), Patience);
-    QTest::keyClicks(tree->findChild<QLineEdit*>(), text);
+    tree->setCurrentIndex(cell);
+    QTest::keyClick(tree, Qt::Key_F2, cell.column() == 0 ? Qt::ShiftModifier : Qt::NoModifier);
+    [&] {
+        QTRY_VERIFY_WITH_TIMEOUT(tree->findChild<QLineEdit*>(), Patience);
+    }();
+    return tree->findChild<QLineEdit*>();
+}
+
+/// Types a text over that of a cell, without ending the editing.
+inline void TypeInto(QTreeView* tree, QModelIndex const& cell, QString const& text)
+{
+    QTest::keyClicks(StartEditing(tree, cell), text);
 }
 
 /// Ends the editing of a cell with the Enter key.
-inline void Enter(QTreeWidget* tree)
+inline void Enter(QTreeView* tree)
 {
     QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
     QTRY_VERIFY_WITH_TIMEOUT(!tree->findChild<QLineEdit*>(), Patience);
+}
+
+/// Gives a value of the first section another text, however long.
+inline void SetValue(QTreeView* tree, int item, QString const& text)
+{
+    StartEditing(tree, ItemCell(tree, 0, item, 1))->insert(text);
+    Enter(tree);
 }
 
 inline QString ActionText(QAction const* action)

@@ -35,7 +35,7 @@
 #include <QTextBlock>
 #include <QTextDocument>
 #include <QToolTip>
-#include <QTreeWidget>
+#include <QTreeView>
 
 #include <random>
 
@@ -345,8 +345,8 @@ void tst_PlainTextOnly::window()
     QCOMPARE(tabs->tabText(1).replace("&&", "&"), markup + ".log");
     QCOMPARE(tabs->widget(1)->accessibleName(), markup + ".log");
     QCOMPARE(tabs->widget(2)->accessibleName(), markup + ".cfg");
-    auto const* tree = tabs->currentEditor()->findChild<QTreeWidget*>();
-    QCOMPARE(tree->topLevelItem(0)->child(0)->text(1), markup);
+    auto const* tree = tabs->currentEditor()->findChild<QTreeView*>();
+    QCOMPARE(CellText(tree, 0, 0, 1), markup);
 }
 
 // What Qt really shows when the mouse hovers.
@@ -449,8 +449,8 @@ void tst_PlainTextOnly::lossBox()
     const HostilePlace place(markup);
     const auto window = WindowTest::show();
     window->OpenFile(place.settings);
-    auto* tree = window->findChild<FileTabs*>()->currentEditor()->findChild<QTreeWidget*>();
-    tree->topLevelItem(0)->child(0)->setText(1, "changed");
+    auto* tree = window->findChild<FileTabs*>()->currentEditor()->findChild<QTreeView*>();
+    SetValue(tree, 0, "changed");
 
     QStringList breaches("no box");
     QString text;
@@ -479,8 +479,8 @@ void tst_PlainTextOnly::boxesOfTheEditor()
     SettingsEditor editor;
     editor.Open(settings);
     editor.show();
-    auto* tree = editor.findChild<QTreeWidget*>();
-    tree->topLevelItem(0)->child(0)->setText(1, "w");
+    auto* tree = editor.findChild<QTreeView*>();
+    SetValue(tree, 0, "w");
     QStringList breaches("no box");
     QString text;
 

@@ -3,22 +3,23 @@
 
 #pragma once
 
-#include "app/settingsfile/SettingsDocument.h"
+#include "app/window/settings/SettingsCommands.h"
+#include "app/window/settings/SettingsModel.h"
+#include "app/window/settings/SettingsSaver.h"
 
-#include <QDateTime>
 #include <QWidget>
 
-class QPlainTextEdit;
+class QAction;
 class QPushButton;
 class QStackedWidget;
-class QTreeWidget;
-class QTreeWidgetItem;
 
 namespace Velocor {
 
+class MalformedFileView;
 class NoticeBar;
+class SettingsTree;
 
-/// Edits a configuration file as a tree of sections, keys and values.
+/// Edits a configuration file as a tree of sections, keys and values. Every change can be undone.
 ///
 /// Before the first save, the file is copied to ".bak". The user is asked before anything is lost
 /// by saving. A malformed file is shown as text, with the position of the error, and cannot be
@@ -38,7 +39,8 @@ public:
     void Open(QString const& path);
 
     /// Ends the editing of a cell and saves through the configuration store, after asking if
-    /// anything would be lost. Does nothing if there are no changes.
+    /// anything would be lost. Does nothing if there are no changes, or if what was typed is
+    /// rejected.
     ///
     /// @return whether the file has all changes now
     bool Save();
@@ -48,59 +50,59 @@ public:
     /// @return false if the user cancels or saving fails
     bool MayClose();
 
+    /// Takes back the last change, or makes it again, and goes there. Does nothing if there is
+    /// none.
+    void Undo();
+    void Redo();
+
     /// Whether there is something to save: changes, or a cell that is being edited.
     bool CanSave() const;
 
-    bool isModified() const { return m_modified; }
+    bool isModified() const;
     QString const& path() const { return m_path; }
 
+    /// The changes; not for changing.
+    QUndoStack const* undoStack() const { return m_commands.undoStack(); }
+
+    /// The commands for the tree, for a menu; none for a malformed file. Owned by the editor.
+    QList<QAction*> commands() const;
+
+    /// Puts actions of the window first in the context menu. Only the first call counts.
+    void AddOuterActions(QList<QAction*> const& actions);
+
     /// The current content of the tree.
-    SettingsDocument document() const;
+    SettingsDocument const& document() const { return m_model.document(); }
 
 Q_SIGNALS:
-    void modifiedChanged(bool modified);
-    void canSaveChanged(bool canSave);
+    /// Something else can be saved, undone or redone.
+    void stateChanged();
     void messageReported(QString const& text);
 
 private:
+    enum Page { TreePage, TextPage };
+
     QWidget* makeTreePage();
-    QWidget* makeTextPage();
     QPushButton* makeButton(QString const& text, QString const& toolTip);
     void showTree(SettingsDocument const& document);
-    void showBroken(SettingsDocument const& document);
-    void addSection();
-    void addValue();
-    void remove();
-    void setModified(bool modified);
-    void updateCanSave();
-    void checkNames(QTreeWidgetItem* item);
+    void showMalformed(SettingsDocument const& document);
+    void updateState();
+    void updateButtons();
     void editLongValueSoon();
     void editLongValue();
-    QTreeWidgetItem* addItem(QTreeWidgetItem* section, QString const& key, QString const& value);
-    void addNamed(QTreeWidgetItem* section, QString const& base, QString const& value);
-    QStringList namesBeside(QTreeWidgetItem* item) const;
-    QString nameProblem(QTreeWidgetItem* item, QString const& name) const;
-    bool confirmLosses();
-    bool confirmOverwrite();
-    bool ask(QString const& text, QString const& details, QString const& acceptText);
-    bool makeBackup();
 
     QString m_path;
-    QString m_rootName;
-    QStringList m_fileLosses;
-    int m_fileLossCount = 0;
-    QDateTime m_read; ///< modification time of the file when it was read
-    bool m_modified = false;
-    bool m_isEditing = false;
-    bool m_filling = false;
-    bool m_hasBackup = false;
     bool m_editingLongValue = false;
 
+    SettingsSaver m_saver;
+    SettingsModel m_model;
+    SettingsCommands m_commands;
     NoticeBar* m_notice;
+    NoticeBar* m_removal; ///< tells what was just removed
     QStackedWidget* m_pages;
-    QTreeWidget* m_tree = nullptr;
-    QPlainTextEdit* m_text = nullptr;
-    QPushButton* m_addValue = nullptr;
+    SettingsTree* m_tree;
+    MalformedFileView* m_text;
+    QPushButton* m_addSection = nullptr;
+    QPushButton* m_addKey = nullptr;
     QPushButton* m_remove = nullptr;
     QPushButton* m_save = nullptr;
 };

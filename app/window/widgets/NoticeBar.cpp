@@ -79,6 +79,15 @@ void NoticeBar::ShowMessage(QString const& text)
     show();
 }
 
+QPushButton* NoticeBar::AddButton(QString const& text)
+{
+    auto* button = new QPushButton(text);
+    button->setAutoDefault(false);
+    auto* row = static_cast<QHBoxLayout*>(layout());
+    row->insertWidget(row->count() - 1, button, 0, Qt::AlignTop);
+    return button;
+}
+
 void NoticeBar::Dismiss()
 {
     hide();

@@ -6,6 +6,7 @@
 #include <QFrame>
 
 class QLabel;
+class QPushButton;
 
 namespace Velocor {
 
@@ -27,6 +28,11 @@ public:
 
     /// Shows a message, below those not dismissed yet.
     void ShowMessage(QString const& text);
+
+    /// Adds a button before "Dismiss".
+    ///
+    /// @return owned by the bar
+    QPushButton* AddButton(QString const& text);
 
     /// Removes all messages.
     void Dismiss();

@@ -1,0 +1,270 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/settings/SettingsCommands.h"
+
+#include "app/window/widgets/PlainText.h"
+#include "common/config/TorkConfigText.h"
+
+#include <QSet>
+#include <QUndoCommand>
+
+#include <algorithm>
+
+namespace Velocor {
+
+namespace {
+
+using Place = SettingsModel::Place;
+
+// The maximum length of each name in a message, in characters.
+constexpr int MaximumNameLength = 40;
+
+// The maximum number of keys that a message about a removal names.
+constexpr int MaximumNamedKeys = 10;
+
+// Edits in their order; undone in the reverse one.
+class EditCommand : public QUndoCommand
+{
+public:
+    EditCommand(SettingsModel* model, QVector<SettingsEdit> const& edits, QString const& text)
+        : QUndoCommand(text), m_model(model), m_edits(edits)
+    {}
+
+    void redo() override { swap(); }
+    void undo() override { swap(); }
+
+private:
+    // What takes the edits back, in the reverse order, takes itself back in the same way.
+    void swap()
+    {
+        for (SettingsEdit& edit : m_edits)
+            edit = m_model->Apply(edit);
+        std::reverse(m_edits.begin(), m_edits.end());
+    }
+
+    SettingsModel* m_model;
+    QVector<SettingsEdit> m_edits;
+};
+
+SettingsEdit EditAt(SettingsEdit::Kind kind, Place place)
+{
+    SettingsEdit edit;
+    edit.kind = kind;
+    edit.section = place.section;
+    edit.item = place.item;
+    return edit;
+}
+
+// From the end of the document to its start, each row once, and no item of a removed section.
+QVector<Place> PlacesToRemove(QModelIndexList const& indexes)
+{
+    QVector<Place> places;
+    for (QModelIndex const& index : indexes) {
+        if (index.isValid() && index.column() == SettingsModel::NameColumn)
+            places.append(SettingsModel::PlaceOf(index));
+    }
+    const auto before = [](Place a, Place b) {
+        return a.section != b.section ? a.section < b.section : a.item < b.item;
+    };
+    std::sort(places.begin(), places.end(), before);
+    QVector<Place> result;
+    for (Place place : qAsConst(places)) {
+        const Place last = result.isEmpty() ? Place() : result.last();
+        const bool isCovered = last.item < 0 || last.item == place.item;
+        if (last.section != place.section || !isCovered)
+            result.append(place);
+    }
+    std::reverse(result.begin(), result.end());
+    return result;
+}
+
+} // namespace
+
+void SettingsCommands::push(Edits const& edits, QString const& text)
+{
+    m_undo.push(new EditCommand(m_model, edits, text));
+}
+
+// The names of the other sections, or of the other keys in the section.
+QStringList SettingsCommands::namesBeside(Place place) const
+{
+    QStringList names;
+    auto const& sections = m_model->document().sections;
+    if (place.item < 0) {
+        for (int i = 0; i < sections.size(); ++i) {
+            if (i != place.section)
+                names.append(sections.at(i).name);
+        }
+        return names;
+    }
+    auto const& items = sections.at(place.section).items;
+    for (int i = 0; i < items.size(); ++i) {
+        if (i != place.item)
+            names.append(items.at(i).key);
+    }
+    return names;
+}
+
+// Of a place that does not exist yet.
+QString SettingsCommands::freeName(Place place, QString const& base) const
+{
+    QSet<QString> taken{m_model->document().rootName};
+    const QStringList names = namesBeside(place);
+    for (QString const& other : names)
+        taken.insert(other);
+    QString name = base;
+    for (int number = 2; taken.contains(name); ++number)
+        name = base + QString::number(number);
+    return name;
+}
+
+QModelIndex SettingsCommands::AddSection()
+{
+    const int end = m_model->document().sections.size();
+    SettingsEdit edit = EditAt(SettingsEdit::InsertSection, {end, -1});
+    edit.addedSection.name = freeName({end, -1}, QStringLiteral("Section"));
+    push({edit}, tr("Add Section"));
+    return m_model->IndexOf({edit.section, -1});
+}
+
+QModelIndex SettingsCommands::AddKey(QModelIndex const& near)
+{
+    if (!near.isValid())
+        return QModelIndex();
+    Place place = SettingsModel::PlaceOf(near);
+    const int end = m_model->document().sections.at(place.section).items.size();
+    place.item = end;
+    SettingsEdit edit = EditAt(SettingsEdit::InsertItem, place);
+    edit.addedItem = {freeName(place, QStringLiteral("key")), tr("value")};
+    push({edit}, tr("Add Key"));
+    return m_model->IndexOf(place);
+}
+
+QModelIndex SettingsCommands::Duplicate(QModelIndex const& index)
+{
+    if (!index.isValid())
+        return QModelIndex();
+    Place place = SettingsModel::PlaceOf(index);
+    auto const& sections = m_model->document().sections;
+    if (place.item < 0) {
+        SettingsEdit edit = EditAt(SettingsEdit::InsertSection, {place.section + 1, -1});
+        edit.addedSection = sections.at(place.section);
+        edit.addedSection.name = freeName({sections.size(), -1}, edit.addedSection.name);
+        push({edit}, tr("Duplicate Section"));
+        return m_model->IndexOf({place.section + 1, -1});
+    }
+    auto const& items = sections.at(place.section).items;
+    SettingsEdit edit = EditAt(SettingsEdit::InsertItem, {place.section, place.item + 1});
+    edit.addedItem = items.at(place.item);
+    edit.addedItem.key = freeName({place.section, items.size()}, edit.addedItem.key);
+    push({edit}, tr("Duplicate Key"));
+    return m_model->IndexOf({place.section, place.item + 1});
+}
+
+void SettingsCommands::Remove(QModelIndexList const& indexes)
+{
+    Edits edits;
+    const QVector<Place> places = PlacesToRemove(indexes);
+    for (Place place : places)
+        edits.append(
+            EditAt(place.item < 0 ? SettingsEdit::RemoveSection : SettingsEdit::RemoveItem, place));
+    if (edits.isEmpty())
+        return;
+    const QString text = removalText(edits);
+    if (edits.size() > 1)
+        push(edits, tr("Remove %1 Items").arg(edits.size()));
+    else if (edits.first().isOfSection())
+        push(edits, tr("Remove Section"));
+    else
+        push(edits, tr("Remove Key"));
+    if (!text.isEmpty())
+        Q_EMIT removed(text);
+}
+
+// Empty for a single key, or a section with at most one.
+QString SettingsCommands::removalText(Edits const& removals) const
+{
+    QStringList names;
+    QStringList sectionNames;
+    int keys = 0;
+    const auto add = [&](SettingsDocument::Item const& item) {
+        if (++keys <= MaximumNamedKeys)
+            names.append(Shortened(item.key, MaximumNameLength));
+    };
+    for (auto edit = removals.rbegin(); edit != removals.rend(); ++edit) { // in document order
+        SettingsDocument::Section const& section = m_model->document().sections.at(edit->section);
+        if (!edit->isOfSection()) {
+            add(section.items.at(edit->item));
+            continue;
+        }
+        sectionNames.append(Shortened(section.name, MaximumNameLength));
+        std::for_each(section.items.begin(), section.items.end(), add);
+    }
+    if (keys < 2)
+        return QString();
+    if (keys > MaximumNamedKeys)
+        names.append(tr("and %1 more").arg(keys - MaximumNamedKeys));
+    const QString list = names.join(QLatin1String(", "));
+    if (sectionNames.isEmpty())
+        return tr("Removed %1 keys: ").arg(keys) + list;
+    const QString of = sectionNames.size() == 1 ? tr("section ") + sectionNames.first()
+                                                : tr("%1 sections").arg(sectionNames.size());
+    return tr("Removed ") + of + tr(", with %1 keys: ").arg(keys) + list;
+}
+
+void SettingsCommands::Move(QModelIndex const& index, int step)
+{
+    if (!index.isValid())
+        return;
+    const Place place = SettingsModel::PlaceOf(index);
+    const int target = index.row() + step;
+    if (target < 0 || target >= m_model->rowCount(m_model->parent(index)))
+        return;
+    const bool isSection = place.item < 0;
+    SettingsEdit edit =
+        EditAt(isSection ? SettingsEdit::MoveSection : SettingsEdit::MoveItem, place);
+    edit.target = target;
+    push({edit}, isSection ? tr("Move Section") : tr("Move Key"));
+}
+
+SettingsCommands::NameProblem SettingsCommands::CheckName(QModelIndex const& index,
+                                                          QString const& name) const
+{
+    const QString shown = Shortened(name, MaximumNameLength);
+    if (!TorkConfigText::IsPlainName(name))
+        return {tr("\"%1\" is not a valid section or key name").arg(shown),
+                tr("Use letters, digits, \"_\", \"-\" and \".\"; start with a letter or \"_\"")};
+    if (name == m_model->document().rootName)
+        return {tr("\"%1\" is the name of the root element").arg(shown), QString()};
+    if (namesBeside(SettingsModel::PlaceOf(index)).contains(name))
+        return {tr("There is already a \"%1\" here").arg(shown), QString()};
+    return NameProblem();
+}
+
+QString SettingsCommands::SetText(QModelIndex const& index, QString const& text)
+{
+    const Place place = SettingsModel::PlaceOf(index);
+    const QString old = SettingsModel::FullText(index);
+    const bool isValue = index.column() == SettingsModel::ValueColumn;
+    SettingsEdit edit = EditAt(SettingsEdit::SetValue, place);
+    edit.text = text;
+    if (!isValue) {
+        edit.text.remove(QLatin1Char(' '));
+        edit.kind = place.item < 0 ? SettingsEdit::RenameSection : SettingsEdit::RenameItem;
+    }
+    if (edit.text == old)
+        return QString();
+    if (isValue) {
+        push({edit}, tr("Change Value"));
+        return QString();
+    }
+    const NameProblem problem = CheckName(index, edit.text);
+    if (!problem.reason.isEmpty())
+        return problem.reason + tr(", so \"%1\" is kept. ").arg(Shortened(old, MaximumNameLength)) +
+               problem.hint;
+    push({edit}, place.item < 0 ? tr("Rename Section") : tr("Rename Key"));
+    return QString();
+}
+
+} // namespace Velocor

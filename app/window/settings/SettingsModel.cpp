@@ -1,0 +1,222 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/settings/SettingsModel.h"
+
+#include "app/window/widgets/PlainText.h"
+
+#include <QFont>
+
+#include <algorithm>
+
+namespace Velocor {
+
+namespace {
+
+constexpr int ShortenedLength = 200;
+
+} // namespace
+
+void SettingsModel::SetDocument(SettingsDocument const& document)
+{
+    beginResetModel();
+    m_document = document;
+    m_rows.clear();
+    for (int i = 0; i < document.sections.size(); ++i)
+        m_rows.push_back(std::make_unique<int>(i));
+    endResetModel();
+}
+
+void SettingsModel::renumber()
+{
+    int row = 0;
+    for (auto const& entry : m_rows)
+        *entry = row++;
+}
+
+SettingsEdit SettingsModel::Apply(SettingsEdit const& edit)
+{
+    SettingsEdit back;
+    const QModelIndex parent = edit.isOfSection() ? QModelIndex() : IndexOf({edit.section, -1});
+    const int row = edit.isOfSection() ? edit.section : edit.item;
+    switch (edit.kind) {
+    case SettingsEdit::InsertSection:
+    case SettingsEdit::InsertItem:
+        beginInsertRows(parent, row, row);
+        back = edit.Apply(m_document);
+        if (edit.isOfSection())
+            m_rows.insert(m_rows.begin() + row, std::make_unique<int>(row));
+        renumber();
+        endInsertRows();
+        break;
+    case SettingsEdit::RemoveSection:
+    case SettingsEdit::RemoveItem:
+        beginRemoveRows(parent, row, row);
+        back = edit.Apply(m_document);
+        if (edit.isOfSection())
+            m_rows.erase(m_rows.begin() + row);
+        renumber();
+        endRemoveRows();
+        break;
+    case SettingsEdit::MoveSection:
+    case SettingsEdit::MoveItem:
+        return applyMove(edit);
+    default:
+        return applyText(edit);
+    }
+    const int left = rowCount(parent);
+    Q_EMIT applied(left > 0 ? index(std::min(row, left - 1), NameColumn, parent) : parent);
+    return back;
+}
+
+SettingsEdit SettingsModel::applyMove(SettingsEdit const& edit)
+{
+    const QModelIndex parent = edit.isOfSection() ? QModelIndex() : IndexOf({edit.section, -1});
+    const int from = edit.isOfSection() ? edit.section : edit.item;
+    const int to = edit.target;
+    beginMoveRows(parent, from, from, parent, to > from ? to + 1 : to);
+    const SettingsEdit back = edit.Apply(m_document);
+    if (edit.isOfSection()) {
+        const auto start = m_rows.begin();
+        if (to > from)
+            std::rotate(start + from, start + from + 1, start + to + 1);
+        else
+            std::rotate(start + to, start + from, start + from + 1);
+        renumber();
+    }
+    endMoveRows();
+    Q_EMIT applied(index(to, NameColumn, parent));
+    return back;
+}
+
+SettingsEdit SettingsModel::applyText(SettingsEdit const& edit)
+{
+    const SettingsEdit back = edit.Apply(m_document);
+    const QModelIndex cell =
+        IndexOf({edit.section, edit.isOfSection() ? -1 : edit.item},
+                edit.kind == SettingsEdit::SetValue ? ValueColumn : NameColumn);
+    Q_EMIT dataChanged(cell, cell);
+    Q_EMIT applied(cell);
+    return back;
+}
+
+QModelIndex SettingsModel::IndexOf(Place place, Column column) const
+{
+    const QModelIndex section = index(place.section, place.item < 0 ? int(column) : 0);
+    return place.item < 0 || !section.isValid() ? section : index(place.item, column, section);
+}
+
+QModelIndex SettingsModel::ItemBeside(Place place, int step) const
+{
+    auto const& sections = m_document.sections;
+    int section = place.section;
+    int item = place.item + step;
+    while (section >= 0 && section < sections.size()) {
+        const int count = sections.at(section).items.size();
+        if (item >= 0 && item < count)
+            return IndexOf({section, item});
+        section += step;
+        const bool isBefore = step < 0 && section >= 0;
+        item = isBefore ? sections.at(section).items.size() - 1 : 0;
+    }
+    return QModelIndex();
+}
+
+SettingsModel::Place SettingsModel::PlaceOf(QModelIndex const& index)
+{
+    if (!index.isValid())
+        return Place();
+    if (IsSection(index))
+        return Place{index.row(), -1};
+    return Place{*static_cast<int const*>(index.internalPointer()), index.row()};
+}
+
+bool SettingsModel::IsSection(QModelIndex const& index)
+{
+    return index.isValid() && !index.internalPointer();
+}
+
+QString SettingsModel::FullText(QModelIndex const& index)
+{
+    return index.data(Qt::EditRole).toString();
+}
+
+bool SettingsModel::IsLong(QModelIndex const& index)
+{
+    return FullText(index).size() > MaximumCellLength;
+}
+
+QModelIndex SettingsModel::index(int row, int column, QModelIndex const& parent) const
+{
+    if (row < 0 || row >= rowCount(parent) || column < 0 || column >= ColumnCount)
+        return QModelIndex();
+    int* section =
+        parent.isValid() ? m_rows[static_cast<std::size_t>(parent.row())].get() : nullptr;
+    return createIndex(row, column, section);
+}
+
+QModelIndex SettingsModel::parent(QModelIndex const& index) const
+{
+    if (!index.isValid() || IsSection(index))
+        return QModelIndex();
+    return createIndex(PlaceOf(index).section, NameColumn, nullptr);
+}
+
+int SettingsModel::rowCount(QModelIndex const& parent) const
+{
+    if (!parent.isValid())
+        return m_document.sections.size();
+    const bool hasItems = IsSection(parent) && parent.column() == NameColumn;
+    return hasItems ? m_document.sections.at(parent.row()).items.size() : 0;
+}
+
+int SettingsModel::columnCount(QModelIndex const&) const
+{
+    return ColumnCount;
+}
+
+QString SettingsModel::text(QModelIndex const& index) const
+{
+    const Place place = PlaceOf(index);
+    SettingsDocument::Section const& section = m_document.sections.at(place.section);
+    const bool isName = index.column() == NameColumn;
+    if (place.item < 0)
+        return isName ? section.name : QString();
+    SettingsDocument::Item const& item = section.items.at(place.item);
+    return isName ? item.key : item.value;
+}
+
+QVariant SettingsModel::data(QModelIndex const& index, int role) const
+{
+    if (!index.isValid())
+        return QVariant();
+    if (role == Qt::EditRole)
+        return text(index);
+    if (role == Qt::DisplayRole) {
+        const QString full = text(index);
+        return full.size() > MaximumCellLength ? Shortened(full, ShortenedLength) : full;
+    }
+    if (role == Qt::FontRole && IsSection(index)) {
+        QFont bold;
+        bold.setBold(true);
+        return bold;
+    }
+    return QVariant();
+}
+
+QVariant SettingsModel::headerData(int section, Qt::Orientation orientation, int role) const
+{
+    if (orientation != Qt::Horizontal || role != Qt::DisplayRole)
+        return QVariant();
+    return section == NameColumn ? tr("Section / key") : tr("Value");
+}
+
+Qt::ItemFlags SettingsModel::flags(QModelIndex const& index) const
+{
+    if (!index.isValid())
+        return Qt::NoItemFlags;
+    const Qt::ItemFlags usual = Qt::ItemIsEnabled | Qt::ItemIsSelectable;
+    return IsSection(index) && index.column() == ValueColumn ? usual : usual | Qt::ItemIsEditable;
+}
+
+} // namespace Velocor

@@ -1,0 +1,91 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include "app/settingsfile/SettingsEdit.h"
+
+#include <QAbstractItemModel>
+
+#include <memory>
+#include <vector>
+
+namespace Velocor {
+
+/// A settings document as a tree: sections at the top, their keys and values below. GUI thread.
+///
+/// Cells show the start of a long text and its size; Qt::EditRole has all of it. The model only
+/// changes by Apply() and SetDocument(): SettingsCommands decides what may be changed.
+class SettingsModel : public QAbstractItemModel
+{
+    Q_OBJECT
+
+public:
+    enum Column { NameColumn, ValueColumn, ColumnCount };
+
+    /// The number of characters up to which a cell shows a text in full and may be edited in place.
+    /// Qt lays out the whole text each time the cell is drawn.
+    static constexpr int MaximumCellLength = 1000;
+
+    /// Where an index is in the document.
+    struct Place
+    {
+        int section = -1;
+        int item = -1; ///< -1 for the section itself
+    };
+
+    explicit SettingsModel(QObject* parent = nullptr) : QAbstractItemModel(parent) {}
+
+    /// Shows another document.
+    void SetDocument(SettingsDocument const& document);
+    SettingsDocument const& document() const { return m_document; }
+
+    /// Changes the document, and emits `applied`.
+    ///
+    /// @return what takes the change back
+    SettingsEdit Apply(SettingsEdit const& edit);
+
+    /// The cell of a place; invalid if there is none.
+    QModelIndex IndexOf(Place place, Column column = NameColumn) const;
+
+    /// The next item, in whatever section; invalid if there is none.
+    ///
+    /// @param step  1, or -1 for the previous one
+    QModelIndex ItemBeside(Place place, int step) const;
+
+    static Place PlaceOf(QModelIndex const& index);
+    static bool IsSection(QModelIndex const& index);
+
+    /// The text of a cell, however long.
+    static QString FullText(QModelIndex const& index);
+
+    /// Whether the cell shows only the start of its text.
+    static bool IsLong(QModelIndex const& index);
+
+    QModelIndex index(int row, int column,
+                      QModelIndex const& parent = QModelIndex()) const override;
+    QModelIndex parent(QModelIndex const& index) const override;
+    int rowCount(QModelIndex const& parent = QModelIndex()) const override;
+    int columnCount(QModelIndex const& parent = QModelIndex()) const override;
+    QVariant data(QModelIndex const& index, int role = Qt::DisplayRole) const override;
+    QVariant headerData(int section, Qt::Orientation orientation,
+                        int role = Qt::DisplayRole) const override;
+    Qt::ItemFlags flags(QModelIndex const& index) const override;
+
+Q_SIGNALS:
+    /// What an edit has changed; of a removal, what is there now.
+    void applied(QModelIndex const& index);
+
+private:
+    SettingsEdit applyMove(SettingsEdit const& edit);
+    SettingsEdit applyText(SettingsEdit const& edit);
+    void renumber();
+    QString text(QModelIndex const& index) const;
+
+    SettingsDocument m_document;
+    /// The row of each section. Indexes of items refer to that of their section, so they hold
+    /// while other sections come, go and move.
+    std::vector<std::unique_ptr<int>> m_rows;
+};
+
+} // namespace Velocor

@@ -1,0 +1,102 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/settings/SettingsSaver.h"
+
+#include "app/settingsfile/SettingsFileWriter.h"
+#include "app/window/widgets/PlainText.h"
+
+#include <QFileInfo>
+#include <QMessageBox>
+#include <QObject>
+#include <QPushButton>
+
+namespace Velocor {
+
+namespace {
+
+// The maximum length of each line in a message box, in characters.
+constexpr int MaximumLossLength = 300;
+
+} // namespace
+
+void SettingsSaver::NoteRead(QString const& path, SettingsDocument const& document)
+{
+    m_path = path;
+    m_hasBackup = false;
+    m_read = QFileInfo(path).lastModified();
+    m_fileLosses = document.losses;
+    m_fileLossCount = document.lossCount;
+}
+
+QString SettingsSaver::name() const
+{
+    return QFileInfo(m_path).fileName();
+}
+
+bool SettingsSaver::ask(QString const& text, QString const& details, QString const& acceptText)
+{
+    PlainMessageBox box(QMessageBox::Warning, m_parent, text, QMessageBox::Cancel, details);
+    QPushButton* yes = box.addButton(acceptText, QMessageBox::AcceptRole);
+    box.setDefaultButton(QMessageBox::Cancel);
+    box.exec();
+    return box.clickedButton() == yes;
+}
+
+bool SettingsSaver::confirmLosses(SettingsDocument const& document)
+{
+    QStringList losses = m_fileLosses + SettingsFileWriter::Losses(document);
+    const int unlisted = m_fileLossCount - m_fileLosses.size();
+    if (losses.isEmpty())
+        return true;
+
+    const int most = 12;
+    const int more = losses.size() - most + unlisted;
+    if (losses.size() > most)
+        losses = losses.mid(0, most);
+    for (QString& loss : losses)
+        loss = Shortened(loss, MaximumLossLength);
+    if (more > 0)
+        losses.append(QObject::tr("and %1 more").arg(more));
+    return ask(QObject::tr("Saving %1 would lose:").arg(name()), losses.join(QLatin1Char('\n')),
+               QObject::tr("Save Anyway"));
+}
+
+bool SettingsSaver::confirmOverwrite()
+{
+    if (!QFileInfo::exists(m_path) || QFileInfo(m_path).lastModified() == m_read)
+        return true;
+    return ask(QObject::tr("%1 was changed by another program.").arg(name()),
+               QObject::tr("Saving would overwrite those changes."), QObject::tr("Save Anyway"));
+}
+
+bool SettingsSaver::makeBackup()
+{
+    if (m_hasBackup)
+        return true;
+    QString error;
+    m_hasBackup = SettingsFileWriter::KeepBackup(m_path, &error);
+    if (m_hasBackup)
+        return true;
+    return ask(QObject::tr("Cannot back up %1.").arg(name()), error,
+               QObject::tr("Save Without Backup"));
+}
+
+bool SettingsSaver::Save(SettingsDocument const& document)
+{
+    if (!confirmOverwrite() || !confirmLosses(document) || !makeBackup())
+        return false;
+    QString error;
+    if (!SettingsFileWriter::Save(m_path, document, &error)) {
+        PlainMessageBox(QMessageBox::Critical, m_parent,
+                        QObject::tr("Could not save %1.\n%2").arg(m_path, error))
+            .exec();
+        return false;
+    }
+    m_read = QFileInfo(m_path).lastModified();
+    m_fileLosses.clear();
+    m_fileLossCount = 0;
+    return true;
+}
+
+} // namespace Velocor

@@ -1,0 +1,49 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include "app/settingsfile/SettingsDocument.h"
+
+#include <QDateTime>
+
+class QWidget;
+
+namespace Velocor {
+
+/// Saves one settings file, and asks the user before anything is lost by that. GUI thread only.
+class SettingsSaver
+{
+public:
+    /// @param parent  of its message boxes; not owned
+    explicit SettingsSaver(QWidget* parent) : m_parent(parent) {}
+
+    /// To be called whenever the file was read.
+    ///
+    /// @param document  what reading it resulted in
+    void NoteRead(QString const& path, SettingsDocument const& document);
+
+    /// Saves a document to the file. Copies the file to ".bak" before the first save.
+    ///
+    /// @return false if the user cancels, or saving failed, which the user was told
+    bool Save(SettingsDocument const& document);
+
+    /// How much of the file, as it was last read, saving would lose.
+    int lossCount() const { return m_fileLossCount; }
+
+private:
+    bool confirmLosses(SettingsDocument const& document);
+    bool confirmOverwrite();
+    bool ask(QString const& text, QString const& details, QString const& acceptText);
+    bool makeBackup();
+    QString name() const;
+
+    QWidget* m_parent;
+    QString m_path;
+    QStringList m_fileLosses;
+    int m_fileLossCount = 0;
+    QDateTime m_read; ///< modification time of the file when it was read
+    bool m_hasBackup = false;
+};
+
+} // namespace Velocor

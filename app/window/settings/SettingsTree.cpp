@@ -1,0 +1,273 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/settings/SettingsTree.h"
+
+#include "app/window/settings/SettingsCommands.h"
+#include "app/window/settings/SettingsDelegate.h"
+
+#include <QAction>
+#include <QClipboard>
+#include <QGuiApplication>
+#include <QHeaderView>
+#include <QKeyEvent>
+
+namespace Velocor {
+
+SettingsTree::SettingsTree(SettingsModel* model, SettingsCommands* commands, QWidget* parent)
+    : QTreeView(parent), m_model(model), m_commands(commands),
+      m_delegate(new SettingsDelegate(commands, this))
+{
+    setAccessibleName(tr("Settings"));
+    header()->setAccessibleName(tr("Settings columns"));
+    setEditTriggers(DoubleClicked);
+    setSelectionMode(ExtendedSelection);
+    setAlternatingRowColors(true);
+    setUniformRowHeights(true);
+    setTextElideMode(Qt::ElideMiddle); // a long value ends in its size
+    setContextMenuPolicy(Qt::ActionsContextMenu);
+    setModel(model);
+    setItemDelegate(m_delegate);
+    connect(m_delegate, &SettingsDelegate::editingChanged, this, &SettingsTree::editingChanged);
+    connect(m_delegate, &SettingsDelegate::rejected, this, [this](QString const& reason) {
+        m_isRejected = true;
+        Q_EMIT rejected(reason);
+    });
+    connect(m_delegate, &SettingsDelegate::longTextRequested, this,
+            &SettingsTree::longValueRequested);
+    connect(model, &SettingsModel::applied, this,
+            [this](QModelIndex const& index) { m_changed = index; });
+    makeActions();
+}
+
+QVector<SettingsCommand> SettingsTree::AllCommands()
+{
+    const auto keys = [](char const* text) {
+        return QList<QKeySequence>{QKeySequence(QLatin1String(text))};
+    };
+    return {
+        {tr("&Edit Value"), keys("F2") + keys("Return") + keys("Enter"), tr("Edit the value"),
+         &SettingsTree::EditValue},
+        {tr("Re&name"), keys("Shift+F2"), tr("Edit the name of the section or key"),
+         &SettingsTree::EditName},
+        {tr("Add &Key"), keys("Ins"), tr("Add a key to the section"), &SettingsTree::AddKey},
+        {tr("Add &Section"), keys("Alt+Ins"), tr("Add an empty section"),
+         &SettingsTree::AddSection},
+        {tr("Dupl&icate"), keys("Ctrl+D"), tr("Add a copy of the section or key"),
+         &SettingsTree::Duplicate},
+        {tr("Remo&ve"), keys("Del"), tr("Remove the selected sections and keys"),
+         &SettingsTree::Remove},
+        {tr("Move &Up"), keys("Alt+Up"), tr("Move the section or key up"), &SettingsTree::MoveUp},
+        {tr("Move &Down"), keys("Alt+Down"), tr("Move the section or key down"),
+         &SettingsTree::MoveDown},
+    };
+}
+
+void SettingsTree::makeActions()
+{
+    const QVector<SettingsCommand> all = AllCommands();
+    for (SettingsCommand const& command : all) {
+        // Shown, but not grabbed: keyPressEvent() handles it.
+        const QString key = command.keys.first().toString(QKeySequence::NativeText);
+        auto* action = new QAction(command.text + QLatin1Char('\t') + key, this);
+        action->setStatusTip(command.statusTip);
+        connect(action, &QAction::triggered, this, command.work);
+        m_actions.append(action);
+    }
+    addActions(m_actions);
+    updateActions();
+}
+
+void SettingsTree::AddOuterActions(QList<QAction*> const& actions)
+{
+    if (m_hasOuterActions)
+        return;
+    m_hasOuterActions = true;
+    auto* separator = new QAction(this);
+    separator->setSeparator(true);
+    insertActions(m_actions.first(), actions);
+    insertAction(m_actions.first(), separator);
+}
+
+// Without a current row, only a section can be added.
+void SettingsTree::updateActions()
+{
+    const bool hasRow = currentIndex().isValid();
+    const QVector<SettingsCommand> all = AllCommands();
+    for (int i = 0; i < m_actions.size(); ++i)
+        m_actions.at(i)->setEnabled(hasRow || all.at(i).work == &SettingsTree::AddSection);
+}
+
+// Keys that a field does not use arrive here, too.
+void SettingsTree::keyPressEvent(QKeyEvent* event)
+{
+    if (isEditing()) {
+        QTreeView::keyPressEvent(event);
+        return;
+    }
+    const int modifiers = static_cast<int>(event->modifiers() & ~Qt::KeypadModifier);
+    const QKeySequence pressed(modifiers + event->key());
+    const QVector<SettingsCommand> all = AllCommands();
+    for (int i = 0; i < all.size(); ++i) {
+        if (all.at(i).keys.contains(pressed)) {
+            m_actions.at(i)->trigger();
+            return;
+        }
+    }
+    QTreeView::keyPressEvent(event);
+}
+
+void SettingsTree::currentChanged(QModelIndex const& current, QModelIndex const& previous)
+{
+    QTreeView::currentChanged(current, previous);
+    if (current.isValid() != previous.isValid())
+        updateActions();
+}
+
+void SettingsTree::ShowAll()
+{
+    expandAll();
+    resizeColumnToContents(SettingsModel::NameColumn);
+    setColumnWidth(SettingsModel::NameColumn,
+                   qBound(160, columnWidth(SettingsModel::NameColumn) + 24, 360));
+    setCurrentIndex(m_model->IndexOf({0, -1}));
+    updateActions();
+}
+
+void SettingsTree::GoTo(QModelIndex const& index)
+{
+    if (!index.isValid())
+        return;
+    expand(index.parent());
+    setCurrentIndex(index);
+    scrollTo(index);
+}
+
+void SettingsTree::GoToChanged()
+{
+    GoTo(m_changed);
+}
+
+bool SettingsTree::isEditing() const
+{
+    return m_delegate->field() != nullptr;
+}
+
+bool SettingsTree::EndEditing()
+{
+    m_isRejected = false;
+    if (QWidget* field = m_delegate->field()) {
+        commitData(field);
+        closeEditor(field, QAbstractItemDelegate::NoHint);
+    }
+    return !m_isRejected;
+}
+
+void SettingsTree::editCell(QModelIndex const& row, SettingsModel::Column column)
+{
+    if (!row.isValid())
+        return;
+    const QModelIndex cell = row.sibling(row.row(), column);
+    GoTo(cell);
+    edit(cell);
+}
+
+void SettingsTree::AddSection()
+{
+    EndEditing();
+    editCell(m_commands->AddSection(), SettingsModel::NameColumn);
+}
+
+void SettingsTree::AddKey()
+{
+    EndEditing();
+    editCell(m_commands->AddKey(currentIndex()), SettingsModel::NameColumn);
+}
+
+// A section has no value.
+void SettingsTree::EditValue()
+{
+    const bool isSection = SettingsModel::IsSection(currentIndex());
+    editCell(currentIndex(), isSection ? SettingsModel::NameColumn : SettingsModel::ValueColumn);
+}
+
+void SettingsTree::EditName()
+{
+    editCell(currentIndex(), SettingsModel::NameColumn);
+}
+
+void SettingsTree::Duplicate()
+{
+    EndEditing();
+    const QModelIndex copy = m_commands->Duplicate(currentIndex());
+    expand(copy);
+    GoTo(copy);
+}
+
+void SettingsTree::Remove()
+{
+    EndEditing();
+    QModelIndexList rows = selectionModel()->selectedRows();
+    if (rows.isEmpty() && currentIndex().isValid())
+        rows.append(currentIndex().sibling(currentIndex().row(), SettingsModel::NameColumn));
+    m_commands->Remove(rows);
+    GoToChanged();
+}
+
+void SettingsTree::MoveUp()
+{
+    m_commands->Move(currentIndex(), -1);
+    scrollTo(currentIndex());
+}
+
+void SettingsTree::MoveDown()
+{
+    m_commands->Move(currentIndex(), 1);
+    scrollTo(currentIndex());
+}
+
+void SettingsTree::copy()
+{
+    QModelIndex cell = currentIndex();
+    if (!cell.isValid())
+        return;
+    if (!SettingsModel::IsSection(cell))
+        cell = cell.sibling(cell.row(), SettingsModel::ValueColumn);
+    QGuiApplication::clipboard()->setText(SettingsModel::FullText(cell));
+}
+
+// Qt searches the current column, and what one remembers is a name.
+void SettingsTree::keyboardSearch(QString const& search)
+{
+    const QModelIndex current = currentIndex();
+    selectionModel()->setCurrentIndex(current.sibling(current.row(), SettingsModel::NameColumn),
+                                      QItemSelectionModel::NoUpdate);
+    QTreeView::keyboardSearch(search);
+}
+
+void SettingsTree::closeEditor(QWidget* editor, QAbstractItemDelegate::EndEditHint hint)
+{
+    const bool isNext = hint == QAbstractItemDelegate::EditNextItem;
+    const bool isPrevious = hint == QAbstractItemDelegate::EditPreviousItem;
+    QTreeView::closeEditor(editor, isNext || isPrevious ? QAbstractItemDelegate::NoHint : hint);
+    if (isNext || isPrevious)
+        editValueBeside(isNext ? 1 : -1);
+}
+
+// From the name of a key, the next value is its own. A long one is only gone to: its dialog would
+// be in the way of somebody who is typing.
+void SettingsTree::editValueBeside(int step)
+{
+    const SettingsModel::Place place = SettingsModel::PlaceOf(currentIndex());
+    const bool isName = currentIndex().column() == SettingsModel::NameColumn;
+    const bool isOwn = isName && place.item >= 0 && step > 0;
+    const QModelIndex row = isOwn ? m_model->IndexOf(place) : m_model->ItemBeside(place, step);
+    const QModelIndex value = row.sibling(row.row(), SettingsModel::ValueColumn);
+    if (!value.isValid())
+        return;
+    GoTo(value);
+    if (!SettingsModel::IsLong(value))
+        edit(value);
+}
+
+} // namespace Velocor
