@@ -143,14 +143,13 @@ void LogEncoding::narrowUnicode(char const*& line, int& length, QByteArray& buff
     }
 }
 
-char const* LogLineEnd::Find(char const* at, char const* end, qint64 offset, char before) const
+char const* LogLineEnd::findPair(char const* at, char const* end, qint64 offset, char before) const
 {
     char const* const start = at;
     while (at != end) {
-        auto const* last =
-            static_cast<char const*>(std::memchr(at, m_last, static_cast<size_t>(end - at)));
-        if (!last || m_size == 1)
-            return last;
+        char const* const last = findLast(at, end);
+        if (!last)
+            return nullptr;
         const char first = last == start ? before : last[-1];
         if (first == m_first && (offset + (last - start) - 1) % m_unit == 0)
             return last;

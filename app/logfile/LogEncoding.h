@@ -6,6 +6,8 @@
 #include <QByteArray>
 #include <QString>
 
+#include <cstring>
+
 namespace Velocor {
 
 /// The encoding of a log file. A plain value; any thread.
@@ -101,9 +103,18 @@ public:
     /// @param offset  where `at` is in the file
     /// @param before  the byte before `at`; 0 if a line starts there
     /// @return nullptr if there is none
-    char const* Find(char const* at, char const* end, qint64 offset, char before) const;
+    char const* Find(char const* at, char const* end, qint64 offset, char before) const
+    {
+        return m_size == 1 ? findLast(at, end) : findPair(at, end, offset, before);
+    }
 
 private:
+    char const* findLast(char const* at, char const* end) const
+    {
+        return static_cast<char const*>(std::memchr(at, m_last, static_cast<size_t>(end - at)));
+    }
+    char const* findPair(char const* at, char const* end, qint64 offset, char before) const;
+
     char m_first = '\0';
     char m_last = '\n';
     int m_size = 1;

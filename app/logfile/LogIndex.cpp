@@ -259,9 +259,12 @@ bool LogIndex::addLine(char const* line, int length, bool complete)
     encoding.Narrow(line, length, narrow);
     const LogLineParser::Parts parts =
         m_parser.Find(line, std::min(length, PartsLimit), m_beginnings);
-    m_hasElapsed = m_hasElapsed || parts.elapsedLength > 0;
-    m_hasTimes = m_hasTimes || parts.timeLength > 0;
-    m_hasSeverities = m_hasSeverities || parts.severity != LogEntry::None;
+    if (parts.elapsedLength > 0)
+        m_hasElapsed = true;
+    if (parts.timeLength > 0)
+        m_hasTimes = true;
+    if (parts.severity != LogEntry::None)
+        m_hasSeverities = true;
     m_lastIsComplete = complete;
 
     if (isSeam(parts, end)) {

@@ -62,31 +62,58 @@ LogLineParser::LogLineParser(QStringList const& dateFormats, QStringList const& 
         const auto severity = static_cast<LogEntry::Severity>(i);
         const QByteArray name = LogSeverities::LoggedName(severity);
         const QByteArray translated = LogSeverities::Name(severity).toLatin1();
-        m_names.push_back({name, severity});
+        m_names.emplace_back(name, severity);
         if (translated != name && !translated.isEmpty())
-            m_names.push_back({translated, severity});
+            m_names.emplace_back(translated, severity);
     }
+    m_firstNames.fill(static_cast<quint8>(m_names.size()));
+    for (size_t i = m_names.size(); i > 0; --i)
+        m_firstNames[static_cast<uchar>(m_names[i - 1].text.at(0))] = static_cast<quint8>(i - 1);
+}
+
+LogLineParser::Name::Name(QByteArray const& name, LogEntry::Severity ofSeverity)
+    : text(name), severity(ofSeverity)
+{
+    const QByteArray bytes = text + ' ';
+    const QByteArray mask(bytes.size(), '\xFF');
+    if (static_cast<size_t>(bytes.size()) <= sizeof m_bytes) {
+        std::memcpy(m_bytes.data(), bytes.constData(), static_cast<size_t>(bytes.size()));
+        std::memcpy(m_mask.data(), mask.constData(), static_cast<size_t>(mask.size()));
+    }
+}
+
+// Which name there is differs from line to line, so that a processor cannot foresee where a
+// comparison ends: all bytes are compared at once. For the goal "opening" in docs/performance.md;
+// tst_PlainLineParser.
+bool LogLineParser::Name::IsAt(char const* at, int length) const
+{
+    Words words;
+    if (m_mask[0] != 0 && static_cast<size_t>(length) >= sizeof words) {
+        std::memcpy(words.data(), at, sizeof words);
+        return (((words[0] ^ m_bytes[0]) & m_mask[0]) | ((words[1] ^ m_bytes[1]) & m_mask[1])) == 0;
+    }
+    const int size = text.size();
+    return length >= size && std::memcmp(at, text.constData(), static_cast<size_t>(size)) == 0 &&
+           (length == size || at[size] == ' ');
 }
 
 LogLineParser::Name const* LogLineParser::nameAt(char const* text, int length) const
 {
-    for (Name const& name : m_names) {
-        const int size = name.text.size();
-        if (length < size || *text != name.text.at(0) ||
-            std::memcmp(text, name.text.constData(), static_cast<size_t>(size)) != 0)
-            continue;
-        if (length == size || text[size] == ' ')
-            return &name;
-    }
-    return nullptr;
+    if (length <= 0)
+        return nullptr;
+    Name const* const end = m_names.data() + m_names.size();
+    Name const* name = m_names.data() + m_firstNames[static_cast<uchar>(*text)];
+    while (name != end && !name->IsAt(text, length))
+        ++name;
+    return name != end ? name : nullptr;
 }
 
 bool LogLineParser::findByFormat(char const* line, int length, Beginnings* last, Parts& parts) const
 {
-    for (size_t i = 0; i < m_readers.size(); ++i) {
-        LogTimeReader const& reader = m_readers[i];
+    LogTimeReader::Beginning* beginning = last ? last->data() : nullptr;
+    for (LogTimeReader const& reader : m_readers) {
         const LogTimeReader::Stamp stamp =
-            last ? reader.Read(line, length, (*last)[i]) : reader.Read(line, length);
+            beginning ? reader.Read(line, length, *beginning++) : reader.Read(line, length);
         const int blank = stamp.length;
         if (blank < 0 || blank >= length || line[blank] != ' ')
             continue;
@@ -127,13 +154,19 @@ bool LogLineParser::findByName(char const* line, int length, Parts& parts) const
     return false;
 }
 
+bool LogLineParser::mayBeElapsed(char first) const
+{
+    return std::any_of(m_elapsedPrefixes.begin(), m_elapsedPrefixes.end(),
+                       [first](QByteArray const& prefix) { return prefix.at(0) == first; });
+}
+
 void LogLineParser::findElapsed(char const* line, int length, Parts& parts) const
 {
     char const* const rest = line + parts.message;
     const int restLength = length - parts.message;
     for (QByteArray const& prefix : m_elapsedPrefixes) {
         const int size = prefix.size();
-        if (restLength < size || *rest != prefix.at(0) ||
+        if (restLength < size ||
             std::memcmp(rest, prefix.constData(), static_cast<size_t>(size)) != 0)
             continue;
         const int number = NumberInBrackets(rest + size, restLength - size);
@@ -150,7 +183,8 @@ void LogLineParser::findElapsed(char const* line, int length, Parts& parts) cons
 void LogLineParser::findOwn(char const* line, int length, Beginnings* last, Parts& parts) const
 {
     length = std::min(length, SearchLimit);
-    if (findByFormat(line, length, last, parts) || findByName(line, length, parts))
+    const bool isFound = findByFormat(line, length, last, parts) || findByName(line, length, parts);
+    if (isFound && parts.message < length && mayBeElapsed(line[parts.message]))
         findElapsed(line, length, parts);
 }
 

@@ -11,6 +11,7 @@
 #include <QString>
 #include <QStringList>
 
+#include <array>
 #include <vector>
 
 namespace Velocor {
@@ -88,10 +89,21 @@ public:
     static constexpr int SearchLimit = 512;
 
 private:
-    struct Name
+    class Name
     {
+    public:
+        Name(QByteArray const& name, LogEntry::Severity ofSeverity);
+        bool IsAt(char const* at, int length) const;
+
         QByteArray text;
         LogEntry::Severity severity;
+
+    private:
+        using Words = std::array<quint64, 2>;
+
+        // With the blank after it; zero if the name is longer.
+        Words m_bytes = {};
+        Words m_mask = {};
     };
 
     Name const* nameAt(char const* text, int length) const;
@@ -100,12 +112,14 @@ private:
     bool findForeign(char const* line, int length, Parts& parts) const;
     bool findByFormat(char const* line, int length, Beginnings* last, Parts& parts) const;
     bool findByName(char const* line, int length, Parts& parts) const;
+    bool mayBeElapsed(char first) const;
     void findElapsed(char const* line, int length, Parts& parts) const;
     bool parseForeign(char const* line, int length, LogEntry& entry) const;
 
     std::vector<LogTimeReader> m_readers;
     std::vector<QByteArray> m_elapsedPrefixes;
     std::vector<Name> m_names;
+    std::array<quint8, 256> m_firstNames = {}; // by first byte: where in m_names to begin
     LogEncoding m_chosenEncoding = LogEncoding::Automatic;
     bool m_isOwn = false;
     LogFileType m_type;

@@ -75,15 +75,20 @@ LogTimeReader::LogTimeReader(QString const& format) : m_fractionOfSecond(WritesF
     m_hasDate = (found[Year] || found[ShortYear]) && found[Month] && found[Day];
     m_hasTime = found[Hour] && found[Minute];
     m_resolution = found[Fraction] ? 1 : found[Second] ? 1000 : MinuteLength;
-    m_secondsToken = m_hasTime ? secondsToken() : 0;
+    if (m_hasTime)
+        splitSeconds();
+    m_pieces[m_parts + 1] = m_tokens.size();
 }
 
-// The first token for seconds or their fraction, if only those and text follow, and numbers and
-// text come before it: whatever follows those, they are read in the same way. (A number that is
-// shorter than it may be ends at text, because seconds begin with a digit.) 0 if there is no such
-// token.
-size_t LogTimeReader::secondsToken() const
+// Splits the tokens before the first one for seconds or their fraction, if only those and text
+// follow, and numbers and text come before it: whatever follows those, they are read in the same
+// way. (A number that is shorter than it may be ends at text, because seconds begin with a digit.)
+// And before the fraction, if it is the last number.
+void LogTimeReader::splitSeconds()
 {
+    const auto isFraction = [](Token const& token) {
+        return token.field == Fraction;
+    };
     const auto isSeconds = [](Token const& token) {
         return token.field == Second || token.field == Fraction;
     };
@@ -97,8 +102,13 @@ size_t LogTimeReader::secondsToken() const
     const bool isFixed = std::all_of(m_tokens.begin(), first, [&](Token const& token) {
         return token.kind == Number || isText(token);
     });
-    const bool isFound = first != m_tokens.end() && isLast && isFixed;
-    return isFound ? static_cast<size_t>(first - m_tokens.begin()) : 0;
+    if (first == m_tokens.begin() || first == m_tokens.end() || !isLast || !isFixed)
+        return;
+    m_pieces[++m_parts] = static_cast<size_t>(first - m_tokens.begin());
+    const auto fraction = std::find_if(first + 1, m_tokens.end(), isFraction);
+    if (fraction != m_tokens.end() && !isFraction(*first) &&
+        std::all_of(fraction + 1, m_tokens.end(), isText))
+        m_pieces[++m_parts] = static_cast<size_t>(fraction - m_tokens.begin());
 }
 
 void LogTimeReader::parseFormat(QString const& format)
@@ -245,87 +255,87 @@ int LogTimeReader::inMinute(Values const& values)
     return values.number[Second] * 1000 + values.number[Fraction];
 }
 
-bool LogTimeReader::readText(Token const& token, char const*& at, char const* end)
+char const* LogTimeReader::readText(Token const& token, char const* at, char const* end)
 {
     char const* const text = token.text.constData();
     const int size = token.text.size();
     if (end - at < size)
-        return false;
+        return nullptr;
     // Mostly of one character, for which a call would take longer.
     for (int i = 0; i < size; ++i) {
         if (at[i] != text[i])
-            return false;
+            return nullptr;
     }
-    at += size;
-    return true;
+    return at + size;
 }
 
-bool LogTimeReader::readNumber(Token const& token, char const*& at, char const* end,
-                               Values& values) const
+char const* LogTimeReader::readNumber(Token const& token, char const* at, char const* end,
+                                      Values& values) const
 {
-    char const* const start = at;
     int value = 0;
-    for (; at != end && at - start < token.maximum && IsAsciiDigit(*at); ++at)
+    int digits = 0;
+    for (; at != end && digits < token.maximum && IsAsciiDigit(*at); ++at, ++digits)
         value = value * 10 + (*at - '0');
-    const auto digits = static_cast<int>(at - start);
     if (digits < token.minimum)
-        return false;
+        return nullptr;
     if (token.field == Fraction && m_fractionOfSecond)
         value = ScaledToMilliseconds(value, digits);
     values.number[token.field] = value;
-    return true;
+    return at;
 }
 
-bool LogTimeReader::readMonth(char const*& at, char const* end, Values& values) const
+char const* LogTimeReader::readMonth(char const* at, char const* end, Values& values) const
 {
     for (size_t i = 0; i < m_monthNames.size(); ++i) {
         QByteArray const& name = m_monthNames[i];
         if (name.isEmpty() || end - at < name.size() ||
             std::memcmp(at, name.constData(), static_cast<size_t>(name.size())) != 0)
             continue;
-        at += name.size();
         values.number[Month] = static_cast<int>(i / 2 % 12) + 1;
-        return true;
+        return at + name.size();
     }
-    return false;
+    return nullptr;
 }
 
-bool LogTimeReader::readWord(Token const& token, char const*& at, char const* end, Values& values)
+char const* LogTimeReader::readWord(Token const& token, char const* at, char const* end,
+                                    Values& values)
 {
     char const* const start = at;
     while (at != end && IsWordCharacter(*at))
         ++at;
-    if (token.field == HalfDay && at != start) {
+    if (at == start)
+        return nullptr;
+    if (token.field == HalfDay) {
         const bool afternoon = *start == 'p' || *start == 'P';
         const bool twelve = values.number[Hour] == 12;
         values.number[HalfDay] = afternoon ? (twelve ? 0 : 12) : (twelve ? -12 : 0);
     }
-    return at != start;
+    return at;
 }
 
-bool LogTimeReader::readTokens(size_t first, size_t last, char const*& at, char const* end,
-                               Values& values) const
+// Reads what the tokens from `first` to the one before `last` stand for. Returns what follows it;
+// nullptr if it is something else.
+char const* LogTimeReader::readTokens(size_t first, size_t last, char const* at, char const* end,
+                                      Values& values) const
 {
-    for (size_t i = first; i < last; ++i) {
+    for (size_t i = first; at && i < last; ++i) {
         Token const& token = m_tokens[i];
-        const bool isRead = token.kind == Number      ? readNumber(token, at, end, values)
-                            : token.kind == Exactly   ? readText(token, at, end)
-                            : token.kind == MonthName ? readMonth(at, end, values)
-                                                      : readWord(token, at, end, values);
-        if (!isRead)
-            return false;
+        at = token.kind == Number      ? readNumber(token, at, end, values)
+             : token.kind == Exactly   ? readText(token, at, end)
+             : token.kind == MonthName ? readMonth(at, end, values)
+                                       : readWord(token, at, end, values);
     }
-    return true;
+    return at;
 }
 
 LogTimeReader::Stamp LogTimeReader::Read(char const* text, int length) const
 {
     Stamp stamp;
     Values values;
-    char const* at = text;
-    if (!readTokens(0, m_tokens.size(), at, text + length, values))
+    char const* const end = readTokens(0, m_tokens.size(), text, text + length, values);
+    if (!end)
         return stamp;
-    stamp.length = static_cast<int>(at - text);
+    stamp.length = static_cast<int>(end - text);
     if (m_hasTime)
         stamp.key = keyOf(values);
     return stamp;
@@ -334,31 +344,55 @@ LogTimeReader::Stamp LogTimeReader::Read(char const* text, int length) const
 // For the goal "opening" in docs/performance.md. tst_PlainLineParser compares it with the other.
 LogTimeReader::Stamp LogTimeReader::Read(char const* text, int length, Beginning& last) const
 {
-    if (m_secondsToken == 0)
+    const auto isKnown = [&](Beginning::Part const& part) {
+        return part.length > 0 && length >= part.length &&
+               std::memcmp(text, last.text.data(), static_cast<size_t>(part.length)) == 0;
+    };
+    size_t known = m_parts;
+    while (known > 0 && !isKnown(last.parts[known - 1]))
+        --known;
+    if (known < m_parts)
+        return readAndNote(text, length, known, last);
+    if (known == 0)
         return Read(text, length);
-    const bool isKnown = last.length > 0 && length >= last.length &&
-                         std::memcmp(text, last.text.data(), static_cast<size_t>(last.length)) == 0;
+
     Stamp stamp;
     Values values;
-    char const* at = isKnown ? text + last.length : text;
-    char const* const end = text + length;
-    if (!isKnown && !readTokens(0, m_secondsToken, at, end, values))
-        return stamp;
-    char const* const seconds = at;
-    if (!readTokens(m_secondsToken, m_tokens.size(), at, end, values))
-        return stamp;
+    Beginning::Part const& part = last.parts[known - 1];
+    char const* const end =
+        readTokens(m_pieces[known], m_tokens.size(), text + part.length, text + length, values);
+    if (end) {
+        stamp.length = static_cast<int>(end - text);
+        stamp.key = part.key + inMinute(values);
+    }
+    return stamp;
+}
+
+// Notes the parts only of what is a stamp: in other text, a number may end where the text does.
+//
+// @param known  how many parts are known
+LogTimeReader::Stamp LogTimeReader::readAndNote(char const* text, int length, size_t known,
+                                                Beginning& last) const
+{
+    Stamp stamp;
+    std::array<Beginning::Part, 2> parts = last.parts;
+    char const* at = text + (known > 0 ? parts[known - 1].length : 0);
+    qint64 key = known > 0 ? parts[known - 1].key : 0;
+    for (size_t i = known; i <= m_parts; ++i) {
+        Values values;
+        at = readTokens(m_pieces[i], m_pieces[i + 1], at, text + length, values);
+        if (!at)
+            return stamp;
+        key += i == 0 ? keyOf(values) : inMinute(values);
+        const auto end = static_cast<int>(at - text);
+        if (i < m_parts)
+            parts[i] = {end <= static_cast<int>(last.text.size()) ? end : 0, key};
+    }
+    for (Beginning::Part const& part : parts)
+        std::copy(text, text + part.length, last.text.begin());
+    last.parts = parts;
     stamp.length = static_cast<int>(at - text);
-    if (isKnown) {
-        stamp.key = last.key + inMinute(values);
-        return stamp;
-    }
-    stamp.key = keyOf(values);
-    last.length = 0;
-    if (seconds - text <= static_cast<std::ptrdiff_t>(last.text.size())) {
-        last.length = static_cast<int>(seconds - text);
-        last.key = stamp.key - inMinute(values);
-        std::copy(text, seconds, last.text.begin());
-    }
+    stamp.key = key;
     return stamp;
 }
 

@@ -36,16 +36,21 @@ public:
     /// Reads the time stamp at the start of a line, in Latin-1.
     Stamp Read(char const* text, int length) const;
 
-    /// How a stamp began: the part before its seconds, which the next stamp in a log usually has,
-    /// too.
+    /// How a stamp began: the parts before its seconds and before their fraction, which the next
+    /// stamps in a log often have, too.
     struct Beginning
     {
+        struct Part
+        {
+            int length = 0; ///< 0: unknown
+            qint64 key = 0; ///< what it adds to the key
+        };
+
         std::array<char, 24> text = {};
-        int length = 0; ///< 0: unknown
-        qint64 key = 0; ///< what it adds to the key
+        std::array<Part, 2> parts = {};
     };
 
-    /// The same, faster for stamps of the same minute.
+    /// The same, faster for stamps of the same minute or second.
     ///
     /// @param last  of the last stamp that this reader has read, or unknown; is set
     Stamp Read(char const* text, int length, Beginning& last) const;
@@ -79,19 +84,23 @@ private:
     void addMonthName();
     void addNumber(Field field, int minimum, int maximum);
     int addQuoted(QString const& format, int position);
-    size_t secondsToken() const;
+    void splitSeconds();
     static qint64 keyOf(Values const& values);
+    Stamp readAndNote(char const* text, int length, size_t known, Beginning& last) const;
     static int inMinute(Values const& values);
-    bool readTokens(size_t first, size_t last, char const*& at, char const* end,
-                    Values& values) const;
-    static bool readText(Token const& token, char const*& at, char const* end);
-    bool readNumber(Token const& token, char const*& at, char const* end, Values& values) const;
-    bool readMonth(char const*& at, char const* end, Values& values) const;
-    static bool readWord(Token const& token, char const*& at, char const* end, Values& values);
+    char const* readTokens(size_t first, size_t last, char const* at, char const* end,
+                           Values& values) const;
+    static char const* readText(Token const& token, char const* at, char const* end);
+    char const* readNumber(Token const& token, char const* at, char const* end,
+                           Values& values) const;
+    char const* readMonth(char const* at, char const* end, Values& values) const;
+    static char const* readWord(Token const& token, char const* at, char const* end,
+                                Values& values);
 
     std::vector<Token> m_tokens;
     std::vector<QByteArray> m_monthNames; // long and short names alternate, January first
-    size_t m_secondsToken = 0;            // 0: stamps have no beginning that can be known
+    std::array<size_t, 4> m_pieces = {};  // the tokens that they begin with, and the end
+    size_t m_parts = 0;                   // pieces that can be known, all but the last one
     bool m_hasDate = false;
     int m_resolution = 1;
     bool m_hasTime = false;

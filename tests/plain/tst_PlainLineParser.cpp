@@ -2,16 +2,21 @@
 // SPDX-License-Identifier: MIT
 
 // Compares what is found in a line when the beginning of the stamp before it is known with what is
-// found without: for stamps in all kinds of formats, all of a day, and lines of all kinds.
+// found without: for stamps in all kinds of formats, all of a day, and lines of all kinds. And the
+// severity after a stamp with the first of the names that is there.
 
 #include "app/logfile/LogLineParser.h"
+#include "app/logfile/LogSeverities.h"
 
 #include "Rounds.h"
 
 #include <QDateTime>
+#include <QTranslator>
 #include <QtTest>
 
+#include <map>
 #include <random>
+#include <vector>
 
 using namespace Velocor;
 
@@ -25,11 +30,14 @@ private slots:
     void everyStampOfADay();
     void lines_data();
     void lines();
+    void names_data();
+    void names();
     void cleanupTestCase();
 
 private:
     int m_stamps = 0;
     int m_lines = 0;
+    int m_names = 0;
 };
 
 namespace {
@@ -89,6 +97,63 @@ bool IsSame(LogLineParser::Parts const& one, LogLineParser::Parts const& other)
            one.isEntry == other.isEntry;
 }
 
+// Translates the names of the severities: to longer ones, of two words, that begin alike.
+class Translator : public QTranslator
+{
+public:
+    QString translate(char const* context, char const* text, char const*, int) const override
+    {
+        static std::map<QByteArray, QString> const names = {{"Trace", "T"},
+                                                            {"Notification", "Benachrichtigung"},
+                                                            {"Warning", "Warnungen, alle"},
+                                                            {"Error", "Fehler"},
+                                                            {"Fatal", "Schwerwiegender Fehler"}};
+        const auto found = names.find(text);
+        return context != QByteArray("QObject") || found == names.end() ? QString() : found->second;
+    }
+    bool isEmpty() const override { return false; }
+};
+
+struct PlainName
+{
+    QByteArray text;
+    LogEntry::Severity severity = LogEntry::None;
+};
+
+std::vector<PlainName> PlainNames()
+{
+    std::vector<PlainName> names;
+    for (int i = 0; i < LogEntry::None; ++i) {
+        const auto severity = static_cast<LogEntry::Severity>(i);
+        names.push_back({LogSeverities::LoggedName(severity), severity});
+        names.push_back({LogSeverities::Name(severity).toLatin1(), severity});
+    }
+    return names;
+}
+
+PlainName PlainNameAt(std::vector<PlainName> const& names, QByteArray const& text)
+{
+    for (PlainName const& name : names) {
+        if (text == name.text || text.startsWith(name.text + ' '))
+            return name;
+    }
+    return PlainName();
+}
+
+// Of a line that begins with a stamp of so many bytes and a blank.
+PlainName PlainNameIn(std::vector<PlainName> const& names, QByteArray const& line, int stampLength)
+{
+    const PlainName name = PlainNameAt(names, line.mid(stampLength + 1));
+    if (!name.text.isEmpty() || line.mid(stampLength + 1, 1) == " ")
+        return name;
+    for (int at = 0; at < qMin(line.size(), 80); ++at) {
+        const PlainName later = PlainNameAt(names, line.mid(at + 1));
+        if (line.at(at) == ' ' && !later.text.isEmpty())
+            return later;
+    }
+    return PlainName();
+}
+
 } // namespace
 
 void tst_PlainLineParser::everyFormat_data()
@@ -119,6 +184,12 @@ void tst_PlainLineParser::everyFormat_data()
                                "hms",
                                "hh:mm:ss ss",
                                "hh:mm s's' s",
+                               "hh:mm:ssz",
+                               "h:m:sz",
+                               "hh:mm z s",
+                               "hh:mm s.z s",
+                               "hh:mm s.z z",
+                               "hh:mm z.z",
                                "yyyyyy-MM-dd hh:mm:ss",
                                "'a very long text before it' hh:mm:ss",
                                "dd hh:mm",
@@ -214,10 +285,45 @@ void tst_PlainLineParser::lines()
     }
 }
 
-void tst_PlainLineParser::cleanupTestCase()
+void tst_PlainLineParser::names_data()
 {
-    std::printf("plain line parser: %d stamps and %d lines compared\n", m_stamps, m_lines);
+    QTest::addColumn<bool>("isTranslated");
+    QTest::newRow("in English") << false;
+    QTest::newRow("in another language") << true;
 }
 
-QTEST_APPLESS_MAIN(tst_PlainLineParser)
+void tst_PlainLineParser::names()
+{
+    QFETCH(bool, isTranslated);
+    Translator translator;
+    if (isTranslated)
+        QCoreApplication::installTranslator(&translator);
+    const std::vector<PlainName> names = PlainNames();
+    const LogLineParser parser;
+    Random random;
+    const int count = Rounds::count(10000, 2000000);
+    for (int i = 0; i < count; ++i, ++m_names) {
+        QByteArray text = names[size_t(random.below(int(names.size())))].text;
+        if (random.once(3))
+            text = random.damaged(text);
+        if (random.once(2))
+            text += ' ' + names[size_t(random.below(int(names.size())))].text;
+        text += QByteArray(" a text of some words").left(random.below(21));
+        const QByteArray line = "2026-03-03 09:02:11.031 " + text;
+        const LogLineParser::Parts parts = parser.Find(line.constData(), line.size());
+        const PlainName plain = PlainNameIn(names, line, 23);
+        const int messageStart = parts.timeLength + 2 + plain.text.size();
+        if (parts.severity != plain.severity ||
+            (parts.isEntry && parts.message != qMin(line.size(), messageStart)))
+            QFAIL(qPrintable("another severity: " + line));
+    }
+}
+
+void tst_PlainLineParser::cleanupTestCase()
+{
+    std::printf("plain line parser: %d stamps, %d lines and %d names compared\n", m_stamps, m_lines,
+                m_names);
+}
+
+QTEST_GUILESS_MAIN(tst_PlainLineParser)
 #include "tst_PlainLineParser.moc"

@@ -106,8 +106,10 @@ private:
     void truncate()
     {
         const int size = int(m_plain.size());
-        const int lines = m_draws->once(2) ? m_draws->below(size + 1)
-                                           : size - m_draws->below(qMin(size, 300) + 1);
+        int lines = m_draws->once(2) ? m_draws->below(size + 1)
+                                     : size - m_draws->below(qMin(size, 300) + 1);
+        if (m_draws->once(3))
+            lines -= lines % int(LineTable::BlockSize);
         tell("truncate to #", lines);
         m_table.Truncate(size_t(lines));
         m_plain.resize(size_t(lines));
@@ -220,7 +222,9 @@ private:
 
     void truncate()
     {
-        const int count = m_draws->below(int(m_plain.size()) + 2);
+        int count = m_draws->below(int(m_plain.size()) + 2);
+        if (m_draws->once(3))
+            count -= count % int(LineNumbers::BlockSize);
         tell("truncate to #", count);
         m_numbers.Truncate(size_t(count));
         m_plain.resize(qMin(m_plain.size(), size_t(count)));
