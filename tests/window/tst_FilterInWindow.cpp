@@ -10,6 +10,7 @@
 #include "app/window/log/LogView.h"
 
 #include <QCheckBox>
+#include <QClipboard>
 #include <QComboBox>
 #include <QLabel>
 #include <QLineEdit>
@@ -98,6 +99,8 @@ private slots:
     void severityOfTheMenu();
     void severityCounts();
     void selectionOfTheCurrentLine();
+    void keysOfTheSecondRow();
+    void cellWithATab();
     void history();
     void historyIsShared();
 };
@@ -352,6 +355,41 @@ void tst_FilterInWindow::selectionOfTheCurrentLine()
     QTest::keyClick(QApplication::activePopupWidget(), Qt::Key_H);
     QTRY_COMPARE_WITH_TIMEOUT(Messages(*window),
                               QStringList({"red \"cherry\" pie", "green pear", "plum"}), Patience);
+}
+
+void tst_FilterInWindow::keysOfTheSecondRow()
+{
+    const WindowTest test(Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    const auto type = [&](Qt::Key key, char const* text) {
+        QTest::keyClick(window.get(), key, Qt::ControlModifier | Qt::ShiftModifier);
+        QTest::keyClicks(QApplication::focusWidget(), text);
+        QTest::keyClick(QApplication::focusWidget(), Qt::Key_Return);
+    };
+    type(Qt::Key_L, "apple");
+    QCOMPARE(Field(*window, "Terms that lines also contain")->text(), QString("apple"));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    type(Qt::Key_L, "e"); // over the selected text
+    QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) > 2, Patience);
+    type(Qt::Key_K, "apple");
+    QCOMPARE(Field(*window, "Terms of lines to hide")->text(), QString("apple"));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
+}
+
+// The row shows blanks for the tab and nothing for the colors.
+void tst_FilterInWindow::cellWithATab()
+{
+    const WindowTest test(entry("09:00:00.000", "Trace", "one\ttwo \x1b[31mred\x1b[0m") + Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 6, Patience);
+    QCOMPARE(Messages(*window).first(), QString("one     two red"));
+    View(*window)->GoToRow(0);
+    QTest::keyClick(View(*window), Qt::Key_C, Qt::ControlModifier);
+    QVERIFY(QGuiApplication::clipboard()->text().endsWith("one\ttwo \x1b[31mred\x1b[0m\n"));
+    Choose(*window, 0, 3, Qt::Key_F);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+    QCOMPARE(Messages(*window), QStringList({"one     two red"}));
 }
 
 void tst_FilterInWindow::history()
