@@ -304,6 +304,8 @@ LogModel::Line LogModel::readLine(int row) const
         line.entry.message = m_parser.Text(line.start);
     else
         line.entry = m_parser.Parse(bytes);
+    if (!line.entry.program.isEmpty())
+        line.entry.message = line.entry.program + QLatin1String(": ") + line.entry.message;
     isCut = isCut || line.entry.message.size() > ShownLimit;
     line.entry.message = ShownText(line.entry.message.left(ShownLimit));
     if (!line.isGone && isCut)
