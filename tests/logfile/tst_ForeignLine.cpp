@@ -213,7 +213,7 @@ void tst_ForeignLine::formats_data()
     row("JSON of a database, debug level",
         R"({"t" : { "$date" : "2026-11-22 14:03:02" } ,"s":"D2","msg":"x"})", "2026-11-22 14:03:02",
         trace, "x");
-    row("an object that is no date", R"({"t":{"$dates":"2026-11-22 14:03:02"},"s":"I","msg":"x"})",
+    row("an object that is no date", R"({"t":{"$data":"2026-11-22 14:03:02"},"s":"I","msg":"x"})",
         "", note, "x");
     row("JSON, several times and messages",
         R"({"date":"2026-11-20","timestamp":"2026-11-22 14:03:02","t":"09:00:00","event":"a",)"
