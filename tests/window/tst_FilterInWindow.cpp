@@ -101,6 +101,8 @@ private slots:
     void selectionOfTheCurrentLine();
     void keysOfTheSecondRow();
     void cellWithATab();
+    void matchThatBeginsBeforeTheMessage_data();
+    void matchThatBeginsBeforeTheMessage();
     void history();
     void historyIsShared();
 };
@@ -390,6 +392,41 @@ void tst_FilterInWindow::cellWithATab()
     Choose(*window, 0, 3, Qt::Key_F);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
     QCOMPARE(Messages(*window), QStringList({"one     two red"}));
+}
+
+void tst_FilterInWindow::matchThatBeginsBeforeTheMessage_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<bool>("isExpression");
+    QTest::addColumn<bool>("isPainted");
+
+    QTest::newRow("the message") << "plum" << false << true;
+    QTest::newRow("with the blank in front of it") << " plum" << false << true;
+    QTest::newRow("with the severity") << "Trace plum" << false << true;
+    QTest::newRow("only in another cell") << "Trace" << false << false;
+    QTest::newRow("the start of the line, not of the message") << "^2025|^plum" << true << false;
+}
+
+void tst_FilterInWindow::matchThatBeginsBeforeTheMessage()
+{
+    QFETCH(QString, text);
+    QFETCH(bool, isExpression);
+    const WindowTest test(entry("09:00:00.000", "Trace", "plum"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+    if (isExpression)
+        ClickBox(Child<QCheckBox>(window.get(), "Regular expression"));
+    Type(*window, qPrintable(text));
+    QTest::keyClick(Field(*window), Qt::Key_Return);
+    QTRY_VERIFY_WITH_TIMEOUT(
+        View(*window)->model()->rowCount() == 1 && !Panel(*window)->model()->isReading(), Patience);
+    const QRect cell = View(*window)->visualRect(View(*window)->model()->index(0, 3));
+    const QImage image = View(*window)->viewport()->grab(cell).toImage();
+    bool isPainted = false;
+    for (int x = 0; x < image.width(); ++x)
+        isPainted =
+            isPainted || image.pixelColor(x, image.height() / 2) == QColor(0xff, 0xe0, 0x66);
+    QTEST(isPainted, "isPainted");
 }
 
 void tst_FilterInWindow::history()
