@@ -21,7 +21,7 @@ namespace {
 constexpr int SearchLimit = 512;
 constexpr int MaximumWords = 6;
 
-enum class Part { Time, Severity, Message };
+enum class Part { Time, Severity, Message, Program };
 
 struct FieldName
 {
@@ -52,6 +52,7 @@ constexpr FieldName FieldNames[] = {
     {"severity_text", Part::Severity},
     {"@l", Part::Severity},
     {"priority", Part::Severity},
+    {"s", Part::Severity},
     {"MESSAGE", Part::Message},
     {"message", Part::Message},
     {"msg", Part::Message},
@@ -61,7 +62,12 @@ constexpr FieldName FieldNames[] = {
     {"text", Part::Message},
     {"log", Part::Message},
     {"event", Part::Message},
+    {"SYSLOG_IDENTIFIER", Part::Program},
+    {"_COMM", Part::Program},
 };
+
+// Around what a program in a container has written.
+constexpr char const ContainerField[] = "log";
 
 // In front of a stamp, in logs of the package manager. They tell what happened, so they stay.
 constexpr char const* Prefixes[] = {
@@ -508,6 +514,12 @@ ForeignLine ReadWords(char const* line, int length, QDate const& latest)
     return result;
 }
 
+// "D1" to "D5".
+bool IsDebugLevel(char const* text, int length)
+{
+    return length == 2 && text[0] == 'D' && IsAsciiDigit(text[1]);
+}
+
 // Splits entries whose parts have names.
 class Named
 {
@@ -538,8 +550,14 @@ public:
                 if (rank < m_messageRank && field.valueLength > 0)
                     takeMessage(field, rank);
                 break;
+            case Part::Program:
+                if (rank < m_programRank)
+                    m_line.program = {field.value, field.valueLength};
+                m_programRank = std::min(rank, m_programRank);
+                break;
             }
         }
+        readContained();
         m_line.isSure = m_hasTime || m_line.severity != LogEntry::None || m_messageRank < Last;
         m_line.isEntry = m_line.isSure;
         return m_line;
@@ -570,7 +588,7 @@ private:
         LogEntry::Severity severity = LogEntry::None;
         if (field.valueLength <= 3 && IsDigits(text, field.valueLength))
             severity = LevelNames::OfNumber(QByteArray(text, field.valueLength).toInt());
-        else if (field.valueLength == 1)
+        else if (field.valueLength == 1 || IsDebugLevel(text, field.valueLength))
             severity = LevelNames::OfLetter(*text);
         else
             severity = LevelNames::Named(text, field.valueLength);
@@ -578,6 +596,16 @@ private:
             return false;
         m_line.severity = severity;
         return true;
+    }
+
+    // What a container has written has no severity but that of the line itself.
+    void readContained()
+    {
+        const bool isContained = m_messageRank < Last &&
+                                 std::strcmp(FieldNames[m_messageRank].name, ContainerField) == 0;
+        if (isContained && m_line.severity == LogEntry::None)
+            m_line.severity =
+                ReadWords(m_text + m_line.message.start, m_line.message.length, m_latest).severity;
     }
 
     void takeMessage(LogField const& field, int rank)
@@ -594,6 +622,7 @@ private:
     int m_timeRank = Last;
     int m_severityRank = Last;
     int m_messageRank = Last;
+    int m_programRank = Last;
 };
 
 // Whether the line starts with the name of a known field and an equals sign.

@@ -33,6 +33,7 @@ struct ForeignLine
     int resolution = 1000;
     LogEntry::Severity severity = LogEntry::None;
     Span message;           ///< what the other parts leave; the whole line if it is not an entry
+    Span program;           ///< who wrote it, in entries of the journal; may be empty
     bool isEscaped = false; ///< the message has the escapes of JSON
 
     /// Splits a line, in any encoding that has ASCII in single bytes.

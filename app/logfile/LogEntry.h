@@ -20,6 +20,7 @@ struct LogEntry
     Severity severity = None;
     QString elapsed;      ///< milliseconds since the previous entry; empty if not logged
     QString message;      ///< the rest of the line, or the whole line if it is not an entry
+    QString program;      ///< who wrote it, in entries of the journal; may be empty
     bool isEntry = false; ///< false if it continues the entry above or is torn
 };
 

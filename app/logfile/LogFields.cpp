@@ -120,6 +120,32 @@ void JsonFields::skipNested()
     }
 }
 
+// Reads `{"$date":"..."}`; at anything else, nothing.
+bool JsonFields::readDate(LogField& field)
+{
+    constexpr char const Wrapper[] = "$date";
+    const int before = m_at++;
+    int name = 0;
+    int nameLength = 0;
+    bool isEscaped = false;
+    skipBlanks();
+    const bool isDate = readString(name, nameLength, isEscaped) &&
+                        nameLength + 1 == static_cast<int>(sizeof Wrapper) &&
+                        std::memcmp(m_text + name, Wrapper, sizeof Wrapper - 1) == 0;
+    skipBlanks();
+    if (isDate && m_at < m_length && m_text[m_at] == ':') {
+        ++m_at;
+        skipBlanks();
+        if (readString(field.value, field.valueLength, field.isEscaped)) {
+            m_at = before;
+            skipNested();
+            return true;
+        }
+    }
+    m_at = before;
+    return false;
+}
+
 bool JsonFields::Next(LogField& field)
 {
     for (;;) {
@@ -141,6 +167,8 @@ bool JsonFields::Next(LogField& field)
             return false;
         if (m_text[m_at] == '"')
             return readString(field.value, field.valueLength, field.isEscaped);
+        if (m_text[m_at] == '{' && readDate(field))
+            return true;
         if (m_text[m_at] == '{' || m_text[m_at] == '[') {
             skipNested();
             continue;

@@ -20,7 +20,8 @@ struct LogField
     static QString Unescaped(QString const& text);
 };
 
-/// The members of a JSON object at the start of a line, without those of nested objects.
+/// The members of a JSON object at the start of a line, without those of nested objects. A date
+/// that a database wraps in an object, `{"$date":"2026-11-22T14:03:02Z"}`, counts as a string.
 ///
 /// Needs no complete object: a line may be cut. Pure; the text has to outlive it.
 ///
@@ -38,6 +39,7 @@ private:
     void skipBlanks();
     bool readString(int& start, int& length, bool& isEscaped);
     void skipNested();
+    bool readDate(LogField& field);
 
     char const* m_text;
     int m_length;

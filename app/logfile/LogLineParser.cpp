@@ -26,9 +26,11 @@ QStringList WithDefault(QStringList texts, QString const& byDefault)
     return texts;
 }
 
-bool HoldsDigit(char const* text, int length)
+// In a format that is not known. Not "make: *** [Makefile:12: all] Error 1".
+bool MayBeStamp(char const* text, int length)
 {
-    return std::any_of(text, text + length, IsAsciiDigit);
+    char const* const end = text + length;
+    return std::any_of(text, end, IsAsciiDigit) && std::find(text, end, '*') == end;
 }
 
 // The length of a number such as "[-12] ", up to its "]"; 0 if there is none.
@@ -143,7 +145,7 @@ bool LogLineParser::findByName(char const* line, int length, Parts& parts) const
         Name const* name = nameAt(line + blank + 1, length - blank - 1);
         if (!name)
             continue;
-        if (blank > 0 && !HoldsDigit(line, blank))
+        if (blank > 0 && !MayBeStamp(line, blank))
             return false;
         parts.isEntry = true;
         parts.timeLength = blank;
@@ -251,6 +253,7 @@ bool LogLineParser::parseForeign(char const* line, int length, LogEntry& entry) 
     entry.message = encoding.Decode(line + foreign.message.start, foreign.message.length);
     if (foreign.isEscaped)
         entry.message = LogField::Unescaped(entry.message);
+    entry.program = encoding.Decode(line + foreign.program.start, foreign.program.length);
     return true;
 }
 

@@ -16,6 +16,8 @@ namespace Velocor {
 
 namespace {
 
+constexpr int RowsPerReport = 100 * 1000; // much less than a second
+
 // Where a line of the file starts; -1 if it has fewer lines.
 qint64 StartOfLine(LogLocateRequest const& request, std::function<bool()> const& isCancelled)
 {
@@ -49,9 +51,10 @@ qint64 StartOfLine(LogLocateRequest const& request, std::function<bool()> const&
 class Times
 {
 public:
-    Times(LogLocateRequest const& request, std::function<bool()> isCancelled)
-        : m_request(request), m_isCancelled(std::move(isCancelled)), m_starts(*request.rows),
-          m_count(static_cast<int>(request.rows->size()))
+    Times(LogLocateRequest const& request, std::function<bool()> isCancelled,
+          std::function<void(int)> report)
+        : m_request(request), m_isCancelled(std::move(isCancelled)), m_report(std::move(report)),
+          m_starts(*request.rows), m_count(static_cast<int>(request.rows->size()))
     {
         m_isOpen = m_reader.Open(request.path, request.parser.fileType());
     }
@@ -122,6 +125,8 @@ private:
     {
         int last = from;
         for (int row = from + 1; row < m_count && !m_isCancelled(); ++row) {
+            if (row % RowsPerReport == RowsPerReport - 1)
+                m_report(static_cast<int>(qint64(row) * 100 / m_count));
             const qint64 key = parts(row).timeKey;
             if (key >= target)
                 return answer(LogLocation::Found, row);
@@ -146,6 +151,7 @@ private:
 
     LogLocateRequest const& m_request;
     std::function<bool()> m_isCancelled;
+    std::function<void(int)> m_report;
     LogLineReader m_reader;
     LogRows::Reader m_starts;
     bool m_isOpen = false;
@@ -179,9 +185,12 @@ void LogLocator::Locate(LogLocateRequest const& request)
     const auto isCancelled = [this, &request] {
         return m_currentRequest > request.number;
     };
+    const auto report = [this, &request](int percent) {
+        Q_EMIT progressed(request.number, percent);
+    };
     LogLocation location = request.place.kind == LogPlace::Line
                                ? LineIn(request, isCancelled)
-                               : Times(request, isCancelled).find();
+                               : Times(request, isCancelled, report).find();
     if (isCancelled())
         return;
     location.number = request.number;

@@ -71,6 +71,9 @@ public Q_SLOTS:
 Q_SIGNALS:
     void located(Velocor::LogLocation const& location);
 
+    /// How many percent of the rows have been looked at for a time. Not emitted for short logs.
+    void progressed(int request, int percent);
+
 private:
     std::atomic<int> m_currentRequest{0};
 };

@@ -117,8 +117,8 @@ void FileOpener::OpenAll(QStringList const& files)
     QStringList problems;
     const QStringList opened = files.mid(0, MaximumFiles);
     for (QString const& file : opened) {
-        const bool isInput = file == QLatin1String("-");
-        const QString problem = isInput ? openStandardInput() : open(file);
+        const int input = file == QLatin1String("-") ? 0 : StandardInput::PipeOf(file);
+        const QString problem = input >= 0 ? openInput(input) : open(file);
         if (!problem.isEmpty())
             problems.append(Shortened(problem, MaximumProblemLength));
     }
@@ -129,9 +129,9 @@ void FileOpener::OpenAll(QStringList const& files)
         Q_EMIT problemReported(problems.join(QLatin1Char('\n')));
 }
 
-QString FileOpener::openStandardInput()
+QString FileOpener::openInput(int descriptor)
 {
-    auto* input = new StandardInput;
+    auto* input = new StandardInput(descriptor);
     if (input->path().isEmpty()) {
         delete input;
         return tr("Standard input cannot be shown, because no file can be created in %1")

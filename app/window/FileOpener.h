@@ -71,7 +71,7 @@ Q_SIGNALS:
 private:
     QStringList openFiles() const;
     QString open(QString const& path);
-    QString openStandardInput();
+    QString openInput(int descriptor);
     void offerToForget(QString const& path);
 
     FileTabs* m_tabs;

@@ -99,6 +99,12 @@ void MainMenus::fillEditMenu(QMenu* menu)
     m_actions.filter = addForLog(menu, tr("F&ilter"), QKeySequence(tr("Ctrl+L")),
                                  tr("Show only lines that contain the filter text"),
                                  [](LogPanel* log) { log->FocusFilter(); });
+    addForLog(menu, tr("Als&o Filter"), QKeySequence(tr("Ctrl+Shift+L")),
+              tr("Show only lines that contain further terms, too"),
+              [](LogPanel* log) { log->FocusRequired(); });
+    addForLog(menu, tr("&Hide Lines"), QKeySequence(tr("Ctrl+Shift+K")),
+              tr("Hide lines that contain certain terms"),
+              [](LogPanel* log) { log->FocusHidden(); });
     addForLog(menu, tr("Clear Fi&lter"), QKeySequence(tr("Ctrl+Shift+F")),
               tr("Show all lines again"), [](LogPanel* log) { log->ClearFilter(); });
     menu->addSeparator();
@@ -212,6 +218,8 @@ void MainMenus::addMarks(QMenu* menu)
               [](LogPanel* log) { log->GoToMark(1); });
     addForLog(menu, tr("Previo&us Mark"), QKeySequence(tr("Shift+F2")),
               tr("Go to the previous marked line"), [](LogPanel* log) { log->GoToMark(-1); });
+    addForLog(menu, tr("A&ll Marks..."), QKeySequence(tr("Ctrl+F2")),
+              tr("List the marked lines and their notes"), [](LogPanel* log) { log->ShowMarks(); });
 }
 
 void MainMenus::fillEncodingMenu(QMenu* menu)

@@ -4,11 +4,13 @@
 #include "app/window/StandardInput.h"
 
 #include <QDir>
+#include <QRegularExpression>
 #include <QSocketNotifier>
 
 #include <array>
 #include <cerrno>
 #include <fcntl.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 namespace Velocor {
@@ -18,31 +20,45 @@ namespace {
 constexpr size_t ReadSize = 1 << 16; // bytes; what a pipe usually holds
 
 // Closing the descriptor would give its number to the next file that is opened.
-void EndInput()
+void EndInput(int descriptor)
 {
     const int nothing = open("/dev/null", O_RDONLY | O_CLOEXEC);
     if (nothing < 0)
         return;
-    dup2(nothing, STDIN_FILENO);
+    dup2(nothing, descriptor);
     close(nothing);
 }
 
 } // namespace
 
-StandardInput::StandardInput(QObject* parent)
-    : QObject(parent), m_folder(QDir::tempPath() + QLatin1String("/velocor-XXXXXX"))
+StandardInput::StandardInput(int descriptor, QObject* parent)
+    : QObject(parent), m_descriptor(descriptor),
+      m_folder(QDir::tempPath() + QLatin1String("/velocor-XXXXXX"))
 {
-    m_file.setFileName(m_folder.filePath(tr("Standard input")));
+    m_file.setFileName(m_folder.filePath(
+        descriptor == STDIN_FILENO ? tr("Standard input") : tr("Pipe %1").arg(descriptor)));
     if (!m_folder.isValid() || !m_file.open(QIODevice::WriteOnly | QIODevice::Unbuffered))
         return;
-    m_notifier = new QSocketNotifier(STDIN_FILENO, QSocketNotifier::Read, this);
+    m_notifier = new QSocketNotifier(m_descriptor, QSocketNotifier::Read, this);
     connect(m_notifier, &QSocketNotifier::activated, this, [this] { readSome(); });
 }
 
 StandardInput::~StandardInput()
 {
     delete m_notifier;
-    EndInput();
+    EndInput(m_descriptor);
+}
+
+// Not one that is opened by its name: nobody may write to it, and opening it would block.
+int StandardInput::PipeOf(QString const& path)
+{
+    static const QRegularExpression name(QStringLiteral("^/(dev|proc/self)/fd/([0-9]{1,4})$"));
+    const QRegularExpressionMatch match = name.match(path);
+    const int descriptor = match.hasMatch() ? match.captured(2).toInt() : -1;
+    struct stat status = {};
+    const bool isPipe =
+        descriptor >= 0 && fstat(descriptor, &status) == 0 && S_ISFIFO(status.st_mode);
+    return isPipe ? descriptor : -1;
 }
 
 QString StandardInput::path() const
@@ -54,7 +70,7 @@ QString StandardInput::path() const
 void StandardInput::readSome()
 {
     std::array<char, ReadSize> slice{};
-    const ssize_t size = read(STDIN_FILENO, slice.data(), slice.size());
+    const ssize_t size = read(m_descriptor, slice.data(), slice.size());
     if (size < 0 && (errno == EINTR || errno == EAGAIN))
         return;
     if (size < 0)
@@ -69,7 +85,7 @@ void StandardInput::readSome()
 void StandardInput::stop(QString const& reason)
 {
     m_notifier->setEnabled(false);
-    EndInput();
+    EndInput(m_descriptor);
     if (!reason.isEmpty())
         Q_EMIT failed(reason);
 }

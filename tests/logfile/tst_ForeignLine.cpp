@@ -199,6 +199,22 @@ void tst_ForeignLine::formats_data()
     row("JSON of the journal", R"({"PRIORITY":"3","MESSAGE":"x","_PID":"71"})", "", error, "x");
     row("JSON of containers", R"({"log":"x\n","stream":"stderr","time":"2026-11-22T14:03:02.1Z"})",
         "2026-11-22T14:03:02.1Z", none, "x\n");
+    row("JSON of containers, severity of what they wrote",
+        R"({"log":"2026-11-22 14:03:02 ERROR full\n","stream":"stdout","time":"09:00:00"})",
+        "09:00:00", error, "2026-11-22 14:03:02 ERROR full\n");
+    row("JSON of containers, with a severity",
+        R"({"log":"ERROR full\n","level":"info","time":"09:00:00"})", "09:00:00", note,
+        "ERROR full\n");
+    row("only what containers wrote is searched", R"({"time":"09:00:00","msg":"ERROR full"})",
+        "09:00:00", none, "ERROR full");
+    row("JSON of a database",
+        R"({"t":{"$date":"2026-11-22T14:03:02.123+00:00"},"s":"E","c":"NETWORK","msg":"full"})",
+        "2026-11-22T14:03:02.123+00:00", error, "full");
+    row("JSON of a database, debug level",
+        R"({"t" : { "$date" : "2026-11-22 14:03:02" } ,"s":"D2","msg":"x"})", "2026-11-22 14:03:02",
+        trace, "x");
+    row("an object that is no date", R"({"t":{"$data":"2026-11-22 14:03:02"},"s":"I","msg":"x"})",
+        "", note, "x");
     row("JSON, several times and messages",
         R"({"date":"2026-11-20","timestamp":"2026-11-22 14:03:02","t":"09:00:00","event":"a",)"
         R"("message":"b","text":"c","severity":"info","priority":"3"})",

@@ -68,6 +68,7 @@ void tst_LogLineParser::parse_data()
     noEntry("severity name as part of a word", stamp + " Traces x");
     noEntry("severity name far to the right", QByteArray(200, '1') + " Error x");
     noEntry("stamp alone", stamp);
+    noEntry("what make writes", "make: *** [Makefile:12: all] Error 1");
 
     QTest::newRow("any stamp with a digit counts")
         << QByteArray("Mon 3rd Warning x") << true << "Mon 3rd" << LogEntry::Warning << ""

@@ -42,6 +42,7 @@ private slots:
     void hiddenLine();
     void severalSlices();
     void obsoleteRequest();
+    void tellsHowFarItIs();
 
 private:
     LogLocation locate(QByteArray const& log, char const* place, int current,
@@ -50,6 +51,7 @@ private:
 
     QTemporaryDir m_folder;
     int m_current = 0;
+    QList<int> m_percents;
 };
 
 LogLocation tst_LogLocator::locate(QByteArray const& log, char const* place, int current,
@@ -71,6 +73,11 @@ LogLocation tst_LogLocator::locate(QByteArray const& log, char const* place, int
     LogLocation found;
     LogLocator locator;
     locator.SetCurrentRequest(m_current);
+    m_percents.clear();
+    connect(&locator, &LogLocator::progressed, this, [&](int number, int percent) {
+        QCOMPARE(number, 1);
+        m_percents.append(percent);
+    });
     connect(&locator, &LogLocator::located, this,
             [&](LogLocation const& location) { found = location; });
     locator.Locate(request);
@@ -184,6 +191,16 @@ void tst_LogLocator::obsoleteRequest()
     QCOMPARE(locate(TwoDays(), "4", -1).row, -1);
     m_current = 1;
     QCOMPARE(locate(TwoDays(), "4", -1).row, 3);
+}
+
+void tst_LogLocator::tellsHowFarItIs()
+{
+    QByteArray log = QByteArray("2025-03-03 09:00:00.000 Trace x\n").repeated(250 * 1000);
+    log += "2025-03-03 10:00:00.000 Trace x\n";
+    QCOMPARE(locate(log, "10:00", -1).row, 250 * 1000);
+    QCOMPARE(m_percents, QList<int>({39, 79}));
+    QCOMPARE(locate(log, "9:00", -1).row, 0);
+    QVERIFY(m_percents.isEmpty());
 }
 
 QTEST_GUILESS_MAIN(tst_LogLocator)

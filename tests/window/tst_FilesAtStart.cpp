@@ -98,6 +98,7 @@ private slots:
     void closingTheTabEndsStandardInput();
     void endOfStandardInputKeepsTheTab();
     void neverWaitsForStandardInput();
+    void readsAPipeOfTheShell();
 
     void reopensFiles();
     void reopensOnlyWhatIsThere();
@@ -220,6 +221,26 @@ void tst_FilesAtStart::neverWaitsForStandardInput()
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
     QTest::keyClick(window.get(), Qt::Key_P, Qt::ControlModifier | Qt::ShiftModifier);
     QVERIFY(Panel(*window)->isPaused());
+}
+
+// As that of "velocor <(command)".
+void tst_FilesAtStart::readsAPipeOfTheShell()
+{
+    const WindowTest test;
+    int ends[2] = {-1, -1};
+    QCOMPARE(pipe(ends), 0);
+    const QByteArray text = run(5, QTime(9, 0), "y");
+    QCOMPARE(write(ends[1], text.constData(), size_t(text.size())), ssize_t(text.size()));
+    const auto window = WindowTest::show({QString("/dev/fd/%1").arg(ends[0])});
+    QTRY_COMPARE_WITH_TIMEOUT(TabTexts(*window),
+                              QStringList({"Log", QString("Pipe %1").arg(ends[0])}), Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    QVERIFY(!window->findChild<NoticeBar*>()->isVisible());
+    fcntl(ends[1], F_SETFL, O_NONBLOCK);
+    QTest::keyClick(window.get(), Qt::Key_W, Qt::ControlModifier);
+    QTRY_VERIFY_WITH_TIMEOUT(write(ends[1], "x", 1) < 0 && errno == EPIPE, Patience);
+    close(ends[0]);
+    close(ends[1]);
 }
 
 // Logs and settings files, in their order, at the tab that was current.

@@ -10,6 +10,7 @@
 #include "app/window/log/LogView.h"
 
 #include <QCheckBox>
+#include <QClipboard>
 #include <QComboBox>
 #include <QLabel>
 #include <QLineEdit>
@@ -98,6 +99,10 @@ private slots:
     void severityOfTheMenu();
     void severityCounts();
     void selectionOfTheCurrentLine();
+    void keysOfTheSecondRow();
+    void cellWithATab();
+    void matchThatBeginsBeforeTheMessage_data();
+    void matchThatBeginsBeforeTheMessage();
     void history();
     void historyIsShared();
 };
@@ -352,6 +357,76 @@ void tst_FilterInWindow::selectionOfTheCurrentLine()
     QTest::keyClick(QApplication::activePopupWidget(), Qt::Key_H);
     QTRY_COMPARE_WITH_TIMEOUT(Messages(*window),
                               QStringList({"red \"cherry\" pie", "green pear", "plum"}), Patience);
+}
+
+void tst_FilterInWindow::keysOfTheSecondRow()
+{
+    const WindowTest test(Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    const auto type = [&](Qt::Key key, char const* text) {
+        QTest::keyClick(window.get(), key, Qt::ControlModifier | Qt::ShiftModifier);
+        QTest::keyClicks(QApplication::focusWidget(), text);
+        QTest::keyClick(QApplication::focusWidget(), Qt::Key_Return);
+    };
+    type(Qt::Key_L, "apple");
+    QCOMPARE(Field(*window, "Terms that lines also contain")->text(), QString("apple"));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    type(Qt::Key_L, "e"); // over the selected text
+    QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) > 2, Patience);
+    type(Qt::Key_K, "apple");
+    QCOMPARE(Field(*window, "Terms of lines to hide")->text(), QString("apple"));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 3, Patience);
+}
+
+// The row shows blanks for the tab and nothing for the colors.
+void tst_FilterInWindow::cellWithATab()
+{
+    const WindowTest test(entry("09:00:00.000", "Trace", "one\ttwo \x1b[31mred\x1b[0m") + Fruit());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 6, Patience);
+    QCOMPARE(Messages(*window).first(), QString("one     two red"));
+    View(*window)->GoToRow(0);
+    QTest::keyClick(View(*window), Qt::Key_C, Qt::ControlModifier);
+    QVERIFY(QGuiApplication::clipboard()->text().endsWith("one\ttwo \x1b[31mred\x1b[0m\n"));
+    Choose(*window, 0, 3, Qt::Key_F);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+    QCOMPARE(Messages(*window), QStringList({"one     two red"}));
+}
+
+void tst_FilterInWindow::matchThatBeginsBeforeTheMessage_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<bool>("isExpression");
+    QTest::addColumn<bool>("isPainted");
+
+    QTest::newRow("the message") << "plum" << false << true;
+    QTest::newRow("with the blank in front of it") << " plum" << false << true;
+    QTest::newRow("with the severity") << "Trace plum" << false << true;
+    QTest::newRow("only in another cell") << "Trace" << false << false;
+    QTest::newRow("the start of the line, not of the message") << "^2025|^plum" << true << false;
+}
+
+void tst_FilterInWindow::matchThatBeginsBeforeTheMessage()
+{
+    QFETCH(QString, text);
+    QFETCH(bool, isExpression);
+    const WindowTest test(entry("09:00:00.000", "Trace", "plum"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+    if (isExpression)
+        ClickBox(Child<QCheckBox>(window.get(), "Regular expression"));
+    Type(*window, qPrintable(text));
+    QTest::keyClick(Field(*window), Qt::Key_Return);
+    QTRY_VERIFY_WITH_TIMEOUT(
+        View(*window)->model()->rowCount() == 1 && !Panel(*window)->model()->isReading(), Patience);
+    const QRect cell = View(*window)->visualRect(View(*window)->model()->index(0, 3));
+    const QImage image = View(*window)->viewport()->grab(cell).toImage();
+    bool isPainted = false;
+    for (int x = 0; x < image.width(); ++x)
+        isPainted =
+            isPainted || image.pixelColor(x, image.height() / 2) == QColor(0xff, 0xe0, 0x66);
+    QTEST(isPainted, "isPainted");
 }
 
 void tst_FilterInWindow::history()

@@ -122,6 +122,7 @@ private slots:
     void orderDecides();
     void switchedOffAndRemoved();
     void expressions();
+    void keyOfADisabledButton();
     void severityStays();
     void besideHits();
     void highlightThis();
@@ -252,6 +253,23 @@ void tst_HighlightInWindow::expressions()
         QVERIFY2(error->text().startsWith("Invalid regular expression: "),
                  qPrintable(error->text()));
         QTest::keyClick(dialog, Qt::Key_Escape);
+    });
+}
+
+// The only rule can be moved neither up nor down.
+void tst_HighlightInWindow::keyOfADisabledButton()
+{
+    const WindowTest test(run(2, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    EditRules(*window, [](HighlightDialog* dialog) {
+        AddRule(dialog, "full");
+        auto* field = Child<QLineEdit>(dialog, "Text to highlight");
+        QTest::keyClick(field, Qt::Key_D, Qt::AltModifier);
+        QTest::keyClick(field, Qt::Key_U, Qt::AltModifier);
+        QCOMPARE(field->text(), QString("full"));
+        QTest::keyClick(field, Qt::Key_D);
+        QCOMPARE(field->text(), QString("fulld"));
+        dialog->reject();
     });
 }
 

@@ -309,7 +309,8 @@ void tst_LogInWindow::journalExport()
     const QString path = test.folder() + "journal.export";
     const QByteArray first("__CURSOR=s=1\n__REALTIME_TIMESTAMP=1795442582000000\nPRIORITY=3\n"
                            "MESSAGE=disk full\n_PID=7");
-    QVERIFY(TestFiles::write(path, first + "\n\n__CURSOR=s=2\nMESSAGE=more\nPRIORITY=6\n\n"));
+    QVERIFY(TestFiles::write(path, first + "\n\n__CURSOR=s=2\nMESSAGE=more\nPRIORITY=6\n_COMM=x\n"
+                                           "SYSLOG_IDENTIFIER=sshd\n\n"));
     const auto window = WindowTest::show();
     window->OpenFile(path);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
@@ -321,7 +322,8 @@ void tst_LogInWindow::journalExport()
     QCOMPARE(text(0, LogModel::TimeColumn), time.toString("yyyy-MM-dd hh:mm:ss.zzz"));
     QCOMPARE(text(0, LogModel::SeverityColumn), QString("Error"));
     QCOMPARE(text(0, LogModel::MessageColumn), QString("disk full"));
-    QCOMPARE(text(1, LogModel::MessageColumn), QString("more"));
+    QCOMPARE(text(1, LogModel::MessageColumn), QString("sshd: more"));
+    QCOMPARE(Panel(*window)->model()->MessageText(1), QString("more"));
     QTest::keyClick(window.get(), Qt::Key_F8);
     QCOMPARE(Child<QPlainTextEdit>(Panel(*window), "Full text of the current line")->toPlainText(),
              QString(first));

@@ -16,6 +16,7 @@
 #include <QLineEdit>
 #include <QMenu>
 #include <QPlainTextEdit>
+#include <QTreeWidget>
 
 using namespace Velocor;
 using namespace WindowParts;
@@ -72,6 +73,8 @@ class tst_MarksInWindow : public WindowTestCase
 private slots:
     void marks();
     void nextAndPrevious();
+    void list();
+    void listIsLeft();
     void notes();
     void looks();
     void outliveTheSession();
@@ -124,6 +127,55 @@ void tst_MarksInWindow::nextAndPrevious()
         QCOMPARE(View(*window)->currentIndex().row(), row);
     }
     QCOMPARE(Status(*window), QString("Continued from the bottom"));
+}
+
+void tst_MarksInWindow::list()
+{
+    const WindowTest test(run(100, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+    QTest::keyClick(window.get(), Qt::Key_F2, Qt::ControlModifier);
+    QCOMPARE(Status(*window), QString("No marks in the lines shown"));
+    for (int row : {60, 30, 90})
+        MarkRow(*window, row);
+    View(*window)->GoToRow(60);
+    WriteNote(*window, "it began here");
+    QStringList texts;
+    WindowTest::whenShown<QDialog>([&](QDialog* dialog) {
+        auto* list = Child<QTreeWidget>(dialog, "Marked lines");
+        for (int i = 0; i < list->topLevelItemCount(); ++i) {
+            const QTreeWidgetItem* item = list->topLevelItem(i);
+            texts.append(QStringList({item->text(0), item->text(1), item->text(2), item->text(3)})
+                             .join('|'));
+        }
+        QCOMPARE(list->indexOfTopLevelItem(list->currentItem()), 1); // where the reader is
+        QTest::keyClick(list, Qt::Key_Down);
+        QTest::keyClick(list, Qt::Key_Return);
+    });
+    QTest::keyClick(window.get(), Qt::Key_F2, Qt::ControlModifier);
+    QCOMPARE(texts, QStringList({"31|2025-03-03 09:00:30.000||x 30",
+                                 "61|2025-03-03 09:01:00.000|it began here|x 60",
+                                 "91|2025-03-03 09:01:30.000||x 90"}));
+    QCOMPARE(View(*window)->currentIndex().row(), 90);
+    QVERIFY(View(*window)->viewport()->rect().contains(
+        View(*window)->visualRect(View(*window)->currentIndex()).center()));
+}
+
+void tst_MarksInWindow::listIsLeft()
+{
+    const WindowTest test(run(100, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+    MarkRow(*window, 30);
+    View(*window)->GoToRow(60);
+    bool isShown = false;
+    WindowTest::whenShown<QDialog>([&](QDialog* dialog) {
+        isShown = Child<QTreeWidget>(dialog, "Marked lines");
+        QTest::keyClick(dialog, Qt::Key_Escape);
+    });
+    QTest::keyClick(window.get(), Qt::Key_F2, Qt::ControlModifier);
+    QVERIFY(isShown);
+    QCOMPARE(View(*window)->currentIndex().row(), 60);
 }
 
 void tst_MarksInWindow::notes()

@@ -4,6 +4,7 @@
 #include "app/window/log/HighlightDialog.h"
 
 #include "app/window/log/HighlightColors.h"
+#include "app/window/log/LogModel.h"
 #include "app/window/widgets/PlainText.h"
 #include "app/window/widgets/TextDialog.h"
 
@@ -11,6 +12,7 @@
 #include <QComboBox>
 #include <QDialogButtonBox>
 #include <QFormLayout>
+#include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
@@ -40,6 +42,8 @@ HighlightDialog::HighlightDialog(std::shared_ptr<HighlightRules> const& rules, Q
     auto* layout = new QVBoxLayout(this);
     layout->addLayout(makeList());
     layout->addLayout(makeFields());
+    layout->addWidget(
+        NewPlainLabel(tr("Rules look at the first %1 bytes of a line.").arg(LogModel::ShownLimit)));
     layout->addWidget(m_error);
     layout->addWidget(buttons);
     resize(520, 420);
@@ -80,6 +84,7 @@ QLayout* HighlightDialog::makeFields()
 {
     m_text->setAccessibleName(tr("Text to highlight"));
     m_text->setMaxLength(HighlightRule::MaximumText);
+    m_text->installEventFilter(this);
     m_text->setPlaceholderText(tr("Lines with this text get the color"));
     m_case->setAccessibleName(tr("Match case"));
     m_expression->setAccessibleName(tr("Regular expression"));
@@ -214,6 +219,20 @@ void HighlightDialog::moveBy(int step)
     std::swap(m_rules[position], m_rules[position + step]);
     fillList(position + step);
     m_shared->SetRules(m_rules);
+}
+
+// Alt and the letter of a button that is disabled would type the letter. On macOS, that is how
+// characters are typed.
+bool HighlightDialog::eventFilter(QObject* watched, QEvent* event)
+{
+#ifndef Q_OS_MACOS
+    if (watched == m_text && event->type() == QEvent::KeyPress) {
+        auto const* key = static_cast<QKeyEvent*>(event);
+        if (key->modifiers() == Qt::AltModifier && !key->text().isEmpty())
+            return true;
+    }
+#endif
+    return QDialog::eventFilter(watched, event);
 }
 
 void HighlightDialog::reject()

@@ -30,6 +30,9 @@ public:
 
     void reject() override;
 
+protected:
+    bool eventFilter(QObject* watched, QEvent* event) override;
+
 private:
     QLayout* makeList();
     QLayout* makeFields();

@@ -98,6 +98,24 @@ qreal HeightOfLines(QTextLayout const& layout)
     return height;
 }
 
+// The matches in a cell. A match may begin before the message that ends the line, with the blank
+// in front of it or in another cell.
+QVector<QPair<int, int>> RangesIn(QString const& text, QString const& line, LogFilter const& filter)
+{
+    const int before = line.size() - text.size();
+    if (before <= 0 || !line.endsWith(text))
+        return filter.Ranges(text);
+    QVector<QPair<int, int>> ranges;
+    const QVector<QPair<int, int>> all = filter.Ranges(line);
+    for (QPair<int, int> const& range : all) {
+        const int start = std::max(0, range.first - before);
+        const int end = range.first + range.second - before;
+        if (end > start)
+            ranges.append(qMakePair(start, end - start));
+    }
+    return ranges;
+}
+
 void AddFormats(QVector<QTextLayout::FormatRange>& formats, QVector<QPair<int, int>> const& ranges,
                 QTextCharFormat const& format)
 {
@@ -182,7 +200,8 @@ void LogDelegate::paintContent(QPainter* painter, QStyleOptionViewItem const& op
     // Not in the severity column, because the filter does not search translated names.
     const bool isMarkable = index.column() != LogModel::SeverityColumn;
     const QVector<QTextLayout::FormatRange> formats =
-        isMarkable ? marks(cell.text) : QVector<QTextLayout::FormatRange>();
+        isMarkable ? marks(cell.text, index.data(LogModel::LineRole).toString())
+                   : QVector<QTextLayout::FormatRange>();
     if (formats.isEmpty() && (m_mostLines == 1 || !isMessage))
         StyleOf(cell)->drawControl(QStyle::CE_ItemViewItem, &cell, painter, cell.widget);
     else
@@ -208,11 +227,11 @@ void LogDelegate::paintUserMark(QPainter* painter, QStyleOptionViewItem const& o
 }
 
 // Later formats are drawn over earlier ones.
-QVector<QTextLayout::FormatRange> LogDelegate::marks(QString const& text) const
+QVector<QTextLayout::FormatRange> LogDelegate::marks(QString const& text, QString const& line) const
 {
     QVector<QTextLayout::FormatRange> formats;
-    AddFormats(formats, m_filter.Ranges(text), MarkFormat());
-    AddFormats(formats, m_found.Ranges(text), FoundFormat());
+    AddFormats(formats, RangesIn(text, line, m_filter), MarkFormat());
+    AddFormats(formats, RangesIn(text, line, m_found), FoundFormat());
     return formats;
 }
 

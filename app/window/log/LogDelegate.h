@@ -48,7 +48,7 @@ private:
     void paintContent(QPainter* painter, QStyleOptionViewItem const& option,
                       QModelIndex const& index) const;
     int ruleColor(QModelIndex const& index) const;
-    QVector<QTextLayout::FormatRange> marks(QString const& text) const;
+    QVector<QTextLayout::FormatRange> marks(QString const& text, QString const& line) const;
     static void paintMarked(QPainter* painter, QStyleOptionViewItem const& option,
                             QVector<QTextLayout::FormatRange> const& formats, int mostLines);
     static void paintEmpty(QPainter* painter, QStyleOptionViewItem const& option);

@@ -261,6 +261,13 @@ void LogFilterBar::FocusText()
     m_text->selectAll();
 }
 
+void LogFilterBar::focusTerms(QLineEdit* field)
+{
+    m_more->setChecked(true);
+    field->setFocus(Qt::ShortcutFocusReason);
+    field->selectAll();
+}
+
 void LogFilterBar::Clear()
 {
     m_text->clear();

@@ -38,6 +38,11 @@ public:
     /// Focuses the text field and selects its text.
     void FocusText();
 
+    /// Opens the second row, focuses the terms that lines also contain or those of lines to hide,
+    /// and selects them.
+    void FocusRequired() { focusTerms(m_required); }
+    void FocusHidden() { focusTerms(m_hidden); }
+
     /// Resets everything that hides lines, except for earlier runs.
     void Clear();
 
@@ -79,6 +84,7 @@ private:
     QWidget* makeSecondRow();
     QComboBox* makeLeastSeverity();
     QComboBox* makeContext();
+    void focusTerms(QLineEdit* field);
     void showMore();
     void keepText();
     void showHistory();

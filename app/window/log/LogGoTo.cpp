@@ -49,6 +49,10 @@ void LogGoTo::startLocator()
     connect(&m_thread, &QThread::finished, m_locator, &QObject::deleteLater);
     connect(this, &LogGoTo::locateRequested, m_locator, &LogLocator::Locate);
     connect(m_locator, &LogLocator::located, this, &LogGoTo::take);
+    connect(m_locator, &LogLocator::progressed, this, [this](int request, int percent) {
+        if (request == m_number)
+            Q_EMIT started(tr("Looking for that time... %1%").arg(percent));
+    });
     m_thread.start();
 }
 

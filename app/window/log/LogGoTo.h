@@ -37,7 +37,7 @@ Q_SIGNALS:
     /// @param message  what the user should know; may be empty
     void arrived(int row, QString const& message);
 
-    /// It may take a while.
+    /// It may take a while; also how far it is.
     void started(QString const& message);
 
     // To the locator's thread.

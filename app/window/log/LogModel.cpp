@@ -6,6 +6,7 @@
 #include "app/logfile/LogIndex.h"
 #include "app/logfile/LogScanner.h"
 #include "app/logfile/LogSeverities.h"
+#include "app/window/log/ShownText.h"
 #include "app/window/widgets/FileSizeText.h"
 #include "app/window/widgets/PlainText.h"
 #include "app/window/widgets/SeverityIcons.h"
@@ -19,16 +20,6 @@
 namespace Velocor {
 
 namespace {
-
-// Control characters would break rows or be invisible.
-QString OnOneLine(QString text)
-{
-    for (QChar& c : text) {
-        if (c.unicode() < 0x20 || c.unicode() == 0x7f)
-            c = QLatin1Char(' ');
-    }
-    return text;
-}
 
 // A longer line is measured no further: rows are read while they are painted.
 constexpr qint64 MeasuredLength = 4 * 1000 * 1000; // bytes
@@ -313,8 +304,10 @@ LogModel::Line LogModel::readLine(int row) const
         line.entry.message = m_parser.Text(line.start);
     else
         line.entry = m_parser.Parse(bytes);
+    if (!line.entry.program.isEmpty())
+        line.entry.message = line.entry.program + QLatin1String(": ") + line.entry.message;
     isCut = isCut || line.entry.message.size() > ShownLimit;
-    line.entry.message = OnOneLine(line.entry.message.left(ShownLimit));
+    line.entry.message = ShownText(line.entry.message.left(ShownLimit));
     if (!line.isGone && isCut)
         line.entry.message += Ellipsis(lengthOf(row));
     return line;

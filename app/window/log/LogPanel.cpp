@@ -259,6 +259,16 @@ void LogPanel::FocusFilter()
     m_filterBar->FocusText();
 }
 
+void LogPanel::FocusRequired()
+{
+    m_filterBar->FocusRequired();
+}
+
+void LogPanel::FocusHidden()
+{
+    m_filterBar->FocusHidden();
+}
+
 void LogPanel::ClearFilter()
 {
     m_filterBar->Clear();

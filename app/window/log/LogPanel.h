@@ -80,6 +80,10 @@ public:
     QList<QWidget*> Panes() const;
 
     void FocusFilter();
+
+    /// Opens the second row of the filter and focuses one of its fields.
+    void FocusRequired();
+    void FocusHidden();
     void ClearFilter();
 
     /// Opens the find bar.
@@ -111,6 +115,9 @@ public:
 
     /// Goes to the next (step 1) or previous (step -1) marked line, or reports that there is none.
     void GoToMark(int step) { m_marks->GoTo(step); }
+
+    /// Lists the marked lines, to go to one of them.
+    void ShowMarks() { m_marks->ShowList(); }
 
     /// Copies the selected entries, as stored in the file.
     void CopySelected() { m_copier->Copy(); }

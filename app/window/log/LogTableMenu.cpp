@@ -21,12 +21,21 @@ LogTableMenu::LogTableMenu(QModelIndex const& cell, LineCopier* copier, LogFilte
     addSeparator();
     addAction(tr("&Filter by This"), this, [this] { filterBy(false); });
     addAction(tr("&Hide This"), this, [this] { filterBy(true); });
-    QAction* highlight = addAction(tr("Hi&ghlight This"), this,
-                                   [this] { Q_EMIT highlightRequested(m_cell.data().toString()); });
+    QAction* highlight =
+        addAction(tr("Hi&ghlight This"), this, [this] { Q_EMIT highlightRequested(text()); });
     highlight->setEnabled(cell.isValid() && cell.column() != LogModel::SeverityColumn);
     addSeparator();
     addAction(marks->isMarked() ? tr("Remove &Mark") : tr("&Mark"), marks, &MarkControl::Toggle);
     addAction(tr("&Note..."), marks, &MarkControl::AskNote);
+}
+
+// As it is in the file, where tabs and color sequences are searched, too.
+QString LogTableMenu::text() const
+{
+    auto const* model = qobject_cast<LogModel const*>(m_cell.model());
+    return model && m_cell.column() == LogModel::MessageColumn
+               ? model->MessageText(m_cell.row()).left(LogModel::ShownLimit)
+               : m_cell.data().toString();
 }
 
 // The names of severities are translated, so their cells stand for the severity itself.
@@ -43,13 +52,13 @@ void LogTableMenu::filterBy(bool isHiding)
             m_filter->FilterBy(severity);
         return;
     }
-    const QString text = m_cell.data().toString();
-    if (text.isEmpty())
+    const QString wanted = text();
+    if (wanted.isEmpty())
         return;
     if (isHiding)
-        m_filter->Hide(text);
+        m_filter->Hide(wanted);
     else
-        m_filter->FilterBy(text);
+        m_filter->FilterBy(wanted);
 }
 
 } // namespace Velocor

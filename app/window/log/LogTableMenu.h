@@ -32,6 +32,7 @@ Q_SIGNALS:
 
 private:
     void filterBy(bool isHiding);
+    QString text() const;
 
     QPersistentModelIndex m_cell;
     LogFilterBar* m_filter;

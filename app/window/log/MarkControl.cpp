@@ -4,7 +4,9 @@
 #include "app/window/log/MarkControl.h"
 
 #include "app/window/log/LogMarks.h"
+#include "app/window/log/LogModel.h"
 #include "app/window/log/LogView.h"
+#include "app/window/log/MarkListDialog.h"
 #include "app/window/log/NoteDialog.h"
 #include "app/window/log/TickScrollBar.h"
 
@@ -13,7 +15,8 @@
 namespace Velocor {
 
 MarkControl::MarkControl(LogModel* model, LogView* view, QWidget* parent)
-    : QObject(parent), m_view(view), m_marks(new LogMarks(model, this)), m_window(parent)
+    : QObject(parent), m_model(model), m_view(view), m_marks(new LogMarks(model, this)),
+      m_window(parent)
 {
     connect(m_marks, &LogMarks::changed, this, &MarkControl::show);
 }
@@ -69,6 +72,21 @@ void MarkControl::GoTo(int step)
     m_view->setFocus();
     if (!isAhead)
         report(step > 0 ? tr("Continued from the top") : tr("Continued from the bottom"));
+}
+
+void MarkControl::ShowList()
+{
+    if (m_marks->rows()->empty()) {
+        report(tr("No marks in the lines shown"));
+        return;
+    }
+    MarkListDialog dialog(*m_marks, *m_view, m_window);
+    if (dialog.exec() != QDialog::Accepted || dialog.start() < 0)
+        return;
+    const int row = m_model->RowNear(dialog.start());
+    if (row >= 0)
+        m_view->GoToRow(row);
+    m_view->setFocus();
 }
 
 bool MarkControl::isMarked() const

@@ -43,6 +43,9 @@ public:
     /// Goes to the next (step 1) or previous (step -1) marked line, or reports that there is none.
     void GoTo(int step);
 
+    /// Lists the marked lines, and goes to the one that the user chooses.
+    void ShowList();
+
     /// Whether the current line is marked.
     bool isMarked() const;
 
@@ -60,6 +63,7 @@ private:
     void report(QString const& message);
     void show();
 
+    LogModel* m_model;
     LogView* m_view;
     LogMarks* m_marks;
     QWidget* m_window;
