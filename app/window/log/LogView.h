@@ -97,6 +97,8 @@ protected:
     QModelIndex moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) override;
     void rowsInserted(QModelIndex const& parent, int first, int last) override;
     void rowsAboutToBeRemoved(QModelIndex const& parent, int first, int last) override;
+    void dataChanged(QModelIndex const& topLeft, QModelIndex const& bottomRight,
+                     QVector<int> const& roles = QVector<int>()) override;
 
 private:
     LogDelegate* cells() const;
@@ -118,6 +120,7 @@ private:
     QString m_fittedPath;
     bool m_following = true;
     bool m_scrollingItself = false;
+    bool m_hasOtherRows = true; // since the last refresh, not only more of them
 
     // The current line and its distance from the top, while the rows are replaced.
     QString m_keptPath;
