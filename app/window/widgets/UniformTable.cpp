@@ -237,8 +237,8 @@ void UniformTable::moveOnceAfter(std::function<void()> const& change)
     movePainted();
 }
 
-// A log that is followed would cost ten times as much if all rows were painted for each new one.
-// tst_PlainPainting compares with that.
+// For the goal for following in docs/performance.md: painting is most of what a new line costs.
+// tst_PlainPainting compares with painting everything.
 void UniformTable::movePainted()
 {
     if (m_isMovingLater || m_isUpdatingGeometries)
