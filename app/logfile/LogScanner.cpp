@@ -33,6 +33,10 @@ QByteArray BytesAt(QFile& file, qint64 offset, qint64 count)
 // A change is read after this time: a few lines are usually written at once.
 constexpr int LookDelay = 10; // milliseconds
 
+// The least time from one look to the next while changes keep coming: what each of them costs, from
+// opening the file to painting, hardly depends on how many lines there are.
+constexpr int LookInterval = 45; // milliseconds
+
 // Whether the system tells of every change of a file: on other file systems, another computer or
 // the system itself may change it.
 bool IsOnLocalDisk(QString const& folder)
@@ -124,8 +128,12 @@ void LogScanner::watch()
 
 void LogScanner::noteChange()
 {
-    if (m_isWatched && !m_lookTimer->isActive())
-        m_lookTimer->start(std::max(LookDelay, m_lookDelay));
+    if (!m_isWatched || m_lookTimer->isActive())
+        return;
+    const int sinceLook = m_sinceLook.isValid()
+                              ? static_cast<int>(qMin<qint64>(m_sinceLook.elapsed(), LookInterval))
+                              : LookInterval;
+    m_lookTimer->start(std::max({LookDelay, LookInterval - sinceLook, m_lookDelay}));
 }
 
 // The more there is to do, the less often it is done.
@@ -143,6 +151,7 @@ void LogScanner::look()
     time.start();
     Poll();
     m_lookDelay = static_cast<int>(std::min<qint64>(10 * time.elapsed(), PollInterval));
+    m_sinceLook.start();
     if (m_isPolling)
         m_lookTimer->start(PollInterval);
 }
@@ -371,7 +380,9 @@ void LogScanner::Poll()
     }
 
     QFile file(m_path);
-    const bool opened = QFileInfo(m_path).isFile() && file.open(QIODevice::ReadOnly);
+    // Without a buffer, which would be filled again for each of the few bytes that are compared.
+    const bool opened =
+        QFileInfo(m_path).isFile() && file.open(QIODevice::ReadOnly | QIODevice::Unbuffered);
     if (!opened && (m_exists || !isComplete())) {
         m_error = ErrorOf(file);
         reportMissing();

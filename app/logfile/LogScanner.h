@@ -132,6 +132,7 @@ private:
     bool m_isLocal = false;
     bool m_isFolderChanged = false;
     int m_lookDelay = 0; // milliseconds
+    QElapsedTimer m_sinceLook;
 
     bool m_exists = false;
     bool m_complete = false;  // the lines of the index

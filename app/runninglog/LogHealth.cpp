@@ -9,6 +9,7 @@
 
 #include <QCoreApplication>
 #include <QFileInfo>
+#include <QFileSystemWatcher>
 #include <QObject>
 #include <QStorageInfo>
 #include <QStringList>
@@ -22,8 +23,37 @@ LogHealth::~LogHealth() = default;
 
 QString LogHealth::Check()
 {
-    const QString problem = writingProblem();
-    return problem.isEmpty() ? sharingProblem() : problem;
+    QString problem = writingProblem();
+    if (problem.isEmpty())
+        problem = sharingProblem();
+    watch();
+    return problem;
+}
+
+// A file that was replaced is no longer watched.
+void LogHealth::watch()
+{
+    const QString logFile = RunningLog::FileName();
+    const QStringList watched{logFile, QFileInfo(logFile).path(), instancesFolder(logFile)};
+    if (!m_watcher) {
+        m_watcher = new QFileSystemWatcher(this);
+        connect(m_watcher, &QFileSystemWatcher::fileChanged, this, &LogHealth::mayHaveChanged);
+        connect(m_watcher, &QFileSystemWatcher::directoryChanged, this, &LogHealth::mayHaveChanged);
+    } else if (m_watched != watched) {
+        m_watcher->removePaths(m_watcher->files() + m_watcher->directories());
+    }
+    m_watched = watched;
+    const QStringList known = m_watcher->files() + m_watcher->directories();
+    for (QString const& path : watched) {
+        if (!known.contains(path) && QFileInfo::exists(path))
+            m_watcher->addPath(path);
+    }
+}
+
+QString LogHealth::instancesFolder(QString const& logFile)
+{
+    return QCoreApplication::instance()->property("DataPath").toString() +
+           QLatin1String("running-") + QFileInfo(logFile).fileName();
 }
 
 QString LogHealth::writingProblem()
@@ -54,9 +84,7 @@ QString LogHealth::sharingProblem()
     const QString logFile = RunningLog::FileName();
     if (!m_instances || m_logFile != logFile) {
         m_logFile = logFile;
-        m_instances = std::make_unique<InstanceList>(
-            QCoreApplication::instance()->property("DataPath").toString() +
-            QLatin1String("running-") + QFileInfo(logFile).fileName());
+        m_instances = std::make_unique<InstanceList>(instancesFolder(logFile));
     }
 
     QStringList numbers;

@@ -43,7 +43,8 @@ namespace Velocor {
 
 namespace {
 
-constexpr int HealthInterval = 2000;       // milliseconds
+constexpr int HealthInterval = 2000;       // milliseconds, while there is a problem or a change
+constexpr int IdleHealthInterval = 60000;  // milliseconds; nothing tells of a disk that fills up
 constexpr int MessageTime = 6000;          // milliseconds
 constexpr int MaximumMessageLength = 1000; // characters
 
@@ -281,6 +282,8 @@ bool MainWindow::event(QEvent* event)
         m_painted = true;
         QTimer::singleShot(0, this, &MainWindow::complete);
     }
+    if (event->type() == QEvent::WindowActivate && m_logHealth)
+        checkLog();
     return result;
 }
 
@@ -289,13 +292,17 @@ void MainWindow::startWork()
     m_tabs->ownLog()->Open(RunningLog::FileName(), true);
     m_logHealth = std::make_unique<LogHealth>();
     connect(&m_healthTimer, &QTimer::timeout, this, &MainWindow::checkLog);
-    m_healthTimer.start(HealthInterval);
+    connect(m_logHealth.get(), &LogHealth::mayHaveChanged, this, [this] {
+        if (m_healthTimer.remainingTime() > HealthInterval)
+            m_healthTimer.start(HealthInterval);
+    });
     checkLog();
 }
 
 void MainWindow::checkLog()
 {
     const QString problem = m_logHealth->Check();
+    m_healthTimer.start(problem.isEmpty() ? IdleHealthInterval : HealthInterval);
     m_health->SetState(problem);
     m_tabs->MarkOwnLog(!problem.isEmpty());
 }

@@ -54,6 +54,8 @@ private slots:
     void healthReadOnly();
     void healthFullDisk();
     void healthWithoutALimit();
+    void healthTellsOfChanges_data();
+    void healthTellsOfChanges();
 };
 
 // Where the window looks for other programs.
@@ -433,6 +435,33 @@ void tst_RunningLog::health()
     QCOMPARE(health.Check(), QString());
     TorkLog::shutdown();
     QCOMPARE(health.Check(), QString("There is no log"));
+}
+
+void tst_RunningLog::healthTellsOfChanges_data()
+{
+    QTest::addColumn<QString>("change");
+    for (char const* change : {"another program", "no log file", "log file", "other permissions"})
+        QTest::newRow(change) << change;
+}
+
+void tst_RunningLog::healthTellsOfChanges()
+{
+    QFETCH(QString, change);
+    const TestRun test;
+    LogHealth health;
+    if (change != "log file")
+        TorkLog::logger()->trace("an entry");
+    QCOMPARE(health.Check(), QString());
+    QSignalSpy told(&health, &LogHealth::mayHaveChanged);
+    if (change == "another program")
+        QVERIFY(TestFiles::write(runningFolder(test) + "/1.lock", "1\n"));
+    else if (change == "no log file")
+        QVERIFY(QFile::remove(test.logFile()));
+    else if (change == "log file")
+        TorkLog::logger()->trace("the first entry");
+    else
+        QVERIFY(QFile::setPermissions(test.logFile(), QFile::ReadOwner));
+    QTRY_VERIFY_WITH_TIMEOUT(told.count() > 0, 20000);
 }
 
 void tst_RunningLog::healthDirectoryInTheWay()

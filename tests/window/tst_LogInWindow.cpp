@@ -1001,6 +1001,8 @@ void tst_LogInWindow::stateOfTheLogCanBeDismissed()
     TorkLog::logger()->setEnable(true);
     QTRY_VERIFY_WITH_TIMEOUT(window->findChild<FileTabs*>()->tabIcon(0).isNull(), Patience);
     TorkLog::logger()->setEnable(false);
+    QEvent activation(QEvent::WindowActivate); // the user comes back
+    QCoreApplication::sendEvent(window.get(), &activation);
     QTRY_VERIFY_WITH_TIMEOUT(state->isVisible(), Patience);
     TorkLog::logger()->setEnable(true);
 }

@@ -28,6 +28,9 @@ namespace {
 // than a frame or two.
 constexpr int MaximumMove = 500 * 1000;
 
+// In a log that is followed for days, they would take more and more memory.
+constexpr int MostMeasuredRows = 1000;
+
 } // namespace
 
 LogView::LogView(LogModel* model, QWidget* parent)
@@ -199,8 +202,10 @@ void LogView::SetFollowing(bool following)
 void LogView::goToEnd()
 {
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
-    updateGeometries(); // updates the scroll bar's range
-    scrollToBottom();
+    moveOnceAfter([this] {
+        updateGeometries(); // updates the scroll bar's range
+        scrollToBottom();
+    });
 }
 
 void LogView::noteScrolled(int value)
@@ -224,11 +229,19 @@ void LogView::SetLineWrap(bool wrapped)
 // Compensates for rows inserted above the visible ones.
 void LogView::rowsInserted(QModelIndex const& parent, int first, int last)
 {
-    const bool above = !m_following && first < rowAt(0);
+    const QScopedValueRollback<bool> guard(m_scrollingItself, true);
+    m_hasOtherRows = m_hasOtherRows || last + 1 < m_model->rowCount();
+    if (m_following) {
+        moveOnceAfter([&] {
+            WrappingTable::rowsInserted(parent, first, last);
+            scrollToBottom();
+        });
+        return;
+    }
+    const bool above = first < rowAt(0);
     WrappingTable::rowsInserted(parent, first, last);
     if (!above)
         return;
-    const QScopedValueRollback<bool> guard(m_scrollingItself, true);
     updateGeometries();
     verticalScrollBar()->setValue(verticalScrollBar()->value() + last - first + 1);
 }
@@ -236,11 +249,19 @@ void LogView::rowsInserted(QModelIndex const& parent, int first, int last)
 void LogView::rowsAboutToBeRemoved(QModelIndex const& parent, int first, int last)
 {
     const int top = rowAt(0);
+    m_hasOtherRows = true;
     WrappingTable::rowsAboutToBeRemoved(parent, first, last);
     if (m_following || first >= top)
         return;
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
     verticalScrollBar()->setValue(verticalScrollBar()->value() - (std::min(last + 1, top) - first));
+}
+
+void LogView::dataChanged(QModelIndex const& topLeft, QModelIndex const& bottomRight,
+                          QVector<int> const& roles)
+{
+    m_hasOtherRows = true;
+    WrappingTable::dataChanged(topLeft, bottomRight, roles);
 }
 
 void LogView::afterRefresh()
@@ -253,13 +274,16 @@ void LogView::afterRefresh()
     setColumnHidden(LogModel::ElapsedColumn, !state.hasElapsed);
     fitTimes();
     m_ticks->SetRowCount(m_model->rowCount());
-    forgetHeights();
-    if (isWrapped())
+    if (m_hasOtherRows || measuredRows() > MostMeasuredRows)
+        forgetHeights();
+    if (isWrapped() && m_hasOtherRows)
         updateGeometries(); // a last line may have got longer
     restoreCurrent();
-    if (m_following)
+    if (m_following && m_hasOtherRows)
         goToEnd();
-    viewport()->update();
+    if (m_hasOtherRows)
+        viewport()->update();
+    m_hasOtherRows = false;
 }
 
 // The text as it was when it became current: what was written over cannot be read any more.
@@ -272,6 +296,7 @@ void LogView::currentChanged(QModelIndex const& current, QModelIndex const& prev
 
 void LogView::noteCurrent()
 {
+    m_hasOtherRows = true;
     const int row = currentIndex().row();
     if (row < 0 || m_model->LineStart(row) < 0)
         return;
@@ -458,6 +483,8 @@ QList<int> LogView::SelectedRows() const
 
 void LogView::SetPlaceholder(QString const& text)
 {
+    if (text == m_placeholder)
+        return;
     m_placeholder = text;
     setAccessibleDescription(text);
     viewport()->update();

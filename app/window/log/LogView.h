@@ -114,6 +114,8 @@ protected:
     QModelIndex moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) override;
     void rowsInserted(QModelIndex const& parent, int first, int last) override;
     void rowsAboutToBeRemoved(QModelIndex const& parent, int first, int last) override;
+    void dataChanged(QModelIndex const& topLeft, QModelIndex const& bottomRight,
+                     QVector<int> const& roles = QVector<int>()) override;
 
 private:
     LogDelegate* cells() const;
@@ -137,6 +139,7 @@ private:
     bool m_following = true;
     bool m_scrollingItself = false;
     bool m_goesSideways = false;
+    bool m_hasOtherRows = true; // since the last refresh, not only more of them
 
     QString m_currentText;
 

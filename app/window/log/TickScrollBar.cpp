@@ -10,6 +10,7 @@
 #include <QStyleOptionSlider>
 
 #include <algorithm>
+#include <iterator>
 
 namespace Velocor {
 
@@ -29,8 +30,32 @@ void TickScrollBar::SetTicks(Kind kind, std::shared_ptr<std::vector<int> const> 
 
 void TickScrollBar::SetRowCount(int count)
 {
+    const bool hasTicks = std::any_of(std::begin(m_ticks), std::end(m_ticks),
+                                      [](auto const& rows) { return rows && !rows->empty(); });
+    if (hasTicks && count != m_rowCount)
+        update();
     m_rowCount = count;
-    update();
+}
+
+// In a large log that is followed, most new lines move the slider by less than a pixel.
+void TickScrollBar::sliderChange(SliderChange change)
+{
+    const Look look = currentLook();
+    if (change == SliderOrientationChange || !(look == m_look))
+        update();
+    m_look = look;
+}
+
+TickScrollBar::Look TickScrollBar::currentLook() const
+{
+    QStyleOptionSlider option;
+    initStyleOption(&option);
+    Look look;
+    look.slider =
+        style()->subControlRect(QStyle::CC_ScrollBar, &option, QStyle::SC_ScrollBarSlider, this);
+    look.isAtStart = value() == minimum();
+    look.isAtEnd = value() == maximum();
+    return look;
 }
 
 QColor TickScrollBar::Color(Kind kind, QPalette const& palette)

@@ -33,10 +33,27 @@ public:
 
 protected:
     void paintEvent(QPaintEvent* event) override;
+    void sliderChange(SliderChange change) override;
 
 private:
+    // What is painted, apart from the ticks.
+    struct Look
+    {
+        QRect slider;
+        bool isAtStart = false;
+        bool isAtEnd = false;
+
+        bool operator==(Look const& other) const
+        {
+            return slider == other.slider && isAtStart == other.isAtStart &&
+                   isAtEnd == other.isAtEnd;
+        }
+    };
+    Look currentLook() const;
+
     std::shared_ptr<std::vector<int> const> m_ticks[KindCount];
     int m_rowCount = 0;
+    Look m_look;
 };
 
 } // namespace Velocor

@@ -14,6 +14,8 @@ LongText::LongText(QWidget* parent) : QPlainTextEdit(parent) {}
 
 void LongText::SetText(QString const& text)
 {
+    if (text.isEmpty() && m_text.isEmpty())
+        return; // for each line of a log that is followed
     m_text = text;
     m_breaks.clear();
     QString shown;

@@ -54,23 +54,36 @@ void UniformTable::setModel(QAbstractItemModel* newModel)
     if (!newModel)
         return;
     // Usually, the vertical header does so.
-    const auto layOut = [this] {
-        scheduleDelayedItemsLayout();
-    };
-    m_connections.append(connect(newModel, &QAbstractItemModel::rowsRemoved, this, layOut));
-    m_connections.append(connect(newModel, &QAbstractItemModel::modelReset, this, layOut));
+    m_connections.append(
+        connect(newModel, &QAbstractItemModel::rowsRemoved, this, &UniformTable::layOutAgain));
+    m_connections.append(
+        connect(newModel, &QAbstractItemModel::modelReset, this, &UniformTable::layOutAgain));
+}
+
+// What is painted may have to be painted again before the layout is due: until then, scrolling
+// would move it.
+void UniformTable::layOutAgain()
+{
+    viewport()->update();
+    scheduleDelayedItemsLayout();
 }
 
 void UniformTable::rowsInserted(QModelIndex const& parent, int first, int last)
 {
     QTableView::rowsInserted(parent, first, last);
-    scheduleDelayedItemsLayout();
+    if (last + 1 < rowCount()) {
+        layOutAgain();
+        return;
+    }
+    m_firstNew = m_firstNew < 0 ? first : std::min(m_firstNew, first);
+    updateGeometries();
+    movePainted();
 }
 
 void UniformTable::SetRowHeight(int height)
 {
     m_rowHeight = std::max(1, height);
-    scheduleDelayedItemsLayout();
+    layOutAgain();
 }
 
 void UniformTable::SetLeftMargin(int width)
@@ -216,16 +229,85 @@ int UniformTable::topFor(int row, ScrollHint hint) const
 
 void UniformTable::scrollContentsBy(int dx, int /*dy*/)
 {
-    if (dx != 0)
+    if (dx != 0) {
         horizontalHeader()->setOffset(horizontalScrollBar()->value());
-    viewport()->update();
+        viewport()->update();
+    }
+    movePainted();
+}
+
+void UniformTable::moveOnceAfter(std::function<void()> const& change)
+{
+    {
+        const QScopedValueRollback<bool> guard(m_isMovingLater, true);
+        change();
+    }
+    movePainted();
+}
+
+// For the goal for following in docs/performance.md: painting is most of what a new line costs.
+// tst_PlainPainting compares with painting everything.
+void UniformTable::movePainted()
+{
+    if (m_isMovingLater || m_isUpdatingGeometries)
+        return;
+    const int distance = topOf(m_paintedRow) - m_paintedTop;
+    m_paintedRow = verticalScrollBar()->value();
+    m_paintedTop = topOf(m_paintedRow);
+    if (qAbs(distance) >= viewport()->height()) {
+        viewport()->update();
+    } else if (distance != 0) {
+        viewport()->scroll(0, distance);
+        updateHovered();
+    }
+    if (m_firstNew >= 0)
+        updateBetween(topOf(m_firstNew), viewport()->height());
+    m_firstNew = -1;
+}
+
+// The row that was below the mouse when it was painted, and the one that is there now.
+void UniformTable::updateHovered()
+{
+    const bool isHovered = viewport()->testAttribute(Qt::WA_Hover) && viewport()->underMouse();
+    const int row = isHovered ? rowPast(viewport()->mapFromGlobal(QCursor::pos()).y()) : -1;
+    if (row == m_hoveredRow)
+        return;
+    for (const int changed : {m_hoveredRow, row}) {
+        if (changed >= 0)
+            updateBetween(topOf(changed), topOf(changed + 1));
+    }
+    m_hoveredRow = row;
+}
+
+// Qt only knows the cell that was below the mouse when the mouse moved last.
+bool UniformTable::viewportEvent(QEvent* event)
+{
+    const bool result = QTableView::viewportEvent(event);
+    if (event->type() == QEvent::HoverMove || event->type() == QEvent::HoverLeave)
+        updateHovered();
+    return result;
+}
+
+// What is painted between two heights has changed.
+void UniformTable::updateBetween(int top, int bottom)
+{
+    const QRect area(0, top, viewport()->width(), bottom - top);
+    viewport()->update(area & viewport()->rect());
 }
 
 void UniformTable::updateGeometries()
 {
     if (m_isUpdatingGeometries)
         return;
-    const QScopedValueRollback<bool> guard(m_isUpdatingGeometries, true);
+    {
+        const QScopedValueRollback<bool> guard(m_isUpdatingGeometries, true);
+        placeHeaderAndBars();
+    }
+    movePainted();
+}
+
+void UniformTable::placeHeaderAndBars()
+{
     QHeaderView* const header = horizontalHeader();
     int height = 0;
     if (!header->isHidden())
@@ -381,8 +463,12 @@ void UniformTable::paintEvent(QPaintEvent* event)
     const QRect area = event->rect();
     const int first = std::max(0, rowPast(area.top()));
     const int last = std::min(rowCount() - 1, rowPast(area.bottom()));
-    for (int row = first; row <= last; ++row)
-        paintRow(painter, option, row);
+    for (int row = first; row <= last; ++row) {
+        if (event->region().intersects(QRect(0, topOf(row), area.right() + 1, heightOf(row))))
+            paintRow(painter, option, row);
+    }
+    if (area == viewport()->rect())
+        m_hoveredRow = m_hovered.row();
     m_hovered = QModelIndex();
 }
 

@@ -6,6 +6,8 @@
 #include <QTableView>
 #include <QVector>
 
+#include <functional>
+
 namespace Velocor {
 
 /// A table for any number of rows, all of the same height unless a subclass overrides heightOf()
@@ -79,7 +81,11 @@ protected:
     /// A position as a widget takes it. Positions far outside are moved nearer.
     static int withinInt(qint64 y);
 
+    /// Does what changes where rows are, and moves what is painted only once, at the end.
+    void moveOnceAfter(std::function<void()> const& change);
+
     void paintEvent(QPaintEvent* event) override;
+    bool viewportEvent(QEvent* event) override;
     void updateGeometries() override;
     void scrollContentsBy(int dx, int dy) override;
     void rowsInserted(QModelIndex const& parent, int first, int last) override;
@@ -92,7 +98,12 @@ protected:
 
 private:
     int rowsInView() const;
+    void placeHeaderAndBars();
     void updateScrollBars();
+    void updateBetween(int top, int bottom);
+    void updateHovered();
+    void movePainted();
+    void layOutAgain();
     int neighborColumn(int column, int step) const;
     int edgeColumn(int step) const;
     void paintRow(QPainter& painter, QStyleOptionViewItem const& option, int row);
@@ -102,7 +113,14 @@ private:
     int m_rowHeight = 20;
     int m_leftMargin = 0;
     bool m_isUpdatingGeometries = false;
+    bool m_isMovingLater = false;
     QModelIndex m_hovered; // while painting
+    int m_hoveredRow = -1; // as painted
+
+    // Where a row is in what is painted, and the first of the rows that are not.
+    int m_paintedRow = 0;
+    int m_paintedTop = 0;
+    int m_firstNew = -1;
 };
 
 } // namespace Velocor
