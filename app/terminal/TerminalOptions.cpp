@@ -105,6 +105,7 @@ Parser::Parser()
     add("exclude", QObject::tr("No entries that contain this text. May be repeated."), "TEXT");
     add("context", QObject::tr("Also this many lines before and after each match."), "LINES");
     add("runs", QObject::tr("List the runs instead of their lines."));
+    add("patterns", QObject::tr("List what messages have in common, numbers and names aside."));
     add("program", QObject::tr("Print the program or file before each line."));
     add("format", QObject::tr("Print text, markdown, csv or json."), "FORMAT");
     m_parser.addPositionalArgument(Name("NAME"),
@@ -146,8 +147,11 @@ void Parser::read(TerminalOptions& options)
 
     const bool selectsLines = isSet("severity") || isSet("match") || isSet("exclude") ||
                               isSet("context") || options.hasTimes();
-    options.showsRuns =
-        isSet("runs") || (options.names.isEmpty() && !selectsLines && !options.isMerged);
+    options.showsPatterns = isSet("patterns");
+    options.showsRuns = isSet("runs") || (options.names.isEmpty() && !selectsLines &&
+                                          !options.isMerged && !options.showsPatterns);
+    if (isSet("runs") && options.showsPatterns)
+        options.error = QObject::tr("Either --runs or --patterns.");
     if (isSet("runs") && selectsLines)
         options.error = QObject::tr("--runs lists whole runs, so no lines can be selected.");
 }

@@ -22,6 +22,7 @@ struct TerminalOptions
     qint64 until = -1;
     bool isMerged = false;
     bool showsRuns = false;
+    bool showsPatterns = false;
     bool showsProgram = false;
     Format format = Text;
 

@@ -41,6 +41,8 @@ private:
     void printLines();
     void printOneByOne(LineWriter& writer, bool withTimes);
     void printMerged(LineWriter& writer);
+    void printPatterns();
+    void print(TextTable const& table);
     void print(LogSource const& source, HistoryCursor& cursor, LineWriter& writer);
     bool isInSpan(qint64 time) const;
 
@@ -84,6 +86,11 @@ void Command::printRuns()
     }
     if (m_options.isMerged)
         table.SortByTime();
+    print(table.Table());
+}
+
+void Command::print(TextTable const& table)
+{
     m_isFound = !table.isEmpty();
     table.Print(m_options.format, m_output);
 }
@@ -93,6 +100,22 @@ bool Command::isInSpan(qint64 time) const
     if (!m_options.hasTimes())
         return true;
     return time >= 0 && time >= m_options.since && (m_options.until < 0 || time <= m_options.until);
+}
+
+// Of entries; their further lines do not count.
+void Command::printPatterns()
+{
+    PatternList patterns;
+    for (LogSource const& source : m_sources.sources()) {
+        const std::unique_ptr<LogHistory> history = read(source, m_options.filter);
+        HistoryCursor cursor(*history, true);
+        while (cursor.Next()) {
+            const LogEntry entry = cursor.file().parser().Parse(cursor.content());
+            if (entry.isEntry && isInSpan(cursor.time()))
+                patterns.Add(entry.severity, entry.message, cursor.time());
+        }
+    }
+    print(PatternTable(patterns));
 }
 
 void Command::print(LogSource const& source, HistoryCursor& cursor, LineWriter& writer)
@@ -148,6 +171,8 @@ int Command::run()
         complain(error);
     if (m_options.showsRuns)
         printRuns();
+    else if (m_options.showsPatterns)
+        printPatterns();
     else
         printLines();
     if (!m_output.Flush())

@@ -40,6 +40,7 @@ private slots:
     void formats_data();
     void formats();
     void runs();
+    void tables();
     void problems_data();
     void problems();
     void relativeTimes();
@@ -181,14 +182,14 @@ void tst_VelocorLog::runs()
         const QByteArrayList rows = result.output.split('\n');
         QCOMPARE(rows.size(), 6);
         QVERIFY(rows[0].startsWith("program  start "));
-        QVERIFY(rows[1].startsWith("Mail     2025-03-02 10:00:00.001   2025-03-03 09:00:00.501  "
-                                   "       0       1      2  "));
+        QVERIFY(rows[1].startsWith("Mail     2025-03-02 10:00:00.001  2025-03-03 09:00:00.501  "
+                                   "       0       1      2                     /"));
         QVERIFY(rows[2].startsWith("Notes    2025-03-01 07:00:00.001 "));
         QVERIFY(rows[2].endsWith("notes.log.1"));
-        QVERIFY(rows[3].startsWith("Notes    <2025-03-02 08:00:00.001  2025-03-02 08:00:05.001  "
-                                   "       0       1      3  "));
-        QVERIFY(rows[4].startsWith("Notes    2025-03-03 09:00:00.001   2025-03-03 09:00:01.001  "
-                                   "       1       0      3  "));
+        QVERIFY(rows[3].startsWith("Notes    2025-03-02 08:00:00.001  2025-03-02 08:00:05.001  "
+                                   "       0       1      3  start overwritten  /"));
+        QVERIFY(rows[4].startsWith("Notes    2025-03-03 09:00:00.001  2025-03-03 09:00:01.001  "
+                                   "       1       0      3                     /"));
     }
     const ProgramResult merged = run({"--runs", "--merge", "--format", "csv", "mail", "notes"});
     QByteArray order;
@@ -196,6 +197,41 @@ void tst_VelocorLog::runs()
         order += row.mid(1, 1);
     QCOMPARE(order, QByteArray("pNNMN"));
     QCOMPARE(run({"--runs", "nosuch.log"}).exitCode, 2);
+}
+
+void tst_VelocorLog::tables()
+{
+    QVERIFY(TestFiles::write("pages.log", "2025-03-03 09:00:00.001 Trace page 1 of \"a|b\"\n"
+                                          "2025-03-03 09:00:00.002 Warning disk\n"
+                                          "page 7\n"
+                                          "2025-03-03 09:00:00.003 Trace page 22 of \"c\"\n"));
+    QCOMPARE(
+        run({"pages.log", "--patterns"}).output,
+        QByteArray("count  first                    last                     severity  pattern\n"
+                   "    2  2025-03-03 09:00:00.001  2025-03-03 09:00:00.003  Trace     page # of "
+                   "\"\u2026\"\n"
+                   "    1  2025-03-03 09:00:00.002  2025-03-03 09:00:00.002  Warning   disk\n"));
+    QCOMPARE(
+        run({"pages.log", "--patterns", "--format", "markdown", "--match", "k$"}).output,
+        QByteArray("| count | first | last | severity | pattern |\n"
+                   "| ---: | --- | --- | --- | --- |\n"
+                   "| 1 | 2025-03-03 09:00:00.002 | 2025-03-03 09:00:00.002 | Warning | disk |\n"));
+    QCOMPARE(run({"pages.log", "--patterns", "--format", "json", "--since",
+                  "2025-03-03 09:00:00.002", "--severity", "trace"})
+                 .output,
+             QByteArray("{\"count\":1,\"first\":\"2025-03-03 09:00:00.003\",\"last\":"
+                        "\"2025-03-03 09:00:00.003\",\"severity\":\"Trace\",\"pattern\":"
+                        "\"page # of \\\"\u2026\\\"\"}\n"));
+    QCOMPARE(run({"pages.log", "--patterns", "--match", "nothing"}).exitCode, 1);
+    const QByteArray csv = run({"pages.log", "--runs", "--format", "csv"}).output;
+    QCOMPARE(csv,
+             QByteArray("\"program\",\"start\",\"end\",\"warnings\",\"errors\",\"lines\","
+                        "\"note\",\"file\"\r\n\"pages.log\",\"2025-03-03 09:00:00.001\","
+                        "\"2025-03-03 09:00:00.003\",\"1\",\"0\",\"4\",\"\",\"pages.log\"\r\n"));
+    QCOMPARE(run({"pages.log", "--runs", "--format", "json"}).output,
+             QByteArray("{\"program\":\"pages.log\",\"start\":\"2025-03-03 09:00:00.001\",\"end\":"
+                        "\"2025-03-03 09:00:00.003\",\"warnings\":1,\"errors\":0,\"lines\":4,"
+                        "\"file\":\"pages.log\"}\n"));
 }
 
 void tst_VelocorLog::problems_data()
@@ -218,6 +254,7 @@ void tst_VelocorLog::problems_data()
     row("negative context", "--context=-1", "Not a number of lines: -1");
     row("format", "--format xml", "Not a format: xml");
     row("time", "--since someday", "Not a time: someday");
+    row("runs and patterns", "--runs --patterns", "Either --runs or --patterns.");
     row("lines of runs", "--runs --match x",
         "--runs lists whole runs, so no lines can be selected.");
 }
