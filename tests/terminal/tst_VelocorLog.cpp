@@ -43,6 +43,8 @@ private slots:
     void tables();
     void problems_data();
     void problems();
+    void documented_data();
+    void documented();
     void relativeTimes();
     void standardInput();
     void bytesAsInFile_data();
@@ -276,6 +278,30 @@ void tst_VelocorLog::problems()
     // What can be read is printed all the same.
     if (!arguments.startsWith("--"))
         QCOMPARE(run({arguments, "mail"}).output, Mail);
+}
+
+void tst_VelocorLog::documented_data()
+{
+    QTest::addColumn<QString>("file");
+    for (char const* name : {"velocor-log.1", "velocor-log.bash", "_velocor-log"})
+        QTest::newRow(name) << QString(PACKAGING "/linux/") + name;
+}
+
+// All options of --help, and no others.
+void tst_VelocorLog::documented()
+{
+    QFETCH(QString, file);
+    const auto options = [](QByteArray text) {
+        static const QRegularExpression option("--[a-z]+");
+        QSet<QString> all;
+        const QString plain = QString::fromUtf8(text.replace("\\-", "-"));
+        for (auto match = option.globalMatch(plain); match.hasNext();)
+            all.insert(match.next().captured());
+        return all;
+    };
+    const QSet<QString> known = options(run({"--help"}).output);
+    QVERIFY(known.contains("--merge"));
+    QCOMPARE(options(TestFiles::read(file)), known);
 }
 
 void tst_VelocorLog::relativeTimes()
