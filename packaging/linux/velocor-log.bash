@@ -20,7 +20,7 @@ _velocor_log() {
     esac
     if [[ $current == -* ]]; then
         mapfile -t COMPREPLY < <(compgen -W '--merge --since --until --severity --match --exclude
-            --context --runs --patterns --program --format --help --version' -- "$current")
+            --context --follow --runs --patterns --program --format --help --version' -- "$current")
         return
     fi
     mapfile -t COMPREPLY < <(compgen -f -- "$current")

@@ -52,6 +52,9 @@ private slots:
     void terminal();
     void readerThatLeaves();
     void fullDisk();
+    void follow();
+    void followedEntry();
+    void followedRuns();
 
 private:
     ProgramResult run(QStringList const& arguments) const
@@ -256,6 +259,11 @@ void tst_VelocorLog::problems_data()
     row("negative context", "--context=-1", "Not a number of lines: -1");
     row("format", "--format xml", "Not a format: xml");
     row("time", "--since someday", "Not a time: someday");
+    row("a table that goes on", "--follow --patterns",
+        "--follow prints lines, so there is no end of a table.");
+    row("a code block that goes on", "--follow --format markdown",
+        "--follow prints lines, so there is no end of a code block.");
+    row("standard input that goes on", "--follow -", "Standard input cannot be followed.");
     row("runs and patterns", "--runs --patterns", "Either --runs or --patterns.");
     row("lines of runs", "--runs --match x",
         "--runs lists whole runs, so no lines can be selected.");
@@ -405,6 +413,98 @@ void tst_VelocorLog::fullDisk()
              QByteArray("velocor-log: Standard output cannot be written: No space left on "
                         "device\n"));
     QCOMPARE(process.exitCode(), 2);
+}
+
+// A program that follows logs.
+class Follower
+{
+public:
+    Follower(QStringList const& arguments, QProcessEnvironment const& environment)
+    {
+        m_process.setProcessEnvironment(environment);
+        m_process.start(VELOCOR_LOG, QStringList("--follow") + arguments);
+    }
+    ~Follower()
+    {
+        m_process.kill();
+        m_process.waitForFinished();
+    }
+
+    // The end of the next line.
+    QByteArray next() { return NextLine(m_process).trimmed().right(1); }
+    QByteArray next(int lines)
+    {
+        QByteArray ends;
+        for (; lines > 0; --lines)
+            ends += next();
+        return ends;
+    }
+
+    QProcess& process() { return m_process; }
+
+private:
+    QProcess m_process;
+};
+
+QByteArray const At = "2025-03-03 09:00:00.00";
+
+void tst_VelocorLog::follow()
+{
+    QByteArray text = At + "1 Trace a\n" + At + "2 Trace b\n" + At + "3 Warn";
+    QVERIFY(TestFiles::write("followed.log", text));
+    Follower follower({"followed.log", "--program"}, m_environment);
+    QCOMPARE(follower.next(2), QByteArray("ab"));
+    text += "ing c\n" + At + "4 Trace d\r\n";
+    QVERIFY(TestFiles::writeOver("followed.log", text));
+    QCOMPARE(NextLine(follower.process()), "followed.log  " + At + "3 Warning c\n");
+    QCOMPARE(NextLine(follower.process()), "followed.log  " + At + "4 Trace d\r\n");
+    QVERIFY(TestFiles::writeOver("followed.log", text + "e\n"));
+    QCOMPARE(follower.next(), QByteArray("e"));
+    follower.process().terminate();
+    QVERIFY(follower.process().waitForFinished());
+    QCOMPARE(follower.process().readAll(), QByteArray());
+}
+
+// All lines of an entry are printed when one of them matches.
+void tst_VelocorLog::followedEntry()
+{
+    QByteArray text = At + "1 Trace x a\n" + At + "2 Trace b\n";
+    QVERIFY(TestFiles::write("entry.log", text));
+    Follower follower({"entry.log", "--match", "x"}, m_environment);
+    QCOMPARE(follower.next(), QByteArray("a"));
+    text += "x c\n";
+    QVERIFY(TestFiles::writeOver("entry.log", text));
+    QCOMPARE(follower.next(2), QByteArray("bc"));
+    text += "d\n" + At + "3 Trace e\n" + At + "4 Trace x f\n";
+    QVERIFY(TestFiles::writeOver("entry.log", text));
+    QCOMPARE(follower.next(2), QByteArray("df"));
+}
+
+// A run that writes over the log, one that rotates it, and a second log.
+void tst_VelocorLog::followedRuns()
+{
+    const QString log = file("data/yourorganization/Calendar/logs/calendar.log");
+    const QByteArray old = At + "1 Trace a\n" + At + "2 Trace b\n";
+    QVERIFY(TestFiles::write(log, old));
+    QVERIFY(TestFiles::write("second.log", old.toUpper()));
+    Follower follower({"calendar", "second.log", "--format", "json"}, m_environment);
+    for (char const* line : {"Calendar", "Calendar", "second.log", "second.log"})
+        QVERIFY(NextLine(follower.process()).contains(line));
+
+    QByteArray text = old;
+    const QByteArray restarted = "2025-03-04 08:00:00.001 Trace c\n";
+    text.replace(0, restarted.size(), restarted);
+    QVERIFY(TestFiles::writeOver(log, text));
+    QVERIFY(NextLine(follower.process()).contains("2025-03-04T08:00:00.001"));
+
+    QVERIFY(QFile::rename(log, log + ".1"));
+    QVERIFY(TestFiles::write(log + ".new", "2025-03-05 08:00:00.001 Trace d\n"));
+    QVERIFY(QFile::rename(log + ".new", log));
+    QVERIFY(NextLine(follower.process()).contains("2025-03-05T08:00:00.001"));
+
+    QVERIFY(TestFiles::writeOver("second.log", old.toUpper() + "e\n"));
+    QVERIFY(NextLine(follower.process()).contains("\"message\":\"e\""));
+    QVERIFY(QFile::remove(log + ".1") && QFile::remove(log));
 }
 
 QTEST_GUILESS_MAIN(tst_VelocorLog)
