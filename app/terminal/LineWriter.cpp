@@ -3,6 +3,7 @@
 
 #include "app/terminal/LineWriter.h"
 
+#include "app/logfile/LogRows.h"
 #include "app/logfile/LogSeverities.h"
 #include "app/terminal/TextFormats.h"
 
@@ -13,11 +14,6 @@ namespace Velocor {
 namespace {
 
 constexpr QLatin1Char Blank(' ');
-
-LogEncoding EncodingOf(HistoryCursor const& cursor)
-{
-    return cursor.file().parser().fileType().encoding;
-}
 
 // The columns of text: those of programs, of their widest name, and the lines.
 class ProgramColumn
@@ -49,16 +45,15 @@ public:
         : m_programs(programs), m_output(&output)
     {}
 
-    void Write(QString const& program, HistoryCursor& cursor) override
+    void Write(PrintedLine const& line) override
     {
-        m_output->Write(m_programs.text(program).toLocal8Bit());
-        QByteArray const& bytes = cursor.bytes();
-        if (EncodingOf(cursor).isWide()) {
-            m_output->Write(cursor.file().parser().Text(cursor.content()).toUtf8() + '\n');
+        m_output->Write(m_programs.text(line.program).toLocal8Bit());
+        if (line.parser.fileType().encoding.isWide()) {
+            m_output->Write(line.parser.Text(line.content).toUtf8() + '\n');
             return;
         }
-        m_output->Write(bytes);
-        if (!bytes.endsWith('\n'))
+        m_output->Write(line.bytes);
+        if (!line.bytes.endsWith('\n'))
             m_output->Write("\n", 1);
     }
 
@@ -78,12 +73,11 @@ public:
         m_isColored = qEnvironmentVariableIsEmpty("NO_COLOR") && terminal != "dumb";
     }
 
-    void Write(QString const& program, HistoryCursor& cursor) override
+    void Write(PrintedLine const& line) override
     {
-        const auto severity =
-            static_cast<LogEntry::Severity>(cursor.mark() & LogRows::SeverityMask);
-        const QString line = TextFormats::Harmless(cursor.file().parser().Text(cursor.content()));
-        const QByteArray text = (m_programs.text(program) + line).toLocal8Bit();
+        const auto severity = static_cast<LogEntry::Severity>(line.mark & LogRows::SeverityMask);
+        const QString shown = TextFormats::Harmless(line.parser.Text(line.content));
+        const QByteArray text = (m_programs.text(line.program) + shown).toLocal8Bit();
         if (m_isColored && LogSeverities::IsProblem(severity))
             m_output->Write((severity == LogEntry::Warning ? "\033[33m" : "\033[31m") + text +
                             "\033[0m\n");
@@ -104,10 +98,10 @@ public:
         : m_programs(programs), m_output(&output)
     {}
 
-    void Write(QString const& program, HistoryCursor& cursor) override
+    void Write(PrintedLine const& line) override
     {
-        const QString line = cursor.file().parser().Text(cursor.content());
-        m_lines += (m_programs.text(program) + line).toUtf8() + '\n';
+        const QString text = line.parser.Text(line.content);
+        m_lines += (m_programs.text(line.program) + text).toUtf8() + '\n';
     }
 
     void End() override { m_output->Write(TextFormats::MarkdownBlock(m_lines)); }
@@ -129,12 +123,11 @@ public:
              QStringLiteral("message")}));
     }
 
-    void Write(QString const& program, HistoryCursor& cursor) override
+    void Write(PrintedLine const& line) override
     {
-        const LogEntry entry = cursor.file().parser().Parse(cursor.content());
+        const LogEntry entry = line.parser.Parse(line.content);
         m_output->Write(TextFormats::CsvRecord(
-            {program, cursor.file().path(), QString::number(cursor.line() + 1),
-             TextFormats::Time(cursor.time()),
+            {line.program, line.path, QString::number(line.number), TextFormats::Time(line.time),
              QString::fromLatin1(LogSeverities::LoggedName(entry.severity)), entry.elapsed,
              entry.message}));
     }
@@ -148,18 +141,18 @@ class JsonLines : public LineWriter
 public:
     explicit JsonLines(OutputBuffer& output) : m_output(&output) {}
 
-    void Write(QString const& program, HistoryCursor& cursor) override
+    void Write(PrintedLine const& line) override
     {
-        const LogEntry entry = cursor.file().parser().Parse(cursor.content());
+        const LogEntry entry = line.parser.Parse(line.content);
         QVector<QPair<char const*, QString>> members = {
-            {"program", TextFormats::JsonText(program)},
-            {"file", TextFormats::JsonText(cursor.file().path())},
-            {"line", QString::number(cursor.line() + 1)}};
+            {"program", TextFormats::JsonText(line.program)},
+            {"file", TextFormats::JsonText(line.path)},
+            {"line", QString::number(line.number)}};
         const auto add = [&members](char const* name, QString const& text) {
             if (!text.isEmpty())
                 members.append({name, TextFormats::JsonText(text)});
         };
-        add("time", TextFormats::Time(cursor.time()));
+        add("time", TextFormats::Time(line.time));
         add("severity", QString::fromLatin1(LogSeverities::LoggedName(entry.severity)));
         if (!entry.elapsed.isEmpty())
             members.append({"elapsed", QString::number(entry.elapsed.toLongLong())});

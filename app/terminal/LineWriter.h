@@ -3,19 +3,35 @@
 
 #pragma once
 
-#include "app/history/HistoryCursor.h"
+#include "app/logfile/LogLineParser.h"
 #include "app/terminal/OutputBuffer.h"
 #include "app/terminal/TerminalOptions.h"
+
+#include <QByteArray>
+#include <QString>
+#include <QStringList>
 
 #include <memory>
 
 namespace Velocor {
 
+/// A line of a log and what is known about it. Refers to what it was made of.
+struct PrintedLine
+{
+    QString const& program;
+    QString const& path;
+    LogLineParser const& parser;
+    QByteArray const& bytes;   ///< as stored in the file, with its line end
+    QByteArray const& content; ///< the same without its line end
+    quint8 mark;               ///< of its row, see LogRows
+    size_t number;             ///< in the file, starting at 1
+    qint64 time;               ///< see HistoryCursor::time()
+};
+
 /// Prints lines of logs in a format.
 ///
 ///     const auto writer = LineWriter::Make(options, isTerminal, names, output);
-///     while (cursor.Next())
-///         writer->Write(name, cursor);
+///     writer->Write(line);
 ///     writer->End();
 class LineWriter
 {
@@ -32,9 +48,8 @@ public:
     static std::unique_ptr<LineWriter> Make(TerminalOptions const& options, bool isTerminal,
                                             QStringList const& names, OutputBuffer& output);
 
-    /// Prints the current line of a cursor, which needs times unless the format is text or
-    /// markdown.
-    virtual void Write(QString const& program, HistoryCursor& cursor) = 0;
+    /// Prints a line. Only CSV and JSON need its time.
+    virtual void Write(PrintedLine const& line) = 0;
 
     /// Prints what follows the last line.
     virtual void End() {}

@@ -4,12 +4,8 @@
 #pragma once
 
 #include "app/history/LogHistory.h"
-#include "app/terminal/OutputBuffer.h"
-#include "app/terminal/TerminalOptions.h"
-
-#include <QPair>
-#include <QString>
-#include <QVector>
+#include "app/history/MessagePattern.h"
+#include "app/terminal/TextTable.h"
 
 #include <vector>
 
@@ -17,9 +13,9 @@ namespace Velocor {
 
 /// The runs of logs as a table.
 ///
-///     RunTable table;
-///     table.Add("Notes", history);
-///     table.Print(TerminalOptions::Text, output);
+///     RunTable runs;
+///     runs.Add("Notes", history);
+///     runs.Table().Print(TerminalOptions::Text, output);
 class RunTable
 {
 public:
@@ -31,10 +27,7 @@ public:
     /// Puts the runs of all logs in the order in which they began.
     void SortByTime();
 
-    bool isEmpty() const { return m_rows.empty(); }
-
-    /// Prints all runs.
-    void Print(TerminalOptions::Format format, OutputBuffer& output) const;
+    TextTable Table() const;
 
 private:
     struct Row
@@ -42,15 +35,13 @@ private:
         QString program;
         QString file;
         HistoryRun run;
-        qint64 key; ///< never less than that of the run before of the same log
+        qint64 key; // never less than that of the run before of the same log
     };
-
-    static QVector<QString> cells(Row const& row);
-    static QVector<QPair<char const*, QString>> members(Row const& row);
-    void printText(OutputBuffer& output) const;
-    void printMarkdown(OutputBuffer& output) const;
 
     std::vector<Row> m_rows;
 };
+
+/// Patterns of messages as a table, the most frequent first.
+TextTable PatternTable(PatternList const& patterns);
 
 } // namespace Velocor

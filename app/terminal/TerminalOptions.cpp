@@ -76,6 +76,7 @@ private:
     void add(char const* name, QString const& description, char const* value = nullptr);
     void read(TerminalOptions& options);
     void readFilter(TerminalOptions& options);
+    void checkCombination(TerminalOptions& options, bool selectsLines);
     void readContext(TerminalOptions& options);
     void readFormat(TerminalOptions& options);
     bool readTime(char const* name, qint64& time, QString& error);
@@ -104,7 +105,9 @@ Parser::Parser()
     add("match", QObject::tr("Only entries that match a regular expression."), "EXPRESSION");
     add("exclude", QObject::tr("No entries that contain this text. May be repeated."), "TEXT");
     add("context", QObject::tr("Also this many lines before and after each match."), "LINES");
+    add("follow", QObject::tr("Then print new lines as they are written, until interrupted."));
     add("runs", QObject::tr("List the runs instead of their lines."));
+    add("patterns", QObject::tr("List what messages have in common, numbers and names aside."));
     add("program", QObject::tr("Print the program or file before each line."));
     add("format", QObject::tr("Print text, markdown, csv or json."), "FORMAT");
     m_parser.addPositionalArgument(Name("NAME"),
@@ -137,6 +140,7 @@ void Parser::read(TerminalOptions& options)
     options.names = m_parser.positionalArguments();
     options.isMerged = isSet("merge");
     options.showsProgram = isSet("program");
+    options.follows = isSet("follow");
     readFilter(options);
     readContext(options);
     readFormat(options);
@@ -146,8 +150,23 @@ void Parser::read(TerminalOptions& options)
 
     const bool selectsLines = isSet("severity") || isSet("match") || isSet("exclude") ||
                               isSet("context") || options.hasTimes();
+    options.showsPatterns = isSet("patterns");
     options.showsRuns =
-        isSet("runs") || (options.names.isEmpty() && !selectsLines && !options.isMerged);
+        isSet("runs") || (options.names.isEmpty() && !selectsLines && !options.isMerged &&
+                          !options.showsPatterns && !options.follows);
+    checkCombination(options, selectsLines);
+}
+
+void Parser::checkCombination(TerminalOptions& options, bool selectsLines)
+{
+    if (options.follows && (isSet("runs") || options.showsPatterns))
+        options.error = QObject::tr("--follow prints lines, so there is no end of a table.");
+    if (options.follows && options.format == TerminalOptions::Markdown)
+        options.error = QObject::tr("--follow prints lines, so there is no end of a code block.");
+    if (options.follows && options.names.contains(QStringLiteral("-")))
+        options.error = QObject::tr("Standard input cannot be followed.");
+    if (isSet("runs") && options.showsPatterns)
+        options.error = QObject::tr("Either --runs or --patterns.");
     if (isSet("runs") && selectsLines)
         options.error = QObject::tr("--runs lists whole runs, so no lines can be selected.");
 }

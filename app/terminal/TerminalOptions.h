@@ -21,7 +21,9 @@ struct TerminalOptions
     qint64 since = -1; ///< time of an entry, as HistoryCursor::time(); -1: no limit
     qint64 until = -1;
     bool isMerged = false;
+    bool follows = false;
     bool showsRuns = false;
+    bool showsPatterns = false;
     bool showsProgram = false;
     Format format = Text;
 

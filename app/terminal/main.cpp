@@ -5,6 +5,7 @@
 #include "app/history/HistoryMerge.h"
 #include "app/history/LogFormats.h"
 #include "app/terminal/LineWriter.h"
+#include "app/terminal/LogFollower.h"
 #include "app/terminal/LogSources.h"
 #include "app/terminal/OutputBuffer.h"
 #include "app/terminal/RunTable.h"
@@ -41,12 +42,17 @@ private:
     void printLines();
     void printOneByOne(LineWriter& writer, bool withTimes);
     void printMerged(LineWriter& writer);
+    void printPatterns();
+    void print(TextTable const& table);
     void print(LogSource const& source, HistoryCursor& cursor, LineWriter& writer);
+    void addFollower(LogSource const& source, LogHistory const& history, LineWriter& writer);
+    void follow();
     bool isInSpan(qint64 time) const;
 
     TerminalOptions m_options;
     LogSources m_sources;
     OutputBuffer m_output;
+    std::vector<std::unique_ptr<LogFollower>> m_followers;
     bool m_isFound = false;
     bool m_hasTrouble = false;
 };
@@ -84,6 +90,11 @@ void Command::printRuns()
     }
     if (m_options.isMerged)
         table.SortByTime();
+    print(table.Table());
+}
+
+void Command::print(TextTable const& table)
+{
     m_isFound = !table.isEmpty();
     table.Print(m_options.format, m_output);
 }
@@ -95,12 +106,60 @@ bool Command::isInSpan(qint64 time) const
     return time >= 0 && time >= m_options.since && (m_options.until < 0 || time <= m_options.until);
 }
 
+// Of entries; their further lines do not count.
+void Command::printPatterns()
+{
+    PatternList patterns;
+    for (LogSource const& source : m_sources.sources()) {
+        const std::unique_ptr<LogHistory> history = read(source, m_options.filter);
+        HistoryCursor cursor(*history, true);
+        while (cursor.Next()) {
+            const LogEntry entry = cursor.file().parser().Parse(cursor.content());
+            if (entry.isEntry && isInSpan(cursor.time()))
+                patterns.Add(entry.severity, entry.message, cursor.time());
+        }
+    }
+    print(PatternTable(patterns));
+}
+
 void Command::print(LogSource const& source, HistoryCursor& cursor, LineWriter& writer)
 {
-    if (!isInSpan(cursor.time()))
+    // It is printed once it is complete.
+    const bool isIncomplete =
+        m_options.follows && cursor.start() >= cursor.file().rows().complete();
+    if (isIncomplete || !isInSpan(cursor.time()))
         return;
     m_isFound = true;
-    writer.Write(source.name, cursor);
+    writer.Write({source.name, cursor.file().path(), cursor.file().parser(), cursor.bytes(),
+                  cursor.content(), cursor.mark(), cursor.line() + 1, cursor.time()});
+}
+
+void Command::addFollower(LogSource const& source, LogHistory const& history, LineWriter& writer)
+{
+    if (!m_options.follows)
+        return;
+    const QString path = source.log.isEmpty() ? source.files.last() : source.log;
+    const auto print = [this, &writer](PrintedLine const& line) {
+        if (isInSpan(line.time))
+            writer.Write(line);
+    };
+    const auto flush = [this] {
+        if (!m_output.Flush())
+            QCoreApplication::quit();
+    };
+    m_followers.push_back(std::make_unique<LogFollower>(source.name, path, print, flush));
+    if (!history.files().empty() && history.files().back().path() == path)
+        m_followers.back()->NotePrinted(history.files().back());
+}
+
+// Until a signal ends the program.
+void Command::follow()
+{
+    m_output.Flush();
+    for (int i = 0; i < m_sources.sources().size(); ++i)
+        m_followers[static_cast<size_t>(i)]->Start(
+            LogFormats::ParserFor(m_sources.sources().at(i).path()), m_options.filter);
+    QCoreApplication::exec();
 }
 
 // One log after the other, so that only one is in memory.
@@ -111,6 +170,7 @@ void Command::printOneByOne(LineWriter& writer, bool withTimes)
         HistoryCursor cursor(*history, withTimes);
         while (m_output.error() == 0 && cursor.Next())
             print(source, cursor, writer);
+        addFollower(source, *history, writer);
     }
 }
 
@@ -125,6 +185,8 @@ void Command::printMerged(LineWriter& writer)
     HistoryMerge merge(std::move(cursors));
     while (m_output.error() == 0 && merge.Next())
         print(m_sources.sources().at(static_cast<int>(merge.log())), merge.cursor(), writer);
+    for (size_t log = 0; log < histories.size(); ++log)
+        addFollower(m_sources.sources().at(static_cast<int>(log)), *histories[log], writer);
 }
 
 void Command::printLines()
@@ -139,6 +201,8 @@ void Command::printLines()
         printMerged(*writer);
     else
         printOneByOne(*writer, withTimes);
+    if (!m_followers.empty() && m_output.error() == 0)
+        follow();
     writer->End();
 }
 
@@ -148,6 +212,8 @@ int Command::run()
         complain(error);
     if (m_options.showsRuns)
         printRuns();
+    else if (m_options.showsPatterns)
+        printPatterns();
     else
         printLines();
     if (!m_output.Flush())

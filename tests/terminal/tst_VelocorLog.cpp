@@ -40,8 +40,11 @@ private slots:
     void formats_data();
     void formats();
     void runs();
+    void tables();
     void problems_data();
     void problems();
+    void documented_data();
+    void documented();
     void relativeTimes();
     void standardInput();
     void bytesAsInFile_data();
@@ -49,6 +52,9 @@ private slots:
     void terminal();
     void readerThatLeaves();
     void fullDisk();
+    void follow();
+    void followedEntry();
+    void followedRuns();
 
 private:
     ProgramResult run(QStringList const& arguments) const
@@ -181,14 +187,14 @@ void tst_VelocorLog::runs()
         const QByteArrayList rows = result.output.split('\n');
         QCOMPARE(rows.size(), 6);
         QVERIFY(rows[0].startsWith("program  start "));
-        QVERIFY(rows[1].startsWith("Mail     2025-03-02 10:00:00.001   2025-03-03 09:00:00.501  "
-                                   "       0       1      2  "));
+        QVERIFY(rows[1].startsWith("Mail     2025-03-02 10:00:00.001  2025-03-03 09:00:00.501  "
+                                   "       0       1      2                     /"));
         QVERIFY(rows[2].startsWith("Notes    2025-03-01 07:00:00.001 "));
         QVERIFY(rows[2].endsWith("notes.log.1"));
-        QVERIFY(rows[3].startsWith("Notes    <2025-03-02 08:00:00.001  2025-03-02 08:00:05.001  "
-                                   "       0       1      3  "));
-        QVERIFY(rows[4].startsWith("Notes    2025-03-03 09:00:00.001   2025-03-03 09:00:01.001  "
-                                   "       1       0      3  "));
+        QVERIFY(rows[3].startsWith("Notes    2025-03-02 08:00:00.001  2025-03-02 08:00:05.001  "
+                                   "       0       1      3  start overwritten  /"));
+        QVERIFY(rows[4].startsWith("Notes    2025-03-03 09:00:00.001  2025-03-03 09:00:01.001  "
+                                   "       1       0      3                     /"));
     }
     const ProgramResult merged = run({"--runs", "--merge", "--format", "csv", "mail", "notes"});
     QByteArray order;
@@ -196,6 +202,41 @@ void tst_VelocorLog::runs()
         order += row.mid(1, 1);
     QCOMPARE(order, QByteArray("pNNMN"));
     QCOMPARE(run({"--runs", "nosuch.log"}).exitCode, 2);
+}
+
+void tst_VelocorLog::tables()
+{
+    QVERIFY(TestFiles::write("pages.log", "2025-03-03 09:00:00.001 Trace page 1 of \"a|b\"\n"
+                                          "2025-03-03 09:00:00.002 Warning disk\n"
+                                          "page 7\n"
+                                          "2025-03-03 09:00:00.003 Trace page 22 of \"c\"\n"));
+    QCOMPARE(
+        run({"pages.log", "--patterns"}).output,
+        QByteArray("count  first                    last                     severity  pattern\n"
+                   "    2  2025-03-03 09:00:00.001  2025-03-03 09:00:00.003  Trace     page # of "
+                   "\"\u2026\"\n"
+                   "    1  2025-03-03 09:00:00.002  2025-03-03 09:00:00.002  Warning   disk\n"));
+    QCOMPARE(
+        run({"pages.log", "--patterns", "--format", "markdown", "--match", "k$"}).output,
+        QByteArray("| count | first | last | severity | pattern |\n"
+                   "| ---: | --- | --- | --- | --- |\n"
+                   "| 1 | 2025-03-03 09:00:00.002 | 2025-03-03 09:00:00.002 | Warning | disk |\n"));
+    QCOMPARE(run({"pages.log", "--patterns", "--format", "json", "--since",
+                  "2025-03-03 09:00:00.002", "--severity", "trace"})
+                 .output,
+             QByteArray("{\"count\":1,\"first\":\"2025-03-03 09:00:00.003\",\"last\":"
+                        "\"2025-03-03 09:00:00.003\",\"severity\":\"Trace\",\"pattern\":"
+                        "\"page # of \\\"\u2026\\\"\"}\n"));
+    QCOMPARE(run({"pages.log", "--patterns", "--match", "nothing"}).exitCode, 1);
+    const QByteArray csv = run({"pages.log", "--runs", "--format", "csv"}).output;
+    QCOMPARE(csv,
+             QByteArray("\"program\",\"start\",\"end\",\"warnings\",\"errors\",\"lines\","
+                        "\"note\",\"file\"\r\n\"pages.log\",\"2025-03-03 09:00:00.001\","
+                        "\"2025-03-03 09:00:00.003\",\"1\",\"0\",\"4\",\"\",\"pages.log\"\r\n"));
+    QCOMPARE(run({"pages.log", "--runs", "--format", "json"}).output,
+             QByteArray("{\"program\":\"pages.log\",\"start\":\"2025-03-03 09:00:00.001\",\"end\":"
+                        "\"2025-03-03 09:00:00.003\",\"warnings\":1,\"errors\":0,\"lines\":4,"
+                        "\"file\":\"pages.log\"}\n"));
 }
 
 void tst_VelocorLog::problems_data()
@@ -218,6 +259,12 @@ void tst_VelocorLog::problems_data()
     row("negative context", "--context=-1", "Not a number of lines: -1");
     row("format", "--format xml", "Not a format: xml");
     row("time", "--since someday", "Not a time: someday");
+    row("a table that goes on", "--follow --patterns",
+        "--follow prints lines, so there is no end of a table.");
+    row("a code block that goes on", "--follow --format markdown",
+        "--follow prints lines, so there is no end of a code block.");
+    row("standard input that goes on", "--follow -", "Standard input cannot be followed.");
+    row("runs and patterns", "--runs --patterns", "Either --runs or --patterns.");
     row("lines of runs", "--runs --match x",
         "--runs lists whole runs, so no lines can be selected.");
 }
@@ -239,6 +286,30 @@ void tst_VelocorLog::problems()
     // What can be read is printed all the same.
     if (!arguments.startsWith("--"))
         QCOMPARE(run({arguments, "mail"}).output, Mail);
+}
+
+void tst_VelocorLog::documented_data()
+{
+    QTest::addColumn<QString>("file");
+    for (char const* name : {"velocor-log.1", "velocor-log.bash", "_velocor-log"})
+        QTest::newRow(name) << QString(PACKAGING "/linux/") + name;
+}
+
+// All options of --help, and no others.
+void tst_VelocorLog::documented()
+{
+    QFETCH(QString, file);
+    const auto options = [](QByteArray text) {
+        static const QRegularExpression option("--[a-z]+");
+        QSet<QString> all;
+        const QString plain = QString::fromUtf8(text.replace("\\-", "-"));
+        for (auto match = option.globalMatch(plain); match.hasNext();)
+            all.insert(match.next().captured());
+        return all;
+    };
+    const QSet<QString> known = options(run({"--help"}).output);
+    QVERIFY(known.contains("--merge"));
+    QCOMPARE(options(TestFiles::read(file)), known);
 }
 
 void tst_VelocorLog::relativeTimes()
@@ -342,6 +413,98 @@ void tst_VelocorLog::fullDisk()
              QByteArray("velocor-log: Standard output cannot be written: No space left on "
                         "device\n"));
     QCOMPARE(process.exitCode(), 2);
+}
+
+// A program that follows logs.
+class Follower
+{
+public:
+    Follower(QStringList const& arguments, QProcessEnvironment const& environment)
+    {
+        m_process.setProcessEnvironment(environment);
+        m_process.start(VELOCOR_LOG, QStringList("--follow") + arguments);
+    }
+    ~Follower()
+    {
+        m_process.kill();
+        m_process.waitForFinished();
+    }
+
+    // The end of the next line.
+    QByteArray next() { return NextLine(m_process).trimmed().right(1); }
+    QByteArray next(int lines)
+    {
+        QByteArray ends;
+        for (; lines > 0; --lines)
+            ends += next();
+        return ends;
+    }
+
+    QProcess& process() { return m_process; }
+
+private:
+    QProcess m_process;
+};
+
+QByteArray const At = "2025-03-03 09:00:00.00";
+
+void tst_VelocorLog::follow()
+{
+    QByteArray text = At + "1 Trace a\n" + At + "2 Trace b\n" + At + "3 Warn";
+    QVERIFY(TestFiles::write("followed.log", text));
+    Follower follower({"followed.log", "--program"}, m_environment);
+    QCOMPARE(follower.next(2), QByteArray("ab"));
+    text += "ing c\n" + At + "4 Trace d\r\n";
+    QVERIFY(TestFiles::writeOver("followed.log", text));
+    QCOMPARE(NextLine(follower.process()), "followed.log  " + At + "3 Warning c\n");
+    QCOMPARE(NextLine(follower.process()), "followed.log  " + At + "4 Trace d\r\n");
+    QVERIFY(TestFiles::writeOver("followed.log", text + "e\n"));
+    QCOMPARE(follower.next(), QByteArray("e"));
+    follower.process().terminate();
+    QVERIFY(follower.process().waitForFinished());
+    QCOMPARE(follower.process().readAll(), QByteArray());
+}
+
+// All lines of an entry are printed when one of them matches.
+void tst_VelocorLog::followedEntry()
+{
+    QByteArray text = At + "1 Trace x a\n" + At + "2 Trace b\n";
+    QVERIFY(TestFiles::write("entry.log", text));
+    Follower follower({"entry.log", "--match", "x"}, m_environment);
+    QCOMPARE(follower.next(), QByteArray("a"));
+    text += "x c\n";
+    QVERIFY(TestFiles::writeOver("entry.log", text));
+    QCOMPARE(follower.next(2), QByteArray("bc"));
+    text += "d\n" + At + "3 Trace e\n" + At + "4 Trace x f\n";
+    QVERIFY(TestFiles::writeOver("entry.log", text));
+    QCOMPARE(follower.next(2), QByteArray("df"));
+}
+
+// A run that writes over the log, one that rotates it, and a second log.
+void tst_VelocorLog::followedRuns()
+{
+    const QString log = file("data/yourorganization/Calendar/logs/calendar.log");
+    const QByteArray old = At + "1 Trace a\n" + At + "2 Trace b\n";
+    QVERIFY(TestFiles::write(log, old));
+    QVERIFY(TestFiles::write("second.log", old.toUpper()));
+    Follower follower({"calendar", "second.log", "--format", "json"}, m_environment);
+    for (char const* line : {"Calendar", "Calendar", "second.log", "second.log"})
+        QVERIFY(NextLine(follower.process()).contains(line));
+
+    QByteArray text = old;
+    const QByteArray restarted = "2025-03-04 08:00:00.001 Trace c\n";
+    text.replace(0, restarted.size(), restarted);
+    QVERIFY(TestFiles::writeOver(log, text));
+    QVERIFY(NextLine(follower.process()).contains("2025-03-04T08:00:00.001"));
+
+    QVERIFY(QFile::rename(log, log + ".1"));
+    QVERIFY(TestFiles::write(log + ".new", "2025-03-05 08:00:00.001 Trace d\n"));
+    QVERIFY(QFile::rename(log + ".new", log));
+    QVERIFY(NextLine(follower.process()).contains("2025-03-05T08:00:00.001"));
+
+    QVERIFY(TestFiles::writeOver("second.log", old.toUpper() + "e\n"));
+    QVERIFY(NextLine(follower.process()).contains("\"message\":\"e\""));
+    QVERIFY(QFile::remove(log + ".1") && QFile::remove(log));
 }
 
 QTEST_GUILESS_MAIN(tst_VelocorLog)

@@ -1,0 +1,60 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include "app/history/HistoryClock.h"
+#include "app/history/HistoryFile.h"
+#include "app/logfile/LogScanner.h"
+#include "app/terminal/LineWriter.h"
+
+#include <functional>
+#include <set>
+
+namespace Velocor {
+
+/// Prints what a log gets, from a moment on: lines at the end of its run, and the lines of runs
+/// that write over it or rotate it.
+///
+/// An incomplete line waits for its end. If a line that arrives later makes its entry match, the
+/// lines of the entry that have not been printed are. What has been printed stays, even if such a
+/// line hides its entry. Needs an event loop.
+class LogFollower
+{
+public:
+    using Print = std::function<void(PrintedLine const&)>;
+
+    /// @param print  called for each line
+    /// @param flush  called after the lines of each change
+    LogFollower(QString program, QString path, Print print, std::function<void()> flush);
+
+    /// Tells that the lines of this file, except an incomplete one, have been printed.
+    void NotePrinted(HistoryFile const& file);
+
+    /// Starts to follow. Prints what the file has got since.
+    void Start(LogLineParser const& parser, LogFilter const& filter);
+
+private:
+    void take(LogUpdate const& update);
+    size_t firstCandidate(LogRows const& rows) const;
+    void print(LogRows const& rows, size_t row, QByteArray const& content,
+               QByteArray const& lineEnd);
+    qint64 timeOf(QByteArray const& content);
+    void forgetOldLines(LogRows const& rows);
+
+    QString m_program;
+    QString m_path;
+    Print m_print;
+    std::function<void()> m_flush;
+    LogScanner m_scanner;
+    LogLineParser m_parser;
+
+    bool m_hasLines = false;
+    quint16 m_firstCheck = 0;   // of the first line of the newest run
+    qint64 m_end = 0;           // what is before has been seen
+    std::set<qint64> m_printed; // starts of lines of entries that may still change
+    HistoryClock m_clock;
+    qint64 m_time = -1;
+};
+
+} // namespace Velocor

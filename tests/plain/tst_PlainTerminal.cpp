@@ -1,0 +1,267 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// Compares what velocor-log prints of random logs, with random options, with what the log view
+// shows of each file, and with a filter that looks at each line of an entry.
+
+#include "app/ProgramRuns.h"
+#include "app/logfile/LogIndex.h"
+
+#include "ProgramLife.h"
+#include "Rounds.h"
+
+#include <QRegularExpression>
+#include <QTemporaryDir>
+#include <QtTest>
+
+#include <memory>
+
+using namespace Velocor;
+
+namespace {
+
+struct Options
+{
+    QStringList arguments;
+    QString expression;
+    QString excluded;
+    QVector<int> severities; // empty: all
+    int context = 0;
+};
+
+class Generator
+{
+public:
+    explicit Generator(quint32 seed) : m_random(seed) {}
+
+    Options next()
+    {
+        Options options;
+        if (chance(2)) {
+            static const QStringList expressions = {
+                "m$",       "L[0-9]*5", "Trace",   "mmm|cc",   "(?i)ERROR.*m{3}", "P0 L1",
+                "^2025-03", "^P",       "nowhere", "\\.[0-4]", "Warning|Error"};
+            options.expression = expressions[below(expressions.size())];
+            options.arguments << "--match" << options.expression;
+        }
+        if (chance(4)) {
+            static const QStringList texts = {"m m", "L1", "mmmmmmmmmm", "Trace", " "};
+            options.excluded = texts[below(texts.size())];
+            options.arguments << "--exclude" << options.excluded;
+        }
+        if (chance(2))
+            addSeverities(options);
+        if (chance(3)) {
+            options.context = below(4);
+            options.arguments << "--context" << QString::number(options.context);
+        }
+        return options;
+    }
+
+    int below(int limit) { return static_cast<int>(m_random() % static_cast<unsigned>(limit)); }
+    bool chance(int oneIn) { return below(oneIn) == 0; }
+
+private:
+    void addSeverities(Options& options)
+    {
+        static const QStringList names = {"trace", "notification", "warning",
+                                          "error", "fatal",        "none"};
+        QStringList list;
+        for (int severity = 0; severity < names.size(); ++severity) {
+            if (chance(2)) {
+                options.severities.append(severity);
+                list.append(names[severity]);
+            }
+        }
+        if (!list.isEmpty())
+            options.arguments << "--severity" << list.join(',');
+    }
+
+    std::mt19937 m_random;
+};
+
+// A line of a file as the log view sees it, without a filter.
+struct Seen
+{
+    QByteArray text;
+    quint8 mark = 0;
+    bool isNewest = false;
+};
+
+QVector<Seen> LinesOf(QByteArray const& file, LogIndex const& index, LogRows const& rows)
+{
+    QVector<Seen> lines;
+    for (size_t row = 0; row < rows.size(); ++row) {
+        if (rows.isHeading(row))
+            continue;
+        const auto start = static_cast<int>(rows.start(row));
+        const int end = file.indexOf('\n', start);
+        lines.append({file.mid(start, end < 0 ? -1 : end - start), rows.mark(row),
+                      rows.line(row) <
+                          (index.RunStarts().size() > 1 ? index.RunStarts()[1] : index.size())});
+    }
+    return lines;
+}
+
+// The plain filter of the lines of one run: entries as a whole, then context.
+QByteArray Filtered(QVector<Seen> const& lines, Options const& options)
+{
+    const QRegularExpression expression(options.expression);
+    QVector<bool> shown(lines.size());
+    int entry = 0;
+    for (int i = 0; i < lines.size(); i = entry) {
+        for (entry = i + 1; entry < lines.size() && (lines[entry].mark & LogRows::Continued) &&
+                            !(lines[entry].mark & LogRows::Alone);)
+            ++entry;
+        bool isMatched = false;
+        bool isExcluded = false;
+        for (int line = i; line < entry; ++line) {
+            const QString text = QString::fromLatin1(lines[line].text);
+            isMatched = isMatched || expression.match(text).hasMatch();
+            isExcluded =
+                isExcluded || (!options.excluded.isEmpty() && text.contains(options.excluded));
+        }
+        for (int line = i; line < entry; ++line) {
+            const int severity = lines[line].mark & LogRows::SeverityMask;
+            shown[line] = isMatched && !isExcluded &&
+                          (options.severities.isEmpty() || options.severities.contains(severity));
+        }
+    }
+    QByteArray text;
+    for (int line = 0; line < lines.size(); ++line) {
+        bool isNear = false;
+        for (int near = qMax(0, line - options.context);
+             near <= qMin(lines.size() - 1, line + options.context); ++near)
+            isNear = isNear || shown[near];
+        if (isNear)
+            text += lines[line].text + '\n';
+    }
+    return text;
+}
+
+} // namespace
+
+class tst_PlainTerminal : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void randomFilters();
+    void cleanupTestCase();
+
+private:
+    void compare(ProgramLife& life, QStringList const& files, Options const& options);
+    QByteArray expected(QString const& path, LogLineParser parser, Options const& options);
+
+    QTemporaryDir m_folder{QFileInfo("/dev/shm").isWritable() ? "/dev/shm/tst_PlainTerminal-XXXXXX"
+                                                              : "tst_PlainTerminal-XXXXXX"};
+    int m_filters = 0;
+    int m_empty = 0;
+    qint64 m_bytes = 0;
+};
+
+// Of one file, as the log view shows it and as the plain filter does.
+QByteArray tst_PlainTerminal::expected(QString const& path, LogLineParser parser,
+                                       Options const& options)
+{
+    QFile file(path);
+    if (!file.open(QIODevice::ReadOnly))
+        return "cannot open " + path.toLatin1();
+    const QByteArray bytes = file.readAll();
+    parser.SetFileType(LogFileType::Of(bytes.left(LogFileType::HeadSize), parser,
+                                       LogEncoding::Automatic,
+                                       QFileInfo(path).lastModified().date()));
+    LogIndex index(parser);
+    index.Begin();
+    index.Feed(bytes.constData(), bytes.size());
+    index.End();
+
+    // The runs, oldest first: context ends where a run ends.
+    const QVector<Seen> lines = LinesOf(bytes, index, index.Rows(LogFilter()));
+    std::vector<size_t> starts = index.RunStarts();
+    QByteArray plain;
+    int at = 0;
+    size_t end = index.size();
+    for (size_t run = starts.size(); run > 0; --run) {
+        const auto count = static_cast<int>(end - starts[run - 1]);
+        plain += Filtered(lines.mid(at, count), options);
+        at += count;
+        end = starts[run - 1];
+    }
+
+    LogFilter filter;
+    for (int severity = 0; severity <= LogEntry::None && !options.severities.isEmpty(); ++severity)
+        filter.SetSeverity(static_cast<LogEntry::Severity>(severity),
+                           options.severities.contains(severity));
+    filter.SetText(options.expression, true, true);
+    if (!options.excluded.isEmpty())
+        filter.SetTerms(LogTerms(), LogTerms(LogTerms::Quoted(options.excluded), true));
+    filter.SetContext(options.context);
+    LogIndex filtering(parser, filter);
+    filtering.Begin();
+    filtering.Feed(bytes.constData(), bytes.size());
+    filtering.End();
+    QByteArray viewed;
+    for (Seen const& line : LinesOf(bytes, filtering, filtering.Rows(filter)))
+        viewed += line.text + '\n';
+    return plain == viewed ? plain : "the log view shows:\n" + viewed + "instead of:\n" + plain;
+}
+
+void tst_PlainTerminal::compare(ProgramLife& life, QStringList const& files, Options const& options)
+{
+    QByteArray all;
+    for (QString const& file : files)
+        all += expected(file, LogLineParser(life.formats(), {}), options);
+    const ProgramResult result =
+        RunProgram(VELOCOR_LOG, files + options.arguments, PrivateEnvironment(m_folder.path()));
+    QCOMPARE(result.output, all);
+    QCOMPARE(result.exitCode, all.isEmpty() ? 1 : 0);
+    QCOMPARE(result.errors, QByteArray());
+    ++m_filters;
+    m_empty += all.isEmpty();
+    m_bytes += all.size();
+}
+
+void tst_PlainTerminal::randomFilters()
+{
+    std::mt19937 random(Rounds::seed());
+    const int count = Rounds::count(40, 10000, 100000);
+    while (m_filters < count) {
+        const quint32 seed = random();
+        Generator generator(seed);
+        const QString path = m_folder.filePath("program.log");
+        ProgramLife life(path, 0, 1741000000000 + generator.below(100000000), seed + 1);
+        for (int step = generator.below(40); step >= 0; --step)
+            life.step();
+        life.save();
+        QFile settings(m_folder.filePath("logsettings.cfg"));
+        QVERIFY(settings.open(QIODevice::WriteOnly));
+        settings.write("<LogSettings><config><dateTimeFormat>" + life.formats()[0].toLatin1() +
+                       "</dateTimeFormat></config></LogSettings>\n");
+        settings.close();
+        QStringList files;
+        for (QString const& name :
+             QDir(m_folder.path()).entryList({"program.log*"}, QDir::Files, QDir::Name))
+            files.append(m_folder.filePath(name));
+        for (int i = 0; i < 4; ++i)
+            compare(life, files, generator.next());
+        if (QTest::currentTestFailed()) {
+            qWarning("filter %d, of seed %u", m_filters, seed);
+            return;
+        }
+        for (QString const& file : files)
+            QFile::remove(file);
+    }
+    QVERIFY(m_bytes > 100 * count);
+    QVERIFY(m_empty < count / 2);
+}
+
+void tst_PlainTerminal::cleanupTestCase()
+{
+    std::printf("plain terminal: %d filters, %d that nothing matches, %lld bytes printed\n",
+                m_filters, m_empty, static_cast<long long>(m_bytes));
+    std::fflush(stdout);
+}
+
+QTEST_GUILESS_MAIN(tst_PlainTerminal)
+#include "tst_PlainTerminal.moc"
