@@ -13,6 +13,7 @@
 #     scripts/install-packages.sh build lint     and to check format and lint
 #     scripts/install-packages.sh build package  and to validate and build the package
 #     scripts/install-packages.sh build abi      and to compare the binary interface
+#     scripts/install-packages.sh consumers      the compilers of projects that use the package
 #     scripts/install-packages.sh build check    and the other tools of ./check
 set -euo pipefail
 
@@ -23,7 +24,7 @@ packages_of() {
     case "$(uname -s)/$1" in
     Darwin/build) echo cmake ninja qt@5 rapidxml ;;
     Darwin/lint) echo clang-format@14 llvm@14 shellcheck ;;
-    Darwin/test | Darwin/wayland | Darwin/package) ;;
+    Darwin/test | Darwin/wayland | Darwin/package | Darwin/consumers) ;;
     */build) echo g++ cmake ninja-build qtbase5-dev librapidxml-dev ;;
     */wayland) echo qtwayland5 ;;
     */test) echo xvfb xauth shared-mime-info pkg-config valgrind doxygen locales-all ;;
@@ -34,6 +35,7 @@ packages_of() {
         ;;
     */fuzz) echo clang-14 libclang-rt-14-dev ;;
     */package) echo dpkg-dev desktop-file-utils appstream man-db ;;
+    */consumers) echo g++-12 clang-14 clang-16 clang-19 pkg-config ;;
     */abi) echo abigail-tools binutils ;;
     */check) echo clazy cppcheck gcovr valgrind python3 python3-clang-14 ;;
     */lint) echo git clang-format-14 clang-tidy-14 shellcheck ;;
