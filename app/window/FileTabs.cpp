@@ -122,7 +122,9 @@ SettingsEditor* FileTabs::addEditor(QString const& path)
     auto* editor = new SettingsEditor;
     const QString name = QFileInfo(path).fileName();
     editor->setAccessibleName(name);
+    editor->SetOwnerNote(m_ownerNotes.value(QFileInfo(path).absoluteFilePath()));
     editor->Open(path);
+    connect(editor, &SettingsEditor::saved, this, [this, editor] { Q_EMIT saved(editor->path()); });
     connect(editor, &SettingsEditor::messageReported, this, &FileTabs::messageReported);
     connect(editor, &SettingsEditor::stateChanged, this, &FileTabs::stateChanged);
     setTabToolTip(addTab(editor, QString()), PlainToolTip(path));

@@ -4,6 +4,7 @@
 #pragma once
 
 #include <QFont>
+#include <QHash>
 #include <QKeySequence>
 #include <QString>
 #include <QStringList>
@@ -54,6 +55,11 @@ public:
     /// @return false if the user cancels
     bool MayCloseAll();
 
+    /// Names settings files of running programs, for those who edit them.
+    ///
+    /// @param notes  what the program will do to the file, by absolute path
+    void SetOwnerNotes(QHash<QString, QString> const& notes) { m_ownerNotes = notes; }
+
     /// The last filter texts of all logs, newest first.
     QStringList filterHistory() const { return *m_filterHistory; }
     void SetFilterHistory(QStringList const& texts) { *m_filterHistory = texts; }
@@ -93,6 +99,9 @@ Q_SIGNALS:
     /// Another tab is current, or what the current one shows has changed.
     void stateChanged();
     void messageReported(QString const& text);
+
+    /// A settings file was saved in an editor.
+    void saved(QString const& path);
     void zoomRequested(int steps);
 
 private:
@@ -108,6 +117,7 @@ private:
     void addCloseButton(QWidget* page, QString const& name);
 
     LogMarkStore* m_marks;
+    QHash<QString, QString> m_ownerNotes;
     std::shared_ptr<QStringList> m_filterHistory = std::make_shared<QStringList>();
     std::shared_ptr<HighlightRules> m_highlightRules;
     LogPanel* m_ownLog;

@@ -6,6 +6,7 @@
 #include "app/ScreenlessPlatform_p.h"
 #include "app/UserMessages.h"
 #include "app/runninglog/LogHealth.h"
+#include "app/runninglog/LogPreferences.h"
 #include "app/runninglog/RunningLog.h"
 #include "app/window/ApplicationProperty.h"
 #include "app/window/CurrentTab.h"
@@ -28,6 +29,7 @@
 #include <QApplication>
 #include <QCloseEvent>
 #include <QDesktopWidget>
+#include <QFileInfo>
 #include <QMenuBar>
 #include <QSplitter>
 #include <QStatusBar>
@@ -127,10 +129,28 @@ void MainWindow::makeTabs()
     setCentralWidget(content);
     content->show(); // Qt would do it in the next turn of the event loop
 
+    watchOwnSettings();
     m_health = new NoticeBar(tr("State of the log"));
     m_tabs->ownLog()->AddBar(m_health);
     connect(m_tabs, &FileTabs::messageReported, this, &MainWindow::showMessage);
     m_tabs->ownLog()->setFocus();
+}
+
+// Files of this program that somebody may edit in it.
+void MainWindow::watchOwnSettings()
+{
+    const QString own = QFileInfo(m_settings.fileName()).absoluteFilePath();
+    m_tabs->SetOwnerNotes(
+        {{own, tr("These are the settings of this window. It takes over what you save here: your "
+                  "changes take effect at the next start, and everything else is written when the "
+                  "window closes.")},
+         {QFileInfo(LogPreferences::FileName()).absoluteFilePath(),
+          tr("These are the settings of this program's log. It reads them at the next start, and "
+             "replaces them only when you change something in Log Settings.")}});
+    connect(m_tabs, &FileTabs::saved, this, [this, own](QString const& path) {
+        if (QFileInfo(path).canonicalFilePath() == QFileInfo(own).canonicalFilePath())
+            m_settings.TakeOverEdits();
+    });
 }
 
 void MainWindow::makeStatusBar()

@@ -67,6 +67,7 @@ private:
     void makeFirstContent();
     void complete();
     void makeTabs();
+    void watchOwnSettings();
     void makeStatusBar();
     void makeMenus();
     void makeToolBar();

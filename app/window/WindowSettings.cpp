@@ -75,11 +75,54 @@ QString WindowSettings::Load()
     if (!document.isParsed)
         return renameDamagedFile();
 
+    m_known = document.AllValues();
     for (SettingsDocument::Section const& section : document.sections) {
         for (SettingsDocument::Item const& item : section.items)
             take(section.name, item.key, item.value);
     }
     return QString();
+}
+
+void WindowSettings::TakeOverEdits()
+{
+    const SettingsDocument document = SettingsFileReader::Read(m_fileName);
+    if (!document.isParsed)
+        return;
+    const SettingsValues values = document.AllValues();
+    for (auto value = values.begin(); value != values.end(); ++value) {
+        if (!m_known.contains(value.key()) || m_known.value(value.key()) != value.value())
+            m_edited.insert(value.key(), value.value());
+    }
+    for (auto value = m_known.begin(); value != m_known.end(); ++value) {
+        if (!values.contains(value.key()))
+            m_edited.insert(value.key(), QString());
+    }
+    m_known = values;
+}
+
+// The store cannot remove a key, so it is filled again.
+void WindowSettings::applyEdits()
+{
+    if (m_edited.isEmpty())
+        return;
+    SettingsDocument document;
+    const QStringList names = m_file.sectionList();
+    for (QString const& name : names) {
+        const auto items = m_file.FindSection(name)->values();
+        for (auto const& item : items) {
+            if (!m_edited.contains({name, item.key}))
+                document.SetValue(name, item.key, item.value);
+        }
+    }
+    for (auto edit = m_edited.begin(); edit != m_edited.end(); ++edit) {
+        if (!edit.value().isNull())
+            document.SetValue(edit.key().first, edit.key().second, edit.value());
+    }
+    m_file.Clear();
+    for (SettingsDocument::Section const& section : qAsConst(document.sections)) {
+        for (SettingsDocument::Item const& item : section.items)
+            take(section.name, item.key, item.value);
+    }
 }
 
 // A text that the store does not give back would damage the file when it is saved. Only what was
@@ -120,6 +163,7 @@ QString WindowSettings::Save()
     if (QFileInfo::exists(m_fileName) && !QFileInfo(m_fileName).isFile())
         return QObject::tr("The settings file %1 is not a regular file").arg(m_fileName);
     QDir().mkpath(QFileInfo(m_fileName).path());
+    applyEdits();
     return m_file.SaveAtomically() ? QString() : m_file.m_lastError;
 }
 

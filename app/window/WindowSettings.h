@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "app/settingsfile/SettingsDocument.h"
 #include "common/config/TorkConfigFile.h"
 
 #include <QList>
@@ -37,6 +38,12 @@ public:
     /// @return the reason for a failure; empty on success
     QString Save();
 
+    /// Keeps what somebody has changed in the file since Load() or the last call: Save() writes
+    /// those values instead of the window's own, and none where a key was removed. To be called
+    /// after the user has saved the file in an editor; it takes effect at the next start. Does
+    /// nothing if the file is malformed.
+    void TakeOverEdits();
+
     /// Restores the saved position and size of a window. Centers it on the primary screen if its
     /// position is no longer on any screen; leaves it unchanged if nothing was saved.
     void RestoreGeometry(QWidget* window);
@@ -58,11 +65,14 @@ public:
 
 private:
     QString renameDamagedFile();
+    void applyEdits();
     void take(QString const& section, QString const& key, QString const& value);
 
     QString m_fileName;
     TorkConfigFile m_file;
     bool m_mayWrite = true;
+    SettingsValues m_known;  ///< what the file held when it was last read
+    SettingsValues m_edited; ///< what others have changed since then; a null text: removed
 };
 
 } // namespace Velocor

@@ -97,11 +97,19 @@ inline QString CellText(QTreeView const* tree, int section, int item, int column
     return ItemCell(tree, section, item, column).data().toString();
 }
 
+/// Makes a cell current and its row the only one that is selected, even if the last key of a test
+/// had a modifier.
+inline void GoTo(QTreeView* tree, QModelIndex const& cell)
+{
+    tree->selectionModel()->setCurrentIndex(cell, QItemSelectionModel::ClearAndSelect |
+                                                      QItemSelectionModel::Rows);
+}
+
 /// Starts editing a cell with the keyboard.
 inline QLineEdit* StartEditing(QTreeView* tree, QModelIndex const& cell)
 {
     tree->setFocus();
-    tree->setCurrentIndex(cell);
+    GoTo(tree, cell);
     QTest::keyClick(tree, Qt::Key_F2, cell.column() == 0 ? Qt::ShiftModifier : Qt::NoModifier);
     [&] {
         QTRY_VERIFY_WITH_TIMEOUT(tree->findChild<QLineEdit*>(), Patience);

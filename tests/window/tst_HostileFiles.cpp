@@ -453,7 +453,7 @@ void tst_HostileFiles::longValueSurvivesOtherEdits()
 
     // The long value is opened.
     tree->setFocus();
-    tree->setCurrentIndex(ItemCell(tree, 0, 0, 1));
+    GoTo(tree, ItemCell(tree, 0, 0, 1));
     QString looked;
     WindowTest::whenShown<QDialog>([&](QDialog* dialog) {
         looked = dialog->findChild<QLabel*>()->text();
@@ -493,7 +493,7 @@ void tst_HostileFiles::longValueIsEdited()
     QTreeView* tree = shown.tree;
     tree->setFocus();
     const QModelIndex item = ItemCell(tree, 0, 0, 1);
-    tree->setCurrentIndex(item);
+    GoTo(tree, item);
 
     int dialogs = 0;
     WindowTest::whenShown<QDialog>([&](QDialog* dialog) {
@@ -536,7 +536,7 @@ void tst_HostileFiles::longValueIsTypedOver()
     editor.show();
     auto* tree = editor.findChild<QTreeView*>();
     tree->setFocus();
-    tree->setCurrentIndex(ItemCell(tree, 0, 0, 1));
+    GoTo(tree, ItemCell(tree, 0, 0, 1));
     WindowTest::whenShown<QDialog>([&](QDialog* dialog) {
         auto* text = dialog->findChild<QPlainTextEdit*>();
         text->setFocus();
@@ -588,7 +588,7 @@ void tst_HostileFiles::longName()
     editor.show();
     auto* tree = editor.findChild<QTreeView*>();
     QVERIFY(MaximumCellLength(tree) <= 1000);
-    tree->setCurrentIndex(ItemCell(tree, 0, 0, 0));
+    GoTo(tree, ItemCell(tree, 0, 0, 0));
     tree->setFocus();
     QTest::keyClick(tree, Qt::Key_F2, Qt::ShiftModifier);
     QTest::qWait(50);
@@ -726,7 +726,7 @@ void tst_HostileFiles::otherLineBreaks()
 
     auto* tree = editor.findChild<QTreeView*>();
     tree->setFocus();
-    tree->setCurrentIndex(ItemCell(tree, 0, 0, 1));
+    GoTo(tree, ItemCell(tree, 0, 0, 1));
     int shown = 0;
     if (inDialog) {
         WindowTest::whenShown<QDialog>([&](QDialog* dialog) {

@@ -66,6 +66,7 @@ private slots:
     void tabGoesFromValueToValue();
     void keys_data();
     void keys();
+    void commandsGoToOneRow();
     void typingFinds();
     void commandsAreInTheMenus();
     void copiesTheValue();
@@ -100,7 +101,7 @@ void tst_SettingsInWindow::editsSettings()
     QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Return);
     QTRY_COMPARE_WITH_TIMEOUT(CellText(tree, 0, 2, 0), QString("twowords"), Patience);
     QTRY_VERIFY_WITH_TIMEOUT(!tree->findChild<QLineEdit*>(), Patience);
-    tree->setCurrentIndex(ItemCell(tree, 0, 1, 0));
+    GoTo(tree, ItemCell(tree, 0, 1, 0));
     Click(button("Remove"));
     Click(button("Add Section"));
     QTRY_VERIFY_WITH_TIMEOUT(tree->findChild<QLineEdit*>(), Patience);
@@ -461,14 +462,14 @@ void tst_SettingsInWindow::everyChangeIsUndone()
     TypeInto(tree, Cell(tree, 1), "renamed");
     Enter(tree);
     note();
-    tree->setCurrentIndex(ItemCell(tree, 0, 0, 0));
+    GoTo(tree, ItemCell(tree, 0, 0, 0));
     press(Qt::Key_D, Qt::ControlModifier);
     note();
     press(Qt::Key_Down, Qt::AltModifier);
     note();
     press(Qt::Key_Delete, Qt::NoModifier);
     note();
-    tree->setCurrentIndex(Cell(tree, 2));
+    GoTo(tree, Cell(tree, 2));
     press(Qt::Key_Up, Qt::AltModifier);
     note();
     press(Qt::Key_Insert, Qt::NoModifier);
@@ -498,7 +499,7 @@ void tst_SettingsInWindow::undoneFromTheMenu()
     const ShownSettings shown(Several);
     const QByteArray before = Bytes(shown.editor);
     SetValue(shown.tree, 1, "new");
-    shown.tree->setCurrentIndex(Cell(shown.tree, 2));
+    GoTo(shown.tree, Cell(shown.tree, 2));
     QAction* undo = Action(*shown.window, "Undo Change Value");
     QVERIFY(undo && undo->isEnabled());
     undo->trigger();
@@ -533,7 +534,7 @@ void tst_SettingsInWindow::removalIsToldAndUndone()
     const QByteArray before = Bytes(shown.editor);
     NoticeBar* notice = Bar(shown.editor, "removal");
     QVERIFY(!notice->isVisible());
-    shown.tree->setCurrentIndex(Cell(shown.tree, 0));
+    GoTo(shown.tree, Cell(shown.tree, 0));
     QTest::keyClick(shown.tree, Qt::Key_Delete);
     QCOMPARE(shown.tree->model()->rowCount(), 2);
     QVERIFY(notice->isVisible());
@@ -552,7 +553,7 @@ void tst_SettingsInWindow::removalIsToldAndUndone()
 void tst_SettingsInWindow::smallRemovalIsNotTold()
 {
     const ShownSettings shown(Several);
-    shown.tree->setCurrentIndex(Cell(shown.tree, 2));
+    GoTo(shown.tree, Cell(shown.tree, 2));
     QTest::keyClick(shown.tree, Qt::Key_Delete);
     QCOMPARE(shown.tree->model()->rowCount(), 2);
     QVERIFY(!Bar(shown.editor, "removal")->isVisible());
@@ -561,7 +562,7 @@ void tst_SettingsInWindow::smallRemovalIsNotTold()
 void tst_SettingsInWindow::noticeGoesWithTheNextChange()
 {
     const ShownSettings shown(Several);
-    shown.tree->setCurrentIndex(ItemCell(shown.tree, 0, 0, 0));
+    GoTo(shown.tree, ItemCell(shown.tree, 0, 0, 0));
     QTest::keyClick(shown.tree, Qt::Key_Down, Qt::ShiftModifier);
     QTest::keyClick(shown.tree, Qt::Key_Delete);
     QCOMPARE(Bar(shown.editor, "removal")->text(), QString("Removed 2 keys: x, y"));
@@ -725,11 +726,29 @@ void tst_SettingsInWindow::keys()
     const ShownSettings shown(Several);
     QTreeView* tree = shown.tree;
     tree->setFocus();
-    tree->setCurrentIndex(item < 0 ? Cell(tree, section) : ItemCell(tree, section, item, 0));
+    GoTo(tree, item < 0 ? Cell(tree, section) : ItemCell(tree, section, item, 0));
     QTest::keyClick(tree, Qt::Key(key), Qt::KeyboardModifiers(modifiers));
     QCOMPARE(CurrentCell(tree), current);
     QCOMPARE(tree->findChild<QLineEdit*>() != nullptr, isEditing);
     QCOMPARE(shown.editor->undoStack()->undoText(), change);
+}
+
+// The next command is about the row that the last one went to, and about no other, although the
+// Control key was pressed.
+void tst_SettingsInWindow::commandsGoToOneRow()
+{
+    const ShownSettings shown(Several);
+    const QByteArray before = Bytes(shown.editor);
+    GoTo(shown.tree, ItemCell(shown.tree, 0, 0, 0));
+    shown.tree->setFocus();
+    QTest::keyClick(shown.tree, Qt::Key_D, Qt::ControlModifier);
+    QTest::keyClick(shown.tree, Qt::Key_Delete);
+    QCOMPARE(Bytes(shown.editor), before);
+    GoTo(shown.tree, Cell(shown.tree, 2));
+    QTest::keyClick(shown.window.get(), Qt::Key_Z, Qt::ControlModifier);
+    QCOMPARE(CurrentCell(shown.tree), QString("A/x2 name"));
+    QTest::keyClick(shown.tree, Qt::Key_Delete);
+    QCOMPARE(Bytes(shown.editor), before);
 }
 
 void tst_SettingsInWindow::typingFinds()
@@ -737,7 +756,7 @@ void tst_SettingsInWindow::typingFinds()
     const ShownSettings shown(Several);
     QTreeView* tree = shown.tree;
     const QByteArray before = Bytes(shown.editor);
-    tree->setCurrentIndex(ItemCell(tree, 0, 0, 1)); // values are not searched
+    GoTo(tree, ItemCell(tree, 0, 0, 1)); // values are not searched
     QTest::keyClicks(tree, "z");
     QCOMPARE(CurrentCell(tree), QString("C/z name"));
     QVERIFY(!tree->findChild<QLineEdit*>());
@@ -768,7 +787,7 @@ void tst_SettingsInWindow::commandsAreInTheMenus()
     QVERIFY(inContext.takeFirst()->isSeparator());
     QCOMPARE(inContext, actions);
 
-    shown.tree->setCurrentIndex(Cell(shown.tree, 0));
+    GoTo(shown.tree, Cell(shown.tree, 0));
     actions.at(5)->trigger();
     QCOMPARE(shown.tree->model()->rowCount(), 2);
     shown.window->findChild<FileTabs*>()->setCurrentIndex(0);
@@ -779,7 +798,7 @@ void tst_SettingsInWindow::copiesTheValue()
 {
     const ShownSettings shown;
     shown.tree->setFocus();
-    shown.tree->setCurrentIndex(ItemCell(shown.tree, 0, 0, 0));
+    GoTo(shown.tree, ItemCell(shown.tree, 0, 0, 0));
     QTest::keyClick(shown.window.get(), Qt::Key_C, Qt::ControlModifier);
     QCOMPARE(QGuiApplication::clipboard()->text(), QString("Serif"));
 }

@@ -213,6 +213,20 @@ QString SettingsCommands::removalText(Edits const& removals) const
     return tr("Removed ") + of + tr(", with %1 keys: ").arg(keys) + list;
 }
 
+void SettingsCommands::Reload(SettingsDocument const& document)
+{
+    if (document.HasSameValues(m_model->document()))
+        return;
+    Edits edits;
+    for (int i = m_model->rowCount() - 1; i >= 0; --i)
+        edits.append(EditAt(SettingsEdit::RemoveSection, {i, -1}));
+    for (int i = 0; i < document.sections.size(); ++i) {
+        edits.append(EditAt(SettingsEdit::InsertSection, {i, -1}));
+        edits.last().addedSection = document.sections.at(i);
+    }
+    push(edits, tr("Reload"));
+}
+
 void SettingsCommands::Move(QModelIndex const& index, int step)
 {
     if (!index.isValid())

@@ -56,6 +56,10 @@ public:
     /// @param indexes  in any order; of each row, only the first column counts
     void Remove(QModelIndexList const& indexes);
 
+    /// Replaces everything by the sections of another document, as after reading the file again.
+    /// Nothing changes if they are the same.
+    void Reload(SettingsDocument const& document);
+
     /// Moves a section among the sections, or an item within its section.
     ///
     /// @param step  1 moves down, -1 up

@@ -4,12 +4,14 @@
 #include "app/window/settings/SettingsEditor.h"
 
 #include "app/settingsfile/SettingsFileReader.h"
+#include "app/window/settings/FileNotice.h"
 #include "app/window/settings/MalformedFileView.h"
 #include "app/window/settings/SettingsTree.h"
 #include "app/window/settings/ValueDialog.h"
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
 
+#include <QFileDialog>
 #include <QFileInfo>
 #include <QHBoxLayout>
 #include <QMessageBox>
@@ -28,8 +30,9 @@ constexpr int MaximumNameLength = 200;
 
 SettingsEditor::SettingsEditor(QWidget* parent)
     : QWidget(parent), m_saver(this), m_commands(&m_model), m_notice(new NoticeBar),
-      m_removal(new NoticeBar(tr("Removal"))), m_pages(new QStackedWidget),
-      m_tree(new SettingsTree(&m_model, &m_commands)), m_text(new MalformedFileView)
+      m_fileNotice(new FileNotice), m_removal(new NoticeBar(tr("Removal"))),
+      m_pages(new QStackedWidget), m_tree(new SettingsTree(&m_model, &m_commands)),
+      m_text(new MalformedFileView)
 {
     m_pages->addWidget(makeTreePage());
     m_pages->addWidget(m_text);
@@ -37,10 +40,18 @@ SettingsEditor::SettingsEditor(QWidget* parent)
     layout->setContentsMargins(8, 8, 8, 8);
     layout->setSpacing(6);
     layout->addWidget(m_notice);
+    layout->addWidget(m_fileNotice);
     layout->addWidget(m_removal);
     layout->addWidget(m_pages, 1);
     setFocusProxy(m_tree);
+    connectParts();
+}
 
+void SettingsEditor::connectParts()
+{
+    connect(m_fileNotice, &FileNotice::reloadRequested, this, &SettingsEditor::Reload);
+    connect(m_fileNotice, &FileNotice::keepRequested, this, &SettingsEditor::keepMine);
+    connect(m_fileNotice, &FileNotice::saveAsRequested, this, &SettingsEditor::saveAs);
     connect(m_tree, &SettingsTree::editingChanged, this, &SettingsEditor::updateState);
     connect(m_tree, &SettingsTree::rejected, this, &SettingsEditor::messageReported);
     connect(m_tree, &SettingsTree::longValueRequested, this, &SettingsEditor::editLongValueSoon);
@@ -104,6 +115,7 @@ void SettingsEditor::Open(QString const& path)
 {
     m_path = path;
     m_notice->Dismiss();
+    m_fileNotice->SetFile(path); // first, so that it tells of a change while the file is read
     const SettingsDocument document = SettingsFileReader::Read(path);
     m_saver.NoteRead(path, document);
     m_model.SetDocument(document.isParsed ? document : SettingsDocument());
@@ -112,7 +124,60 @@ void SettingsEditor::Open(QString const& path)
         showTree(document);
     else
         showMalformed(document);
+    if (!m_ownerNote.isEmpty())
+        m_notice->ShowMessage(m_ownerNote);
     updateState();
+}
+
+void SettingsEditor::Reload()
+{
+    m_fileNotice->SetFile(m_path);
+    const SettingsDocument document = SettingsFileReader::Read(m_path);
+    const bool canUndo = document.isParsed && m_pages->currentIndex() == TreePage &&
+                         document.rootName == m_model.document().rootName;
+    if (!canUndo) {
+        Open(m_path);
+        return;
+    }
+    m_tree->EndEditing();
+    const SettingsModel::Place place = SettingsModel::PlaceOf(m_tree->currentIndex());
+    m_commands.Reload(document);
+    m_commands.undoStack()->setClean();
+    m_saver.NoteRead(m_path, document);
+    m_tree->GoTo(m_model.IndexOf(place));
+    m_tree->setFocus();
+}
+
+// Saving has to write the file, even if nothing was changed here.
+void SettingsEditor::keepMine()
+{
+    m_saver.AcceptFile();
+    m_fileNotice->SetFile(m_path);
+    if (m_pages->currentIndex() == TreePage)
+        m_commands.undoStack()->resetClean();
+    setFocus();
+}
+
+void SettingsEditor::saveAs()
+{
+    if (!m_tree->EndEditing())
+        return;
+    const QString path = QFileDialog::getSaveFileName(this, tr("Save Settings As"), m_path,
+                                                      tr("Settings (*.cfg *.xml);;All files (*)"));
+    if (path.isEmpty() || !m_saver.SaveAs(path, document()))
+        return;
+    m_path = path;
+    noteSaved();
+}
+
+void SettingsEditor::noteSaved()
+{
+    m_notice->Dismiss();
+    m_fileNotice->SetFile(m_path);
+    m_commands.undoStack()->setClean();
+    updateState();
+    Q_EMIT saved();
+    Q_EMIT messageReported(tr("Saved %1").arg(QFileInfo(m_path).fileName()));
 }
 
 void SettingsEditor::showTree(SettingsDocument const& document)
@@ -225,9 +290,7 @@ bool SettingsEditor::Save()
         return true;
     if (!m_saver.Save(document()))
         return false;
-    m_notice->Dismiss();
-    m_commands.undoStack()->setClean();
-    Q_EMIT messageReported(tr("Saved %1").arg(QFileInfo(m_path).fileName()));
+    noteSaved();
     return true;
 }
 

@@ -15,6 +15,7 @@ class QStackedWidget;
 
 namespace Velocor {
 
+class FileNotice;
 class MalformedFileView;
 class NoticeBar;
 class SettingsTree;
@@ -35,6 +36,9 @@ public:
     explicit SettingsEditor(QWidget* parent = nullptr);
     ~SettingsEditor() override;
 
+    /// Whose file it is, and what that program will do to it; shown by Open().
+    void SetOwnerNote(QString const& note) { m_ownerNote = note; }
+
     /// Shows a file. Unsaved changes are discarded.
     void Open(QString const& path);
 
@@ -49,6 +53,9 @@ public:
     ///
     /// @return false if the user cancels or saving fails
     bool MayClose();
+
+    /// Shows what is in the file now. Can be undone, unless the file is malformed.
+    void Reload();
 
     /// Takes back the last change, or makes it again, and goes there. Does nothing if there is
     /// none.
@@ -78,13 +85,20 @@ Q_SIGNALS:
     void stateChanged();
     void messageReported(QString const& text);
 
+    /// The file at path() was written.
+    void saved();
+
 private:
     enum Page { TreePage, TextPage };
 
+    void connectParts();
     QWidget* makeTreePage();
     QPushButton* makeButton(QString const& text, QString const& toolTip);
     void showTree(SettingsDocument const& document);
     void showMalformed(SettingsDocument const& document);
+    void keepMine();
+    void saveAs();
+    void noteSaved();
     void updateState();
     void updateButtons();
     void editLongValueSoon();
@@ -96,7 +110,9 @@ private:
     SettingsSaver m_saver;
     SettingsModel m_model;
     SettingsCommands m_commands;
+    QString m_ownerNote;
     NoticeBar* m_notice;
+    FileNotice* m_fileNotice;
     NoticeBar* m_removal; ///< tells what was just removed
     QStackedWidget* m_pages;
     SettingsTree* m_tree;

@@ -82,6 +82,23 @@ bool SettingsSaver::makeBackup()
                QObject::tr("Save Without Backup"));
 }
 
+void SettingsSaver::AcceptFile()
+{
+    m_read = QFileInfo(m_path).lastModified();
+}
+
+bool SettingsSaver::SaveAs(QString const& path, SettingsDocument const& document)
+{
+    SettingsSaver other = *this;
+    other.m_path = path;
+    other.m_hasBackup = false;
+    other.AcceptFile(); // the file dialog has asked
+    if (!other.Save(document))
+        return false;
+    *this = other;
+    return true;
+}
+
 bool SettingsSaver::Save(SettingsDocument const& document)
 {
     if (!confirmOverwrite() || !confirmLosses(document) || !makeBackup())
@@ -93,7 +110,7 @@ bool SettingsSaver::Save(SettingsDocument const& document)
             .exec();
         return false;
     }
-    m_read = QFileInfo(m_path).lastModified();
+    AcceptFile();
     m_fileLosses.clear();
     m_fileLossCount = 0;
     return true;

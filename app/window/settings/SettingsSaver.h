@@ -23,6 +23,14 @@ public:
     /// @param document  what reading it resulted in
     void NoteRead(QString const& path, SettingsDocument const& document);
 
+    /// Overwrites what is in the file by now without asking.
+    void AcceptFile();
+
+    /// Saves a document to another file, which is the file from then on.
+    ///
+    /// @return as Save(), and false leaves the former file as it is
+    bool SaveAs(QString const& path, SettingsDocument const& document);
+
     /// Saves a document to the file. Copies the file to ".bak" before the first save.
     ///
     /// @return false if the user cancels, or saving failed, which the user was told

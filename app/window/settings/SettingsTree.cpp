@@ -37,7 +37,14 @@ SettingsTree::SettingsTree(SettingsModel* model, SettingsCommands* commands, QWi
             &SettingsTree::longValueRequested);
     connect(model, &SettingsModel::applied, this,
             [this](QModelIndex const& index) { m_changed = index; });
+    connect(model, &SettingsModel::rowsInserted, this, &SettingsTree::expandNew);
     makeActions();
+}
+
+void SettingsTree::expandNew(QModelIndex const& parent, int first, int last)
+{
+    for (int row = first; row <= last && !parent.isValid(); ++row)
+        expand(m_model->index(row, SettingsModel::NameColumn));
 }
 
 QVector<SettingsCommand> SettingsTree::AllCommands()
@@ -130,7 +137,7 @@ void SettingsTree::ShowAll()
     resizeColumnToContents(SettingsModel::NameColumn);
     setColumnWidth(SettingsModel::NameColumn,
                    qBound(160, columnWidth(SettingsModel::NameColumn) + 24, 360));
-    setCurrentIndex(m_model->IndexOf({0, -1}));
+    GoTo(m_model->IndexOf({0, -1}));
     updateActions();
 }
 
@@ -139,7 +146,9 @@ void SettingsTree::GoTo(QModelIndex const& index)
     if (!index.isValid())
         return;
     expand(index.parent());
-    setCurrentIndex(index);
+    // setCurrentIndex() would add to the selection while Ctrl is pressed, as for Ctrl+Z.
+    selectionModel()->setCurrentIndex(index, QItemSelectionModel::ClearAndSelect |
+                                                 QItemSelectionModel::Rows);
     scrollTo(index);
 }
 
@@ -199,9 +208,7 @@ void SettingsTree::EditName()
 void SettingsTree::Duplicate()
 {
     EndEditing();
-    const QModelIndex copy = m_commands->Duplicate(currentIndex());
-    expand(copy);
-    GoTo(copy);
+    GoTo(m_commands->Duplicate(currentIndex()));
 }
 
 void SettingsTree::Remove()

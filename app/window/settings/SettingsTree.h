@@ -98,6 +98,7 @@ protected Q_SLOTS:
 
 private:
     void makeActions();
+    void expandNew(QModelIndex const& parent, int first, int last);
     void updateActions();
     void editCell(QModelIndex const& row, SettingsModel::Column column);
     void editValueBeside(int step);
