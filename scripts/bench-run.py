@@ -151,6 +151,15 @@ SECTIONS = {
             Limit(["..., " + LONGEST_TURN], "velocor", 16e6, quick=True),
         ],
     ),
+    "terminal": Section(
+        "Logs in a terminal",
+        [("bench_terminal", "own")],
+        (1, 1),
+        goals=[
+            Goal(["filter by expression in a terminal"], "velocor-log", 1.3, "grep -P"),
+            Goal(["merge logs in a terminal"], "velocor-log", 1.5, "sort -m"),
+        ],
+    ),
     "growth": Section("Cost as work grows", [("bench_growth", "google")], (5, 2)),
 }
 

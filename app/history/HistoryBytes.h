@@ -25,12 +25,13 @@ public:
     ///
     /// @param size  at most 2^30
     /// @return refers to memory of this object: valid until the next call
-    QByteArray At(qint64 start, int size);
+    QByteArray const& At(qint64 start, int size);
 
 private:
     std::shared_ptr<QFile> m_file;
     QByteArray m_bytes;
     qint64 m_start = 0;
+    QByteArray m_part; // always the same object, so that a part takes no memory
 };
 
 } // namespace Velocor

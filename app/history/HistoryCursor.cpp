@@ -91,14 +91,11 @@ bool HistoryCursor::Next()
             continue;
         }
         m_line = line;
-        m_mark = file().rows().mark(m_row);
         ++m_row;
-        m_bytes = m_lines->Bytes(line);
-        m_content = m_lines->Content(line, m_bytes);
-        if (!m_lines->IsSame(line, m_content))
+        if (!m_lines->IsSame(line, m_lines->Content(line)))
             continue;
         if (m_withTimes) {
-            noteTime(line, m_content);
+            noteTime(line, content());
             m_timed = line + 1;
         }
         return true;

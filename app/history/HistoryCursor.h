@@ -37,15 +37,15 @@ public:
     /// The line without its line end, as stored in the file.
     ///
     /// @return valid until the next call of Next()
-    QByteArray const& content() const { return m_content; }
+    QByteArray const& content() const { return m_lines->content(); }
 
     /// The same with its line end, which the last line of a file may lack.
-    QByteArray const& bytes() const { return m_bytes; }
+    QByteArray const& bytes() const { return m_lines->bytes(); }
 
     HistoryRun const& run() const { return m_history->runs()[m_run]; }
     HistoryFile const& file() const { return m_lines->file(); }
     size_t line() const { return m_line; } ///< its number in the file, starting at 0
-    quint8 mark() const { return m_mark; } ///< of its row, see LogRows
+    quint8 mark() const { return file().rows().mark(m_row - 1); } ///< of its row, see LogRows
 
     /// Where the line starts in the file, and the one after it.
     qint64 start() { return m_lines->start(m_line); }
@@ -78,9 +78,6 @@ private:
     HistoryClock m_clock;
 
     size_t m_line = 0;
-    quint8 m_mark = 0;
-    QByteArray m_bytes;
-    QByteArray m_content;
     qint64 m_time = -1;
     qint64 m_key = -1;
 };

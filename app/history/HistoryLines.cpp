@@ -19,22 +19,19 @@ qint64 HistoryLines::start(size_t line)
     return line < m_lines->size() ? m_starts.start(line) : m_file->rows().end();
 }
 
-QByteArray HistoryLines::Bytes(size_t line)
+QByteArray const& HistoryLines::Content(size_t line)
 {
     const qint64 begin = start(line);
-    const qint64 length = start(line + 1) - begin;
-    return m_bytes.At(begin, static_cast<int>(std::min<qint64>(length, LogIndex::LineLimit)));
-}
-
-QByteArray HistoryLines::Content(size_t line, QByteArray const& bytes)
-{
-    const qint64 begin = start(line);
-    const bool isWhole =
-        begin < m_file->rows().complete() && begin + bytes.size() == start(line + 1);
-    const int length = std::max(0, bytes.size() - (isWhole ? m_lineEnd.size() : 0));
+    const qint64 end = start(line + 1);
+    const auto size = static_cast<int>(std::min<qint64>(end - begin, LogIndex::LineLimit));
+    QByteArray const& read = m_bytes.At(begin, size);
+    m_line.setRawData(read.constData(), static_cast<uint>(read.size()));
+    const bool isWhole = begin < m_file->rows().complete() && begin + m_line.size() == end;
+    const int length = std::max(0, m_line.size() - (isWhole ? m_lineEnd.size() : 0));
     LogEncoding const& encoding = m_file->parser().fileType().encoding;
-    return QByteArray::fromRawData(bytes.constData(),
-                                   encoding.WithoutReturn(bytes.constData(), length));
+    m_content.setRawData(m_line.constData(),
+                         static_cast<uint>(encoding.WithoutReturn(m_line.constData(), length)));
+    return m_content;
 }
 
 bool HistoryLines::IsSame(size_t line, QByteArray const& content) const

@@ -26,17 +26,16 @@ public:
     /// Where a line starts in the file; where the file ended for the line after the last one.
     qint64 start(size_t line);
 
-    /// A line as stored in the file, with its line end, which the last line may lack; at most
-    /// LogIndex::LineLimit bytes.
+    /// A line without its line end, as stored in the file; at most LogIndex::LineLimit bytes.
     ///
     /// @return refers to memory of this object: valid until the next call
-    QByteArray Bytes(size_t line);
+    QByteArray const& Content(size_t line);
 
-    /// A line without its line end.
-    ///
-    /// @param bytes  from Bytes(), whose memory the result refers to
-    QByteArray Content(size_t line, QByteArray const& bytes);
-    QByteArray Content(size_t line) { return Content(line, Bytes(line)); }
+    /// The last Content().
+    QByteArray const& content() const { return m_content; }
+
+    /// The same with its line end, which the last line may lack.
+    QByteArray const& bytes() const { return m_line; }
 
     /// Whether a line is the one that was indexed, so that the log has not overwritten it since.
     bool IsSame(size_t line, QByteArray const& content) const;
@@ -51,6 +50,8 @@ private:
     LineTable const* m_lines;
     LineTable::Reader m_starts;
     HistoryBytes m_bytes;
+    QByteArray m_line; // always the same objects, so that a line takes no memory
+    QByteArray m_content;
     LogLineEnd m_lineEnd;
     LogLineParser::Beginnings m_beginnings;
 };

@@ -30,7 +30,7 @@ public:
     /// Reads a log with its numbered files.
     ///
     /// If the log rotates while the files are opened, they are opened again, so that no line is
-    /// missing or read twice.
+    /// missing. For a moment, though, a log that rotates has its newest file twice.
     ///
     /// @param path  the current file, which need not exist if there are numbered ones
     /// @return false if a file cannot be read; the others have been

@@ -25,6 +25,8 @@ public:
             m_width = std::max(m_width, name.size());
     }
 
+    bool isShown() const { return m_isShown; }
+
     QString text(QString const& program) const
     {
         return m_isShown ? TextFormats::Harmless(program).leftJustified(m_width) + Blank + Blank
@@ -47,7 +49,8 @@ public:
 
     void Write(PrintedLine const& line) override
     {
-        m_output->Write(m_programs.text(line.program).toLocal8Bit());
+        if (m_programs.isShown())
+            m_output->Write(m_programs.text(line.program).toLocal8Bit());
         if (line.parser.fileType().encoding.isWide()) {
             m_output->Write(line.parser.Text(line.content).toUtf8() + '\n');
             return;

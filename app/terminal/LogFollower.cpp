@@ -28,7 +28,7 @@ LogFollower::LogFollower(QString program, QString path, Print print, std::functi
     : m_program(std::move(program)), m_path(std::move(path)), m_print(std::move(print)),
       m_flush(std::move(flush))
 {
-    QObject::connect(&m_scanner, &LogScanner::updated,
+    QObject::connect(&m_scanner, &LogScanner::updated, &m_scanner,
                      [this](LogUpdate const& update) { take(update); });
 }
 

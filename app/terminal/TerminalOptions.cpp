@@ -74,12 +74,12 @@ public:
 
 private:
     void add(char const* name, QString const& description, char const* value = nullptr);
-    void read(TerminalOptions& options);
-    void readFilter(TerminalOptions& options);
-    void checkCombination(TerminalOptions& options, bool selectsLines);
-    void readContext(TerminalOptions& options);
-    void readFormat(TerminalOptions& options);
-    bool readTime(char const* name, qint64& time, QString& error);
+    void read(TerminalOptions& options) const;
+    void readFilter(TerminalOptions& options) const;
+    void checkCombination(TerminalOptions& options, bool selectsLines) const;
+    void readContext(TerminalOptions& options) const;
+    void readFormat(TerminalOptions& options) const;
+    bool readTime(char const* name, qint64& time, QString& error) const;
     bool isSet(char const* name) const { return m_parser.isSet(Name(name)); }
     QString value(char const* name) const { return m_parser.value(Name(name)); }
 
@@ -135,7 +135,7 @@ TerminalOptions Parser::parse(QStringList const& arguments)
     return options;
 }
 
-void Parser::read(TerminalOptions& options)
+void Parser::read(TerminalOptions& options) const
 {
     options.names = m_parser.positionalArguments();
     options.isMerged = isSet("merge");
@@ -157,7 +157,7 @@ void Parser::read(TerminalOptions& options)
     checkCombination(options, selectsLines);
 }
 
-void Parser::checkCombination(TerminalOptions& options, bool selectsLines)
+void Parser::checkCombination(TerminalOptions& options, bool selectsLines) const
 {
     if (options.follows && (isSet("runs") || options.showsPatterns))
         options.error = QObject::tr("--follow prints lines, so there is no end of a table.");
@@ -171,7 +171,7 @@ void Parser::checkCombination(TerminalOptions& options, bool selectsLines)
         options.error = QObject::tr("--runs lists whole runs, so no lines can be selected.");
 }
 
-void Parser::readFilter(TerminalOptions& options)
+void Parser::readFilter(TerminalOptions& options) const
 {
     LogFilter& filter = options.filter;
     if (isSet("severity") && !SeverityList().Read(value("severity"), filter))
@@ -190,7 +190,7 @@ void Parser::readFilter(TerminalOptions& options)
     filter.SetTerms(LogTerms(), LogTerms(excluded.join(QLatin1Char(' ')), true));
 }
 
-void Parser::readContext(TerminalOptions& options)
+void Parser::readContext(TerminalOptions& options) const
 {
     if (!isSet("context"))
         return;
@@ -202,7 +202,7 @@ void Parser::readContext(TerminalOptions& options)
         options.filter.SetContext(lines);
 }
 
-void Parser::readFormat(TerminalOptions& options)
+void Parser::readFormat(TerminalOptions& options) const
 {
     static const QStringList names = {Name("text"), Name("markdown"), Name("csv"), Name("json")};
     if (!isSet("format"))
@@ -215,7 +215,7 @@ void Parser::readFormat(TerminalOptions& options)
 }
 
 // Returns false if the value of an option is no time.
-bool Parser::readTime(char const* name, qint64& time, QString& error)
+bool Parser::readTime(char const* name, qint64& time, QString& error) const
 {
     if (!isSet(name))
         return true;

@@ -52,6 +52,7 @@ private slots:
     void refused();
     void withoutCurrentFile();
     void overwrittenMeanwhile();
+    void rotatedMeanwhile();
     void dates_data();
     void dates();
     void filter();
@@ -153,6 +154,22 @@ void tst_LogHistory::overwrittenMeanwhile()
     QVERIFY(history.ReadLog(log));
     QVERIFY(TestFiles::writeOver(log, "a new run\nnd\nthird\n"));
     QCOMPARE(Lines(history), QByteArray("third\n"));
+}
+
+// What has been opened is read, whatever its name is by then.
+void tst_LogHistory::rotatedMeanwhile()
+{
+    const QString log = m_folder.filePath("moved.log");
+    QVERIFY(TestFiles::write(log, "old\n"));
+    HistoryFile file;
+    QVERIFY(file.Open(log));
+    QVERIFY(file.IsInPlace());
+    QVERIFY(QFile::rename(log, log + ".1"));
+    QVERIFY(!file.IsInPlace());
+    QVERIFY(TestFiles::write(log, "the next run\nof two lines\n"));
+    QVERIFY(!file.IsInPlace());
+    QVERIFY(file.Read(LogLineParser(), LogFilter()));
+    QCOMPARE(file.rows().lines().size(), size_t(1));
 }
 
 void tst_LogHistory::dates_data()
