@@ -24,8 +24,8 @@ namespace Velocor {
 
 namespace {
 
-// The maximum length of each name in the title of a dialog, in characters.
-constexpr int MaximumNameLength = 200;
+// The maximum length of each name in the heading of a dialog, in characters.
+constexpr int MaximumTitlePartLength = 200;
 
 } // namespace
 
@@ -229,8 +229,8 @@ void SettingsEditor::editLongValue()
     const SettingsModel::Place place = SettingsModel::PlaceOf(cell);
     SettingsDocument::Section const& section = m_model.document().sections.at(place.section);
     const QString name =
-        tr("%1 / %2").arg(Shortened(section.name, MaximumNameLength),
-                          Shortened(section.items.at(place.item).key, MaximumNameLength));
+        tr("%1 / %2").arg(Shortened(section.name, MaximumTitlePartLength),
+                          Shortened(section.items.at(place.item).key, MaximumTitlePartLength));
     ValueDialog dialog(name, SettingsModel::FullText(cell), this);
     if (dialog.exec() == QDialog::Accepted && dialog.isModified())
         m_commands.SetText(cell, dialog.value());
