@@ -224,6 +224,10 @@ void TakeEditing(MainWindow& window, Camera const& camera)
     camera.take(window, "settings-editing");
     QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Escape);
     editor->Undo();
+    QTest::keyClick(tree, Qt::Key_F, Qt::ControlModifier);
+    QTest::keyClicks(ByName<QLineEdit>(editor, "Find in names and values"), "255");
+    camera.take(window, "settings-find");
+    QTest::keyClick(ByName<QLineEdit>(editor, "Find in names and values"), Qt::Key_Escape);
 }
 
 void TakeAll(QString const& folder, QString const& suffix)

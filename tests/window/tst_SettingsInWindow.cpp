@@ -68,6 +68,9 @@ private slots:
     void keys();
     void commandsGoToOneRow();
     void typingFinds();
+    void finds_data();
+    void finds();
+    void findBarByKeyboard();
     void commandsAreInTheMenus();
     void copiesTheValue();
 };
@@ -763,6 +766,75 @@ void tst_SettingsInWindow::typingFinds()
     QCOMPARE(Bytes(shown.editor), before);
 }
 
+void tst_SettingsInWindow::finds_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QString>("keys"); // n: next, p: previous
+    QTest::addColumn<QString>("current");
+    QTest::addColumn<QString>("result");
+
+    const auto row = [](char const* name, char const* text, char const* keys, char const* current,
+                        char const* result) {
+        QTest::newRow(name) << text << keys << current << result;
+    };
+    row("a value", "3", "", "C/z value", "");
+    row("a name in another case", "Y", "", "A/y name", "");
+    row("a section", "b", "", "B name", "");
+    row("where it is already", "a", "", "A name", "");
+    row("the only match again", "z", "nn", "C/z name", "");
+    row("around the end", "a", "n", "A name", "");
+    row("from name to value", "1", "", "A/x value", "");
+    row("the previous one, around the start", "c", "p", "C name", "");
+    row("nowhere", "none", "", "A name", "No match");
+    row("nowhere, asked again", "none", "np", "A name", "No match");
+}
+
+void tst_SettingsInWindow::finds()
+{
+    QFETCH(QString, text);
+    QFETCH(QString, keys);
+    QFETCH(QString, current);
+    QFETCH(QString, result);
+    const ShownSettings shown(Several);
+    const QByteArray before = Bytes(shown.editor);
+    shown.tree->setFocus();
+    QTest::keyClick(shown.tree, Qt::Key_F, Qt::ControlModifier);
+    auto* field = Child<QLineEdit>(shown.editor, "Find in names and values");
+    QVERIFY(field->isVisible() && field->hasFocus());
+    QTest::keyClicks(field, text);
+    for (QChar key : keys)
+        QTest::keyClick(field, Qt::Key_F3, key == 'p' ? Qt::ShiftModifier : Qt::NoModifier);
+    QCOMPARE(CurrentCell(shown.tree), current);
+    QCOMPARE(Child<QLabel>(shown.editor, "Result of the search")->text(), result);
+    QCOMPARE(Bytes(shown.editor), before);
+}
+
+// Both ways through all matches, from the bar and from the tree.
+void tst_SettingsInWindow::findBarByKeyboard()
+{
+    const ShownSettings shown(QByteArray(Several).replace(">3<", ">x1<"));
+    QTreeView* tree = shown.tree;
+    tree->setFocus();
+    QTest::keyClick(tree, Qt::Key_F3); // nothing to find yet
+    auto* field = Child<QLineEdit>(shown.editor, "Find in names and values");
+    QVERIFY(field->hasFocus());
+    QTest::keyClicks(field, "x");
+    QCOMPARE(CurrentCell(tree), QString("A/x name"));
+    QTest::keyClick(field, Qt::Key_Return);
+    QCOMPARE(CurrentCell(tree), QString("C/z value"));
+    QTest::keyClick(field, Qt::Key_Return, Qt::ShiftModifier);
+    QCOMPARE(CurrentCell(tree), QString("A/x name"));
+    QTest::keyClick(field, Qt::Key_Escape);
+    QVERIFY(!field->isVisible() && tree->hasFocus());
+    QTest::keyClick(tree, Qt::Key_F3);
+    QCOMPARE(CurrentCell(tree), QString("C/z value"));
+    QTest::keyClick(tree, Qt::Key_F3);
+    QCOMPARE(CurrentCell(tree), QString("A/x name"));
+    QTest::keyClick(tree, Qt::Key_F3, Qt::ShiftModifier);
+    QCOMPARE(CurrentCell(tree), QString("C/z value"));
+    QVERIFY(!field->isVisible());
+}
+
 // The same commands in the window's menu and in the context menu, each with its key.
 void tst_SettingsInWindow::commandsAreInTheMenus()
 {
@@ -778,7 +850,8 @@ void tst_SettingsInWindow::commandsAreInTheMenus()
     }
     QCOMPARE(entries, QStringList({"Edit Value\tF2", "Rename\tShift+F2", "Add Key\tIns",
                                    "Add Section\tAlt+Ins", "Duplicate\tCtrl+D", "Remove\tDel",
-                                   "Move Up\tAlt+Up", "Move Down\tAlt+Down"}));
+                                   "Move Up\tAlt+Up", "Move Down\tAlt+Down", "Find\tCtrl+F",
+                                   "Find Next\tF3", "Find Previous\tShift+F3"}));
     for (QChar letter : letters)
         QCOMPARE(letters.count(letter), 1);
     QList<QAction*> inContext = shown.tree->actions();

@@ -6,6 +6,7 @@
 #include "app/settingsfile/SettingsFileReader.h"
 #include "app/window/settings/FileNotice.h"
 #include "app/window/settings/MalformedFileView.h"
+#include "app/window/settings/SettingsFindBar.h"
 #include "app/window/settings/SettingsTree.h"
 #include "app/window/settings/ValueDialog.h"
 #include "app/window/widgets/NoticeBar.h"
@@ -23,8 +24,8 @@ namespace Velocor {
 
 namespace {
 
-// The maximum length of each name in the title of a dialog, in characters.
-constexpr int MaximumNameLength = 200;
+// The maximum length of each name in the heading of a dialog, in characters.
+constexpr int MaximumTitlePartLength = 200;
 
 } // namespace
 
@@ -32,7 +33,7 @@ SettingsEditor::SettingsEditor(QWidget* parent)
     : QWidget(parent), m_saver(this), m_commands(&m_model), m_notice(new NoticeBar),
       m_fileNotice(new FileNotice), m_removal(new NoticeBar(tr("Removal"))),
       m_pages(new QStackedWidget), m_tree(new SettingsTree(&m_model, &m_commands)),
-      m_text(new MalformedFileView)
+      m_find(new SettingsFindBar(m_tree)), m_text(new MalformedFileView)
 {
     m_pages->addWidget(makeTreePage());
     m_pages->addWidget(m_text);
@@ -52,6 +53,8 @@ void SettingsEditor::connectParts()
     connect(m_fileNotice, &FileNotice::reloadRequested, this, &SettingsEditor::Reload);
     connect(m_fileNotice, &FileNotice::keepRequested, this, &SettingsEditor::keepMine);
     connect(m_fileNotice, &FileNotice::saveAsRequested, this, &SettingsEditor::saveAs);
+    connect(m_tree, &SettingsTree::findRequested, m_find, &SettingsFindBar::Open);
+    connect(m_tree, &SettingsTree::findNextRequested, m_find, &SettingsFindBar::FindNext);
     connect(m_tree, &SettingsTree::editingChanged, this, &SettingsEditor::updateState);
     connect(m_tree, &SettingsTree::rejected, this, &SettingsEditor::messageReported);
     connect(m_tree, &SettingsTree::longValueRequested, this, &SettingsEditor::editLongValueSoon);
@@ -107,6 +110,7 @@ QWidget* SettingsEditor::makeTreePage()
     auto* layout = new QVBoxLayout(page);
     layout->setContentsMargins(0, 0, 0, 0);
     layout->addWidget(m_tree, 1);
+    layout->addWidget(m_find);
     layout->addLayout(buttons);
     return page;
 }
@@ -225,8 +229,8 @@ void SettingsEditor::editLongValue()
     const SettingsModel::Place place = SettingsModel::PlaceOf(cell);
     SettingsDocument::Section const& section = m_model.document().sections.at(place.section);
     const QString name =
-        tr("%1 / %2").arg(Shortened(section.name, MaximumNameLength),
-                          Shortened(section.items.at(place.item).key, MaximumNameLength));
+        tr("%1 / %2").arg(Shortened(section.name, MaximumTitlePartLength),
+                          Shortened(section.items.at(place.item).key, MaximumTitlePartLength));
     ValueDialog dialog(name, SettingsModel::FullText(cell), this);
     if (dialog.exec() == QDialog::Accepted && dialog.isModified())
         m_commands.SetText(cell, dialog.value());

@@ -18,6 +18,7 @@ namespace Velocor {
 class FileNotice;
 class MalformedFileView;
 class NoticeBar;
+class SettingsFindBar;
 class SettingsTree;
 
 /// Edits a configuration file as a tree of sections, keys and values. Every change can be undone.
@@ -116,6 +117,7 @@ private:
     NoticeBar* m_removal; ///< tells what was just removed
     QStackedWidget* m_pages;
     SettingsTree* m_tree;
+    SettingsFindBar* m_find;
     MalformedFileView* m_text;
     QPushButton* m_addSection = nullptr;
     QPushButton* m_addKey = nullptr;

@@ -122,6 +122,46 @@ QModelIndex SettingsModel::ItemBeside(Place place, int step) const
     return QModelIndex();
 }
 
+// In the order of the tree, around its end.
+SettingsModel::Place SettingsModel::rowBeside(Place place, int step) const
+{
+    auto const& sections = m_document.sections;
+    if (step > 0) {
+        if (place.item + 1 < sections.at(place.section).items.size())
+            return Place{place.section, place.item + 1};
+        return Place{(place.section + 1) % sections.size(), -1};
+    }
+    if (place.item >= 0)
+        return Place{place.section, place.item - 1};
+    const int section = (place.section + sections.size() - 1) % sections.size();
+    return Place{section, sections.at(section).items.size() - 1};
+}
+
+QModelIndex SettingsModel::matchIn(Place place, QString const& text) const
+{
+    SettingsDocument::Section const& section = m_document.sections.at(place.section);
+    QString const& name = place.item < 0 ? section.name : section.items.at(place.item).key;
+    if (name.contains(text, Qt::CaseInsensitive))
+        return IndexOf(place, NameColumn);
+    if (place.item >= 0 && section.items.at(place.item).value.contains(text, Qt::CaseInsensitive))
+        return IndexOf(place, ValueColumn);
+    return QModelIndex();
+}
+
+QModelIndex SettingsModel::Find(QString const& text, Place from, int step, bool withFrom) const
+{
+    if (m_document.sections.isEmpty())
+        return QModelIndex();
+    const Place start = from.section < 0 ? Place{0, -1} : from;
+    Place place = withFrom ? start : rowBeside(start, step);
+    const Place last = withFrom ? rowBeside(start, -step) : start;
+    for (;; place = rowBeside(place, step)) {
+        const QModelIndex match = matchIn(place, text);
+        if (match.isValid() || (place.section == last.section && place.item == last.item))
+            return match;
+    }
+}
+
 SettingsModel::Place SettingsModel::PlaceOf(QModelIndex const& index)
 {
     if (!index.isValid())

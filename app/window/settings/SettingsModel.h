@@ -53,6 +53,14 @@ public:
     /// @param step  1, or -1 for the previous one
     QModelIndex ItemBeside(Place place, int step) const;
 
+    /// The next cell whose text contains another in any letter case, around the end; of a row, the
+    /// first. Invalid if there is none.
+    ///
+    /// @param from  a place of the document, or the first one if it is invalid
+    /// @param step  1, or -1 for the previous one
+    /// @param withFrom  whether to look at that place first instead of last
+    QModelIndex Find(QString const& text, Place from, int step, bool withFrom) const;
+
     static Place PlaceOf(QModelIndex const& index);
     static bool IsSection(QModelIndex const& index);
 
@@ -81,6 +89,8 @@ private:
     SettingsEdit applyText(SettingsEdit const& edit);
     void renumber();
     QString text(QModelIndex const& index) const;
+    Place rowBeside(Place place, int step) const;
+    QModelIndex matchIn(Place place, QString const& text) const;
 
     SettingsDocument m_document;
     /// The row of each section. Indexes of items refer to that of their section, so they hold

@@ -67,6 +67,11 @@ QVector<SettingsCommand> SettingsTree::AllCommands()
         {tr("Move &Up"), keys("Alt+Up"), tr("Move the section or key up"), &SettingsTree::MoveUp},
         {tr("Move &Down"), keys("Alt+Down"), tr("Move the section or key down"),
          &SettingsTree::MoveDown},
+        {tr("&Find"), keys("Ctrl+F"), tr("Find a text in names and values"),
+         &SettingsTree::OpenFind},
+        {tr("Find Ne&xt"), keys("F3"), tr("Go to the next match"), &SettingsTree::FindNext},
+        {tr("Find &Previous"), keys("Shift+F3"), tr("Go to the previous match"),
+         &SettingsTree::FindPrevious},
     };
 }
 
@@ -155,6 +160,29 @@ void SettingsTree::GoTo(QModelIndex const& index)
 void SettingsTree::GoToChanged()
 {
     GoTo(m_changed);
+}
+
+bool SettingsTree::Find(QString const& text, int step, bool fromCurrent)
+{
+    const QModelIndex match =
+        m_model->Find(text, SettingsModel::PlaceOf(currentIndex()), step, fromCurrent);
+    GoTo(match);
+    return match.isValid();
+}
+
+void SettingsTree::OpenFind()
+{
+    Q_EMIT findRequested();
+}
+
+void SettingsTree::FindNext()
+{
+    Q_EMIT findNextRequested(1);
+}
+
+void SettingsTree::FindPrevious()
+{
+    Q_EMIT findNextRequested(-1);
 }
 
 bool SettingsTree::isEditing() const

@@ -55,6 +55,11 @@ public:
     /// Goes to what was changed last.
     void GoToChanged();
 
+    /// Goes to the next cell that contains a text; as SettingsModel::Find().
+    ///
+    /// @return whether there is one
+    bool Find(QString const& text, int step, bool fromCurrent);
+
     bool isEditing() const;
 
     /// Ends the editing of a cell, and takes what was typed.
@@ -70,6 +75,9 @@ public:
     void Remove();
     void MoveUp();
     void MoveDown();
+    void OpenFind();
+    void FindNext();
+    void FindPrevious();
 
     void keyboardSearch(QString const& search) override;
 
@@ -85,6 +93,10 @@ Q_SIGNALS:
     ///
     /// @param reason  for the user
     void rejected(QString const& reason);
+
+    /// The user wants to find a text, or the next match in a direction.
+    void findRequested();
+    void findNextRequested(int step);
 
     /// The current value is to be edited, which is too long for its cell.
     void longValueRequested();
