@@ -43,11 +43,12 @@ GOALS = {"common": 97, "app": 95}  # percent
 # The folders whose sources are changed, and the tests, or their folders, that may notice: each group
 # is built and run only for what the ones before it did not notice.
 PROOFS = "tst_Faults tst_SystemLimits tst_SuddenDeath tst_Load tst_Life"
+PLAIN_LOGS = "tst_PlainLineParser tst_PlainLineTable tst_PlainLogRows tst_PlainLogIndex tst_PlainSearch tst_LogLives"
 ROOMS = {
     "common/config": ("config", "plain", PROOFS),
     "common/log": ("log", "plain", PROOFS),
     "common/xml": ("xml", "config plain", "hostile"),
-    "app/logfile": ("logfile", "window/log", "window"),
+    "app/logfile": ("logfile", PLAIN_LOGS, "window/log window"),
     "app/settingsfile": ("settingsfile", "plain hostile", "window"),
     "app/runninglog": ("runninglog", "window"),
 }
@@ -94,6 +95,7 @@ def configure(build, sanitizer=""):
             f"-DCMAKE_CXX_FLAGS=-w -include {COPY}/scripts/Mutant.h", "-DVELOCOR_PRECOMPILE=ON",
             "-DCMAKE_EXPORT_COMPILE_COMMANDS=ON", f"-DVELOCOR_SANITIZE={sanitizer}",
             f"-DCMAKE_DISABLE_PRECOMPILE_HEADERS={'ON' if sanitizer else 'OFF'}", stdout=subprocess.DEVNULL)
+    run("ninja", "-C", WORK / build, "--quiet", "build.ninja")  # there may be other sources now
 
 
 def find(name):

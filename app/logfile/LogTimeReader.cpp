@@ -18,6 +18,9 @@ namespace {
 
 constexpr int MinuteLength = 60000; // milliseconds
 
+// What AM or PM says. The hours may be those of the whole day nevertheless.
+enum Half { Unknown, Morning, Afternoon };
+
 // Letters of any language: anything above ASCII may be one.
 bool IsWordCharacter(char c)
 {
@@ -245,7 +248,12 @@ qint64 LogTimeReader::keyOf(Values const& values)
 {
     int const* number = values.number;
     qint64 key = DayNumber(number[Year] + number[ShortYear], number[Month], number[Day]);
-    key = key * 24 + number[Hour] + number[HalfDay];
+    int hour = number[Hour];
+    if (number[HalfDay] == Afternoon && hour < 12)
+        hour += 12;
+    else if (number[HalfDay] == Morning && hour == 12)
+        hour = 0;
+    key = key * 24 + hour;
     key = key * 60 + number[Minute];
     return key * MinuteLength + inMinute(values);
 }
@@ -305,11 +313,8 @@ char const* LogTimeReader::readWord(Token const& token, char const* at, char con
         ++at;
     if (at == start)
         return nullptr;
-    if (token.field == HalfDay) {
-        const bool afternoon = *start == 'p' || *start == 'P';
-        const bool twelve = values.number[Hour] == 12;
-        values.number[HalfDay] = afternoon ? (twelve ? 0 : 12) : (twelve ? -12 : 0);
-    }
+    if (token.field == HalfDay)
+        values.number[HalfDay] = *start == 'p' || *start == 'P' ? Afternoon : Morning;
     return at;
 }
 

@@ -64,6 +64,11 @@ void tst_LogTimeReader::length_data()
     QTest::newRow("hours without minutes") << QString("hh") << QByteArray("09 x") << 2 << false;
     QTest::newRow("nothing between two quotes")
         << QString("hh'':mm") << QByteArray("09':30 x") << 6 << true;
+    QTest::newRow("a word of any letters")
+        << QString("hh:mm t") << QByteArray("09:30 azAZ\x80\xFF x") << 12 << true;
+    for (char const c : {'`', '{', '@', '[', '\x7F'})
+        QTest::newRow(qPrintable(QString("no word: %1").arg(uint(c))))
+            << QString("hh:mm t") << (QByteArray("09:30 ") + c + " x") << -1 << false;
     QTest::newRow("unknown month") << QString("MMM d") << QByteArray("Foo 3") << -1 << false;
 }
 
@@ -120,6 +125,13 @@ void tst_LogTimeReader::order_data()
         << QString("h:mm ap") << QByteArray("11:59 am") << QByteArray("12:00 pm");
     QTest::newRow("midnight is before one")
         << QString("h:mm ap") << QByteArray("12:59 am") << QByteArray("1:00 am");
+    QTest::newRow("the half of the day comes first")
+        << QString("ap h:mm") << QByteArray("am 12:59") << QByteArray("am 1:00");
+    QTest::newRow("hours of the whole day, and the half")
+        << QString("yyyy-MM-dd HH:mm AP") << QByteArray("2025-01-01 23:59 PM")
+        << QByteArray("2025-01-02 00:00 AM");
+    QTest::newRow("one digit of milliseconds is half a second")
+        << QString("hh:mm:ss.z") << QByteArray("09:30:00.031") << QByteArray("09:30:00.5");
     QTest::newRow("names of months")
         << QString("yyyy MMM d hh:mm") << QByteArray("2025 Apr 1 00:00")
         << QByteArray("2025 Aug 1 00:00");

@@ -2,15 +2,18 @@
 // SPDX-License-Identifier: MIT
 
 // Compares what is found in a line when the beginning of the stamp before it is known with what is
-// found without: for stamps in all kinds of formats, all of a day, and lines of all kinds. And the
-// severity after a stamp with the first of the names that is there.
+// found without: for stamps in all kinds of formats, all of a day, and lines of all kinds. Stamps
+// in random formats with the moments that Qt wrote in them, and the severity after a stamp with the
+// first of the names that is there.
 
+#include "app/logfile/DayNumber.h"
 #include "app/logfile/LogLineParser.h"
 #include "app/logfile/LogSeverities.h"
 
 #include "Rounds.h"
 
 #include <QDateTime>
+#include <QHash>
 #include <QTranslator>
 #include <QtTest>
 
@@ -28,6 +31,7 @@ private slots:
     void everyFormat_data();
     void everyFormat();
     void everyStampOfADay();
+    void randomFormats();
     void lines_data();
     void lines();
     void names_data();
@@ -47,6 +51,12 @@ class Random
 public:
     int below(int limit) { return int(m_random() % unsigned(limit)); }
     bool once(int times) { return below(times) == 0; }
+
+    template <class T, size_t count>
+    T const& oneOf(T const (&values)[count])
+    {
+        return values[below(int(count))];
+    }
 
     // Mostly a little later than the one before.
     QDateTime moment()
@@ -82,6 +92,66 @@ private:
     std::mt19937 m_random{Rounds::seed()};
     qint64 m_time = 1772496000000; // 3 March 2026
 };
+
+// A date format, and what a reader should make of stamps in it.
+struct PlainFormat
+{
+    QString text;
+    QHash<QChar, int> counts; // of its letters
+
+    bool has(char letter) const { return counts.value(QLatin1Char(letter)) > 0; }
+    bool hasDay() const { return has('d') && counts['d'] != 3 && counts['d'] != 4; }
+    bool hasHour() const { return has('h') || has('H'); }
+
+    // One letter for the year is text.
+    bool hasDate() const { return counts.value('y') > 1 && has('M') && hasDay(); }
+
+    int resolution() const { return has('z') ? 1 : has('s') ? 1000 : 60000; }
+
+    qint64 key(QDateTime const& moment) const
+    {
+        if (!hasHour() || !has('m'))
+            return -1;
+        const int letters = counts.value('y');
+        const int year = moment.date().year();
+        const int longYear = letters >= 4 ? year : 0;
+        const int shortYear = letters == 2 || letters == 3 || letters == 6 ? year % 100 : 0;
+        const QTime time = moment.time();
+        const qint64 day = DayNumber(longYear + shortYear, has('M') ? moment.date().month() : 0,
+                                     hasDay() ? moment.date().day() : 0);
+        return day * 86400000 + time.hour() * 3600000 + time.minute() * 60000 +
+               (has('s') ? time.second() * 1000 : 0) + (has('z') ? time.msec() : 0);
+    }
+};
+
+PlainFormat Format(Random& random)
+{
+    static char const* const separators[] = {" ", "-", ".", "''", "':'", "[", "{", "@", "`", "/"};
+    PlainFormat format;
+    QByteArray letters("yMdmsz");
+    letters += "hH"[random.below(2)];
+    const bool isHalved = random.once(3);
+    for (int i = 0; i < 3; ++i)
+        letters.remove(random.once(2) ? letters.size() : random.below(letters.size()), 1);
+    if (isHalved || letters.contains('h')) // without AM or PM, h may be beyond twelve
+        letters += random.once(2) ? 'a' : 'A';
+    if (random.once(8))
+        letters += 't';
+    while (!letters.isEmpty()) {
+        const int at = random.below(letters.size());
+        const char letter = letters.at(at);
+        letters.remove(at, 1);
+        const bool isWord = letter == 'a' || letter == 'A' || letter == 't';
+        const int count = isWord ? 1 : 1 + random.below(6);
+        format.counts[QLatin1Char(letter)] = count;
+        format.text += QString(count, QLatin1Char(letter));
+        if (letter == 'a' || letter == 'A')
+            format.text += QString(random.below(2), QChar(letter + 'p' - 'a'));
+        const bool isNumber = !isWord && letter != 'M' && letter != 'd';
+        format.text += isNumber && random.once(6) ? "'o''clock'" : random.oneOf(separators);
+    }
+    return format;
+}
 
 bool IsSame(LogTimeReader::Stamp const& one, LogTimeReader::Stamp const& other)
 {
@@ -233,6 +303,25 @@ void tst_PlainLineParser::everyStampOfADay()
                           time / 60000 % 60, time / 1000 % 60, time % 1000);
         if (!IsSame(reader.Read(text, length, last), reader.Read(text, length)))
             QFAIL(text);
+    }
+}
+
+void tst_PlainLineParser::randomFormats()
+{
+    Random random;
+    const int count = Rounds::count(10000, 1000000);
+    for (int i = 0; i < count; ++i, ++m_stamps) {
+        const PlainFormat format = Format(random);
+        QDateTime moment = random.moment();
+        moment = moment.addMSecs(111 + 222 * random.below(4) - moment.time().msec());
+        const QByteArray text = moment.toString(format.text).toLatin1();
+        const LogTimeReader reader(format.text);
+        const LogTimeReader::Stamp stamp = reader.Read(text.constData(), text.size());
+        const QString shown = format.text + ": " + QString::fromLatin1(text);
+        QVERIFY2(stamp.length == text.size(), qPrintable(shown));
+        QVERIFY2(stamp.key == format.key(moment), qPrintable(shown));
+        QVERIFY2(reader.hasDate() == format.hasDate(), qPrintable(shown));
+        QVERIFY2(reader.resolution() == format.resolution(), qPrintable(shown));
     }
 }
 

@@ -7,7 +7,7 @@
 
 #include "app/logfile/LogIndex.h"
 #include "app/logfile/LogScanner.h"
-#include "plain/Program.h"
+#include "plain/WrittenLog.h"
 #include "support/TestFiles.h"
 
 #include <QDate>
@@ -332,36 +332,22 @@ bool IsSame(PlainRows const& left, PlainRows const& right)
 }
 
 // A file that a log writes, and what its reader has set.
-class Written : public Program::Pair
+class Written : public WrittenLog
 {
 protected:
-    // Any moment of 2025, to the millisecond.
-    QByteArray stamp() const
-    {
-        const qint64 day = m_time / 86400000;
-        const int clock = int(m_time % 86400000);
-        const QByteArray text =
-            QString::asprintf(m_isDated ? "%02d:%02d:%02d.%03d" : "%02d-%02d-%02d,%03d",
-                              clock / 3600000, clock / 60000 % 60, clock / 1000 % 60, clock % 1000)
-                .toLatin1();
-        if (!m_isDated)
-            return text;
-        return QDate(2025, 3, 1).addDays(day).toString("yyyy-MM-dd").toLatin1() + ' ' + text;
-    }
-
     QByteArray entry()
     {
         static qint64 const steps[] = {1000, 0, 7, 60000, 3600000, 46800000};
         static char const* const elapsed[] = {"", "", "", "dT:[12] ", "dT:[-5]", "dT:[x] "};
-        m_time += steps[m_draws->below(m_isDated ? 6 : 5)]; // half a day back is midnight
+        const qint64 step = steps[m_draws->below(m_isDated ? 6 : 5)]; // half a day back is midnight
+        const QByteArray text = m_draws->text("abc xX1", m_draws->once(4) ? 60 : 8).toLatin1();
+        const QByteArray line = WrittenLog::entry(step, m_draws->oneOf(elapsed) +
+                                                            QByteArray::number(++m_number) + text);
         m_latest = qMax(m_latest, m_time);
         if (!m_hasEntries)
             m_first = m_time;
         m_hasEntries = true;
-        const QString severity = SeverityNames.value(m_draws->below(6)); // the last has no name
-        const QString message = m_draws->text("abc xX1", m_draws->once(4) ? 60 : 8);
-        return stamp() + ' ' + severity.toLatin1() + ' ' + m_draws->oneOf(elapsed) +
-               QByteArray::number(++m_number) + message.toLatin1() + '\n';
+        return line;
     }
 
     QByteArray otherLine()
@@ -370,14 +356,6 @@ protected:
             "it goes on\n",      "\n",      " Error at the start\n", "5 Error not timed\n",
             "no number Error\n", "Error\n", "7 Error\r\n",           "end of "};
         return m_draws->oneOf(lines);
-    }
-
-    // What the log writes next, over what is there.
-    void write(QByteArray const& bytes)
-    {
-        tell("write(#)", bytes);
-        m_file.replace(m_position, bytes.size(), bytes);
-        m_position += bytes.size();
     }
 
     void writeSome() { write(m_draws->once(5) ? otherLine() : entry()); }
@@ -443,14 +421,10 @@ protected:
         return parser;
     }
 
-    QByteArray m_file;
-    int m_position = 0;
-    qint64 m_time = 8 * 3600000; // since the first day
     qint64 m_latest = m_time;
     bool m_hasEntries = false; // of this run
     qint64 m_first = 0;        // the time of the first of them
     bool m_isTurnedBack = false;
-    bool m_isDated = true;
     int m_number = 0;
     bool m_readsTimes = false;
     LogFilter m_filter;

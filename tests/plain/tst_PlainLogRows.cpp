@@ -7,7 +7,7 @@
 
 #include "app/logfile/LogIndex.h"
 #include "app/logfile/LogUpdate.h"
-#include "plain/Program.h"
+#include "plain/WrittenLog.h"
 
 #include <QtTest>
 
@@ -139,7 +139,7 @@ LogUpdate PlainCompare(PlainRows const& before, PlainRows const& after)
 }
 
 // A log that grows, or is written over from its start, and rows of several moments.
-class Rows : public Program::Pair
+class Rows : public WrittenLog
 {
 public:
     void perform(Program::Draws& draws)
@@ -153,7 +153,7 @@ public:
         else if (kind < 27)
             writePart();
         else if (kind == 27)
-            writeMany();
+            writeAroundLimits();
         else if (kind < 30)
             turnBack();
         else if (kind == 30)
@@ -175,14 +175,8 @@ public:
 private:
     QByteArray entry()
     {
-        static char const* const severities[] = {"Trace", "Notification", "Warning",
-                                                 "Error", "Fatal",        ""};
-        m_time += m_draws->below(5000);
-        const QTime time = QTime::fromMSecsSinceStartOfDay(int(m_time % 86400000));
-        QByteArray text =
-            "2025-03-" + QByteArray::number(3 + m_time / 86400000).rightJustified(2, '0');
-        text += ' ' + time.toString("hh:mm:ss.zzz").toLatin1() + ' ';
-        return text + m_draws->oneOf(severities) + ' ' + message() + '\n';
+        const int step = m_draws->below(5000);
+        return WrittenLog::entry(step, message());
     }
 
     QByteArray message()
@@ -205,9 +199,7 @@ private:
         if (!m_draws->once(4))
             bytes.prepend(m_rest);
         m_rest.clear();
-        tell("write(#)", bytes);
-        m_file.replace(m_position, bytes.size(), bytes);
-        m_position += bytes.size();
+        WrittenLog::write(bytes);
     }
 
     // The rest follows later, or never. Until then, the entry may look like another one.
@@ -221,16 +213,14 @@ private:
     }
 
     // Around the limits: of an entry's lines, and of a block.
-    void writeMany()
+    void writeAroundLimits()
     {
         const bool isBlock = m_draws->once(8);
         const int most = isBlock ? int(LineTable::BlockSize) : int(LogIndex::MaximumEntryLines);
         const QByteArray text = m_draws->once(2) ? entry() : otherLine();
         const int count = most - 3 + m_draws->below(6);
         tell("write # times #", count, text);
-        const QByteArray all = text.repeated(text.size() > 300 ? 10 : count);
-        m_file.replace(m_position, all.size(), all);
-        m_position += all.size();
+        writeMany(text, text.size() > 300 ? 10 : count);
     }
 
     // What follows may look like an earlier run, until the log grows.
@@ -242,7 +232,7 @@ private:
 
     void startAgain()
     {
-        m_time += 86400000;
+        m_time += Day;
         m_position = 0;
         tell("a new run");
     }
@@ -334,11 +324,8 @@ private:
         m_before = rows;
     }
 
-    QByteArray m_file;
     QByteArray m_passed;
     QByteArray m_rest; // of an entry
-    int m_position = 0;
-    qint64 m_time = 8 * 3600000; // since the first day
     LogFilter m_filter;
     LogIndex m_index{parser()};
     LogRows m_before;
