@@ -601,9 +601,7 @@ private:
     // What a container has written has no severity but that of the line itself.
     void readContained()
     {
-        const bool isContained = m_messageRank < Last &&
-                                 std::strcmp(FieldNames[m_messageRank].name, ContainerField) == 0;
-        if (isContained && m_line.severity == LogEntry::None)
+        if (m_isContained && m_line.severity == LogEntry::None)
             m_line.severity =
                 ReadWords(m_text + m_line.message.start, m_line.message.length, m_latest).severity;
     }
@@ -613,12 +611,14 @@ private:
         m_line.message = {field.value, field.valueLength};
         m_line.isEscaped = field.isEscaped;
         m_messageRank = rank;
+        m_isContained = std::strcmp(FieldNames[rank].name, ContainerField) == 0;
     }
 
     char const* m_text;
     QDate m_latest;
     ForeignLine m_line;
     bool m_hasTime = false;
+    bool m_isContained = false; // whether the message is what a container has written
     int m_timeRank = Last;
     int m_severityRank = Last;
     int m_messageRank = Last;

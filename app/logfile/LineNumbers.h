@@ -47,10 +47,10 @@ private:
     {
         std::vector<quint32> numbers;
 
-        void reserve() {} // most lists are short
+        static void reserve() {} // most lists are short
         void truncate(size_t count) { numbers.resize(count); }
         void pack() { numbers.shrink_to_fit(); }
-        void unpack() {}
+        static void unpack() {}
     };
 
     GrowingBlocks<Block, BlockSize> m_blocks;

@@ -22,7 +22,7 @@ public:
     SettingsDelegate(SettingsCommands* commands, QObject* parent);
 
     /// The field in which the user is typing; null if there is none.
-    QWidget* field() const { return m_field; }
+    QWidget* field() const { return m_field.data(); }
 
     QSize sizeHint(QStyleOptionViewItem const& option, QModelIndex const& index) const override;
     QWidget* createEditor(QWidget* parent, QStyleOptionViewItem const& option,

@@ -116,8 +116,9 @@ QModelIndex SettingsModel::ItemBeside(Place place, int step) const
         if (item >= 0 && item < count)
             return IndexOf({section, item});
         section += step;
-        const bool isBefore = step < 0 && section >= 0;
-        item = isBefore ? sections.at(section).items.size() - 1 : 0;
+        item = 0;
+        if (step < 0 && section >= 0)
+            item = sections.at(section).items.size() - 1;
     }
     return QModelIndex();
 }
