@@ -18,6 +18,9 @@ class tst_LogLineParser : public QObject
 private slots:
     void parse_data();
     void parse();
+    void startsOfLines_data();
+    void startsOfLines();
+    void resolution();
     void settings_data();
     void settings();
     void anyBytes();
@@ -55,6 +58,14 @@ void tst_LogLineParser::parse_data()
     entry("elapsed time", "Trace dT:[250] x", LogEntry::Trace, "250", "x");
     entry("negative elapsed time", "Trace dT:[-86399999] x", LogEntry::Trace, "-86399999", "x");
     entry("elapsed time alone", "Trace dT:[250] ", LogEntry::Trace, "250", "");
+    entry("elapsed time at the end of a line", "Trace dT:[250]", LogEntry::Trace, "250", "");
+    entry("elapsed time of the greatest length", "Trace dT:[" + QByteArray(476, '1') + "] x",
+          LogEntry::Trace, QString(476, '1'), "x");
+    entry("elapsed time beyond that", "Trace dT:[" + QByteArray(478, '1') + "] x", LogEntry::Trace,
+          "", "dT:[" + QString(478, '1') + "] x");
+    entry("elapsed time that is a minus", "Trace dT:[-] x", LogEntry::Trace, "", "dT:[-] x");
+    entry("elapsed time without brackets", "Trace dT: x", LogEntry::Trace, "", "dT: x");
+    entry("elapsed time cut off", "Trace dT:", LogEntry::Trace, "", "dT:");
     entry("elapsed time without its end", "Trace dT:[250", LogEntry::Trace, "", "dT:[250");
     entry("elapsed time without number", "Trace dT:[] x", LogEntry::Trace, "", "dT:[] x");
     entry("elapsed time that a text follows", "Trace dT:[1]x", LogEntry::Trace, "", "dT:[1]x");
@@ -67,7 +78,18 @@ void tst_LogLineParser::parse_data()
     noEntry("severity name in plain text", "the last Error was this");
     noEntry("severity name as part of a word", stamp + " Traces x");
     noEntry("severity name far to the right", QByteArray(200, '1') + " Error x");
+    noEntry("severity name after the longest stamp", QByteArray(80, '1') + " Error x");
+    noEntry("severity name after a letter", "x Error y");
+    noEntry("elapsed time without a stamp", "dT:[12] x");
     noEntry("stamp alone", stamp);
+
+    const QByteArray longest(79, '1');
+    QTest::newRow("the longest stamp")
+        << QByteArray(longest + " Error x") << true << QString(longest) << LogEntry::Error << ""
+        << "x";
+    QTest::newRow("elapsed time after any stamp")
+        << QByteArray("Mon 3rd Warning dT:[5] x") << true << "Mon 3rd" << LogEntry::Warning << "5"
+        << "x";
 
     QTest::newRow("any stamp with a digit counts")
         << QByteArray("Mon 3rd Warning x") << true << "Mon 3rd" << LogEntry::Warning << ""
@@ -86,6 +108,47 @@ void tst_LogLineParser::parse()
     QTEST(entry.severity, "severity");
     QTEST(entry.elapsed, "elapsed");
     QTEST(entry.message, "message");
+}
+
+void tst_LogLineParser::startsOfLines_data()
+{
+    QTest::addColumn<QByteArray>("line");
+    for (char const* line :
+         {"2025-03-03 09:02:11.031 Trace dT:[-12] x", "2025-03-03 09:02:11.031  x",
+          "2025-03-03 09:02:11.5 Error dT:[12]", "Mon 3rd Warning dT:[5] x", " Fatal x"})
+        QTest::newRow(line) << QByteArray(line);
+}
+
+// What follows the bytes of a line in memory does not matter.
+void tst_LogLineParser::startsOfLines()
+{
+    QFETCH(QByteArray, line);
+    const LogLineParser parser;
+    for (int length = 0; length <= line.size(); ++length) {
+        const QByteArray start(line.constData(), length);
+        const LogLineParser::Parts alone = parser.Find(start.constData(), length);
+        const LogLineParser::Parts parts = parser.Find(line.constData(), length);
+        QCOMPARE(parts.isEntry, alone.isEntry);
+        QCOMPARE(parts.timeLength, alone.timeLength);
+        QCOMPARE(parts.timeKey, alone.timeKey);
+        QCOMPARE(parts.severity, alone.severity);
+        QCOMPARE(parts.elapsed, alone.elapsed);
+        QCOMPARE(parts.elapsedLength, alone.elapsedLength);
+        QCOMPARE(parts.message, alone.message);
+        QVERIFY(parts.message <= length);
+    }
+}
+
+// That of the format that the stamp has.
+void tst_LogLineParser::resolution()
+{
+    const LogLineParser parser({"hh:mm", "hh:mm:ss"}, {});
+    const auto resolutionOf = [&](QByteArray const& line) {
+        return parser.Find(line.constData(), line.size()).resolution;
+    };
+    QCOMPARE(resolutionOf("09:02 Trace x"), 60000);
+    QCOMPARE(resolutionOf("09:02:11 Trace x"), 1000);
+    QCOMPARE(resolutionOf("2025-03-03 09:02:11.031 Trace x"), 1);
 }
 
 void tst_LogLineParser::settings_data()

@@ -260,6 +260,8 @@ void tst_PlainLineParser::everyFormat_data()
                                "hh:mm s.z s",
                                "hh:mm s.z z",
                                "hh:mm z.z",
+                               "hh:mm z 'ms'",
+                               "hh:mm s.z 'ms'",
                                "yyyyyy-MM-dd hh:mm:ss",
                                "'a very long text before it' hh:mm:ss",
                                "dd hh:mm",
