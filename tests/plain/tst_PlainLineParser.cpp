@@ -262,6 +262,8 @@ void tst_PlainLineParser::everyFormat_data()
                                "hh:mm z.z",
                                "hhmmsszzzs",
                                "hhssmm",
+                               "ss:hh:mm",
+                               "z hh:mm",
                                "h:m",
                                "hh:mm z 'ms'",
                                "hh:mm s.z 'ms'",
