@@ -39,6 +39,8 @@ private slots:
     void detect();
     void decode_data();
     void decode();
+    void narrowUtf8_data();
+    void narrowUtf8();
     void secondMark();
     void validUtf8();
     void lineEnds_data();
@@ -123,6 +125,30 @@ void tst_LogEncoding::decode()
     encoding.Narrow(line, length, buffer);
     QCOMPARE(encoding.narrowed().Decode(line, length), text);
     QVERIFY(encoding.kind() == LogEncoding::Latin1 || !QByteArray(line, length).contains('\0'));
+}
+
+// The bytes of a line in UTF-8 are those of the file, but for the mark.
+void tst_LogEncoding::narrowUtf8_data()
+{
+    QTest::addColumn<QByteArray>("bytes");
+    QTest::addColumn<int>("length");
+    QTest::newRow("mark and text") << QByteArray("\xEF\xBB\xBFxy") << 2;
+    QTest::newRow("mark alone") << QByteArray("\xEF\xBB\xBF") << 0;
+    QTest::newRow("part of a mark") << QByteArray("\xEF\xBB") << 2;
+    QTest::newRow("greater than a mark") << QByteArray("\xEF\xBC\xBF") << 3;
+    QTest::newRow("another character that begins alike") << QByteArray("\xEF\xBB\xBE") << 3;
+    QTest::newRow("less than a mark") << QByteArray("abc") << 3;
+}
+
+void tst_LogEncoding::narrowUtf8()
+{
+    QFETCH(QByteArray, bytes);
+    QByteArray buffer;
+    char const* line = bytes.constData();
+    int length = bytes.size();
+    LogEncoding(LogEncoding::Utf8).Narrow(line, length, buffer);
+    QTEST(length, "length");
+    QCOMPARE(QByteArray(line, length), bytes.right(length));
 }
 
 // Only the first one is no text.

@@ -84,6 +84,8 @@ void tst_LogFilter::text()
     LogFilter filter;
     QVERIFY(filter.SetText(text, isExpression, caseSensitive));
     QTEST(filter.Matches(line), "matches");
+    QTEST(filter.FindQuickly(line) == LogFilter::Yes, "matches");
+    QVERIFY(filter.FindQuickly(line) != LogFilter::TooLong);
     QTEST(filter.Ranges(line).size(), "rangeCount");
 }
 

@@ -109,6 +109,8 @@ private slots:
     void passesOverAWritingRun();
     void growthAtTheEndMakesOneRun();
     void readsOnlyWhatIsNew();
+    void readsSomeLinesAgain_data();
+    void readsSomeLinesAgain();
     void incompleteLastLine();
     void checks();
     void incompleteEntryCountsOnce();
@@ -573,6 +575,8 @@ void tst_LogIndex::counts_data()
     row("an entry without a line end", error + error.trimmed(), "0 0 0 2 0 0");
     row("earlier runs, and a torn line",
         error + "n entry\n" + entry("06:00:00.000", "Fatal", "b") + "more\n", "0 0 0 1 1 1");
+    row("a torn line that looks like an entry",
+        error + "5 Warning\n" + entry("06:00:00.000", "Fatal", "b"), "0 0 0 1 1 1");
 }
 
 void tst_LogIndex::counts()
@@ -663,6 +667,29 @@ void tst_LogIndex::readsOnlyWhatIsNew()
     QVERIFY(!second.Feed(rest.constData(), rest.size()));
     second.End();
     QCOMPARE(Texts(second, overwritten), TextsOf(overwritten));
+}
+
+// Lines after the last entry are read again in each pass, unless they are many.
+void tst_LogIndex::readsSomeLinesAgain_data()
+{
+    QTest::addColumn<int>("lines");
+    QTest::addColumn<bool>("isReadAgain");
+    QTest::newRow("one") << 1 << true;
+    QTest::newRow("as many as are read again") << 1000 << true;
+    QTest::newRow("one more") << 1001 << false;
+}
+
+void tst_LogIndex::readsSomeLinesAgain()
+{
+    QFETCH(int, lines);
+    QFETCH(bool, isReadAgain);
+    const QByteArray first = entry("09:00:00.000", "Trace", "a");
+    const QByteArray file = first + QByteArray("it goes on\n").repeated(lines);
+    LogIndex index;
+    Pass(index, file, 4096);
+    const qint64 offset = isReadAgain ? first.size() : file.size();
+    QCOMPARE(index.resumeOffset(), offset);
+    QCOMPARE(index.Begin(), offset);
 }
 
 // They cover what a line has in the file, and the last line as far as it was written.

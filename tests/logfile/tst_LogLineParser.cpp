@@ -3,6 +3,8 @@
 
 #include "app/logfile/LogLineParser.h"
 
+#include "app/logfile/ForeignLine.h"
+
 #include <QtTest>
 
 #include <random>
@@ -18,6 +20,12 @@ class tst_LogLineParser : public QObject
 private slots:
     void parse_data();
     void parse();
+    void startsOfLines_data();
+    void startsOfLines();
+    void resolution();
+    void foreignFile_data();
+    void foreignFile();
+    void wideLine();
     void settings_data();
     void settings();
     void anyBytes();
@@ -55,6 +63,17 @@ void tst_LogLineParser::parse_data()
     entry("elapsed time", "Trace dT:[250] x", LogEntry::Trace, "250", "x");
     entry("negative elapsed time", "Trace dT:[-86399999] x", LogEntry::Trace, "-86399999", "x");
     entry("elapsed time alone", "Trace dT:[250] ", LogEntry::Trace, "250", "");
+    entry("elapsed time at the end of a line", "Trace dT:[250]", LogEntry::Trace, "250", "");
+    entry("elapsed time of the greatest length", "Trace dT:[" + QByteArray(476, '1') + "] x",
+          LogEntry::Trace, QString(476, '1'), "x");
+    entry("elapsed time beyond that", "Trace dT:[" + QByteArray(478, '1') + "] x", LogEntry::Trace,
+          "", "dT:[" + QString(478, '1') + "] x");
+    entry("elapsed time that is a minus", "Trace dT:[-] x", LogEntry::Trace, "", "dT:[-] x");
+    entry("elapsed time without brackets", "Trace dT: x", LogEntry::Trace, "", "dT: x");
+    entry("elapsed time without its start", "Trace dT:x12] x", LogEntry::Trace, "", "dT:x12] x");
+    entry("elapsed time with another prefix", "Trace dt:[12] x", LogEntry::Trace, "", "dt:[12] x");
+    entry("neither a name nor a message", " ", LogEntry::None, "", "");
+    entry("elapsed time cut off", "Trace dT:", LogEntry::Trace, "", "dT:");
     entry("elapsed time without its end", "Trace dT:[250", LogEntry::Trace, "", "dT:[250");
     entry("elapsed time without number", "Trace dT:[] x", LogEntry::Trace, "", "dT:[] x");
     entry("elapsed time that a text follows", "Trace dT:[1]x", LogEntry::Trace, "", "dT:[1]x");
@@ -67,8 +86,20 @@ void tst_LogLineParser::parse_data()
     noEntry("severity name in plain text", "the last Error was this");
     noEntry("severity name as part of a word", stamp + " Traces x");
     noEntry("severity name far to the right", QByteArray(200, '1') + " Error x");
+    noEntry("severity name after the longest stamp", QByteArray(80, '1') + " Error x");
+    noEntry("severity name after a letter", "x Error y");
+    noEntry("elapsed time without a stamp", "dT:[12] x");
+    noEntry("severity name right after a stamp", stamp + "-Trace x");
     noEntry("stamp alone", stamp);
     noEntry("what make writes", "make: *** [Makefile:12: all] Error 1");
+
+    const QByteArray longest(79, '1');
+    QTest::newRow("the longest stamp")
+        << QByteArray(longest + " Error x") << true << QString(longest) << LogEntry::Error << ""
+        << "x";
+    QTest::newRow("elapsed time after any stamp")
+        << QByteArray("Mon 3rd Warning dT:[5] x") << true << "Mon 3rd" << LogEntry::Warning << "5"
+        << "x";
 
     QTest::newRow("any stamp with a digit counts")
         << QByteArray("Mon 3rd Warning x") << true << "Mon 3rd" << LogEntry::Warning << ""
@@ -87,6 +118,96 @@ void tst_LogLineParser::parse()
     QTEST(entry.severity, "severity");
     QTEST(entry.elapsed, "elapsed");
     QTEST(entry.message, "message");
+}
+
+void tst_LogLineParser::startsOfLines_data()
+{
+    QTest::addColumn<QByteArray>("line");
+    for (char const* line :
+         {"2025-03-03 09:02:11.031 Trace dT:[-12] x", "2025-03-03 09:02:11.031  x",
+          "2025-03-03 09:02:11.5 Error dT:[12]", "Mon 3rd Warning dT:[5] x", " Fatal x"})
+        QTest::newRow(line) << QByteArray(line);
+}
+
+// What follows the bytes of a line in memory does not matter.
+void tst_LogLineParser::startsOfLines()
+{
+    QFETCH(QByteArray, line);
+    const LogLineParser parser;
+    for (int length = 0; length <= line.size(); ++length) {
+        const QByteArray start(line.constData(), length);
+        const LogLineParser::Parts alone = parser.Find(start.constData(), length);
+        const LogLineParser::Parts parts = parser.Find(line.constData(), length);
+        QCOMPARE(parts.isEntry, alone.isEntry);
+        QCOMPARE(parts.timeLength, alone.timeLength);
+        QCOMPARE(parts.timeKey, alone.timeKey);
+        QCOMPARE(parts.severity, alone.severity);
+        QCOMPARE(parts.elapsed, alone.elapsed);
+        QCOMPARE(parts.elapsedLength, alone.elapsedLength);
+        QCOMPARE(parts.message, alone.message);
+        QVERIFY(parts.message <= length);
+    }
+}
+
+// That of the format that the stamp has.
+void tst_LogLineParser::resolution()
+{
+    const LogLineParser parser({"hh:mm", "hh:mm:ss"}, {});
+    const auto resolutionOf = [&](QByteArray const& line) {
+        return parser.Find(line.constData(), line.size()).resolution;
+    };
+    QCOMPARE(resolutionOf("09:02 Trace x"), 60000);
+    QCOMPARE(resolutionOf("09:02:11 Trace x"), 1000);
+    QCOMPARE(resolutionOf("2025-03-03 09:02:11.031 Trace x"), 1);
+}
+
+void tst_LogLineParser::foreignFile_data()
+{
+    QTest::addColumn<QByteArray>("line");
+    QTest::addColumn<bool>("isForeign");
+    QTest::newRow("date and time") << QByteArray("2026-03-03T09:02:11Z ERROR x") << true;
+    QTest::newRow("time alone") << QByteArray("[09:02:11] ERROR x") << true;
+    QTest::newRow("milliseconds") << QByteArray("2026-03-03 09:02:11,031 WARN x") << true;
+    QTest::newRow("as the log writes it in an unknown format")
+        << QByteArray("Mon 3rd Notification x") << false;
+}
+
+// Lines that are not another program's may be the log's own.
+void tst_LogLineParser::foreignFile()
+{
+    QFETCH(QByteArray, line);
+    QFETCH(bool, isForeign);
+    LogFileType type;
+    type.isForeign = true;
+    type.latest = QDate(2026, 3, 3);
+    LogLineParser parser;
+    parser.SetFileType(type);
+    const LogLineParser::Parts parts = parser.Find(line.constData(), line.size());
+    const LogLineParser::Parts own = parser.FindOwn(line.constData(), line.size());
+    const ForeignLine foreign = ForeignLine::Read(line.constData(), line.size(), type.latest);
+    QCOMPARE(foreign.isEntry, isForeign);
+    QVERIFY(parts.isEntry);
+    QCOMPARE(parts.severity, isForeign ? foreign.severity : own.severity);
+    QCOMPARE(parts.timeLength, isForeign ? foreign.time.length : own.timeLength);
+    QCOMPARE(parts.timeKey, isForeign ? foreign.timeKey : own.timeKey);
+    QCOMPARE(parts.hasDate, isForeign ? foreign.hasDate : own.hasDate);
+    QCOMPARE(parts.resolution, isForeign ? foreign.resolution : own.resolution);
+    QCOMPARE(parts.message, isForeign ? foreign.message.start : own.message);
+}
+
+void tst_LogLineParser::wideLine()
+{
+    LogFileType type;
+    type.encoding = LogEncoding::Utf16Be;
+    LogLineParser parser;
+    parser.SetFileType(type);
+    QByteArray line;
+    for (char c : QByteArray("2025-03-03 09:02:11.031 Error \xE9"))
+        line += '\0' + QByteArray(1, c);
+    const LogEntry entry = parser.Parse(line);
+    QCOMPARE(entry.time, QString("2025-03-03 09:02:11.031"));
+    QCOMPARE(entry.severity, LogEntry::Error);
+    QCOMPARE(entry.message, QString(QChar(0xE9)));
 }
 
 void tst_LogLineParser::settings_data()
@@ -117,6 +238,16 @@ void tst_LogLineParser::settings_data()
         << "it took " << QByteArray("09:02 Trace it took [3] x") << "09:02"
         << "3"
         << "x";
+    QTest::newRow("own prefix without a number")
+        << "hh:mm"
+        << "it took " << QByteArray("09:02 Trace it took long") << "09:02"
+        << ""
+        << "it took long";
+    QTest::newRow("own prefix at the start of a line")
+        << "hh:mm"
+        << "x Error " << QByteArray("x Error [3] y") << ""
+        << ""
+        << "x Error [3] y";
     QTest::newRow("empty settings")
         << ""
         << "" << QByteArray("2025-03-03 09:02:11.031 Trace dT:[3] x") << "2025-03-03 09:02:11.031"

@@ -44,6 +44,7 @@ void tst_LogTerms::split_data()
     QTest::newRow("quote within a word") << "a\"b c\"d" << QStringList({"a", "b c", "d"});
     QTest::newRow("doubled quote within quotes")
         << "\"a \"\"b\"\" c\" d" << QStringList({"a \"b\" c", "d"});
+    QTest::newRow("doubled quote at the end") << "\"a\"\"" << QStringList({"a\""});
     QTest::newRow("only a quote") << "\"\"\"\"" << QStringList({"\""});
     QTest::newRow("minus is no sign") << "-5" << QStringList({"-5"});
 }

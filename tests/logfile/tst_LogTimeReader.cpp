@@ -69,6 +69,12 @@ void tst_LogTimeReader::length_data()
     for (char const c : {'`', '{', '@', '[', '\x7F'})
         QTest::newRow(qPrintable(QString("no word: %1").arg(uint(c))))
             << QString("hh:mm t") << (QByteArray("09:30 ") + c + " x") << -1 << false;
+    QTest::newRow("another character between numbers")
+        << byDefault << QByteArray("2025/03-03 09:02:11.031 Trace x") << -1 << false;
+    QTest::newRow("another text") << QString("'at' hh:mm") << QByteArray("as 09:30 x") << -1
+                                  << false;
+    QTest::newRow("a month at the end of a line")
+        << QString("MMM") << QByteArray("May") << 3 << false;
     QTest::newRow("unknown month") << QString("MMM d") << QByteArray("Foo 3") << -1 << false;
 }
 
@@ -130,6 +136,10 @@ void tst_LogTimeReader::order_data()
     QTest::newRow("hours of the whole day, and the half")
         << QString("yyyy-MM-dd HH:mm AP") << QByteArray("2025-01-01 23:59 PM")
         << QByteArray("2025-01-02 00:00 AM");
+    QTest::newRow("half a second is before the next millisecond")
+        << QString("hh:mm:ss.z") << QByteArray("09:30:00.5") << QByteArray("09:30:00.501");
+    QTest::newRow("two digits of milliseconds")
+        << QString("hh:mm:ss.z") << QByteArray("09:30:00.319") << QByteArray("09:30:00.32");
     QTest::newRow("one digit of milliseconds is half a second")
         << QString("hh:mm:ss.z") << QByteArray("09:30:00.031") << QByteArray("09:30:00.5");
     QTest::newRow("names of months")

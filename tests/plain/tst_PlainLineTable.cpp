@@ -148,10 +148,13 @@ private:
             return;
         LineTable::Reader reader(m_table);
         for (int i = 0; i < 10; ++i) {
-            const auto near = size_t(m_draws->below(int(m_plain.size())));
+            static int const units[] = {1, 1, 128, int(LineTable::BlockSize)};
+            const int drawn = m_draws->below(int(m_plain.size()));
+            const auto near = size_t(drawn - drawn % m_draws->oneOf(units));
             const auto line = i < 5 ? near : m_plain.size() - 1 - near % qMin<size_t>(near + 1, 9);
             compareLine(m_table, m_plain, line, reader);
-            const qint64 offset = m_plain[line].start + m_draws->below(300) - 100;
+            const qint64 distance = m_draws->once(3) ? 0 : m_draws->below(300) - 100;
+            const qint64 offset = m_plain[line].start + distance;
             const auto after = std::upper_bound(
                 m_plain.begin(), m_plain.end(), offset,
                 [](qint64 value, PlainLine const& other) { return value < other.start; });
