@@ -55,6 +55,29 @@ int TextMargin(QStyle const* style, QWidget const* widget)
     return style->pixelMetric(QStyle::PM_FocusFrameHMargin, nullptr, widget) + 1;
 }
 
+// Lays out a text in one line, as the style does. False if it does not fit.
+bool LayOutFitting(QTextLayout& layout, QStyleOptionViewItem const& option, int width)
+{
+    QTextOption textOption(QStyle::visualAlignment(option.direction, option.displayAlignment));
+    textOption.setWrapMode(QTextOption::ManualWrap);
+    textOption.setTextDirection(option.direction);
+    layout.setTextOption(textOption);
+    layout.beginLayout();
+    QTextLine line = layout.createLine();
+    if (line.isValid())
+        line.setLineWidth(width);
+    const bool isOneLine = line.isValid() && !layout.createLine().isValid();
+    layout.endLayout();
+    return isOneLine && line.naturalTextWidth() <= width;
+}
+
+QPalette::ColorGroup ColorGroupOf(QStyle::State state)
+{
+    if (!(state & QStyle::State_Enabled))
+        return QPalette::Disabled;
+    return state & QStyle::State_Active ? QPalette::Normal : QPalette::Inactive;
+}
+
 void LayOutLines(QTextLayout& layout, qreal width, int mostLines)
 {
     qreal y = 0;
@@ -200,12 +223,43 @@ void LogDelegate::paintContent(QPainter* painter, QStyleOptionViewItem const& op
     // Not in the severity column, because the filter does not search translated names.
     const bool isMarkable = index.column() != LogModel::SeverityColumn;
     const QVector<QTextLayout::FormatRange> formats =
-        isMarkable ? marks(cell.text, index.data(LogModel::LineRole).toString())
-                   : QVector<QTextLayout::FormatRange>();
+        isMarkable && (m_filter.hasText() || m_found.hasText())
+            ? marks(cell.text, index.data(LogModel::LineRole).toString())
+            : QVector<QTextLayout::FormatRange>();
     if (formats.isEmpty() && (m_mostLines == 1 || !isMessage))
-        StyleOf(cell)->drawControl(QStyle::CE_ItemViewItem, &cell, painter, cell.widget);
+        paintPlain(painter, cell);
     else
         paintMarked(painter, cell, formats, isMessage ? m_mostLines : 1);
+}
+
+// Looks as if the style had drawn it all. But the style shapes a text three times, which costs more
+// than all else about a line that is appended. It still draws what it colors or elides itself.
+void LogDelegate::paintPlain(QPainter* painter, QStyleOptionViewItem const& option)
+{
+    QStyle const* style = StyleOf(option);
+    QStyleOptionViewItem empty = option; // but with its icon
+    empty.text.clear();
+    const QRect cell = style->subElementRect(QStyle::SE_ItemViewItemText, &empty, option.widget);
+    const int margin = TextMargin(style, option.widget);
+    const QRect area = cell.adjusted(margin, 0, -margin, 0);
+    QTextLayout layout(option.text, option.font);
+    const bool isColored = option.state & (QStyle::State_Selected | QStyle::State_HasFocus);
+    // Or a long text would be shaped here in vain.
+    const bool isLong =
+        option.text.size() * option.fontMetrics.averageCharWidth() > 2 * area.width();
+    if (isColored || isLong || !LayOutFitting(layout, option, area.width())) {
+        style->drawControl(QStyle::CE_ItemViewItem, &option, painter, option.widget);
+        return;
+    }
+
+    style->drawControl(QStyle::CE_ItemViewItem, &empty, painter, option.widget);
+    const QRect text = QStyle::alignedRect(Qt::LayoutDirectionAuto, option.displayAlignment,
+                                           layout.boundingRect().size().toSize(), area);
+    painter->save();
+    painter->setClipRect(option.rect);
+    painter->setPen(option.palette.color(ColorGroupOf(option.state), QPalette::Text));
+    layout.draw(painter, QPointF(area.x(), text.top()));
+    painter->restore();
 }
 
 // A bar at the edge of the row, and a folded corner if there is a note.

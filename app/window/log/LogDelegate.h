@@ -49,6 +49,7 @@ private:
                       QModelIndex const& index) const;
     int ruleColor(QModelIndex const& index) const;
     QVector<QTextLayout::FormatRange> marks(QString const& text, QString const& line) const;
+    static void paintPlain(QPainter* painter, QStyleOptionViewItem const& option);
     static void paintMarked(QPainter* painter, QStyleOptionViewItem const& option,
                             QVector<QTextLayout::FormatRange> const& formats, int mostLines);
     static void paintEmpty(QPainter* painter, QStyleOptionViewItem const& option);
