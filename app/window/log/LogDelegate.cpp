@@ -75,7 +75,7 @@ QPalette::ColorGroup ColorGroupOf(QStyle::State state)
 {
     if (!(state & QStyle::State_Enabled))
         return QPalette::Disabled;
-    return state & QStyle::State_Active ? QPalette::Normal : QPalette::Inactive;
+    return (state & QStyle::State_Active) ? QPalette::Normal : QPalette::Inactive;
 }
 
 void LayOutLines(QTextLayout& layout, qreal width, int mostLines)

@@ -31,17 +31,17 @@ public:
     void setModelData(QWidget* editor, QAbstractItemModel* model,
                       QModelIndex const& index) const override;
 
-Q_SIGNALS:
+Q_SIGNALS: // const, as they come from the functions of a delegate, which are
     /// Editing a cell has begun or ended.
-    void editingChanged() const;
+    void editingChanged() const; // clazy:exclude=const-signal-or-slot
 
     /// What was typed is not used.
     ///
     /// @param reason  for the user
-    void rejected(QString const& reason) const;
+    void rejected(QString const& reason) const; // clazy:exclude=const-signal-or-slot
 
     /// A cell is to be edited whose text is too long for that.
-    void longTextRequested() const;
+    void longTextRequested() const; // clazy:exclude=const-signal-or-slot
 
 private:
     QString problemOf(QModelIndex const& index, QString const& text) const;
