@@ -40,7 +40,7 @@ void LogFollower::NotePrinted(HistoryFile const& file)
     m_end = file.runStarts().size() > 1 ? rows.lines().start(file.runStarts()[1]) : rows.complete();
     for (size_t row = rows.earlier(); row < rows.size(); ++row) {
         if (rows.start(row) >= 0 && rows.start(row) < m_end)
-            m_printed.insert(rows.start(row));
+            m_printed[rows.start(row)] = rows.check(row);
     }
     forgetOldLines(rows);
 }
@@ -91,7 +91,11 @@ void LogFollower::take(LogUpdate const& update)
         newestEnd < rows.lines().size() ? rows.lines().start(newestEnd) : rows.complete();
     for (size_t row = firstCandidate(rows); row < rows.size(); ++row) {
         const qint64 start = rows.start(row);
-        if (start < 0 || start >= end || m_printed.count(start) > 0)
+        if (start < 0 || start >= end)
+            continue;
+        // A new file may begin with the line that the one before began with, such as a header.
+        const auto printed = m_printed.find(start);
+        if (printed != m_printed.end() && printed->second == rows.check(row))
             continue;
         const QByteArray content = reader.Line(start);
         if (LogRows::CheckOf(content.constData(), content.size()) != rows.check(row))
@@ -99,7 +103,7 @@ void LogFollower::take(LogUpdate const& update)
         const LogLineEnd lineEnd = update.type.lineEnd();
         const bool hasReturn = reader.nextStart() - start == content.size() + 1 + lineEnd.size();
         print(rows, row, content, (hasReturn ? "\r" : "") + lineEnd.bytes());
-        m_printed.insert(start);
+        m_printed[start] = rows.check(row);
     }
     m_end = end;
     forgetOldLines(rows);

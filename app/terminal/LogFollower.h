@@ -9,7 +9,7 @@
 #include "app/terminal/LineWriter.h"
 
 #include <functional>
-#include <set>
+#include <map>
 
 namespace Velocor {
 
@@ -50,9 +50,9 @@ private:
     LogLineParser m_parser;
 
     bool m_hasLines = false;
-    quint16 m_firstCheck = 0;   // of the first line of the newest run
-    qint64 m_end = 0;           // what is before has been seen
-    std::set<qint64> m_printed; // starts of lines of entries that may still change
+    quint16 m_firstCheck = 0;            // of the first line of the newest run
+    qint64 m_end = 0;                    // what is before has been seen
+    std::map<qint64, quint16> m_printed; // lines of entries that may still change: start, check
     HistoryClock m_clock;
     qint64 m_time = -1;
 };

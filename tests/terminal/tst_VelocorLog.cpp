@@ -53,6 +53,7 @@ private slots:
     void readerThatLeaves();
     void fullDisk();
     void follow();
+    void followedFileWithTheSameHeader();
     void followedEntry();
     void followedRuns();
 
@@ -463,6 +464,18 @@ void tst_VelocorLog::follow()
     follower.process().terminate();
     QVERIFY(follower.process().waitForFinished());
     QCOMPARE(follower.process().readAll(), QByteArray());
+}
+
+// The lines of a new file are not taken for those of the one before, which begins like it.
+void tst_VelocorLog::followedFileWithTheSameHeader()
+{
+    QByteArray const header = "#Fields: h\n";
+    QVERIFY(TestFiles::write("followed.log", header + At + "1 Trace a\n" + At + "2 Trace b\n"));
+    Follower follower({"followed.log"}, m_environment);
+    QCOMPARE(follower.next(3), QByteArray("hab"));
+    QVERIFY(QFile::rename("followed.log", "followed.log.1"));
+    QVERIFY(TestFiles::write("followed.log", header + At + "3 Trace c\n" + At + "4 Trace d\n"));
+    QCOMPARE(follower.next(2), QByteArray("cd"));
 }
 
 // All lines of an entry are printed when one of them matches.
