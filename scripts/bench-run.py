@@ -134,7 +134,7 @@ SECTIONS = {
             ("bench_log_index", "google"),
             ("bench_large_log", "display"),
         ],
-        (5, 2),
+        (3, 2),
         unit="line",
         goals=[
             Limit(LARGE_LOG, "open", 2e9, quick=True),
