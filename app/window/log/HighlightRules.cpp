@@ -16,8 +16,8 @@ namespace Velocor {
 
 namespace {
 
-constexpr int ShownText = 60; // characters of a rule in a message
-constexpr int FieldCount = 4; // before the text
+constexpr int LongestRule = 60; // characters of a rule in a message
+constexpr int FieldCount = 4;   // before the text
 
 QString LineOf(HighlightRule const& rule)
 {
@@ -136,7 +136,7 @@ void HighlightRules::stop(int position)
     const QString text = m_rules.at(m_active.at(position).rule).text;
     m_active.removeAt(position);
     const QString message = tr("The highlight rule \"%1\" takes too long and is not applied")
-                                .arg(Shortened(text, ShownText));
+                                .arg(Shortened(text, LongestRule));
     QTimer::singleShot(0, this, [this, message] {
         Q_EMIT stopped(message);
         Q_EMIT changed();
