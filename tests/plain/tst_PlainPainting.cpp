@@ -8,6 +8,7 @@
 #include "app/window/log/LogView.h"
 #include "app/window/log/TickScrollBar.h"
 #include "app/window/widgets/UniformTable.h"
+#include "plain/NumberedModel.h"
 #include "plain/Program.h"
 #include "support/DemoLog.h"
 #include "support/TestFiles.h"
@@ -177,7 +178,7 @@ class Tables : public Painting
 public:
     Tables()
     {
-        insert(0, 8);
+        m_model.InsertNumbered(0, 8);
         m_view.SetRowHeight(17);
         m_view.setModel(&m_model);
         m_view.setItemDelegate(&m_delegate);
@@ -226,22 +227,12 @@ public:
     }
 
 private:
-    void insert(int at, int count)
-    {
-        for (int i = 0; i < count; ++i) {
-            QList<QStandardItem*> items;
-            for (int column = 0; column < Columns; ++column)
-                items.append(new QStandardItem(QString("%1 in %2").arg(++m_number).arg(column)));
-            m_model.insertRow(at + i, items);
-        }
-    }
-
     void append()
     {
         const int count = m_draws->once(10) ? 30 : 1 + m_draws->below(3);
         const bool isAtEnd = m_draws->once(2);
         tell("append #, go to the end #", count, isAtEnd);
-        insert(m_model.rowCount(), count);
+        m_model.InsertNumbered(m_model.rowCount(), count);
         if (isAtEnd)
             m_view.scrollToBottom();
     }
@@ -256,7 +247,7 @@ private:
         if (isRemoved)
             m_model.removeRows(at, qMin(count, rows - at));
         else
-            insert(at, count);
+            m_model.InsertNumbered(at, count);
     }
 
     void change()
@@ -297,7 +288,7 @@ private:
         m_view.viewport()->update();
     }
 
-    QStandardItemModel m_model{0, Columns};
+    NumberedModel m_model{0, Columns};
     Hovering m_delegate;
     Uniform m_view;
     int m_number = 0;

@@ -5,13 +5,13 @@
 // and changes of the model do, where cells are, and how they are painted.
 
 #include "app/window/widgets/UniformTable.h"
+#include "plain/NumberedModel.h"
 #include "plain/Program.h"
 
 #include <QApplication>
 #include <QHeaderView>
 #include <QImage>
 #include <QScrollBar>
-#include <QStandardItemModel>
 #include <QtTest>
 
 using namespace Velocor;
@@ -52,7 +52,7 @@ public:
         m_plain.setShowGrid(false);
         m_plain.setVerticalScrollMode(QAbstractItemView::ScrollPerItem);
         m_plain.setHorizontalScrollMode(QAbstractItemView::ScrollPerPixel);
-        insert(0, 30);
+        m_model.InsertNumbered(0, 30);
         for (QTableView* view : views()) {
             view->setModel(&m_model);
             view->setSelectionBehavior(QAbstractItemView::SelectRows);
@@ -103,16 +103,6 @@ public:
 private:
     QVector<QTableView*> views() { return {&m_uniform, &m_plain}; }
 
-    void insert(int at, int count)
-    {
-        for (int i = 0; i < count; ++i) {
-            QList<QStandardItem*> items;
-            for (int column = 0; column < Columns; ++column)
-                items.append(new QStandardItem(QString("%1 in %2").arg(++m_number).arg(column)));
-            m_model.insertRow(at + i, items);
-        }
-    }
-
     void pressKey()
     {
         static Qt::Key const keys[] = {Qt::Key_Down, Qt::Key_Up,  Qt::Key_PageDown, Qt::Key_PageUp,
@@ -156,7 +146,7 @@ private:
             m_model.removeRows(at, removed);
         } else {
             tell("insert # rows at #", count, at);
-            insert(at, count);
+            m_model.InsertNumbered(at, count);
         }
         QCoreApplication::processEvents();
     }
@@ -308,10 +298,9 @@ private:
         return view.viewport()->grab().toImage();
     }
 
-    QStandardItemModel m_model{0, Columns};
+    NumberedModel m_model{0, Columns};
     Uniform m_uniform;
     QTableView m_plain;
-    int m_number = 0;
 };
 
 } // namespace
