@@ -203,6 +203,16 @@ protected:
         });
     }
 
+    /// Performs something after the last step, with draws that are the same in every program.
+    template <class Function>
+    void performLast(Function const& function)
+    {
+        const Step last;
+        Draws draws(last);
+        m_draws = &draws;
+        function();
+    }
+
     template <class Value>
     void same(char const* what, Value const& real, Value const& plain)
     {

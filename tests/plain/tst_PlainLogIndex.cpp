@@ -455,10 +455,7 @@ public:
 
     void finish()
     {
-        static Program::Step last;
-        Program::Draws draws(last);
-        m_draws = &draws;
-        pass();
+        performLast([this] { pass(); });
     }
 
 private:
@@ -581,10 +578,7 @@ public:
 
     void finish()
     {
-        static Program::Step last;
-        Program::Draws draws(last);
-        m_draws = &draws;
-        poll();
+        performLast([this] { poll(); });
     }
 
 private:

@@ -166,10 +166,7 @@ public:
 
     void finish()
     {
-        static Program::Step last;
-        Program::Draws draws(last);
-        m_draws = &draws;
-        pass();
+        performLast([this] { pass(); });
     }
 
 private:
