@@ -6,6 +6,8 @@
 # per file; fails below 95 % of lines or 90 % of branches.
 #
 #     scripts/coverage.sh               all tests except those of the package
+#     scripts/coverage.sh --quick       those that repeat others in another locale or on another screen
+#                                       neither
 #     scripts/coverage.sh --no-run      the counts of the last run
 #
 # The compiler adds an exception branch after almost every call. No exception crosses an interface
@@ -16,6 +18,8 @@ set -euo pipefail
 
 root=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd -P)
 build=$root/build/coverage
+repeated=package
+[ "${1:-}" != --quick ] || repeated='package|locale|screen'
 
 "$root/scripts/install-packages.sh" build test check
 "$root/scripts/build.sh" coverage
@@ -25,7 +29,7 @@ if [ "${1:-}" != --no-run ]; then
     "$root/scripts/prepare-coverage.sh"
     # Some tests compare the whole output of a program, or leave it no disk space for its counts.
     export GCOV_ERROR_FILE=/dev/null
-    ctest --test-dir "$build" -j3 --no-tests=error -LE package -V --quiet \
+    ctest --test-dir "$build" -j3 --no-tests=error -LE "$repeated" -V --quiet \
         --output-log "$build/tests.txt" || {
         grep -A 4 'FAIL!' "$build/tests.txt" || true
         sed -n '/^The following tests FAILED/,/^$/p' "$build/tests.txt"
