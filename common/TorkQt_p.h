@@ -58,15 +58,14 @@ inline QString FontText(QFont const& font)
 /// @return whether the text is one; otherwise the font is unchanged
 inline bool ReadFont(QString const& text, QFont& font)
 {
-    if (!font.fromString(text))
-        return false;
+    const bool isFont = font.fromString(text);
 #if QT_VERSION >= QT_VERSION_CHECK(6, 0, 0)
     constexpr int WeightField = 4, MostFieldsOfQt5 = 11;
     const QStringList fields = text.split(QLatin1Char(','));
-    if (fields.size() > WeightField && fields.size() <= MostFieldsOfQt5)
+    if (isFont && fields.size() > WeightField && fields.size() <= MostFieldsOfQt5)
         font.setLegacyWeight(fields.at(WeightField).toInt());
 #endif
-    return true;
+    return isFont;
 }
 
 } // namespace TorkQt
