@@ -151,13 +151,13 @@ QString QDateTime::toString(QString const& format) const
     return original(this, format);
 }
 #else
-QString QLocale::toString(QDateTime const& time, QStringView format, QCalendar calendar) const
+QString QLocale::toString(QDateTime const& time, QStringView format) const
 {
-    using ToString = QString (*)(QLocale const*, QDateTime const&, QStringView, QCalendar);
+    using ToString = QString (*)(QLocale const*, QDateTime const&, QStringView);
     static const auto original = reinterpret_cast<ToString>(
-        dlsym(RTLD_NEXT, "_ZNK7QLocale8toStringERK9QDateTime11QStringView9QCalendar"));
+        dlsym(RTLD_NEXT, "_ZNK7QLocale8toStringERK9QDateTime11QStringView"));
     ++s_stampsMade;
-    return original(this, time, format, calendar);
+    return original(this, time, format);
 }
 #endif
 
