@@ -15,7 +15,7 @@ descriptions=packaging/abi
 
 # Without optimization the debug information has every type; the paths in it start at the root.
 cmake -S . -B "$build" -G Ninja -DCMAKE_BUILD_TYPE=Debug -DBUILD_SHARED_LIBS=ON \
-    -DVELOCOR_BUILD_TESTS=OFF -DCMAKE_CXX_FLAGS="-ffile-prefix-map=$PWD=."
+    -DVELOCOR_QT=5 -DVELOCOR_BUILD_TESTS=OFF -DCMAKE_CXX_FLAGS="-ffile-prefix-map=$PWD=."
 cmake --build "$build" --target tork_common
 cmake --install "$build/common" --prefix "$PWD/$build/prefix" >/dev/null
 

@@ -13,7 +13,7 @@ import re
 import sys
 
 PAGE = 'docs/architecture.md'
-SHARED = 'common'  # its own headers define only macros, so no arrow is needed to include them
+SHARED = 'common'  # its own headers may be included without an arrow
 INCLUDE = re.compile(r'^\s*#\s*include\s*[<"]([^>"]+)[>"]', re.M)
 
 

@@ -49,7 +49,7 @@ QString LogField::Unescaped(QString const& text)
         }
         const QChar escape = text.at(at + 1);
         bool isNumber = false;
-        const ushort unit = text.midRef(at + 2, 4).toUShort(&isNumber, 16);
+        const ushort unit = text.mid(at + 2, 4).toUShort(&isNumber, 16);
         if (escape == QLatin1Char('u') && isNumber && at + 6 <= text.size()) {
             result += QChar(unit);
             at += 5;

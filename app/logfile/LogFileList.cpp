@@ -15,7 +15,7 @@ namespace {
 int NumberOf(QString const& name)
 {
     bool converted = false;
-    const int number = name.midRef(name.lastIndexOf(QLatin1Char('.')) + 1).toInt(&converted);
+    const int number = name.mid(name.lastIndexOf(QLatin1Char('.')) + 1).toInt(&converted);
     return converted && name.contains(QLatin1Char('.')) ? number : -1;
 }
 

@@ -179,7 +179,7 @@ bool LogIndex::Feed(char const* bytes, int count)
             if (!addLine(at, length, true))
                 return false;
         } else {
-            m_partialLine.append(at, std::min(length, LineLimit - m_partialLine.size()));
+            m_partialLine.append(at, std::min<int>(length, LineLimit - m_partialLine.size()));
             m_lineIsPartial = true;
             if (lineEnd && !addLine(m_partialLine.constData(), m_partialLine.size(), true))
                 return false;

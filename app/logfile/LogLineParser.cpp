@@ -130,7 +130,7 @@ bool LogLineParser::findByFormat(char const* line, int length, Beginnings* last,
         parts.hasDate = reader.hasDate();
         parts.resolution = reader.resolution();
         parts.severity = name ? name->severity : LogEntry::None;
-        parts.message = std::min(length, blank + 2 + (name ? name->text.size() : 0));
+        parts.message = std::min<int>(length, blank + 2 + (name ? name->text.size() : 0));
         return true;
     }
     return false;
@@ -150,7 +150,7 @@ bool LogLineParser::findByName(char const* line, int length, Parts& parts) const
         parts.isEntry = true;
         parts.timeLength = blank;
         parts.severity = name->severity;
-        parts.message = std::min(length, blank + 2 + name->text.size());
+        parts.message = std::min<int>(length, blank + 2 + name->text.size());
         return true;
     }
     return false;
@@ -177,7 +177,7 @@ void LogLineParser::findElapsed(char const* line, int length, Parts& parts) cons
             continue;
         parts.elapsed = parts.message + size + 1;
         parts.elapsedLength = number - 2;
-        parts.message = std::min(length, parts.message + after + 1);
+        parts.message = std::min<int>(length, parts.message + after + 1);
         return;
     }
 }

@@ -34,7 +34,7 @@ QStringList ShortestFolders(QStringList const& paths)
 {
     int deepest = 0;
     for (QString const& path : paths)
-        deepest = std::max(deepest, path.count(QLatin1Char('/')));
+        deepest = std::max<int>(deepest, path.count(QLatin1Char('/')));
     QStringList folders;
     for (int depth = 1; depth <= deepest; ++depth) {
         folders.clear();

@@ -26,11 +26,11 @@
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
 
-#include <QApplication>
 #include <QCloseEvent>
-#include <QDesktopWidget>
 #include <QFileInfo>
+#include <QGuiApplication>
 #include <QMenuBar>
+#include <QScreen>
 #include <QSplitter>
 #include <QStatusBar>
 #include <QVBoxLayout>
@@ -239,8 +239,8 @@ void MainWindow::showPlaces(bool shown)
 
 void MainWindow::restoreFirstState()
 {
-    const QSize available = QApplication::desktop()->availableGeometry(this).size();
-    resize(QSize(1080, 680).boundedTo(available * 9 / 10));
+    if (QScreen const* screen = QGuiApplication::primaryScreen())
+        resize(QSize(1080, 680).boundedTo(screen->availableSize() * 9 / 10));
 
     m_startupMessage = m_settings.Load();
     m_settings.RestoreGeometry(this);

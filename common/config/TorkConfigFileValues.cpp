@@ -5,14 +5,15 @@
 
 #include "common/config/TorkConfigFile.h"
 
+#include "common/TorkQt_p.h"
 #include "common/config/TorkScreenFit_p.h"
 
 #include <QApplication>
 #include <QColor>
-#include <QDesktopWidget>
 #include <QFont>
 #include <QPoint>
-#include <QRegExp>
+#include <QRect>
+#include <QScreen>
 #include <QSize>
 #include <QStringList>
 #include <QVector>
@@ -31,17 +32,23 @@ QString Join(std::initializer_list<int> numbers)
 QVector<int> Numbers(QString const& text)
 {
     QVector<int> numbers;
-    const QStringList fields = text.split(QRegExp(QStringLiteral("[,\\-]")));
+    const QStringList fields =
+        QString(text).replace(QLatin1Char('-'), QLatin1Char(',')).split(QLatin1Char(','));
     for (QString const& field : fields)
         numbers.append(field.toInt());
     return numbers;
 }
 
-// QApplication::desktop() crashes without a QApplication.
-QDesktopWidget* Desktop()
+// The size of all screens together; invalid without a QApplication.
+QSize DesktopSize()
 {
-    const bool haveApplication = qobject_cast<QApplication*>(QCoreApplication::instance());
-    return haveApplication ? QApplication::desktop() : nullptr;
+    if (!qobject_cast<QApplication*>(QCoreApplication::instance()))
+        return QSize();
+    QRect desktop;
+    const QList<QScreen*> screens = QGuiApplication::screens();
+    for (QScreen const* screen : screens)
+        desktop |= screen->geometry();
+    return desktop.size();
 }
 
 // Same result as QString::toInt(). Plain short numbers, which almost all are, are parsed here,
@@ -176,7 +183,7 @@ bool TorkConfigFile::ReadSize(QString const& section, QString const& key, QSize&
 
 bool TorkConfigFile::WriteFont(QString const& section, QString const& key, QFont& font)
 {
-    return WriteItem(section, key, font.toString());
+    return WriteItem(section, key, TorkQt::FontText(font));
 }
 
 bool TorkConfigFile::ReadFont(QString const& section, QString const& key, QFont& font)
@@ -185,7 +192,7 @@ bool TorkConfigFile::ReadFont(QString const& section, QString const& key, QFont&
     if (!text)
         return false;
 
-    font.fromString(*text);
+    TorkQt::ReadFont(*text, font);
     return true;
 }
 
@@ -205,13 +212,13 @@ bool TorkConfigFile::ReadScreenMetrics(char const* name, QPoint& position, QSize
         return text != nullptr;
     }
 
-    QDesktopWidget* desktop = Desktop();
+    const QSize desktop = DesktopSize();
     QVector<int> numbers;
-    if (!desktop || !ToInts(fields, numbers))
+    if (!desktop.isValid() || !ToInts(fields, numbers))
         return false;
 
-    const TorkWindowRect fitted = TorkFitToDesktop(numbers[0], numbers[1], numbers[2], numbers[3],
-                                                   desktop->geometry().size());
+    const TorkWindowRect fitted =
+        TorkFitToDesktop(numbers[0], numbers[1], numbers[2], numbers[3], desktop);
     position = fitted.position;
     size = fitted.size;
     return true;

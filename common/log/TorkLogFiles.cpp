@@ -47,7 +47,7 @@ int LogFileNumber(QString const& fileName)
 {
     bool converted = false;
     const int dot = fileName.lastIndexOf(QLatin1Char('.'));
-    const int number = fileName.midRef(dot + 1).toInt(&converted);
+    const int number = fileName.mid(dot + 1).toInt(&converted);
     return converted ? number : -1;
 }
 
@@ -145,7 +145,7 @@ void RemoveUnfinishedCopies(QFileInfo const& log)
     const QStringList files =
         EntriesWithExtension(log.path(), start, QDir::Files | QDir::Hidden | QDir::NoSymLinks);
     for (QString const& file : files) {
-        const QStringRef random = file.midRef(start.length() + 1, 6);
+        const QString random = file.mid(start.length() + 1, 6);
         const bool isRandom = std::all_of(random.begin(), random.end(), [](QChar letter) {
             return (letter >= QLatin1Char('a') && letter <= QLatin1Char('z')) ||
                    (letter >= QLatin1Char('A') && letter <= QLatin1Char('Z'));

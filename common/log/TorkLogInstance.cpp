@@ -110,7 +110,8 @@ TorkLog* TorkLog::initialize(QString const& path, QString const& prefix,
         m_gLog = new TorkLog(path);
     }
 
-    const QString dataLocation = QStandardPaths::writableLocation(QStandardPaths::DataLocation);
+    const QString dataLocation =
+        QStandardPaths::writableLocation(QStandardPaths::AppLocalDataLocation);
     m_gLog->setOutputPath(path.isEmpty() ? dataLocation + QLatin1String("/logs/") : path);
 
     qInstallMessageHandler(TorkLog_MessageHandler);

@@ -3,6 +3,7 @@
 
 #include "common/log/TorkLogStamp_p.h"
 
+#include "common/TorkQt_p.h"
 #include "common/log/TorkLogLock_p.h"
 
 #include <QDateTime>
@@ -86,7 +87,7 @@ bool IsLatin1(QString const& text)
 // In some languages the digits are beyond Latin-1, and a whole stamp would be question marks.
 QString Stamp(QDateTime const& time, QString const& format)
 {
-    const QString stamp = time.toString(format);
+    const QString stamp = TorkQt::DateText(time, format);
     return IsLatin1(stamp) ? stamp : QLocale::c().toString(time, format);
 }
 

@@ -3,6 +3,7 @@
 
 #include "common/log/TorkLogWriter_p.h"
 
+#include "common/TorkQt_p.h"
 #include "common/log/TorkLogPlace_p.h"
 
 #include <QTextStream>
@@ -129,7 +130,7 @@ void TorkLogWriter::trim(int length, qint64 limit)
 void TorkLogWriter::cut(int length)
 {
     QTextStream stream(&m_file);
-    stream.setCodec("ISO 8859-1"); // byte for byte, in any locale
+    TorkQt::UseLatin1(stream); // byte for byte, in any locale
     stream.setAutoDetectUnicode(false);
 
     QString kept;

@@ -31,8 +31,7 @@ bool IsPredefined(QString const& name)
 QChar CharacterOf(QString const& reference)
 {
     const bool isHex = reference.startsWith(QLatin1String("#x"));
-    const uint code =
-        isHex ? reference.midRef(2).toUInt(nullptr, 16) : reference.midRef(1).toUInt();
+    const uint code = isHex ? reference.mid(2).toUInt(nullptr, 16) : reference.mid(1).toUInt();
     return QChar(static_cast<ushort>(code));
 }
 

@@ -14,10 +14,11 @@
 #include <QCoreApplication>
 #include <QJsonDocument>
 #include <QJsonObject>
-#include <QTextStream>
 #include <QVariant>
 
 #include <cstring>
+
+#include <cstdio>
 
 namespace {
 
@@ -102,8 +103,6 @@ int main(int argc, char** argv)
         if (!identity)
             result.insert("RootPath", application.property("RootPath").toString());
     }
-    QTextStream out(stdout);
-    out.setCodec("UTF-8");
-    out << QJsonDocument(result).toJson(QJsonDocument::Compact);
+    std::fputs(QJsonDocument(result).toJson(QJsonDocument::Compact).constData(), stdout);
     return 0;
 }

@@ -58,7 +58,14 @@ ProgramResult RunProgram(QString const& program, QStringList const& arguments,
 
 // Tests that run in the background, or under nohup, ignore some of these signals, and so would the
 // program.
-void PreparedProcess::setupChildProcess()
+PreparedProcess::PreparedProcess()
+{
+#if QT_VERSION >= QT_VERSION_CHECK(6, 0, 0)
+    setChildProcessModifier([this] { prepare(); });
+#endif
+}
+
+void PreparedProcess::prepare() const
 {
     for (int signalNumber : {SIGHUP, SIGINT, SIGTERM})
         std::signal(signalNumber, SIG_DFL);

@@ -36,6 +36,8 @@ ProgramResult RunProgram(QString const& program, QStringList const& arguments,
 class PreparedProcess : public QProcess
 {
 public:
+    PreparedProcess();
+
     ~PreparedProcess() override
     {
         kill();
@@ -44,8 +46,16 @@ public:
 
     std::function<void()> inChild; ///< async-signal-safe calls only
 
+#if QT_VERSION < QT_VERSION_CHECK(6, 0, 0)
 protected:
-    void setupChildProcess() override;
+    void setupChildProcess() override
+    {
+        prepare();
+    }
+#endif
+
+private:
+    void prepare() const;
 };
 
 /// The next line of a process's standard output, including its line feed. Whatever there is of it

@@ -26,7 +26,7 @@ namespace {
 // Whether the log service has been started: its first start creates this file.
 bool LogIsStarted()
 {
-    return QFile::exists(QStandardPaths::writableLocation(QStandardPaths::DataLocation) +
+    return QFile::exists(QStandardPaths::writableLocation(QStandardPaths::AppLocalDataLocation) +
                          "/logs/logsettings.cfg");
 }
 

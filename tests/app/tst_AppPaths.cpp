@@ -31,7 +31,7 @@ QString OwnRoot()
 
 QString DataLocation()
 {
-    return QStandardPaths::writableLocation(QStandardPaths::DataLocation) + "/";
+    return QStandardPaths::writableLocation(QStandardPaths::AppLocalDataLocation) + "/";
 }
 
 QString DocumentsLocation()

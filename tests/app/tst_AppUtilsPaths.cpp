@@ -22,7 +22,7 @@ QString OwnRoot()
 
 QString DataLocation()
 {
-    return QStandardPaths::writableLocation(QStandardPaths::DataLocation) + "/";
+    return QStandardPaths::writableLocation(QStandardPaths::AppLocalDataLocation) + "/";
 }
 
 QString DocumentsLocation()

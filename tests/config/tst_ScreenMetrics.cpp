@@ -3,8 +3,8 @@
 
 #include "common/config/TorkConfigFile.h"
 
-#include <QApplication>
-#include <QDesktopWidget>
+#include <QGuiApplication>
+#include <QScreen>
 #include <QtTest>
 
 #include <limits>
@@ -47,7 +47,7 @@ private:
 
 void tst_ScreenMetrics::initTestCase()
 {
-    const QSize desktop = QApplication::desktop()->geometry().size();
+    const QSize desktop = QGuiApplication::primaryScreen()->virtualSize();
     if (desktop != QSize(1920, 1080))
         QSKIP("the desktop is not 1920 by 1080 pixels");
 }

@@ -140,8 +140,8 @@ void tst_TorkConfigFileValues::written_data()
     };
     QFont italic("Courier New", 11, QFont::Bold, true);
     italic.setUnderline(true);
-    QTest::newRow("font") << font(QFont("Helvetica", 12)) << QFont("Helvetica", 12).toString();
-    QTest::newRow("font with attributes") << font(italic) << italic.toString();
+    QTest::newRow("font") << font(QFont("Helvetica", 12)) << "Helvetica,12,-1,5,50,0,0,0,0,0";
+    QTest::newRow("font with attributes") << font(italic) << "Courier New,11,-1,5,75,1,1,0,0,0";
 }
 
 void tst_TorkConfigFileValues::written()
@@ -197,7 +197,7 @@ void tst_TorkConfigFileValues::namesLoseTheirBlanks_data()
     QTest::newRow("font") << Action([=](TorkConfigFile& f) {
         QFont font("Helvetica", 12);
         return f.WriteFont(section, key, font);
-    }) << QFont("Helvetica", 12).toString()
+    }) << QString("Helvetica,12,-1,5,50,0,0,0,0,0")
                           << Action([=](TorkConfigFile& f) {
                                  QFont font("Times", 9);
                                  return f.ReadFont(section, key, font) &&
@@ -556,9 +556,10 @@ void tst_TorkConfigFileValues::readFont_data()
     QFont bold("Courier New", 11, QFont::Bold, true);
     bold.setStrikeOut(true);
     const QFont untouched("Times", 9);
-    QTest::newRow("plain") << QFont("Helvetica", 12).toString() << QByteArray() << true
+    QTest::newRow("plain") << QString("Helvetica,12,-1,5,50,0,0,0,0,0") << QByteArray() << true
                            << QFont("Helvetica", 12);
-    QTest::newRow("with attributes") << bold.toString() << QByteArray() << true << bold;
+    QTest::newRow("with attributes")
+        << QString("Courier New,11,-1,5,75,1,0,1,0,0") << QByteArray() << true << bold;
     QTest::newRow("missing") << QString() << QByteArray() << false << untouched;
     QTest::newRow("three fields are not a font, but the key was found")
         << "a,b,c" << QByteArray("QFont::fromString: Invalid description 'a,b,c'") << true

@@ -182,7 +182,7 @@ void tst_TorkLogLifetime::firstStartInDefaultDirectory()
     qputenv("XDG_DATA_HOME", QFile::encodeName(folder.root() + "data"));
     QCoreApplication::setOrganizationName("Some Makers");
     QCoreApplication::setApplicationName("Some Product");
-    const QString location = QStandardPaths::writableLocation(QStandardPaths::DataLocation);
+    const QString location = QStandardPaths::writableLocation(QStandardPaths::AppLocalDataLocation);
     if (!location.startsWith(folder.root()))
         QSKIP("The data location cannot be moved on this system.");
 
@@ -299,7 +299,7 @@ void tst_TorkLogLifetime::initializeWithShortForm()
         ~Environment() { qputenv("XDG_DATA_HOME", before); }
     } environment;
     qputenv("XDG_DATA_HOME", QFile::encodeName(folder.root() + "data"));
-    const QString location = QStandardPaths::writableLocation(QStandardPaths::DataLocation);
+    const QString location = QStandardPaths::writableLocation(QStandardPaths::AppLocalDataLocation);
     if (!location.startsWith(folder.root()))
         QSKIP("The data location cannot be moved on this system.");
 

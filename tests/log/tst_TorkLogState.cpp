@@ -141,6 +141,7 @@ QtMessageHandler qInstallMessageHandler(QtMessageHandler handler)
 }
 
 // In place of Qt's, which it calls: how often a stamp is made.
+#if QT_VERSION < QT_VERSION_CHECK(6, 0, 0)
 QString QDateTime::toString(QString const& format) const
 {
     using ToString = QString (*)(QDateTime const*, QString const&);
@@ -149,6 +150,16 @@ QString QDateTime::toString(QString const& format) const
     ++s_stampsMade;
     return original(this, format);
 }
+#else
+QString QLocale::toString(QDateTime const& time, QStringView format) const
+{
+    using ToString = QString (*)(QLocale const*, QDateTime const&, QStringView);
+    static const auto original = reinterpret_cast<ToString>(
+        dlsym(RTLD_NEXT, "_ZNK7QLocale8toStringERK9QDateTime11QStringView"));
+    ++s_stampsMade;
+    return original(this, time, format);
+}
+#endif
 
 // In place of Qt's, which it calls: how often the category of usual messages is asked for.
 QLoggingCategory* QLoggingCategory::defaultCategory()

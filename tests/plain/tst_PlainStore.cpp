@@ -13,9 +13,9 @@
 #include <QApplication>
 #include <QBuffer>
 #include <QColor>
-#include <QDesktopWidget>
 #include <QFont>
 #include <QMap>
+#include <QScreen>
 #include <QTemporaryDir>
 #include <QXmlInputSource>
 #include <QXmlSimpleReader>
@@ -585,7 +585,7 @@ private:
         if (fields.size() == 4) {
             for (int i = 0; i < 4 && isRead; ++i)
                 plain[i] = fields[i].toInt(&isRead);
-            const QSize desktop = QApplication::desktop()->geometry().size();
+            const QSize desktop = QGuiApplication::primaryScreen()->virtualSize();
             Fit(plain[0], plain[2], desktop.width(), 320, false);
             Fit(plain[1], plain[3], desktop.height(), 200, true);
             if (!isRead)

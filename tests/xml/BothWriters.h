@@ -4,6 +4,7 @@
 #pragma once
 
 #include "common/xml/TorkXmlFile.h"
+#include "support/QtVersions.h"
 
 #include "support/TestFiles.h"
 #include "xml/WriterSteps.h"
@@ -34,7 +35,7 @@ inline Outcome WrittenByFile(Steps const& steps)
         TorkXmlFile writer(name);
         if (!writer.open(QIODevice::WriteOnly))
             qFatal("%s: %s", qPrintable(name), qPrintable(writer.errorString()));
-        writer.setCodec("UTF-8"); // a new device, as at open, resets the codec to the locale's
+        QtVersions::useUtf8(writer); // a new device, as at open, resets the codec to the locale's
         outcome.codes = Perform(writer, steps);
         writer.flush();
         writer.close();

@@ -3,6 +3,7 @@
 
 #include "common/xml/TorkXmlFile.h"
 #include "common/xml/TorkXmlStream.h"
+#include "support/QtVersions.h"
 
 #include "support/TestFiles.h"
 #include "xml/BothWriters.h"
@@ -153,7 +154,7 @@ Outcome WrittenByStream(Steps const& steps)
     QBuffer device(&outcome.text);
     device.open(QIODevice::WriteOnly);
     TorkXmlStream writer(&device);
-    writer.setCodec("UTF-8");
+    QtVersions::useUtf8(writer);
     outcome.codes = Perform(writer, steps);
     writer.flush();
     return outcome;
@@ -789,7 +790,7 @@ void tst_TorkXmlWriters::writeResult()
     const QTemporaryDir dir;
     TorkXmlFile file(dir.filePath("out.xml"));
     QVERIFY2(file.open(QIODevice::WriteOnly), qPrintable(file.errorString()));
-    file.setCodec("UTF-8");
+    QtVersions::useUtf8(file);
     QCOMPARE(file.Write(text), 0);
     file.flush();
     QCOMPARE(TestFiles::read(file.name()), text.toUtf8());

@@ -209,7 +209,7 @@ void HighlightDialog::remove()
 {
     const int position = m_list->currentRow();
     m_rules.removeAt(position);
-    fillList(std::min(position, m_rules.size() - 1));
+    fillList(std::min<int>(position, m_rules.size() - 1));
     m_shared->SetRules(m_rules);
 }
 

@@ -64,7 +64,7 @@ QString LinesAsText::Entries(LogModel const& model, QList<int> const& rows, int 
         const QPair<int, int> entry = model.EntryRows(row);
         for (next = std::max(next, entry.first); next <= entry.second && count < limit; ++next) {
             const QString line = model.LineText(next, LogIndex::LineLimit + 1);
-            text += line.leftRef(LogIndex::LineLimit);
+            text += line.left(LogIndex::LineLimit);
             text += line.size() > LogIndex::LineLimit ? QStringLiteral("\u2026\n")
                                                       : QStringLiteral("\n");
             ++count;

@@ -43,10 +43,10 @@ QString LongText::SelectedText() const
     int from = 0;
     auto next = std::lower_bound(m_breaks.begin(), m_breaks.end(), start);
     for (; next != m_breaks.end() && *next < cursor.selectionEnd(); ++next) {
-        text += shown.midRef(from, *next - start - from);
+        text += shown.mid(from, *next - start - from);
         from = *next - start + 1;
     }
-    text += shown.midRef(from);
+    text += shown.mid(from);
     return text.replace(QChar::ParagraphSeparator, QLatin1Char('\n'));
 }
 

@@ -341,10 +341,22 @@ void UniformTable::updateScrollBars()
     verticalScrollBar()->setSingleStep(1);
 }
 
+// Qt 6 has renamed the virtual function.
+QStyleOptionViewItem UniformTable::cellOptions() const
+{
+#if QT_VERSION < QT_VERSION_CHECK(6, 0, 0)
+    return viewOptions();
+#else
+    QStyleOptionViewItem option;
+    initViewItemOption(&option);
+    return option;
+#endif
+}
+
 int UniformTable::sizeHintForColumn(int column) const
 {
     ensurePolished();
-    const QStyleOptionViewItem option = viewOptions();
+    const QStyleOptionViewItem option = cellOptions();
     // Those in view, and as many before as after them.
     const int before = (MeasuredRows - rowsInView()) / 2;
     const int first =
@@ -459,7 +471,7 @@ void UniformTable::paintEvent(QPaintEvent* event)
     const bool isHovered = viewport()->testAttribute(Qt::WA_Hover) && viewport()->underMouse();
     m_hovered = isHovered ? indexAt(viewport()->mapFromGlobal(QCursor::pos())) : QModelIndex();
     QPainter painter(viewport());
-    const QStyleOptionViewItem option = viewOptions();
+    const QStyleOptionViewItem option = cellOptions();
     const QRect area = event->rect();
     const int first = std::max(0, rowPast(area.top()));
     const int last = std::min(rowCount() - 1, rowPast(area.bottom()));

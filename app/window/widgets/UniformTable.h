@@ -97,6 +97,7 @@ protected:
     bool isIndexHidden(QModelIndex const& index) const override;
 
 private:
+    QStyleOptionViewItem cellOptions() const;
     int rowsInView() const;
     void placeHeaderAndBars();
     void updateScrollBars();
