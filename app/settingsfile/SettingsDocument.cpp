@@ -5,6 +5,15 @@
 
 namespace Velocor {
 
+QStringList SettingsDocument::TextsOf(QVector<Loss> const& losses)
+{
+    QStringList texts;
+    texts.reserve(losses.size());
+    for (Loss const& loss : losses)
+        texts.append(loss.text);
+    return texts;
+}
+
 QString SettingsDocument::Value(QString const& section, QString const& key,
                                 QString const& byDefault) const
 {

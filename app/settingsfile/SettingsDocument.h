@@ -30,6 +30,14 @@ struct SettingsDocument
         QVector<Item> items;
     };
 
+    /// Something that saving does not keep.
+    struct Loss
+    {
+        QString section; ///< where it is; empty outside any section
+        QString key;     ///< empty outside any item
+        QString text;    ///< for the user; of a file that was read, starting with its line
+    };
+
     QString rootName;
     QVector<Section> sections;
 
@@ -39,9 +47,11 @@ struct SettingsDocument
     int line = 0;  ///< position of the error, starting at 1; 0 if unknown
     int column = 0;
 
-    /// What the store does not keep, one message each, with its line.
-    QStringList losses;
-    int lossCount = 0; ///< the number of all losses; `losses` has only the first ones
+    QVector<Loss> losses; ///< what the store does not keep of a file
+    int lossCount = 0;    ///< the number of all losses; `losses` has only the first ones
+
+    /// The texts of losses.
+    static QStringList TextsOf(QVector<Loss> const& losses);
 
     /// The value under a section and a key; `byDefault` if there is none.
     QString Value(QString const& section, QString const& key,

@@ -9,8 +9,25 @@
 #include <QFile>
 #include <QFileInfo>
 #include <QObject>
+#include <QRegularExpression>
 
 namespace Velocor {
+
+namespace {
+
+constexpr int MaximumDeclaration = 200; // bytes
+
+// Whether a file that starts with an XML declaration means the same without it.
+bool IsDefaultDeclaration(QByteArray const& start)
+{
+    static const QRegularExpression pattern(
+        QStringLiteral("^<\\?xml\\s+version\\s*=\\s*(\"1\\.0\"|'1\\.0')"
+                       "(\\s+encoding\\s*=\\s*(\"utf-8\"|'utf-8'))?\\s*\\?>"),
+        QRegularExpression::CaseInsensitiveOption);
+    return pattern.match(QString::fromLatin1(start)).hasMatch();
+}
+
+} // namespace
 
 SettingsFileReader::SettingsFileReader(TorkConfigFile& store, SettingsDocument& document)
     : TorkConfigFileDocHandler(&store), m_store(store), m_document(document)
@@ -46,8 +63,8 @@ SettingsDocument SettingsFileReader::ReadBytes(QByteArray const& bytes)
 void SettingsFileReader::read(QIODevice& device, SettingsDocument& document)
 {
     document.isReadable = true;
-    if (device.peek(5) == "<?xml")
-        document.losses.append(QObject::tr("Line 1: the XML declaration"));
+    if (device.peek(5) == "<?xml" && !IsDefaultDeclaration(device.peek(MaximumDeclaration)))
+        document.losses.append({QString(), QString(), QObject::tr("Line 1: the XML declaration")});
     document.lossCount = document.losses.size();
 
     TorkConfigFile store((QString()));
@@ -65,12 +82,14 @@ void SettingsFileReader::read(QIODevice& device, SettingsDocument& document)
     }
 }
 
-void SettingsFileReader::noteLoss(QString const& what)
+// In the last element that began at a depth: the section is at 2, the item at 3.
+void SettingsFileReader::noteLossAt(int depth, QString const& what)
 {
     ++m_document.lossCount;
     if (m_document.losses.size() >= MaximumLosses)
         return;
-    m_document.losses.append(QObject::tr("Line %1: %2").arg(m_locator->lineNumber()).arg(what));
+    m_document.losses.append({depth >= 2 ? m_section : QString(), depth >= 3 ? m_item : QString(),
+                              QObject::tr("Line %1: %2").arg(m_locator->lineNumber()).arg(what)});
 }
 
 bool SettingsFileReader::startElement(QString const& namespaceURI, QString const& localName,
@@ -82,22 +101,30 @@ bool SettingsFileReader::startElement(QString const& namespaceURI, QString const
         m_document.rootName = localName;
         m_store.SetRootElementName(localName);
     }
+    if (newDepth == 2)
+        m_section = localName;
+    else if (newDepth == 3)
+        m_item = localName;
     for (int i = 0; i < attributes.count(); ++i)
-        noteLoss(QObject::tr("the attribute \"%1\" of \"%2\"").arg(attributes.qName(i), localName));
+        noteLossAt(
+            newDepth,
+            QObject::tr("the attribute \"%1\" of \"%2\"").arg(attributes.qName(i), localName));
 
     const bool hasRootName = newDepth > 1 && localName == m_document.rootName;
     const bool isSection = newDepth == 2 && !hasRootName;
     if (hasRootName)
-        noteLoss(QObject::tr("the element \"%1\", which has the same name as the root element")
-                     .arg(localName));
+        noteLossAt(newDepth,
+                   QObject::tr("the element \"%1\", which has the same name as the root element")
+                       .arg(localName));
     else if (isSection && m_store.HasSection(localName))
-        noteLoss(QObject::tr("a second section \"%1\", merged with the first").arg(localName));
+        noteLossAt(newDepth,
+                   QObject::tr("a second section \"%1\", merged with the first").arg(localName));
     else if (newDepth > 3)
-        noteLoss(QObject::tr("the nesting of the element \"%1\"").arg(localName));
+        noteLossAt(newDepth, QObject::tr("the nesting of the element \"%1\"").arg(localName));
 
     TorkConfigFileDocHandler::startElement(namespaceURI, localName, qName, attributes);
     if (isSection && !m_store.HasSection(localName))
-        noteLoss(QObject::tr("the name of the section \"%1\"").arg(localName));
+        noteLossAt(newDepth, QObject::tr("the name of the section \"%1\"").arg(localName));
     return true;
 }
 

@@ -36,7 +36,8 @@ private:
     SettingsFileReader(TorkConfigFile& store, SettingsDocument& document);
 
     static void read(QIODevice& device, SettingsDocument& document);
-    void noteLoss(QString const& what);
+    void noteLoss(QString const& what) { noteLossAt(depth(), what); }
+    void noteLossAt(int depth, QString const& what);
     void noteLossOfValue();
 
     void setDocumentLocator(QXmlLocator* locator) override { m_locator = locator; }
@@ -53,7 +54,9 @@ private:
     TorkConfigFile& m_store;
     SettingsDocument& m_document;
     QXmlLocator* m_locator = nullptr; // set before anything is read
-    bool m_isAfterValue = false;      // in the same item
+    QString m_section;                // the names of the last section and item that began
+    QString m_item;
+    bool m_isAfterValue = false; // in the same item
 };
 
 } // namespace Velocor

@@ -17,6 +17,8 @@ namespace Velocor {
 
 namespace {
 
+using Loss = SettingsDocument::Loss;
+
 bool IsLatin1(QString const& text)
 {
     return std::all_of(text.begin(), text.end(), [](QChar c) { return c.unicode() < 256; });
@@ -34,22 +36,28 @@ QString ReasonOf(QString const& value)
     return QObject::tr("the value would change when read back");
 }
 
-QString Message(SettingsDocument::Section const& section, SettingsDocument::Item const& item,
-                QString const& reason)
+Loss LossOf(SettingsDocument::Section const& section, SettingsDocument::Item const& item,
+            QString const& reason)
 {
-    return QStringLiteral("%1 / %2: %3").arg(section.name, item.key, reason);
+    return {section.name, item.key,
+            QStringLiteral("%1 / %2: %3").arg(section.name, item.key, reason)};
+}
+
+Loss LossOf(SettingsDocument::Section const& section, QString const& reason)
+{
+    return {section.name, QString(), QStringLiteral("%1: %2").arg(section.name, reason)};
 }
 
 // Returns the section with only the items that the store can write.
 SettingsDocument::Section WithoutLosses(SettingsDocument::Section const& section,
-                                        QStringList& losses)
+                                        QVector<Loss>& losses)
 {
     SettingsDocument::Section writable{section.name, {}};
     for (SettingsDocument::Item const& item : section.items) {
         if (!TorkConfigText::IsPlainName(item.key))
-            losses.append(Message(section, item, QObject::tr("the key is not a valid name")));
+            losses.append(LossOf(section, item, QObject::tr("the key is not a valid name")));
         if (!TorkConfigText::IsPlainValue(item.value))
-            losses.append(Message(section, item, ReasonOf(item.value)));
+            losses.append(LossOf(section, item, ReasonOf(item.value)));
         else if (TorkConfigText::IsPlainName(item.key))
             writable.items.append(item);
     }
@@ -81,17 +89,17 @@ QByteArray SettingsFileWriter::ToBytes(SettingsDocument const& document)
     return store.ToXml();
 }
 
-QStringList SettingsFileWriter::Losses(SettingsDocument const& document)
+QVector<Loss> SettingsFileWriter::Losses(SettingsDocument const& document)
 {
-    QStringList losses;
+    QVector<Loss> losses;
     SettingsDocument writable;
     for (SettingsDocument::Section const& section : document.sections) {
         const SettingsDocument::Section kept = WithoutLosses(section, losses);
         if (!TorkConfigText::IsPlainName(section.name))
-            losses.append(QObject::tr("%1: the section name is not valid").arg(section.name));
+            losses.append(LossOf(section, QObject::tr("the section name is not valid")));
         else if (section.name == document.rootName)
-            losses.append(QObject::tr("%1: the section has the same name as the root element")
-                              .arg(section.name));
+            losses.append(
+                LossOf(section, QObject::tr("the section has the same name as the root element")));
         else
             writable.sections.append(kept);
     }
@@ -102,7 +110,7 @@ QStringList SettingsFileWriter::Losses(SettingsDocument const& document)
     for (SettingsDocument::Section const& section : qAsConst(writable.sections)) {
         for (SettingsDocument::Item const& item : section.items) {
             if (readBack.value({section.name, item.key}) != item.value)
-                losses.append(Message(section, item, ReasonOf(item.value)));
+                losses.append(LossOf(section, item, ReasonOf(item.value)));
         }
     }
     return losses;

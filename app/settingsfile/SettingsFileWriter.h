@@ -9,15 +9,15 @@ namespace Velocor {
 
 /// Saves a settings document through the configuration store, and reports what that would lose.
 ///
-///     const QStringList losses = SettingsFileWriter::Losses(document);
+///     const auto losses = SettingsFileWriter::Losses(document);
 ///     if (losses.isEmpty() && SettingsFileWriter::Save(path, document, &error))
 ///         ...;
 class SettingsFileWriter
 {
 public:
-    /// What would not read back unchanged: one message per value or name. Found in memory; no file
+    /// What would not read back unchanged: one per value or name. Found in memory; no file
     /// is written.
-    static QStringList Losses(SettingsDocument const& document);
+    static QVector<SettingsDocument::Loss> Losses(SettingsDocument const& document);
 
     /// What is wrong with a text as a value: why it would not read back unchanged. Empty if it
     /// would.

@@ -73,7 +73,8 @@ public:
 
     bool processingInstruction(QString const& target, QString const& data) override
     {
-        return add("instruction " + target + data);
+        // The parser reports the declaration, too.
+        return target == "xml" || add("instruction " + target + data);
     }
 
 private:
@@ -103,7 +104,8 @@ public:
     {
         QString document;
         if (chance(40))
-            document += "<?xml version=\"1.0\"?>";
+            document += chance(2) ? "<?xml version=\"1.0\"?>"
+                                  : "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?>";
         if (chance(40))
             document += "<!DOCTYPE R [<!ENTITY e 'x'>]>";
         spoil(document);
@@ -270,9 +272,10 @@ void tst_PlainSettingsFile::compareDocument(QByteArray const& text)
         store.Load(); // an empty value is in the file, but is gone after loading it
     }
     const QStringList before = Contents::of(text);
-    const bool isKept = !text.startsWith("<?xml") && before == Contents::of(saved) &&
+    const bool isKept = !text.contains("ISO-8859-1") && before == Contents::of(saved) &&
                         before == Contents::of(store.ToXml());
-    const QStringList losses = document.losses + SettingsFileWriter::Losses(document);
+    const QStringList losses =
+        SettingsDocument::TextsOf(document.losses + SettingsFileWriter::Losses(document));
     QVERIFY(!before.isEmpty());
     QVERIFY2(losses.isEmpty() == isKept, qPrintable("named: " + losses.join(" | ")));
     QVERIFY(QFile::remove(path));
@@ -321,7 +324,7 @@ void tst_PlainSettingsFile::compareValues(SettingsDocument const& document)
             isKept = isKept && found && found->FindValue(item.key, value) && value == item.value;
         }
     }
-    const QStringList losses = SettingsFileWriter::Losses(document);
+    const QStringList losses = SettingsDocument::TextsOf(SettingsFileWriter::Losses(document));
     QVERIFY2(losses.isEmpty() == isKept, qPrintable("named: " + losses.join(" | ")));
     QVERIFY(QFile::remove(path));
     ++m_values;

@@ -49,6 +49,8 @@ private slots:
     void read();
     void lossTexts_data();
     void lossTexts();
+    void lossesAreInTheirPlaces_data();
+    void lossesAreInTheirPlaces();
     void readsWhatTheStoreReads_data();
     void readsWhatTheStoreReads();
     void errors_data();
@@ -114,8 +116,15 @@ void tst_SettingsFile::read_data()
         "Line 2: the name of the section \"\xC3\xA9\"");
     row("section named like the root", "<R><a>1</a></R>", "", 2,
         "Line 2: the element \"R\", which has the same name as the root element");
-    QTest::newRow("declaration") << QByteArray("<?xml version=\"1.0\"?><R><S><a>1</a></S></R>")
-                                 << "[S] a=1" << 1 << "Line 1: the XML declaration";
+    const auto declared = [](char const* name, char const* declaration, int lossCount) {
+        QTest::newRow(name) << QByteArray(declaration) + QByteArray("<R><S><a>1</a></S></R>")
+                            << QString("[S] a=1") << lossCount
+                            << QString(lossCount > 0 ? "Line 1: the XML declaration" : "");
+    };
+    declared("declaration", "<?xml version=\"1.0\"?>", 0);
+    declared("declaration of UTF-8", "<?xml version='1.0' encoding=\"utf-8\"?>\n", 0);
+    declared("declaration of Latin-1", "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?>", 1);
+    declared("declaration of standing alone", "<?xml version='1.0' standalone='yes'?>", 1);
 }
 
 void tst_SettingsFile::read()
@@ -127,7 +136,7 @@ void tst_SettingsFile::read()
     QCOMPARE(document.rootName, QString("R"));
     QTEST(Joined(document), "values");
     if (!firstLoss.isEmpty())
-        QCOMPARE(document.losses.value(0), firstLoss);
+        QCOMPARE(document.losses.value(0).text, firstLoss);
     QTEST(document.lossCount, "lossCount");
 }
 
@@ -182,7 +191,7 @@ void tst_SettingsFile::lossTexts_data()
     row("key thrice", "<R><S><a>1</a><a>2</a><a>3</a></S></R>",
         {"Line 1: the first value of \"a\", replaced by a second one",
          "Line 1: the first value of \"a\", replaced by a second one"});
-    row("declaration and comment", "<?xml version='1.0'?>\n<!--c--><R/>",
+    row("declaration and comment", "<?xml version='1.0' encoding='ISO-8859-1'?>\n<!--c--><R/>",
         {"Line 1: the XML declaration", "Line 2: the comment \"c\""});
 }
 
@@ -193,8 +202,38 @@ void tst_SettingsFile::lossTexts()
     const SettingsDocument read = SettingsFileReader::ReadBytes(document);
     QVERIFY2(read.isParsed, qPrintable(read.error));
     QFETCH(QStringList, losses);
-    QCOMPARE(read.losses.join('\n'), losses.join('\n'));
+    QCOMPARE(SettingsDocument::TextsOf(read.losses).join('\n'), losses.join('\n'));
     QCOMPARE(read.lossCount, read.losses.size());
+}
+
+void tst_SettingsFile::lossesAreInTheirPlaces_data()
+{
+    QTest::addColumn<QByteArray>("inside");
+    QTest::addColumn<QString>("places");
+
+    const auto row = [](char const* name, char const* inside, char const* places) {
+        QTest::newRow(name) << QByteArray(inside) << QString(places);
+    };
+    row("before any section", "<!--c--><S/>", "/");
+    row("between sections", "<S/><!--c--><T/>", "/");
+    row("of a section", "<S><a>1</a></S><T x='1'/>", "T/");
+    row("in a section, after an item", "<S><a>1</a><!--c--></S>", "S/");
+    row("of an item", "<S><a>1</a><b x='1'>2</b></S>", "S/b");
+    row("in an item", "<S><a>1<!--c--></a></S>", "S/a");
+    row("deep in an item", "<S><a>1<d><e/></d></a></S>", "S/a S/a");
+    row("empty item", "<S><a>1</a></S><T><b/></T>", "T/b");
+    row("key twice", "<S><a>1</a><b>2</b><a>3</a></S>", "S/a");
+    row("section twice", "<S/><T/><S/>", "S/");
+}
+
+void tst_SettingsFile::lossesAreInTheirPlaces()
+{
+    QFETCH(QByteArray, inside);
+    const SettingsDocument read = SettingsFileReader::ReadBytes("<R>" + inside + "</R>");
+    QStringList places;
+    for (SettingsDocument::Loss const& loss : read.losses)
+        places.append(loss.section + '/' + loss.key);
+    QTEST(places.join(' '), "places");
 }
 
 void tst_SettingsFile::readsWhatTheStoreReads_data()
@@ -358,7 +397,7 @@ void tst_SettingsFile::lossesOfNames()
     SettingsDocument document;
     document.rootName = "Root";
     document.SetValue(section, key, "v");
-    QTEST(SettingsFileWriter::Losses(document), "expected");
+    QTEST(SettingsDocument::TextsOf(SettingsFileWriter::Losses(document)), "expected");
 }
 
 void tst_SettingsFile::reasons_data()
@@ -385,7 +424,8 @@ void tst_SettingsFile::reasons()
 {
     QFETCH(QString, value);
     QFETCH(QString, reason);
-    QCOMPARE(SettingsFileWriter::Losses(OneValue(value)), QStringList("S / k: " + reason));
+    QCOMPARE(SettingsDocument::TextsOf(SettingsFileWriter::Losses(OneValue(value))),
+             QStringList("S / k: " + reason));
 }
 
 void tst_SettingsFile::manyLosses_data()
@@ -415,7 +455,7 @@ void tst_SettingsFile::lossesWriteNoFile()
     const timespec longAgo[] = {{1000000000, 0}, {1000000000, 0}};
     const QByteArray path = QFile::encodeName(folder.path());
     QCOMPARE(utimensat(AT_FDCWD, path.constData(), longAgo, 0), 0);
-    const QStringList losses = SettingsFileWriter::Losses(OneValue("%1"));
+    const auto losses = SettingsFileWriter::Losses(OneValue("%1"));
     if (temporary.isNull())
         qunsetenv("TMPDIR");
     else

@@ -25,7 +25,7 @@ void SettingsSaver::NoteRead(QString const& path, SettingsDocument const& docume
     m_path = path;
     m_hasBackup = false;
     m_read = QFileInfo(path).lastModified();
-    m_fileLosses = document.losses;
+    m_fileLosses = SettingsDocument::TextsOf(document.losses);
     m_fileLossCount = document.lossCount;
 }
 
@@ -45,7 +45,8 @@ bool SettingsSaver::ask(QString const& text, QString const& details, QString con
 
 bool SettingsSaver::confirmLosses(SettingsDocument const& document)
 {
-    QStringList losses = m_fileLosses + SettingsFileWriter::Losses(document);
+    QStringList losses =
+        m_fileLosses + SettingsDocument::TextsOf(SettingsFileWriter::Losses(document));
     const int unlisted = m_fileLossCount - m_fileLosses.size();
     if (losses.isEmpty())
         return true;
