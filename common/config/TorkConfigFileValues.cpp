@@ -181,6 +181,7 @@ bool TorkConfigFile::ReadSize(QString const& section, QString const& key, QSize&
     return true;
 }
 
+// cppcheck-suppress constParameter ; applications build on it
 bool TorkConfigFile::WriteFont(QString const& section, QString const& key, QFont& font)
 {
     return WriteItem(section, key, TorkQt::FontText(font));
