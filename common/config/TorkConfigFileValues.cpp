@@ -193,7 +193,7 @@ bool TorkConfigFile::ReadFont(QString const& section, QString const& key, QFont&
     if (!text)
         return false;
 
-    TorkQt::ReadFont(*text, font);
+    font.fromString(*text);
     return true;
 }
 

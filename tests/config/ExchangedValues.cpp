@@ -9,6 +9,7 @@
 //     exchanged_values print FILE
 
 #include "common/config/TorkConfigFile.h"
+#include "common/config/TorkConfigText.h"
 
 #include <QColor>
 #include <QFont>
@@ -89,13 +90,13 @@ bool Write(QString const& path)
     TorkConfigFile file(path);
     Random random;
     for (int round = 0; round < Rounds; ++round) {
-        const QString section = QString::number(round);
+        const QString section = QStringLiteral("round%1").arg(round);
         QColor color(int(random.below(256)), int(random.below(256)), int(random.below(256)));
         QSize size(int(random.below(10000)), int(random.below(10000)));
         QFont font = Font(random);
         file.WriteItem(section, QStringLiteral("int"), int(random.below(1u << 31)) - (1 << 30));
         file.WriteItem(section, QStringLiteral("unsigned"), random.below(~0u));
-        file.WriteItem(section, QStringLiteral("text"), Text(random));
+        file.WriteItem(section, QStringLiteral("text"), TorkConfigText::EncodeValue(Text(random)));
         file.WriteBool(section, QStringLiteral("bool"), random.coin());
         file.WriteColor(section, QStringLiteral("color"), color);
         file.WriteSize(section, QStringLiteral("size"), size);
@@ -110,7 +111,7 @@ bool Print(QString const& path)
     if (!file.Load())
         return false;
     for (int round = 0; round < Rounds; ++round) {
-        const QString section = QString::number(round);
+        const QString section = QStringLiteral("round%1").arg(round);
         int number = 0;
         unsigned natural = 0;
         bool flag = false;
@@ -126,8 +127,8 @@ bool Print(QString const& path)
                          file.ReadFont(section, QStringLiteral("font"), font);
         const bool isNatural = file.ReadUint(section, QStringLiteral("unsigned"), 0, natural);
         std::printf("%d %d %d %u \"%s\" %d %06x %dx%d\n", all, number, isNatural, natural,
-                    text.toUtf8().constData(), flag, color.rgb() & 0xffffff, size.width(),
-                    size.height());
+                    TorkConfigText::DecodeValue(text).toUtf8().constData(), flag,
+                    color.rgb() & 0xffffff, size.width(), size.height());
         std::printf("%s %g %d hint %d weight %d style %d %d %d %d \"%s\"\n",
                     font.family().toUtf8().constData(), font.pointSizeF(), font.pixelSize(),
                     int(font.styleHint()), WeightNumber(font), int(font.style()), font.underline(),
