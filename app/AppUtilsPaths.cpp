@@ -42,7 +42,7 @@ void AppUtils::SetupProgramPath(QString& path)
 
 void AppUtils::SetupDataRootPath(QString& path)
 {
-    path = Location(QStandardPaths::DataLocation);
+    path = Location(QStandardPaths::AppLocalDataLocation);
 }
 
 void AppUtils::SetupDocumentPath(QString& path)

@@ -36,7 +36,7 @@ inline QString DateText(QDateTime const& time, QString const& format)
 }
 
 /// A font as QFont::toString() of Qt 5 formats it. That of Qt 6 has other weights and more fields,
-/// which Qt 5 would not read.
+/// which Qt 5 would not read; QFont::fromString() of Qt 6 reads both.
 inline QString FontText(QFont const& font)
 {
 #if QT_VERSION < QT_VERSION_CHECK(6, 0, 0)
@@ -51,21 +51,6 @@ inline QString FontText(QFont const& font)
         fields.append(font.styleName());
     return fields.join(QLatin1Char(','));
 #endif
-}
-
-/// Reads a font that either version of Qt has formatted.
-///
-/// @return whether the text is one; otherwise the font is unchanged
-inline bool ReadFont(QString const& text, QFont& font)
-{
-    const bool isFont = font.fromString(text);
-#if QT_VERSION >= QT_VERSION_CHECK(6, 0, 0)
-    constexpr int WeightField = 4, MostFieldsOfQt5 = 11;
-    const QStringList fields = text.split(QLatin1Char(','));
-    if (isFont && fields.size() > WeightField && fields.size() <= MostFieldsOfQt5)
-        font.setLegacyWeight(fields.at(WeightField).toInt());
-#endif
-    return isFont;
 }
 
 } // namespace TorkQt

@@ -35,6 +35,7 @@ sources() {
 # shellcheck disable=SC2016  # expanded by the shell that xargs starts
 search() { xargs -0 -r bash -c 'grep "$@" || [ $? -eq 1 ]' grep "$@"; }
 
+# REUSE-IgnoreStart
 without_spdx() {
     local file
     while IFS= read -r -d '' file; do
@@ -43,6 +44,7 @@ without_spdx() {
             echo "$file"
     done < <(sources)
 }
+# REUSE-IgnoreEnd
 
 without_pragma_once() { tracked '*.h' | search -LE '^#pragma once$'; }
 
@@ -74,6 +76,13 @@ qt_keywords() {
 const_before_the_type() {
     tracked 'app/*.cpp' 'app/*.h' 'common/*.cpp' 'common/*.h' |
         search -nHP '\bconst [\w:]+(<[^<>;]*>)? ?[&*]'
+}
+
+# The names are those that Qt 5.15's manual says came after 5.9, except common words; overloads and
+# new classes' members of older names are not among them.
+newer_than_qt_5_9() {
+    tracked 'app/*.cpp' 'app/*.h' 'common/*.cpp' 'common/*.h' 'examples/*.cpp' 'examples/*.h' |
+        search -nHwFf scripts/qt-after-5.9.txt | grep -vE '^[^:]+:[0-9]+: *//' || true
 }
 
 exceptions() {
@@ -169,6 +178,7 @@ rule "does not match docs/architecture.md" scripts/check-rooms.py
 rule "a signal that starts with a capital letter" capital_signals
 rule "a Qt keyword instead of Q_SIGNALS, Q_SLOTS or Q_EMIT" qt_keywords
 rule "const before the type of a reference or pointer" const_before_the_type
+rule "not in Qt 5.9" newer_than_qt_5_9
 rule "an exception" exceptions
 rule "an installed header that includes a private one" private_headers_in_public_ones
 rule "British spelling" british_spelling

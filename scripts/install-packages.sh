@@ -6,6 +6,7 @@
 # Needs neither network nor password if all of them are already installed.
 #
 #     scripts/install-packages.sh build          to build the program
+#     scripts/install-packages.sh qt6            and with Qt 6
 #     scripts/install-packages.sh wayland        Qt's platform plug-in for Wayland
 #     scripts/install-packages.sh build test     and to run its tests
 #     scripts/install-packages.sh build bench    and what ./bench compares with
@@ -23,9 +24,11 @@ say() { echo "install-packages: $*" >&2; }
 packages_of() {
     case "$(uname -s)/$1" in
     Darwin/build) echo cmake ninja qt@5 rapidxml ;;
+    Darwin/qt6) echo qt ;;
     Darwin/lint) echo clang-format@14 llvm@14 shellcheck ;;
     Darwin/test | Darwin/wayland | Darwin/package | Darwin/consumers) ;;
     */build) echo g++ cmake ninja-build qtbase5-dev librapidxml-dev ;;
+    */qt6) echo qt6-base-dev qt6-5compat-dev ;;
     */wayland) echo qtwayland5 ;;
     */test) echo xvfb xauth shared-mime-info pkg-config valgrind doxygen locales-all ;;
     */bench)
@@ -34,11 +37,11 @@ packages_of() {
             libpugixml-dev libxml2-dev grep ripgrep ugrep lnav glogg
         ;;
     */fuzz) echo clang-14 libclang-rt-14-dev ;;
-    */package) echo dpkg-dev desktop-file-utils appstream man-db ;;
+    */package) echo dpkg-dev debhelper doxygen lintian devscripts blhc desktop-file-utils appstream man-db ;;
     */consumers) echo g++-12 clang-14 clang-16 clang-19 pkg-config ;;
     */abi) echo abigail-tools binutils ;;
     */check) echo clazy cppcheck gcovr valgrind python3 python3-clang-14 ;;
-    */lint) echo git clang-format-14 clang-tidy-14 shellcheck ;;
+    */lint) echo git clang-format-14 clang-tidy-14 reuse shellcheck ;;
     *)
         say "unknown group: $1"
         return 2

@@ -24,7 +24,7 @@ QByteArray const& HistoryBytes::At(qint64 start, int size)
     }
     const auto at = static_cast<int>(start - m_start);
     m_part.setRawData(m_bytes.constData() + at,
-                      static_cast<uint>(std::min(size, m_bytes.size() - at)));
+                      static_cast<uint>(std::min<int>(size, m_bytes.size() - at)));
     return m_part;
 }
 

@@ -20,6 +20,21 @@ namespace {
 
 constexpr int ReadSize = 1 << 20;
 
+// Of the open file, since its name may belong to another one by now.
+QDateTime LastModified(QFile const& file)
+{
+    struct stat status
+    {};
+    if (::fstat(file.handle(), &status) != 0)
+        return QDateTime();
+#ifdef Q_OS_MACOS
+    const timespec time = status.st_mtimespec;
+#else
+    const timespec time = status.st_mtim;
+#endif
+    return QDateTime::fromMSecsSinceEpoch(qint64(time.tv_sec) * 1000 + time.tv_nsec / 1000000);
+}
+
 } // namespace
 
 bool HistoryFile::Open(QString const& path)
@@ -39,7 +54,7 @@ bool HistoryFile::Open(QString const& path)
 
 bool HistoryFile::Read(LogLineParser const& parser, LogFilter const& filter)
 {
-    const QDateTime modified = m_file->fileTime(QFileDevice::FileModificationTime);
+    const QDateTime modified = LastModified(*m_file);
     m_modified = std::max<qint64>(0, ForeignStamp::KeyOfEpoch(modified.toMSecsSinceEpoch()));
     // What the file gets from now on comes too late, however fast it grows. Some have no size.
     const qint64 size = m_file->size();

@@ -27,7 +27,7 @@ QByteArray const& HistoryLines::Content(size_t line)
     QByteArray const& read = m_bytes.At(begin, size);
     m_line.setRawData(read.constData(), static_cast<uint>(read.size()));
     const bool isWhole = begin < m_file->rows().complete() && begin + m_line.size() == end;
-    const int length = std::max(0, m_line.size() - (isWhole ? m_lineEnd.size() : 0));
+    const int length = std::max<int>(0, m_line.size() - (isWhole ? m_lineEnd.size() : 0));
     LogEncoding const& encoding = m_file->parser().fileType().encoding;
     m_content.setRawData(m_line.constData(),
                          static_cast<uint>(encoding.WithoutReturn(m_line.constData(), length)));

@@ -77,7 +77,8 @@ private:
     {
         int end = at;
         bool hasDigit = false;
-        if (m_message.midRef(at, 2) == QLatin1String("0x"))
+        if (m_message.at(at) == QLatin1Char('0') && at + 1 < m_message.size() &&
+            m_message.at(at + 1) == QLatin1Char('x'))
             end += 2;
         while (end < m_message.size()) {
             if (IsHexDigit(m_message.at(end)))

@@ -22,7 +22,7 @@ public:
     ProgramColumn(bool isShown, QStringList const& names) : m_isShown(isShown)
     {
         for (QString const& name : names)
-            m_width = std::max(m_width, name.size());
+            m_width = std::max<int>(m_width, name.size());
     }
 
     bool isShown() const { return m_isShown; }

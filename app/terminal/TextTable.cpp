@@ -38,7 +38,7 @@ QVector<int> TextTable::widths() const
     for (int column = 0; column + 1 < m_columns.size(); ++column) {
         int width = QString::fromLatin1(m_columns[column].name).size();
         for (QVector<QString> const& row : m_rows)
-            width = std::max(width, row[column].size());
+            width = std::max<int>(width, row[column].size());
         widths.append(width);
     }
     return widths << 0;

@@ -181,6 +181,7 @@ bool TorkConfigFile::ReadSize(QString const& section, QString const& key, QSize&
     return true;
 }
 
+// cppcheck-suppress constParameter ; applications build on it
 bool TorkConfigFile::WriteFont(QString const& section, QString const& key, QFont& font)
 {
     return WriteItem(section, key, TorkQt::FontText(font));
@@ -192,7 +193,7 @@ bool TorkConfigFile::ReadFont(QString const& section, QString const& key, QFont&
     if (!text)
         return false;
 
-    TorkQt::ReadFont(*text, font);
+    font.fromString(*text);
     return true;
 }
 

@@ -20,9 +20,9 @@
 /// a full disk, call flush() and check status() and errorString() before close(). A file that is
 /// cut short by a failed write is not removed.
 ///
-/// The file is in the locale's encoding unless you call setCodec("UTF-8") before the first text. It
-/// is written in place: to replace an existing file atomically, write to a QSaveFile through a
-/// TorkXmlStream instead. One thread at a time.
+/// Qt 6 writes UTF-8; with Qt 5, the file is in the locale's encoding unless you call
+/// setCodec("UTF-8") before the first text. The file is written in place: to replace an existing
+/// file atomically, write to a QSaveFile through a TorkXmlStream instead. One thread at a time.
 ///
 ///     TorkXmlFile writer(path);
 ///     if (!writer.open(QIODevice::WriteOnly))

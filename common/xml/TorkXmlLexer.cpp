@@ -158,7 +158,7 @@ void TorkXmlLexer::afterLess(QChar character)
     } else {
         m_tag.clear();
         m_tag.append(character);
-        m_beforeTag = {m_prefixes.size(), m_prefixWeight};
+        m_beforeTag = {int(m_prefixes.size()), m_prefixWeight};
         m_state = State::TagName;
     }
 }

@@ -63,7 +63,7 @@ void TorkXml_ParseManager_Base::removePrefix(QString const& prefix)
 void TorkXml_ParseManager_Base::usePrefix(QString const& prefix)
 {
     if (addPrefix(prefix))
-        m_usedPrefixes.append({prefix, m_elements.size()});
+        m_usedPrefixes.append({prefix, int(m_elements.size())});
 }
 
 // A parse through a TorkXmlGuard ends before it comes to this.

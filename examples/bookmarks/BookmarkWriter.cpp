@@ -51,7 +51,9 @@ bool WriteBookmarks(QString const& path, Bookmark const& root, QString& error)
         return false;
     }
 
+#if QT_VERSION < QT_VERSION_CHECK(6, 0, 0) // Qt 6 writes UTF-8 anyway
     writer.setCodec("UTF-8");
+#endif
     writer.Write("<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n");
     writer.Write("<!DOCTYPE xbel>\n");
     writer.WriteElementOpen("xbel", 1);

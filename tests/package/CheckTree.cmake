@@ -9,6 +9,7 @@ set(expected
     appdata.cfg
     lib/cmake/Tork/TorkConfig.cmake
     lib/cmake/Tork/TorkConfigVersion.cmake
+    lib/cmake/Tork/TorkLaunchData.cmake
     lib/cmake/Tork/TorkTargets.cmake
     lib/cmake/Tork/VelocorTargets.cmake
     lib/pkgconfig/tork.pc

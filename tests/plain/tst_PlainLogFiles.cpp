@@ -5,6 +5,7 @@
 // made of, through the same random life of a log directory, with links, pipes, forks, other writers
 // and holders of the file: both leave the same. tst_PlainLog compares more calls, without files.
 
+#include "common/TorkQt_p.h"
 #include "common/log/TorkLog.h"
 #include "plain/Program.h"
 #include "support/TestFiles.h"
@@ -174,7 +175,7 @@ private:
     void trim(int length)
     {
         QTextStream stream(&m_file);
-        stream.setCodec("ISO 8859-1");
+        TorkQt::UseLatin1(stream);
         stream.setAutoDetectUnicode(false);
         QString kept;
         int count = 0;

@@ -86,7 +86,7 @@ struct PlainLine
         }
         isEntry = true;
         severity = name.isEmpty() ? int(LogEntry::None) : SeverityNames.indexOf(name);
-        hasElapsed = line.midRef(end).toString().contains(elapsed);
+        hasElapsed = line.mid(end).contains(elapsed);
     }
 
     // The single z of the default format, as this Qt writes it.

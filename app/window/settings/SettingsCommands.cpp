@@ -150,14 +150,14 @@ QModelIndex SettingsCommands::Duplicate(QModelIndex const& index)
     if (place.item < 0) {
         SettingsEdit edit = EditAt(SettingsEdit::InsertSection, {place.section + 1, -1});
         edit.addedSection = sections.at(place.section);
-        edit.addedSection.name = freeName({sections.size(), -1}, edit.addedSection.name);
+        edit.addedSection.name = freeName({int(sections.size()), -1}, edit.addedSection.name);
         push({edit}, tr("Duplicate Section"));
         return m_model->IndexOf({place.section + 1, -1});
     }
     auto const& items = sections.at(place.section).items;
     SettingsEdit edit = EditAt(SettingsEdit::InsertItem, {place.section, place.item + 1});
     edit.addedItem = items.at(place.item);
-    edit.addedItem.key = freeName({place.section, items.size()}, edit.addedItem.key);
+    edit.addedItem.key = freeName({place.section, int(items.size())}, edit.addedItem.key);
     push({edit}, tr("Duplicate Key"));
     return m_model->IndexOf({place.section, place.item + 1});
 }

@@ -130,12 +130,13 @@ SettingsModel::Place SettingsModel::rowBeside(Place place, int step) const
     if (step > 0) {
         if (place.item + 1 < sections.at(place.section).items.size())
             return Place{place.section, place.item + 1};
-        return Place{(place.section + 1) % sections.size(), -1};
+        return Place{(place.section + 1) % int(sections.size()), -1};
     }
     if (place.item >= 0)
         return Place{place.section, place.item - 1};
-    const int section = (place.section + sections.size() - 1) % sections.size();
-    return Place{section, sections.at(section).items.size() - 1};
+    const int count = sections.size();
+    const int section = (place.section + count - 1) % count;
+    return Place{section, int(sections.at(section).items.size()) - 1};
 }
 
 QModelIndex SettingsModel::matchIn(Place place, QString const& text) const
