@@ -57,6 +57,8 @@ void CurrentTab::updateEditing()
         m_actions.settings->addActions(commands);
     }
     m_actions.settings->menuAction()->setEnabled(!commands.isEmpty());
+    for (QAction* action : m_actions.ofSettings)
+        action->setEnabled(!commands.isEmpty());
     if (editor)
         editor->AddOuterActions({m_actions.undo, m_actions.redo});
 }

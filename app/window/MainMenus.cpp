@@ -70,6 +70,14 @@ void MainMenus::fillFileMenu(QMenu* menu)
     m_actions.save =
         add(menu, tr("&Save"), QKeySequence::Save, tr("Save the current settings file"),
             [this] { m_targets.tabs->currentEditor()->Save(); });
+    m_actions.ofSettings.append(
+        add(menu, tr("&What Will Be Written..."), QKeySequence(tr("Ctrl+Shift+W")),
+            tr("Compare the settings file with what saving would make of it"),
+            [this] { m_targets.tabs->currentEditor()->ShowWhatWillBeWritten(); }));
+    m_actions.ofSettings.append(
+        add(menu, tr("Compare Wit&h..."), QKeySequence(tr("Ctrl+Shift+D")),
+            tr("Compare the settings with another file, and take over values"),
+            [this] { m_targets.tabs->currentEditor()->CompareWithOther(); }));
     m_actions.close = add(menu, tr("&Close Tab"), QKeySequence::Close, tr("Close the current file"),
                           [this] { m_targets.tabs->CloseCurrent(); });
     addForLog(menu, tr("Save &Lines As..."), QKeySequence(tr("Ctrl+Shift+S")),

@@ -50,7 +50,8 @@ struct MenuActions
     QAction* lineNumbers = nullptr;
     QAction* reopen = nullptr;
     QActionGroup* encodings = nullptr;
-    QList<QAction*> ofLogs; ///< those that need a log in the current tab
+    QList<QAction*> ofSettings; ///< those that need a settings file that can be edited
+    QList<QAction*> ofLogs;     ///< those that need a log in the current tab
 };
 
 /// Fills the menus, and does what their items say.

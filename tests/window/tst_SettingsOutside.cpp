@@ -87,7 +87,7 @@ void tst_SettingsOutside::changeIsToldAndReloaded()
     QVERIFY(TestFiles::writeOver(shown.file, WithFont("other"))); // as long
     QTRY_VERIFY_WITH_TIMEOUT(state->isVisible(), Patience);
     QCOMPARE(state->text(), QString("some.cfg was changed by another program."));
-    QCOMPARE(VisibleButtons(state), QStringList({"Dismiss", "Keep Mine", "Reload"}));
+    QCOMPARE(VisibleButtons(state), QStringList({"Compare...", "Dismiss", "Keep Mine", "Reload"}));
     Click(Button(state, "Reload"));
     QCOMPARE(CellText(shown.tree, 0, 0, 1), QString("other"));
     QVERIFY(!state->isVisible());

@@ -12,6 +12,7 @@
 #include "app/window/log/HighlightDialog.h"
 #include "app/window/log/LogSettingsDialog.h"
 #include "app/window/log/NoteDialog.h"
+#include "app/window/settings/DifferenceDialog.h"
 
 #include <QAbstractButton>
 #include <QComboBox>
@@ -126,6 +127,10 @@ void tst_WindowAccessibility::namesInDialogs()
     QCOMPARE(NamelessControls(&goTo), QStringList());
     NoteDialog note("text", nullptr);
     QCOMPARE(NamelessControls(&note), QStringList());
+    DifferenceDialog differences("Title", nullptr);
+    differences.SetSides({"Left", SettingsDocument(), "a"}, {"Right", SettingsDocument(), "b"});
+    differences.AllowTakeOver();
+    QCOMPARE(NamelessControls(&differences), QStringList());
     HighlightDialog highlights(std::make_shared<HighlightRules>(), nullptr);
     QCOMPARE(NamelessControls(&highlights), QStringList());
 }

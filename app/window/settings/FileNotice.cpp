@@ -15,6 +15,8 @@ FileNotice::FileNotice(QWidget* parent)
     : NoticeBar(tr("State of the file"), parent), m_watch(this),
       m_reload(addButton(tr("Reload"), tr("Show what is in the file now; can be undone"),
                          &FileNotice::reloadRequested)),
+      m_compare(addButton(tr("Compare..."), tr("Show what differs, and take over single values"),
+                          &FileNotice::compareRequested)),
       m_keep(addButton(tr("Keep Mine"), tr("Leave the editor as it is; saving replaces the file"),
                        &FileNotice::keepRequested)),
       m_saveAs(
@@ -46,6 +48,12 @@ void FileNotice::SetFile(QString const& path)
     check();
 }
 
+void FileNotice::SetComparable(bool isComparable)
+{
+    m_isComparable = isComparable;
+    check();
+}
+
 void FileNotice::check()
 {
     const QFileInfo file(m_path);
@@ -64,6 +72,7 @@ void FileNotice::check()
     else if (!isWritable)
         state = tr("%1 is read-only. Changes can only be saved to another file.").arg(name);
     m_reload->setVisible(isChanged);
+    m_compare->setVisible(isChanged && m_isComparable);
     m_keep->setVisible(isChanged);
     m_saveAs->setVisible(!now.exists || !isWritable);
     SetState(state);

@@ -23,10 +23,14 @@ public:
     /// after each of both.
     void SetFile(QString const& path);
 
+    /// Whether the editor has something to compare the file with.
+    void SetComparable(bool isComparable);
+
 Q_SIGNALS:
-    /// The user wants the file's content instead of the editor's, the editor's instead of the
-    /// file's, or the editor's in another file.
+    /// The user wants the file's content instead of the editor's, both side by side, the editor's
+    /// instead of the file's, or the editor's in another file.
     void reloadRequested();
+    void compareRequested();
     void keepRequested();
     void saveAsRequested();
 
@@ -46,8 +50,10 @@ private:
 
     QString m_path;
     Stamp m_known;
+    bool m_isComparable = false;
     FileWatch m_watch;
     QPushButton* m_reload;
+    QPushButton* m_compare;
     QPushButton* m_keep;
     QPushButton* m_saveAs;
 };

@@ -79,6 +79,46 @@ QVector<Place> PlacesToRemove(QModelIndexList const& indexes)
     return result;
 }
 
+QString const& NameOf(SettingsDocument::Section const& section)
+{
+    return section.name;
+}
+
+QString const& NameOf(SettingsDocument::Item const& item)
+{
+    return item.key;
+}
+
+template <class Entry>
+bool HaveSameNames(QVector<Entry> const& left, QVector<Entry> const& right)
+{
+    return std::equal(left.begin(), left.end(), right.begin(), right.end(),
+                      [](Entry const& a, Entry const& b) { return NameOf(a) == NameOf(b); });
+}
+
+SettingsEdit InsertionOf(int position, SettingsDocument::Section const& section)
+{
+    SettingsEdit edit = EditAt(SettingsEdit::InsertSection, {position, -1});
+    edit.addedSection = section;
+    return edit;
+}
+
+// What makes one section of another with the same name.
+QVector<SettingsEdit> EditsOfSection(int position, SettingsDocument::Section const& before,
+                                     SettingsDocument::Section const& after)
+{
+    if (!HaveSameNames(before.items, after.items))
+        return {EditAt(SettingsEdit::RemoveSection, {position, -1}), InsertionOf(position, after)};
+    QVector<SettingsEdit> edits;
+    for (int i = 0; i < after.items.size(); ++i) {
+        if (before.items.at(i).value == after.items.at(i).value)
+            continue;
+        edits.append(EditAt(SettingsEdit::SetValue, {position, i}));
+        edits.last().text = after.items.at(i).value;
+    }
+    return edits;
+}
+
 } // namespace
 
 void SettingsCommands::push(Edits const& edits, QString const& text)
@@ -213,18 +253,29 @@ QString SettingsCommands::removalText(Edits const& removals) const
     return tr("Removed ") + of + tr(", with %1 keys: ").arg(keys) + list;
 }
 
-void SettingsCommands::Reload(SettingsDocument const& document)
+// Rows that stay keep their place on the screen.
+SettingsCommands::Edits SettingsCommands::editsTo(SettingsDocument const& document) const
 {
-    if (document.HasSameValues(m_model->document()))
-        return;
+    auto const& old = m_model->document().sections;
+    auto const& sections = document.sections;
     Edits edits;
-    for (int i = m_model->rowCount() - 1; i >= 0; --i)
-        edits.append(EditAt(SettingsEdit::RemoveSection, {i, -1}));
-    for (int i = 0; i < document.sections.size(); ++i) {
-        edits.append(EditAt(SettingsEdit::InsertSection, {i, -1}));
-        edits.last().addedSection = document.sections.at(i);
+    if (HaveSameNames(old, sections)) {
+        for (int i = 0; i < sections.size(); ++i)
+            edits += EditsOfSection(i, old.at(i), sections.at(i));
+        return edits;
     }
-    push(edits, tr("Reload"));
+    for (int i = old.size() - 1; i >= 0; --i)
+        edits.append(EditAt(SettingsEdit::RemoveSection, {i, -1}));
+    for (int i = 0; i < sections.size(); ++i)
+        edits.append(InsertionOf(i, sections.at(i)));
+    return edits;
+}
+
+void SettingsCommands::Replace(SettingsDocument const& document, QString const& text)
+{
+    const Edits edits = editsTo(document);
+    if (!edits.isEmpty())
+        push(edits, text);
 }
 
 void SettingsCommands::Move(QModelIndex const& index, int step)

@@ -56,9 +56,11 @@ public:
     /// @param indexes  in any order; of each row, only the first column counts
     void Remove(QModelIndexList const& indexes);
 
-    /// Replaces everything by the sections of another document, as after reading the file again.
-    /// Nothing changes if they are the same.
-    void Reload(SettingsDocument const& document);
+    /// Replaces everything by the sections of another document. Nothing changes if they are the
+    /// same.
+    ///
+    /// @param text  what the step is called in "Undo ..."
+    void Replace(SettingsDocument const& document, QString const& text);
 
     /// Moves a section among the sections, or an item within its section.
     ///
@@ -83,6 +85,7 @@ Q_SIGNALS:
 private:
     using Edits = QVector<SettingsEdit>;
 
+    Edits editsTo(SettingsDocument const& document) const;
     void push(Edits const& edits, QString const& text);
     QStringList namesBeside(SettingsModel::Place place) const;
     QString freeName(SettingsModel::Place place, QString const& base) const;

@@ -30,7 +30,8 @@ constexpr int MaximumTitlePartLength = 200;
 } // namespace
 
 SettingsEditor::SettingsEditor(QWidget* parent)
-    : QWidget(parent), m_saver(this), m_commands(&m_model), m_notice(new NoticeBar),
+    : QWidget(parent), m_saver(this), m_commands(&m_model),
+      m_comparison(&m_model, &m_commands, this), m_notice(new NoticeBar),
       m_fileNotice(new FileNotice), m_removal(new NoticeBar(tr("Removal"))),
       m_pages(new QStackedWidget), m_tree(new SettingsTree(&m_model, &m_commands)),
       m_find(new SettingsFindBar(m_tree)), m_text(new MalformedFileView)
@@ -51,6 +52,7 @@ SettingsEditor::SettingsEditor(QWidget* parent)
 void SettingsEditor::connectParts()
 {
     connect(m_fileNotice, &FileNotice::reloadRequested, this, &SettingsEditor::Reload);
+    connect(m_fileNotice, &FileNotice::compareRequested, this, &SettingsEditor::compareWithFile);
     connect(m_fileNotice, &FileNotice::keepRequested, this, &SettingsEditor::keepMine);
     connect(m_fileNotice, &FileNotice::saveAsRequested, this, &SettingsEditor::saveAs);
     connect(m_tree, &SettingsTree::findRequested, m_find, &SettingsFindBar::Open);
@@ -128,6 +130,7 @@ void SettingsEditor::Open(QString const& path)
         showTree(document);
     else
         showMalformed(document);
+    m_fileNotice->SetComparable(document.isParsed);
     if (!m_ownerNote.isEmpty())
         m_notice->ShowMessage(m_ownerNote);
     updateState();
@@ -145,11 +148,34 @@ void SettingsEditor::Reload()
     }
     m_tree->EndEditing();
     const SettingsModel::Place place = SettingsModel::PlaceOf(m_tree->currentIndex());
-    m_commands.Reload(document);
+    m_commands.Replace(document, tr("Reload"));
     m_commands.undoStack()->setClean();
     m_saver.NoteRead(m_path, document);
     m_tree->GoTo(m_model.IndexOf(place));
     m_tree->setFocus();
+}
+
+void SettingsEditor::ShowWhatWillBeWritten()
+{
+    if (m_tree->EndEditing())
+        m_comparison.ShowSaving(m_path);
+}
+
+void SettingsEditor::compareWithFile()
+{
+    if (m_tree->EndEditing())
+        m_comparison.CompareWith(m_path, tr("In the file"));
+}
+
+void SettingsEditor::CompareWithOther()
+{
+    if (!m_tree->EndEditing())
+        return;
+    const QString path =
+        QFileDialog::getOpenFileName(this, tr("Compare With"), QFileInfo(m_path).path(),
+                                     tr("Settings (*.cfg *.xml *.bak);;All files (*)"));
+    if (!path.isEmpty())
+        m_comparison.CompareWith(path, QFileInfo(path).fileName());
 }
 
 // Saving has to write the file, even if nothing was changed here.

@@ -4,6 +4,7 @@
 #pragma once
 
 #include "app/window/settings/SettingsCommands.h"
+#include "app/window/settings/SettingsComparison.h"
 #include "app/window/settings/SettingsModel.h"
 #include "app/window/settings/SettingsSaver.h"
 
@@ -58,6 +59,12 @@ public:
     /// Shows what is in the file now. Can be undone, unless the file is malformed.
     void Reload();
 
+    /// Shows the file as it is and as saving would make it.
+    void ShowWhatWillBeWritten();
+
+    /// Asks for another file, and shows it beside the settings here. Its values can be taken over.
+    void CompareWithOther();
+
     /// Takes back the last change, or makes it again, and goes there. Does nothing if there is
     /// none.
     void Undo();
@@ -97,6 +104,7 @@ private:
     QPushButton* makeButton(QString const& text, QString const& toolTip);
     void showTree(SettingsDocument const& document);
     void showMalformed(SettingsDocument const& document);
+    void compareWithFile();
     void keepMine();
     void saveAs();
     void noteSaved();
@@ -111,6 +119,7 @@ private:
     SettingsSaver m_saver;
     SettingsModel m_model;
     SettingsCommands m_commands;
+    SettingsComparison m_comparison;
     QString m_ownerNote;
     NoticeBar* m_notice;
     FileNotice* m_fileNotice;
