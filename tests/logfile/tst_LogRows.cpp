@@ -362,6 +362,16 @@ void tst_LogRows::countSame_data()
     row("another line", all(ten), all(changed), 4);
     row("all lines and some", all(ten), listed(ten, {0, 1, 2}), 0);
     row("the same list", listed(ten, {0, 1, 5}), listed(ten, {0, 1, 5}), 3);
+    row(
+        "a list that was made again", listed(ten, {0, 1, 5}),
+        [&] {
+            LogRows rows = listed(ten, {0, 2, 3});
+            rows.Truncate(0);
+            for (size_t line : {0, 1, 5})
+                rows.AddLine(line, false);
+            return rows;
+        }(),
+        3);
     row("a longer list", listed(ten, {0, 1, 5}), listed(twenty, {0, 1, 5, 12}), 3);
     row("another list", listed(ten, {0, 1, 5}), listed(ten, {0, 2, 5}), 1);
     row("the same list, another line", listed(ten, {0, 1, 5}), listed(changed, {0, 1, 5}), 2);
