@@ -137,6 +137,8 @@ private slots:
     void anotherText_data();
     void anotherText();
     void partOfASearch();
+    void beforeTheFirstPass();
+    void awaitsKnownLines();
     void textFilterOfLongLines();
     void slowLineAfterOthers();
     void entryUntilItGoesOn();
@@ -331,6 +333,8 @@ void tst_LogIndex::filter_data()
                                << QStringList({"a", "b", "c", "d", "e", "more", "?"});
     QTest::newRow("no traces") << QList<int>({LogEntry::Trace})
                                << QStringList({"b", "c", "d", "e", "more", "?"});
+    QTest::newRow("all but what has no severity")
+        << QList<int>({LogEntry::None}) << QStringList({"a", "b", "c", "d", "e", "more"});
     QTest::newRow("problems only")
         << QList<int>({LogEntry::Trace, LogEntry::Notification, LogEntry::None})
         << QStringList({"c", "d", "e", "more"});
@@ -474,6 +478,54 @@ void tst_LogIndex::partOfASearch()
     index.Search(file.mid(static_cast<int>(index.searchOffset())), [] { return true; });
     QCOMPARE(index.searchedLines(), size_t(30));
     QCOMPARE(Texts(index, file, filter).size(), 11);
+
+    // A pass ends it.
+    index.BeginSearch(filter);
+    index.Begin();
+    QCOMPARE(index.searchedLines(), size_t(30));
+    index.End();
+}
+
+void tst_LogIndex::beforeTheFirstPass()
+{
+    const LogIndex index;
+    QCOMPARE(index.RunStarts(), std::vector<size_t>{0});
+    QCOMPARE(index.size(), size_t(0));
+    QCOMPARE(index.nextOffset(), qint64(0));
+    QCOMPARE(index.completeOffset(), qint64(0));
+    QCOMPARE(index.resumeOffset(), qint64(0));
+    QCOMPARE(index.searchedLines(), size_t(0));
+    QCOMPARE(index.slowLine(), size_t(0));
+    QVERIFY(!index.isOneRun() && !index.hasMoved() && !index.hasLostSeam());
+    QVERIFY(!index.awaitsKnownLines());
+    QCOMPARE(index.Rows(LogFilter()).size(), size_t(0));
+    QCOMPARE(State(index), StateOf(QByteArray()));
+}
+
+// While the newest run is read again, lines after its seam are known, but not reached.
+void tst_LogIndex::awaitsKnownLines()
+{
+    const QByteArray newer = run(3, QTime(9, 0), "n");
+    const QByteArray file = writtenOver(run(20, QTime(17, 0), "older", true), newer);
+    LogIndex index;
+    Pass(index, newer, 4096);
+    index.Begin();
+    QVERIFY(!index.awaitsKnownLines()); // one run only
+    index.End();
+
+    index = LogIndex();
+    index.Begin();
+    QVERIFY(!index.awaitsKnownLines());
+    index.Feed(file.constData(), file.size());
+    QVERIFY(!index.awaitsKnownLines());
+    index.End();
+    const auto offset = static_cast<int>(index.Begin());
+    QVERIFY(index.awaitsKnownLines());
+    QVERIFY(!index.Feed(file.constData() + offset, file.size() - offset));
+    QVERIFY(!index.awaitsKnownLines());
+    index.End();
+    QVERIFY(!index.awaitsKnownLines());
+    QCOMPARE(State(index), StateOf(file));
 }
 
 // Read in many pieces, and searched as a whole.
