@@ -49,7 +49,8 @@ ROOMS = {
     "common/config": ("config", "plain", PROOFS),
     "common/log": ("log", "plain", PROOFS),
     "common/xml": ("xml", "config plain", "hostile"),
-    "app/logfile": ("logfile", PLAIN_LOGS, "window/log window"),
+    "app/history": ("history", "tst_HistoryLives tst_PlainTerminal"),
+    "app/logfile": ("logfile", PLAIN_LOGS),
     "app/settingsfile": ("settingsfile", "plain hostile", "window"),
     "app/runninglog": ("runninglog", "window"),
 }
@@ -126,7 +127,7 @@ def find(name):
 
 
 def copy(sources):
-    """Copies the tree; the given sources, which are changed later, only if they are missing."""
+    """Copies the tree; the given sources, which are changed later, only if they are missing or newer."""
     names = run("git", "ls-files", "-z", "--cached", "--others", "--exclude-standard", cwd=ROOT,
                 capture_output=True).stdout.split("\0")
     for name in names:
@@ -134,7 +135,8 @@ def copy(sources):
             update(COPY / name, (ROOT / name).read_text("latin-1"))
             (COPY / name).chmod((ROOT / name).stat().st_mode)
     for name in targets():
-        if not (COPY / name).exists() or name not in sources:
+        if (name not in sources or not (COPY / name).exists()
+                or (ROOT / name).stat().st_mtime > (COPY / name).stat().st_mtime):
             update(COPY / name, (ROOT / name).read_text("latin-1"))
     configure("plain")
 
@@ -149,16 +151,26 @@ def change(sources, jobs):
     return [mutant for _, mutants, _ in found for mutant in mutants], digest(*(changed for *_, changed in found))
 
 
-def groups_of(mutant):
-    return ROOMS[os.path.dirname(mutant["file"])]
+@functools.cache
+def groups_of(name):
+    """The groups of tests that may notice mutants of a source; the test of its class comes first."""
+    room, own = os.path.dirname(name), f"tst_{re.sub(r'(_p)?[.](cpp|h)$', '', os.path.basename(name))}"
+    has_own = (ROOT / "tests" / os.path.basename(room) / f"{own}.cpp").exists()
+    return (own, *ROOMS[room]) if has_own else ROOMS[room]
 
 
-def build_tests(mutants, stage, jobs):
-    """Builds the tests that may notice these mutants; returns a pattern of their paths."""
-    names = sorted({name for m in mutants for name in groups_of(m)[stage].split()})
+def pattern_of(names, stage):
+    """A pattern of the paths of the tests in one group of these sources."""
+    tests = sorted({test for name in names for test in groups_of(name)[stage].split()})
+    return "|".join(f"{test}$" if test.startswith("tst_") else f"tests/{test}/" for test in tests)
+
+
+def build_tests(names, stage, jobs):
+    """Builds the tests that may notice mutants of these sources; returns a pattern of their paths."""
+    tests = sorted({test for name in names for test in groups_of(name)[stage].split()})
     run("ninja", "-C", WORK / "plain", f"-j{jobs}", "--quiet",
-        *(name if name.startswith("tst_") else f"tests/{name}/all" for name in names))
-    return "|".join(f"{name}$" if name.startswith("tst_") else f"tests/{name}/" for name in names)
+        *(test if test.startswith("tst_") else f"tests/{test}/all" for test in tests))
+    return pattern_of(names, stage)
 
 
 def tests(build, pattern):
@@ -283,11 +295,11 @@ def record(build, desks, sources, pattern, wanted):
     return reaching, digest(*(kept for *_, kept in found))
 
 
-def notice(desk, number, reaching):
+def notice(desk, number, functions):
     """The test that notices a mutant, if any: quick functions of a program run in one process."""
     runs = {}
     # In the order of the program: some tests need what others leave.
-    for seconds, name, test, function in reaching.get(number, []):
+    for seconds, name, test, function in functions:
         own = function if seconds > 0.5 else ""
         runs.setdefault((name, own), (test, []))[1].append((seconds, function))
     def cost(entry):  # less for a test that noticed others
@@ -332,12 +344,13 @@ def try_all(mutants, sources, desks, wanted):
         """Not noticed yet; a survivor is tried again when a test changed."""
         return [m for m in which if not known[m["key"]]["by"] and state not in known[m["key"]]["survived"]]
 
-    for stage in range(3):
-        left = [m for m in open_ones(mutants, None) if stage < len(groups_of(m))
+    for stage in range(4):
+        left = [m for m in open_ones(mutants, None) if stage < len(groups_of(m["file"]))
                 and (stage == 0 or what(m) not in accepted())]
         if not left:
             break
-        reached, state = record("plain", desks, sources, build_tests(left, stage, len(desks)), wanted)
+        names = sorted({m["file"] for m in left})
+        reached, state = record("plain", desks, sources, build_tests(names, stage, len(desks)), wanted)
         for number, functions in reached.items():
             reaching.setdefault(number, []).extend(functions)
         left = open_ones(left, state)
@@ -345,7 +358,9 @@ def try_all(mutants, sources, desks, wanted):
 
         def one(desk, mutant):
             result = known[mutant["key"]]
-            note(mutant, by=notice(desk, mutant["id"], reached), survived=[*result["survived"], state],
+            own = f"/({pattern_of([mutant['file']], stage)})"
+            functions = [f for f in reached.get(mutant["id"], []) if re.search(own, f[2][0])]
+            note(mutant, by=notice(desk, mutant["id"], functions), survived=[*result["survived"], state],
                  reached=mutant["id"] in reaching)
             if (number := next(done)) % 25 == 0:
                 print(f"mutants: {number} of {len(left)} in {time.monotonic() - started:.0f} s", flush=True)
@@ -359,7 +374,7 @@ def try_all(mutants, sources, desks, wanted):
             run("ninja", "-C", WORK / build, f"-j{len(desks)}", "--quiet", *sorted(names))
             reached, state = record(build, desks, sources, "|".join(f"{name}$" for name in names), wanted)
             left = open_ones(left, state)
-            for mutant, why in zip(left, in_parallel(desks, lambda desk, m: notice(desk, m["id"], reached), left)):
+            for mutant, why in zip(left, in_parallel(desks, lambda desk, m: notice(desk, m["id"], reached.get(m["id"], [])), left)):
                 note(mutant, by=why and f"{why} with the {sanitizer} sanitizer",
                      survived=[*known[mutant["key"]]["survived"], state])
     out.close()
@@ -419,7 +434,7 @@ def some_sources(wanted, chance):
 def main():
     parser = argparse.ArgumentParser(prog="mutants", description=__doc__.splitlines()[0])
     parser.add_argument("files", nargs="*", help="sources; all by default")
-    parser.add_argument("--sample", type=int, help=f"only as many, {PER_SOURCE} a source of one room, chosen by the seed")
+    parser.add_argument("--sample", type=int, help=f"only as many of each named source, or of one room, {PER_SOURCE} a source; chosen by the seed")
     parser.add_argument("--seed", type=int, default=1)
     parser.add_argument("--tests", default="", help="a pattern: only these tests")
     parser.add_argument("--jobs", type=int, default=os.cpu_count())
@@ -432,7 +447,7 @@ def main():
     alone = (WORK / "lock").open("w")
     fcntl.flock(alone, fcntl.LOCK_EX)
     chance = random.Random(options.seed)
-    sources = some_sources(options.sample, chance) if options.sample else options.files or targets()
+    sources = options.files or (some_sources(options.sample, chance) if options.sample else targets())
     mutants, digest_of_sources = change(sources, options.jobs)
     seen = {}
     for mutant in mutants:
@@ -441,7 +456,8 @@ def main():
         mutant["key"] = f"{key}{seen[key]}"
     if options.sample:
         drawn = [candidates(m for m in mutants if m["file"] == name) for name in sources]
-        mutants = [m for own in drawn for m in chance.sample(own, min(len(own), PER_SOURCE))]
+        most = options.sample if options.files else PER_SOURCE
+        mutants = [m for own in drawn for m in chance.sample(own, min(len(own), most))]
     desks = [Desk(number) for number in range(options.jobs)]
     try:
         known = try_all(mutants, digest_of_sources, desks, options.tests)

@@ -4,52 +4,11 @@
 // The places where a text is found; tst_PlainSearch compares many more.
 
 #include "app/logfile/ByteLiteral.h"
+#include "support/GuardedBytes.h"
 
 #include <QtTest>
 
-#include <cstring>
-
-#include <sys/mman.h>
-#include <unistd.h>
-
 using namespace Velocor;
-
-namespace {
-
-// Bytes with a page before and after them that must not be read.
-class GuardedBytes
-{
-public:
-    GuardedBytes()
-        : m_pageSize(size_t(sysconf(_SC_PAGESIZE))),
-          m_pages(mmap(nullptr, 3 * m_pageSize, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS,
-                       -1, 0))
-    {
-        if (m_pages == MAP_FAILED)
-            qFatal("no memory");
-        mprotect(page(0), m_pageSize, PROT_NONE);
-        mprotect(page(2), m_pageSize, PROT_NONE);
-    }
-    ~GuardedBytes() { munmap(m_pages, 3 * m_pageSize); }
-    Q_DISABLE_COPY(GuardedBytes)
-
-    // Where these bytes are now, right before the last page or right after the first one.
-    char const* Put(QByteArray const& bytes, bool isAtEnd)
-    {
-        const auto size = size_t(bytes.size());
-        char* const at = isAtEnd ? page(2) - size : page(1);
-        std::memcpy(at, bytes.constData(), size);
-        return at;
-    }
-
-private:
-    char* page(size_t number) const { return static_cast<char*>(m_pages) + number * m_pageSize; }
-
-    size_t m_pageSize;
-    void* m_pages;
-};
-
-} // namespace
 
 class tst_ByteLiteral : public QObject
 {
@@ -59,6 +18,8 @@ private slots:
     void places_data();
     void places();
     void nextPlaces();
+    void nearMisses();
+    void nothingElse();
     void letterCase_data();
     void letterCase();
 };
@@ -69,6 +30,7 @@ void tst_ByteLiteral::places_data()
     QTest::addColumn<QByteArray>("rare"); // the others are frequent
 
     QTest::newRow("a byte") << QByteArray("k") << QByteArray();
+    QTest::newRow("a byte that is rare") << QByteArray("k") << QByteArray("k");
     QTest::newRow("two bytes") << QByteArray("kl") << QByteArray();
     QTest::newRow("two bytes, the second is rarer") << QByteArray("kl") << QByteArray("l");
     QTest::newRow("a word, as it is") << QByteArray("klmno") << QByteArray();
@@ -122,6 +84,42 @@ void tst_ByteLiteral::nextPlaces()
         QCOMPARE(
             int(literal.Find(bytes.constBegin() + from, bytes.constEnd()) - bytes.constBegin()),
             expected < 0 ? bytes.size() : expected);
+    }
+}
+
+// Any byte of the text may be the one that differs, whatever is looked for first.
+void tst_ByteLiteral::nearMisses()
+{
+    const QByteArray wanted("klmno");
+    for (const char rare : wanted) {
+        ByteLiteral literal(wanted, false);
+        ByteLiteral::Frequencies frequencies = {};
+        frequencies.fill(9);
+        frequencies[static_cast<unsigned char>(rare)] = 1;
+        literal.Learn(frequencies);
+        for (int other = 0; other < wanted.size(); ++other) {
+            QByteArray bytes = wanted;
+            bytes[other] = '.';
+            QVERIFY(!literal.IsIn(bytes.constData(), bytes.size()));
+            bytes = bytes.repeated(20);
+            QVERIFY(!literal.IsIn(bytes.constData(), bytes.size()));
+        }
+    }
+
+    // The block looks as if the text were in it, and the bytes end with its first ones.
+    GuardedBytes guarded;
+    const QByteArray bytes = "k.m" + QByteArray(29, '.') + "kl";
+    char const* const at = guarded.Put(bytes, true);
+    QVERIFY(!ByteLiteral("klm", false).IsIn(at, bytes.size()));
+}
+
+// The first of many places, in blocks that hold nothing but the text.
+void tst_ByteLiteral::nothingElse()
+{
+    const QByteArray bytes(100, 'k');
+    for (int size = 1; size <= bytes.size(); ++size) {
+        const ByteLiteral literal(QByteArray(size, 'k'), false);
+        QCOMPARE(literal.Find(bytes.constBegin(), bytes.constEnd()), bytes.constBegin());
     }
 }
 

@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 
 #include "app/logfile/CandidateSearch.h"
+#include "support/GuardedBytes.h"
 
 #include <QtTest>
 
@@ -61,6 +62,7 @@ private slots:
     void places_data();
     void places();
     void rarestText();
+    void learnsFromTheSampleOnly();
 };
 
 void tst_CandidateSearch::candidates_data()
@@ -105,6 +107,14 @@ void tst_CandidateSearch::candidates_data()
         "\xE2\x84\xAA"
         "aput",
         true);
+    row(
+        "no hidden text in any case",
+        [] {
+            LogFilter filter;
+            filter.SetTerms(LogTerms(), LogTerms("kaput", false));
+            return filter;
+        }(),
+        utf8, "other", false);
     row("the bytes of a kelvin sign in Latin-1", inAnyCase("kaput"), latin1,
         "\xE2\x84\xAA"
         "aput",
@@ -121,6 +131,17 @@ void tst_CandidateSearch::candidates_data()
     row("a character that Latin-1 lacks", exactly(QString::fromUtf8("€")), latin1, "any", true);
     row("a character above 16 bits", exactly(QString::fromUtf8("😀")), utf8, "\xF0\x9F\x98\x80",
         true);
+    row("the last character of Latin-1, not there", exactly(QString::fromUtf8("ÿ")), latin1, "any",
+        false);
+    row("the first character after Latin-1", exactly(QString::fromUtf8("Ā")), latin1, "any", true);
+    row("one in Latin-1 and one that it lacks", exactly(QString::fromUtf8("é€")), latin1, "\xE9?",
+        true);
+    row("a character above 16 bits, not there", exactly(QString::fromUtf8("😀")), utf8, "any",
+        false);
+    row("a character, and what invalid bytes become", exactly(QString::fromUtf8("é\uFFFD")), utf8,
+        "\xC3\xA9\xFF", true);
+    row("a character above 16 bits, and what invalid bytes become",
+        exactly(QString::fromUtf8("😀\uFFFD")), utf8, "\xF0\x9F\x98\x80\xFF", true);
     row("half of it", exactly(QString(QChar(0xD83D))), utf8, "any", true);
     row("what invalid bytes become", exactly(QString(QChar(0xFFFD))), utf8, "\xFF", true);
     row("what invalid bytes become, and more", exactly(QString(QChar(0xFFFD)) + "a"), utf8,
@@ -267,6 +288,13 @@ void tst_CandidateSearch::places()
     }
     const CandidateSearch hiding(withTerms("absent", "", "absent2 diskfull"), utf8);
     QCOMPARE(int(hiding.Find(bytes.constBegin(), bytes.constEnd()) - bytes.constBegin()), place);
+
+    // In place of the text, a character that may equal one of its letters.
+    QByteArray unclear(length, 'x');
+    unclear.replace(place, 3, "\xE2\x84\xAA");
+    const CandidateSearch anyCase(inAnyCase("k"), utf8);
+    QCOMPARE(int(anyCase.Find(unclear.constBegin(), unclear.constEnd()) - unclear.constBegin()),
+             place);
 }
 
 // Of the texts of an expression, the one that is rarest in the sample is looked for.
@@ -277,6 +305,24 @@ void tst_CandidateSearch::rarestText()
     search.Learn(sample.constData(), sample.size());
     QCOMPARE(int(search.Find(sample.constBegin(), sample.constEnd()) - sample.constBegin()),
              sample.indexOf("77 "));
+
+    // Of two that are as rare, the longer one.
+    CandidateSearch asRare(matching("ab\\d+cdef"), utf8);
+    asRare.Learn(sample.constData(), sample.size());
+    const QByteArray both("ab 1 cdef");
+    QCOMPARE(int(asRare.Find(both.constBegin(), both.constEnd()) - both.constBegin()),
+             both.indexOf("cdef"));
+}
+
+void tst_CandidateSearch::learnsFromTheSampleOnly()
+{
+    CandidateSearch search(matching("ab\\d+cdef"), utf8);
+    GuardedBytes guarded;
+    const QByteArray sample("ab 1 cdef");
+    for (bool isAtEnd : {false, true})
+        search.Learn(guarded.Put(sample, isAtEnd), sample.size());
+    QCOMPARE(search.Find(sample.constBegin(), sample.constEnd()) - sample.constBegin(),
+             std::ptrdiff_t(sample.indexOf("cdef")));
 }
 
 QTEST_GUILESS_MAIN(tst_CandidateSearch)

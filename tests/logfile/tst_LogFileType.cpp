@@ -5,6 +5,7 @@
 
 #include "app/logfile/LogIndex.h"
 #include "app/logfile/LogLineParser.h"
+#include "support/GuardedBytes.h"
 
 #include <QtTest>
 
@@ -60,12 +61,15 @@ class tst_LogFileType : public QObject
 private slots:
     void owner_data();
     void owner();
+    void readsNothingElse();
+    void isLike();
     void encoding_data();
     void encoding();
     void chosenEncoding();
     void knownOwner();
     void content_data();
     void content();
+    void controls();
     void oneRun_data();
     void oneRun();
     void everyLine_data();
@@ -104,6 +108,15 @@ void tst_LogFileType::owner_data()
     row("JSON", "{\"level\":\"info\"}\n", true, false);
     row("only severities", "[INFO] x\n[ERROR] y\n", true, false);
     row("only severities that the log has", "1 Error x\n[ERROR] y\n", false, false);
+    row("syslog, and a line that the log may have written", "Nov 22 14:03:02 host x\n1 Error x\n",
+        true, false);
+    row("the log's own after the start of a journal", "__CURSOR=1\n" + own, false, true);
+    row("a severity at the end of a line", "2026-11-22 14:03:02.123 Trace\r\n", false, true);
+    const QByteArray json("{\"level\":\"info\",\"a\":\"");
+    row("an incomplete line, one byte short of all that is looked at",
+        json.leftJustified(LogFileType::HeadSize - 1, 'x'), false, false);
+    row("an incomplete line of all that is looked at",
+        json.leftJustified(LogFileType::HeadSize, 'x'), true, false);
     row("an incomplete line", "2026-11-22 14:03:02.1", false, false);
     row("a long first line", "{\"level\":\"info\",\"a\":\"" + QByteArray(70000, 'x'), true, false);
 }
@@ -115,6 +128,39 @@ void tst_LogFileType::owner()
     QTEST(type.isForeign, "isForeign");
     QTEST(type.isOwn, "isOwn");
     QVERIFY(!type.isJournal);
+    QCOMPARE(type.latest, QDate(2026, 11, 25));
+}
+
+// An empty first line has nothing before it.
+void tst_LogFileType::readsNothingElse()
+{
+    GuardedBytes guarded;
+    for (QByteArray const& head : {QByteArray("\n"), QByteArray("\r\n"), QByteArray("\nx\r")}) {
+        for (bool isAtEnd : {false, true}) {
+            char const* const at = guarded.Put(head, isAtEnd);
+            QVERIFY(!TypeOf(QByteArray::fromRawData(at, head.size())).isForeign);
+        }
+    }
+}
+
+void tst_LogFileType::isLike()
+{
+    const auto type = [](LogEncoding::Kind kind, bool isForeign, bool isJournal) {
+        LogFileType result;
+        result.encoding = kind;
+        result.isForeign = isForeign;
+        result.isJournal = isJournal;
+        return result;
+    };
+    const LogFileType one = type(LogEncoding::Utf8, true, false);
+    LogFileType same = one;
+    same.isOwn = true; // has no effect on how lines are split
+    same.latest = QDate(2026, 11, 22);
+    QVERIFY(one.IsLike(same));
+    QVERIFY(!one.IsLike(type(LogEncoding::Latin1, true, false)));
+    QVERIFY(!one.IsLike(type(LogEncoding::Utf8, false, false)));
+    QVERIFY(!one.IsLike(type(LogEncoding::Utf8, true, true)));
+    QVERIFY(!one.IsLike(type(LogEncoding::Latin1, false, true)));
 }
 
 void tst_LogFileType::encoding_data()
@@ -178,6 +224,18 @@ void tst_LogFileType::content_data()
                    6) +
             noise,
         LogFileType::Xz);
+    row("xz, whatever follows",
+        QByteArray("\xFD"
+                   "7zXZ\0\1",
+                   7) +
+            noise,
+        LogFileType::Xz);
+    row("nearly xz",
+        QByteArray("\xFD"
+                   "7zXZ\1",
+                   6) +
+            noise,
+        LogFileType::Binary);
     row("bzip2", "BZh91AY&SY" + noise, LogFileType::Bzip2);
     row("a line that begins like bzip2", "BZh9 is a line\n", LogFileType::Text);
     row("zstd", "\x28\xB5\x2F\xFD" + noise, LogFileType::Zstd);
@@ -187,6 +245,10 @@ void tst_LogFileType::content_data()
         LogFileType::Text);
     row("colors and progress", QByteArray("\x1B[1m10%\x1B[0m\b\b\b\r\n").repeated(9),
         LogFileType::Text);
+    row("a control in twenty characters", "\1" + QByteArray(19, 'x'), LogFileType::Text);
+    row("a control in less than twenty", "\1" + QByteArray(18, 'x'), LogFileType::Binary);
+    row("controls between zeros", QByteArray("\0\1\0\1", 4) + QByteArray(70, 'x'),
+        LogFileType::Binary);
     row("zeros after a power failure", line + QByteArray(4096, '\0'), LogFileType::Text);
 }
 
@@ -194,6 +256,16 @@ void tst_LogFileType::content()
 {
     QFETCH(QByteArray, head);
     QTEST(int(TypeOf(head).content), "content");
+}
+
+// Which characters text does not have.
+void tst_LogFileType::controls()
+{
+    for (int code = 0; code < 256; ++code) {
+        const bool isText = code >= 0x20 || (code >= '\a' && code <= '\r') || code == 0x1B;
+        QCOMPARE(LogFileType::ContentOf(QByteArray(10, char(code)), LogEncoding::Latin1),
+                 isText ? LogFileType::Text : LogFileType::Binary);
+    }
 }
 
 // A torn line may look like anything.
@@ -240,8 +312,9 @@ void tst_LogFileType::everyLine_data()
     QTest::addColumn<QByteArray>("file");
     QTest::addColumn<QStringList>("rows");
 
-    const QString text = "14:03:02 INFO \u20ac\n\u0a0a\u000a\n";
-    const QStringList lines({"14:03:02 INFO \u20ac\n", "\u0a0a\n", "\n"});
+    // In the second line, halves of two characters look like a line end.
+    const QString text = "14:03:02 INFO \u20ac\n\u0a0a\u0a41\u0100\u0a41\u000a\n";
+    const QStringList lines({"14:03:02 INFO \u20ac\n", "\u0a0a\u0a41\u0100\u0a41\n", "\n"});
     QByteArray big = Utf16Le(text);
     for (int i = 0; i < big.size(); i += 2)
         std::swap(big.data()[i], big.data()[i + 1]);
@@ -256,8 +329,8 @@ void tst_LogFileType::everyLine_data()
                       "a\xFF\nb\n")
         << QStringList({"a" + QString(QChar::ReplacementCharacter) + "\n", "b\n"});
     QTest::newRow("journal export")
-        << QByteArray("__CURSOR=1\nMESSAGE=a\n\n__CURSOR=2\nMESSAGE=b\n\n")
-        << QStringList({"__CURSOR=1\nMESSAGE=a\n\n", "__CURSOR=2\nMESSAGE=b\n\n"});
+        << QByteArray("__CURSOR=1\nMESSAGE=a\n\n__CURSOR=2\nMESSAGE=bc\n\n")
+        << QStringList({"__CURSOR=1\nMESSAGE=a\n\n", "__CURSOR=2\nMESSAGE=bc\n\n"});
 }
 
 void tst_LogFileType::everyLine()

@@ -17,6 +17,8 @@ private slots:
     void text();
     void errors();
     void sameText();
+    void hasText();
+    void earlierRuns();
 };
 
 void tst_LogFilter::filter()
@@ -109,6 +111,32 @@ void tst_LogFilter::sameText()
     QVERIFY(!plain.HasSameText(expression));
     QVERIFY(!plain.HasSameText(anyCase));
     QVERIFY(plain.HasSameText(hiding));
+}
+
+void tst_LogFilter::hasText()
+{
+    const LogTerms none;
+    const LogTerms some("a", true);
+    LogFilter filter;
+    QVERIFY(!filter.hasText());
+    filter.SetTerms(some, none);
+    QVERIFY(filter.hasText());
+    filter.SetTerms(none, some);
+    QVERIFY(filter.hasText());
+    filter.SetTerms(none, none);
+    QVERIFY(!filter.hasText());
+    QVERIFY(filter.SetText("a", false, true));
+    QVERIFY(filter.hasText());
+}
+
+void tst_LogFilter::earlierRuns()
+{
+    LogFilter filter;
+    QVERIFY(filter.earlierRuns());
+    filter.SetEarlierRuns(false);
+    QVERIFY(!filter.earlierRuns());
+    filter.SetEarlierRuns(true);
+    QVERIFY(filter.earlierRuns());
 }
 
 QTEST_GUILESS_MAIN(tst_LogFilter)

@@ -46,6 +46,7 @@ void tst_RequiredLiterals::literals_data()
     row("at least one", "ab+c", {"ab", "c"});
     row("at least one, lazy", "ab+?c", {"ab", "c"});
     row("a pair of surrogates, optional", "a😀?b", {"a", "b"});
+    row("a pair of surrogates at the start, optional", "😀?b", {"b"});
     row("none at all", "a{0}b", {"b"});
     row("none, but not at the start", "ca{0}b", {"c", "b"});
     row("none, in two digits", "a{00}b", {"b"});
@@ -69,6 +70,11 @@ void tst_RequiredLiterals::literals_data()
     row("groups in groups", "ab(c(d|e)f)ef", {"ab", "ef"});
     row("a group without a number", "ab(?:cd)*ef", {"ab", "ef"});
     row("a group with a name", "ab(?<n_1>cd)ef", {"ab", "ef"});
+    row("a group with a short name", "ab(?<n>cd)ef", {"ab", "ef"});
+    none("a group with a name that is not ASCII", "ab(?<é>cd)ef");
+    none("a group with a name that is not all ASCII", "ab(?<né>cd)ef");
+    row("an empty group without a number", "ab(?:)ef", {"ab", "ef"});
+    row("an empty group with a name", "ab(?<n>)ef", {"ab", "ef"});
     none("a group with a name in another style", "ab(?P<n>cd)ef");
     none("a group with a name in a third style", "ab(?'n'cd)ef");
     row("an atomic group", "ab(?>cd)ef", {"ab", "ef"});
@@ -101,6 +107,8 @@ void tst_RequiredLiterals::literals_data()
     row("a class of an opening bracket", "ab[[]ef", {"ab", "ef"});
     row("a class of a backslash", "ab[\\\\]ef", {"ab", "ef"});
     row("a class of a character by its number", "ab[\\x5d]ef", {"ab", "ef"});
+    row("a class of a colon", "ab[c:]ef", {"ab", "ef"});
+    none("a class of a character and a named class", "ab[c[:alpha:]]ef");
     none("a class of a named class", "ab[[:alpha:]]ef");
     none("a class of a control character", "ab[\\c]]ef]gh");
     none("a class with quotes", "ab[\\Q]\\E]ef");
@@ -111,6 +119,9 @@ void tst_RequiredLiterals::literals_data()
     row("an escaped backslash", "a\\\\b", {"a\\b"});
     row("an escaped character, optional", "a\\.?b", {"a", "b"});
     row("an escaped blank", "a\\ b", {"a b"});
+    row("an escaped tilde", "a\\~b", {"a~b"});
+    none("an escaped character that is not printed", "a\\\x7F"
+                                                     "b");
     none("an escaped character, not ASCII", "a\\éb");
     row("classes by a letter", "ab\\dcd\\Wef", {"ab", "cd", "ef"});
     row("a class by a letter, optional", "ab\\d?cd", {"ab", "cd"});
