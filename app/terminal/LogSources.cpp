@@ -48,6 +48,11 @@ void SortOldestFirst(QStringList& files)
 
 } // namespace
 
+QString LogSource::CurrentPath() const
+{
+    return LogFileList::CurrentOf(QFileInfo(path()).absoluteFilePath());
+}
+
 LogSources::LogSources(QStringList const& names, bool joinsFiles) : m_joinsFiles(joinsFiles)
 {
     if (names.isEmpty()) {

@@ -32,6 +32,9 @@ struct LogSource
 
     /// A path in the folder of the log.
     QString const& path() const { return log.isEmpty() ? files.first() : log; }
+
+    /// The current file of the log, even if only others are meant.
+    QString CurrentPath() const;
 };
 
 /// Finds the logs that a command line names. A name that is also that of a file is the file.

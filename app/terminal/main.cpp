@@ -86,6 +86,7 @@ void Command::printRuns()
     for (LogSource const& source : m_sources.sources()) {
         const std::unique_ptr<LogHistory> history = read(source, LogFilter());
         history->ReadTimes();
+        history->ReadEnds(source.CurrentPath());
         table.Add(source.name, *history);
     }
     if (m_options.isMerged)

@@ -189,13 +189,13 @@ void tst_VelocorLog::runs()
         QCOMPARE(rows.size(), 6);
         QVERIFY(rows[0].startsWith("program  start "));
         QVERIFY(rows[1].startsWith("Mail     2025-03-02 10:00:00.001  2025-03-03 09:00:00.501  "
-                                   "       0       1      2                     /"));
+                                   "unknown         0       1      2                     /"));
         QVERIFY(rows[2].startsWith("Notes    2025-03-01 07:00:00.001 "));
         QVERIFY(rows[2].endsWith("notes.log.1"));
         QVERIFY(rows[3].startsWith("Notes    2025-03-02 08:00:00.001  2025-03-02 08:00:05.001  "
-                                   "       0       1      3  start overwritten  /"));
+                                   "unknown         0       1      3  start overwritten  /"));
         QVERIFY(rows[4].startsWith("Notes    2025-03-03 09:00:00.001  2025-03-03 09:00:01.001  "
-                                   "       1       0      3                     /"));
+                                   "unknown         1       0      3                     /"));
     }
     const ProgramResult merged = run({"--runs", "--merge", "--format", "csv", "mail", "notes"});
     QByteArray order;
@@ -225,18 +225,21 @@ void tst_VelocorLog::tables()
     QCOMPARE(run({"pages.log", "--patterns", "--format", "json", "--since",
                   "2025-03-03 09:00:00.002", "--severity", "trace"})
                  .output,
-             QByteArray("{\"count\":1,\"first\":\"2025-03-03 09:00:00.003\",\"last\":"
-                        "\"2025-03-03 09:00:00.003\",\"severity\":\"Trace\",\"pattern\":"
+             QByteArray("{\"count\":1,\"first\":\"2025-03-03T09:00:00.003\",\"last\":"
+                        "\"2025-03-03T09:00:00.003\",\"severity\":\"Trace\",\"pattern\":"
                         "\"page # of \\\"\u2026\\\"\"}\n"));
     QCOMPARE(run({"pages.log", "--patterns", "--match", "nothing"}).exitCode, 1);
     const QByteArray csv = run({"pages.log", "--runs", "--format", "csv"}).output;
-    QCOMPARE(csv,
-             QByteArray("\"program\",\"start\",\"end\",\"warnings\",\"errors\",\"lines\","
-                        "\"note\",\"file\"\r\n\"pages.log\",\"2025-03-03 09:00:00.001\","
-                        "\"2025-03-03 09:00:00.003\",\"1\",\"0\",\"4\",\"\",\"pages.log\"\r\n"));
+    QCOMPARE(
+        csv,
+        QByteArray(
+            "\"program\",\"start\",\"end\",\"exit\",\"warnings\",\"errors\",\"lines\","
+            "\"note\",\"file\"\r\n\"pages.log\",\"2025-03-03T09:00:00.001\","
+            "\"2025-03-03T09:00:00.003\",\"unknown\",\"1\",\"0\",\"4\",\"\",\"pages.log\"\r\n"));
     QCOMPARE(run({"pages.log", "--runs", "--format", "json"}).output,
-             QByteArray("{\"program\":\"pages.log\",\"start\":\"2025-03-03 09:00:00.001\",\"end\":"
-                        "\"2025-03-03 09:00:00.003\",\"warnings\":1,\"errors\":0,\"lines\":4,"
+             QByteArray("{\"program\":\"pages.log\",\"start\":\"2025-03-03T09:00:00.001\",\"end\":"
+                        "\"2025-03-03T09:00:00.003\",\"exit\":\"unknown\",\"warnings\":1,"
+                        "\"errors\":0,\"lines\":4,"
                         "\"file\":\"pages.log\"}\n"));
 }
 
