@@ -45,6 +45,9 @@ public:
     /// @param joinsFiles  whether several files of one log are one source
     LogSources(QStringList const& names, bool joinsFiles);
 
+    /// Where the data folders of this user's programs are.
+    static QString FamilyFolder();
+
     QList<LogSource> const& sources() const { return m_sources; }
 
     /// Of the names that are neither a file nor a program, for users.
