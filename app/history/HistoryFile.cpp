@@ -35,6 +35,25 @@ QDateTime LastModified(QFile const& file)
     return QDateTime::fromMSecsSinceEpoch(qint64(time.tv_sec) * 1000 + time.tv_nsec / 1000000);
 }
 
+// What prints a compressed file; null if this is none.
+char const* UnpackerOf(LogFileType::Content content)
+{
+    switch (content) {
+    case LogFileType::Gzip:
+        return "zcat";
+    case LogFileType::Xz:
+        return "xzcat";
+    case LogFileType::Bzip2:
+        return "bzcat";
+    case LogFileType::Zstd:
+        return "zstdcat";
+    case LogFileType::Binary:
+    case LogFileType::Text:
+        break;
+    }
+    return nullptr;
+}
+
 } // namespace
 
 bool HistoryFile::Open(QString const& path)
@@ -64,6 +83,11 @@ bool HistoryFile::Read(LogLineParser const& parser, LogFilter const& filter)
     const QByteArray head = m_file->read(std::min<qint64>(LogFileType::HeadSize, end));
     m_parser = parser;
     m_parser.SetFileType(LogFileType::Of(head, parser, parser.chosenEncoding(), modified.date()));
+    if (char const* unpacker = UnpackerOf(m_parser.fileType().content)) {
+        m_error = QObject::tr("A compressed file. To read it: %1 FILE | velocor-log -")
+                      .arg(QLatin1String(unpacker));
+        return false;
+    }
     LogIndex index(m_parser, filter);
     QByteArray bytes(ReadSize, Qt::Uninitialized);
     qint64 count = m_file->seek(index.Begin()) ? 0 : -1;

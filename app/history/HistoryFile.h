@@ -34,8 +34,18 @@ public:
     /// Finds the lines and runs of the open file, and those lines that match.
     ///
     /// @param parser  the encoding and whose file it is are found out
-    /// @return false if it cannot be read; see error()
+    /// @return false if it cannot be read or is compressed; see error()
     bool Read(LogLineParser const& parser, LogFilter const& filter);
+
+    /// Keeps the same file open as another object, without its lines.
+    void Share(HistoryFile const& other)
+    {
+        m_path = other.m_path;
+        m_file = other.m_file;
+    }
+
+    /// Whether Open() succeeded.
+    bool isOpen() const { return m_file && m_file->isOpen(); }
 
     QString const& path() const { return m_path; }
 

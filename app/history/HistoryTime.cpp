@@ -5,7 +5,10 @@
 
 #include "app/logfile/DayNumber.h"
 #include "app/logfile/ForeignStamp.h"
+#include "app/logfile/LogPlace.h"
 #include "app/logfile/Milliseconds.h"
+
+#include <cstdio>
 
 namespace Velocor {
 
@@ -21,7 +24,30 @@ QDateTime HistoryTime::DateTime(qint64 time)
 
 qint64 HistoryTime::Now()
 {
-    return ForeignStamp::KeyOfEpoch(QDateTime::currentMSecsSinceEpoch());
+    return OfEpoch(QDateTime::currentMSecsSinceEpoch());
+}
+
+qint64 HistoryTime::OfEpoch(qint64 milliseconds)
+{
+    return ForeignStamp::KeyOfEpoch(milliseconds);
+}
+
+QByteArray HistoryTime::Text(qint64 time)
+{
+    const QDateTime moment = DateTime(time);
+    const QDate date = moment.date();
+    const QTime timeOfDay = moment.time();
+    char text[64];
+    const int length = std::snprintf(text, sizeof text, "%04d-%02d-%02dT%02d:%02d:%02d.%03d",
+                                     date.year(), date.month(), date.day(), timeOfDay.hour(),
+                                     timeOfDay.minute(), timeOfDay.second(), timeOfDay.msec());
+    return QByteArray(text, length);
+}
+
+qint64 HistoryTime::FromText(QByteArray const& text)
+{
+    const LogPlace place = LogPlace::Parse(QString::fromLatin1(text));
+    return place.kind == LogPlace::DateTime ? place.value : -1;
 }
 
 } // namespace Velocor

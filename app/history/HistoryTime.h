@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include <QByteArray>
 #include <QDateTime>
 
 namespace Velocor {
@@ -20,6 +21,20 @@ public:
 
     /// The time of an entry that is written now.
     static qint64 Now();
+
+    /// The time of an entry that is written at this moment.
+    ///
+    /// @param milliseconds  since 1970, in UTC
+    static qint64 OfEpoch(qint64 milliseconds);
+
+    /// A time for files, such as "2026-11-20T14:03:02.007". Uses no locale, so that it works while
+    /// a program exits.
+    static QByteArray Text(qint64 time);
+
+    /// Reads such a text.
+    ///
+    /// @return -1 if it is none
+    static qint64 FromText(QByteArray const& text);
 };
 
 } // namespace Velocor

@@ -5,6 +5,7 @@
 
 #include "app/history/HistoryClock.h"
 #include "app/history/HistoryLines.h"
+#include "app/history/RunEnds.h"
 #include "app/logfile/LogFileList.h"
 #include "app/logfile/Milliseconds.h"
 
@@ -175,6 +176,11 @@ void LogHistory::ReadTimes()
             run.start = run.start < 0 ? run.end : run.start;
         }
     }
+}
+
+void LogHistory::ReadEnds(QString const& path)
+{
+    RunEnds::Assign(RunEnds::Of(path), m_runs);
 }
 
 } // namespace Velocor

@@ -57,6 +57,11 @@ public:
     /// reading all files again.
     void ReadTimes();
 
+    /// Finds out how the runs ended, as far as RunEnds tells. After ReadTimes().
+    ///
+    /// @param path  the current file of the log, even if only others have been read
+    void ReadEnds(QString const& path);
+
 private:
     void open(QStringList const& paths);
     bool isInPlace() const;

@@ -49,6 +49,9 @@ public:
 
     void Write(PrintedLine const& line) override
     {
+        if (m_isIncomplete)
+            m_output->Write("\n", 1);
+        m_isIncomplete = false;
         if (m_programs.isShown())
             m_output->Write(m_programs.text(line.program).toLocal8Bit());
         if (line.parser.fileType().encoding.isWide()) {
@@ -56,13 +59,13 @@ public:
             return;
         }
         m_output->Write(line.bytes);
-        if (!line.bytes.endsWith('\n'))
-            m_output->Write("\n", 1);
+        m_isIncomplete = !line.bytes.endsWith('\n');
     }
 
 private:
     ProgramColumn m_programs;
     OutputBuffer* m_output;
+    bool m_isIncomplete = false; // the last line has no end, which it gets if another one follows
 };
 
 // The same for people at a terminal, which knows one encoding and obeys escape sequences.

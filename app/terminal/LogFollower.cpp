@@ -3,12 +3,14 @@
 
 #include "app/terminal/LogFollower.h"
 
+#include "app/history/HistoryLines.h"
 #include "app/history/HistoryTime.h"
 #include "app/logfile/LogIndex.h"
 #include "app/logfile/LogLineReader.h"
 #include "app/logfile/Milliseconds.h"
 
 #include <QObject>
+#include <QTimer>
 
 #include <algorithm>
 #include <utility>
@@ -43,14 +45,55 @@ void LogFollower::NotePrinted(HistoryFile const& file)
             m_printed[rows.start(row)] = rows.check(row);
     }
     forgetOldLines(rows);
+    m_held.Share(file);
 }
 
 void LogFollower::Start(LogLineParser const& parser, LogFilter const& filter)
 {
     m_parser = parser;
-    m_scanner.SetCurrentRequest(1);
+    m_filter = filter;
     m_scanner.SetWatched(true);
-    m_scanner.Open(1, m_path, parser, filter);
+    m_scanner.SetCurrentRequest(++m_request);
+    open();
+}
+
+void LogFollower::open()
+{
+    if (!m_held.isOpen())
+        m_held.Open(m_path);
+    m_scanner.Open(m_request, m_path, m_parser, m_filter);
+}
+
+// Not at once, because the scanner is sending an update. Others that it sends until then may be of
+// either file.
+void LogFollower::restart()
+{
+    m_held = HistoryFile();
+    m_hasLines = false;
+    m_end = 0;
+    m_printed.clear();
+    m_scanner.SetCurrentRequest(++m_request);
+    QTimer::singleShot(0, &m_scanner, [this] { open(); });
+}
+
+// What the file got before another one took its name.
+void LogFollower::printRest()
+{
+    if (!m_held.Read(m_parser, m_filter))
+        return;
+    LogRows const& rows = m_held.rows();
+    if (rows.lines().isEmpty())
+        return;
+    noteFirstLine(rows);
+    m_parser.SetFileType(m_held.parser().fileType());
+    HistoryLines lines(m_held);
+    const size_t newestEnd = rows.newestEnd();
+    const qint64 end = newestEnd < rows.lines().size() ? rows.lines().start(newestEnd) : rows.end();
+    printNew(rows, end, [&lines, &rows](size_t row, QByteArray& lineEnd) {
+        const QByteArray content = lines.Content(rows.line(row));
+        lineEnd = lines.bytes().mid(content.size());
+        return QByteArray(content.constData(), content.size());
+    });
 }
 
 // The first row of the newest run whose entry may have changed.
@@ -72,15 +115,18 @@ void LogFollower::take(LogUpdate const& update)
 {
     LogRows const& rows = *update.rows;
     m_scanner.NoteTaken();
-    if (!update.exists || rows.lines().isEmpty() || update.isPartial)
+    if (!update.exists || update.request != m_request)
         return;
-    const quint16 firstCheck = rows.lines().check(0);
-    if (m_hasLines && firstCheck != m_firstCheck) {
-        m_end = 0;
-        m_printed.clear();
+    if (m_held.isOpen() && !m_held.IsInPlace()) {
+        printRest();
+        restart();
+        return;
     }
-    m_hasLines = true;
-    m_firstCheck = firstCheck;
+    if (rows.lines().isEmpty() || update.isPartial)
+        return;
+    if (!m_held.isOpen())
+        m_held.Open(m_path);
+    noteFirstLine(rows);
 
     m_parser.SetFileType(update.type);
     LogLineReader reader;
@@ -89,6 +135,31 @@ void LogFollower::take(LogUpdate const& update)
     const size_t newestEnd = rows.newestEnd();
     const qint64 end =
         newestEnd < rows.lines().size() ? rows.lines().start(newestEnd) : rows.complete();
+    printNew(rows, end, [&](size_t row, QByteArray& lineEnd) {
+        const QByteArray content = reader.Line(rows.start(row));
+        const LogLineEnd usual = update.type.lineEnd();
+        const bool hasReturn =
+            reader.nextStart() - rows.start(row) == content.size() + 1 + usual.size();
+        lineEnd = (hasReturn ? "\r" : "") + usual.bytes();
+        return content;
+    });
+}
+
+// Another first line is that of another run.
+void LogFollower::noteFirstLine(LogRows const& rows)
+{
+    const quint16 firstCheck = rows.lines().check(0);
+    if (m_hasLines && firstCheck != m_firstCheck) {
+        m_end = 0;
+        m_printed.clear();
+    }
+    m_hasLines = true;
+    m_firstCheck = firstCheck;
+}
+
+// @param end  where the newest run ends in the file
+void LogFollower::printNew(LogRows const& rows, qint64 end, Line const& read)
+{
     for (size_t row = firstCandidate(rows); row < rows.size(); ++row) {
         const qint64 start = rows.start(row);
         if (start < 0 || start >= end)
@@ -97,12 +168,11 @@ void LogFollower::take(LogUpdate const& update)
         const auto printed = m_printed.find(start);
         if (printed != m_printed.end() && printed->second == rows.check(row))
             continue;
-        const QByteArray content = reader.Line(start);
+        QByteArray lineEnd;
+        const QByteArray content = read(row, lineEnd);
         if (LogRows::CheckOf(content.constData(), content.size()) != rows.check(row))
             continue; // overwritten meanwhile; the next update will have it
-        const LogLineEnd lineEnd = update.type.lineEnd();
-        const bool hasReturn = reader.nextStart() - start == content.size() + 1 + lineEnd.size();
-        print(rows, row, content, (hasReturn ? "\r" : "") + lineEnd.bytes());
+        print(rows, row, content, lineEnd);
         m_printed[start] = rows.check(row);
     }
     m_end = end;

@@ -18,7 +18,8 @@ namespace Velocor {
 ///
 /// An incomplete line waits for its end. If a line that arrives later makes its entry match, the
 /// lines of the entry that have not been printed are. What has been printed stays, even if such a
-/// line hides its entry. Needs an event loop.
+/// line hides its entry. The file is kept open, so that what it got right before it was rotated is
+/// printed, too. Needs an event loop.
 class LogFollower
 {
 public:
@@ -35,7 +36,14 @@ public:
     void Start(LogLineParser const& parser, LogFilter const& filter);
 
 private:
+    using Line = std::function<QByteArray(size_t row, QByteArray& lineEnd)>;
+
     void take(LogUpdate const& update);
+    void printRest();
+    void restart();
+    void open();
+    void noteFirstLine(LogRows const& rows);
+    void printNew(LogRows const& rows, qint64 end, Line const& read);
     size_t firstCandidate(LogRows const& rows) const;
     void print(LogRows const& rows, size_t row, QByteArray const& content,
                QByteArray const& lineEnd);
@@ -48,6 +56,9 @@ private:
     std::function<void()> m_flush;
     LogScanner m_scanner;
     LogLineParser m_parser;
+    LogFilter m_filter;
+    int m_request = 0;
+    HistoryFile m_held; // the file that is followed, under whatever name
 
     bool m_hasLines = false;
     quint16 m_firstCheck = 0;            // of the first line of the newest run

@@ -21,8 +21,7 @@ namespace {
 
 QList<ProgramLog> FamilyLogs()
 {
-    const QString data = QCoreApplication::instance()->property("DataPath").toString();
-    return ProgramLogs::In(QFileInfo(QDir::cleanPath(data)).path());
+    return ProgramLogs::In(LogSources::FamilyFolder());
 }
 
 LogSource SourceOf(ProgramLog const& log)
@@ -48,6 +47,11 @@ void SortOldestFirst(QStringList& files)
 
 } // namespace
 
+QString LogSource::CurrentPath() const
+{
+    return LogFileList::CurrentOf(QFileInfo(path()).absoluteFilePath());
+}
+
 LogSources::LogSources(QStringList const& names, bool joinsFiles) : m_joinsFiles(joinsFiles)
 {
     if (names.isEmpty()) {
@@ -61,6 +65,12 @@ LogSources::LogSources(QStringList const& names, bool joinsFiles) : m_joinsFiles
         if (source.files.size() > 1)
             SortOldestFirst(source.files);
     }
+}
+
+QString LogSources::FamilyFolder()
+{
+    const QString data = QCoreApplication::instance()->property("DataPath").toString();
+    return QFileInfo(QDir::cleanPath(data)).path();
 }
 
 void LogSources::add(QString const& name)

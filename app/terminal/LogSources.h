@@ -32,6 +32,9 @@ struct LogSource
 
     /// A path in the folder of the log.
     QString const& path() const { return log.isEmpty() ? files.first() : log; }
+
+    /// The current file of the log, even if only others are meant.
+    QString CurrentPath() const;
 };
 
 /// Finds the logs that a command line names. A name that is also that of a file is the file.
@@ -41,6 +44,9 @@ public:
     /// @param names  of files and programs; "-" is standard input; none: all programs
     /// @param joinsFiles  whether several files of one log are one source
     LogSources(QStringList const& names, bool joinsFiles);
+
+    /// Where the data folders of this user's programs are.
+    static QString FamilyFolder();
 
     QList<LogSource> const& sources() const { return m_sources; }
 

@@ -19,9 +19,19 @@ size_t ErrorsOf(HistoryRun const& run)
     return run.counts[LogEntry::Error] + run.counts[LogEntry::Fatal];
 }
 
-QString TableTime(qint64 time)
+QString ExitName(HistoryRun::Exit exit)
 {
-    return TextFormats::Time(time).replace(QLatin1Char('T'), QLatin1Char(' '));
+    switch (exit) {
+    case HistoryRun::Unknown:
+        break;
+    case HistoryRun::Normal:
+        return QStringLiteral("normal");
+    case HistoryRun::Abnormal:
+        return QStringLiteral("abnormal");
+    case HistoryRun::Running:
+        return QStringLiteral("running");
+    }
+    return QStringLiteral("unknown");
 }
 
 } // namespace
@@ -44,16 +54,17 @@ void RunTable::SortByTime()
 TextTable RunTable::Table() const
 {
     TextTable table({{"program", TextTable::Text},
-                     {"start", TextTable::Text},
-                     {"end", TextTable::Text},
+                     {"start", TextTable::Time},
+                     {"end", TextTable::Time},
+                     {"exit", TextTable::Text},
                      {"warnings", TextTable::Number},
                      {"errors", TextTable::Number},
                      {"lines", TextTable::Number},
                      {"note", TextTable::Text},
                      {"file", TextTable::Text}});
     for (Row const& row : m_rows)
-        table.AddRow({row.program, TableTime(row.run.start), TableTime(row.run.end),
-                      QString::number(row.run.counts[LogEntry::Warning]),
+        table.AddRow({row.program, TextFormats::Time(row.run.start), TextFormats::Time(row.run.end),
+                      ExitName(row.run.exit), QString::number(row.run.counts[LogEntry::Warning]),
                       QString::number(ErrorsOf(row.run)),
                       QString::number(row.run.endLine - row.run.firstLine),
                       row.run.isCut ? QObject::tr("start overwritten") : QString(), row.file});
@@ -63,14 +74,15 @@ TextTable RunTable::Table() const
 TextTable PatternTable(PatternList const& patterns)
 {
     TextTable table({{"count", TextTable::Number},
-                     {"first", TextTable::Text},
-                     {"last", TextTable::Text},
+                     {"first", TextTable::Time},
+                     {"last", TextTable::Time},
                      {"severity", TextTable::Text},
                      {"pattern", TextTable::Text}});
     for (PatternList::Pattern const& pattern : patterns.Sorted())
-        table.AddRow(
-            {QString::number(pattern.count), TableTime(pattern.first), TableTime(pattern.last),
-             QString::fromLatin1(LogSeverities::LoggedName(pattern.severity)), pattern.text});
+        table.AddRow({QString::number(pattern.count), TextFormats::Time(pattern.first),
+                      TextFormats::Time(pattern.last),
+                      QString::fromLatin1(LogSeverities::LoggedName(pattern.severity)),
+                      pattern.text});
     return table;
 }
 

@@ -228,7 +228,9 @@ bool Parser::readTime(char const* name, qint64& time, QString& error) const
     else if (place.kind == LogPlace::Interval)
         time = qMax<qint64>(0, now + place.value);
     else
-        error = QObject::tr("Not a time: %1").arg(value(name));
+        error = QObject::tr("Not a time: %1. Times are such as 2026-11-20, 14:03, \"2026-11-20 "
+                            "14:03\" or, until now, -2h, -30m and -1d.")
+                    .arg(value(name));
     return time >= 0;
 }
 

@@ -31,6 +31,13 @@ QVector<QString> TextTable::names() const
     return names;
 }
 
+// A cell for people.
+QString TextTable::shown(QVector<QString> const& row, int column) const
+{
+    QString cell = row[column];
+    return m_columns[column].kind == Time ? cell.replace(QLatin1Char('T'), QLatin1Char(' ')) : cell;
+}
+
 // The last column is as wide as each of its cells.
 QVector<int> TextTable::widths() const
 {
@@ -50,7 +57,7 @@ void TextTable::printText(OutputBuffer& output) const
     const auto print = [&](QVector<QString> const& row) {
         QString text;
         for (int column = 0; column < columns.size(); ++column) {
-            const QString cell = TextFormats::Harmless(row[column]);
+            const QString cell = TextFormats::Harmless(shown(row, column));
             text += column > 0 ? QLatin1String("  ") : QLatin1String("");
             text += m_columns[column].kind == Number ? cell.rightJustified(columns[column])
                                                      : cell.leftJustified(columns[column]);
@@ -71,8 +78,12 @@ void TextTable::printMarkdown(OutputBuffer& output) const
     for (Column const& column : m_columns)
         lines.append(QString::fromLatin1(column.kind == Number ? "---:" : "---"));
     output.Write(MarkdownRow(lines));
-    for (QVector<QString> const& row : m_rows)
-        output.Write(MarkdownRow(row));
+    for (QVector<QString> const& row : m_rows) {
+        QVector<QString> cells;
+        for (int column = 0; column < row.size(); ++column)
+            cells.append(shown(row, column));
+        output.Write(MarkdownRow(cells));
+    }
 }
 
 void TextTable::printCsv(OutputBuffer& output) const

@@ -21,7 +21,11 @@ namespace Velocor {
 class TextTable
 {
 public:
-    enum Kind { Text, Number };
+    enum Kind {
+        Text,
+        Number,
+        Time ///< cells as TextFormats::Time(); for people, a blank separates date and time
+    };
 
     struct Column
     {
@@ -41,6 +45,7 @@ public:
 private:
     QVector<QString> names() const;
     QVector<int> widths() const;
+    QString shown(QVector<QString> const& row, int column) const;
     void printText(OutputBuffer& output) const;
     void printMarkdown(OutputBuffer& output) const;
     void printCsv(OutputBuffer& output) const;

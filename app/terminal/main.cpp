@@ -10,6 +10,7 @@
 #include "app/terminal/OutputBuffer.h"
 #include "app/terminal/RunTable.h"
 #include "app/terminal/TerminalOptions.h"
+#include "app/terminal/TextFormats.h"
 
 #include <QCoreApplication>
 #include <QObject>
@@ -25,6 +26,13 @@ using namespace Velocor; // NOLINT(google-build-using-namespace): all of this fi
 
 // As grep has them.
 enum ExitCode { Found = 0, NothingFound = 1, Trouble = 2 };
+
+// Names of files and what users type may have characters that control the terminal.
+void PrintError(QString const& error)
+{
+    std::fprintf(stderr, "velocor-log: %s\n",
+                 TextFormats::Harmless(error).toLocal8Bit().constData());
+}
 
 class Command
 {
@@ -61,20 +69,27 @@ void Command::complain(QString const& problem)
 {
     m_hasTrouble = true;
     m_output.Flush(); // so that the complaint comes after the lines before it
-    std::fprintf(stderr, "velocor-log: %s\n", problem.toLocal8Bit().constData());
+    PrintError(problem);
 }
 
 std::unique_ptr<LogHistory> Command::read(LogSource const& source, LogFilter const& filter)
 {
     auto history = std::make_unique<LogHistory>(LogFormats::ParserFor(source.path()), filter);
     source.Read(*history);
+    // Users do not know the copy of standard input.
+    const auto shown = [&source](QString text) {
+        return source.isInput ? text.replace(source.path(), source.name) : text;
+    };
     for (QString const& error : history->errors())
-        complain(error);
+        complain(shown(error));
     for (HistoryFile const& file : history->files()) {
+        if (file.parser().fileType().content == LogFileType::Binary)
+            complain(QObject::tr("%1: A binary file, printed as if it were text")
+                         .arg(shown(file.path())));
         if (file.slowLine() > 0)
             complain(QObject::tr("%1: line %2: the expression takes too long, so all lines count "
                                  "as matches")
-                         .arg(file.path())
+                         .arg(shown(file.path()))
                          .arg(file.slowLine()));
     }
     return history;
@@ -86,6 +101,7 @@ void Command::printRuns()
     for (LogSource const& source : m_sources.sources()) {
         const std::unique_ptr<LogHistory> history = read(source, LogFilter());
         history->ReadTimes();
+        history->ReadEnds(source.CurrentPath());
         table.Add(source.name, *history);
     }
     if (m_options.isMerged)
@@ -210,6 +226,8 @@ int Command::run()
 {
     for (QString const& error : m_sources.errors())
         complain(error);
+    if (m_options.names.isEmpty() && m_sources.sources().isEmpty())
+        PrintError(QObject::tr("No logs of programs in %1").arg(LogSources::FamilyFolder()));
     if (m_options.showsRuns)
         printRuns();
     else if (m_options.showsPatterns)
@@ -232,8 +250,7 @@ int main(int argc, char** argv)
     AppPaths::SetOrganizationAndProduct();
     TerminalOptions options = TerminalOptions::Parse(QCoreApplication::arguments());
     if (!options.error.isEmpty()) {
-        const QByteArray error = options.error.toLocal8Bit();
-        std::fprintf(stderr, "velocor-log: %s\n", error.constData());
+        PrintError(options.error);
         return Trouble;
     }
     if (!options.answer.isEmpty()) {

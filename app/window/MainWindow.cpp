@@ -7,6 +7,7 @@
 #include "app/UserMessages.h"
 #include "app/runninglog/LogHealth.h"
 #include "app/runninglog/LogPreferences.h"
+#include "app/runninglog/RunMark.h"
 #include "app/runninglog/RunningLog.h"
 #include "app/window/ApplicationProperty.h"
 #include "app/window/CurrentTab.h"
@@ -61,8 +62,8 @@ QIcon WindowIcon()
 } // namespace
 
 MainWindow::MainWindow(QWidget* parent)
-    : QMainWindow(parent), m_settings(ApplicationProperty("DataPath")),
-      m_marks(ApplicationProperty("DataPath"))
+    : QMainWindow(parent), m_runMark(std::make_unique<RunMark>(RunningLog::FileName())),
+      m_settings(ApplicationProperty("DataPath")), m_marks(ApplicationProperty("DataPath"))
 {
     setWindowTitle(ApplicationProperty("caption"));
     setAcceptDrops(true);
@@ -310,6 +311,7 @@ bool MainWindow::event(QEvent* event)
 void MainWindow::startWork()
 {
     m_tabs->ownLog()->Open(RunningLog::FileName(), true);
+    m_runMark->CollectOthers();
     m_logHealth = std::make_unique<LogHealth>();
     connect(&m_healthTimer, &QTimer::timeout, this, &MainWindow::checkLog);
     connect(m_logHealth.get(), &LogHealth::mayHaveChanged, this, [this] {

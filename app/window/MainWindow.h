@@ -26,6 +26,7 @@ class MainMenus;
 class MainToolBar;
 class NoticeBar;
 class PlacesPanel;
+class RunMark;
 class TextFont;
 class WindowDialogs;
 
@@ -81,6 +82,7 @@ private:
     void checkLog();
     void showMessage(QString const& text);
 
+    std::unique_ptr<RunMark> m_runMark;
     WindowSettings m_settings;
     MarksFile m_marks;
     QStringList m_filesOfStart;

@@ -782,7 +782,8 @@ public:
         static const QRegularExpression mayBeThere(
             "^(home/|data/|config/|temp/|run/.*|report|logs/|data/other/(other\\.cfg)?|"
             "data/yourorganization/(yourproduct/(velocor\\.cfg(\\.saving)?|"
-            "running-velocor\\.log/.*|logs/(logsettings\\.cfg|velocor\\.log(\\.[12])?)?)?)?)$");
+            "(running|ended)-velocor\\.log(/.*)?|logs/"
+            "(logsettings\\.cfg|velocor\\.log(\\.[12])?)?)?)?)$");
         const QStringList entries = TestFiles::listing(m_folder.root());
         for (QString const& entry : entries) {
             if (!mayBeThere.match(entry.section(": ", 0, 0)).hasMatch())

@@ -43,10 +43,13 @@ private slots:
     void tables();
     void problems_data();
     void problems();
+    void binaryFile();
+    void noPrograms();
     void documented_data();
     void documented();
     void relativeTimes();
     void standardInput();
+    void compressedInput();
     void bytesAsInFile_data();
     void bytesAsInFile();
     void terminal();
@@ -54,6 +57,8 @@ private slots:
     void fullDisk();
     void follow();
     void followedFileWithTheSameHeader();
+    void followedUntilRotation_data();
+    void followedUntilRotation();
     void followedEntry();
     void followedRuns();
 
@@ -189,13 +194,13 @@ void tst_VelocorLog::runs()
         QCOMPARE(rows.size(), 6);
         QVERIFY(rows[0].startsWith("program  start "));
         QVERIFY(rows[1].startsWith("Mail     2025-03-02 10:00:00.001  2025-03-03 09:00:00.501  "
-                                   "       0       1      2                     /"));
+                                   "unknown         0       1      2                     /"));
         QVERIFY(rows[2].startsWith("Notes    2025-03-01 07:00:00.001 "));
         QVERIFY(rows[2].endsWith("notes.log.1"));
         QVERIFY(rows[3].startsWith("Notes    2025-03-02 08:00:00.001  2025-03-02 08:00:05.001  "
-                                   "       0       1      3  start overwritten  /"));
+                                   "unknown         0       1      3  start overwritten  /"));
         QVERIFY(rows[4].startsWith("Notes    2025-03-03 09:00:00.001  2025-03-03 09:00:01.001  "
-                                   "       1       0      3                     /"));
+                                   "unknown         1       0      3                     /"));
     }
     const ProgramResult merged = run({"--runs", "--merge", "--format", "csv", "mail", "notes"});
     QByteArray order;
@@ -225,18 +230,21 @@ void tst_VelocorLog::tables()
     QCOMPARE(run({"pages.log", "--patterns", "--format", "json", "--since",
                   "2025-03-03 09:00:00.002", "--severity", "trace"})
                  .output,
-             QByteArray("{\"count\":1,\"first\":\"2025-03-03 09:00:00.003\",\"last\":"
-                        "\"2025-03-03 09:00:00.003\",\"severity\":\"Trace\",\"pattern\":"
+             QByteArray("{\"count\":1,\"first\":\"2025-03-03T09:00:00.003\",\"last\":"
+                        "\"2025-03-03T09:00:00.003\",\"severity\":\"Trace\",\"pattern\":"
                         "\"page # of \\\"\u2026\\\"\"}\n"));
     QCOMPARE(run({"pages.log", "--patterns", "--match", "nothing"}).exitCode, 1);
     const QByteArray csv = run({"pages.log", "--runs", "--format", "csv"}).output;
-    QCOMPARE(csv,
-             QByteArray("\"program\",\"start\",\"end\",\"warnings\",\"errors\",\"lines\","
-                        "\"note\",\"file\"\r\n\"pages.log\",\"2025-03-03 09:00:00.001\","
-                        "\"2025-03-03 09:00:00.003\",\"1\",\"0\",\"4\",\"\",\"pages.log\"\r\n"));
+    QCOMPARE(
+        csv,
+        QByteArray(
+            "\"program\",\"start\",\"end\",\"exit\",\"warnings\",\"errors\",\"lines\","
+            "\"note\",\"file\"\r\n\"pages.log\",\"2025-03-03T09:00:00.001\","
+            "\"2025-03-03T09:00:00.003\",\"unknown\",\"1\",\"0\",\"4\",\"\",\"pages.log\"\r\n"));
     QCOMPARE(run({"pages.log", "--runs", "--format", "json"}).output,
-             QByteArray("{\"program\":\"pages.log\",\"start\":\"2025-03-03 09:00:00.001\",\"end\":"
-                        "\"2025-03-03 09:00:00.003\",\"warnings\":1,\"errors\":0,\"lines\":4,"
+             QByteArray("{\"program\":\"pages.log\",\"start\":\"2025-03-03T09:00:00.001\",\"end\":"
+                        "\"2025-03-03T09:00:00.003\",\"exit\":\"unknown\",\"warnings\":1,"
+                        "\"errors\":0,\"lines\":4,"
                         "\"file\":\"pages.log\"}\n"));
 }
 
@@ -259,7 +267,17 @@ void tst_VelocorLog::problems_data()
     row("context", "--context x", "Not a number of lines: x");
     row("negative context", "--context=-1", "Not a number of lines: -1");
     row("format", "--format xml", "Not a format: xml");
-    row("time", "--since someday", "Not a time: someday");
+    row("time", "--since someday",
+        "Not a time: someday. Times are such as 2026-11-20, 14:03, \"2026-11-20 14:03\" or, until "
+        "now, -2h, -30m and -1d.");
+    row("control characters", "a\033[2Jb\n", "a\u241b[2Jb\u240a: No such file or program");
+    row("control characters of an option", "--severity=\033c", "Not a list of severities: \u241bc");
+    row("gzip", "old.log.gz",
+        "old.log.gz: A compressed file. To read it: zcat FILE | velocor-log -");
+    row("xz", "old.log.xz",
+        "old.log.xz: A compressed file. To read it: xzcat FILE | velocor-log -");
+    row("bzip2", "old.bz2", "old.bz2: A compressed file. To read it: bzcat FILE | velocor-log -");
+    row("zstd", "old.zst", "old.zst: A compressed file. To read it: zstdcat FILE | velocor-log -");
     row("a table that goes on", "--follow --patterns",
         "--follow prints lines, so there is no end of a table.");
     row("a code block that goes on", "--follow --format markdown",
@@ -275,6 +293,12 @@ void tst_VelocorLog::problems()
     QFETCH(QString, arguments);
     QFETCH(QByteArray, error);
     ::mkfifo("pipe", 0600);
+    QVERIFY(TestFiles::write("old.log.gz", QByteArray("\x1f\x8b\x08\0\0\0\0", 7)));
+    QVERIFY(TestFiles::write("old.log.xz", QByteArray("\xfd"
+                                                      "7zXZ\0\n",
+                                                      7)));
+    QVERIFY(TestFiles::write("old.bz2", "BZh91AY&SY"));
+    QVERIFY(TestFiles::write("old.zst", "\x28\xb5\x2f\xfd\n"));
     const ProgramResult result = run(Words(arguments));
     QVERIFY(result.finished);
     // Qt's library words what is wrong with an expression.
@@ -287,6 +311,33 @@ void tst_VelocorLog::problems()
     // What can be read is printed all the same.
     if (!arguments.startsWith("--"))
         QCOMPARE(run({arguments, "mail"}).output, Mail);
+}
+
+// Something may be found in it all the same.
+void tst_VelocorLog::binaryFile()
+{
+    const QByteArray bytes = QByteArray("\1\2\3\4\5\6\7", 7).repeated(20) + "\nfound\n";
+    QVERIFY(TestFiles::write("program.bin", bytes));
+    const ProgramResult result = run({"program.bin"});
+    QCOMPARE(result.output, bytes);
+    QCOMPARE(result.errors,
+             QByteArray("velocor-log: program.bin: A binary file, printed as if it were text\n"));
+    QCOMPARE(result.exitCode, 2);
+    QCOMPARE(run({"program.bin", "--match", "fo"}).output, QByteArray("found\n"));
+}
+
+void tst_VelocorLog::noPrograms()
+{
+    const QTemporaryDir empty;
+    QProcessEnvironment environment = m_environment;
+    environment.insert("XDG_DATA_HOME", empty.path());
+    for (QStringList const& arguments : {QStringList(), QStringList({"--merge"})}) {
+        const ProgramResult result = RunProgram(VELOCOR_LOG, arguments, environment);
+        QCOMPARE(result.output, QByteArray());
+        QCOMPARE(result.errors, "velocor-log: No logs of programs in " +
+                                    QFile::encodeName(empty.path()) + "/yourorganization\n");
+        QCOMPARE(result.exitCode, 1);
+    }
 }
 
 void tst_VelocorLog::documented_data()
@@ -338,6 +389,21 @@ void tst_VelocorLog::standardInput()
     QCOMPARE(process.exitCode(), 0);
 }
 
+// Nobody has heard of the copy that is read.
+void tst_VelocorLog::compressedInput()
+{
+    QProcess process;
+    process.setProcessEnvironment(m_environment);
+    process.start(VELOCOR_LOG, {"-"});
+    process.write("BZh91AY&SY");
+    process.closeWriteChannel();
+    QVERIFY(process.waitForFinished());
+    QCOMPARE(process.readAllStandardError(),
+             QByteArray("velocor-log: -: A compressed file. To read it: bzcat FILE | velocor-log "
+                        "-\n"));
+    QCOMPARE(process.exitCode(), 2);
+}
+
 void tst_VelocorLog::bytesAsInFile_data()
 {
     QTest::addColumn<QByteArray>("bytes");
@@ -346,7 +412,10 @@ void tst_VelocorLog::bytesAsInFile_data()
         QTest::newRow(name) << bytes << output;
     };
     row("carriage returns", "a\r\nb\r\n", "a\r\nb\r\n");
-    row("no last line end", "a\nb", "a\nb\n");
+    row("no last line end", "a\nb", "a\nb");
+    row("an incomplete line before another one",
+        "2025-03-03 09:00:02.001 Trace a\n2025-03-02 09:00:00.001 Trace b",
+        "2025-03-02 09:00:00.001 Trace b\n2025-03-03 09:00:02.001 Trace a\n");
     row("Latin-1", "caf\xe9\n", "caf\xe9\n");
     row("UTF-8", "caf\xc3\xa9\n", "caf\xc3\xa9\n");
     row("control characters", "a\033[1m\n", "a\033[1m\n");
@@ -466,7 +535,7 @@ void tst_VelocorLog::follow()
     QCOMPARE(follower.process().readAll(), QByteArray());
 }
 
-// The lines of a new file are not taken for those of the one before, which begins like it.
+// The lines of a new file are not taken for those of the one before, even if it begins like it.
 void tst_VelocorLog::followedFileWithTheSameHeader()
 {
     QByteArray const header = "#Fields: h\n";
@@ -475,7 +544,47 @@ void tst_VelocorLog::followedFileWithTheSameHeader()
     QCOMPARE(follower.next(3), QByteArray("hab"));
     QVERIFY(QFile::rename("followed.log", "followed.log.1"));
     QVERIFY(TestFiles::write("followed.log", header + At + "3 Trace c\n" + At + "4 Trace d\n"));
-    QCOMPARE(follower.next(2), QByteArray("cd"));
+    QCOMPARE(follower.next(3), QByteArray("hcd"));
+}
+
+void tst_VelocorLog::followedUntilRotation_data()
+{
+    QTest::addColumn<bool>("isRenamed");
+    QTest::addColumn<QString>("expression");
+    QTest::addColumn<QByteArray>("expected");
+    QTest::newRow("renamed") << true << ".*" << QByteArray("bcdef");
+    QTest::newRow("copied and removed") << false << ".*" << QByteArray("bcdef");
+    QTest::newRow("with a filter") << false << "[ace]$" << QByteArray("cde"); // an entry whole
+}
+
+// The program had no chance to look in between.
+void tst_VelocorLog::followedUntilRotation()
+{
+    QFETCH(bool, isRenamed);
+    QFETCH(QString, expression);
+    QFETCH(QByteArray, expected);
+    const QString old = "rotated.log.1";
+    QFile::remove(old);
+    QByteArray text = "2025-03-02 08:00:00.001 Trace a\n";
+    QVERIFY(TestFiles::write("rotated.log", text));
+    Follower follower({"rotated.log", "--match", expression}, m_environment);
+    QCOMPARE(follower.next(), QByteArray("a"));
+    const auto process = static_cast<pid_t>(follower.process().processId());
+    ::kill(process, SIGSTOP);
+    text += "2025-03-02 08:00:00.002 Trace b\n2025-03-02 08:00:00.003 Trace c\nincomplete d";
+    QVERIFY(TestFiles::writeOver("rotated.log", text));
+    QVERIFY(isRenamed ? QFile::rename("rotated.log", old)
+                      : QFile::copy("rotated.log", old) && QFile::remove("rotated.log"));
+    QVERIFY(TestFiles::write("rotated.new", "2025-03-02 08:00:00.004 Trace e\n"));
+    QVERIFY(QFile::rename("rotated.new", "rotated.log"));
+    ::kill(process, SIGCONT);
+    QCOMPARE(follower.next(expected.size() - expected.endsWith('f')),
+             expected.left(expected.size() - expected.endsWith('f')));
+    QVERIFY(TestFiles::writeOver("rotated.log", "2025-03-02 08:00:00.004 Trace e\n"
+                                                "2025-03-02 08:00:00.005 Trace f\n"
+                                                "2025-03-02 08:00:00.006 Trace a\n"));
+    QCOMPARE(follower.next(expected.endsWith('f') ? 2 : 1),
+             QByteArray(expected.endsWith('f') ? "fa" : "a"));
 }
 
 // All lines of an entry are printed when one of them matches.

@@ -1,0 +1,365 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// What velocor-log says about how runs of the program ended. The program is ended for real.
+
+#include "../app/Installation.h"
+#include "app/history/RunEnds.h"
+#include "app/runninglog/RunMark.h"
+#include "support/TestFiles.h"
+
+#include <QTemporaryDir>
+#include <QtTest>
+
+#include <csignal>
+#include <cstdlib>
+#include <sys/wait.h>
+#include <unistd.h>
+
+using namespace Velocor;
+
+namespace {
+
+// Of the user of an installation.
+QString LogOf(Installation const& installation)
+{
+    return installation.LogFolder() + "velocor.log";
+}
+
+// The exits of the log's runs, oldest first.
+QByteArrayList Exits(Installation const& installation, QString const& log)
+{
+    const ProgramResult result =
+        RunProgram(VELOCOR_LOG, {log, log + ".1", "--merge", "--runs", "--format", "json"},
+                   installation.environment);
+    QByteArrayList exits;
+    for (QByteArray const& line : result.output.split('\n')) {
+        if (!line.isEmpty())
+            exits.append(QJsonDocument::fromJson(line).object().value("exit").toString().toUtf8());
+    }
+    return exits;
+}
+
+QStringList Marks(Installation const& installation)
+{
+    const QDir folder(RunEnds::MarkFolderOf(LogOf(installation)));
+    QStringList marks;
+    for (QString const& name : folder.entryList({"*.run"}))
+        marks.append(folder.filePath(name));
+    return marks;
+}
+
+QByteArrayList DistinctOf(QByteArrayList list)
+{
+    std::sort(list.begin(), list.end());
+    list.erase(std::unique(list.begin(), list.end()), list.end());
+    return list;
+}
+
+QStringList Words(QString const& text)
+{
+    return text.isEmpty() ? QStringList() : text.split(' ');
+}
+
+bool CopyFolder(QString const& from, QString const& to)
+{
+    return QProcess::execute("cp", {"-a", from, to}) == 0;
+}
+
+// As from a backup: the file is the same, and older than its last change.
+bool MakeRestored(QString const& mark)
+{
+    QByteArrayList parts = TestFiles::read(mark).split(' ');
+    if (parts.size() != 4)
+        return false;
+    parts[1] = QByteArray::number(parts[1].toLongLong() - 60000);
+    return TestFiles::writeOver(mark, parts.join(' '));
+}
+
+} // namespace
+
+class tst_RunExits : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void exits_data();
+    void exits();
+    void endOfTheSession();
+    void secondWindow();
+    void copiedFolder();
+    void assigned_data();
+    void assigned();
+    void damagedRecords();
+    void markOfAForkedChild();
+    void longRecord();
+
+private:
+    static void endLike(Installation const& installation, RunningProgram& program,
+                        QString const& how);
+    static void compareAfterNextStart(Installation const& installation, QByteArray const& expected);
+};
+
+void tst_RunExits::exits_data()
+{
+    QTest::addColumn<QString>("how");
+    QTest::addColumn<QByteArray>("expected");
+    const auto row = [](char const* how, char const* expected) {
+        QTest::newRow(how) << how << QByteArray(expected);
+    };
+    row("still running", "running");
+    row("closed", "normal");
+    row("told to end", "normal");
+    row("terminal closed", "normal");
+    row("killed", "abnormal");
+    row("invalid memory access", "abnormal");
+    row("aborted", "abnormal");
+    row("killed, and its process ID used again", "abnormal");
+    row("restored from a backup", "unknown");
+    row("mark of another computer", "unknown");
+    row("mark removed", "unknown");
+}
+
+void tst_RunExits::endLike(Installation const& installation, RunningProgram& program,
+                           QString const& how)
+{
+    static const QMap<QString, int> signalsOf = {{"told to end", SIGTERM},
+                                                 {"terminal closed", SIGHUP},
+                                                 {"invalid memory access", SIGSEGV},
+                                                 {"aborted", SIGABRT}};
+    const pid_t id = program.Id();
+    program.Send(signalsOf.value(how, SIGKILL));
+    program.ExitCode();
+    const QStringList marks = Marks(installation);
+    if (how.startsWith("killed, ")) {
+        QString living = marks.value(0);
+        living.replace(QString("-%1.").arg(id),
+                       QString("-%1.").arg(QCoreApplication::applicationPid()));
+        QVERIFY(living != marks.value(0));
+        QVERIFY(QFile::rename(marks.value(0), living));
+    } else if (how == "restored from a backup") {
+        QVERIFY(MakeRestored(marks.value(0)));
+    } else if (how == "mark of another computer") {
+        QVERIFY(TestFiles::writeOver(marks.value(0),
+                                     TestFiles::read(marks.value(0)).trimmed() + "x\n"));
+    } else if (how == "mark removed") {
+        QVERIFY(QFile::remove(marks.value(0)));
+    }
+}
+
+void tst_RunExits::exits()
+{
+    QFETCH(QString, how);
+    QFETCH(QByteArray, expected);
+    Installation installation;
+    if (how == "closed")
+        installation.AddSpy("close");
+    RunningProgram program(installation);
+    if (how == "closed") {
+        QCOMPARE(program.ExitCode(), 0);
+    } else {
+        QTRY_COMPARE_WITH_TIMEOUT(Exits(installation, LogOf(installation)),
+                                  QByteArrayList({"running"}), Patience);
+        if (how != "still running")
+            endLike(installation, program, how);
+    }
+    QCOMPARE(Exits(installation, LogOf(installation)), QByteArrayList({expected}));
+    installation.environment.remove("QT_QPA_GENERIC_PLUGINS");
+    if (how != "still running")
+        compareAfterNextStart(installation, expected);
+}
+
+// The next start removes the marks that tell something, and keeps what they told.
+void tst_RunExits::compareAfterNextStart(Installation const& installation,
+                                         QByteArray const& expected)
+{
+    const QString log = LogOf(installation);
+    const int doubtful = expected == "unknown" ? Marks(installation).size() : 0;
+    QVERIFY(QFile::rename(log, log + ".1"));
+    RunningProgram program(installation);
+    QTRY_COMPARE_WITH_TIMEOUT(Exits(installation, log), QByteArrayList({expected, "running"}),
+                              Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(Marks(installation).size(), 1 + doubtful, Patience);
+    QCOMPARE(Exits(installation, log), QByteArrayList({expected, "running"}));
+    program.Send(SIGTERM);
+    program.ExitCode();
+    QCOMPARE(Exits(installation, log), QByteArrayList({expected, "normal"}));
+}
+
+// The display goes away, and the program exits without returning to main().
+void tst_RunExits::endOfTheSession()
+{
+    if (QStandardPaths::findExecutable("Xvfb").isEmpty())
+        QSKIP("no Xvfb");
+    QProcess display;
+    display.start("Xvfb", {"-displayfd", "1", "-screen", "0", "800x600x24", "-nolisten", "tcp"});
+    const QByteArray number = NextLine(display).trimmed();
+    QVERIFY(!number.isEmpty());
+    Installation installation;
+    installation.environment.insert("DISPLAY", ":" + number);
+    installation.environment.insert("QT_QPA_PLATFORM", "xcb");
+    RunningProgram program(installation);
+    QTRY_COMPARE_WITH_TIMEOUT(Exits(installation, LogOf(installation)), QByteArrayList({"running"}),
+                              Patience);
+    display.terminate();
+    QVERIFY(display.waitForFinished(Patience));
+    QVERIFY(program.ExitCode() > 0);
+    QCOMPARE(Exits(installation, LogOf(installation)), QByteArrayList({"normal"}));
+    QCOMPARE(Marks(installation), QStringList());
+}
+
+// Both write to the same file, so it may not be known whose run it is. It did not crash, though.
+void tst_RunExits::secondWindow()
+{
+    Installation const installation;
+    const QString log = LogOf(installation);
+    RunningProgram first(installation);
+    QTRY_COMPARE_WITH_TIMEOUT(Exits(installation, log), QByteArrayList({"running"}), Patience);
+    RunningProgram second(installation);
+    QTRY_COMPARE_WITH_TIMEOUT(Marks(installation).size(), 2, Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(Exits(installation, log).last(), QByteArray("running"), Patience);
+    second.Send(SIGTERM);
+    QCOMPARE(second.ExitCode(), 0);
+    QVERIFY(!Exits(installation, log).contains("abnormal"));
+    QCOMPARE(Marks(installation).size(), 1);
+    first.Send(SIGTERM);
+    QCOMPARE(first.ExitCode(), 0);
+    QCOMPARE(DistinctOf(Exits(installation, log)), QByteArrayList({"normal"}));
+    QVERIFY(!QFile::exists(RunEnds::MarkFolderOf(log)));
+}
+
+// The copy of a running program's mark is held by nobody.
+void tst_RunExits::copiedFolder()
+{
+    Installation const installation;
+    RunningProgram program(installation);
+    QTRY_COMPARE_WITH_TIMEOUT(Exits(installation, LogOf(installation)), QByteArrayList({"running"}),
+                              Patience);
+    const QString copy = installation.top + "copy";
+    QVERIFY(CopyFolder(installation.LogFolder() + "..", copy));
+    QVERIFY(QFile::exists(copy + "/logs/velocor.log"));
+    QCOMPARE(Exits(installation, copy + "/logs/velocor.log"), QByteArrayList({"unknown"}));
+    program.Send(SIGTERM);
+    program.ExitCode();
+    QVERIFY(CopyFolder(installation.LogFolder() + "..", copy + "2"));
+    QCOMPARE(Exits(installation, copy + "2/logs/velocor.log"), QByteArrayList({"normal"}));
+}
+
+void tst_RunExits::assigned_data()
+{
+    QTest::addColumn<QString>("ends"); // start-end and first letter of the exit
+    QTest::addColumn<QString>("runs"); // start; "c": its own start has been overwritten
+    QTest::addColumn<QString>("expected");
+    const auto row = [](char const* name, char const* ends, char const* runs,
+                        char const* expected) {
+        QTest::newRow(name) << QString(ends) << QString(runs) << QString(expected);
+    };
+    row("nothing known", "", "10001", "U");
+    row("run without times", "5001-90001N", "-1", "U");
+    row("one run", "10000-20001N", "10001", "N");
+    row("entry at the start of the program", "10001-20001N", "10001", "N");
+    row("entry before the program", "10002-20001N", "10001", "U");
+    row("entry at its end", "10000-20001N", "20001", "N");
+    row("entry after its end", "10000-20001N", "20002", "U");
+    row("stamps in seconds", "10999-20001N", "10000", "N");
+    row("stamps in seconds, too early", "11000-20001N", "10000", "U");
+    row("stamps in minutes", "119999-200001N", "60000", "N");
+    row("stamps in minutes, too early", "120000-200001N", "60000", "U");
+    row("each its own", "10000-20001N 30000-40001A", "10001 30001", "NA");
+    row("run without a mark between", "10000-20001N 30000-40001A", "10001 25001 30001", "NUA");
+    row("run without a mark after a killed one", "10000-40001A", "10001 25001", "AU");
+    row("in two parts, because a clock was set back", "10000-40001N", "10001 25001", "NN");
+    row("later one overwrote the start", "10000-20001N 30000-40001A", "15001c 30001", "NA");
+    row("two at once, both normal", "10000-90001N 30000-80001N", "31001c", "N");
+    row("two at once, one killed", "10000-90001N 30000-80001A", "31001c", "U");
+    row("two at once, start of the second", "10000-90001A 30000-80001N", "30001", "N");
+    row("two at once, killed second", "10000-90001N 30000-80001A", "30001", "A");
+    row("started together", "29000-90001N 30000-80001A", "30001", "U");
+    row("hardly together", "28000-90001N 30000-80001A", "30001", "U");
+    row("not quite together", "27999-90001N 30000-80001A", "30001", "A");
+    row("record and mark", "10000-90001A 10000-20001N", "10001", "N");
+    row("mark and record", "10000-20001N 10000-90001A", "10001", "N");
+}
+
+void tst_RunExits::assigned()
+{
+    QFETCH(QString, ends);
+    QFETCH(QString, runs);
+    const QString letters = "UNAR";
+    std::vector<RunEnd> known;
+    for (QString const& text : Words(ends)) {
+        RunEnd end;
+        end.start = text.section('-', 0, 0).toLongLong();
+        end.end = text.section('-', 1).chopped(1).toLongLong();
+        end.exit = static_cast<HistoryRun::Exit>(letters.indexOf(text.right(1)));
+        known.push_back(end);
+    }
+    std::vector<HistoryRun> all;
+    for (QString const& text : runs.split(' ')) {
+        HistoryRun run;
+        run.isCut = text.endsWith('c');
+        run.start = QString(text).remove('c').toLongLong();
+        all.push_back(run);
+    }
+    RunEnds::Assign(known, all);
+    QString found;
+    for (HistoryRun const& run : all)
+        found += letters.at(run.exit);
+    QTEST(found, "expected");
+}
+
+void tst_RunExits::damagedRecords()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("logs/app.log");
+    const QByteArray good = "2026-11-20T14:03:02.007 2026-11-20T14:03:03.100 abnormal\n";
+    QVERIFY(TestFiles::write(RunEnds::RecordFileOf(log),
+                             "2026-11-20T14:03 \n2026-11-20T14:03:02.007 2026-11-20T1" + good +
+                                 "2026-11-20T14:03:02.007 x normal\n"
+                                 "2026-11-20T14:03:02.007 2026-11-20T14:03:02.007 unknown\n\n" +
+                                 good));
+    const std::vector<RunEnd> ends = RunEnds::Of(log);
+    QCOMPARE(ends.size(), size_t(1));
+    QCOMPARE(RunEnds::Line(ends[0]), good);
+    QCOMPARE(ends[0].end - ends[0].start, qint64(1093));
+    QCOMPARE(RunEnds::RecordFileOf(folder.filePath("app.log")), QString());
+    QCOMPARE(RunEnds::Of(folder.filePath("app.log")).size(), size_t(0));
+}
+
+// It may exit without having started another program.
+void tst_RunExits::markOfAForkedChild()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("logs/app.log");
+    {
+        const RunMark mark(log);
+        const pid_t child = fork();
+        if (child == 0)
+            std::exit(0);
+        int status = 0;
+        QCOMPARE(waitpid(child, &status, 0), child);
+        QVERIFY(!QFile::exists(RunEnds::RecordFileOf(log)));
+        QCOMPARE(RunEnds::Of(log).size(), size_t(1));
+        QCOMPARE(RunEnds::Of(log)[0].exit, HistoryRun::Running);
+    }
+    QCOMPARE(RunEnds::Of(log).size(), size_t(1));
+    QCOMPARE(RunEnds::Of(log)[0].exit, HistoryRun::Normal);
+    QCOMPARE(RunEnds::Of(log)[0].start, RunMark::ProgramStart());
+}
+
+// The file does not grow forever. The newest stay.
+void tst_RunExits::longRecord()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("logs/app.log");
+    const QByteArray old = "2026-11-20T14:03:02.007 2026-11-20T14:03:03.100 abnormal\n";
+    const QByteArray last = "2026-11-21T14:03:02.007 2026-11-21T14:03:03.100 abnormal\n";
+    QVERIFY(TestFiles::write(RunEnds::RecordFileOf(log), old.repeated(20000) + last));
+    RunMark(log).CollectOthers();
+    const QByteArray kept = TestFiles::read(RunEnds::RecordFileOf(log));
+    QVERIFY(kept.size() < 300000 && kept.size() > 200000);
+    QVERIFY(kept.startsWith(old) && kept.contains('\n' + last));
+}
+
+QTEST_GUILESS_MAIN(tst_RunExits)
+#include "tst_RunExits.moc"
