@@ -74,6 +74,12 @@ void FindControl::showFound()
     m_bar->ShowSlowLine(m_search->slowLine());
     m_view->ticks()->SetTicks(TickScrollBar::Found, m_search->hits());
     m_bar->ShowCount(countText());
+    Q_EMIT foundChanged();
+}
+
+std::shared_ptr<std::vector<int> const> const& FindControl::hits() const
+{
+    return m_search->hits();
 }
 
 QString FindControl::countText() const

@@ -5,6 +5,9 @@
 
 #include <QObject>
 
+#include <memory>
+#include <vector>
+
 namespace Velocor {
 
 class LogFindBar;
@@ -27,7 +30,13 @@ public:
     /// found. Opens the find bar if there is no text yet.
     void Next(int step);
 
+    /// The rows found so far, ascending.
+    std::shared_ptr<std::vector<int> const> const& hits() const;
+
 Q_SIGNALS:
+    /// The rows found may be others.
+    void foundChanged();
+
     /// A message for the status bar.
     void messageReported(QString const& text);
 

@@ -14,6 +14,7 @@
 #include "app/window/log/LogGoTo.h"
 #include "app/window/log/LogMarkStore.h"
 #include "app/window/log/LogModel.h"
+#include "app/window/log/LogOverview.h"
 #include "app/window/log/LogStateText.h"
 #include "app/window/log/LogTableMenu.h"
 #include "app/window/log/LogView.h"
@@ -31,9 +32,9 @@ namespace Velocor {
 
 LogPanel::LogPanel(QWidget* parent)
     : QWidget(parent), m_model(new LogModel(this)), m_view(new LogView(m_model)),
-      m_numbers(new LineNumberMargin(m_view)), m_files(new LogFileBox),
-      m_filterBar(new LogFilterBar), m_findBar(new LogFindBar), m_line(new CurrentLine),
-      m_splitter(new QSplitter(Qt::Vertical)),
+      m_numbers(new LineNumberMargin(m_view)), m_overview(new LogOverview(m_model, m_view)),
+      m_files(new LogFileBox), m_filterBar(new LogFilterBar), m_findBar(new LogFindBar),
+      m_line(new CurrentLine), m_splitter(new QSplitter(Qt::Vertical)),
       m_find(new FindControl(m_model, m_view, m_findBar, this)),
       m_marks(new MarkControl(m_model, m_view, this)),
       m_copier(new LineCopier(m_model, m_view, this)), m_goTo(new LogGoTo(m_model, this))
@@ -56,7 +57,11 @@ QWidget* LogPanel::makeTable()
     auto* layout = new QVBoxLayout(table);
     layout->setContentsMargins(0, 0, 0, 2);
     layout->setSpacing(6);
-    layout->addWidget(m_view, 1);
+    auto* rows = new QHBoxLayout;
+    rows->setSpacing(0);
+    rows->addWidget(m_view, 1);
+    rows->addWidget(m_overview);
+    layout->addLayout(rows, 1);
     layout->addWidget(m_findBar);
     return table;
 }
@@ -100,6 +105,10 @@ void LogPanel::connectParts()
     connect(m_find, &FindControl::messageReported, this, &LogPanel::messageReported);
     connect(m_copier, &LineCopier::messageReported, this, &LogPanel::messageReported);
     connect(m_marks, &MarkControl::messageReported, this, &LogPanel::messageReported);
+    connect(m_marks, &MarkControl::changed, this,
+            [this] { m_overview->SetMarked(m_marks->rows()); });
+    connect(m_find, &FindControl::foundChanged, this,
+            [this] { m_overview->SetFound(m_find->hits()); });
     // Not the line, in which the user may have selected something.
     connect(m_marks, &MarkControl::changed, this, [this] { m_line->SetNote(m_marks->note()); });
     connect(m_goTo, &LogGoTo::arrived, this, [this](int row, QString const& message) {

@@ -29,6 +29,7 @@ class LogFindBar;
 class LogGoTo;
 class LogMarkStore;
 class LogModel;
+class LogOverview;
 class LogView;
 class NoticeBar;
 
@@ -178,6 +179,7 @@ private:
     LogModel* m_model;
     LogView* m_view;
     LineNumberMargin* m_numbers;
+    LogOverview* m_overview;
     LogFileBox* m_files;
     LogFilterBar* m_filterBar;
     LogFindBar* m_findBar;

@@ -94,6 +94,11 @@ bool MarkControl::isMarked() const
     return m_marks->isMarked(m_view->currentIndex().row());
 }
 
+std::shared_ptr<std::vector<int> const> const& MarkControl::rows() const
+{
+    return m_marks->rows();
+}
+
 QString MarkControl::note() const
 {
     return m_marks->NoteOf(m_view->currentIndex().row());

@@ -5,6 +5,9 @@
 
 #include <QObject>
 
+#include <memory>
+#include <vector>
+
 class QWidget;
 
 namespace Velocor {
@@ -45,6 +48,9 @@ public:
 
     /// Lists the marked lines, and goes to the one that the user chooses.
     void ShowList();
+
+    /// The rows with marks, ascending.
+    std::shared_ptr<std::vector<int> const> const& rows() const;
 
     /// Whether the current line is marked.
     bool isMarked() const;

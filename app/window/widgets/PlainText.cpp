@@ -8,6 +8,7 @@
 #include <QCoreApplication>
 #include <QLabel>
 #include <QTextDocument>
+#include <QToolTip>
 #include <QVariant>
 
 namespace Velocor {
@@ -27,6 +28,11 @@ QString PlainToolTip(QString const& text)
     // Without a tag, Qt does not always detect escaped text as rich text: "&amp;lt;" is plain.
     return QLatin1String("<p style=\"white-space:pre-wrap\">") + shown.toHtmlEscaped() +
            QLatin1String("</p>");
+}
+
+void ShowPlainToolTip(QPoint const& position, QString const& text, QWidget* widget)
+{
+    QToolTip::showText(position, PlainToolTip(text), widget);
 }
 
 QString Shortened(QString const& text, int limit)

@@ -7,6 +7,8 @@
 #include <QString>
 
 class QLabel;
+class QPoint;
+class QWidget;
 
 /// \file
 /// Plain text in widgets that detect rich text automatically.
@@ -23,6 +25,10 @@ namespace Velocor {
 /// escaped rich text. So is long text, because Qt wraps only rich tool tips. Text of more than
 /// `MaximumToolTipLength` characters is shortened by Shortened(). Other text is returned unchanged.
 QString PlainToolTip(QString const& text);
+
+/// Shows a text at a global position as a tool tip of a widget, character by character; hides the
+/// tool tip if the text is empty.
+void ShowPlainToolTip(QPoint const& position, QString const& text, QWidget* widget);
 
 /// The maximum length of a tool tip, in characters.
 constexpr int MaximumToolTipLength = 4096;
