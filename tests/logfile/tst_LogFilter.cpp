@@ -88,7 +88,7 @@ void tst_LogFilter::text()
     QTEST(filter.Matches(line), "matches");
     QTEST(filter.FindQuickly(line) == LogFilter::Yes, "matches");
     QVERIFY(filter.FindQuickly(line) != LogFilter::TooLong);
-    QTEST(filter.Ranges(line).size(), "rangeCount");
+    QTEST(int(filter.Ranges(line).size()), "rangeCount");
 }
 
 void tst_LogFilter::errors()

@@ -670,7 +670,7 @@ void tst_TorkXml_ParseManager::endedStateGoes()
         QVERIFY(manager.endElement(QString(), "a", "a"));
         QCOMPARE(manager.CurrentElement(), QString("r"));
         QCOMPARE(script.events.count("~a"), isDeleted ? 1 : 0);
-        QTEST(MeddlingState::popped.size(), "owned");
+        QTEST(int(MeddlingState::popped.size()), "owned");
         QVERIFY(isDeleted || MeddlingState::popped.contains(state));
 
         QStringList left;
