@@ -75,8 +75,9 @@ QString State(LogIndex const& index, LogFilter const& filter = LogFilter())
     for (size_t row = 0; row < rows.size(); ++row)
         told.append(
             QString("%1:%2:%3").arg(rows.start(row)).arg(rows.mark(row)).arg(rows.check(row)));
-    told.append(QString("problems %1, lines %2, ends %3 %4 %5")
+    told.append(QString("problems %1, newest %2, lines %3, ends %4 %5 %6")
                     .arg(rows.problems())
+                    .arg(rows.newestEnd())
                     .arg(index.size())
                     .arg(index.completeOffset())
                     .arg(index.nextOffset())
@@ -140,6 +141,12 @@ private slots:
     void beforeTheFirstPass();
     void awaitsKnownLines();
     void textFilterOfLongLines();
+    void lineLimit();
+    void searchesALineAtATime();
+    void searchEndsAtASlowLine();
+    void earlierRunsWithoutAMatch();
+    void wholeLinesAreOverwritten();
+    void rowsOfAGrowingLog();
     void slowLineAfterOthers();
     void entryUntilItGoesOn();
     void textFilterOfEntries_data();
@@ -553,6 +560,112 @@ void tst_LogIndex::textFilterOfLongLines()
 }
 
 // From then on all lines match, also those that did not.
+// The text filter looks at so many bytes of a line, no more and no less.
+void tst_LogIndex::lineLimit()
+{
+    QByteArray file(LogIndex::LineLimit + 2, 'x');
+    file[LogIndex::LineLimit - 1] = 'a';
+    file[LogIndex::LineLimit] = 'b';
+    file[LogIndex::LineLimit + 1] = '\n';
+    for (char const* text : {"a", "b"}) {
+        const size_t expected = *text == 'a' ? 1 : 0;
+        const LogFilter filter = With(text);
+        for (int slice : {1 << 25, 1 << 27}) {
+            LogIndex index(LogLineParser(), filter);
+            Pass(index, file, slice);
+            QCOMPARE(index.Rows(filter).size(), expected);
+        }
+        LogIndex again;
+        Pass(again, file, 1 << 27);
+        Search(again, file, filter, 1 << 27);
+        QCOMPARE(again.Rows(filter).size(), expected);
+    }
+}
+
+void tst_LogIndex::searchesALineAtATime()
+{
+    const QByteArray file = QByteArray(100, 'a') + "\nb\n";
+    LogIndex index;
+    Pass(index, file, 4096);
+    index.BeginSearch(With("b"));
+    QCOMPARE(index.SearchEnd(10), qint64(101)); // of a line that is longer, all
+    QCOMPARE(index.SearchEnd(101), qint64(101));
+    QCOMPARE(index.SearchEnd(1000), qint64(file.size()));
+}
+
+// Nothing is searched after a line that takes too long.
+void tst_LogIndex::searchEndsAtASlowLine()
+{
+    const QByteArray file =
+        entry("09:00:03.000", "Trace", QString(40, 'a') + '-') + run(30, QTime(10, 0), "x");
+    LogFilter filter;
+    QVERIFY(filter.SetText("(a+)+[b-z]$", true, true));
+    LogIndex index;
+    Pass(index, file, 4096);
+    index.BeginSearch(filter);
+    index.Search(file, [] { return true; });
+    QCOMPARE(index.slowLine(), size_t(1));
+    QCOMPARE(index.searchOffset(), index.nextOffset());
+    QCOMPARE(index.Rows(filter).size(), size_t(31));
+}
+
+// Without a line of theirs, they have no headings.
+void tst_LogIndex::earlierRunsWithoutAMatch()
+{
+    const QByteArray newer = run(3, QTime(9, 0), "newer");
+    const QByteArray file = writtenOver(run(20, QTime(17, 0), "older", true), newer);
+    LogIndex index(LogLineParser(), With("newer"));
+    Pass(index, file, 4096);
+    QCOMPARE(Texts(index, file, With("newer")), Lines(newer));
+}
+
+// Each new entry takes the place of an older one as long: the seam is always between two lines.
+void tst_LogIndex::wholeLinesAreOverwritten()
+{
+    const QByteArray older = run(10, QTime(17, 0), "older", true);
+    LogIndex index;
+    for (int count = 1; count < 9; ++count) { // a complete line of the older run is left
+        QByteArray file = writtenOver(older, run(count, QTime(9, 0), "newer"));
+        file.chop(1); // the last line is not complete
+        Pass(index, file, 4096);
+        QCOMPARE(State(index), StateOf(file));
+        QCOMPARE(index.hasMoved(), count > 1);
+        QCOMPARE(index.RunStarts(), (std::vector<size_t>{0, size_t(count)}));
+        QCOMPARE(index.resumeOffset(), qint64(run(count, QTime(9, 0), "newer").size()));
+        Pass(index, file, 4096);
+        QVERIFY(!index.hasMoved() && !index.hasLostSeam());
+        QCOMPARE(State(index), StateOf(file));
+    }
+}
+
+// With context around each hit, derived from the rows before.
+void tst_LogIndex::rowsOfAGrowingLog()
+{
+    const QByteArray file =
+        run(60, QTime(9, 0), "x") + "it goes on\n" + entry("10:00:00.000", "Error", "end");
+    for (int context : {0, 1, 2, 5}) {
+        LogFilter filter;
+        filter.SetSeverity(LogEntry::Trace, false);
+        filter.SetContext(context);
+        LogIndex index(LogLineParser(), filter);
+        LogRows before;
+        for (int end = 0; end < file.size(); end += 37) {
+            Pass(index, file.left(end), 4096);
+            const LogRows rows = index.Rows(filter, before);
+            const LogRows whole = index.Rows(filter);
+            QCOMPARE(rows.size(), whole.size());
+            for (size_t row = 0; row < rows.size(); ++row) {
+                QCOMPARE(rows.start(row), whole.start(row));
+                QCOMPARE(rows.mark(row), whole.mark(row));
+            }
+            QCOMPARE(rows.newestEnd(), whole.newestEnd());
+            QCOMPARE(rows.problems(), whole.problems());
+            before = rows;
+        }
+        QVERIFY(before.size() > 10);
+    }
+}
+
 void tst_LogIndex::slowLineAfterOthers()
 {
     LogFilter filter;

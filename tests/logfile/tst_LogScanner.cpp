@@ -9,6 +9,7 @@
 #include "support/TestFiles.h"
 
 #include <QTemporaryDir>
+#include <QThread>
 #include <QtTest>
 
 #include <functional>
@@ -135,6 +136,8 @@ private slots:
     void unchangedFiles();
     void seamLostWithinATick();
     void oneUpdateForManyChanges();
+    void typeOfALongFirstLine();
+    void queuedRequest();
     void missingFiles_data();
     void missingFiles();
     void fileComesBack();
@@ -144,6 +147,7 @@ private slots:
     void progress();
     void partsOfALongPass_data();
     void partsOfALongPass();
+    void partOfEachSlice();
     void firstPartComesSooner();
     void growsWhileItIsRead();
     void watched_data();
@@ -357,6 +361,31 @@ void tst_LogScanner::oneUpdateForManyChanges()
     QCOMPARE(reader.Rows(), Lines(run(8, QTime(9, 0), "x")));
 }
 
+// As much of a long first line as there may be is looked at.
+void tst_LogScanner::typeOfALongFirstLine()
+{
+    const QByteArray json("{\"level\":\"info\",\"a\":\"");
+    QVERIFY(TestFiles::write(m_file, json.leftJustified(LogFileType::HeadSize + 10, 'x')));
+    Reader reader(m_file);
+    reader.Open(1);
+    QVERIFY(reader.updates.last().type.isForeign);
+}
+
+// A request from another thread comes as an event.
+void tst_LogScanner::queuedRequest()
+{
+    QVERIFY(TestFiles::write(m_file, run(5, QTime(9, 0), "x")));
+    Reader reader(m_file);
+    reader.scanner.SetCurrentRequest(1);
+    QVERIFY(QMetaObject::invokeMethod(
+        &reader.scanner, "Open", Qt::QueuedConnection, Q_ARG(int, 1), Q_ARG(QString, m_file),
+        Q_ARG(Velocor::LogLineParser, LogLineParser()), Q_ARG(Velocor::LogFilter, LogFilter())));
+    QCOMPARE(reader.updates.size(), 0);
+    QCoreApplication::processEvents();
+    QCOMPARE(reader.updates.size(), 1);
+    QCOMPARE(reader.updates.last().lines, size_t(5));
+}
+
 void tst_LogScanner::missingFiles_data()
 {
     QTest::addColumn<bool>("existsFirst");
@@ -528,6 +557,18 @@ void tst_LogScanner::partsOfALongPass()
     QCOMPARE(reader.updates.last().lines, size_t(600));
 }
 
+// If it is asked for each slice, however long its receiver takes.
+void tst_LogScanner::partOfEachSlice()
+{
+    const QByteArray file = run(100, QTime(9, 0), "x");
+    QVERIFY(TestFiles::write(m_file, file));
+    Reader reader(m_file);
+    reader.scanner.SetPace(1000, 0);
+    QObject::connect(&reader.scanner, &LogScanner::updated, [] { QThread::msleep(5); });
+    reader.Open(1);
+    QCOMPARE(reader.updates.size(), (file.size() + 999) / 1000);
+}
+
 // Nobody has seen the file yet; reading it again should not change what is shown more than once.
 void tst_LogScanner::firstPartComesSooner()
 {
@@ -653,6 +694,8 @@ void tst_LogScanner::watched()
     QCOMPARE(reader.updates.size(), updates);
     reader.scanner.SetWatched(true); // also tells what happened before
     QTRY_COMPARE_WITH_TIMEOUT(reader.updates.last().lines, size_t(50), 20000);
+    QVERIFY(TestFiles::writeOver(file, run(60, QTime(12, 0), "x")));
+    QTRY_COMPARE_WITH_TIMEOUT(reader.updates.last().lines, size_t(60), 20000);
 }
 
 // Nobody tells of it before the folder exists.
