@@ -76,9 +76,11 @@ private:
     int numberLength(int at) const
     {
         int end = at;
-        bool hasDigit = false;
-        if (m_message.midRef(at, 2) == QLatin1String("0x"))
+        const bool isMarked = m_message.midRef(at, 2) == QLatin1String("0x") &&
+                              at + 2 < m_message.size() && IsHexDigit(m_message.at(at + 2));
+        if (isMarked)
             end += 2;
+        bool hasDigit = isMarked; // a word of letters is none
         while (end < m_message.size()) {
             if (IsHexDigit(m_message.at(end)))
                 hasDigit = hasDigit || IsDigit(m_message.at(end));
