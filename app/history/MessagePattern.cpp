@@ -76,10 +76,12 @@ private:
     int numberLength(int at) const
     {
         int end = at;
-        bool hasDigit = false;
-        if (m_message.at(at) == QLatin1Char('0') && at + 1 < m_message.size() &&
-            m_message.at(at + 1) == QLatin1Char('x'))
+        const bool isMarked = at + 2 < m_message.size() && m_message.at(at) == QLatin1Char('0') &&
+                              m_message.at(at + 1) == QLatin1Char('x') &&
+                              IsHexDigit(m_message.at(at + 2));
+        if (isMarked)
             end += 2;
+        bool hasDigit = isMarked; // a word of letters is none
         while (end < m_message.size()) {
             if (IsHexDigit(m_message.at(end)))
                 hasDigit = hasDigit || IsDigit(m_message.at(end));

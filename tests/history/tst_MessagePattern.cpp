@@ -36,6 +36,8 @@ void tst_MessagePattern::pattern_data()
     row("version", "Qt 5.15.8", "Qt #");
     row("network address", "from 10.0.0.1:8080", "from #");
     row("address", "at 0x7f31c0aa", "at #");
+    row("address without digits", "at 0xdeadbeef", "at #");
+    row("no address", "at 0x.", "at #x.");
     row("identifier", "6fa459ea-ee8a-3ca4-894e-db77e160355e failed", "# failed");
     row("hash", "commit deadbeef12", "commit #");
     row("hexadecimal that begins with a digit", "code 1f", "code #");
