@@ -322,6 +322,12 @@ void tst_OverviewInWindow::manyRows()
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 250000, Patience);
     QTRY_VERIFY_WITH_TIMEOUT(AreAt(Ticks(*window, LogEntry::Error), {200, 800}), Patience);
     QVERIFY(AreAt(Ticks(*window, LogEntry::Warning), {500}));
+    // While a file is read, there are several refreshes; here there is only one each.
+    QTest::keyClick(window.get(), Qt::Key_4, Qt::ControlModifier); // no errors
+    QTRY_VERIFY_WITH_TIMEOUT(Ticks(*window, LogEntry::Error).isEmpty(), Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(AreAt(Ticks(*window, LogEntry::Warning), {500}), Patience);
+    QTest::keyClick(window.get(), Qt::Key_4, Qt::ControlModifier);
+    QTRY_VERIFY_WITH_TIMEOUT(AreAt(Ticks(*window, LogEntry::Error), {200, 800}), Patience);
 }
 
 void tst_OverviewInWindow::wheel()
