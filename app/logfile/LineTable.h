@@ -97,11 +97,14 @@ private:
         }
         qint64 start(size_t line, size_t& position) const;
         size_t lineAt(qint64 offset) const;
+        bool hasSame(size_t group, Block const& other) const;
         void reserve();
         void truncate(size_t line);
         void pack();
         void unpack();
     };
+
+    bool hasSameGroup(size_t line, LineTable const& other) const;
 
     GrowingBlocks<Block, BlockSize> m_blocks;
     qint64 m_lastStart = 0; // of the last line

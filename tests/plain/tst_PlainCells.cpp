@@ -9,6 +9,7 @@
 #include "plain/Rounds.h"
 
 #include <QApplication>
+#include <QFontDatabase>
 #include <QImage>
 #include <QPainter>
 #include <QStandardItemModel>
@@ -44,9 +45,12 @@ public:
     }
 };
 
-// Also letters that combine, that read from the right, that are wide, and that break lines.
+// Also letters that combine, that join, that read from the right, that are wide or have no width,
+// and that break lines.
 QString const Letters = QString::fromUtf8("aWil. \t\n\xc3\xa9\xcc\x81\xd7\x90\xd7\x91\xd9\x84"
-                                          "\xd8\xa7\xe4\xb8\xad\xe2\x80\x8f");
+                                          "\xd8\xa7\xd9\x85\xe0\xa4\x95\xe0\xa5\x8d\xe0\xa4\xb7"
+                                          "\xe0\xa4\xbf\xe4\xb8\xad\xe2\x80\x8d\xe2\x80\x8f");
+QString const AsciiLetters("aWAVTofil.,:-=>!()[]0123 ");
 
 QImage Painted(LogDelegate const& delegate, QStyleOptionViewItem const& option,
                QModelIndex const& index)
@@ -91,8 +95,16 @@ private:
 
     QString randomText()
     {
+        static int const lengths[] = {12, 12, 60, 300, 1200};
         QString text;
-        for (int left = below(below(4) ? 12 : 60); left > 0; --left)
+        // Only narrow or wide letters, or all; mostly with none of the others, or with one of them.
+        const int first = below(3) ? 0 : below(AsciiLetters.size());
+        const int kinds = below(3) ? AsciiLetters.size() - first : 1;
+        const bool isAscii = below(2);
+        for (int left = below(lengths[below(5)]); left > 0; --left)
+            text +=
+                isAscii ? AsciiLetters.at(first + below(kinds)) : Letters.at(below(Letters.size()));
+        if (isAscii && below(4) == 0)
             text += Letters.at(below(Letters.size()));
         return text;
     }
@@ -116,6 +128,8 @@ private:
         option.decorationPosition = QStyleOptionViewItem::Left;
         option.decorationAlignment = Qt::AlignCenter;
         option.font = m_view.font();
+        if (below(3) == 0)
+            option.font.setFamily(m_families.at(below(m_families.size())));
         if (below(4) == 0)
             option.font.setPointSizeF(7 + below(12) / 2.0);
         option.fontMetrics = QFontMetrics(option.font);
@@ -125,6 +139,7 @@ private:
     }
 
     std::mt19937& m_random;
+    const QStringList m_families = QFontDatabase().families();
     QStandardItemModel m_model;
     QTableView m_view;
     LogDelegate m_delegate;

@@ -58,6 +58,7 @@ int TextMargin(QStyle const* style, QWidget const* widget)
 // Lays out a text in one line, as the style does. False if it does not fit.
 bool LayOutFitting(QTextLayout& layout, QStyleOptionViewItem const& option, int width)
 {
+    layout.setCacheEnabled(true); // or drawing would shape the text again
     QTextOption textOption(QStyle::visualAlignment(option.direction, option.displayAlignment));
     textOption.setWrapMode(QTextOption::ManualWrap);
     textOption.setTextDirection(option.direction);
@@ -233,7 +234,8 @@ void LogDelegate::paintContent(QPainter* painter, QStyleOptionViewItem const& op
 }
 
 // Looks as if the style had drawn it all. But the style shapes a text three times, which costs more
-// than all else about a line that is appended. It still draws what it colors or elides itself.
+// than all else about a line that is appended. It still draws what it colors or elides itself. For
+// the goal for following in docs/performance.md; tst_PlainCells compares.
 void LogDelegate::paintPlain(QPainter* painter, QStyleOptionViewItem const& option)
 {
     QStyle const* style = StyleOf(option);

@@ -232,9 +232,11 @@ void LogView::rowsInserted(QModelIndex const& parent, int first, int last)
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
     m_hasOtherRows = m_hasOtherRows || last + 1 < m_model->rowCount();
     if (m_following) {
-        moveOnceAfter([&] {
-            WrappingTable::rowsInserted(parent, first, last);
-            scrollToBottom();
+        m_ticks->UpdateOnceAfter([&] {
+            moveOnceAfter([&] {
+                WrappingTable::rowsInserted(parent, first, last);
+                scrollToBottom();
+            });
         });
         return;
     }

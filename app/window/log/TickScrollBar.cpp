@@ -6,6 +6,7 @@
 #include "app/window/widgets/SeverityIcons.h"
 
 #include <QPainter>
+#include <QScopedValueRollback>
 #include <QStyle>
 #include <QStyleOptionSlider>
 
@@ -40,10 +41,22 @@ void TickScrollBar::SetRowCount(int count)
 // In a large log that is followed, most new lines move the slider by less than a pixel.
 void TickScrollBar::sliderChange(SliderChange change)
 {
+    if (m_isUpdatingLater && change != SliderOrientationChange)
+        return;
     const Look look = currentLook();
     if (change == SliderOrientationChange || !(look == m_look))
         update();
     m_look = look;
+}
+
+// In between, the slider is not at the end of a range that has grown.
+void TickScrollBar::UpdateOnceAfter(std::function<void()> const& change)
+{
+    {
+        const QScopedValueRollback<bool> guard(m_isUpdatingLater, true);
+        change();
+    }
+    sliderChange(SliderValueChange);
 }
 
 TickScrollBar::Look TickScrollBar::currentLook() const

@@ -5,6 +5,7 @@
 
 #include <QScrollBar>
 
+#include <functional>
 #include <memory>
 #include <vector>
 
@@ -31,6 +32,9 @@ public:
     /// Sets the number of rows that the whole bar stands for.
     void SetRowCount(int count);
 
+    /// Does what changes range and value, and paints only if both together look different.
+    void UpdateOnceAfter(std::function<void()> const& change);
+
 protected:
     void paintEvent(QPaintEvent* event) override;
     void sliderChange(SliderChange change) override;
@@ -53,6 +57,7 @@ private:
 
     std::shared_ptr<std::vector<int> const> m_ticks[KindCount];
     int m_rowCount = 0;
+    bool m_isUpdatingLater = false;
     Look m_look;
 };
 
