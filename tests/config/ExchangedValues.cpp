@@ -142,7 +142,7 @@ bool Print(QString const& path)
 int main(int argc, char* argv[])
 {
     const QGuiApplication application(argc, argv);
-    const QStringList arguments = application.arguments();
+    const QStringList arguments = QGuiApplication::arguments();
     if (arguments.size() != 3)
         return 2;
     return (arguments.at(1) == QLatin1String("write") ? Write : Print)(arguments.at(2)) ? 0 : 1;
