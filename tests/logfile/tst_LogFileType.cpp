@@ -329,8 +329,9 @@ void tst_LogFileType::everyLine_data()
                       "a\xFF\nb\n")
         << QStringList({"a" + QString(QChar::ReplacementCharacter) + "\n", "b\n"});
     QTest::newRow("journal export")
-        << QByteArray("__CURSOR=1\nMESSAGE=a\n\n__CURSOR=2\nMESSAGE=bc\n\n")
-        << QStringList({"__CURSOR=1\nMESSAGE=a\n\n", "__CURSOR=2\nMESSAGE=bc\n\n"});
+        << QByteArray("__CURSOR=1\nMESSAGE=a\n\n__CURSOR=2\nMESSAGE=bc\n\n__CURSOR=3\n\n")
+        << QStringList(
+               {"__CURSOR=1\nMESSAGE=a\n\n", "__CURSOR=2\nMESSAGE=bc\n\n", "__CURSOR=3\n\n"});
 }
 
 void tst_LogFileType::everyLine()
