@@ -3,7 +3,7 @@
 
 // What velocor-log says about how runs of the program ended. The program is ended for real.
 
-#include "../app/Installation.h"
+#include "app/Installation.h"
 #include "app/history/RunEnds.h"
 #include "app/runninglog/RunMark.h"
 #include "support/TestFiles.h"
