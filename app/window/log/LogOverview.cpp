@@ -37,6 +37,11 @@ constexpr int ShowDelay = 200; // milliseconds
 
 constexpr int ToolTipLength = 200; // characters of a line
 
+size_t RowCount(int first, int last)
+{
+    return static_cast<size_t>(last) - static_cast<size_t>(first) + 1;
+}
+
 } // namespace
 
 LogOverview::LogOverview(LogModel* model, LogView* view, QWidget* parent)
@@ -54,17 +59,17 @@ LogOverview::LogOverview(LogModel* model, LogView* view, QWidget* parent)
     reset();
     connect(model, &LogModel::modelReset, this, &LogOverview::reset);
     connect(model, &LogModel::rowsInserted, this, [this](QModelIndex const&, int first, int last) {
-        m_problems.Insert(static_cast<size_t>(first), static_cast<size_t>(last - first + 1));
+        m_problems.Insert(static_cast<size_t>(first), RowCount(first, last));
         m_isOutdated = true;
     });
     connect(model, &LogModel::rowsRemoved, this, [this](QModelIndex const&, int first, int last) {
-        m_problems.Remove(static_cast<size_t>(first), static_cast<size_t>(last - first + 1));
+        m_problems.Remove(static_cast<size_t>(first), RowCount(first, last));
         m_isOutdated = true;
     });
     connect(model, &LogModel::dataChanged, this,
             [this](QModelIndex const& first, QModelIndex const& last) {
                 m_problems.Change(static_cast<size_t>(first.row()),
-                                  static_cast<size_t>(last.row() - first.row() + 1));
+                                  RowCount(first.row(), last.row()));
                 m_isOutdated = true;
             });
     connect(model, &LogModel::refreshed, this, &LogOverview::look);
