@@ -129,6 +129,7 @@ void tst_FindInWindow::amongTheOtherLines()
     QCOMPARE(Status(*window), QString("Continued from the bottom"));
     QTest::keyClick(Field(*window), Qt::Key_Enter, Qt::ShiftModifier | Qt::KeypadModifier);
     QCOMPARE(view->currentIndex().row(), 150);
+    QCOMPARE(Status(*window), QString());
 }
 
 void tst_FindInWindow::withTheKeyboardFromTheTable()

@@ -9,6 +9,7 @@
 #include "app/window/log/LineSaver.h"
 #include "app/window/widgets/NoticeBar.h"
 #include "support/ProcessLimits.h"
+#include "support/TestFiles.h"
 
 #include <QClipboard>
 #include <QFileDialog>
@@ -42,6 +43,7 @@ private slots:
     void copiesAsMarkdown_data();
     void copiesAsMarkdown();
     void copiesAsCsv();
+    void copiesTheProgramAsCsv();
     void copiesFromTheMenu_data();
     void copiesFromTheMenu();
     void copiesNothingWithoutASelection();
@@ -101,6 +103,21 @@ void tst_LinesElsewhere::copiesAsCsv()
     // The clipboard may have its own line ends.
     QCOMPARE(QGuiApplication::clipboard()->text().remove('\r'), QString(expected).remove('\r'));
     QCOMPARE(Status(*window), QString("3 lines copied"));
+}
+
+void tst_LinesElsewhere::copiesTheProgramAsCsv()
+{
+    const WindowTest test(entry("09:00:00.000", "Trace", "a"));
+    const QString path = test.folder() + "journal.export";
+    QVERIFY(TestFiles::write(path, "__CURSOR=s=1\nMESSAGE=hello\nSYSLOG_IDENTIFIER=sshd\n\n"));
+    const auto window = WindowTest::show();
+    window->OpenFile(path);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
+    QCOMPARE(Panel(*window)->path(), path);
+    QTest::keyClick(window.get(), Qt::Key_A, Qt::ControlModifier);
+    QTest::keyClick(window.get(), Qt::Key_V, Qt::ControlModifier | Qt::AltModifier);
+    const QString copied = QGuiApplication::clipboard()->text();
+    QVERIFY2(copied.contains("\"sshd: hello\""), qPrintable(copied));
 }
 
 void tst_LinesElsewhere::copiesFromTheMenu_data()

@@ -625,6 +625,7 @@ void tst_LogInWindow::problems()
     QCOMPARE(View(*window)->currentIndex().row(), 3);
     QCOMPARE(Status(*window), QString("Continued from the bottom"));
     QTest::keyClick(window.get(), Qt::Key_F8, Qt::ShiftModifier);
+    QCOMPARE(Status(*window), QString());
     QCOMPARE(View(*window)->selectionModel()->selectedRows().size(), 1);
     QCOMPARE(View(*window)->currentIndex().row(), 1);
 }

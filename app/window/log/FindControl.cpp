@@ -63,9 +63,9 @@ void FindControl::goToFound()
         return;
     }
     m_view->GoToRow(row);
-    if (answer == LogSearch::Answer::Wrapped)
-        Q_EMIT messageReported(step > 0 ? tr("Continued from the top")
-                                        : tr("Continued from the bottom"));
+    const QString wrapped =
+        step > 0 ? tr("Continued from the top") : tr("Continued from the bottom");
+    Q_EMIT messageReported(answer == LogSearch::Answer::Wrapped ? wrapped : QString());
 }
 
 void FindControl::showFound()

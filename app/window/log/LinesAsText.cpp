@@ -47,7 +47,7 @@ QString ColumnName(LogModel const& model, int column)
 
 QString CellText(LogModel const& model, int row, int column)
 {
-    return column == LogModel::MessageColumn ? model.MessageText(row)
+    return column == LogModel::MessageColumn ? model.MessageWithProgram(row)
                                              : model.index(row, column).data().toString();
 }
 

@@ -40,6 +40,12 @@ QString GoneText()
     return LogModel::tr("This line is no longer in the file");
 }
 
+QString WithProgram(LogEntry const& entry)
+{
+    return entry.program.isEmpty() ? entry.message
+                                   : entry.program + QLatin1String(": ") + entry.message;
+}
+
 // The length of a line, which starts at a character, without its end; -1 if the end is missing.
 int EndOfLine(QByteArray const& line, LogLineEnd const& lineEnd)
 {
@@ -304,10 +310,9 @@ LogModel::Line LogModel::readLine(int row) const
         line.entry.message = m_parser.Text(line.start);
     else
         line.entry = m_parser.Parse(bytes);
-    if (!line.entry.program.isEmpty())
-        line.entry.message = line.entry.program + QLatin1String(": ") + line.entry.message;
-    isCut = isCut || line.entry.message.size() > ShownLimit;
-    line.entry.message = ShownText(line.entry.message.left(ShownLimit));
+    const QString message = WithProgram(line.entry);
+    isCut = isCut || message.size() > ShownLimit;
+    line.entry.message = ShownText(message.left(ShownLimit));
     if (!line.isGone && isCut)
         line.entry.message += Ellipsis(lengthOf(row));
     return line;
@@ -348,16 +353,33 @@ QString LogModel::LineText(int row, int limit) const
     return whole.startsWith(line.start) ? m_parser.Text(whole) : GoneText();
 }
 
-QString LogModel::MessageText(int row) const
+// An entry that is gone, torn or no entry has nothing but a message.
+LogEntry LogModel::wholeEntry(int row) const
 {
+    LogEntry entry;
     if (row < 0 || row >= m_rowCount || isHeading(row))
-        return QString();
+        return entry;
     Line const* known = knownLine(row);
     const Line line = known ? *known : readLine(row);
-    if (line.isGone || line.isTorn)
-        return LineText(row, LogIndex::LineLimit);
-    const QByteArray whole = readBytes(row, LogIndex::LineLimit);
-    return whole.startsWith(line.start) ? m_parser.Parse(whole).message : line.entry.message;
+    const bool isMessage = line.isGone || line.isTorn;
+    const QByteArray whole = isMessage ? QByteArray() : readBytes(row, LogIndex::LineLimit);
+    if (isMessage)
+        entry.message = LineText(row, LogIndex::LineLimit);
+    else if (whole.startsWith(line.start))
+        entry = m_parser.Parse(whole);
+    else
+        entry.message = line.entry.message;
+    return entry;
+}
+
+QString LogModel::MessageText(int row) const
+{
+    return wholeEntry(row).message;
+}
+
+QString LogModel::MessageWithProgram(int row) const
+{
+    return WithProgram(wholeEntry(row));
 }
 
 QPair<int, int> LogModel::EntryRows(int row) const

@@ -97,6 +97,9 @@ public:
     /// The message of a row, whole even if the row shows only its start.
     QString MessageText(int row) const;
 
+    /// The same, after the program that wrote it if that is known, as the row shows it.
+    QString MessageWithProgram(int row) const;
+
     /// The first and the last row of the entry that a row belongs to: its first line and the lines
     /// that follow without a stamp. Of a line that belongs to no entry, and of a heading, the row
     /// itself.
@@ -162,6 +165,7 @@ private:
     Line const* knownLine(int row) const;
     Line const& line(int row) const;
     LogEntry const& entry(int row) const { return line(row).entry; }
+    LogEntry wholeEntry(int row) const;
     QString headingText(int row) const;
     QString cellText(int row, int column) const;
     QString toolTip(int row, int column) const;

@@ -356,9 +356,9 @@ void LogPanel::GoToProblem(int step)
         return;
     }
     m_view->setFocus();
-    if (jump == LogView::Jump::Wrapped)
-        Q_EMIT messageReported(step > 0 ? tr("Continued from the top")
-                                        : tr("Continued from the bottom"));
+    const QString wrapped =
+        step > 0 ? tr("Continued from the top") : tr("Continued from the bottom");
+    Q_EMIT messageReported(jump == LogView::Jump::Wrapped ? wrapped : QString());
 }
 
 QString LogPanel::path() const

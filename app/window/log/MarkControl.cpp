@@ -70,8 +70,9 @@ void MarkControl::GoTo(int step)
     else
         m_view->GoToRow(isAhead ? *(before - 1) : rows.back());
     m_view->setFocus();
-    if (!isAhead)
-        report(step > 0 ? tr("Continued from the top") : tr("Continued from the bottom"));
+    const QString wrapped =
+        step > 0 ? tr("Continued from the top") : tr("Continued from the bottom");
+    Q_EMIT messageReported(isAhead ? QString() : wrapped);
 }
 
 void MarkControl::ShowList()
