@@ -124,7 +124,10 @@ SettingsEditor* FileTabs::addEditor(QString const& path)
     editor->setAccessibleName(name);
     editor->SetOwnerNote(m_ownerNotes.value(QFileInfo(path).absoluteFilePath()));
     editor->Open(path);
-    connect(editor, &SettingsEditor::saved, this, [this, editor] { Q_EMIT saved(editor->path()); });
+    connect(editor, &SettingsEditor::saved, this, [this, editor] {
+        setTabToolTip(indexOf(editor), PlainToolTip(editor->path())); // maybe another file now
+        Q_EMIT saved(editor->path());
+    });
     connect(editor, &SettingsEditor::messageReported, this, &FileTabs::messageReported);
     connect(editor, &SettingsEditor::stateChanged, this, &FileTabs::stateChanged);
     setTabToolTip(addTab(editor, QString()), PlainToolTip(path));

@@ -222,8 +222,8 @@ void TakeEditing(MainWindow& window, Camera const& camera)
     QTest::keyClick(tree, Qt::Key_F2, Qt::ShiftModifier);
     QTest::keyClicks(tree->findChild<QLineEdit*>(), "timeout");
     camera.take(window, "settings-editing");
-    TakeDialog(window, "What Will Be Written...", camera, "settings-written");
     QTest::keyClick(tree->findChild<QLineEdit*>(), Qt::Key_Escape);
+    TakeDialog(window, "What Will Be Written...", camera, "settings-written");
     editor->Undo();
     QTest::keyClick(tree, Qt::Key_F, Qt::ControlModifier);
     QTest::keyClicks(ByName<QLineEdit>(editor, "Find in names and values"), "255");

@@ -18,6 +18,7 @@
 #include <QMessageBox>
 #include <QUndoStack>
 
+#include <sys/stat.h>
 #include <unistd.h>
 
 using namespace Velocor;
@@ -70,6 +71,8 @@ private slots:
     void savesOfOurOwnAreNotTold();
     void malformedFileIsReloaded();
     void removedFileIsToldAndSavedAgain();
+    void somethingElseInItsPlace_data();
+    void somethingElseInItsPlace();
     void folderIsGone();
     void readOnlyIsToldAtOnce();
     void ownersAreTold_data();
@@ -165,6 +168,27 @@ void tst_SettingsOutside::removedFileIsToldAndSavedAgain()
     QVERIFY(!state->isVisible());
 }
 
+void tst_SettingsOutside::somethingElseInItsPlace_data()
+{
+    QTest::addColumn<bool>("isFolder");
+    QTest::addColumn<QString>("told");
+    QTest::newRow("folder") << true << "some.cfg is a folder now, not a file.";
+    QTest::newRow("pipe") << false << "some.cfg is not a regular file any more.";
+}
+
+void tst_SettingsOutside::somethingElseInItsPlace()
+{
+    QFETCH(bool, isFolder);
+    const ShownSettings shown;
+    QVERIFY(QFile::remove(shown.file));
+    const QByteArray path = QFile::encodeName(shown.file);
+    QCOMPARE(isFolder ? mkdir(path.constData(), 0700) : mkfifo(path.constData(), 0600), 0);
+    FileNotice* state = State(shown.editor);
+    QFETCH(QString, told);
+    QTRY_COMPARE_WITH_TIMEOUT(state->text(), told, Patience);
+    QCOMPARE(VisibleButtons(state), QStringList({"Dismiss", "Save As..."}));
+}
+
 void tst_SettingsOutside::folderIsGone()
 {
     const WindowTest test;
@@ -190,6 +214,7 @@ void tst_SettingsOutside::folderIsGone()
     QCOMPARE(editor->path(), other);
     QVERIFY(!state->isVisible() && !editor->isModified());
     QCOMPARE(window->findChild<FileTabs*>()->tabText(1), QString("other.cfg"));
+    QCOMPARE(window->findChild<FileTabs*>()->tabToolTip(1), other);
 }
 
 // Only to those who may not write it: the administrator may write everything.

@@ -108,7 +108,7 @@ DifferenceDialog::DifferenceDialog(QString const& title, QWidget* parent)
     layout->addWidget(m_pages, 1);
     layout->addLayout(buttons);
     m_tree->setFocus();
-    resize(760, 480);
+    resize(780, 480);
 }
 
 QWidget* DifferenceDialog::makeLinesPage()
@@ -135,7 +135,7 @@ void DifferenceDialog::SetSides(Side const& left, Side const& right,
         summary += tr("; saving would lose what the last column names");
     m_summary->setText(summary);
     for (int i = 0; i < DifferenceTree::ColumnCount; ++i)
-        m_tree->setColumnWidth(i, i == DifferenceTree::StateColumn ? 120 : 170);
+        m_tree->setColumnWidth(i, i == DifferenceTree::StateColumn ? 110 : 150);
     m_leftLines->setPlainText(QString::fromUtf8(left.bytes.left(ShownLimit)));
     m_rightLines->setPlainText(QString::fromUtf8(right.bytes.left(ShownLimit)));
     m_leftLines->setAccessibleName(tr("Lines: %1").arg(left.title));

@@ -104,7 +104,7 @@ void DifferenceTree::addFileRow(Losses const& losses)
         return;
     auto* item = new QTreeWidgetItem(this);
     item->setText(NameColumn, tr("(whole file)"));
-    item->setText(LossColumn, texts.join(QLatin1String("; ")));
+    setLosses(item, texts);
     if (!isChanged)
         return;
     item->setText(StateColumn, tr("Other root element"));
@@ -140,7 +140,14 @@ void DifferenceTree::addRow(int position, Losses const& losses)
         setLook(item, row);
     }
     std::reverse(lost.begin(), lost.end()); // the last one that was inserted comes first
-    item->setText(LossColumn, lost.join(QLatin1String("; ")));
+    setLosses(item, lost);
+}
+
+void DifferenceTree::setLosses(QTreeWidgetItem* item, QStringList const& texts)
+{
+    const QString text = texts.join(QLatin1String("; "));
+    item->setText(LossColumn, text);
+    item->setToolTip(LossColumn, PlainToolTip(text));
 }
 
 void DifferenceTree::setLook(QTreeWidgetItem* item, Row const& row)

@@ -46,6 +46,7 @@ private:
     void fill();
     void addFileRow(Losses const& losses);
     void addRow(int position, Losses const& losses);
+    void setLosses(QTreeWidgetItem* item, QStringList const& texts);
     void setLook(QTreeWidgetItem* item, SettingsDifference::Row const& row);
     void goTo(QString const& section, QString const& key);
     int positionOf(QTreeWidgetItem const* item) const;

@@ -59,14 +59,18 @@ void FileNotice::check()
     const QFileInfo file(m_path);
     const QString name = file.fileName();
     const Stamp now = stampOf(m_path);
-    const bool isChanged = now.exists && (!m_known.exists || now.changed != m_known.changed ||
-                                          now.size != m_known.size);
+    const bool isChanged = file.isFile() && (!m_known.exists || now.changed != m_known.changed ||
+                                             now.size != m_known.size);
     const bool isWritable = file.isWritable();
     QString state;
     if (!now.exists && !file.dir().exists())
         state = tr("The folder of %1 is gone.").arg(name);
     else if (!now.exists)
         state = tr("%1 was removed. Saving changes creates it again.").arg(name);
+    else if (file.isDir())
+        state = tr("%1 is a folder now, not a file.").arg(name);
+    else if (!file.isFile())
+        state = tr("%1 is not a regular file any more.").arg(name);
     else if (isChanged)
         state = tr("%1 was changed by another program.").arg(name);
     else if (!isWritable)
@@ -74,7 +78,7 @@ void FileNotice::check()
     m_reload->setVisible(isChanged);
     m_compare->setVisible(isChanged && m_isComparable);
     m_keep->setVisible(isChanged);
-    m_saveAs->setVisible(!now.exists || !isWritable);
+    m_saveAs->setVisible(!file.isFile() || !isWritable);
     SetState(state);
 }
 

@@ -10,8 +10,8 @@
 
 namespace Velocor {
 
-/// A bar that tells what happens to the file of an editor from outside: it is changed or removed,
-/// its folder is gone, or it is read-only from the start. GUI thread only.
+/// A bar that tells what happens to the file of an editor from outside: it is changed, removed or
+/// replaced by a folder, its folder is gone, or it is read-only from the start. GUI thread only.
 class FileNotice : public NoticeBar
 {
     Q_OBJECT
