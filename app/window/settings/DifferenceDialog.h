@@ -59,7 +59,7 @@ Q_SIGNALS:
     /// The user wants other content on the left.
     ///
     /// @param document  the left one with what was selected
-    void takeOverRequested(SettingsDocument const& document);
+    void takeOverRequested(Velocor::SettingsDocument const& document);
     void undoRequested();
 
 private:
