@@ -25,7 +25,7 @@ namespace Velocor {
 namespace {
 
 constexpr int LaneWidth = 4; // pixels, as are the next ones
-constexpr int Margin = 1;
+constexpr int EdgeMargin = 1;
 constexpr int TickSize = 2;
 constexpr int Reach = 3; // of a click, on both sides
 
@@ -79,7 +79,7 @@ LogOverview::LogOverview(LogModel* model, LogView* view, QWidget* parent)
 
 QSize LogOverview::sizeHint() const
 {
-    return QSize(LaneCount * LaneWidth + 2 * Margin, 0);
+    return QSize(LaneCount * LaneWidth + 2 * EdgeMargin, 0);
 }
 
 void LogOverview::SetFound(Rows const& rows)
@@ -229,7 +229,7 @@ void LogOverview::paintEvent(QPaintEvent* /*event*/)
                 color = TickScrollBar::Color(TickScrollBar::Found, palette());
             else if (lane == Marked)
                 color = TickScrollBar::Color(TickScrollBar::Marked, palette());
-            painter.fillRect(Margin + lane * LaneWidth, area.top() + part, LaneWidth, TickSize,
+            painter.fillRect(EdgeMargin + lane * LaneWidth, area.top() + part, LaneWidth, TickSize,
                              color);
         }
     }
@@ -257,7 +257,7 @@ LogOverview::Place LogOverview::placeAt(int y) const
 int LogOverview::rowAt(QPoint const& position) const
 {
     const Place place = placeAt(position.y());
-    const int lane = qBound(0, (position.x() - Margin) / LaneWidth, LaneCount - 1);
+    const int lane = qBound(0, (position.x() - EdgeMargin) / LaneWidth, LaneCount - 1);
     for (const int tick :
          {place.rows[lane], place.rows[Marked], place.rows[Problems], place.rows[Found]}) {
         if (tick >= 0)
