@@ -78,6 +78,7 @@ private:
     Rows m_rows[LaneCount];                  // not of Problems
     std::vector<LogEntry::Severity> m_worst; // of each part
     bool m_isOutdated = true;                // m_worst
+    bool m_isReset = true;                   // since it was shown
     QTimer m_lookTimer;
     QTimer m_showTimer;
 };
