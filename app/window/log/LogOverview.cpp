@@ -33,7 +33,7 @@ constexpr int Reach = 3; // of a click, on both sides
 constexpr size_t RowsAtOnce = 100 * 1000;
 
 // In a log that is followed, ticks hardly move, but finding them among all rows and painting them
-// costs more than the new rows. For the goal for following in docs/performance.md.
+// costs far more than a new row.
 constexpr int FirstShowDelay = 200; // milliseconds
 constexpr int ShowDelay = 1000;     // milliseconds
 
