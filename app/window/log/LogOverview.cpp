@@ -170,10 +170,12 @@ int LogOverview::partCount() const
 // The first row of a part or of one below; the number of rows for the part after the last one.
 int LogOverview::firstRow(int part) const
 {
-    const qint64 parts = partCount();
+    const auto parts = static_cast<qint64>(m_worst.size());
     return static_cast<int>((qint64(part) * m_model->rowCount() + parts - 1) / parts);
 }
 
+// Before anything else that depends on the parts: their number follows the scroll bar's groove,
+// which the style has to be asked for.
 void LogOverview::updateParts()
 {
     const auto parts = static_cast<size_t>(partCount());
@@ -224,7 +226,8 @@ void LogOverview::paintEvent(QPaintEvent* /*event*/)
     painter.fillRect(area, palette().color(QPalette::Base));
     if (m_model->rowCount() == 0)
         return;
-    for (int part = 0; part < partCount(); ++part) {
+    const auto parts = static_cast<int>(m_worst.size());
+    for (int part = 0; part < parts; ++part) {
         for (int lane = 0; lane < LaneCount; ++lane) {
             if (!hasTick(static_cast<Lane>(lane), part))
                 continue;
@@ -243,7 +246,7 @@ void LogOverview::paintEvent(QPaintEvent* /*event*/)
 LogOverview::Place LogOverview::placeAt(int y) const
 {
     Place place;
-    const int last = partCount() - 1;
+    const int last = static_cast<int>(m_worst.size()) - 1;
     const int at = y - ground().top();
     for (int lane = 0; lane < LaneCount; ++lane) {
         for (int distance = 0; distance <= Reach && place.rows[lane] < 0; ++distance) {
@@ -267,7 +270,8 @@ int LogOverview::rowAt(QPoint const& position) const
         if (tick >= 0)
             return tick;
     }
-    const int part = qBound(0, position.y() - ground().top(), partCount() - 1);
+    const int last = static_cast<int>(m_worst.size()) - 1;
+    const int part = qBound(0, position.y() - ground().top(), last);
     const int row = std::min(firstRow(part), m_model->rowCount() - 1);
     if (m_model->LineStart(row) >= 0) // not a heading
         return row;
@@ -304,6 +308,7 @@ bool LogOverview::event(QEvent* event)
 {
     if (event->type() != QEvent::ToolTip)
         return QWidget::event(event);
+    updateParts();
     auto const* help = static_cast<QHelpEvent*>(event);
     ShowPlainToolTip(help->globalPos(), textOf(placeAt(help->pos().y())), this);
     return true;
@@ -313,6 +318,7 @@ void LogOverview::mousePressEvent(QMouseEvent* event)
 {
     if (event->button() != Qt::LeftButton || m_model->rowCount() == 0)
         return;
+    updateParts();
     m_view->GoToRow(rowAt(event->pos()));
     m_view->setFocus();
 }
