@@ -29,7 +29,7 @@ struct VelocorMutants
         const long file = name ? syscall(SYS_openat, AT_FDCWD, name, O_RDWR | O_CLOEXEC) : -1;
         if (file < 0)
             return;
-        const size_t size = size_t(1) << 17;
+        const long size = syscall(SYS_lseek, file, 0L, SEEK_END);
         const long start =
             syscall(SYS_mmap, nullptr, size, PROT_READ | PROT_WRITE, MAP_SHARED, file, 0L);
         if (start != -1)

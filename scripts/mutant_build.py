@@ -115,7 +115,9 @@ def change(sources, jobs):
     copy(sources)
     with multiprocessing.Pool(jobs) as pool:
         found = pool.map(find, sources, chunksize=1)
-    for name, _, changed in found:
+    for name, mutants, changed in found:
+        if len(mutants) >= NUMBERS:
+            raise SystemExit(f"mutants: {name} has more changes than numbers")
         update(COPY / name, changed)
     return [mutant for _, mutants, _ in found for mutant in mutants], digest(*(changed for *_, changed in found))
 

@@ -15,7 +15,7 @@ import signal
 import subprocess
 import time
 
-from mutant_build import WORK, digest, run
+from mutant_build import NUMBERS, WORK, digest, run, targets
 
 LEFT_OUT = r"locale|package|memcheck"  # labels; and runs of the same tests on other screens:
 OTHER_SCREENS = "800x600|double_scale"
@@ -119,7 +119,7 @@ def record(build, desks, sources, pattern, wanted):
             for function in re.findall(r"^(\w+)\(\)", listed.stdout + listed.stderr, re.M):
                 reached = WORK / f"{desk.folder.name}.reached"
                 for _ in range(2):  # once more if it fails: others may share the machine
-                    reached.write_bytes(bytes(1 << 17))
+                    reached.write_bytes(bytes((len(targets()) + 1) * NUMBERS))
                     reached.chmod(0o666)  # some tests change the user
                     started = time.monotonic()
                     why = desk.run(test, [function], 600, VELOCOR_MUTANT_REACHED=str(reached))
