@@ -346,7 +346,7 @@ void tst_NavigationInWindow::lineOfAReplacedFile()
         QVERIFY(TestFiles::write(path + ".new", lines(first)));
         QCOMPARE(std::rename(QFile::encodeName(path + ".new"), QFile::encodeName(path)), 0);
     } else {
-        QVERIFY(TestFiles::write(path, lines(first)));
+        QVERIFY(TestFiles::writeOver(path, lines(first)));
     }
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 200 - first, Patience);
     QTRY_VERIFY_WITH_TIMEOUT(!Panel(*window)->model()->isReading(), Patience);
