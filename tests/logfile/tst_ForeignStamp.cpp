@@ -381,6 +381,9 @@ void tst_ForeignStamp::epochs()
     Compare(ReadGuarded(ForeignStamp::Read, "1795442582.250 x"), 14,
             local.toString("yyyy-MM-dd hh:mm:ss.zzz").toLatin1());
     QVERIFY(IsTextCutAnywhere(ForeignStamp::Read, "1795442582.250 x"));
+    const QDateTime first = QDateTime::fromMSecsSinceEpoch(0);
+    Compare(ReadGuarded(ForeignStamp::Read, "0000000000.000 x"), 14,
+            first.toString("yyyy-MM-dd hh:mm:ss.zzz").toLatin1());
 
     const qint64 year = qint64(366) * 24 * 60 * 60 * 1000;
     QVERIFY(ForeignStamp::KeyOfEpoch(-1900 * year) > 0);

@@ -43,6 +43,7 @@ private slots:
     void names();
     void noNames_data();
     void noNames();
+    void twoNames();
     void letters();
     void symbols_data();
     void symbols();
@@ -106,6 +107,19 @@ void tst_LevelNames::noNames()
     QCOMPARE(Named(name, LevelNames::Match::AnyCase), None);
     QCOMPARE(Named(name, LevelNames::Match::UpperCase), None);
     QVERIFY(!IsEveryday(name));
+}
+
+// The names are next to each other in memory.
+void tst_LevelNames::twoNames()
+{
+    const QList<QByteArray> names{"EMERG", "PANIC",  "ALERT",   "CRIT", "FATAL",   "ERROR",
+                                  "ERR",   "SEVERE", "WARNING", "WARN", "WRN",     "NOTICE",
+                                  "NOTE",  "INFO",   "INF",     "LOG",  "SUCCESS", "CONFIG",
+                                  "DEBUG", "DBG",    "TRACE",   "TRC",  "VERBOSE", "FINE"};
+    for (QByteArray const& one : names) {
+        for (QByteArray const& other : names)
+            QCOMPARE(Named(one + '\0' + other, LevelNames::Match::UpperCase), None);
+    }
 }
 
 // Small letters are none of them.
