@@ -21,7 +21,7 @@ namespace {
 constexpr int SearchLimit = 512;
 constexpr int MaximumWords = 6;
 
-enum class Part { Time, Severity, Message, Program };
+enum class Part { Time, Severity, Message, Program, None };
 
 struct FieldName
 {
@@ -64,6 +64,7 @@ constexpr FieldName FieldNames[] = {
     {"event", Part::Message},
     {"SYSLOG_IDENTIFIER", Part::Program},
     {"_COMM", Part::Program},
+    {"", Part::None}, // all others
 };
 
 // Around what a program in a container has written.
@@ -100,14 +101,15 @@ char ClosingOf(char c)
 
 int RankOf(LogField const& field)
 {
+    const auto length = static_cast<size_t>(field.nameLength);
+    const auto isOther = [&](FieldName const& known) {
+        return std::strlen(known.name) != length ||
+               std::memcmp(known.name, field.name, length) != 0;
+    };
     int rank = 0;
-    for (FieldName const& known : FieldNames) {
-        const auto length = static_cast<size_t>(field.nameLength);
-        if (std::strlen(known.name) == length && std::memcmp(known.name, field.name, length) == 0)
-            return rank;
+    while (FieldNames[rank].part != Part::None && isOther(FieldNames[rank]))
         ++rank;
-    }
-    return -1;
+    return rank;
 }
 
 bool IsDigits(char const* text, int length)
@@ -535,8 +537,6 @@ public:
         LogField field;
         while (fields.Next(field)) {
             const int rank = RankOf(field);
-            if (rank < 0)
-                continue;
             switch (FieldNames[rank].part) {
             case Part::Time:
                 if (rank < m_timeRank && takeTime(field))
@@ -554,6 +554,8 @@ public:
                 if (rank < m_programRank)
                     m_line.program = {field.value, field.valueLength};
                 m_programRank = std::min(rank, m_programRank);
+                break;
+            case Part::None:
                 break;
             }
         }
@@ -630,7 +632,8 @@ bool IsLogfmt(char const* line, int length)
 {
     LogField field;
     LogfmtFields fields(line, std::min(length, SearchLimit));
-    return length > 0 && !IsBlank(*line) && fields.Next(field) && RankOf(field) >= 0;
+    return length > 0 && !IsBlank(*line) && fields.Next(field) &&
+           FieldNames[RankOf(field)].part != Part::None;
 }
 
 } // namespace

@@ -232,9 +232,11 @@ private:
         int ignored = 0;
         if (!readNumber(2, ignored))
             return false;
-        if (m_end - m_at >= 3 && *m_at == ':')
+        char const* const minutes = m_at;
+        if (m_at != m_end && *m_at == ':')
             ++m_at;
-        readNumber(2, ignored);
+        if (!readNumber(2, ignored))
+            m_at = minutes; // the colon belongs to what follows
         return true;
     }
 

@@ -100,7 +100,7 @@ template <size_t Count>
 Level const* Find(Level const (&levels)[Count], char const* name, int length, bool anyCase)
 {
     for (Level const& level : levels) {
-        if (length > 0 && IsSame(name, length, level.name, anyCase))
+        if (IsSame(name, length, level.name, anyCase))
             return &level;
     }
     return nullptr;

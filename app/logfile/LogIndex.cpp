@@ -369,8 +369,8 @@ bool LogIndex::joinKnownLines(qint64 start)
     if (first == m_known.size() || m_runs.size() != 2)
         return false;
 
-    const qint64 seam =
-        m_runs[1].firstLine < m_lines.size() ? m_lines.start(m_runs[1].firstLine) : start;
+    const size_t seamLine = m_runs[1].firstLine; // this one, or the rest of a torn entry above it
+    const qint64 seam = seamLine == m_lines.size() ? start : m_lines.start(seamLine);
     m_isSeamUnchanged = seam == m_knownSeam;
     m_hasMoved = !m_isSeamUnchanged;
     const size_t joint = m_lines.size();

@@ -21,7 +21,6 @@ bool LogLineReader::Open(QString const& path, LogFileType const& type)
     m_lineEnd = type.lineEnd();
     m_file.close();
     m_bytes.clear();
-    m_start = 0;
     m_file.setFileName(path);
     // Opening a pipe would block.
     return QFileInfo(path).isFile() && m_file.open(QIODevice::ReadOnly | QIODevice::Unbuffered);

@@ -15,7 +15,7 @@ namespace {
 struct Candidate
 {
     qint64 start = -1;
-    int neighbors = -1; // how many are the same
+    int neighbors = -1; // how many are the same; without a line, less than with any
 };
 
 class Candidates
@@ -74,7 +74,7 @@ private:
             Candidate& best = m_best[open.first];
             const bool isNearer =
                 qAbs(candidate.start - mark.start) < qAbs(best.start - mark.start);
-            if (best.start < 0 || candidate.neighbors > best.neighbors ||
+            if (candidate.neighbors > best.neighbors ||
                 (candidate.neighbors == best.neighbors && isNearer))
                 best = candidate;
         }

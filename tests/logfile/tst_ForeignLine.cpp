@@ -5,6 +5,7 @@
 
 #include "app/logfile/ForeignLine.h"
 #include "app/logfile/LogLineParser.h"
+#include "support/GuardedBytes.h"
 
 #include <QtTest>
 
@@ -27,6 +28,40 @@ LogLineParser ForeignParser()
     return parser;
 }
 
+bool IsSame(ForeignLine const& one, ForeignLine const& other)
+{
+    const auto isSame = [](ForeignLine::Span a, ForeignLine::Span b) {
+        return a.start == b.start && a.length == b.length;
+    };
+    return one.isEntry == other.isEntry && one.isSure == other.isSure &&
+           isSame(one.time, other.time) && one.isEpoch == other.isEpoch &&
+           one.timeKey == other.timeKey && one.hasDate == other.hasDate &&
+           one.resolution == other.resolution && one.severity == other.severity &&
+           isSame(one.message, other.message) && isSame(one.program, other.program) &&
+           one.isEscaped == other.isEscaped;
+}
+
+// Whether each beginning of a line is read in the same way, whatever is before and after it.
+bool IsCutAnywhere(QByteArray const& line)
+{
+    const QDate latest(2026, 11, 25);
+    GuardedBytes guarded;
+    for (int length = 0; length <= line.size(); ++length) {
+        const QByteArray part = line.left(length);
+        const ForeignLine alone = ForeignLine::Read(guarded.Put(part, true), length, latest);
+        for (char next : {' ', ']', ')', ':', '=', '"', '}', '>', '[', 'E', '0', '/', 'm', '\n'}) {
+            const QByteArray followed = '[' + part + QByteArray(20, next);
+            if (!IsSame(ForeignLine::Read(followed.constData() + 1, length, latest), alone)) {
+                qWarning("%d bytes, followed by %d", length, next);
+                return false;
+            }
+        }
+        if (!IsSame(ForeignLine::Read(guarded.Put(part, false), length, latest), alone))
+            return false;
+    }
+    return true;
+}
+
 } // namespace
 
 class tst_ForeignLine : public QObject
@@ -40,6 +75,8 @@ private slots:
     void severities();
     void noEntries_data();
     void noEntries();
+    void zeroBytes();
+    void longLines();
     void keys_data();
     void keys();
     void epochs_data();
@@ -185,6 +222,75 @@ void tst_ForeignLine::formats_data()
     row("alternatives", "update-alternatives 2026-11-22 14:03:02: run with x",
         "2026-11-22 14:03:02", none, "update-alternatives 2026-11-22 14:03:02: run with x");
 
+    row("level in small letters", "2026-11-22 14:03:02 error x", "2026-11-22 14:03:02", error, "x");
+    row("level in small letters, second word", "2026-11-22 14:03:02 a error x",
+        "2026-11-22 14:03:02", none, "a error x");
+    row("everyday level in small letters", "2026-11-22 14:03:02 note x", "2026-11-22 14:03:02",
+        none, "note x");
+    row("everyday level with a colon", "2026-11-22 14:03:02 note: x", "2026-11-22 14:03:02", note,
+        "x");
+    row("bars", "2026-11-22 14:03:02 | ERROR | x", "2026-11-22 14:03:02", error, "x");
+    row("bar right after the level", "2026-11-22 14:03:02 ERROR|x", "2026-11-22 14:03:02", error,
+        "x");
+    row("commas", "2026-11-22 14:03:02,ERROR,x", "2026-11-22 14:03:02", error, "x");
+    row("minus before a number is kept", "2026-11-22 14:03:02 ERROR - -5", "2026-11-22 14:03:02",
+        error, "-5");
+    row("minus at the end", "2026-11-22 14:03:02 ERROR -", "2026-11-22 14:03:02", error, "");
+    row("letter in brackets", "2026-11-22 14:03:02 [W] x", "2026-11-22 14:03:02", warning, "x");
+    row("letter in brackets, with blanks", "2026-11-22 14:03:02 [ W ] x", "2026-11-22 14:03:02",
+        warning, "x");
+    row("level in brackets, with blanks", "2026-11-22 14:03:02 [ error\t] x", "2026-11-22 14:03:02",
+        error, "x");
+    row("only blanks in brackets", "2026-11-22 14:03:02 [ ] x", "2026-11-22 14:03:02", none,
+        "[ ] x");
+    row("empty brackets", "2026-11-22 14:03:02 [] x", "2026-11-22 14:03:02", none, "[] x");
+    row("level before a slash", "2026-11-22 14:03:02 [INFO/Main] x", "2026-11-22 14:03:02", note,
+        "x");
+    row("level before a colon", "2026-11-22 14:03:02 [error:core] x", "2026-11-22 14:03:02", none,
+        "[error:core] x");
+    row("open bracket", "2026-11-22 14:03:02 [error x", "2026-11-22 14:03:02", none, "[error x");
+    row("symbol and letters", "2026-11-22 14:03:02 (WW) x", "2026-11-22 14:03:02", warning, "x");
+    row("letter in parentheses", "2026-11-22 14:03:02 (W) x", "2026-11-22 14:03:02", none, "(W) x");
+    row("level as the sixth word", "2026-11-22 14:03:02 a b c d e ERROR x", "2026-11-22 14:03:02",
+        error, "a b c d e ERROR x");
+    row("level as the seventh word", "2026-11-22 14:03:02 a b c d e f ERROR x",
+        "2026-11-22 14:03:02", none, "a b c d e f ERROR x");
+    row("level with a digit", "2026-11-22 14:03:02 DEBUG5 x", "2026-11-22 14:03:02", trace, "x");
+    row("level after a digit", "2026-11-22 14:03:02 5DEBUG x", "2026-11-22 14:03:02", none,
+        "5DEBUG x");
+    row("level before a color", "2026-11-22 14:03:02 ERROR\x1b[0m x", "2026-11-22 14:03:02", error,
+        "x");
+    row("level before a plus sign", "2026-11-22 14:03:02 ERROR+ x", "2026-11-22 14:03:02", none,
+        "ERROR+ x");
+    row("short escape sequence", "\x1b[m2026-11-22 14:03:02 x", "2026-11-22 14:03:02", none, "x");
+    row("two escape sequences", "\x1b[0m\x1b[1;31mERROR: x", "", error, "x");
+    row("stamp in parentheses", "(2026-11-22 14:03:02) x", "2026-11-22 14:03:02", none, "x");
+    row("access log without an address", "-[22/Nov/2026:14:03:02 +0000] x",
+        "22/Nov/2026:14:03:02 +0000", none, "-[22/Nov/2026:14:03:02 +0000] x");
+    row("access stamp first", "[22/Nov/2026:14:03:02 +0000] x", "22/Nov/2026:14:03:02 +0000", none,
+        "x");
+    row("process of one digit", "7:C 22 Nov 2026 14:03:02.123 * x", "22 Nov 2026 14:03:02.123",
+        none, "7:C 22 Nov 2026 14:03:02.123 * x");
+    row("apt, end", "End-Date: 2026-11-22  14:03:02", "2026-11-22  14:03:02", none,
+        "End-Date: 2026-11-22  14:03:02");
+    row("apt terminal, end", "Log ended: 2026-11-22  14:03:02", "2026-11-22  14:03:02", none,
+        "Log ended: 2026-11-22  14:03:02");
+    row("priority 0", "<0>x", "", fatal, "x");
+    row("greatest priority", "<191>x", "", trace, "x");
+    row("priority of three digits, without a version", "<165>Nov 22 14:03:02 h x",
+        "Nov 22 14:03:02", note, "h x");
+    row("letter, comma and stamp without a level", "E, [2026-11-22T14:03:02 #71] x",
+        "2026-11-22T14:03:02", error, "#71] x");
+    row("level and stamp in brackets", "[INFO] [2026-11-22 14:03:02] x", "2026-11-22 14:03:02",
+        note, "x");
+    row("level first, another later", "ERROR: 2026-11-22 14:03:02 WARN x", "2026-11-22 14:03:02",
+        error, "WARN x");
+    row("ids and a letter, further on", "11-22 14:03:02.123  1200  1203 a E x",
+        "11-22 14:03:02.123", error, "1200  1203 a E x");
+    row("a letter without ids", "2026-11-22 14:03:02 1200 E x", "2026-11-22 14:03:02", none,
+        "1200 E x");
+    row("kernel, facility with blanks", "daemon :notice: x", "", note, "x");
+    row("kernel, facility without blanks", "user:info:x", "", note, "x");
     row("JSON", R"({"time":"2026-11-22T14:03:02Z","level":"error","msg":"disk full"})",
         "2026-11-22T14:03:02Z", error, "disk full");
     row("JSON, level by number", R"({"level":50,"time":"14:03:02","pid":71,"msg":"x"})", "14:03:02",
@@ -244,6 +350,8 @@ void tst_ForeignLine::formats()
     QCOMPARE(parts.severity, entry.severity);
     QCOMPARE(parts.timeLength > 0, !entry.time.isEmpty());
     QCOMPARE(parts.timeKey >= 0, !entry.time.isEmpty());
+
+    QVERIFY(IsCutAnywhere(line));
 }
 
 void tst_ForeignLine::severities_data()
@@ -298,6 +406,21 @@ void tst_ForeignLine::noEntries_data()
     row("empty JSON", "{}");
     row("JSON without known members", "{\"a\":1}");
     row("assignment", "a=1 b=2");
+    row("list of a level's letter", "[E] done");
+    row("level after what is no stamp", "Log started: ERROR: x");
+    row("facility without a level", "kern : x : y");
+    row("facility without a second colon", "kern :err x");
+    row("priority without a digit", "<>x");
+    row("priority of four digits", "<0034>x");
+    row("priority that is not closed", "<34 x");
+    row("only a priority's bracket", "<");
+    row("seconds without brackets", "12.345678 x");
+    row("seconds in parentheses", "(12.345678) x");
+    row("seconds and more in brackets", "[12.345678 x] y");
+    row("small letter and stamp", "e1122 14:03:02.123456 x");
+    row("letter, blank and compact stamp", "x E1122 14:03:02");
+    row("blank before known pairs", " level=error msg=x");
+    row("unknown pair first", "a=1 level=error msg=x");
 }
 
 void tst_ForeignLine::noEntries()
@@ -308,6 +431,34 @@ void tst_ForeignLine::noEntries()
     QCOMPARE(entry.time, QString());
     QCOMPARE(entry.severity, LogEntry::None);
     QCOMPARE(entry.message, QString::fromUtf8(line));
+    QVERIFY(IsCutAnywhere(line));
+}
+
+// The log may have been damaged.
+void tst_ForeignLine::zeroBytes()
+{
+    const QByteArray start("2026-11-22 14:03:02 ERROR a");
+    const QByteArray whole = start + '\0' + "b";
+    const ForeignLine line = ForeignLine::Read(whole.constData(), whole.size(), QDate());
+    QCOMPARE(line.severity, LogEntry::Error);
+    QCOMPARE(line.message.start, start.size() - 1);
+    QCOMPARE(line.message.length, 3);
+}
+
+// A severity counts in the first 512 bytes.
+void tst_ForeignLine::longLines()
+{
+    const QByteArray stamp("2026-11-22 14:03:02 ");
+    for (int end : {511, 512, 513}) { // of the severity
+        QByteArray line = stamp + '[' + QByteArray(end - 28, 'x') + "] ERROR";
+        QCOMPARE(line.size(), end);
+        line += QByteArray(900, ' ');
+        const ForeignLine found = ForeignLine::Read(line.constData(), line.size(), QDate());
+        QVERIFY(found.isEntry);
+        QCOMPARE(found.severity, end <= 512 ? LogEntry::Error : LogEntry::None);
+        QCOMPARE(found.message.start, stamp.size());
+        QCOMPARE(found.message.length, line.size() - stamp.size());
+    }
 }
 
 // Which of two stamps is later, and by how much.
@@ -332,6 +483,8 @@ void tst_ForeignLine::keys_data()
     row("twelve hours", "11/22/2026 2:03:02 PM x", "2026-11-22 14:03:02 x", 0);
     row("after midnight", "11/22/2026 12:30:00 AM x", "2026-11-22 00:30:00 x", 0);
     row("after noon", "11/22/2026 12:30:00 PM x", "2026-11-22 12:30:00 x", 0);
+    row("seconds since 1970", R"({"ts":1795442582})", R"({"ts":1795442582.250})", 250);
+    row("from 1970 on", R"({"ts":"0000000000"})", R"({"ts":"0000000001.5"})", 1500);
     row("compact", "I1122 14:03:02.000000 x", "E20261122 14:03:02.500 x", 500);
 }
 

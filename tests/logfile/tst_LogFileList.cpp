@@ -21,9 +21,9 @@ void tst_LogFileList::logFileList()
 {
     const QTemporaryDir folder;
     const QString log = folder.filePath("a[1] b.log");
-    for (char const* end : {"", ".1", ".2", ".10", ".x", ".01", ".bak.3"})
+    for (char const* end : {"", ".0", ".1", ".2", ".10", ".x", ".01", ".-1", ".bak.3"})
         QVERIFY(TestFiles::write(log + end, "x"));
-    const QStringList all{log, log + ".1", log + ".2", log + ".10"};
+    const QStringList all{log, log + ".0", log + ".1", log + ".2", log + ".10"};
     QCOMPARE(LogFileList::FilesOf(log), all);
     QCOMPARE(LogFileList::FilesOf(log + ".2"), all);
     QCOMPARE(LogFileList::FilesOf(folder.filePath("none.log")),

@@ -71,9 +71,14 @@ private slots:
     void longLines();
     void wideCharacters();
     void slowExpression();
+    void slowFirstLine();
     void noFile();
     void obsoleteRequest();
     void incompleteLine();
+    void sameCheck();
+    void emptyBefore();
+    void onlyChangedRowsAreSearched();
+    void findsBeforeItIsDone();
     void changedRows();
 
 private:
@@ -281,6 +286,22 @@ void tst_LogFinder::slowExpression()
     QVERIFY(hits.hits->empty());
 }
 
+// Again when the rows are the same, instead of what was found without it.
+void tst_LogFinder::slowFirstLine()
+{
+    const QByteArray log =
+        entry("09:00:00.000", "Trace", QString(3000, 'a')) + run(9, QTime(10, 0), "x");
+    QVERIFY(TestFiles::write(m_file, log));
+    LogFinder finder;
+    for (bool isReset : {true, false}) {
+        const LogHits hits =
+            find(finder, Text("(a+)+[b-z]$|x", true), RowsOf(IndexOf(log)), isReset);
+        QVERIFY(hits.isComplete);
+        QCOMPARE(hits.slowLine, qint64(1));
+        QVERIFY(hits.hits->empty());
+    }
+}
+
 void tst_LogFinder::noFile()
 {
     LogFinder finder;
@@ -309,6 +330,114 @@ void tst_LogFinder::incompleteLine()
     QVERIFY(find(finder, Text("a 2"), RowsOf(IndexOf(half))).hits->empty());
     QVERIFY(TestFiles::write(m_file, log));
     QCOMPARE(*find(finder, Text("a 2"), RowsOf(IndexOf(log)), false).hits, std::vector<int>({2}));
+}
+
+// Lines are told apart by a check of few bits. Of two that have the same, the last one is searched
+// again all the same.
+void tst_LogFinder::sameCheck()
+{
+    const QByteArray log = run(3, QTime(9, 0), "a");
+    const int start = log.lastIndexOf('\n', -2) + 1;
+    const QByteArray half = log.mid(start).trimmed();
+    const quint16 check = LogRows::CheckOf(half.constData(), half.size());
+    QByteArray whole;
+    int number = 0;
+    do
+        whole = half + " more " + QByteArray::number(++number);
+    while (LogRows::CheckOf(whole.constData(), whole.size()) != check);
+
+    LogFinder finder;
+    const QByteArray before = log.left(start) + half;
+    QVERIFY(TestFiles::write(m_file, before));
+    QVERIFY(find(finder, Text("more"), RowsOf(IndexOf(before))).hits->empty());
+    const QByteArray after = log.left(start) + whole + '\n';
+    QVERIFY(TestFiles::write(m_file, after));
+    const LogHits hits = find(finder, Text("more"), RowsOf(IndexOf(after)), false);
+    QCOMPARE(*hits.hits, std::vector<int>({2}));
+}
+
+void tst_LogFinder::emptyBefore()
+{
+    const QByteArray log = run(3, QTime(9, 0), "a");
+    LogFinder finder;
+    QVERIFY(TestFiles::write(m_file, QByteArray()));
+    QVERIFY(find(finder, Text("a"), RowsOf(IndexOf(QByteArray()))).hits->empty());
+    QVERIFY(TestFiles::write(m_file, log));
+    const LogHits hits = find(finder, Text("a"), RowsOf(IndexOf(log)), false);
+    QCOMPARE(*hits.hits, std::vector<int>({0, 1, 2}));
+}
+
+// Seen by other lines that have come in the place of those that were found.
+void tst_LogFinder::onlyChangedRowsAreSearched()
+{
+    const QByteArray log = run(9, QTime(9, 0), "a");
+    const auto rows = RowsOf(IndexOf(log));
+    const std::vector<int> all{0, 1, 2, 3, 4, 5, 6, 7, 8};
+    const auto afterOthers = [&](QString const& next, bool isReset) {
+        LogFinder finder;
+        TestFiles::write(m_file, log);
+        const LogHits before = find(finder, Text("a \\d", true), rows);
+        if (*before.hits != all || before.slowLine != 0)
+            return std::vector<int>();
+        TestFiles::write(m_file, QByteArray(log).replace(" a ", " b "));
+        return *find(finder, Text(next, true), rows, isReset).hits;
+    };
+    QCOMPARE(afterOthers("a \\d", false), std::vector<int>({0, 1, 2, 3, 4, 5, 6, 7}));
+    QCOMPARE(afterOthers("a \\d", true), std::vector<int>());
+    QCOMPARE(afterOthers("b \\d", false), all);
+}
+
+// A search that takes long tells what it has found so far, and can be stopped then. How many rows
+// that takes depends on the machine.
+void tst_LogFinder::findsBeforeItIsDone()
+{
+    const LogFilter text = Text("(x+x+)+y|^$|a$", true);
+    bool hasReported = false;
+    bool hasStopped = false;
+    bool isRemoved = false;
+    for (int rows = 1024; !(hasReported && hasStopped && isRemoved) && rows < 1 << 22; rows *= 2) {
+        const QByteArray log = (QByteArray(40, 'z') + QByteArray(12, 'x') + "a\n").repeated(rows);
+        QVERIFY(TestFiles::write(m_file, log));
+        const auto all = RowsOf(IndexOf(log));
+        LogFinder finder;
+        LogHits last;
+        connect(&finder, &LogFinder::found, this, [&](LogHits const& hits) {
+            QVERIFY(!last.isComplete);
+            QCOMPARE(hits.isComplete, hits.searched == rows);
+            QCOMPARE(hits.hits->size(), size_t(hits.searched));
+            QVERIFY(hits.searched > last.searched);
+            hasReported = hasReported || !hits.isComplete;
+            last = hits;
+        });
+        find(finder, text, all);
+        QVERIFY(last.isComplete);
+
+        hasStopped = false;
+        LogFinder stopped;
+        connect(&stopped, &LogFinder::found, this, [&](LogHits const& hits) {
+            QVERIFY(!hasStopped);
+            hasStopped = !hits.isComplete;
+            if (hasStopped)
+                stopped.SetCurrentRequest(hits.number + 1);
+        });
+        find(stopped, text, all);
+
+        // The line that takes too long has a number only while the file has its name.
+        const QByteArray slow = log + QByteArray(3000, 'x') + '\n';
+        QVERIFY(TestFiles::write(m_file, slow));
+        isRemoved = false;
+        LogFinder finderOfRemoved;
+        connect(&finderOfRemoved, &LogFinder::found, this, [&](LogHits const& hits) {
+            if (!hits.isComplete)
+                isRemoved = QFile::remove(m_file) || isRemoved;
+            else
+                QCOMPARE(hits.slowLine, qint64(isRemoved ? 0 : rows + 1));
+        });
+        QVERIFY(find(finderOfRemoved, text, RowsOf(IndexOf(slow))).isComplete);
+    }
+    QVERIFY(isRemoved);
+    QVERIFY(hasStopped);
+    QVERIFY(hasReported);
 }
 
 // Whatever has been kept from the previous search, the result is that of a search of everything.

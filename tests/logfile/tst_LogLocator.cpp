@@ -38,6 +38,10 @@ private slots:
     void places();
     void withoutDates();
     void withoutTimes();
+    void beforeTheFirstEntry();
+    void secondsSinceTheStart_data();
+    void secondsSinceTheStart();
+    void timeAtTheEndOfALongLine();
     void wideCharacters();
     void hiddenLine();
     void severalSlices();
@@ -115,6 +119,8 @@ void tst_LogLocator::places_data()
     row("back", "-10h", 2, LogLocation::Found, 1);
     row("back a little", "-1s", 2, LogLocation::Found, 1);
     row("back from a clock set back", "-1m", 4, LogLocation::Found, 2);
+    row("forward, without a current row", "+0s", -1, LogLocation::Beyond, 5);
+    row("back by a millisecond", "-1ms", 4, LogLocation::Found, 2);
     row("back, before the start", "-2d", 4, LogLocation::Beyond, 0);
 }
 
@@ -136,14 +142,79 @@ void tst_LogLocator::withoutDates()
     const QByteArray log = "09:00:00 Trace a\n10:00:00 Trace b\n11:00:00 Trace c\n";
     QCOMPARE(locate(log, "10:00", -1, LogFilter(), parser).row, 1);
     QCOMPARE(locate(log, "+90m", 0, LogFilter(), parser).row, 2);
-    QCOMPARE(locate(log, "2025-03-03 10:00", -1, LogFilter(), parser).answer, LogLocation::NoDates);
+    const LogLocation date = locate(log, "2025-03-03 10:00", -1, LogFilter(), parser);
+    QCOMPARE(date.answer, LogLocation::NoDates);
+    QCOMPARE(date.row, -1);
 }
 
 void tst_LogLocator::withoutTimes()
 {
     QCOMPARE(locate("a\nb\n", "10:00", -1).answer, LogLocation::NoTimes);
     QCOMPARE(locate("a\nb\n", "2", -1).row, 1);
-    QCOMPARE(locate("", "10:00", -1).answer, LogLocation::NoTimes);
+    const LogLocation nowhere = locate("", "10:00", -1);
+    QCOMPARE(nowhere.answer, LogLocation::NoTimes);
+    QCOMPARE(nowhere.row, -1);
+}
+
+// The lines above the first entry have its time.
+void tst_LogLocator::beforeTheFirstEntry()
+{
+    const QByteArray log = "a\n" + TwoDays();
+    QCOMPARE(locate(log, "22:00", 0).row, 1);
+    QCOMPARE(locate(log, "22:30", 0).row, 2);
+}
+
+// The first entry of a system that starts has the time 0.
+void tst_LogLocator::secondsSinceTheStart_data()
+{
+    QTest::addColumn<QByteArray>("log");
+    QTest::addColumn<QByteArray>("place");
+    QTest::addColumn<int>("current");
+    QTest::addColumn<int>("answer");
+    QTest::addColumn<int>("row");
+    const auto row = [](char const* name, QByteArray const& log, char const* place, int current,
+                        LogLocation::Answer answer, int found) {
+        QTest::newRow(name) << log << QByteArray(place) << current << int(answer) << found;
+    };
+    const QByteArray first("[    0.000000] first\n");
+    const QByteArray two = first + "[    1.000000] second\n";
+    row("from the first entry", two, "+1s", 0, LogLocation::Found, 1);
+    row("from a line above it", "a\n" + two, "+1s", 0, LogLocation::Found, 2);
+    row("back to the first entry", two, "-1s", 1, LogLocation::Found, 0);
+    row("back, before the first entry", two, "-5s", 1, LogLocation::Beyond, 0);
+    row("after the first entry, which is the last", first, "12:00", -1, LogLocation::Beyond, 0);
+}
+
+void tst_LogLocator::secondsSinceTheStart()
+{
+    QFETCH(QByteArray, log);
+    QFETCH(QByteArray, place);
+    QFETCH(int, current);
+    QFETCH(int, answer);
+    QFETCH(int, row);
+    LogFileType type;
+    type.isForeign = true;
+    LogLineParser parser;
+    parser.SetFileType(type);
+    const LogLocation location = locate(log, place.constData(), current, LogFilter(), parser);
+    QCOMPARE(int(location.answer), answer);
+    QCOMPARE(location.row, row);
+}
+
+// As much of a line is looked at as the index does.
+void tst_LogLocator::timeAtTheEndOfALongLine()
+{
+    LogFileType type;
+    type.isForeign = true;
+    LogLineParser parser;
+    parser.SetFileType(type);
+    const QByteArray start("{\"a\":\"");
+    const QByteArray end("\",\"time\":\"14:03:02\"");
+    const QByteArray filling(LogIndex::PartsLimit - start.size() - end.size(), 'x');
+    QCOMPARE(locate(start + filling + end + "}\n", "14:00", -1, LogFilter(), parser).row, 0);
+    const LogLocation cut =
+        locate(start + filling + 'x' + end + "}\n", "14:00", -1, LogFilter(), parser);
+    QCOMPARE(cut.answer, LogLocation::NoTimes);
 }
 
 // Lines are those of the file, whatever is shown of it.
@@ -174,6 +245,16 @@ void tst_LogLocator::hiddenLine()
     const LogLocation shown = locate(TwoDays(), "5", -1, filter);
     QCOMPARE(shown.answer, LogLocation::Found);
     QCOMPARE(shown.row, 2);
+
+    const QByteArray hiddenEnds =
+        entry("09:00:00.000", "Error", "a") + entry("10:00:00.000", "Trace", "b") +
+        entry("11:00:00.000", "Trace", "c") + entry("12:00:00.000", "Error", "d");
+    const LogLocation first = locate(hiddenEnds, "1", -1, filter);
+    QCOMPARE(first.answer, LogLocation::Nearest);
+    QCOMPARE(first.row, 0);
+    const LogLocation last = locate(hiddenEnds, "12:00", -1, filter);
+    QCOMPARE(last.answer, LogLocation::Beyond);
+    QCOMPARE(last.row, 1);
 }
 
 void tst_LogLocator::severalSlices()

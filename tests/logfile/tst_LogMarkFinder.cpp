@@ -18,6 +18,8 @@ class tst_LogMarkFinder : public QObject
 
 private slots:
     void identities();
+    void lineAbove_data();
+    void lineAbove();
     void found_data();
     void found();
     void severalMarks();
@@ -47,6 +49,7 @@ void tst_LogMarkFinder::identities()
 {
     QVERIFY(TestFiles::write(m_file, "a\nbb\nc"));
     const LogMark first = LogMark::Of(m_file, 0);
+    QVERIFY(first.isFound);
     QCOMPARE(first.line, LogMark::IdentityOf("a"));
     QCOMPARE(first.above, QByteArray());
     QCOMPARE(first.below, LogMark::IdentityOf("bb"));
@@ -58,6 +61,33 @@ void tst_LogMarkFinder::identities()
     QCOMPARE(last.above, LogMark::IdentityOf("bb"));
     QCOMPARE(last.below, QByteArray());
     QVERIFY(LogMark::IdentityOf("a") != LogMark::IdentityOf("b"));
+    QVERIFY(TestFiles::write(m_file, "\nb\n"));
+    QCOMPARE(LogMark::Of(m_file, 1).above, LogMark::IdentityOf(""));
+}
+
+// A very long one is not read.
+void tst_LogMarkFinder::lineAbove_data()
+{
+    QTest::addColumn<QByteArray>("before");
+    QTest::addColumn<int>("length");
+    QTest::addColumn<bool>("isKnown");
+    const int most = 64 << 10; // that are read, line ends included
+    QTest::newRow("first line") << QByteArray() << most - 1 << true;
+    QTest::newRow("first line, very long") << QByteArray() << most << false;
+    QTest::newRow("other line") << QByteArray("first\n") << most - 2 << true;
+    QTest::newRow("other line, very long") << QByteArray("first\n") << most - 1 << false;
+}
+
+void tst_LogMarkFinder::lineAbove()
+{
+    QFETCH(QByteArray, before);
+    QFETCH(int, length);
+    QFETCH(bool, isKnown);
+    const QByteArray line(length, 'x');
+    QVERIFY(TestFiles::write(m_file, before + line + "\nb\n"));
+    const LogMark mark = LogMark::Of(m_file, before.size() + length + 1);
+    QCOMPARE(mark.line, LogMark::IdentityOf("b"));
+    QCOMPARE(mark.above, isKnown ? LogMark::IdentityOf(line) : QByteArray());
 }
 
 void tst_LogMarkFinder::found_data()
@@ -80,6 +110,11 @@ void tst_LogMarkFinder::found_data()
     row("below the same line", "a\nx\nb\nx\nc\n", 6, "x\nb\nx\ny\nx\n", 4);
     row("above the same line", "a\nx\nb\nx\nc\n", 6, "x\ny\nx\nc\n", 4);
     row("equal neighbors, same place", "x\nx\nx\nx\nx\n", 4, "x\nx\nx\nx\nx\n", 4);
+    row("below the same line, farther away", "a\nx\nbbb\n", 2, "qq\nx\nq\nx\nbbb\n", 7);
+    row("first line, and a line like it", "x\nb\nx\nc\n", 0, "x\nb\nx\nc\n", 0);
+    row("only the line above is the same, farther away", "a\nx\nb\n", 2, "x\nb\na\nx\n", 0);
+    row("only the line below is the same, farther away", "a\nx\nb\n", 2, "a\nx\nq\nx\nb\n", 2);
+    row("equally far away", "a\nx\nb\n", 2, "x\nq\nx\n", 0);
     row("empty line", "a\n\nb\n", 2, "new\na\n\nb\n", 6);
     row("without a line end", "a\nb", 2, "a\nb", 2);
     row("other line ends", "a\nb\nc\n", 2, "a\r\nb\r\nc\r\n", 3);

@@ -60,6 +60,7 @@ void tst_LogPlace::places_data()
     row("+ 5 m", LogPlace::Interval, 5 * Minute);
     row("-500ms", LogPlace::Interval, -500);
     row("+0s", LogPlace::Interval, 0);
+    row("+999999999s", LogPlace::Interval, 999999999000);
 }
 
 void tst_LogPlace::places()
