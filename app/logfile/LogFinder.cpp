@@ -8,7 +8,6 @@
 #include "app/logfile/LogUpdate.h"
 
 #include <QElapsedTimer>
-#include <QFile>
 
 #include <algorithm>
 
@@ -29,7 +28,7 @@ LogFinder::LogFinder(QObject* parent) : QObject(parent)
 
 bool LogFinder::isSameText(LogFindRequest const& request) const
 {
-    return request.path == m_request.path && request.type.IsLike(m_request.type) &&
+    return request.source == m_request.source && request.type.IsLike(m_request.type) &&
            request.text.HasSameText(m_request.text);
 }
 
@@ -45,7 +44,7 @@ void LogFinder::Find(LogFindRequest const& request)
         return;
 
     LogLineReader reader;
-    if (!reader.Open(request.path, request.type) || !request.text.hasText()) {
+    if (!reader.Open(request.source, request.type) || !request.text.hasText()) {
         report(request.rows->size(), true);
         return;
     }
@@ -147,12 +146,12 @@ void LogFinder::report(size_t searched, bool isComplete)
 
 qint64 LogFinder::numberOfLine(qint64 start) const
 {
-    QFile file(m_request.path);
-    if (!file.open(QIODevice::ReadOnly))
+    LogBytes log;
+    if (!log.Open(m_request.source))
         return 0;
     qint64 number = 1;
-    while (file.pos() < start && !isCancelled()) {
-        const QByteArray bytes = file.read(std::min<qint64>(1 << 20, start - file.pos()));
+    while (log.position() < start && !isCancelled()) {
+        const QByteArray bytes = log.Read(std::min<qint64>(1 << 20, start - log.position()));
         if (bytes.isEmpty())
             break;
         number += std::count(bytes.begin(), bytes.end(), '\n');

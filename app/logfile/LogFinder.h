@@ -6,6 +6,7 @@
 #include "app/logfile/LogFileType.h"
 #include "app/logfile/LogFilter.h"
 #include "app/logfile/LogRows.h"
+#include "app/logfile/LogSource.h"
 
 #include <QMetaType>
 #include <QObject>
@@ -23,7 +24,7 @@ class LogLineReader;
 struct LogFindRequest
 {
     int number = 0;
-    QString path;
+    LogSource source;
     LogFileType type;
     LogFilter text; ///< only its text counts
     std::shared_ptr<LogRows const> rows;

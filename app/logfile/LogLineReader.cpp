@@ -3,8 +3,6 @@
 
 #include "app/logfile/LogLineReader.h"
 
-#include <QFileInfo>
-
 #include <algorithm>
 
 namespace Velocor {
@@ -15,24 +13,22 @@ constexpr int SliceSize = 64 << 10;
 
 } // namespace
 
-bool LogLineReader::Open(QString const& path, LogFileType const& type)
+bool LogLineReader::Open(LogSource const& source, LogFileType const& type)
 {
     m_type = type;
     m_lineEnd = type.lineEnd();
-    m_file.close();
     m_bytes.clear();
-    m_file.setFileName(path);
-    // Opening a pipe would block.
-    return QFileInfo(path).isFile() && m_file.open(QIODevice::ReadOnly | QIODevice::Unbuffered);
+    m_start = 0;
+    return m_file.Open(source);
 }
 
 bool LogLineReader::readMore()
 {
     const int size = m_bytes.size();
-    if (!m_file.seek(m_start + size))
+    if (!m_file.Seek(m_start + size))
         return false;
     m_bytes.resize(size + SliceSize);
-    const qint64 count = m_file.read(m_bytes.data() + size, SliceSize);
+    const qint64 count = m_file.Read(m_bytes.data() + size, SliceSize);
     m_bytes.resize(size + static_cast<int>(std::max<qint64>(count, 0)));
     return count > 0;
 }

@@ -3,11 +3,10 @@
 
 #pragma once
 
+#include "app/logfile/LogBytes.h"
 #include "app/logfile/LogFileType.h"
 
 #include <QByteArray>
-#include <QFile>
-#include <QString>
 
 namespace Velocor {
 
@@ -21,11 +20,11 @@ namespace Velocor {
 class LogLineReader
 {
 public:
-    /// Opens a file, and forgets what was read before.
+    /// Opens a log, and forgets what was read before.
     ///
     /// @param type  how lines end, and how their bytes are decoded
     /// @return false if it cannot be read or is not a regular file
-    bool Open(QString const& path, LogFileType const& type = LogFileType());
+    bool Open(LogSource const& source, LogFileType const& type = LogFileType());
 
     /// The bytes of the line that starts there, without its line end; none at the end of the file.
     ///
@@ -42,7 +41,7 @@ private:
     bool readMore();
     int endAfter(int at, int searched) const;
 
-    QFile m_file;
+    LogBytes m_file;
     QByteArray m_bytes;
     qint64 m_start = 0; // of the bytes in the file
     qint64 m_next = 0;

@@ -7,8 +7,6 @@
 #include "app/logfile/LogLineReader.h"
 #include "app/logfile/Milliseconds.h"
 
-#include <QFile>
-
 #include <algorithm>
 #include <functional>
 
@@ -23,13 +21,13 @@ qint64 StartOfLine(LogLocateRequest const& request, std::function<bool()> const&
 {
     const LogLineEnd lineEnd = request.parser.fileType().lineEnd();
     qint64 number = request.place.value;
-    QFile file(request.path);
-    if (number == 1 || !file.open(QIODevice::ReadOnly))
+    LogBytes log;
+    if (number == 1 || !log.Open(request.source))
         return number == 1 ? 0 : -1;
     qint64 offset = 0;
     char before = '\0'; // the last byte, unless a line ended with it
     while (!isCancelled()) {
-        const QByteArray bytes = file.read(1 << 20);
+        const QByteArray bytes = log.Read(1 << 20);
         if (bytes.isEmpty())
             return -1;
         char const* at = bytes.constBegin();
@@ -39,7 +37,7 @@ qint64 StartOfLine(LogLocateRequest const& request, std::function<bool()> const&
             before = '\0';
             const qint64 start = offset + (at - bytes.constBegin());
             if (--number == 1)
-                return start < file.size() ? start : -1;
+                return start < log.size() ? start : -1;
         }
         before = at == bytes.constEnd() ? '\0' : bytes.back();
         offset += bytes.size();
@@ -56,7 +54,7 @@ public:
         : m_request(request), m_isCancelled(std::move(isCancelled)), m_report(std::move(report)),
           m_starts(*request.rows), m_count(static_cast<int>(request.rows->size()))
     {
-        m_isOpen = m_reader.Open(request.path, request.parser.fileType());
+        m_isOpen = m_reader.Open(request.source, request.parser.fileType());
     }
 
     LogLocation find()

@@ -6,6 +6,7 @@
 #include "app/logfile/LogLineParser.h"
 #include "app/logfile/LogPlace.h"
 #include "app/logfile/LogRows.h"
+#include "app/logfile/LogSource.h"
 
 #include <QMetaType>
 #include <QObject>
@@ -20,7 +21,7 @@ namespace Velocor {
 struct LogLocateRequest
 {
     int number = 0;
-    QString path;
+    LogSource source;
     LogLineParser parser;
     LogPlace place; ///< valid
     std::shared_ptr<LogRows const> rows;

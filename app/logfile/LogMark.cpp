@@ -6,7 +6,6 @@
 #include "app/logfile/LogLineReader.h"
 
 #include <QCryptographicHash>
-#include <QFile>
 
 #include <algorithm>
 
@@ -17,13 +16,13 @@ namespace {
 constexpr qint64 LookBack = 64 << 10; // bytes
 
 // Where the line above starts; -1 if there is none, or if it is very long.
-qint64 StartAbove(QString const& path, qint64 start, LogLineEnd const& lineEnd)
+qint64 StartAbove(LogSource const& source, qint64 start, LogLineEnd const& lineEnd)
 {
-    QFile file(path);
+    LogBytes log;
     const qint64 from = std::max<qint64>(0, start - LookBack);
-    if (start <= 0 || !file.open(QIODevice::ReadOnly) || !file.seek(from))
+    if (start <= 0 || !log.Open(source) || !log.Seek(from))
         return -1;
-    const QByteArray bytes = file.read(start - from - lineEnd.size());
+    const QByteArray bytes = log.Read(start - from - lineEnd.size());
     char const* at = bytes.constBegin();
     while (char const* last =
                lineEnd.Find(at, bytes.constEnd(), from + (at - bytes.constBegin()), '\0'))
@@ -39,20 +38,20 @@ QByteArray LogMark::IdentityOf(QByteArray const& line)
            QCryptographicHash::hash(line, QCryptographicHash::Sha1).toHex();
 }
 
-LogMark LogMark::Of(QString const& path, qint64 start, LogFileType const& type)
+LogMark LogMark::Of(LogSource const& source, qint64 start, LogFileType const& type)
 {
     LogMark mark;
     mark.start = start;
     mark.isFound = true;
     LogLineReader reader;
-    if (!reader.Open(path, type))
+    if (!reader.Open(source, type))
         return mark;
     mark.line = IdentityOf(reader.Line(start));
     const qint64 next = reader.nextStart();
     const QByteArray below = reader.Line(next);
     if (reader.nextStart() > next)
         mark.below = IdentityOf(below);
-    const qint64 above = StartAbove(path, start, type.lineEnd());
+    const qint64 above = StartAbove(source, start, type.lineEnd());
     if (above >= 0)
         mark.above = IdentityOf(reader.Line(above));
     return mark;

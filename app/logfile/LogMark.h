@@ -4,6 +4,7 @@
 #pragma once
 
 #include "app/logfile/LogFileType.h"
+#include "app/logfile/LogSource.h"
 
 #include <QByteArray>
 #include <QMetaType>
@@ -31,7 +32,8 @@ struct LogMark
 
     /// The mark of the line that starts there, in a regular file; of an empty line if the file
     /// cannot be read.
-    static LogMark Of(QString const& path, qint64 start, LogFileType const& type = LogFileType());
+    static LogMark Of(LogSource const& source, qint64 start,
+                      LogFileType const& type = LogFileType());
 
     /// How many characters of a note are kept.
     static constexpr int MaximumNote = 1000;

@@ -97,14 +97,15 @@ LogMarkFinder::LogMarkFinder(QObject* parent) : QObject(parent)
 {
     qRegisterMetaType<QVector<LogMark>>("QVector<Velocor::LogMark>");
     qRegisterMetaType<LogFileType>();
+    qRegisterMetaType<LogSource>();
 }
 
-void LogMarkFinder::Find(int request, QString const& path, QVector<LogMark> const& marks,
+void LogMarkFinder::Find(int request, LogSource const& source, QVector<LogMark> const& marks,
                          LogFileType const& type)
 {
     Candidates candidates(marks);
     LogLineReader reader;
-    qint64 start = reader.Open(path, type) ? 0 : -1;
+    qint64 start = reader.Open(source, type) ? 0 : -1;
     while (start >= 0 && m_currentRequest <= request) {
         const QByteArray line = reader.Line(start);
         if (reader.nextStart() <= start)

@@ -31,7 +31,7 @@ public:
 public Q_SLOTS:
     /// Reads a file to its end, and emits found() with the same marks in the same order, unless the
     /// request becomes obsolete.
-    void Find(int request, QString const& path, QVector<Velocor::LogMark> const& marks,
+    void Find(int request, Velocor::LogSource const& source, QVector<Velocor::LogMark> const& marks,
               Velocor::LogFileType const& type = Velocor::LogFileType());
 
 Q_SIGNALS:

@@ -57,6 +57,7 @@ void LogRows::AddHeading(qint64 start)
 {
     m_parts.push_back({Part::Heading, m_size, static_cast<size_t>(-start)});
     ++m_size;
+    ++m_headings;
 }
 
 void LogRows::AddLines(size_t first, size_t end)
@@ -87,6 +88,20 @@ void LogRows::AddLine(size_t line, bool isContext)
     ++m_size;
 }
 
+void LogRows::AddRows(LogRows const& rows, size_t first, size_t end, size_t offset)
+{
+    if (first == end)
+        return;
+    Part const& part = rows.partOf(first);
+    if (part.kind == Part::Lines) {
+        const size_t line = rows.lineOf(part, first) + offset;
+        AddLines(line, line + end - first);
+        return;
+    }
+    for (size_t row = first; row < end; ++row)
+        AddLine(rows.lineOf(part, row) + offset, rows.mark(row) & Context);
+}
+
 void LogRows::Truncate(size_t row)
 {
     for (size_t removed = row; removed < m_size; ++removed)
@@ -94,6 +109,7 @@ void LogRows::Truncate(size_t row)
     while (!m_parts.empty() && m_parts.back().firstRow >= row) {
         if (m_parts.back().kind == Part::Listed)
             m_numbers.Truncate(m_parts.back().first);
+        m_headings -= m_parts.back().isHeading();
         m_parts.pop_back();
     }
     if (!m_parts.empty() && m_parts.back().kind == Part::Listed)

@@ -37,6 +37,9 @@ public:
     static constexpr qint64 EarlierHeading = -1;
     static constexpr qint64 NewestHeading = -2;
 
+    /// Of the heading of a run among several; those of the runs after it are smaller.
+    static constexpr qint64 FirstRunHeading = -3;
+
     /// The mark of a row: a LogEntry::Severity and these flags.
     static constexpr quint8 SeverityMask = 0x07;
     static_assert(LogEntry::None <= SeverityMask, "a mark has no room for another severity");
@@ -109,6 +112,9 @@ public:
     /// The number of rows of earlier runs, including their heading; 0 if there are none.
     size_t earlier() const { return m_earlier; }
 
+    /// The number of headings.
+    size_t headings() const { return m_headings; }
+
     /// The number of entries that are warnings or worse.
     size_t problems() const { return m_problems; }
 
@@ -137,6 +143,14 @@ public:
 
     /// Adds a row for one line, which must be among the first 2^31.
     void AddLine(size_t line, bool isContext);
+
+    /// Adds the rows of one run of another file, without its heading.
+    ///
+    /// @param rows  of a table whose lines are in this one, too
+    /// @param first  the first of the rows to add
+    /// @param end  the row after the last one
+    /// @param offset  the line here that is the first one there
+    void AddRows(LogRows const& rows, size_t first, size_t end, size_t offset);
 
     /// Tells that the rows so far are those of the earlier runs.
     void EndEarlier() { m_earlier = m_size; }
@@ -207,6 +221,7 @@ private:
     std::vector<Part> m_parts; // without empty ones
     size_t m_size = 0;
     size_t m_earlier = 0;
+    size_t m_headings = 0;
     size_t m_problems = 0;
     size_t m_newestEnd = 0;
     qint64 m_complete = 0;

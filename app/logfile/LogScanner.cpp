@@ -443,6 +443,7 @@ void LogScanner::report(bool isPartial)
     update.hasTimes = m_index.hasTimes();
     update.hasSeverities = m_index.hasSeverities();
     update.type = m_parser.fileType();
+    update.runStarts = m_index.RunStarts();
     update.slowLine = m_index.slowLine();
     if (nothingNew)
         return;

@@ -10,6 +10,7 @@
 #include <QString>
 
 #include <memory>
+#include <vector>
 
 namespace Velocor {
 
@@ -37,7 +38,8 @@ struct LogUpdate
     bool hasElapsed = false;
     bool hasTimes = false;
     bool hasSeverities = false;
-    LogFileType type; ///< how to read the lines
+    LogFileType type;              ///< how to read the lines
+    std::vector<size_t> runStarts; ///< see LogIndex::RunStarts()
 
     /// Computes the numbers from the rows before and after.
     void Compare(LogRows const& before);

@@ -74,8 +74,8 @@ void LineCommands::saveTo(QString const& path)
     LogPanel const* log = m_tabs->currentLog();
     if (!log)
         return;
-    auto* saver = new LineSaver(log->path(), log->LineStarts(), log->model()->parser().fileType(),
-                                path, this);
+    auto* saver = new LineSaver(log->model()->source(), log->LineStarts(),
+                                log->model()->parser().fileType(), path, this);
     connect(saver, &LineSaver::progressed, this,
             [this](int percent) { Q_EMIT messageReported(tr("Saving lines: %1%").arg(percent)); });
     connect(saver, &QThread::finished, this, [this, saver] {

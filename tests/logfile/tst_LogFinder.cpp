@@ -104,7 +104,7 @@ LogHits tst_LogFinder::find(LogFinder& finder, LogFilter const& text,
         connect(&finder, &LogFinder::found, this, [&](LogHits const& hits) { last = hits; });
     LogFindRequest request;
     request.number = ++m_number;
-    request.path = m_file;
+    request.source = m_file;
     request.text = text;
     request.rows = std::move(rows);
     request.isReset = isReset;
@@ -239,7 +239,7 @@ void tst_LogFinder::wideCharacters()
     LogHits last;
     connect(&finder, &LogFinder::found, this, [&](LogHits const& hits) { last = hits; });
     request.number = 1;
-    request.path = m_file;
+    request.source = m_file;
     request.rows = RowsOf(index);
     request.text = Text(QChar(0x20ac));
     finder.Find(request);

@@ -69,7 +69,7 @@ LogLocation tst_LogLocator::locate(QByteArray const& log, char const* place, int
     index.End();
     LogLocateRequest request;
     request.number = 1;
-    request.path = path;
+    request.source = path;
     request.parser = parser;
     request.place = LogPlace::Parse(place);
     request.rows = std::make_shared<LogRows>(index.Rows(filter));

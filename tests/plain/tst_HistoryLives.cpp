@@ -2,9 +2,12 @@
 // SPDX-License-Identifier: MIT
 
 // Random lives of several programs and their rotating logs, compared with what they wrote: every
-// line that is in the files once, in the order in which it was written, and merged by time.
+// line that is in the files once, in the order in which it was written, and merged by time. What
+// the window shows as all of a log is compared with that.
 
 #include "app/history/HistoryMerge.h"
+#include "app/history/HistoryScanner.h"
+#include "app/logfile/LogLineReader.h"
 
 #include "ProgramLife.h"
 #include "Rounds.h"
@@ -34,6 +37,8 @@ private:
     void compareMerged(std::vector<std::unique_ptr<ProgramLife>> const& lives,
                        std::vector<LogHistory> const& histories,
                        QList<QList<QByteArray>> const& alone);
+    void compareInWindow(ProgramLife const& life, LogLineParser const& parser,
+                         LogHistory const& history);
 
     QTemporaryDir m_folder{QFileInfo("/dev/shm").isWritable() ? "/dev/shm/tst_HistoryLives-XXXXXX"
                                                               : "tst_HistoryLives-XXXXXX"};
@@ -44,6 +49,7 @@ private:
     int m_guesses = 0;
     qint64 m_lines = 0;
     qint64 m_times = 0;
+    quint64 m_rows = 0;
 };
 
 // Where clocks change twice a year.
@@ -156,6 +162,58 @@ void tst_HistoryLives::compareMerged(std::vector<std::unique_ptr<ProgramLife>> c
     m_clearMerges += isClear;
 }
 
+// The rows of all of a log, first with a filter and then of all lines, as they are read for a view.
+void tst_HistoryLives::compareInWindow(ProgramLife const& life, LogLineParser const& parser,
+                                       LogHistory const& history)
+{
+    HistoryScanner scanner;
+    HistoryUpdate update;
+    connect(&scanner, &HistoryScanner::updated, &scanner,
+            [&update](HistoryUpdate const& now) { update = now; });
+    const auto shown = [&] {
+        QList<QByteArray> lines;
+        LogLineReader reader;
+        reader.Open({life.path(), update.older}, update.type);
+        for (size_t row = 0; row < update.rows->size(); ++row) {
+            if (update.rows->isHeading(row))
+                continue;
+            const QByteArray line = reader.Line(update.rows->start(row));
+            lines.append(QByteArray(line.constData(), line.size()));
+        }
+        return lines;
+    };
+    const auto expected = [&](LogFilter const& filter) {
+        LogHistory filtered(parser, filter);
+        filtered.ReadLog(life.path());
+        QList<QByteArray> lines;
+        HistoryCursor cursor(filtered, false);
+        while (cursor.Next())
+            lines.append(QByteArray(cursor.content().constData(), cursor.content().size()));
+        return lines;
+    };
+    const auto compare = [&](LogFilter const& filter) {
+        QCOMPARE(shown(), expected(filter));
+        QCOMPARE(update.runs->size(), history.runs().size());
+        m_rows += update.rows->size();
+    };
+    LogFilter filter;
+    filter.SetText(QStringLiteral("7"), false, false);
+    scanner.Open(0, life.path(), parser, filter, true);
+    compare(filter);
+    scanner.SetFilter(0, LogFilter());
+    compare(LogFilter());
+    LogFilter few;
+    few.SetSeverity(LogEntry::Trace, false);
+    scanner.SetFilter(0, few);
+    compare(few);
+    for (char const* text : {"Warning", "m"}) {
+        filter.SetText(QString::fromLatin1(text), false, false);
+        filter.SetContext(filter.context() + 1);
+        scanner.SetFilter(0, filter);
+        compare(filter);
+    }
+}
+
 void tst_HistoryLives::look(std::vector<std::unique_ptr<ProgramLife>>& lives)
 {
     std::vector<LogHistory> histories;
@@ -174,6 +232,7 @@ void tst_HistoryLives::look(std::vector<std::unique_ptr<ProgramLife>>& lives)
         compareLines(*life, shown);
         compareOrder(*life, shown);
         compareTimes(*life, histories.back());
+        compareInWindow(*life, parser, histories.back());
         if (QTest::currentTestFailed())
             return;
     }
@@ -231,9 +290,9 @@ void tst_HistoryLives::cleanupTestCase()
     std::printf(
         "plain history: %d lives, %d views of a log with %lld lines, %d with a clear order, "
         "%d in which a clock that was set back was taken for a restart, %d merges of logs "
-        "with a clear order, %lld times\n",
+        "with a clear order, %lld times, %llu rows in the window\n",
         m_lives, m_views, static_cast<long long>(m_lines), m_clearViews, m_guesses, m_clearMerges,
-        static_cast<long long>(m_times));
+        static_cast<long long>(m_times), static_cast<unsigned long long>(m_rows));
     std::fflush(stdout);
 }
 

@@ -3,14 +3,13 @@
 
 #include "app/window/log/LineSaver.h"
 
-#include <QFile>
 #include <QFileInfo>
 #include <QSaveFile>
 
 namespace Velocor {
 
-LineSaver::LineSaver(QString const& source, QVector<qint64> const& starts, LogFileType const& type,
-                     QString const& target, QObject* parent)
+LineSaver::LineSaver(LogSource const& source, QVector<qint64> const& starts,
+                     LogFileType const& type, QString const& target, QObject* parent)
     : QThread(parent), m_source(source), m_target(target), m_starts(starts),
       m_lineEnd(type.lineEnd())
 {}
@@ -26,16 +25,16 @@ void LineSaver::run()
     m_error = save();
 }
 
-QString LineSaver::copyLine(QFile& from, qint64 start, QSaveFile& to) const
+QString LineSaver::copyLine(LogBytes& from, qint64 start, QSaveFile& to) const
 {
     const QString changed = tr("The log has changed in the meantime");
-    if (!from.seek(start))
+    if (!from.Seek(start))
         return changed;
     char const* last = nullptr;
     char before = '\0';
     for (int size = 256; !last; size = 1 << 16) { // most lines are short
-        const qint64 offset = from.pos();
-        QByteArray bytes = from.read(size);
+        const qint64 offset = from.position();
+        QByteArray bytes = from.Read(size);
         if (bytes.isEmpty() && offset == start)
             return changed;
         last = m_lineEnd.Find(bytes.constBegin(), bytes.constEnd(), offset, before);
@@ -53,19 +52,29 @@ QString LineSaver::copyLine(QFile& from, qint64 start, QSaveFile& to) const
     return QString();
 }
 
+bool LineSaver::isSource(QFileInfo const& target) const
+{
+    const auto isSame = [&target](QString const& path) {
+        return target.canonicalFilePath() == QFileInfo(path).canonicalFilePath();
+    };
+    bool isOne = isSame(m_source.path);
+    for (size_t file = 0; m_source.older && file < m_source.older->count(); ++file)
+        isOne = isOne || isSame(m_source.older->path(file));
+    return isOne;
+}
+
 QString LineSaver::save()
 {
-    const QFileInfo source(m_source);
     const QFileInfo target(m_target);
     if (target.exists() && !target.isFile())
         return tr("Not a regular file");
-    if (target.exists() && target.canonicalFilePath() == source.canonicalFilePath())
+    if (target.exists() && isSource(target))
         return tr("This is the log itself");
-    if (!source.isFile())
+    if (!m_source.older && !QFileInfo(m_source.path).isFile())
         return tr("The log no longer exists");
-    QFile from(m_source);
-    if (!from.open(QIODevice::ReadOnly))
-        return from.errorString();
+    LogBytes from;
+    if (!from.Open(m_source))
+        return from.error();
     QSaveFile to(m_target);
     if (!to.open(QIODevice::WriteOnly))
         return to.errorString();

@@ -3,18 +3,19 @@
 
 #pragma once
 
+#include "app/logfile/LogBytes.h"
 #include "app/logfile/LogFileType.h"
 
 #include <QString>
 #include <QThread>
 #include <QVector>
 
-class QFile;
+class QFileInfo;
 class QSaveFile;
 
 namespace Velocor {
 
-/// Saves lines of a file to another one, byte by byte, in a thread of its own.
+/// Saves lines of a log to another file, byte by byte, in a thread of its own.
 ///
 /// The other file is replaced only when all lines have been written; if that fails, it is left
 /// unchanged. The destructor cancels and waits.
@@ -29,7 +30,7 @@ class LineSaver : public QThread
 public:
     /// @param starts  where the lines start in the file, in the order in which they are saved
     /// @param type  how lines end
-    LineSaver(QString const& source, QVector<qint64> const& starts, LogFileType const& type,
+    LineSaver(LogSource const& source, QVector<qint64> const& starts, LogFileType const& type,
               QString const& target, QObject* parent = nullptr);
     ~LineSaver() override;
 
@@ -50,9 +51,10 @@ protected:
 
 private:
     QString save();
-    QString copyLine(QFile& from, qint64 start, QSaveFile& to) const;
+    bool isSource(QFileInfo const& target) const;
+    QString copyLine(LogBytes& from, qint64 start, QSaveFile& to) const;
 
-    QString m_source;
+    LogSource m_source;
     QString m_target;
     QVector<qint64> m_starts;
     LogLineEnd m_lineEnd;

@@ -61,7 +61,7 @@ void LogGoTo::Find(LogPlace const& place, int currentRow)
     startLocator();
     LogLocateRequest request;
     request.number = ++m_number;
-    request.path = m_model->path();
+    request.source = m_model->source();
     request.parser = m_model->parser();
     request.place = place;
     request.rows = m_model->state().rows;

@@ -3,15 +3,16 @@
 
 #include "app/window/log/LogModel.h"
 
+#include "app/history/HistoryScanner.h"
+#include "app/history/ProgramLogs.h"
 #include "app/logfile/LogIndex.h"
-#include "app/logfile/LogScanner.h"
 #include "app/logfile/LogSeverities.h"
+#include "app/window/log/RunText.h"
 #include "app/window/log/ShownText.h"
 #include "app/window/widgets/FileSizeText.h"
 #include "app/window/widgets/PlainText.h"
 #include "app/window/widgets/SeverityIcons.h"
 
-#include <QFileInfo>
 #include <QGuiApplication>
 #include <QPalette>
 
@@ -73,15 +74,16 @@ void LogModel::startScanner()
 {
     if (m_scanner)
         return;
-    m_scanner = new LogScanner;
+    m_scanner = new HistoryScanner;
     m_scanner->moveToThread(&m_thread);
     connect(&m_thread, &QThread::finished, m_scanner, &QObject::deleteLater);
-    connect(this, &LogModel::openRequested, m_scanner, &LogScanner::Open);
-    connect(this, &LogModel::filterRequested, m_scanner, &LogScanner::SetFilter);
-    connect(this, &LogModel::watchRequested, m_scanner, &LogScanner::SetWatched);
-    connect(this, &LogModel::pollRequested, m_scanner, &LogScanner::Poll);
-    connect(m_scanner, &LogScanner::updated, this, &LogModel::take);
-    connect(m_scanner, &LogScanner::progressed, this, [this](int request, int percent) {
+    connect(this, &LogModel::openRequested, m_scanner, &HistoryScanner::Open);
+    connect(this, &LogModel::filterRequested, m_scanner, &HistoryScanner::SetFilter);
+    connect(this, &LogModel::foldRequested, m_scanner, &HistoryScanner::SetFolded);
+    connect(this, &LogModel::watchRequested, m_scanner, &HistoryScanner::SetWatched);
+    connect(this, &LogModel::pollRequested, m_scanner, &HistoryScanner::Poll);
+    connect(m_scanner, &HistoryScanner::updated, this, &LogModel::take);
+    connect(m_scanner, &HistoryScanner::progressed, this, [this](int request, int percent) {
         if (request == m_request && m_reading)
             Q_EMIT progressed(percent);
     });
@@ -89,13 +91,14 @@ void LogModel::startScanner()
     Q_EMIT watchRequested(!m_paused);
 }
 
-void LogModel::Open(QString const& path, LogLineParser const& parser, bool isCurrent)
+void LogModel::Open(QString const& path, LogLineParser const& parser, bool isCurrent, bool isAll)
 {
     m_path = path;
     m_parser = parser;
     m_parser.SetChosenEncoding(m_chosenEncoding);
     m_parser.SetOwn(isCurrent);
     m_isCurrent = isCurrent;
+    m_isAll = isAll;
     m_lines.clear();
     Reload();
 }
@@ -108,7 +111,7 @@ void LogModel::Reload()
     m_reading = true;
     m_awaitsReset = true;
     m_scanner->SetCurrentRequest(++m_request);
-    Q_EMIT openRequested(m_request, m_path, m_parser, m_filter);
+    Q_EMIT openRequested(m_request, m_path, m_parser, m_filter, m_isAll);
 }
 
 void LogModel::SetEncoding(LogEncoding encoding)
@@ -138,19 +141,20 @@ void LogModel::SetPaused(bool paused)
     if (paused)
         return;
     if (m_heldBack) // the scanner does not report it again
-        take(LogUpdate(*m_heldBack));
+        take(HistoryUpdate(*m_heldBack));
     Q_EMIT pollRequested();
 }
 
-void LogModel::take(LogUpdate const& update)
+void LogModel::take(HistoryUpdate const& update)
 {
     m_scanner->NoteTaken();
     if (update.request != m_request)
         return;
     const bool wasReading = m_reading;
     m_reading = wasReading && update.isPartial;
-    if (m_paused && !wasReading) {
-        m_heldBack = std::make_shared<LogUpdate>(update);
+    const bool isFolding = update.isFolding && !m_heldBack; // of the rows that are shown
+    if (m_paused && !wasReading && !isFolding) {
+        m_heldBack = std::make_shared<HistoryUpdate>(update);
         return;
     }
     if (!m_paused || !update.type.IsLike(m_parser.fileType()))
@@ -167,10 +171,10 @@ void LogModel::take(LogUpdate const& update)
     Q_EMIT refreshed();
 }
 
-void LogModel::reset(LogUpdate const& update)
+void LogModel::reset(HistoryUpdate const& update)
 {
     beginResetModel();
-    m_file.close();
+    m_file.Close();
     m_state = update;
     m_rowCount = static_cast<int>(update.rows->size());
     endResetModel();
@@ -178,7 +182,7 @@ void LogModel::reset(LogUpdate const& update)
 
 // First the earlier runs, whose first rows the newest run overwrites, then the new rows at the end.
 // In between, views see the new rows except those at the end.
-void LogModel::applyChange(LogUpdate const& update)
+void LogModel::applyChange(HistoryUpdate const& update)
 {
     const int at = static_cast<int>(update.changeAt);
     const int difference = static_cast<int>(update.inserted) - static_cast<int>(update.removed);
@@ -237,8 +241,7 @@ bool LogModel::openFile() const
 {
     if (m_file.isOpen())
         return true;
-    m_file.setFileName(m_path);
-    return QFileInfo(m_path).isFile() && m_file.open(QIODevice::ReadOnly | QIODevice::Unbuffered);
+    return m_file.Open(source());
 }
 
 // Up to `limit` bytes of a line, without its line end. Null if the file cannot be read.
@@ -246,7 +249,7 @@ QByteArray LogModel::readBytes(int row, qint64 limit) const
 {
     LogRows const& rows = *m_state.rows;
     const qint64 start = rows.start(static_cast<size_t>(row));
-    if (!openFile() || !m_file.seek(start))
+    if (!openFile() || !m_file.Seek(start))
         return QByteArray();
 
     // A last line may have got longer since.
@@ -254,10 +257,10 @@ QByteArray LogModel::readBytes(int row, qint64 limit) const
     const qint64 length = start < rows.complete() ? most : std::min(most, rows.end() - start);
     const qint64 first = std::min<qint64>(length, 1024);
     const LogLineEnd lineEnd = m_parser.fileType().lineEnd();
-    QByteArray bytes = m_file.read(first);
+    QByteArray bytes = m_file.Read(first);
     int end = EndOfLine(bytes, lineEnd);
     if (end < 0 && bytes.size() == first && length > first) {
-        bytes += m_file.read(length - first);
+        bytes += m_file.Read(length - first);
         end = EndOfLine(bytes, lineEnd);
     }
     if (end >= 0)
@@ -274,13 +277,13 @@ qint64 LogModel::lengthOf(int row) const
     const qint64 start = rows.start(static_cast<size_t>(row));
     const qint64 most =
         start < rows.complete() ? MeasuredLength : std::min(MeasuredLength, rows.end() - start);
-    if (!openFile() || !m_file.seek(start))
+    if (!openFile() || !m_file.Seek(start))
         return 0;
     const LogLineEnd lineEnd = m_parser.fileType().lineEnd();
     qint64 length = 0;
     char before = '\0';
     while (length < most) {
-        const QByteArray bytes = m_file.read(std::min<qint64>(most - length, 1 << 16));
+        const QByteArray bytes = m_file.Read(std::min<qint64>(most - length, 1 << 16));
         if (bytes.isEmpty())
             break;
         char const* const last = lineEnd.Find(bytes.constBegin(), bytes.constEnd(), length, before);
@@ -422,8 +425,42 @@ bool LogModel::IsGone(int row) const
     return known ? known->isGone : readLine(row).isGone;
 }
 
+// Of a heading, while the runs are shown.
+RunHeading const& LogModel::runOf(int row) const
+{
+    const qint64 start = m_state.rows->start(static_cast<size_t>(row));
+    return start == LogRows::NewestHeading
+               ? m_state.runs->back()
+               : (*m_state.runs)[static_cast<size_t>(LogRows::FirstRunHeading - start)];
+}
+
+void LogModel::SetFolded(int row, bool folded)
+{
+    if (IsFoldable(row) && folded != IsFolded(row))
+        Q_EMIT foldRequested(runOf(row).id, folded);
+}
+
+QString LogModel::FileOf(int row) const
+{
+    const size_t file = m_state.older ? m_state.older->FileAt(LineStart(row)) : 0;
+    return m_state.older && file < m_state.older->count() ? m_state.older->path(file) : m_path;
+}
+
+size_t LogModel::FirstLineOfFile(int row) const
+{
+    LineTable const& lines = m_state.rows->lines();
+    if (!m_state.older || m_state.older->count() == 0 || lines.isEmpty())
+        return 0;
+    const size_t file = m_state.older->FileAt(LineStart(row));
+    const qint64 start =
+        file < m_state.older->count() ? m_state.older->start(file) : m_state.older->size();
+    return lines.LineAt(start);
+}
+
 QString LogModel::headingText(int row) const
 {
+    if (m_isAll && m_state.runs)
+        return RunText(runOf(row), ProgramLogs::NameOf(m_path));
     const qint64 start = m_state.rows->start(static_cast<size_t>(row));
     if (start == LogRows::EarlierHeading)
         return tr("Earlier");

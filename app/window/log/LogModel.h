@@ -3,14 +3,14 @@
 
 #pragma once
 
+#include "app/history/HistoryUpdate.h"
+#include "app/logfile/LogBytes.h"
 #include "app/logfile/LogEntry.h"
 #include "app/logfile/LogFilter.h"
 #include "app/logfile/LogLineParser.h"
-#include "app/logfile/LogUpdate.h"
 
 #include <QAbstractTableModel>
 #include <QCache>
-#include <QFile>
 #include <QHash>
 #include <QThread>
 
@@ -18,14 +18,14 @@
 
 namespace Velocor {
 
-class LogScanner;
+class HistoryScanner;
 
 /// A log file as a table, live: time, severity, elapsed time and message of each line, oldest
 /// first.
 ///
-/// Lines are read from the file when a view needs them; all searching is done by a LogScanner in
-/// another thread. A line that is not in the file anymore, because the log has overwritten it, is
-/// shown as gone until the next update; what is in its place is not. Heading rows separate the
+/// Lines are read from the file when a view needs them; all searching is done by a HistoryScanner
+/// in another thread. A line that is not in the file anymore, because the log has overwritten it,
+/// is shown as gone until the next update; what is in its place is not. Heading rows separate the
 /// runs. GUI thread.
 ///
 ///     LogModel model;
@@ -53,7 +53,20 @@ public:
     /// Shows another file, or reloads the same one. Rows appear when they have been read.
     ///
     /// @param isCurrent  whether the running program writes it: then it is read as the log's own
-    void Open(QString const& path, LogLineParser const& parser, bool isCurrent);
+    /// @param isAll  whether to show the older files of the log, too, as one; see HistoryScanner
+    void Open(QString const& path, LogLineParser const& parser, bool isCurrent, bool isAll = false);
+
+    /// Whether the older files of the log are shown, too.
+    bool isAll() const { return m_isAll; }
+
+    /// Whether a row is a heading that folds.
+    bool IsFoldable(int row) const { return m_isAll && isHeading(row); }
+
+    /// Hides the rows under a heading, or shows them again. Does nothing for other rows.
+    void SetFolded(int row, bool folded);
+
+    /// Whether the rows under a heading are hidden.
+    bool IsFolded(int row) const { return IsFoldable(row) && runOf(row).isFolded; }
 
     /// Reads the file again from the start.
     void Reload();
@@ -115,8 +128,18 @@ public:
     bool IsGone(int row) const;
 
     QString const& path() const { return m_path; }
+
+    /// Where the bytes of the lines are.
+    LogSource source() const { return {m_path, m_state.older}; }
+
+    /// The file that the line of a row is in.
+    QString FileOf(int row) const;
+
+    /// The first line of that file among all lines.
+    size_t FirstLineOfFile(int row) const;
+
     LogLineParser const& parser() const { return m_parser; }
-    LogUpdate const& state() const { return m_state; }
+    HistoryUpdate const& state() const { return m_state; }
     bool isReading() const { return m_reading; }
 
     int rowCount(QModelIndex const& parent = QModelIndex()) const override;
@@ -137,7 +160,8 @@ Q_SIGNALS:
 
     // To the scanner's thread. Fully qualified, because queued connections look up types by name.
     void openRequested(int request, QString const& path, Velocor::LogLineParser const& parser,
-                       Velocor::LogFilter const& filter);
+                       Velocor::LogFilter const& filter, bool isAll);
+    void foldRequested(quint64 run, bool folded);
     void filterRequested(int request, Velocor::LogFilter const& filter);
     void watchRequested(bool watched);
     void pollRequested();
@@ -154,9 +178,9 @@ private:
     };
 
     void startScanner();
-    void take(LogUpdate const& update);
-    void reset(LogUpdate const& update);
-    void applyChange(LogUpdate const& update);
+    void take(HistoryUpdate const& update);
+    void reset(HistoryUpdate const& update);
+    void applyChange(HistoryUpdate const& update);
     bool isHeading(int row) const;
     bool openFile() const;
     QByteArray readBytes(int row, qint64 limit) const;
@@ -166,27 +190,29 @@ private:
     Line const& line(int row) const;
     LogEntry const& entry(int row) const { return line(row).entry; }
     LogEntry wholeEntry(int row) const;
+    RunHeading const& runOf(int row) const;
     QString headingText(int row) const;
     QString cellText(int row, int column) const;
     QString toolTip(int row, int column) const;
 
     QThread m_thread;
-    LogScanner* m_scanner = nullptr;
+    HistoryScanner* m_scanner = nullptr;
     bool m_paused = false;
-    std::shared_ptr<LogUpdate const> m_heldBack; // the last update that arrived after the pause
+    std::shared_ptr<HistoryUpdate const> m_heldBack; // the last update that arrived after the pause
     bool m_reading = false;
     bool m_awaitsReset = false; // what was requested has not been reported yet
     bool m_isCurrent = false;
+    bool m_isAll = false;
     int m_request = 0;
 
     QString m_path;
     LogLineParser m_parser;
     LogEncoding m_chosenEncoding = LogEncoding::Automatic;
     LogFilter m_filter;
-    LogUpdate m_state;
+    HistoryUpdate m_state;
     int m_rowCount = 0; // fewer than the rows of m_state only while a change is being signaled
     QHash<qint64, QString> m_marks;
-    mutable QFile m_file;
+    mutable LogBytes m_file;
     mutable QCache<qint64, Line> m_lines;
 };
 

@@ -66,7 +66,7 @@ void LogSearch::request(bool isCancelling)
     LogFindRequest request;
     request.type = m_model->parser().fileType();
     request.number = ++m_number;
-    request.path = m_model->path();
+    request.source = m_model->source();
     request.text = m_text;
     request.rows = m_text.hasText() ? m_model->state().rows : std::make_shared<LogRows>();
     request.isReset = isCancelling;

@@ -22,8 +22,8 @@ struct StateText
 
 qulonglong ShownLines(LogModel const& model)
 {
-    const int headings = model.state().rows->earlier() > 0 ? 2 : 0;
-    return static_cast<qulonglong>(model.rowCount() - headings);
+    LogRows const& rows = *model.state().rows;
+    return static_cast<qulonglong>(model.rowCount()) - rows.headings();
 }
 
 QString LinesShown(LogModel const& model)

@@ -375,8 +375,8 @@ void LogView::fitTimes()
 // The headings.
 bool LogView::isSpanning(int row) const
 {
-    const int earlier = static_cast<int>(m_model->state().rows->earlier());
-    return earlier > 0 && (row == 0 || row == earlier);
+    return row >= 0 && row < m_model->rowCount() &&
+           m_model->state().rows->isHeading(static_cast<size_t>(row));
 }
 
 // The heading cannot be selected, so no key would lead to it.

@@ -1,0 +1,65 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/window/log/RunText.h"
+
+#include <QCoreApplication>
+#include <QLocale>
+#include <QStringList>
+
+namespace Velocor {
+
+namespace {
+
+struct RunTexts
+{
+    Q_DECLARE_TR_FUNCTIONS(RunText)
+};
+
+// With one date if both have the same.
+QString TimesOf(RunHeading const& run)
+{
+    if (run.start.isEmpty() || run.end == run.start)
+        return run.start;
+    const int space = run.start.indexOf(QLatin1Char(' ')) + 1;
+    const bool isSameDay = space > 0 && run.end.startsWith(run.start.left(space));
+    return RunTexts::tr("%1 to %2").arg(run.start, isSameDay ? run.end.mid(space) : run.end);
+}
+
+QString ExitOf(HistoryRun::Exit exit)
+{
+    switch (exit) {
+    case HistoryRun::Normal:
+        return RunTexts::tr("ended normally");
+    case HistoryRun::Abnormal:
+        return RunTexts::tr("killed or crashed");
+    case HistoryRun::Running:
+        return RunTexts::tr("still running");
+    case HistoryRun::Unknown:
+        break;
+    }
+    return QString();
+}
+
+QString CountOf(size_t count, QString const& one, QString const& several)
+{
+    if (count == 0)
+        return QString();
+    return count == 1 ? one : several.arg(QLocale().toString(qulonglong(count)));
+}
+
+} // namespace
+
+QString RunText(RunHeading const& run, QString const& program)
+{
+    QStringList parts = {
+        program, TimesOf(run), ExitOf(run.exit),
+        CountOf(run.warnings, RunTexts::tr("1 warning"), RunTexts::tr("%1 warnings")),
+        CountOf(run.errors, RunTexts::tr("1 error"), RunTexts::tr("%1 errors"))};
+    parts.removeAll(QString());
+    const QChar arrow(run.isFolded ? 0x25b8 : 0x25be);
+    const QString separator = QStringLiteral("  %1  ").arg(QChar(0xb7)); // middle dot
+    return QStringLiteral("%1  %2").arg(arrow, parts.join(separator));
+}
+
+} // namespace Velocor
