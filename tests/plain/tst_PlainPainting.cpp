@@ -6,7 +6,6 @@
 
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogView.h"
-#include "app/window/log/TickScrollBar.h"
 #include "app/window/widgets/UniformTable.h"
 #include "plain/NumberedModel.h"
 #include "plain/Program.h"
@@ -417,8 +416,6 @@ private:
         if (m_model.rowCount() == 0)
             return;
         m_model.SetMarks({{m_model.LineStart(row), "note"}});
-        m_view.ticks()->SetTicks(TickScrollBar::Marked,
-                                 std::make_shared<std::vector<int>>(std::vector<int>{row}));
         m_view.viewport()->update();
     }
 

@@ -10,7 +10,6 @@
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogView.h"
 #include "app/window/log/NoteDialog.h"
-#include "app/window/log/TickScrollBar.h"
 
 #include <QLabel>
 #include <QLineEdit>
@@ -199,7 +198,7 @@ void tst_MarksInWindow::notes()
     QVERIFY(Marked(*window).isEmpty());
 }
 
-// In the table and in the scroll bar.
+// In the table and beside the scroll bar.
 void tst_MarksInWindow::looks()
 {
     const WindowTest test(run(100, QTime(9, 0), "x"));
@@ -209,17 +208,18 @@ void tst_MarksInWindow::looks()
         return Pixels(widget, MarkColor);
     };
     LogView* view = View(*window);
+    auto* overview = Child<QWidget>(window.get(), "Overview");
     QCOMPARE(pixels(view->viewport()), 0);
-    QCOMPARE(pixels(view->ticks()), 0);
+    QCOMPARE(pixels(overview), 0);
     MarkRow(*window, 50);
     QTRY_VERIFY_WITH_TIMEOUT(pixels(view->viewport()) > 4 * 10, Patience);
-    QTRY_VERIFY_WITH_TIMEOUT(pixels(view->ticks()) > 10, Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(pixels(overview) >= 8, Patience);
     const int withoutNote = pixels(view->viewport());
     WriteNote(*window, "why");
     QTRY_VERIFY_WITH_TIMEOUT(pixels(view->viewport()) > withoutNote + 10, Patience);
     QTest::keyClick(window.get(), Qt::Key_M, Qt::ControlModifier);
     QTRY_COMPARE_WITH_TIMEOUT(pixels(view->viewport()), 0, Patience);
-    QTRY_COMPARE_WITH_TIMEOUT(pixels(view->ticks()), 0, Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(pixels(overview), 0, Patience);
 }
 
 void tst_MarksInWindow::outliveTheSession()

@@ -6,7 +6,7 @@
 #include "app/window/log/HighlightColors.h"
 #include "app/window/log/HighlightRules.h"
 #include "app/window/log/LogModel.h"
-#include "app/window/log/TickScrollBar.h"
+#include "app/window/log/TickColors.h"
 #include "app/window/widgets/BlendedColor.h"
 #include "app/window/widgets/RowHeight.h"
 #include "app/window/widgets/SeverityIcons.h"
@@ -182,9 +182,8 @@ void LogDelegate::initStyleOption(QStyleOptionViewItem* option, QModelIndex cons
         option->palette.setColor(QPalette::Text, HighlightColors::Text(option->palette));
     }
     if (index.column() == LogModel::TimeColumn && index.data(LogModel::MarkedRole).toBool())
-        option->backgroundBrush =
-            Blended(option->palette.color(QPalette::Base),
-                    TickScrollBar::Color(TickScrollBar::Marked, option->palette), 0.2);
+        option->backgroundBrush = Blended(option->palette.color(QPalette::Base),
+                                          TickColors::Marked(option->palette), 0.2);
     if (index.column() == LogModel::SeverityColumn && !index.data(LogModel::ContextRole).toBool())
         option->palette.setColor(QPalette::Text, SeverityIcons::Color(severity, option->palette));
 }
@@ -268,7 +267,7 @@ void LogDelegate::paintPlain(QPainter* painter, QStyleOptionViewItem const& opti
 void LogDelegate::paintUserMark(QPainter* painter, QStyleOptionViewItem const& option, bool hasNote)
 {
     const QRect cell = option.rect;
-    const QColor color = TickScrollBar::Color(TickScrollBar::Marked, option.palette);
+    const QColor color = TickColors::Marked(option.palette);
     painter->save();
     painter->fillRect(cell.left(), cell.top(), MarkWidth, cell.height(), color);
     if (hasNote) {

@@ -7,7 +7,7 @@
 #include "app/window/log/HighlightRules.h"
 #include "app/window/log/LogDelegate.h"
 #include "app/window/log/LogModel.h"
-#include "app/window/log/TickScrollBar.h"
+#include "app/window/log/SteadyScrollBar.h"
 #include "app/window/widgets/RowHeight.h"
 
 #include <QAbstractButton>
@@ -34,7 +34,7 @@ constexpr int MostMeasuredRows = 1000;
 } // namespace
 
 LogView::LogView(LogModel* model, QWidget* parent)
-    : WrappingTable(new LogDelegate, parent), m_model(model), m_ticks(new TickScrollBar(this))
+    : WrappingTable(new LogDelegate, parent), m_model(model), m_bar(new SteadyScrollBar(this))
 {
     setUp();
     setModel(model);
@@ -52,7 +52,7 @@ LogDelegate* LogView::cells() const
 void LogView::setUp()
 {
     setAccessibleName(tr("Log entries"));
-    setVerticalScrollBar(m_ticks);
+    setVerticalScrollBar(m_bar);
     setSelectionBehavior(SelectRows);
     setSelectionMode(ExtendedSelection);
     setEditTriggers(NoEditTriggers);
@@ -232,7 +232,7 @@ void LogView::rowsInserted(QModelIndex const& parent, int first, int last)
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
     m_hasOtherRows = m_hasOtherRows || last + 1 < m_model->rowCount();
     if (m_following) {
-        m_ticks->UpdateOnceAfter([&] {
+        m_bar->UpdateOnceAfter([&] {
             moveOnceAfter([&] {
                 WrappingTable::rowsInserted(parent, first, last);
                 scrollToBottom();
@@ -275,7 +275,6 @@ void LogView::afterRefresh()
     setColumnHidden(LogModel::SeverityColumn, !state.hasSeverities && state.lines > 0);
     setColumnHidden(LogModel::ElapsedColumn, !state.hasElapsed);
     fitTimes();
-    m_ticks->SetRowCount(m_model->rowCount());
     if (m_hasOtherRows || measuredRows() > MostMeasuredRows)
         forgetHeights();
     if (isWrapped() && m_hasOtherRows)

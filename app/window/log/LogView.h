@@ -13,7 +13,7 @@ class HighlightRules;
 class LogDelegate;
 class LogFilter;
 class LogModel;
-class TickScrollBar;
+class SteadyScrollBar;
 
 /// The table of a log: keeps its position while rows change, or follows the newest entry.
 ///
@@ -69,9 +69,6 @@ public:
 
     /// Sets the rules that highlight lines.
     void SetHighlightRules(std::shared_ptr<HighlightRules> const& rules);
-
-    /// The vertical scroll bar.
-    TickScrollBar* ticks() const { return m_ticks; }
 
     /// The numbers of the selected rows in ascending order, at most MaximumCopiedLines.
     QList<int> SelectedRows() const;
@@ -133,7 +130,7 @@ private:
     void fitTimes();
 
     LogModel* m_model;
-    TickScrollBar* m_ticks;
+    SteadyScrollBar* m_bar;
     QString m_placeholder;
     QString m_fittedPath;
     bool m_following = true;
