@@ -312,7 +312,14 @@ void tst_FindInWindow::inTheRowsShown()
     QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) < 40, Patience);
     int hits = 0;
     for (int row = 0; row < Rows(*window); ++row)
-        hits += View(*window)->model()->index(row, 3).data().toString().startsWith("x 1") ? 1 : 0;
+        hits += View(*window)
+                        ->model()
+                        ->index(row, LogModel::MessageColumn)
+                        .data()
+                        .toString()
+                        .startsWith("x 1")
+                    ? 1
+                    : 0;
     QTRY_COMPARE_WITH_TIMEOUT(Count(*window), QString("%1 lines").arg(hits), Patience);
 }
 

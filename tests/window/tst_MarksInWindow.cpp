@@ -256,7 +256,8 @@ void tst_MarksInWindow::moveWithTheirLines()
     QTRY_COMPARE_WITH_TIMEOUT(Marked(*window).size(), 1, Patience);
     const int row = Marked(*window).first();
     QVERIFY(row != 80);
-    QCOMPARE(View(*window)->model()->index(row, 3).data().toString(), QString("older 80"));
+    QCOMPARE(View(*window)->model()->index(row, LogModel::MessageColumn).data().toString(),
+             QString("older 80"));
 
     // While the window is open.
     QVERIFY(TestFiles::writeOver(test.logFile(), "new\n" + older));
@@ -272,13 +273,15 @@ void tst_MarksInWindow::lineWrittenOver()
     const auto window = WindowTest::show();
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 102, Patience);
     int row = 0;
-    while (View(*window)->model()->index(row, 3).data().toString() != "older 50")
+    while (View(*window)->model()->index(row, LogModel::MessageColumn).data().toString() !=
+           "older 50")
         ++row;
     MarkRow(*window, row);
     QCOMPARE(Marked(*window).size(), 1);
     QVERIFY(TestFiles::writeOver(test.logFile(), writtenOver(older, newer)));
-    QTRY_COMPARE_WITH_TIMEOUT(View(*window)->model()->index(101, 3).data().toString(),
-                              QString("newer 59"), Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(
+        View(*window)->model()->index(101, LogModel::MessageColumn).data().toString(),
+        QString("newer 59"), Patience);
     QTRY_VERIFY_WITH_TIMEOUT(Marked(*window).isEmpty(), Patience);
 }
 

@@ -39,6 +39,7 @@ LogView::LogView(LogModel* model, QWidget* parent)
     setUp();
     setModel(model);
     SetDefaultWidths();
+    hideColumn(LogModel::SinceColumn);
     connect(verticalScrollBar(), &QScrollBar::valueChanged, this, &LogView::noteScrolled);
     connect(model, &LogModel::modelAboutToBeReset, this, &LogView::noteCurrent);
     connect(model, &LogModel::refreshed, this, &LogView::afterRefresh);
@@ -88,6 +89,8 @@ void LogView::SetDefaultWidths()
                        padding);
     setColumnWidth(LogModel::ElapsedColumn,
                    metrics.boundingRect(QStringLiteral("00000 ms")).width() + padding);
+    setColumnWidth(LogModel::SinceColumn,
+                   metrics.boundingRect(QStringLiteral("00 min 00 s")).width() + padding);
 }
 
 void LogView::changeEvent(QEvent* event)
@@ -226,6 +229,34 @@ void LogView::SetLineWrap(bool wrapped)
         scrollTo(currentIndex());
 }
 
+void LogView::SetSince(bool shown)
+{
+    m_showsSince = shown;
+    setColumnHidden(LogModel::SinceColumn, !shown || !m_model->state().hasTimes);
+}
+
+void LogView::SetLeastGap(qint64 span)
+{
+    if (span == m_model->spans().leastGap())
+        return;
+    m_model->spans().SetLeastGap(span);
+    forgetHeights(); // the gap takes some of a message's width
+    if (isWrapped())
+        updateGeometries();
+    viewport()->update();
+}
+
+bool LogView::MeasureFrom(int row)
+{
+    if (row < 0)
+        m_model->spans().MeasureFromAbove();
+    else if (!m_model->spans().MeasureFrom(row))
+        return false;
+    viewport()->update();
+    horizontalHeader()->viewport()->update();
+    return true;
+}
+
 // Compensates for rows inserted above the visible ones.
 void LogView::rowsInserted(QModelIndex const& parent, int first, int last)
 {
@@ -274,6 +305,7 @@ void LogView::afterRefresh()
     setColumnHidden(LogModel::TimeColumn, !state.hasTimes && state.lines > 0);
     setColumnHidden(LogModel::SeverityColumn, !state.hasSeverities && state.lines > 0);
     setColumnHidden(LogModel::ElapsedColumn, !state.hasElapsed);
+    setColumnHidden(LogModel::SinceColumn, !m_showsSince || !state.hasTimes);
     fitTimes();
     if (m_hasOtherRows || measuredRows() > MostMeasuredRows)
         forgetHeights();

@@ -32,6 +32,18 @@ public:
     /// Shows long messages in several lines, at most WrappedRows::MaximumLines. The rest is elided.
     void SetLineWrap(bool wrapped);
 
+    /// Shows the column with the time since another entry, if entries have times.
+    void SetSince(bool shown);
+
+    /// Shows where at least this much time passed between two entries, in milliseconds; 0 for
+    /// nowhere.
+    void SetLeastGap(qint64 span);
+
+    /// Measures the time since the entry of a row or, with -1, since the entry above each.
+    ///
+    /// @return false, with nothing changed, if that entry has no time
+    bool MeasureFrom(int row);
+
     /// Whether to keep the newest row in view.
     void SetFollowing(bool following);
     bool isFollowing() const { return m_following; }
@@ -136,6 +148,7 @@ private:
     bool m_following = true;
     bool m_scrollingItself = false;
     bool m_goesSideways = false;
+    bool m_showsSince = false;
     bool m_hasOtherRows = true; // since the last refresh, not only more of them
 
     QString m_currentText;
