@@ -16,7 +16,9 @@ struct LogEntry
     /// The severities of the log; None for lines that are not entries.
     enum Severity : int { Trace = 0, Notification, Warning, Error, Fatal, None };
 
-    QString time; ///< the time stamp as written; empty if there is none
+    QString time;         ///< the time stamp as written; empty if there is none
+    qint64 timeKey = -1;  ///< see LogTimeReader::Stamp; -1 if the time is unknown
+    bool hasDate = false; ///< whether that counts from a date, not from midnight
     Severity severity = None;
     QString elapsed;      ///< milliseconds since the previous entry; empty if not logged
     QString message;      ///< the rest of the line, or the whole line if it is not an entry

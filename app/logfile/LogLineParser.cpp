@@ -248,6 +248,8 @@ bool LogLineParser::parseForeign(char const* line, int length, LogEntry& entry) 
     char const* const time = line + foreign.time.start;
     entry.isEntry = true;
     entry.severity = foreign.severity;
+    entry.timeKey = foreign.timeKey;
+    entry.hasDate = foreign.hasDate;
     entry.time = foreign.isEpoch ? ForeignLine::EpochText(time, foreign.time.length)
                                  : QString::fromLatin1(time, foreign.time.length);
     entry.message = encoding.Decode(line + foreign.message.start, foreign.message.length);
@@ -271,6 +273,8 @@ LogEntry LogLineParser::Parse(QByteArray const& line) const
     const LogEncoding encoding = m_type.encoding.narrowed();
     entry.isEntry = parts.isEntry;
     entry.severity = parts.severity;
+    entry.timeKey = parts.timeKey;
+    entry.hasDate = parts.hasDate;
     entry.time = encoding.Decode(text, parts.timeLength);
     entry.elapsed = QString::fromLatin1(text + parts.elapsed, parts.elapsedLength);
     entry.message = encoding.Decode(text + parts.message, length - parts.message);

@@ -106,9 +106,12 @@ LogPanel* FileTabs::addLog(QString const& path)
     connect(panel, &LogPanel::stateChanged, this, &FileTabs::stateChanged);
     connect(panel, &LogPanel::messageReported, this, &FileTabs::messageReported);
     connect(panel, &LogPanel::zoomRequested, this, &FileTabs::zoomRequested);
+    connect(panel, &LogPanel::sinceRequested, this, &FileTabs::sinceRequested);
     panel->SetTextFont(m_textFont);
     panel->SetLineWrap(m_isWrapped);
     panel->SetLineNumbers(m_hasNumbers);
+    panel->SetSince(m_showsSince);
+    panel->SetLeastGap(m_leastGap);
     if (!path.isEmpty())
         panel->Open(path, false);
     setTabToolTip(addTab(panel, QString()), PlainToolTip(path));
@@ -255,6 +258,24 @@ void FileTabs::SetLineNumbers(bool shown)
     for (int i = 0; i < count(); ++i) {
         if (auto* log = qobject_cast<LogPanel*>(widget(i)))
             log->SetLineNumbers(shown);
+    }
+}
+
+void FileTabs::SetSince(bool shown)
+{
+    m_showsSince = shown;
+    for (int i = 0; i < count(); ++i) {
+        if (auto* log = qobject_cast<LogPanel*>(widget(i)))
+            log->SetSince(shown);
+    }
+}
+
+void FileTabs::SetLeastGap(qint64 span)
+{
+    m_leastGap = span;
+    for (int i = 0; i < count(); ++i) {
+        if (auto* log = qobject_cast<LogPanel*>(widget(i)))
+            log->SetLeastGap(span);
     }
 }
 

@@ -82,6 +82,12 @@ public:
     /// Shows the numbers of the lines in all logs or not.
     void SetLineNumbers(bool shown);
 
+    /// Shows the time since another entry in all logs or not.
+    void SetSince(bool shown);
+
+    /// Shows gaps of at least so many milliseconds in all logs; 0: none.
+    void SetLeastGap(qint64 span);
+
     /// Marks the tab of the program's log: there is a problem with it.
     void MarkOwnLog(bool marked);
 
@@ -104,6 +110,9 @@ Q_SIGNALS:
     void saved(QString const& path);
     void zoomRequested(int steps);
 
+    /// The user wants to see the time since another entry.
+    void sinceRequested();
+
 private:
     LogPanel* addLog(QString const& path);
     SettingsEditor* addEditor(QString const& path);
@@ -124,6 +133,8 @@ private:
     QFont m_textFont;
     bool m_isWrapped = false;
     bool m_hasNumbers = false;
+    bool m_showsSince = false;
+    qint64 m_leastGap = 0; // milliseconds
 };
 
 } // namespace Velocor

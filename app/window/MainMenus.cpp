@@ -3,6 +3,7 @@
 
 #include "app/window/MainMenus.h"
 
+#include "app/logfile/Milliseconds.h"
 #include "app/window/FileOpener.h"
 #include "app/window/FileTabs.h"
 #include "app/window/LineCommands.h"
@@ -182,6 +183,7 @@ void MainMenus::fillViewMenu(QMenu* menu)
     menu->addSeparator();
     fillEncodingMenu(menu->addMenu(tr("En&coding")));
     fillTextMenu(menu->addMenu(tr("Te&xt")));
+    fillAnalyzeMenu(menu->addMenu(tr("Anal&yze")));
     add(menu, tr("&Highlight Rules..."), QKeySequence(tr("Ctrl+Shift+H")),
         tr("Give lines with certain texts a color"),
         [this] { m_targets.tabs->EditHighlightRules(); });
@@ -274,6 +276,36 @@ void MainMenus::fillTextMenu(QMenu* menu)
         addSwitch(menu, tr("Line N&umbers"), QKeySequence(tr("Ctrl+Alt+N")),
                   tr("Show the numbers of the lines in the file beside logs"),
                   [this](bool shown) { m_targets.tabs->SetLineNumbers(shown); });
+}
+
+void MainMenus::fillAnalyzeMenu(QMenu* menu)
+{
+    m_actions.since = addSwitch(menu, tr("&Time Since"), QKeySequence(tr("Ctrl+Alt+S")),
+                                tr("Show the time since the entry above or since a chosen one"),
+                                [this](bool shown) { m_targets.tabs->SetSince(shown); });
+    fillGapMenu(menu->addMenu(tr("&Gaps")));
+}
+
+void MainMenus::fillGapMenu(QMenu* menu)
+{
+    m_actions.gaps = new QActionGroup(menu);
+    const auto addGap = [&](QString const& text, QString const& statusTip, qint64 span) {
+        QAction* action = addSwitch(menu, text, QKeySequence(), statusTip,
+                                    [this, span](bool) { m_targets.tabs->SetLeastGap(span); });
+        action->setData(span);
+        m_actions.gaps->addAction(action);
+    };
+    const auto addSpan = [&](QString const& text, qint64 span) {
+        addGap(text,
+               tr("Show where no entry follows for %1").arg(QString(text).remove(QLatin1Char('&'))),
+               span);
+    };
+    addGap(tr("&None"), tr("Do not show gaps between entries"), 0);
+    addSpan(tr("&1 Second"), Milliseconds::Second);
+    addSpan(tr("10 &Seconds"), 10 * Milliseconds::Second);
+    addSpan(tr("1 &Minute"), Milliseconds::Minute);
+    addSpan(tr("10 M&inutes"), 10 * Milliseconds::Minute);
+    addSpan(tr("1 &Hour"), Milliseconds::Hour);
 }
 
 void MainMenus::fillHelpMenu(QMenu* menu)

@@ -48,6 +48,8 @@ struct MenuActions
     QAction* monospaced = nullptr;
     QAction* lineWrap = nullptr;
     QAction* lineNumbers = nullptr;
+    QAction* since = nullptr;
+    QActionGroup* gaps = nullptr; ///< their data is the least gap shown, in milliseconds
     QAction* reopen = nullptr;
     QActionGroup* encodings = nullptr;
     QList<QAction*> ofSettings; ///< those that need a settings file that can be edited
@@ -94,6 +96,8 @@ private:
     void addMarks(QMenu* menu);
     void fillEncodingMenu(QMenu* menu);
     void fillTextMenu(QMenu* menu);
+    void fillAnalyzeMenu(QMenu* menu);
+    void fillGapMenu(QMenu* menu);
     void fillHelpMenu(QMenu* menu);
 
     QAction* add(QMenu* menu, QString const& text, QKeySequence const& shortcut,

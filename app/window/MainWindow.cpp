@@ -27,6 +27,7 @@
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
 
+#include <QActionGroup>
 #include <QCloseEvent>
 #include <QFileInfo>
 #include <QGuiApplication>
@@ -187,6 +188,10 @@ void MainWindow::makeMenus()
     connect(actions.showPlaces, &QAction::triggered, this, &MainWindow::showPlaces);
     connect(actions.nextPane, &QAction::triggered, this, [this] { GoToPane(panes(), 1); });
     connect(actions.previousPane, &QAction::triggered, this, [this] { GoToPane(panes(), -1); });
+    connect(m_tabs, &FileTabs::sinceRequested, this, [this] {
+        if (!m_menus->actions().since->isChecked())
+            m_menus->actions().since->trigger();
+    });
     m_currentTab = std::make_unique<CurrentTab>(m_tabs, actions, m_summary, this);
 }
 
@@ -258,6 +263,9 @@ void MainWindow::restoreState()
     m_tabs->SetLineWrap(actions.lineWrap->isChecked());
     actions.lineNumbers->setChecked(m_settings.Flag(QStringLiteral("lineNumbers"), false));
     m_tabs->SetLineNumbers(actions.lineNumbers->isChecked());
+    actions.since->setChecked(m_settings.Flag(QStringLiteral("since"), false));
+    m_tabs->SetSince(actions.since->isChecked());
+    restoreGaps();
     m_tabs->highlightRules()->SetFromText(m_settings.Text(QStringLiteral("highlights")));
     m_tabs->ownLog()->SetColumnWidths(m_settings.Numbers(QStringLiteral("columns")));
     m_tabs->ownLog()->SetPaneSizes(m_settings.Numbers(QStringLiteral("linePane")));
@@ -272,6 +280,20 @@ void MainWindow::restoreState()
     actions.reopen->setChecked(m_settings.Flag(QStringLiteral("reopenFiles"), true));
 }
 
+// One of those in the menu; none if it is another one.
+void MainWindow::restoreGaps()
+{
+    const QList<int> saved = m_settings.Numbers(QStringLiteral("leastGap"));
+    const QList<QAction*> gaps = m_menus->actions().gaps->actions();
+    QAction* chosen = gaps.first();
+    for (QAction* gap : gaps) {
+        if (!saved.isEmpty() && gap->data().toLongLong() == saved.first())
+            chosen = gap;
+    }
+    chosen->setChecked(true);
+    m_tabs->SetLeastGap(chosen->data().toLongLong());
+}
+
 void MainWindow::saveState()
 {
     MenuActions const& actions = m_menus->actions();
@@ -282,6 +304,9 @@ void MainWindow::saveState()
     m_textFont->Save(m_settings);
     m_settings.SetFlag(QStringLiteral("lineWrap"), actions.lineWrap->isChecked());
     m_settings.SetFlag(QStringLiteral("lineNumbers"), actions.lineNumbers->isChecked());
+    m_settings.SetFlag(QStringLiteral("since"), actions.since->isChecked());
+    m_settings.SetNumbers(QStringLiteral("leastGap"),
+                          {actions.gaps->checkedAction()->data().toInt()});
     m_settings.SetText(QStringLiteral("highlights"), m_tabs->highlightRules()->ToText());
     m_settings.SetFlag(QStringLiteral("toolBarShown"), actions.showToolBar->isChecked());
     m_settings.SetNumbers(QStringLiteral("columns"), m_tabs->ownLog()->columnWidths());

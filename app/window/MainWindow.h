@@ -76,6 +76,7 @@ private:
     QList<QWidget*> panes() const;
     void restoreFirstState();
     void restoreState();
+    void restoreGaps();
     void saveState();
     void startWork();
     void openFilesOfStart();

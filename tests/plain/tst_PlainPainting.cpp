@@ -6,7 +6,6 @@
 
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogView.h"
-#include "app/window/log/TickScrollBar.h"
 #include "app/window/widgets/UniformTable.h"
 #include "plain/NumberedModel.h"
 #include "plain/Program.h"
@@ -334,6 +333,10 @@ public:
             find();
         else if (kind == 29)
             follow();
+        else if (kind == 30)
+            showGaps();
+        else
+            measure();
         await();
         comparePixels(m_view);
     }
@@ -371,7 +374,9 @@ private:
     {
         static char const* const severities[] = {"Trace", "Warning", "Error"};
         const QByteArray text = QByteArray("word ").repeated(m_draws->below(40));
-        const QTime time = QTime(9, 0).addSecs(++m_number);
+        ++m_number;
+        m_seconds += m_draws->once(5) ? 90 : 1;
+        const QTime time = QTime(9, 0).addSecs(m_seconds);
         return DemoLog::entry(time.toString("HH:mm:ss.zzz").toLatin1().constData(),
                               m_draws->oneOf(severities),
                               QByteArray::number(m_number) + ' ' + text);
@@ -417,9 +422,22 @@ private:
         if (m_model.rowCount() == 0)
             return;
         m_model.SetMarks({{m_model.LineStart(row), "note"}});
-        m_view.ticks()->SetTicks(TickScrollBar::Marked,
-                                 std::make_shared<std::vector<int>>(std::vector<int>{row}));
         m_view.viewport()->update();
+    }
+
+    void showGaps()
+    {
+        const qint64 least = m_draws->once(3) ? 0 : 60000;
+        tell("gaps of # milliseconds", least);
+        m_view.SetLeastGap(least);
+    }
+
+    void measure()
+    {
+        const int row = m_draws->below(m_model.rowCount() + 1) - 1;
+        tell("measure from row #", row);
+        m_view.SetSince(true);
+        m_view.MeasureFrom(row);
     }
 
     void find()
@@ -442,6 +460,7 @@ private:
     LogModel m_model;
     LogView m_view{&m_model};
     int m_number = 0;
+    int m_seconds = 0;
 };
 
 } // namespace

@@ -154,6 +154,12 @@ void TakeLogViews(MainWindow& window, Camera const& camera)
     more->setChecked(false);
     table->clearSelection();
 
+    panel->SetSince(true);
+    panel->SetLeastGap(10 * 1000);
+    camera.take(window, "since");
+    panel->SetSince(false);
+    panel->SetLeastGap(0);
+
     panel->GoToProblem(-1);
     panel->ToggleMark();
     panel->OpenFind();

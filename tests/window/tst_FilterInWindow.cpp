@@ -35,7 +35,8 @@ QStringList Messages(MainWindow& window)
 {
     QStringList messages;
     for (int row = 0; row < Rows(window); ++row)
-        messages.append(View(window)->model()->index(row, 3).data().toString());
+        messages.append(
+            View(window)->model()->index(row, LogModel::MessageColumn).data().toString());
     return messages;
 }
 
@@ -389,7 +390,7 @@ void tst_FilterInWindow::cellWithATab()
     View(*window)->GoToRow(0);
     QTest::keyClick(View(*window), Qt::Key_C, Qt::ControlModifier);
     QVERIFY(QGuiApplication::clipboard()->text().endsWith("one\ttwo \x1b[31mred\x1b[0m\n"));
-    Choose(*window, 0, 3, Qt::Key_F);
+    Choose(*window, 0, LogModel::MessageColumn, Qt::Key_F);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1, Patience);
     QCOMPARE(Messages(*window), QStringList({"one     two red"}));
 }
@@ -420,7 +421,8 @@ void tst_FilterInWindow::matchThatBeginsBeforeTheMessage()
     QTest::keyClick(Field(*window), Qt::Key_Return);
     QTRY_VERIFY_WITH_TIMEOUT(
         View(*window)->model()->rowCount() == 1 && !Panel(*window)->model()->isReading(), Patience);
-    const QRect cell = View(*window)->visualRect(View(*window)->model()->index(0, 3));
+    const QRect cell =
+        View(*window)->visualRect(View(*window)->model()->index(0, LogModel::MessageColumn));
     const QImage image = View(*window)->viewport()->grab(cell).toImage();
     bool isPainted = false;
     for (int x = 0; x < image.width(); ++x)

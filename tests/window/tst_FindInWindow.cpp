@@ -12,7 +12,6 @@
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogSearch.h"
 #include "app/window/log/LogView.h"
-#include "app/window/log/TickScrollBar.h"
 
 #include <QCheckBox>
 #include <QDialogButtonBox>
@@ -83,7 +82,7 @@ private slots:
     void options();
     void marksInTheTable();
     void marksBesideThoseOfTheFilter();
-    void ticksInTheScrollBar();
+    void ticksBesideTheScrollBar();
     void closes();
     void newLinesAreFound();
     void inTheRowsShown();
@@ -237,7 +236,7 @@ void tst_FindInWindow::marksBesideThoseOfTheFilter()
 }
 
 // As many ticks as hits, each where its row is, in light and in dark.
-void tst_FindInWindow::ticksInTheScrollBar()
+void tst_FindInWindow::ticksBesideTheScrollBar()
 {
     const WindowTest test(Needles(300));
     const auto window = WindowTest::show();
@@ -245,9 +244,9 @@ void tst_FindInWindow::ticksInTheScrollBar()
     const QPalette light = window->palette();
     QPalette dark = light;
     dark.setColor(QPalette::Base, QColor(0x1e, 0x1f, 0x22));
-    TickScrollBar* bar = View(*window)->ticks();
+    auto* overview = Child<QWidget>(window.get(), "Overview");
     const auto tickTops = [&](QColor const& color) {
-        const QImage image = bar->grab().toImage();
+        const QImage image = overview->grab().toImage();
         QVector<int> tops;
         for (int y = 1; y < image.height(); ++y) {
             const int x = image.width() / 2;
@@ -260,12 +259,12 @@ void tst_FindInWindow::ticksInTheScrollBar()
     Type(*window, "needle");
     QTRY_COMPARE_WITH_TIMEOUT(tickTops(QColor(0, 0x7a, 0x8c)).size(), 3, Patience);
     const QVector<int> tops = tickTops(QColor(0, 0x7a, 0x8c));
-    const double height = tops[2] - tops[0]; // two thirds of the groove
-    QVERIFY(height > bar->height() * qApp->devicePixelRatio() / 2);
+    const double height = tops[2] - tops[0]; // two thirds of the strip
+    QVERIFY(height > overview->height() * qApp->devicePixelRatio() / 2);
     QVERIFY(qAbs(tops[1] - tops[0] - height / 2) <= 2 * qApp->devicePixelRatio());
-    bar->setPalette(dark);
+    overview->setPalette(dark);
     QTRY_COMPARE_WITH_TIMEOUT(tickTops(QColor(0x5f, 0xd9, 0xe8)).size(), 3, Patience);
-    bar->setPalette(light);
+    overview->setPalette(light);
     QTest::keyClick(Field(*window), Qt::Key_Escape);
     QTRY_COMPARE_WITH_TIMEOUT(tickTops(QColor(0, 0x7a, 0x8c)).size(), 0, Patience);
 }
@@ -313,7 +312,14 @@ void tst_FindInWindow::inTheRowsShown()
     QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) < 40, Patience);
     int hits = 0;
     for (int row = 0; row < Rows(*window); ++row)
-        hits += View(*window)->model()->index(row, 3).data().toString().startsWith("x 1") ? 1 : 0;
+        hits += View(*window)
+                        ->model()
+                        ->index(row, LogModel::MessageColumn)
+                        .data()
+                        .toString()
+                        .startsWith("x 1")
+                    ? 1
+                    : 0;
     QTRY_COMPARE_WITH_TIMEOUT(Count(*window), QString("%1 lines").arg(hits), Patience);
 }
 

@@ -299,7 +299,9 @@ void tst_HighlightInWindow::besideHits()
     const auto pixels = [&](QRgb color) {
         LogView* view = View(*window);
         const QImage image =
-            view->viewport()->grab(view->visualRect(view->model()->index(0, 3))).toImage();
+            view->viewport()
+                ->grab(view->visualRect(view->model()->index(0, LogModel::MessageColumn)))
+                .toImage();
         int count = 0;
         for (int y = 0; y < image.height(); ++y) {
             for (int x = 0; x < image.width(); ++x)

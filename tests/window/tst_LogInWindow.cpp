@@ -116,7 +116,8 @@ void tst_LogInWindow::showsTheLog()
     LogModel* model = Panel(*window)->model();
     QCOMPARE(model->index(0, 0).data().toString(), QString("Earlier"));
     QCOMPARE(model->index(model->rowCount() - 5, 0).data().toString(), QString("This run"));
-    QCOMPARE(model->index(model->rowCount() - 1, 3).data().toString(), QString("newer 3"));
+    QCOMPARE(model->index(model->rowCount() - 1, LogModel::MessageColumn).data().toString(),
+             QString("newer 3"));
     QCOMPARE(View(*window)->visualRect(model->index(0, 0)).width(),
              View(*window)->horizontalHeader()->length());
     QVERIFY(View(*window)->isColumnHidden(LogModel::ElapsedColumn));
@@ -520,7 +521,8 @@ void tst_LogInWindow::overwrittenWhilePaused()
     QTest::keyClick(view, Qt::Key_P, Qt::ControlModifier | Qt::ShiftModifier);
     QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) != 200, Patience);
     const LogModel* model = Panel(*window)->model();
-    QCOMPARE(model->index(Rows(*window) - 1, 3).data().toString(), QString("another 99"));
+    QCOMPARE(model->index(Rows(*window) - 1, LogModel::MessageColumn).data().toString(),
+             QString("another 99"));
     for (int row = 0; row < Rows(*window); ++row)
         QVERIFY(!model->IsGone(row));
 }
@@ -903,12 +905,17 @@ void tst_LogInWindow::keepsItsPlace()
     QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::NoModifier,
                       RowCentre(view, view->rowAt(0) + 2));
     const auto texts = [&] {
-        return QStringList({view->model()->index(view->rowAt(0), 3).data().toString(),
-                            view->model()->index(view->currentIndex().row(), 3).data().toString(),
-                            view->model()
-                                ->index(view->selectionModel()->selectedRows().value(0).row(), 3)
-                                .data()
-                                .toString()});
+        return QStringList(
+            {view->model()->index(view->rowAt(0), LogModel::MessageColumn).data().toString(),
+             view->model()
+                 ->index(view->currentIndex().row(), LogModel::MessageColumn)
+                 .data()
+                 .toString(),
+             view->model()
+                 ->index(view->selectionModel()->selectedRows().value(0).row(),
+                         LogModel::MessageColumn)
+                 .data()
+                 .toString()});
     };
     const QStringList before = texts();
     QCOMPARE(before[1], before[2]);
@@ -918,8 +925,9 @@ void tst_LogInWindow::keepsItsPlace()
     QVERIFY(file.seek(half));
     file.write(newer.mid(half));
     file.close();
-    QTRY_COMPARE_WITH_TIMEOUT(view->model()->index(Rows(*window) - 1, 3).data().toString(),
-                              QString("newer 99"), Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(
+        view->model()->index(Rows(*window) - 1, LogModel::MessageColumn).data().toString(),
+        QString("newer 99"), Patience);
     QCOMPARE(texts(), before);
 }
 

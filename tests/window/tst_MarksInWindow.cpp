@@ -10,7 +10,6 @@
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogView.h"
 #include "app/window/log/NoteDialog.h"
-#include "app/window/log/TickScrollBar.h"
 
 #include <QLabel>
 #include <QLineEdit>
@@ -199,7 +198,7 @@ void tst_MarksInWindow::notes()
     QVERIFY(Marked(*window).isEmpty());
 }
 
-// In the table and in the scroll bar.
+// In the table and beside the scroll bar.
 void tst_MarksInWindow::looks()
 {
     const WindowTest test(run(100, QTime(9, 0), "x"));
@@ -209,17 +208,18 @@ void tst_MarksInWindow::looks()
         return Pixels(widget, MarkColor);
     };
     LogView* view = View(*window);
+    auto* overview = Child<QWidget>(window.get(), "Overview");
     QCOMPARE(pixels(view->viewport()), 0);
-    QCOMPARE(pixels(view->ticks()), 0);
+    QCOMPARE(pixels(overview), 0);
     MarkRow(*window, 50);
     QTRY_VERIFY_WITH_TIMEOUT(pixels(view->viewport()) > 4 * 10, Patience);
-    QTRY_VERIFY_WITH_TIMEOUT(pixels(view->ticks()) > 10, Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(pixels(overview) >= 8, Patience);
     const int withoutNote = pixels(view->viewport());
     WriteNote(*window, "why");
     QTRY_VERIFY_WITH_TIMEOUT(pixels(view->viewport()) > withoutNote + 10, Patience);
     QTest::keyClick(window.get(), Qt::Key_M, Qt::ControlModifier);
     QTRY_COMPARE_WITH_TIMEOUT(pixels(view->viewport()), 0, Patience);
-    QTRY_COMPARE_WITH_TIMEOUT(pixels(view->ticks()), 0, Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(pixels(overview), 0, Patience);
 }
 
 void tst_MarksInWindow::outliveTheSession()
@@ -256,7 +256,8 @@ void tst_MarksInWindow::moveWithTheirLines()
     QTRY_COMPARE_WITH_TIMEOUT(Marked(*window).size(), 1, Patience);
     const int row = Marked(*window).first();
     QVERIFY(row != 80);
-    QCOMPARE(View(*window)->model()->index(row, 3).data().toString(), QString("older 80"));
+    QCOMPARE(View(*window)->model()->index(row, LogModel::MessageColumn).data().toString(),
+             QString("older 80"));
 
     // While the window is open.
     QVERIFY(TestFiles::writeOver(test.logFile(), "new\n" + older));
@@ -272,13 +273,15 @@ void tst_MarksInWindow::lineWrittenOver()
     const auto window = WindowTest::show();
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 102, Patience);
     int row = 0;
-    while (View(*window)->model()->index(row, 3).data().toString() != "older 50")
+    while (View(*window)->model()->index(row, LogModel::MessageColumn).data().toString() !=
+           "older 50")
         ++row;
     MarkRow(*window, row);
     QCOMPARE(Marked(*window).size(), 1);
     QVERIFY(TestFiles::writeOver(test.logFile(), writtenOver(older, newer)));
-    QTRY_COMPARE_WITH_TIMEOUT(View(*window)->model()->index(101, 3).data().toString(),
-                              QString("newer 59"), Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(
+        View(*window)->model()->index(101, LogModel::MessageColumn).data().toString(),
+        QString("newer 59"), Patience);
     QTRY_VERIFY_WITH_TIMEOUT(Marked(*window).isEmpty(), Patience);
 }
 

@@ -9,7 +9,7 @@
 
 #include "app/window/log/LogOverview.h"
 #include "app/window/log/LogView.h"
-#include "app/window/log/TickScrollBar.h"
+#include "app/window/log/TickColors.h"
 #include "app/window/widgets/SeverityIcons.h"
 #include "support/TestFiles.h"
 
@@ -75,9 +75,14 @@ QVector<int> Ticks(MainWindow& window, LogEntry::Severity severity)
     return Ticks(window, SeverityIcons::Color(severity, window.palette()));
 }
 
-QVector<int> Ticks(MainWindow& window, TickScrollBar::Kind kind)
+QVector<int> FoundTicks(MainWindow& window)
 {
-    return Ticks(window, TickScrollBar::Color(kind, window.palette()));
+    return Ticks(window, TickColors::Found(window.palette()));
+}
+
+QVector<int> MarkTicks(MainWindow& window)
+{
+    return Ticks(window, TickColors::Marked(window.palette()));
 }
 
 // Whether ticks are where they should be, give or take three pixels.
@@ -166,8 +171,8 @@ void tst_OverviewInWindow::problems()
     QTRY_VERIFY_WITH_TIMEOUT(AreAt(Ticks(*window, LogEntry::Error), {300, 800}), Patience);
     QVERIFY(AreAt(Ticks(*window, LogEntry::Warning), {100}));
     QVERIFY(AreAt(Ticks(*window, LogEntry::Fatal), {500}));
-    QVERIFY(Ticks(*window, TickScrollBar::Found).isEmpty());
-    QVERIFY(Ticks(*window, TickScrollBar::Marked).isEmpty());
+    QVERIFY(FoundTicks(*window).isEmpty());
+    QVERIFY(MarkTicks(*window).isEmpty());
     const QColor light = SeverityIcons::Color(LogEntry::Error, window->palette());
     QPalette dark = window->palette();
     dark.setColor(QPalette::Base, QColor(0x1e, 0x1f, 0x22));
@@ -182,14 +187,14 @@ void tst_OverviewInWindow::foundAndMarked()
     const auto window = WindowTest::show();
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2000, Patience);
     Find(*window, "line 500");
-    QTRY_VERIFY_WITH_TIMEOUT(AreAt(Ticks(*window, TickScrollBar::Found), {250}), Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(AreAt(FoundTicks(*window), {250}), Patience);
     View(*window)->GoToRow(1500);
     QTest::keyClick(window.get(), Qt::Key_M, Qt::ControlModifier);
-    QTRY_VERIFY_WITH_TIMEOUT(AreAt(Ticks(*window, TickScrollBar::Marked), {750}), Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(AreAt(MarkTicks(*window), {750}), Patience);
     QTest::keyClick(Child<QLineEdit>(window.get(), "Find text"), Qt::Key_Escape);
-    QTRY_VERIFY_WITH_TIMEOUT(Ticks(*window, TickScrollBar::Found).isEmpty(), Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(FoundTicks(*window).isEmpty(), Patience);
     QTest::keyClick(window.get(), Qt::Key_M, Qt::ControlModifier);
-    QTRY_VERIFY_WITH_TIMEOUT(Ticks(*window, TickScrollBar::Marked).isEmpty(), Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(MarkTicks(*window).isEmpty(), Patience);
 }
 
 void tst_OverviewInWindow::clicks_data()
@@ -223,7 +228,7 @@ void tst_OverviewInWindow::clicks()
         QTest::keyClick(window.get(), Qt::Key_M, Qt::ControlModifier);
     }
     Find(*window, "line 60005");
-    QTRY_COMPARE_WITH_TIMEOUT(Ticks(*window, TickScrollBar::Found).size(), 1, Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(FoundTicks(*window).size(), 1, Patience);
     QTRY_COMPARE_WITH_TIMEOUT(Ticks(*window, LogEntry::Error).size(), 2, Patience);
     ClickAt(*window, near, x);
     QCOMPARE(View(*window)->currentIndex().row(), row);
@@ -266,7 +271,7 @@ void tst_OverviewInWindow::toolTips()
     View(*window)->GoToRow(600);
     QTest::keyClick(window.get(), Qt::Key_M, Qt::ControlModifier);
     Find(*window, "line</b> 600");
-    QTRY_COMPARE_WITH_TIMEOUT(Ticks(*window, TickScrollBar::Found).size(), 1, Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(FoundTicks(*window).size(), 1, Patience);
     shown.setHtml(ToolTipAt(*window, 600));
     QCOMPARE(shown.toPlainText(), QString("Error: 2025-03-03 09:00:06.000 <b>line</b> 600\n"
                                           "Found: 2025-03-03 09:00:06.000 <b>line</b> 600\n"

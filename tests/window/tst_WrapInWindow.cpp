@@ -203,7 +203,8 @@ void tst_WrapInWindow::goesToRows()
     }
     view->GoToRow(300);
     // As near to the center as whole rows allow.
-    const int center = view->visualRect(view->model()->index(300, 3)).center().y();
+    const int center =
+        view->visualRect(view->model()->index(300, LogModel::MessageColumn)).center().y();
     const int middle = view->viewport()->height() / 2;
     QVERIFY(center <= middle + 1);
     QVERIFY(center + view->rowHeight(view->rowAt(0) - 1) >= middle - 1);
@@ -339,7 +340,8 @@ void tst_WrapInWindow::currentLineStaysWithAFilter()
     QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);
     QTest::keyClicks(QApplication::focusWidget(), "9 word");
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 60, Patience);
-    QTRY_COMPARE(view->currentIndex().siblingAtColumn(3).data().toString(), line);
+    QTRY_COMPARE(view->currentIndex().siblingAtColumn(LogModel::MessageColumn).data().toString(),
+                 line);
     QVERIFY(IsInView(view, view->currentIndex().row()));
     QTest::keyClick(window.get(), Qt::Key_F, Qt::ControlModifier | Qt::ShiftModifier);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 600, Patience);

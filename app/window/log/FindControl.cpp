@@ -6,7 +6,6 @@
 #include "app/window/log/LogFindBar.h"
 #include "app/window/log/LogSearch.h"
 #include "app/window/log/LogView.h"
-#include "app/window/log/TickScrollBar.h"
 
 #include <QItemSelectionModel>
 
@@ -72,7 +71,6 @@ void FindControl::showFound()
 {
     goToFound();
     m_bar->ShowSlowLine(m_search->slowLine());
-    m_view->ticks()->SetTicks(TickScrollBar::Found, m_search->hits());
     m_bar->ShowCount(countText());
     Q_EMIT foundChanged();
 }

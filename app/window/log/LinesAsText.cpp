@@ -14,6 +14,10 @@ namespace {
 
 constexpr QLatin1Char Quote('"');
 
+// What is in the line. The time since another entry depends on what else is shown.
+constexpr LogModel::Column CopiedColumns[] = {LogModel::TimeColumn, LogModel::SeverityColumn,
+                                              LogModel::ElapsedColumn, LogModel::MessageColumn};
+
 bool IsHeading(LogModel const& model, int row)
 {
     return model.index(row, 0).data(LogModel::HeadingRole).toBool();
@@ -88,14 +92,14 @@ QString LinesAsText::Markdown(LogModel const& model, QList<int> const& rows)
 QString LinesAsText::Csv(LogModel const& model, QList<int> const& rows)
 {
     QStringList names;
-    for (int column = 0; column < model.columnCount(); ++column)
+    for (int column : CopiedColumns)
         names.append(Field(ColumnName(model, column)));
     QString text = Record(names);
     for (int row : rows) {
         if (IsHeading(model, row))
             continue;
         QStringList fields;
-        for (int column = 0; column < model.columnCount(); ++column)
+        for (int column : CopiedColumns)
             fields.append(Field(CellText(model, row, column)));
         text += Record(fields);
     }

@@ -6,7 +6,7 @@
 #include "app/window/log/HighlightColors.h"
 #include "app/window/log/HighlightRules.h"
 #include "app/window/log/LogModel.h"
-#include "app/window/log/TickScrollBar.h"
+#include "app/window/log/TickColors.h"
 #include "app/window/widgets/BlendedColor.h"
 #include "app/window/widgets/RowHeight.h"
 #include "app/window/widgets/SeverityIcons.h"
@@ -21,10 +21,14 @@ namespace Velocor {
 
 namespace {
 
-constexpr int MarkWidth = 3; // pixels
+constexpr int MarkWidth = 3; // pixels, as is the next one
+constexpr int GapMargin = 8;
 
 // Dimmed, but still with a contrast of more than 4.5:1.
 constexpr qreal ContextFade = 0.4;
+
+// Of the line above a gap: a contrast of more than 3:1.
+constexpr qreal GapStrength = 0.55;
 
 QStyle const* StyleOf(QStyleOptionViewItem const& option)
 {
@@ -48,6 +52,16 @@ QTextCharFormat FoundFormat()
     format.setBackground(QColor(0x74, 0xe0, 0xef));
     format.setForeground(QColor(0x1a, 0x1a, 0x1a));
     return format;
+}
+
+// The room beside a message for the gap before it. None in a narrow column: the line above the row
+// has to do.
+int GapWidth(QString const& gap, QFontMetrics const& metrics, int width)
+{
+    if (gap.isEmpty())
+        return 0;
+    const int wanted = metrics.boundingRect(gap).width() + 2 * GapMargin;
+    return 2 * wanted <= width ? wanted : 0;
 }
 
 int TextMargin(QStyle const* style, QWidget const* widget)
@@ -182,9 +196,8 @@ void LogDelegate::initStyleOption(QStyleOptionViewItem* option, QModelIndex cons
         option->palette.setColor(QPalette::Text, HighlightColors::Text(option->palette));
     }
     if (index.column() == LogModel::TimeColumn && index.data(LogModel::MarkedRole).toBool())
-        option->backgroundBrush =
-            Blended(option->palette.color(QPalette::Base),
-                    TickScrollBar::Color(TickScrollBar::Marked, option->palette), 0.2);
+        option->backgroundBrush = Blended(option->palette.color(QPalette::Base),
+                                          TickColors::Marked(option->palette), 0.2);
     if (index.column() == LogModel::SeverityColumn && !index.data(LogModel::ContextRole).toBool())
         option->palette.setColor(QPalette::Text, SeverityIcons::Color(severity, option->palette));
 }
@@ -207,6 +220,9 @@ void LogDelegate::paint(QPainter* painter, QStyleOptionViewItem const& option,
         return;
     }
     paintContent(painter, cell, index);
+    const QString gap = index.data(LogModel::GapRole).toString();
+    if (!gap.isEmpty())
+        paintGap(painter, cell, index, gap);
     if (index.column() == LogModel::TimeColumn && index.data(LogModel::MarkedRole).toBool())
         paintUserMark(painter, cell, !index.data(LogModel::NoteRole).toString().isEmpty());
 }
@@ -221,8 +237,17 @@ void LogDelegate::paintContent(QPainter* painter, QStyleOptionViewItem const& op
         cell.rect.setHeight(RowHeight(cell.fontMetrics));
         cell.state &= ~QStyle::State_HasFocus;
     }
-    // Not in the severity column, because the filter does not search translated names.
-    const bool isMarkable = index.column() != LogModel::SeverityColumn;
+    const int gapWidth = isMessage ? GapWidth(index.data(LogModel::GapRole).toString(),
+                                              cell.fontMetrics, cell.rect.width())
+                                   : 0;
+    if (gapWidth > 0) {
+        paintEmpty(painter, cell);
+        cell.rect.setWidth(cell.rect.width() - gapWidth);
+        cell.state &= ~QStyle::State_HasFocus;
+    }
+    // The filter searches neither translated names nor what is not in the line.
+    const bool isMarkable =
+        index.column() != LogModel::SeverityColumn && index.column() != LogModel::SinceColumn;
     const QVector<QTextLayout::FormatRange> formats =
         isMarkable && (m_filter.hasText() || m_found.hasText())
             ? marks(cell.text, index.data(LogModel::LineRole).toString())
@@ -268,7 +293,7 @@ void LogDelegate::paintPlain(QPainter* painter, QStyleOptionViewItem const& opti
 void LogDelegate::paintUserMark(QPainter* painter, QStyleOptionViewItem const& option, bool hasNote)
 {
     const QRect cell = option.rect;
-    const QColor color = TickScrollBar::Color(TickScrollBar::Marked, option.palette);
+    const QColor color = TickColors::Marked(option.palette);
     painter->save();
     painter->fillRect(cell.left(), cell.top(), MarkWidth, cell.height(), color);
     if (hasNote) {
@@ -278,6 +303,32 @@ void LogDelegate::paintUserMark(QPainter* painter, QStyleOptionViewItem const& o
         painter->setBrush(color);
         painter->drawPolygon(QPolygon(
             QVector<QPoint>({corner, corner - QPoint(size, 0), corner + QPoint(0, size)})));
+    }
+    painter->restore();
+}
+
+// A line above the row, and the gap in words at the end of it.
+void LogDelegate::paintGap(QPainter* painter, QStyleOptionViewItem const& option,
+                           QModelIndex const& index, QString const& gap)
+{
+    const bool isSelected = option.state & QStyle::State_Selected;
+    // Not the cell's own, in which a severity has its color.
+    const QPalette palette = option.widget ? option.widget->palette() : option.palette;
+    const QColor text = palette.color(isSelected ? QPalette::HighlightedText : QPalette::Text);
+    const QColor ground = palette.color(isSelected ? QPalette::Highlight : QPalette::Base);
+    painter->save();
+    painter->setClipRect(option.rect);
+    painter->fillRect(option.rect.left(), option.rect.top(), option.rect.width(), 1,
+                      Blended(ground, text, GapStrength));
+    const int width = index.column() == LogModel::MessageColumn
+                          ? GapWidth(gap, option.fontMetrics, option.rect.width())
+                          : 0;
+    if (width > 0) {
+        const QRect area(option.rect.right() + 1 - width, option.rect.top(), width,
+                         std::min(option.rect.height(), RowHeight(option.fontMetrics)));
+        painter->setPen(Blended(text, ground, ContextFade));
+        painter->setFont(option.font);
+        painter->drawText(area, Qt::AlignCenter, gap);
     }
     painter->restore();
 }
@@ -310,11 +361,14 @@ void LogDelegate::paintHeading(QPainter* painter, QStyleOptionViewItem const& op
     painter->restore();
 }
 
-int LogDelegate::HeightOf(QString const& message, QFont const& font, int width) const
+int LogDelegate::HeightOf(QString const& message, QString const& gap, QFont const& font,
+                          int width) const
 {
     QStyle const* style = QApplication::style();
     QTextLayout layout(message, font);
-    LayOut(layout, width - 2 * TextMargin(style, nullptr), m_mostLines);
+    LayOut(layout,
+           width - GapWidth(gap, QFontMetrics(font), width) - 2 * TextMargin(style, nullptr),
+           m_mostLines);
     return qCeil(HeightOfLines(layout)) + RowHeight(QFontMetrics(font)) -
            QFontMetrics(font).height();
 }

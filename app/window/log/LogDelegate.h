@@ -36,7 +36,9 @@ public:
     void SetMostLines(int lines) { m_mostLines = lines; }
 
     /// The height of a row with a message in a column of a width, in pixels.
-    int HeightOf(QString const& message, QFont const& font, int width) const;
+    ///
+    /// @param gap  as LogModel::GapRole
+    int HeightOf(QString const& message, QString const& gap, QFont const& font, int width) const;
 
     void paint(QPainter* painter, QStyleOptionViewItem const& option,
                QModelIndex const& index) const override;
@@ -54,6 +56,8 @@ private:
                             QVector<QTextLayout::FormatRange> const& formats, int mostLines);
     static void paintEmpty(QPainter* painter, QStyleOptionViewItem const& option);
     static void paintUserMark(QPainter* painter, QStyleOptionViewItem const& option, bool hasNote);
+    static void paintGap(QPainter* painter, QStyleOptionViewItem const& option,
+                         QModelIndex const& index, QString const& gap);
     static void paintHeading(QPainter* painter, QStyleOptionViewItem const& option);
 
     LogFilter m_filter;

@@ -99,6 +99,7 @@ void LogModel::Open(QString const& path, LogLineParser const& parser, bool isCur
     m_parser.SetOwn(isCurrent);
     m_isCurrent = isCurrent;
     m_isAll = isAll;
+    m_spans.MeasureFromAbove();
     m_lines.clear();
     Reload();
 }
@@ -479,6 +480,8 @@ QString LogModel::cellText(int row, int column) const
         return LogSeverities::Name(entry(row).severity);
     case ElapsedColumn:
         return entry(row).elapsed.isEmpty() ? QString() : tr("%1 ms").arg(entry(row).elapsed);
+    case SinceColumn:
+        return m_spans.Since(row);
     default:
         return entry(row).message;
     }
@@ -528,8 +531,9 @@ QVariant LogModel::data(QModelIndex const& index, int role) const
     case Qt::ToolTipRole:
         return PlainToolTip(toolTip(row, index.column()));
     case Qt::TextAlignmentRole:
-        return index.column() == ElapsedColumn ? int(Qt::AlignRight | Qt::AlignVCenter)
-                                               : int(Qt::AlignLeft | Qt::AlignVCenter);
+        return index.column() == ElapsedColumn || index.column() == SinceColumn
+                   ? int(Qt::AlignRight | Qt::AlignVCenter)
+                   : int(Qt::AlignLeft | Qt::AlignVCenter);
     case SeverityRole:
         return static_cast<int>(m_state.rows->severity(static_cast<size_t>(row)));
     case HeadingRole:
@@ -542,6 +546,12 @@ QVariant LogModel::data(QModelIndex const& index, int role) const
         return bool(m_state.rows->mark(static_cast<size_t>(row)) & LogRows::Context);
     case LineRole:
         return LineText(row, ShownLimit);
+    case GapRole:
+        return m_spans.Gap(row);
+    case Qt::AccessibleDescriptionRole: {
+        const QString gap = index.column() == TimeColumn ? m_spans.Gap(row) : QString();
+        return gap.isEmpty() ? QVariant() : tr("%1 after the entry above").arg(gap);
+    }
     case NoteRole:
         return m_marks.value(LineStart(row));
     default:
@@ -554,7 +564,12 @@ QVariant LogModel::headerData(int section, Qt::Orientation orientation, int role
     if (orientation != Qt::Horizontal)
         return QVariant();
     if (role == Qt::TextAlignmentRole)
-        return int((section == ElapsedColumn ? Qt::AlignRight : Qt::AlignLeft) | Qt::AlignVCenter);
+        return int(
+            (section == ElapsedColumn || section == SinceColumn ? Qt::AlignRight : Qt::AlignLeft) |
+            Qt::AlignVCenter);
+    if (role == Qt::ToolTipRole && section == SinceColumn)
+        return PlainToolTip(m_spans.base().isEmpty() ? tr("Time since the entry above")
+                                                     : tr("Time since %1").arg(m_spans.base()));
     if (role != Qt::DisplayRole)
         return QVariant();
     switch (section) {
@@ -564,6 +579,8 @@ QVariant LogModel::headerData(int section, Qt::Orientation orientation, int role
         return tr("Severity");
     case ElapsedColumn:
         return tr("Elapsed");
+    case SinceColumn:
+        return m_spans.base().isEmpty() ? tr("Since") : tr("Since Chosen");
     default:
         return tr("Message");
     }

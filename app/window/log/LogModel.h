@@ -8,6 +8,7 @@
 #include "app/logfile/LogEntry.h"
 #include "app/logfile/LogFilter.h"
 #include "app/logfile/LogLineParser.h"
+#include "app/window/log/RowSpans.h"
 
 #include <QAbstractTableModel>
 #include <QCache>
@@ -20,8 +21,8 @@ namespace Velocor {
 
 class HistoryScanner;
 
-/// A log file as a table, live: time, severity, elapsed time and message of each line, oldest
-/// first.
+/// A log file as a table, live: time, severity, elapsed time, time since another entry, and message
+/// of each line, oldest first.
 ///
 /// Lines are read from the file when a view needs them; all searching is done by a HistoryScanner
 /// in another thread. A line that is not in the file anymore, because the log has overwritten it,
@@ -36,15 +37,23 @@ class LogModel : public QAbstractTableModel
     Q_OBJECT
 
 public:
-    enum Column { TimeColumn, SeverityColumn, ElapsedColumn, MessageColumn, ColumnCount };
+    enum Column {
+        TimeColumn,
+        SeverityColumn,
+        ElapsedColumn,
+        SinceColumn,
+        MessageColumn,
+        ColumnCount
+    };
     enum Role {
         SeverityRole = Qt::UserRole, ///< a LogEntry::Severity
         HeadingRole,                 ///< whether the row is a heading
         EarlierRole,                 ///< whether the row belongs to an earlier run
         MarkedRole,                  ///< whether the user has marked the row
         NoteRole,                    ///< the user's note on it
-        LineRole,   ///< the start of the line in the file, of up to ShownLimit bytes
-        ContextRole ///< whether it is shown only as the context of others
+        LineRole,    ///< the start of the line in the file, of up to ShownLimit bytes
+        ContextRole, ///< whether it is shown only as the context of others
+        GapRole      ///< the gap before the row, in words; empty if there is none
     };
 
     explicit LogModel(QObject* parent = nullptr);
@@ -89,6 +98,12 @@ public:
 
     /// Sets the lines that the user has marked: where they start, and their notes.
     void SetMarks(QHash<qint64, QString> const& marks);
+
+    /// The times between rows. Views have to be told if it is to measure something else.
+    RowSpans& spans() { return m_spans; }
+
+    /// What a row shows of its line, with the start of the message; of a heading, nothing.
+    LogEntry Entry(int row) const { return isHeading(row) ? LogEntry() : entry(row); }
 
     /// The first row of the nearest entry after (step 1) or before (step -1) that of `row` that is
     /// a warning or worse; -1 if there is none.
@@ -212,6 +227,7 @@ private:
     HistoryUpdate m_state;
     int m_rowCount = 0; // fewer than the rows of m_state only while a change is being signaled
     QHash<qint64, QString> m_marks;
+    RowSpans m_spans{*this};
     mutable LogBytes m_file;
     mutable QCache<qint64, Line> m_lines;
 };

@@ -6,7 +6,7 @@
 #include "app/logfile/LogSeverities.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogView.h"
-#include "app/window/log/TickScrollBar.h"
+#include "app/window/log/TickColors.h"
 #include "app/window/widgets/PlainText.h"
 #include "app/window/widgets/SeverityIcons.h"
 
@@ -233,9 +233,9 @@ void LogOverview::paintEvent(QPaintEvent* /*event*/)
                 continue;
             QColor color = SeverityIcons::Color(m_worst[static_cast<size_t>(part)], palette());
             if (lane == Found)
-                color = TickScrollBar::Color(TickScrollBar::Found, palette());
+                color = TickColors::Found(palette());
             else if (lane == Marked)
-                color = TickScrollBar::Color(TickScrollBar::Marked, palette());
+                color = TickColors::Marked(palette());
             painter.fillRect(EdgeMargin + lane * LaneWidth, area.top() + part, LaneWidth, TickSize,
                              color);
         }

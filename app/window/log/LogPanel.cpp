@@ -252,6 +252,24 @@ void LogPanel::SetLineNumbers(bool shown)
     m_numbers->SetShown(shown);
 }
 
+void LogPanel::SetSince(bool shown)
+{
+    m_view->SetSince(shown);
+}
+
+void LogPanel::SetLeastGap(qint64 span)
+{
+    m_view->SetLeastGap(span);
+}
+
+void LogPanel::measure(bool isFromCurrent)
+{
+    if (m_view->MeasureFrom(isFromCurrent ? m_view->currentIndex().row() : -1))
+        Q_EMIT sinceRequested();
+    else
+        Q_EMIT messageReported(tr("This line has no time"));
+}
+
 void LogPanel::AddBar(QWidget* bar)
 {
     auto* all = static_cast<QVBoxLayout*>(layout());
@@ -327,6 +345,7 @@ void LogPanel::showMenu(QPoint const& position, QModelIndex const& cell)
 {
     auto* menu = new LogTableMenu(cell, m_copier, m_filterBar, m_marks, this);
     connect(menu, &LogTableMenu::highlightRequested, this, &LogPanel::highlight);
+    connect(menu, &LogTableMenu::measureRequested, this, &LogPanel::measure);
     menu->popup(position);
 }
 

@@ -74,6 +74,10 @@ public:
     /// Shows the numbers of the lines in the file beside the rows.
     void SetLineNumbers(bool shown);
 
+    /// See LogView::SetSince() and LogView::SetLeastGap().
+    void SetSince(bool shown);
+    void SetLeastGap(qint64 span);
+
     /// Adds a bar above the table. The panel takes ownership.
     void AddBar(QWidget* bar);
 
@@ -159,6 +163,9 @@ Q_SIGNALS:
     /// Ctrl and the mouse wheel: larger (1) or smaller (-1) text.
     void zoomRequested(int steps);
 
+    /// The user wants to see the time since another entry.
+    void sinceRequested();
+
 protected:
     void keyPressEvent(QKeyEvent* event) override;
     void focusInEvent(QFocusEvent* event) override;
@@ -174,6 +181,7 @@ private:
     void updatePlaceholder();
     void showContent();
     void highlight(QString const& text);
+    void measure(bool isFromCurrent);
     void showMenu(QPoint const& position, QModelIndex const& cell);
 
     LogModel* m_model;

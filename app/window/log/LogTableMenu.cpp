@@ -19,14 +19,18 @@ LogTableMenu::LogTableMenu(QModelIndex const& cell, LineCopier* copier, LogFilte
     addAction(tr("Copy as Mar&kdown"), copier, &LineCopier::CopyAsMarkdown);
     addAction(tr("Copy as CS&V"), copier, &LineCopier::CopyAsCsv);
     addSeparator();
-    addAction(tr("&Filter by This"), this, [this] { filterBy(false); });
-    addAction(tr("&Hide This"), this, [this] { filterBy(true); });
+    const bool isInLine = cell.column() != LogModel::SinceColumn;
+    addAction(tr("&Filter by This"), this, [this] { filterBy(false); })->setEnabled(isInLine);
+    addAction(tr("&Hide This"), this, [this] { filterBy(true); })->setEnabled(isInLine);
     QAction* highlight =
         addAction(tr("Hi&ghlight This"), this, [this] { Q_EMIT highlightRequested(text()); });
-    highlight->setEnabled(cell.isValid() && cell.column() != LogModel::SeverityColumn);
+    highlight->setEnabled(cell.isValid() && isInLine && cell.column() != LogModel::SeverityColumn);
     addSeparator();
     addAction(marks->isMarked() ? tr("Remove &Mark") : tr("&Mark"), marks, &MarkControl::Toggle);
     addAction(tr("&Note..."), marks, &MarkControl::AskNote);
+    addSeparator();
+    addAction(tr("Measure From He&re"), this, [this] { Q_EMIT measureRequested(true); });
+    addAction(tr("Measure From &Above"), this, [this] { Q_EMIT measureRequested(false); });
 }
 
 // As it is in the file, where tabs and color sequences are searched, too.

@@ -30,6 +30,9 @@ Q_SIGNALS:
     /// Lines with a text shall be highlighted.
     void highlightRequested(QString const& text);
 
+    /// The time since the current entry shall be shown (true), or since the entry above each.
+    void measureRequested(bool isFromCurrent);
+
 private:
     void filterBy(bool isHiding);
     QString text() const;

@@ -7,7 +7,7 @@
 #include "app/window/log/HighlightRules.h"
 #include "app/window/log/LogDelegate.h"
 #include "app/window/log/LogModel.h"
-#include "app/window/log/TickScrollBar.h"
+#include "app/window/log/SteadyScrollBar.h"
 #include "app/window/widgets/RowHeight.h"
 
 #include <QAbstractButton>
@@ -34,11 +34,12 @@ constexpr int MostMeasuredRows = 1000;
 } // namespace
 
 LogView::LogView(LogModel* model, QWidget* parent)
-    : WrappingTable(new LogDelegate, parent), m_model(model), m_ticks(new TickScrollBar(this))
+    : WrappingTable(new LogDelegate, parent), m_model(model), m_bar(new SteadyScrollBar(this))
 {
     setUp();
     setModel(model);
     SetDefaultWidths();
+    hideColumn(LogModel::SinceColumn);
     connect(verticalScrollBar(), &QScrollBar::valueChanged, this, &LogView::noteScrolled);
     connect(model, &LogModel::modelAboutToBeReset, this, &LogView::noteCurrent);
     connect(model, &LogModel::refreshed, this, &LogView::afterRefresh);
@@ -52,7 +53,7 @@ LogDelegate* LogView::cells() const
 void LogView::setUp()
 {
     setAccessibleName(tr("Log entries"));
-    setVerticalScrollBar(m_ticks);
+    setVerticalScrollBar(m_bar);
     setSelectionBehavior(SelectRows);
     setSelectionMode(ExtendedSelection);
     setEditTriggers(NoEditTriggers);
@@ -88,6 +89,8 @@ void LogView::SetDefaultWidths()
                        padding);
     setColumnWidth(LogModel::ElapsedColumn,
                    metrics.boundingRect(QStringLiteral("00000 ms")).width() + padding);
+    setColumnWidth(LogModel::SinceColumn,
+                   metrics.boundingRect(QStringLiteral("00 min 00 s")).width() + padding);
 }
 
 void LogView::changeEvent(QEvent* event)
@@ -226,13 +229,41 @@ void LogView::SetLineWrap(bool wrapped)
         scrollTo(currentIndex());
 }
 
+void LogView::SetSince(bool shown)
+{
+    m_showsSince = shown;
+    setColumnHidden(LogModel::SinceColumn, !shown || !m_model->state().hasTimes);
+}
+
+void LogView::SetLeastGap(qint64 span)
+{
+    if (span == m_model->spans().leastGap())
+        return;
+    m_model->spans().SetLeastGap(span);
+    forgetHeights(); // the gap takes some of a message's width
+    if (isWrapped())
+        updateGeometries();
+    viewport()->update();
+}
+
+bool LogView::MeasureFrom(int row)
+{
+    if (row < 0)
+        m_model->spans().MeasureFromAbove();
+    else if (!m_model->spans().MeasureFrom(row))
+        return false;
+    viewport()->update();
+    horizontalHeader()->viewport()->update();
+    return true;
+}
+
 // Compensates for rows inserted above the visible ones.
 void LogView::rowsInserted(QModelIndex const& parent, int first, int last)
 {
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
     m_hasOtherRows = m_hasOtherRows || last + 1 < m_model->rowCount();
     if (m_following) {
-        m_ticks->UpdateOnceAfter([&] {
+        m_bar->UpdateOnceAfter([&] {
             moveOnceAfter([&] {
                 WrappingTable::rowsInserted(parent, first, last);
                 scrollToBottom();
@@ -274,8 +305,8 @@ void LogView::afterRefresh()
     setColumnHidden(LogModel::TimeColumn, !state.hasTimes && state.lines > 0);
     setColumnHidden(LogModel::SeverityColumn, !state.hasSeverities && state.lines > 0);
     setColumnHidden(LogModel::ElapsedColumn, !state.hasElapsed);
+    setColumnHidden(LogModel::SinceColumn, !m_showsSince || !state.hasTimes);
     fitTimes();
-    m_ticks->SetRowCount(m_model->rowCount());
     if (m_hasOtherRows || measuredRows() > MostMeasuredRows)
         forgetHeights();
     if (isWrapped() && m_hasOtherRows)

@@ -13,7 +13,7 @@ class HighlightRules;
 class LogDelegate;
 class LogFilter;
 class LogModel;
-class TickScrollBar;
+class SteadyScrollBar;
 
 /// The table of a log: keeps its position while rows change, or follows the newest entry.
 ///
@@ -31,6 +31,18 @@ public:
 
     /// Shows long messages in several lines, at most WrappedRows::MaximumLines. The rest is elided.
     void SetLineWrap(bool wrapped);
+
+    /// Shows the column with the time since another entry, if entries have times.
+    void SetSince(bool shown);
+
+    /// Shows where at least this much time passed between two entries, in milliseconds; 0 for
+    /// nowhere.
+    void SetLeastGap(qint64 span);
+
+    /// Measures the time since the entry of a row or, with -1, since the entry above each.
+    ///
+    /// @return false, with nothing changed, if that entry has no time
+    bool MeasureFrom(int row);
 
     /// Whether to keep the newest row in view.
     void SetFollowing(bool following);
@@ -69,9 +81,6 @@ public:
 
     /// Sets the rules that highlight lines.
     void SetHighlightRules(std::shared_ptr<HighlightRules> const& rules);
-
-    /// The vertical scroll bar.
-    TickScrollBar* ticks() const { return m_ticks; }
 
     /// The numbers of the selected rows in ascending order, at most MaximumCopiedLines.
     QList<int> SelectedRows() const;
@@ -133,12 +142,13 @@ private:
     void fitTimes();
 
     LogModel* m_model;
-    TickScrollBar* m_ticks;
+    SteadyScrollBar* m_bar;
     QString m_placeholder;
     QString m_fittedPath;
     bool m_following = true;
     bool m_scrollingItself = false;
     bool m_goesSideways = false;
+    bool m_showsSince = false;
     bool m_hasOtherRows = true; // since the last refresh, not only more of them
 
     QString m_currentText;

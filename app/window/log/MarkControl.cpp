@@ -8,7 +8,6 @@
 #include "app/window/log/LogView.h"
 #include "app/window/log/MarkListDialog.h"
 #include "app/window/log/NoteDialog.h"
-#include "app/window/log/TickScrollBar.h"
 
 #include <algorithm>
 
@@ -107,7 +106,6 @@ QString MarkControl::note() const
 
 void MarkControl::show()
 {
-    m_view->ticks()->SetTicks(TickScrollBar::Marked, m_marks->rows());
     m_view->viewport()->update();
     Q_EMIT changed();
 }

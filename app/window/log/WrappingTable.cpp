@@ -61,8 +61,11 @@ int WrappingTable::heightOf(int row) const
     const auto known = m_heights.find(row);
     if (known != m_heights.end())
         return known->second;
-    const QString message = model()->index(row, LogModel::MessageColumn).data().toString();
-    const int height = std::max(usualHeight(), m_delegate->HeightOf(message, font(), m_width));
+    const QModelIndex cell = model()->index(row, LogModel::MessageColumn);
+    const int height =
+        std::max(usualHeight(),
+                 m_delegate->HeightOf(cell.data().toString(),
+                                      cell.data(LogModel::GapRole).toString(), font(), m_width));
     m_heights.emplace(row, height);
     return height;
 }

@@ -150,22 +150,22 @@ void tst_LogModel::columns()
 {
     LogModel model;
     open(model, "2025-03-03 09:02:11.031 Warning dT:[250] hello\nmore\n");
-    QCOMPARE(model.columnCount(), 4);
+    QCOMPARE(model.columnCount(), 5);
     QCOMPARE(model.rowCount(), 2);
     QCOMPARE(model.index(0, 0).data().toString(), QString("2025-03-03 09:02:11.031"));
     QCOMPARE(model.index(0, 1).data().toString(), QString("Warning"));
     QCOMPARE(model.index(0, 2).data().toString(), QString("250 ms"));
-    QCOMPARE(model.index(0, 3).data().toString(), QString("hello"));
+    QCOMPARE(model.index(0, LogModel::MessageColumn).data().toString(), QString("hello"));
     QCOMPARE(model.LineText(0, LogIndex::LineLimit),
              QString("2025-03-03 09:02:11.031 Warning dT:[250] hello"));
     QCOMPARE(model.index(1, 0).data().toString(), QString());
-    QCOMPARE(model.index(1, 3).data().toString(), QString("more"));
+    QCOMPARE(model.index(1, LogModel::MessageColumn).data().toString(), QString("more"));
     QVERIFY(model.state().hasElapsed);
     QVERIFY(!model.index(2, 0).data().isValid());
     QStringList titles;
-    for (int column = 0; column < 4; ++column)
+    for (int column = 0; column < model.columnCount(); ++column)
         titles.append(model.headerData(column, Qt::Horizontal, Qt::DisplayRole).toString());
-    QCOMPARE(titles, QStringList({"Time", "Severity", "Elapsed", "Message"}));
+    QCOMPARE(titles, QStringList({"Time", "Severity", "Elapsed", "Since", "Message"}));
 }
 
 void tst_LogModel::details()
@@ -201,7 +201,7 @@ void tst_LogModel::details()
     QStringList titles;
     for (int column = 0; column < model.columnCount(); ++column)
         titles.append(model.headerData(column, Qt::Horizontal, Qt::DisplayRole).toString());
-    QCOMPARE(titles, QStringList({"Time", "Severity", "Elapsed", "Message"}));
+    QCOMPARE(titles, QStringList({"Time", "Severity", "Elapsed", "Since", "Message"}));
     QVERIFY(!model.headerData(0, Qt::Vertical, Qt::DisplayRole).isValid());
     QVERIFY(!model.headerData(0, Qt::Horizontal, Qt::FontRole).isValid());
 }
@@ -572,7 +572,8 @@ void tst_LogModel::overwritten()
         open(model, log);
         QCOMPARE(model.rowCount(), lines);
         for (int row = 0; row < onScreen; ++row)
-            QCOMPARE(model.index(row, 3).data().toString(), QString("x %1").arg(row));
+            QCOMPARE(model.index(row, LogModel::MessageColumn).data().toString(),
+                     QString("x %1").arg(row));
         model.SetPaused(isPaused);
         QVERIFY(WriteAt(m_file, 0, over));
         QVERIFY(length == 0 || QFile::resize(m_file, length));
@@ -587,7 +588,7 @@ void tst_LogModel::overwritten()
             QCOMPARE(model.IsGone(row), row >= onScreen && !isThere);
             const QString gone = "This line is no longer in the file";
             QCOMPARE(line, model.IsGone(row) ? gone : before[row]);
-            QCOMPARE(model.index(row, 3).data().toString(),
+            QCOMPARE(model.index(row, LogModel::MessageColumn).data().toString(),
                      model.IsGone(row) ? gone : QString("x %1").arg(row));
             QCOMPARE(model.index(row, 0).data().toString().isEmpty(), model.IsGone(row));
         }
@@ -659,13 +660,13 @@ void tst_LogModel::longLines()
         open(model, line + lineEnd + entry("09:00:01.000", "Trace", "next") + line);
         QCOMPARE(model.rowCount(), 3);
         for (int row : {0, 2}) {
-            const QString shown = model.index(row, 3).data().toString();
+            const QString shown = model.index(row, LogModel::MessageColumn).data().toString();
             QVERIFY2(shown.endsWith(end), qPrintable(shown.right(20)));
             QVERIFY(shown.size() <= LogModel::ShownLimit);
             QCOMPARE(model.LineText(row, LogIndex::LineLimit), QString(line));
             QCOMPARE(model.EntryText(row, LogIndex::LineLimit), QString(line));
         }
-        QCOMPARE(model.index(1, 3).data().toString(), QString("next"));
+        QCOMPARE(model.index(1, LogModel::MessageColumn).data().toString(), QString("next"));
     }
 }
 
@@ -673,7 +674,7 @@ void tst_LogModel::controlCharacters()
 {
     LogModel model;
     open(model, "2025-03-03 09:00:00.000 Trace a\tb\rc\x1b[0m\r\n");
-    QCOMPARE(model.index(0, 3).data().toString(), QString("a       b c"));
+    QCOMPARE(model.index(0, LogModel::MessageColumn).data().toString(), QString("a       b c"));
     QCOMPARE(model.LineText(0, 100), QString("2025-03-03 09:00:00.000 Trace a\tb\rc\x1b[0m"));
 }
 

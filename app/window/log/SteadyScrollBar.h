@@ -6,41 +6,26 @@
 #include <QScrollBar>
 
 #include <functional>
-#include <memory>
-#include <vector>
 
 namespace Velocor {
 
-/// A vertical scroll bar with ticks where certain rows are.
-class TickScrollBar : public QScrollBar
+/// A vertical scroll bar that paints only when it looks different: in a large log that is followed,
+/// most new lines move its slider by less than a pixel.
+class SteadyScrollBar : public QScrollBar
 {
     Q_OBJECT
 
 public:
-    enum Kind { Found, Marked, KindCount };
-
-    explicit TickScrollBar(QWidget* parent = nullptr);
-
-    /// The color of a kind of ticks, readable on the palette's background.
-    static QColor Color(Kind kind, QPalette const& palette);
-
-    /// Sets the rows of one kind.
-    ///
-    /// @param rows  ascending
-    void SetTicks(Kind kind, std::shared_ptr<std::vector<int> const> const& rows);
-
-    /// Sets the number of rows that the whole bar stands for.
-    void SetRowCount(int count);
+    explicit SteadyScrollBar(QWidget* parent = nullptr);
 
     /// Does what changes range and value, and paints only if both together look different.
     void UpdateOnceAfter(std::function<void()> const& change);
 
 protected:
-    void paintEvent(QPaintEvent* event) override;
     void sliderChange(SliderChange change) override;
 
 private:
-    // What is painted, apart from the ticks.
+    // What is painted.
     struct Look
     {
         QRect slider;
@@ -55,8 +40,6 @@ private:
     };
     Look currentLook() const;
 
-    std::shared_ptr<std::vector<int> const> m_ticks[KindCount];
-    int m_rowCount = 0;
     bool m_isUpdatingLater = false;
     Look m_look;
 };
