@@ -3,7 +3,24 @@
 
 #include "app/settingsfile/SettingsDocument.h"
 
+#include <QObject>
+
 namespace Velocor {
+
+SettingsDocument SettingsDocument::WithErrorAsLoss() const
+{
+    SettingsDocument document = *this;
+    if (isParsed)
+        return document;
+    if (rootName.isEmpty())
+        document.rootName = QStringLiteral("VelocorSettings");
+    document.losses.prepend(
+        {QString(), QString(),
+         QObject::tr("Line %1: everything from there on (%2)").arg(line).arg(error)});
+    ++document.lossCount;
+    document.isParsed = true;
+    return document;
+}
 
 QStringList SettingsDocument::TextsOf(QVector<Loss> const& losses)
 {

@@ -50,6 +50,10 @@ struct SettingsDocument
     QVector<Loss> losses; ///< what the store does not keep of a file
     int lossCount = 0;    ///< the number of all losses; `losses` has only the first ones
 
+    /// What was read of a malformed file, as a document that can be saved: its error is one more
+    /// loss. A document that was parsed stays the same.
+    SettingsDocument WithErrorAsLoss() const;
+
     /// The texts of losses.
     static QStringList TextsOf(QVector<Loss> const& losses);
 

@@ -10,8 +10,13 @@
 #include <QFile>
 #include <QFileInfo>
 #include <QObject>
+#include <QSaveFile>
 
 #include <algorithm>
+
+#ifdef Q_OS_UNIX
+#include <unistd.h>
+#endif
 
 namespace Velocor {
 
@@ -75,6 +80,17 @@ void Fill(TorkConfigFile& store, SettingsDocument const& document)
     }
 }
 
+// Whether a file that this process creates would have the same owner and group.
+bool IsOurs(QFileInfo const& file)
+{
+#ifdef Q_OS_UNIX
+    return file.ownerId() == geteuid() && file.groupId() == getegid();
+#else
+    Q_UNUSED(file)
+    return true;
+#endif
+}
+
 } // namespace
 
 QString SettingsFileWriter::ValueProblem(QString const& value)
@@ -136,6 +152,27 @@ bool SettingsFileWriter::Save(QString const& path, SettingsDocument const& docum
         *error = QObject::tr("The file was written, but does not read back completely. "
                              "The disk may be full.");
     return arrived;
+}
+
+bool SettingsFileWriter::SaveBytes(QString const& path, QByteArray const& bytes, QString* error)
+{
+    const QFileInfo info(path);
+    if (info.exists() && !info.isFile()) {
+        *error = QObject::tr("Not a regular file");
+        return false;
+    }
+    QSaveFile replacement(path);
+    QFile original(path);
+    QFileDevice& file =
+        info.exists() && !IsOurs(info) ? static_cast<QFileDevice&>(original) : replacement;
+    bool isSaved = file.open(QIODevice::WriteOnly) && file.write(bytes) == bytes.size();
+    if (&file == &replacement)
+        isSaved = isSaved && replacement.commit();
+    else
+        isSaved = isSaved && original.flush();
+    if (!isSaved)
+        *error = file.errorString();
+    return isSaved;
 }
 
 bool SettingsFileWriter::KeepBackup(QString const& path, QString* error)

@@ -32,6 +32,12 @@ public:
     /// @return false if the file could not be opened, or does not contain the document afterwards
     static bool Save(QString const& path, SettingsDocument const& document, QString* error);
 
+    /// Replaces the content of a file, or creates it. Its owner and permissions stay; a file of
+    /// another owner or group is therefore written in place.
+    ///
+    /// @param error  receives the reason for a failure
+    static bool SaveBytes(QString const& path, QByteArray const& bytes, QString* error);
+
     /// Copies a file to the same name with ".bak" appended, replacing an earlier copy.
     static bool KeepBackup(QString const& path, QString* error);
 };

@@ -42,14 +42,11 @@ void CurrentTab::Update()
 void CurrentTab::updateEditing()
 {
     SettingsEditor* editor = m_tabs->currentEditor();
-    QUndoStack const* changes = editor ? editor->undoStack() : nullptr;
     m_actions.save->setEnabled(editor && editor->CanSave());
-    m_actions.undo->setEnabled(changes && changes->canUndo());
-    m_actions.redo->setEnabled(changes && changes->canRedo());
-    m_actions.undo->setText(
-        tr("&Undo %1").arg(changes ? changes->undoText() : QString()).trimmed());
-    m_actions.redo->setText(
-        tr("&Redo %1").arg(changes ? changes->redoText() : QString()).trimmed());
+    m_actions.undo->setEnabled(editor && editor->CanUndo());
+    m_actions.redo->setEnabled(editor && editor->CanRedo());
+    m_actions.undo->setText(tr("&Undo %1").arg(editor ? editor->UndoText() : QString()).trimmed());
+    m_actions.redo->setText(tr("&Redo %1").arg(editor ? editor->RedoText() : QString()).trimmed());
 
     const QList<QAction*> commands = editor ? editor->commands() : QList<QAction*>();
     if (m_actions.settings->actions() != commands) {
@@ -58,7 +55,7 @@ void CurrentTab::updateEditing()
     }
     m_actions.settings->menuAction()->setEnabled(!commands.isEmpty());
     for (QAction* action : m_actions.ofSettings)
-        action->setEnabled(!commands.isEmpty());
+        action->setEnabled(editor && editor->ShowsTree());
     if (editor)
         editor->AddOuterActions({m_actions.undo, m_actions.redo});
 }

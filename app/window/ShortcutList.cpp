@@ -3,6 +3,7 @@
 
 #include "app/window/ShortcutList.h"
 
+#include "app/window/settings/SettingsTextPage.h"
 #include "app/window/settings/SettingsTree.h"
 
 #include <QAbstractButton>
@@ -74,6 +75,9 @@ QString SettingsLines()
     const QVector<SettingsCommand> all = SettingsTree::AllCommands();
     for (SettingsCommand const& command : all)
         lines += KeyLine(command.keys.first(), command.statusTip);
+    const QVector<SettingsTextCommand> ofText = SettingsTextPage::AllCommands();
+    for (SettingsTextCommand const& command : ofText)
+        lines += KeyLine(command.key, command.statusTip);
     return lines;
 }
 

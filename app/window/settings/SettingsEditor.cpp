@@ -4,14 +4,16 @@
 #include "app/window/settings/SettingsEditor.h"
 
 #include "app/settingsfile/SettingsFileReader.h"
+#include "app/settingsfile/SettingsFileWriter.h"
 #include "app/window/settings/FileNotice.h"
-#include "app/window/settings/MalformedFileView.h"
 #include "app/window/settings/SettingsFindBar.h"
+#include "app/window/settings/SettingsTextPage.h"
 #include "app/window/settings/SettingsTree.h"
 #include "app/window/settings/ValueDialog.h"
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
 
+#include <QFile>
 #include <QFileDialog>
 #include <QFileInfo>
 #include <QHBoxLayout>
@@ -24,6 +26,13 @@ namespace Velocor {
 
 namespace {
 
+QByteArray WholeFile(QString const& path)
+{
+    QFile file(path);
+    const bool isOpen = QFileInfo(path).isFile() && file.open(QIODevice::ReadOnly);
+    return isOpen ? file.readAll() : QByteArray();
+}
+
 // The maximum length of each name in the heading of a dialog, in characters.
 constexpr int MaximumTitlePartLength = 200;
 
@@ -34,7 +43,7 @@ SettingsEditor::SettingsEditor(QWidget* parent)
       m_comparison(&m_model, &m_commands, this), m_notice(new NoticeBar),
       m_fileNotice(new FileNotice), m_removal(new NoticeBar(tr("Removal"))),
       m_pages(new QStackedWidget), m_tree(new SettingsTree(&m_model, &m_commands)),
-      m_find(new SettingsFindBar(m_tree)), m_text(new MalformedFileView)
+      m_find(new SettingsFindBar(m_tree)), m_text(new SettingsTextPage)
 {
     m_pages->addWidget(makeTreePage());
     m_pages->addWidget(m_text);
@@ -60,6 +69,12 @@ void SettingsEditor::connectParts()
     connect(m_tree, &SettingsTree::editingChanged, this, &SettingsEditor::updateState);
     connect(m_tree, &SettingsTree::rejected, this, &SettingsEditor::messageReported);
     connect(m_tree, &SettingsTree::longValueRequested, this, &SettingsEditor::editLongValueSoon);
+    connect(m_tree, &SettingsTree::textRequested, this, &SettingsEditor::ShowAsText);
+    connect(m_text, &SettingsTextPage::settingsRequested, this, &SettingsEditor::ShowAsTree);
+    connect(m_text, &SettingsTextPage::saveRequested, this, &SettingsEditor::Save);
+    connect(m_text, &SettingsTextPage::stateChanged, this, &SettingsEditor::updateState);
+    connect(m_commands.undoStack(), &QUndoStack::indexChanged, this,
+            &SettingsEditor::noteTreeChange);
     connect(m_commands.undoStack(), &QUndoStack::indexChanged, m_removal, &NoticeBar::Dismiss);
     connect(m_commands.undoStack(), &QUndoStack::indexChanged, this, &SettingsEditor::updateState);
     connect(m_commands.undoStack(), &QUndoStack::cleanChanged, this, &SettingsEditor::updateState);
@@ -74,6 +89,7 @@ void SettingsEditor::connectParts()
 SettingsEditor::~SettingsEditor()
 {
     disconnect(m_tree, nullptr, this, nullptr);
+    disconnect(m_text, nullptr, this, nullptr);
     disconnect(m_commands.undoStack(), nullptr, this, nullptr);
     delete m_pages;
 }
@@ -126,11 +142,12 @@ void SettingsEditor::Open(QString const& path)
     m_saver.NoteRead(path, document);
     m_model.SetDocument(document.isParsed ? document : SettingsDocument());
     m_commands.undoStack()->clear();
+    m_hasTree = document.isParsed;
+    m_hasText = !document.isParsed;
     if (document.isParsed)
         showTree(document);
     else
         showMalformed(document);
-    m_fileNotice->SetComparable(document.isParsed);
     if (!m_ownerNote.isEmpty())
         m_notice->ShowMessage(m_ownerNote);
     updateState();
@@ -140,8 +157,15 @@ void SettingsEditor::Reload()
 {
     m_fileNotice->SetFile(m_path);
     const SettingsDocument document = SettingsFileReader::Read(m_path);
-    const bool canUndo = document.isParsed && m_pages->currentIndex() == TreePage &&
-                         document.rootName == m_model.document().rootName;
+    if (!ShowsTree() && m_text->isModified() && document.isReadable) {
+        m_text->Replace(WholeFile(m_path));
+        m_text->SetModified(false);
+        m_saver.NoteRead(m_path, document);
+        m_hasTree = false;
+        return;
+    }
+    const bool canUndo =
+        document.isParsed && ShowsTree() && document.rootName == m_model.document().rootName;
     if (!canUndo) {
         Open(m_path);
         return;
@@ -151,6 +175,7 @@ void SettingsEditor::Reload()
     m_commands.Replace(document, tr("Reload"));
     m_commands.undoStack()->setClean();
     m_saver.NoteRead(m_path, document);
+    m_hasText = false;
     m_tree->GoTo(m_model.IndexOf(place));
     m_tree->setFocus();
 }
@@ -183,8 +208,10 @@ void SettingsEditor::keepMine()
 {
     m_saver.AcceptFile();
     m_fileNotice->SetFile(m_path);
-    if (m_pages->currentIndex() == TreePage)
+    if (ShowsTree())
         m_commands.undoStack()->resetClean();
+    else if (!m_text->isReadOnly())
+        m_text->SetModified(true);
     setFocus();
 }
 
@@ -194,7 +221,11 @@ void SettingsEditor::saveAs()
         return;
     const QString path = QFileDialog::getSaveFileName(this, tr("Save Settings As"), m_path,
                                                       tr("Settings (*.cfg *.xml);;All files (*)"));
-    if (path.isEmpty() || !m_saver.SaveAs(path, document()))
+    if (path.isEmpty())
+        return;
+    const bool isSaved = ShowsTree() ? m_saver.SaveAs(path, document())
+                                     : m_saver.SaveTextAs(path, m_text->bytes(), m_text->parsed());
+    if (!isSaved)
         return;
     m_path = path;
     noteSaved();
@@ -204,7 +235,12 @@ void SettingsEditor::noteSaved()
 {
     m_notice->Dismiss();
     m_fileNotice->SetFile(m_path);
-    m_commands.undoStack()->setClean();
+    if (ShowsTree()) {
+        m_commands.undoStack()->setClean();
+        m_hasText = false;
+    } else {
+        m_text->SetModified(false);
+    }
     updateState();
     Q_EMIT saved();
     Q_EMIT messageReported(tr("Saved %1").arg(QFileInfo(m_path).fileName()));
@@ -214,8 +250,7 @@ void SettingsEditor::showTree(SettingsDocument const& document)
 {
     m_tree->ShowAll();
     updateButtons();
-    m_pages->setCurrentIndex(TreePage);
-    setFocusProxy(m_tree);
+    showPage(TreePage);
     if (document.lossCount > 0)
         m_notice->ShowMessage(
             document.lossCount == 1
@@ -229,9 +264,79 @@ void SettingsEditor::showMalformed(SettingsDocument const& document)
     if (document.line > 0)
         message += tr(" (line %1, column %2)").arg(document.line).arg(document.column);
     m_notice->ShowMessage(message);
-    m_text->ShowFile(m_path, document);
-    m_pages->setCurrentIndex(TextPage);
-    setFocusProxy(m_text);
+    m_text->Show(WholeFile(m_path), document);
+    m_shownText = m_text->bytes();
+    showPage(TextPage);
+}
+
+void SettingsEditor::showPage(Page page)
+{
+    const bool isTree = page == TreePage;
+    m_pages->setCurrentIndex(page);
+    setFocusProxy(isTree ? static_cast<QWidget*>(m_tree) : m_text);
+    m_fileNotice->SetComparable(isTree);
+}
+
+void SettingsEditor::noteTreeChange()
+{
+    m_treeChanged = true;
+}
+
+void SettingsEditor::ShowAsText()
+{
+    if (!ShowsTree() || !m_tree->EndEditing())
+        return;
+    const bool isChanged = m_hasText ? m_treeChanged : isModified();
+    const QByteArray content = SettingsFileWriter::ToBytes(document());
+    if (!m_hasText)
+        m_text->Show(WholeFile(m_path), SettingsFileReader::Read(m_path));
+    const bool isTooLarge = content.size() > SettingsTextPage::EditLimit;
+    if (isChanged && (m_text->isReadOnly() || isTooLarge)) {
+        Q_EMIT messageReported(tr("This file cannot be edited as text: save the changes first"));
+        return;
+    }
+    m_hasText = true;
+    if (isChanged)
+        m_text->Replace(content);
+    m_treeChanged = false;
+    m_shownText = m_text->bytes();
+    m_removal->Dismiss();
+    showPage(TextPage);
+    m_text->setFocus();
+    updateState();
+}
+
+void SettingsEditor::ShowAsTree()
+{
+    if (ShowsTree())
+        return;
+    const SettingsDocument parsed =
+        m_text->isReadOnly() ? SettingsFileReader::Read(m_path) : m_text->parsed();
+    const SettingsDocument settings = parsed.WithErrorAsLoss();
+    m_saver.NoteLosses(settings);
+    if (m_hasTree && m_text->bytes() == m_shownText) {
+        showPage(TreePage);
+    } else {
+        if (m_hasTree && settings.rootName == m_model.document().rootName) {
+            m_commands.Replace(settings, tr("Edit as Text"));
+            showPage(TreePage);
+        } else {
+            m_commands.undoStack()->clear();
+            m_model.SetDocument(settings);
+            m_notice->Dismiss();
+            showTree(settings);
+        }
+        // Even if both have the same values, one has to be asked before the text is lost.
+        if (m_text->isModified() || !parsed.isParsed)
+            m_commands.undoStack()->resetClean();
+        else
+            m_commands.undoStack()->setClean();
+    }
+    m_hasTree = true;
+    m_treeChanged = false;
+    m_shownText = m_text->bytes();
+    m_tree->setFocus();
+    updateState();
 }
 
 // Delayed, because the tree is still handling the key or click.
@@ -262,8 +367,15 @@ void SettingsEditor::editLongValue()
         m_commands.SetText(cell, dialog.value());
 }
 
+bool SettingsEditor::ShowsTree() const
+{
+    return m_pages->currentIndex() == TreePage;
+}
+
 bool SettingsEditor::isModified() const
 {
+    if (!ShowsTree())
+        return m_text->isModified();
     return !m_commands.undoStack()->isClean();
 }
 
@@ -286,8 +398,32 @@ void SettingsEditor::updateButtons()
     m_remove->setEnabled(hasRow);
 }
 
+bool SettingsEditor::CanUndo() const
+{
+    return ShowsTree() ? m_commands.undoStack()->canUndo() : m_text->canUndo();
+}
+
+bool SettingsEditor::CanRedo() const
+{
+    return ShowsTree() ? m_commands.undoStack()->canRedo() : m_text->canRedo();
+}
+
+QString SettingsEditor::UndoText() const
+{
+    return ShowsTree() ? m_commands.undoStack()->undoText() : QString();
+}
+
+QString SettingsEditor::RedoText() const
+{
+    return ShowsTree() ? m_commands.undoStack()->redoText() : QString();
+}
+
 void SettingsEditor::Undo()
 {
+    if (!ShowsTree()) {
+        m_text->Undo();
+        return;
+    }
     m_tree->EndEditing();
     m_commands.undoStack()->undo();
     m_tree->GoToChanged();
@@ -295,6 +431,10 @@ void SettingsEditor::Undo()
 
 void SettingsEditor::Redo()
 {
+    if (!ShowsTree()) {
+        m_text->Redo();
+        return;
+    }
     m_tree->EndEditing();
     m_commands.undoStack()->redo();
     m_tree->GoToChanged();
@@ -302,7 +442,7 @@ void SettingsEditor::Redo()
 
 QList<QAction*> SettingsEditor::commands() const
 {
-    return m_pages->currentIndex() == TreePage ? m_tree->commands() : QList<QAction*>();
+    return ShowsTree() ? m_tree->commands() : m_text->commands();
 }
 
 void SettingsEditor::AddOuterActions(QList<QAction*> const& actions)
@@ -312,14 +452,25 @@ void SettingsEditor::AddOuterActions(QList<QAction*> const& actions)
 
 bool SettingsEditor::Save()
 {
-    if (m_pages->currentIndex() != TreePage)
-        return false;
+    if (!ShowsTree())
+        return saveText();
     if (!m_tree->EndEditing())
         return false; // "Saved" would take the place of the reason
     if (!isModified())
         return true;
     if (!m_saver.Save(document()))
         return false;
+    noteSaved();
+    return true;
+}
+
+bool SettingsEditor::saveText()
+{
+    if (!m_text->isModified())
+        return !m_text->isReadOnly();
+    if (!m_saver.SaveText(m_text->bytes(), m_text->parsed()))
+        return false;
+    m_hasTree = false; // the next one is that of this text
     noteSaved();
     return true;
 }

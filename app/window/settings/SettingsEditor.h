@@ -17,16 +17,16 @@ class QStackedWidget;
 namespace Velocor {
 
 class FileNotice;
-class MalformedFileView;
 class NoticeBar;
 class SettingsFindBar;
+class SettingsTextPage;
 class SettingsTree;
 
 /// Edits a configuration file as a tree of sections, keys and values. Every change can be undone.
 ///
 /// Before the first save, the file is copied to ".bak". The user is asked before anything is lost
-/// by saving. A malformed file is shown as text, with the position of the error, and cannot be
-/// saved.
+/// by saving. A malformed file is shown as text, with the position of the error, to be mended; what
+/// can be read of it can be shown as a tree, and every file as text.
 ///
 /// A cell shows only the start of a long text, with its size. A long value is edited in a separate
 /// dialog, and a long name cannot be edited; both are saved in full.
@@ -65,6 +65,20 @@ public:
     /// Asks for another file, and shows it beside the settings here. Its values can be taken over.
     void CompareWithOther();
 
+    /// Shows the file as text, with the changes made here; in the text, what can be read of it as a
+    /// tree. Both can be undone.
+    void ShowAsText();
+    void ShowAsTree();
+
+    /// Whether there is a change to take back, or to make again, and what to call it after "Undo".
+    bool CanUndo() const;
+    bool CanRedo() const;
+    QString UndoText() const;
+    QString RedoText() const;
+
+    /// Whether the settings are shown as a tree, so that they can be compared.
+    bool ShowsTree() const;
+
     /// Takes back the last change, or makes it again, and goes there. Does nothing if there is
     /// none.
     void Undo();
@@ -79,7 +93,7 @@ public:
     /// The changes; not for changing.
     QUndoStack const* undoStack() const { return m_commands.undoStack(); }
 
-    /// The commands for the tree, for a menu; none for a malformed file. Owned by the editor.
+    /// The commands for the tree or the text, for a menu. Owned by the editor.
     QList<QAction*> commands() const;
 
     /// Puts actions of the window first in the context menu. Only the first call counts.
@@ -104,6 +118,9 @@ private:
     QPushButton* makeButton(QString const& text, QString const& toolTip);
     void showTree(SettingsDocument const& document);
     void showMalformed(SettingsDocument const& document);
+    void showPage(Page page);
+    void noteTreeChange();
+    bool saveText();
     void compareWithFile();
     void keepMine();
     void saveAs();
@@ -127,7 +144,11 @@ private:
     QStackedWidget* m_pages;
     SettingsTree* m_tree;
     SettingsFindBar* m_find;
-    MalformedFileView* m_text;
+    SettingsTextPage* m_text;
+    bool m_hasText = false;     ///< whether the text page has this file
+    bool m_hasTree = false;     ///< whether the tree has this file
+    bool m_treeChanged = false; ///< since the text was last shown
+    QByteArray m_shownText;     ///< when the text was last shown
     QPushButton* m_addSection = nullptr;
     QPushButton* m_addKey = nullptr;
     QPushButton* m_remove = nullptr;

@@ -25,6 +25,11 @@ void SettingsSaver::NoteRead(QString const& path, SettingsDocument const& docume
     m_path = path;
     m_hasBackup = false;
     m_read = QFileInfo(path).lastModified();
+    NoteLosses(document);
+}
+
+void SettingsSaver::NoteLosses(SettingsDocument const& document)
+{
     m_fileLosses = SettingsDocument::TextsOf(document.losses);
     m_fileLossCount = document.lossCount;
 }
@@ -88,12 +93,19 @@ void SettingsSaver::AcceptFile()
     m_read = QFileInfo(m_path).lastModified();
 }
 
-bool SettingsSaver::SaveAs(QString const& path, SettingsDocument const& document)
+// The file dialog has asked whether it may be overwritten.
+SettingsSaver SettingsSaver::saverOf(QString const& path) const
 {
     SettingsSaver other = *this;
     other.m_path = path;
     other.m_hasBackup = false;
-    other.AcceptFile(); // the file dialog has asked
+    other.AcceptFile();
+    return other;
+}
+
+bool SettingsSaver::SaveAs(QString const& path, SettingsDocument const& document)
+{
+    SettingsSaver other = saverOf(path);
     if (!other.Save(document))
         return false;
     *this = other;
@@ -105,16 +117,58 @@ bool SettingsSaver::Save(SettingsDocument const& document)
     if (!confirmOverwrite() || !confirmLosses(document) || !makeBackup())
         return false;
     QString error;
-    if (!SettingsFileWriter::Save(m_path, document, &error)) {
+    const bool isSaved = SettingsFileWriter::Save(m_path, document, &error);
+    if (!noteOutcome(isSaved, error))
+        return false;
+    NoteLosses(SettingsDocument());
+    return true;
+}
+
+bool SettingsSaver::confirmMalformed(SettingsDocument const& parsed)
+{
+    if (parsed.isParsed)
+        return true;
+    return ask(QObject::tr("Programs cannot read all of %1 yet.").arg(name()),
+               QObject::tr("Line %1, column %2: %3")
+                   .arg(parsed.line)
+                   .arg(parsed.column)
+                   .arg(Shortened(parsed.error, MaximumLossLength)),
+               QObject::tr("Save Anyway"));
+}
+
+bool SettingsSaver::SaveText(QByteArray const& text, SettingsDocument const& parsed)
+{
+    if (!confirmOverwrite() || !confirmMalformed(parsed) || !makeBackup())
+        return false;
+    QString error;
+    const bool isSaved = SettingsFileWriter::SaveBytes(m_path, text, &error);
+    if (!noteOutcome(isSaved, error))
+        return false;
+    NoteLosses(parsed);
+    return true;
+}
+
+bool SettingsSaver::SaveTextAs(QString const& path, QByteArray const& text,
+                               SettingsDocument const& parsed)
+{
+    SettingsSaver other = saverOf(path);
+    if (!other.SaveText(text, parsed))
+        return false;
+    *this = other;
+    return true;
+}
+
+// Tells the user of a failure.
+bool SettingsSaver::noteOutcome(bool isSaved, QString const& error)
+{
+    if (isSaved) {
+        AcceptFile();
+    } else {
         PlainMessageBox(QMessageBox::Critical, m_parent,
                         QObject::tr("Could not save %1.\n%2").arg(m_path, error))
             .exec();
-        return false;
     }
-    AcceptFile();
-    m_fileLosses.clear();
-    m_fileLossCount = 0;
-    return true;
+    return isSaved;
 }
 
 } // namespace Velocor

@@ -36,6 +36,18 @@ public:
     /// @return false if the user cancels, or saving failed, which the user was told
     bool Save(SettingsDocument const& document);
 
+    /// Saves a text to the file, as it is. Asks first if it cannot be parsed.
+    ///
+    /// @param parsed  what reading the text results in
+    /// @return as Save()
+    bool SaveText(QByteArray const& text, SettingsDocument const& parsed);
+
+    /// As SaveAs(), with a text.
+    bool SaveTextAs(QString const& path, QByteArray const& text, SettingsDocument const& parsed);
+
+    /// What saving a document of this file would lose, as for NoteRead().
+    void NoteLosses(SettingsDocument const& document);
+
     /// How much of the file, as it was last read, saving would lose.
     int lossCount() const { return m_fileLossCount; }
 
@@ -43,7 +55,10 @@ private:
     bool confirmLosses(SettingsDocument const& document);
     bool confirmOverwrite();
     bool ask(QString const& text, QString const& details, QString const& acceptText);
+    bool confirmMalformed(SettingsDocument const& parsed);
     bool makeBackup();
+    bool noteOutcome(bool isSaved, QString const& error);
+    SettingsSaver saverOf(QString const& path) const;
     QString name() const;
 
     QWidget* m_parent;

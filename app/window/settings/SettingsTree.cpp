@@ -72,6 +72,8 @@ QVector<SettingsCommand> SettingsTree::AllCommands()
         {tr("Find Ne&xt"), keys("F3"), tr("Go to the next match"), &SettingsTree::FindNext},
         {tr("Find &Previous"), keys("Shift+F3"), tr("Go to the previous match"),
          &SettingsTree::FindPrevious},
+        {tr("Edit as &Text"), keys("Ctrl+T"), tr("Edit the file as text"),
+         &SettingsTree::EditAsText},
     };
 }
 
@@ -101,13 +103,14 @@ void SettingsTree::AddOuterActions(QList<QAction*> const& actions)
     insertAction(m_actions.first(), separator);
 }
 
-// Without a current row, only a section can be added.
+// Without a current row, there is nothing to change or to find.
 void SettingsTree::updateActions()
 {
     const bool hasRow = currentIndex().isValid();
     const QVector<SettingsCommand> all = AllCommands();
     for (int i = 0; i < m_actions.size(); ++i)
-        m_actions.at(i)->setEnabled(hasRow || all.at(i).work == &SettingsTree::AddSection);
+        m_actions.at(i)->setEnabled(hasRow || all.at(i).work == &SettingsTree::AddSection ||
+                                    all.at(i).work == &SettingsTree::EditAsText);
 }
 
 // Keys that a field does not use arrive here, too.
@@ -183,6 +186,11 @@ void SettingsTree::FindNext()
 void SettingsTree::FindPrevious()
 {
     Q_EMIT findNextRequested(-1);
+}
+
+void SettingsTree::EditAsText()
+{
+    Q_EMIT textRequested();
 }
 
 bool SettingsTree::isEditing() const

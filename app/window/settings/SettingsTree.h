@@ -78,6 +78,7 @@ public:
     void OpenFind();
     void FindNext();
     void FindPrevious();
+    void EditAsText();
 
     void keyboardSearch(QString const& search) override;
 
@@ -97,6 +98,9 @@ Q_SIGNALS:
     /// The user wants to find a text, or the next match in a direction.
     void findRequested();
     void findNextRequested(int step);
+
+    /// The user wants to edit the file as text.
+    void textRequested();
 
     /// The current value is to be edited, which is too long for its cell.
     void longValueRequested();
