@@ -3,13 +3,16 @@
 
 # Which Qt to build with.
 #
-#   VELOCOR_QT          5 or 6: that of the project around this one, or else 5 if it is installed
+#   VELOCOR_QT          5 or 6: what the project around this one has already found, or else 5 if it is
+#                       installed
 #   VELOCOR_QT_PACKAGE  with its version, for find_package()
 #   VELOCOR_QT_XML      the libraries with Qt's XML classes, which Qt 6 has moved
 
 if(NOT VELOCOR_QT)
     if(QT_VERSION_MAJOR AND NOT VELOCOR_IS_TOP_LEVEL)
         set(found_qt ${QT_VERSION_MAJOR})
+    elseif(TARGET Qt6::Core AND NOT TARGET Qt5::Core)
+        set(found_qt 6) # find_package(Qt6) does not set QT_VERSION_MAJOR
     else()
         find_package(Qt5 5.9 QUIET COMPONENTS Core)
         if(Qt5_FOUND)
