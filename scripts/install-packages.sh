@@ -30,7 +30,10 @@ packages_of() {
     */build) echo g++ cmake ninja-build qtbase5-dev librapidxml-dev ;;
     */qt6) echo qt6-base-dev qt6-5compat-dev ;;
     */wayland) echo qtwayland5 ;;
-    */test) echo xvfb xauth shared-mime-info pkg-config valgrind doxygen locales-all ;;
+    */test)
+        echo xvfb xauth shared-mime-info pkg-config valgrind doxygen locales-all dpkg-dev \
+            desktop-file-utils
+        ;;
     */bench)
         echo python3 xvfb xauth shared-mime-info libbenchmark-dev libspdlog-dev liblog4cplus-dev \
             liblog4cxx-dev libboost-dev libboost-log-dev libgoogle-glog-dev libkf5config-dev \

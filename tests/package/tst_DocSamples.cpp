@@ -43,10 +43,16 @@ private slots:
     void xmlReaderIsTheProgram();
     void xmlReader_data();
     void xmlReader();
+    void orderReaderIsTheProgram();
+    void orderReader_data();
+    void orderReader();
     void namedTestsExist_data();
     void namedTestsExist();
     void linkedFilesExist_data();
     void linkedFilesExist();
+
+private:
+    static void runReader(QString const& reader);
 };
 
 namespace {
@@ -281,6 +287,12 @@ void tst_DocSamples::xmlReader_data()
 
 void tst_DocSamples::xmlReader()
 {
+    runReader(TITLE_READER);
+}
+
+// Runs the program on the row's document.
+void tst_DocSamples::runReader(QString const& reader)
+{
     QFETCH(QString, document);
     QFETCH(QString, output);
     QFETCH(QString, errors);
@@ -289,11 +301,48 @@ void tst_DocSamples::xmlReader()
     QVERIFY(TestFiles::write(path, document.toUtf8()));
 
     QProcess program;
-    program.start(TITLE_READER, {path});
+    program.start(reader, {path});
     QVERIFY(program.waitForFinished());
     QCOMPARE(QString::fromUtf8(program.readAllStandardError()), errors);
     QCOMPARE(QString::fromUtf8(program.readAllStandardOutput()), output);
     QCOMPARE(program.exitCode(), errors.isEmpty() ? 0 : 1);
+}
+
+void tst_DocSamples::orderReaderIsTheProgram()
+{
+    const QString program = Read("tests/package/OrderReader.cpp");
+    QCOMPARE(program.mid(program.indexOf("#include")), Sample("start-here.md", "order-reader"));
+}
+
+void tst_DocSamples::orderReader_data()
+{
+    QTest::addColumn<QString>("document");
+    QTest::addColumn<QString>("output");
+    QTest::addColumn<QString>("errors");
+
+    const QString heading = "Failed to parse the XML content:\n";
+    const auto row = [&heading](char const* name, char const* document, char const* errors) {
+        QTest::newRow(name) << QString(document) << QString() << heading + errors;
+    };
+    QTest::newRow("counts") << "<order>\n<item count='2'>A</item>\n<item count='3'/></order>"
+                            << "5 pieces\n"
+                            << QString();
+    QTest::newRow("only the first of two wrong attributes")
+        << "<order>\n  <item count=\"2\"/>\n  <item count=\"none\"/>\n  <item count='0'/></order>"
+        << QString() << Sample("start-here.md", "order-reader-attribute");
+    row("end of an element", "<order>\n  <item/>pens</order>",
+        "Line 2, column 8: an item without a count\n");
+    row("text", "<order>\n  pens<!-- -->and pens</order>",
+        "Line 2, column 7: text between the items: pens\n");
+    row("unknown element", "<order>\n <pen/></order>",
+        "Error: 1016 Unknown element \"pen\". Parse state element \"order\".\n"
+        "Line 2, column 6: error triggered by consumer\n");
+    row("malformed", "<order>\n</orders>", "Line 2, column 9: tag mismatch\n");
+}
+
+void tst_DocSamples::orderReader()
+{
+    runReader(ORDER_READER);
 }
 
 // As "tst_Class::function(row)" or "tst_Class::function".
