@@ -60,7 +60,7 @@ bool IsNoPlaceholder(QString const& text)
 {
     static const QRegularExpression placeholders(
         QStringLiteral("\\A(?:[*.x?-]*|\\(?(?:null|nil|none|empty|unset|set|true|false|yes|no|"
-                       "undefined|hidden|redacted)\\)?)[.,;]?\\z"),
+                       "undefined|hidden|redacted|left out)\\)?)[.,;]?\\z"),
         QRegularExpression::CaseInsensitiveOption);
     return !placeholders.match(text).hasMatch();
 }
