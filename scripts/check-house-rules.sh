@@ -106,7 +106,7 @@ other_words_for_qt() {
 
 # The framework links Qt Widgets, so the compiler would let the rooms below the window use it.
 widgets_below_the_window() {
-    tracked 'app/logfile/*' 'app/history/*' 'app/terminal/*' 'app/settingsfile/*' 'app/runninglog/*' |
+    tracked 'app/logfile/*' 'app/history/*' 'app/report/*' 'app/terminal/*' 'app/settingsfile/*' 'app/runninglog/*' |
         search -nHP '^\s*#\s*include\s*<(Qt(Gui|Widgets)\b|Q\w*(Widget|Dialog|Color|Font|Icon|Image|Pixmap|Paint|Palette|Screen|Style|Menu|Label|Button|Layout|MessageBox|Window|Clipboard|GuiApplication)|QApplication)'
 }
 

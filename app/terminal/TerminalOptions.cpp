@@ -90,7 +90,8 @@ Parser::Parser()
 {
     m_parser.setApplicationDescription(QObject::tr(
         "Prints log files, or the logs of programs with all of their runs, oldest "
-        "first. Without arguments, lists the programs and their runs.\n\n"
+        "first. Without arguments, lists the programs and their runs. \"velocor-log report\" "
+        "saves a report of a problem; see \"velocor-log report --help\".\n\n"
         "A TIME is a date, a time or both (2026-11-20, 14:03, \"2026-11-20 14:03\"), or "
         "an interval until now such as -2h, -30m or -1d."));
     m_parser.addOption({{Name("h"), Name("help")}, QObject::tr("Print this help and exit.")});

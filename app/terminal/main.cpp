@@ -8,6 +8,7 @@
 #include "app/terminal/LogFollower.h"
 #include "app/terminal/LogSources.h"
 #include "app/terminal/OutputBuffer.h"
+#include "app/terminal/ReportCommand.h"
 #include "app/terminal/RunTable.h"
 #include "app/terminal/TerminalOptions.h"
 #include "app/terminal/TextFormats.h"
@@ -242,21 +243,36 @@ int Command::run()
     return m_isFound ? Found : NothingFound;
 }
 
+int Print(QByteArray const& answer)
+{
+    OutputBuffer output;
+    output.Write(answer);
+    return output.Flush() ? Found : Trouble;
+}
+
+int MakeReport(QStringList const& arguments)
+{
+    const ReportCommand command(arguments);
+    if (command.error().isEmpty())
+        return Print(command.answer());
+    PrintError(command.error());
+    return Trouble;
+}
+
 } // namespace
 
 int main(int argc, char** argv)
 {
     const QCoreApplication application(argc, argv);
     AppPaths::SetOrganizationAndProduct();
+    if (QCoreApplication::arguments().value(1) == QLatin1String("report"))
+        return MakeReport(QCoreApplication::arguments().mid(1));
     TerminalOptions options = TerminalOptions::Parse(QCoreApplication::arguments());
     if (!options.error.isEmpty()) {
         PrintError(options.error);
         return Trouble;
     }
-    if (!options.answer.isEmpty()) {
-        OutputBuffer output;
-        output.Write(options.answer);
-        return output.Flush() ? Found : Trouble;
-    }
+    if (!options.answer.isEmpty())
+        return Print(options.answer);
     return Command(std::move(options)).run();
 }

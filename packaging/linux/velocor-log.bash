@@ -18,12 +18,18 @@ _velocor_log() {
         ;;
     --since | --until | --match | --exclude | --context) return ;;
     esac
+    if [[ ${COMP_WORDS[1]} == report && $COMP_CWORD -gt 1 ]]; then
+        mapfile -t COMPREPLY < <(compgen -W '--without --hide --help' -- "$current")
+        [[ $current == -* ]] || mapfile -t COMPREPLY < <(compgen -f -- "$current")
+        return
+    fi
     if [[ $current == -* ]]; then
         mapfile -t COMPREPLY < <(compgen -W '--merge --since --until --severity --match --exclude
             --context --follow --runs --patterns --program --format --help --version' -- "$current")
         return
     fi
     mapfile -t COMPREPLY < <(compgen -f -- "$current")
+    [[ $COMP_CWORD -gt 1 || report != "$current"* ]] || COMPREPLY+=(report)
     for name in "$data"/*/logs; do
         name=${name%/logs}
         name=${name##*/}

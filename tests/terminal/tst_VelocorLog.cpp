@@ -47,6 +47,9 @@ private slots:
     void noPrograms();
     void documented_data();
     void documented();
+    void report();
+    void refusedReport_data();
+    void refusedReport();
     void relativeTimes();
     void standardInput();
     void compressedInput();
@@ -359,9 +362,71 @@ void tst_VelocorLog::documented()
             all.insert(match.next().captured());
         return all;
     };
-    const QSet<QString> known = options(run({"--help"}).output);
-    QVERIFY(known.contains("--merge"));
+    const QSet<QString> known = options(run({"--help"}).output + run({"report", "--help"}).output);
+    QVERIFY(known.contains("--merge") && known.contains("--hide"));
     QCOMPARE(options(TestFiles::read(file)), known);
+}
+
+// Of the window's program, which need not be able to start, without a display.
+void tst_VelocorLog::report()
+{
+    QTemporaryDir folder;
+    QProcessEnvironment environment = PrivateEnvironment(folder.path());
+    environment.insert("USER", "quentin");
+    const QString data = folder.filePath("data/yourorganization/yourproduct/");
+    QVERIFY(TestFiles::write(data + "logs/velocor.log",
+                             "2026-11-20 09:00:00.001 Error quentin in " +
+                                 folder.filePath("home").toUtf8() + " by a@x.org, secretly\n"));
+    QVERIFY(TestFiles::write(data + "logs/logsettings.cfg", "<LogSettings></LogSettings>"));
+    QVERIFY(TestFiles::write(data + "velocor.cfg", "damaged <password>hunter2"));
+    const QString path = folder.filePath("report");
+    const ProgramResult result =
+        RunProgram(VELOCOR_LOG, {"report", path, "--hide", "secretly"}, environment);
+    QCOMPARE(result.errors, QByteArray());
+    QCOMPARE(result.exitCode, 0);
+    QCOMPARE(result.output, path.toLocal8Bit() + "\n");
+    const QByteArray line =
+        "2026-11-20 09:00:00.001 Error <user-1> in <home> by <mail-1>, <word-1>\n";
+    QCOMPARE(TestFiles::read(path + "/last-run.log"), line);
+    QCOMPARE(TestFiles::read(path + "/settings/velocor.cfg"),
+             QByteArray("damaged <password>(left out)"));
+    QVERIFY(QFile::exists(path + "/settings/logsettings.cfg"));
+    const QByteArray text = TestFiles::read(path + "/report.md");
+    for (QByteArray const& part :
+         {QByteArray("\nProgram: Velocor "), QByteArray("\nProduct: yourproduct\n"),
+          "## Problems\n\n```text\n" + line + "```\n", QByteArray("| names of users | 1 | ")})
+        QVERIFY2(text.contains(part), text);
+
+    const QString lesser = folder.filePath("lesser");
+    QCOMPARE(RunProgram(VELOCOR_LOG, {"report", lesser, "--without", "runs,settings"}, environment)
+                 .exitCode,
+             0);
+    QCOMPARE(QDir(lesser).entryList(QDir::AllEntries | QDir::NoDotAndDotDot),
+             QStringList({"report.md", "settings"}));
+    QVERIFY(!QFile::exists(lesser + "/settings/velocor.cfg"));
+}
+
+void tst_VelocorLog::refusedReport_data()
+{
+    QTest::addColumn<QString>("arguments");
+    QTest::addColumn<QString>("error");
+    QTest::newRow("existing folder") << "report /"
+                                     << "Could not save /: It exists";
+    QTest::newRow("unknown part") << "report --without x"
+                                  << "Not a part of a report: x";
+    QTest::newRow("two") << "report a b"
+                         << "Only one report at a time.";
+    QTest::newRow("unknown option") << "report --merge"
+                                    << "Unknown option 'merge'.";
+}
+
+void tst_VelocorLog::refusedReport()
+{
+    QFETCH(QString, arguments);
+    QFETCH(QString, error);
+    const ProgramResult result = run(Words(arguments));
+    QCOMPARE(result.exitCode, 2);
+    QCOMPARE(QString(result.errors), "velocor-log: " + error + "\n");
 }
 
 void tst_VelocorLog::relativeTimes()

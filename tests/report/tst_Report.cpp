@@ -1,0 +1,291 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/history/RunEnds.h"
+#include "app/report/Report.h"
+#include "app/report/ReportReader.h"
+#include "app/report/ZipArchive.h"
+#include "support/TestFiles.h"
+
+#include <QProcess>
+#include <QStandardPaths>
+#include <QTemporaryDir>
+#include <QtTest>
+
+using namespace Velocor;
+
+namespace {
+
+// Entries of one run, a second apart, some of them problems.
+QByteArray Run(int hour, int count, QList<int> const& problems)
+{
+    QByteArray run;
+    for (int i = 0; i < count; ++i)
+        run += QString("2026-11-20 %1:%2:%3.001 %4 entry %5\n")
+                   .arg(hour, 2, 10, QChar('0'))
+                   .arg(i / 60, 2, 10, QChar('0'))
+                   .arg(i % 60, 2, 10, QChar('0'))
+                   .arg(problems.contains(i) ? "Warning" : "Trace")
+                   .arg(i)
+                   .toLatin1();
+    return run;
+}
+
+QStringList Split(QString const& text, char separator)
+{
+    QStringList parts = text.split(separator);
+    parts.removeAll("");
+    return parts;
+}
+
+// The numbers of the entries in a text, and "|" for each gap.
+QString Numbers(QString const& text)
+{
+    QStringList numbers;
+    for (QString const& line : Split(text, '\n'))
+        numbers.append(line == "..." ? QString("|") : line.section(' ', -1));
+    return numbers.join(' ');
+}
+
+QString Range(int first, int last)
+{
+    QStringList numbers;
+    for (int i = first; i <= last; ++i)
+        numbers.append(QString::number(i));
+    return numbers.join(' ');
+}
+
+} // namespace
+
+class tst_Report : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void archive();
+    void secretValues_data();
+    void secretValues();
+    void settings();
+    void problems_data();
+    void problems();
+    void problemsOfOtherRuns();
+    void runs();
+    void longRun();
+    void noLog();
+    void savedFolder();
+    void savedArchive();
+    void codeBlocks();
+};
+
+// By somebody else's reader.
+void tst_Report::archive()
+{
+    if (QStandardPaths::findExecutable("python3").isEmpty())
+        QSKIP("no python3");
+    const QTemporaryDir folder;
+    ZipArchive archive;
+    archive.Add("report.md", "text\n");
+    archive.Add(QString::fromUtf8("ö/empty"), "");
+    archive.Add("zeros", QByteArray(100000, '\0'));
+    QVERIFY(archive.Bytes().size() < 1000);
+    QVERIFY(TestFiles::write(folder.filePath("a.zip"), archive.Bytes()));
+    QProcess reader;
+    reader.start(
+        "python3",
+        {"-c",
+         "import sys, zipfile\n"
+         "archive = zipfile.ZipFile(sys.argv[1])\n"
+         "assert archive.testzip() is None\n"
+         "for name in archive.namelist():\n"
+         "    print(ascii(name), len(archive.read(name)), sorted(set(archive.read(name))))\n",
+         folder.filePath("a.zip")});
+    QVERIFY(reader.waitForFinished(60000));
+    QCOMPARE(
+        QString(reader.readAllStandardOutput()),
+        QString("'report.md' 5 [10, 101, 116, 120]\n'\\xf6/empty' 0 []\n'zeros' 100000 [0]\n"));
+}
+
+void tst_Report::secretValues_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QString>("expected");
+    const auto row = [](char const* name, char const* text, char const* expected) {
+        QTest::newRow(name) << QString(text) << QString(expected);
+    };
+    row("element", "<a><password>x</password><b>y</b></a>",
+        "<a><password>(left out)</password><b>y</b></a>");
+    row("CDATA", "<apiKey><![CDATA[x<]]></apiKey>y", "<apiKey>(left out)</apiKey>y");
+    row("section", "<token>\n<a>x</a>\n</token>y", "<token>(left out)</token>y");
+    row("attribute", "<arg key=\"password\">x</arg><arg key=\"product\">y</arg>",
+        "<arg key=\"password\">(left out)</arg><arg key=\"product\">y</arg>");
+    row("without its end", "<a><pwd>x</pw></a>", "<a><pwd>(left out)");
+    row("empty element", "<password/><b>y</b>", "<password/><b>y</b>");
+    row("two", "<pwd>x</pwd><pwd>y</pwd>", "<pwd>(left out)</pwd><pwd>(left out)</pwd>");
+    row("none", "<columns>1,2</columns> < & >", "<columns>1,2</columns> < & >");
+}
+
+void tst_Report::secretValues()
+{
+    QFETCH(QString, text);
+    QTEST(ReportReader::WithoutSecretValues(text), "expected");
+}
+
+void tst_Report::settings()
+{
+    const QTemporaryDir folder;
+    QVERIFY(TestFiles::write(folder.filePath("a.cfg"), "<x><pwd>1</pwd>\xe4</x>"));
+    const ReportPart part = ReportReader::Settings(
+        "T", {folder.filePath("a.cfg"), folder.filePath("none.cfg"), folder.path()});
+    QCOMPARE(part.title, QString("T"));
+    QCOMPARE(part.text, QString("settings/a.cfg: 20 bytes\n"));
+    QCOMPARE(part.files.size(), 1);
+    QCOMPARE(part.files[0].name, QString("settings/a.cfg"));
+    QCOMPARE(part.files[0].text, QString::fromUtf8("<x><pwd>(left out)</pwd>ä</x>"));
+    QCOMPARE(ReportReader::Settings("T", {}).text, QString("There are none.\n"));
+}
+
+void tst_Report::problems_data()
+{
+    QTest::addColumn<QString>("problems");
+    QTest::addColumn<QString>("expected");
+    QTest::newRow("none") << ""
+                          << "None.";
+    QTest::newRow("in the middle") << "50" << Range(40, 60);
+    QTest::newRow("first") << "0" << Range(0, 10);
+    QTest::newRow("last") << "99" << Range(89, 99);
+    QTest::newRow("close to each other") << "20 40" << Range(10, 50);
+    QTest::newRow("neighbors meet") << "20 41" << Range(10, 51);
+    QTest::newRow("a gap") << "20 42" << Range(10, 30) + " | " + Range(32, 52);
+}
+
+void tst_Report::problems()
+{
+    QFETCH(QString, problems);
+    QList<int> numbers;
+    for (QString const& number : Split(problems, ' '))
+        numbers.append(number.toInt());
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("app.log");
+    QVERIFY(TestFiles::write(log, Run(9, 100, numbers)));
+    QTEST(Numbers(ReportReader::Log(log).at(1).text), "expected");
+}
+
+// Their neighbors are of the same run; only the last ones are in the report; an entry has all
+// lines.
+void tst_Report::problemsOfOtherRuns()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("app.log");
+    QVERIFY(TestFiles::write(log + ".1", Run(7, 20, {19})));
+    QVERIFY(TestFiles::write(log, Run(9, 20, {}) + "second line\n"));
+    QCOMPARE(Numbers(ReportReader::Log(log).at(1).text), Range(9, 19));
+    QVERIFY(TestFiles::write(log, Run(9, 20, {0}) + "second line\n"));
+    QCOMPARE(Numbers(ReportReader::Log(log).at(1).text), Range(9, 19) + " | " + Range(0, 10));
+    QVERIFY(TestFiles::write(log, Run(9, 20, {19}) + "second line\n"));
+    QVERIFY(ReportReader::Log(log).at(1).text.endsWith("entry 19\nsecond line\n"));
+
+    QList<int> many;
+    for (int i = 0; i < ReportReader::MaximumProblems + 1; ++i)
+        many.append(30 * i);
+    QVERIFY(QFile::remove(log + ".1"));
+    QVERIFY(TestFiles::write(log, Run(9, 3000, many)));
+    QVERIFY(Numbers(ReportReader::Log(log).at(1).text).startsWith("20 21 "));
+}
+
+void tst_Report::runs()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("logs/app.log");
+    QVERIFY(TestFiles::write(log + ".2", Run(7, 5, {})));
+    QVERIFY(TestFiles::write(log + ".1", Run(8, 4, {1, 2})));
+    QVERIFY(TestFiles::write(log, Run(9, 3, {})));
+    QVERIFY(TestFiles::write(RunEnds::RecordFileOf(log),
+                             "2026-11-20T07:59:59.000 2026-11-20T08:30:00.000 abnormal\n"
+                             "2026-11-20T08:59:59.000 2026-11-20T09:30:00.000 normal\n"));
+    const ReportPart part = ReportReader::Log(log).at(0);
+    QCOMPARE(part.text,
+             QString("The last run (last-run.log): from 2026-11-20T09:00:00.001 to "
+                     "2026-11-20T09:00:02.001, 3 lines, problems: 0; it ended normally\n"
+                     "The run before (run-before.log): from 2026-11-20T08:00:00.001 to "
+                     "2026-11-20T08:00:03.001, 4 lines, problems: 2; it was killed or crashed\n"));
+    QCOMPARE(part.files.size(), 2);
+    QCOMPARE(part.files[0].text, QString(Run(9, 3, {})));
+    QCOMPARE(part.files[1].name, QString("run-before.log"));
+    QCOMPARE(part.files[1].text, QString(Run(8, 4, {1, 2})));
+}
+
+void tst_Report::longRun()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("app.log");
+    const QByteArray longLine =
+        "2026-11-20 12:00:00.001 Trace " + QByteArray(2 * ReportReader::LineLimit, 'x') + "\n";
+    QVERIFY(TestFiles::write(log, Run(9, ReportReader::MaximumRunLines, {}) + longLine));
+    const QString text = ReportReader::Log(log).at(0).files[0].text;
+    QCOMPARE(text.count('\n'), int(ReportReader::MaximumRunLines));
+    QVERIFY(text.startsWith("2026-11-20 09:00:01.001"));
+    QCOMPARE(text.section('\n', -2, -2),
+             QString(longLine.left(ReportReader::LineLimit)) + QChar(0x2026));
+}
+
+void tst_Report::noLog()
+{
+    QCOMPARE(ReportReader::Log("").at(0).text, QString("The log is empty.\n"));
+    QCOMPARE(ReportReader::Log("").at(0).files.size(), 0);
+    QCOMPARE(ReportReader::Log("").at(1).text, QString("None.\n"));
+}
+
+void tst_Report::savedFolder()
+{
+    const QTemporaryDir folder;
+    Redactor redactor;
+    redactor.AddSecret(SecretKind::UserName, "ada");
+    const Report report(
+        {{"One", "ada a@x.org\n", {{"sub/1.log", "A@x.org b@x.org ada\n"}}}, {"Two", "x\n", {}}},
+        redactor);
+    const QString path = folder.filePath("report");
+    QCOMPARE(report.Save(path), QString());
+    QCOMPARE(TestFiles::read(path + "/sub/1.log"), QByteArray("<mail-1> <mail-2> <user-1>\n"));
+    const QByteArray text = TestFiles::read(path + "/report.md");
+    QVERIFY2(text.startsWith("# Report\n\nCreated 2"), text);
+    QVERIFY2(text.endsWith(
+                 "Z\n\n## One\n\n```text\n<user-1> <mail-1>\n```\n\n## Two\n\n```text\nx\n```\n"
+                 "\n## Replaced by placeholders\n\n"
+                 "| what | different | places |\n|---|---|---|\n"
+                 "| names of users | 1 | 2 |\n| mail addresses | 2 | 3 |\n"),
+             text);
+    QCOMPARE(report.Save(path), QString("It exists"));
+    QVERIFY(TestFiles::write(folder.filePath("file"), "old"));
+    QCOMPARE(report.Save(folder.filePath("file")), QString("It exists"));
+    QVERIFY(!report.Save(folder.filePath("file/report")).isEmpty());
+    QCOMPARE(TestFiles::read(folder.filePath("file")), QByteArray("old"));
+
+    redactor.SetShown(1, true);
+    QCOMPARE(Report::Replaced(Report({{"a@x.org", "", {}}}, redactor).files(), redactor),
+             QString("\n## Replaced by placeholders\n\nNothing.\n"));
+}
+
+void tst_Report::savedArchive()
+{
+    const QTemporaryDir folder;
+    Redactor redactor;
+    const Report report({{"One", "x\n", {}}}, redactor);
+    ZipArchive archive;
+    archive.Add("report.md", report.files().front().content.text.toUtf8());
+    QCOMPARE(report.Save(folder.filePath("r.ZIP")), QString());
+    QCOMPARE(TestFiles::read(folder.filePath("r.ZIP")), archive.Bytes());
+    QCOMPARE(report.Save(folder.filePath("r.ZIP")), QString());
+    QVERIFY(QDir(folder.path()).mkdir("d.zip"));
+    QCOMPARE(report.Save(folder.filePath("d.zip")), QString("Not a regular file"));
+}
+
+// No text ends its block.
+void tst_Report::codeBlocks()
+{
+    Redactor redactor;
+    const Report report({{"One", "a\n```\nb", {}}}, redactor);
+    QVERIFY(report.files().front().content.text.contains("\n````text\na\n```\nb\n````\n"));
+}
+
+QTEST_GUILESS_MAIN(tst_Report)
+#include "tst_Report.moc"
