@@ -1,0 +1,221 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// Marks of this process; tst_RunExits has those of programs that ended.
+
+#include "app/runninglog/RunMark.h"
+
+#include "app/history/HistoryTime.h"
+#include "app/history/RunEnds.h"
+#include "app/history/RunMarkFile.h"
+#include "support/OpenFiles.h"
+#include "support/TestFiles.h"
+
+#include <QTemporaryDir>
+#include <QtTest>
+
+#include <fcntl.h>
+#include <unistd.h>
+
+using namespace Velocor;
+
+namespace {
+
+// As one that a program left behind that began then.
+bool LeaveBehind(QString const& path, qint64 start)
+{
+    QDir().mkpath(QFileInfo(path).path());
+    const int file = ::open(QFile::encodeName(path).constData(), O_WRONLY | O_CREAT, 0666);
+    const QByteArray text = RunMarkFile::TextFor(start, file);
+    const bool isWritten = ::write(file, text.constData(), size_t(text.size())) == text.size();
+    ::close(file);
+    return isWritten;
+}
+
+} // namespace
+
+class tst_RunMark : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void init();
+    void oneLife();
+    void noLog();
+    void noFolder();
+    void secondMark();
+    void othersAreUsingTheFolder();
+    void collects_data();
+    void collects();
+    void recordThatCannotBeWritten_data();
+    void recordThatCannotBeWritten();
+    void recordIsShortened_data();
+    void recordIsShortened();
+
+private:
+    QString folder() const { return RunEnds::MarkFolderOf(m_log); }
+    QString record() const { return RunEnds::RecordFileOf(m_log); }
+
+    std::unique_ptr<QTemporaryDir> m_folder;
+    QString m_log;
+};
+
+void tst_RunMark::init()
+{
+    m_folder = std::make_unique<QTemporaryDir>();
+    m_log = m_folder->filePath("logs/app.log");
+}
+
+void tst_RunMark::oneLife()
+{
+    const int before = openFileCount();
+    {
+        const RunMark mark(m_log);
+        const QStringList names = RunMarkFile::NamesIn(folder());
+        QCOMPARE(names, QStringList(RunMarkFile::NameFor(RunMark::ProgramStart())));
+        const RunMarkFile file(folder() + '/' + names[0]);
+        QCOMPARE(file.state(), RunMarkFile::Held);
+        QCOMPARE(file.start(), RunMark::ProgramStart());
+        QVERIFY(!QFile::exists(record()));
+        QCOMPARE(openFileCount(), before + 1);
+    }
+    QCOMPARE(openFileCount(), before);
+    QVERIFY(!QFile::exists(folder()));
+    const std::vector<RunEnd> ends = RunEnds::Of(m_log);
+    QCOMPARE(ends.size(), size_t(1));
+    QCOMPARE(ends[0].exit, HistoryRun::Normal);
+    QCOMPARE(ends[0].start, RunMark::ProgramStart());
+    QVERIFY(ends[0].end >= ends[0].start && ends[0].end <= HistoryTime::Now());
+    const qint64 now = HistoryTime::Now();
+    QVERIFY(RunMark::ProgramStart() <= now && RunMark::ProgramStart() > now - 3600 * 1000);
+}
+
+void tst_RunMark::noLog()
+{
+    RunMark(QString()).CollectOthers();
+    RunMark(m_folder->filePath("app.log")).CollectOthers(); // in no folder "logs"
+    QCOMPARE(TestFiles::listing(m_folder->path()), QStringList());
+}
+
+void tst_RunMark::noFolder()
+{
+    QVERIFY(TestFiles::write(folder(), "x"));
+    RunMark(m_log).CollectOthers();
+    QCOMPARE(TestFiles::listing(m_folder->path()), QStringList("running-app.log: x"));
+}
+
+// There is one run, however many marks are asked for.
+void tst_RunMark::secondMark()
+{
+    const int before = openFileCount();
+    {
+        const RunMark first(m_log);
+        {
+            const RunMark second(m_log);
+            QCOMPARE(RunMarkFile::NamesIn(folder()).size(), 1);
+        }
+        QCOMPARE(RunMarkFile::NamesIn(folder()).size(), 1);
+        QVERIFY(!QFile::exists(record()));
+    }
+    QCOMPARE(RunEnds::Of(m_log).size(), size_t(1));
+    QCOMPARE(openFileCount(), before);
+}
+
+void tst_RunMark::othersAreUsingTheFolder()
+{
+    QVERIFY(LeaveBehind(folder() + "/other.run", RunMark::ProgramStart()));
+    {
+        const RunMark mark(m_log);
+    }
+    QCOMPARE(RunMarkFile::NamesIn(folder()), QStringList("other.run"));
+}
+
+void tst_RunMark::collects_data()
+{
+    QTest::addColumn<int>("after"); // milliseconds from the start of this program
+    QTest::addColumn<QString>("kind");
+    QTest::addColumn<bool>("isCollected");
+    QTest::newRow("began before") << -5 << "" << true;
+    QTest::newRow("began at the same time") << 0 << "" << true;
+    QTest::newRow("began later") << 1 << "" << false;
+    QTest::newRow("a copy") << -5 << "copy" << false;
+    QTest::newRow("not complete yet") << -5 << "damaged" << false;
+}
+
+void tst_RunMark::collects()
+{
+    QFETCH(int, after);
+    QFETCH(QString, kind);
+    QFETCH(bool, isCollected);
+    const QString other = folder() + "/other.run";
+    const qint64 start = RunMark::ProgramStart() + after;
+    QVERIFY(LeaveBehind(other, start));
+    if (kind == "copy") {
+        QVERIFY(QFile::copy(other, other + ".copy"));
+        QVERIFY(QFile::remove(other));
+        QVERIFY(QFile::rename(other + ".copy", other));
+    } else if (kind == "damaged") {
+        QVERIFY(TestFiles::write(other, "2026"));
+    }
+    {
+        RunMark mark(m_log);
+        mark.CollectOthers();
+        QCOMPARE(QFile::exists(other), !isCollected);
+        QCOMPARE(TestFiles::read(record()).count('\n'), isCollected ? 1 : 0);
+        QCOMPARE(RunMarkFile::NamesIn(folder()).size(), isCollected ? 1 : 2);
+    }
+    if (isCollected) {
+        const RunEnd end = RunEnds::FromLine(TestFiles::read(record()).split('\n')[0]);
+        QCOMPARE(end.exit, HistoryRun::Abnormal);
+        QCOMPARE(end.start, start);
+        QCOMPARE(end.end, RunMark::ProgramStart());
+    }
+}
+
+// What the mark tells is not lost.
+void tst_RunMark::recordThatCannotBeWritten_data()
+{
+    QTest::addColumn<QString>("target"); // of a link; a folder if empty
+    QTest::newRow("folder") << "";
+    QTest::newRow("device") << "/dev/null";
+    QTest::newRow("full disk") << "/dev/full";
+}
+
+void tst_RunMark::recordThatCannotBeWritten()
+{
+    QFETCH(QString, target);
+    const int before = openFileCount();
+    QVERIFY(LeaveBehind(folder() + "/other.run", RunMark::ProgramStart() - 5));
+    QVERIFY(target.isEmpty() ? QDir().mkpath(record()) : QFile::link(target, record()));
+    RunMark(m_log).CollectOthers();
+    QCOMPARE(RunMarkFile::NamesIn(folder()), QStringList("other.run"));
+    QCOMPARE(openFileCount(), before);
+}
+
+void tst_RunMark::recordIsShortened_data()
+{
+    QTest::addColumn<int>("size");
+    QTest::addColumn<bool>("isShortened");
+    QTest::newRow("at the limit") << (512 << 10) << false;
+    QTest::newRow("above the limit") << (512 << 10) + 1 << true;
+}
+
+// To half of it, from a whole line on.
+void tst_RunMark::recordIsShortened()
+{
+    QFETCH(int, size);
+    QFETCH(bool, isShortened);
+    QByteArray bytes;
+    for (int number = 0; bytes.size() < size; ++number)
+        bytes += QByteArray::number(number).rightJustified(63, '.') + '\n';
+    bytes.truncate(size);
+    QVERIFY(TestFiles::write(record(), bytes));
+    RunMark mark(m_log);
+    mark.CollectOthers();
+    const QByteArray kept = TestFiles::read(record());
+    const int start = bytes.indexOf('\n', size - (256 << 10)) + 1;
+    QCOMPARE(kept, isShortened ? bytes.mid(start) : bytes);
+}
+
+QTEST_GUILESS_MAIN(tst_RunMark)
+#include "tst_RunMark.moc"
