@@ -194,6 +194,10 @@ void MainMenus::fillViewMenu(QMenu* menu)
 
 void MainMenus::addMovement(QMenu* menu)
 {
+    m_actions.allFiles =
+        addSwitchForLog(menu, tr("All Files, &by Time"), QKeySequence(tr("Ctrl+Shift+A")),
+                        tr("Show the older files of the log, too, as one, each run with a heading"),
+                        [](LogPanel* log, bool shown) { log->SetAllFiles(shown); });
     m_actions.earlierRuns =
         addSwitchForLog(menu, tr("&Earlier Runs"), QKeySequence(tr("Ctrl+Shift+E")),
                         tr("Show entries from earlier runs"),

@@ -39,6 +39,7 @@ struct MenuActions
     QAction* showToolBar = nullptr;
     QAction* nextPane = nullptr;
     QAction* previousPane = nullptr;
+    QAction* allFiles = nullptr;
     QAction* earlierRuns = nullptr;
     QAction* pause = nullptr;
     QAction* follow = nullptr;

@@ -11,6 +11,7 @@
 #include "app/window/MainWindow.h"
 #include "app/window/log/HighlightRules.h"
 #include "app/window/log/LogFindBar.h"
+#include "app/window/log/LogModel.h"
 #include "app/window/log/LogPanel.h"
 #include "app/window/settings/SettingsEditor.h"
 #include "common/log/TorkLog.h"
@@ -85,7 +86,7 @@ void SetUpProgram()
     QDir(Home).removeRecursively();
     TorkLog::initialize(Home + "logs/", "velocor", QString(), true);
     TestFiles::write(Home + "logs/velocor.log", DemoLog::lifelike());
-    TestFiles::write(Home + "logs/velocor.log.1", DemoLog::run(200, QTime(8, 0), "older"));
+    TestFiles::write(Home + "logs/velocor.log.1", DemoLog::run(200, QTime(8, 0), "older", true));
     TestFiles::write(Home + "viewer.cfg", SettingsText);
     TestFiles::write(Home + "broken.cfg", BrokenText);
 }
@@ -173,6 +174,20 @@ void TakeLogViews(MainWindow& window, Camera const& camera)
     table->clearSelection();
 }
 
+void TakeAllFiles(MainWindow& window, Camera const& camera)
+{
+    LogPanel* panel = PanelOf(window);
+    Trigger(window, "All Files, by Time");
+    QTest::qWait(1000);
+    panel->model()->SetFolded(0, true);
+    QTest::qWait(500);
+    panel->GoToProblem(1);
+    camera.take(window, "all-files");
+    Trigger(window, "All Files, by Time");
+    QTest::qWait(1000);
+    panel->findChild<QTableView*>()->clearSelection();
+}
+
 // And the bar that says that something is wrong with the log.
 void TakePlaces(MainWindow& window, Camera const& camera)
 {
@@ -245,6 +260,7 @@ void TakeAll(QString const& folder, QString const& suffix)
     window.show();
     QTest::qWait(1000);
     TakeLogViews(window, camera);
+    TakeAllFiles(window, camera);
     TakeHighlights(window, camera);
     TakePlaces(window, camera);
     TakeDialogs(window, camera);

@@ -28,9 +28,13 @@ void LogFileBox::Open(QString const& path)
     addItem(QFileInfo(path).fileName(), path);
 }
 
-void LogFileBox::SetShown(QString const& path)
+void LogFileBox::SetShown(QString const& path, bool isAll)
 {
+    const bool isOther = isAll != m_isAll;
     m_shown = path;
+    m_isAll = isAll;
+    if (isOther)
+        fill();
     setToolTip(PlainToolTip(path));
     setAccessibleDescription(path);
 }
@@ -52,13 +56,18 @@ void LogFileBox::fill()
         addItem(tr("%1 (%2)").arg(info.fileName(), size), file);
         setItemData(count() - 1, PlainToolTip(file), Qt::ToolTipRole);
     }
-    setCurrentIndex(findData(m_shown));
+    addItem(tr("All files, by time"));
+    setItemData(count() - 1, PlainToolTip(tr("Every run that the files still have, oldest first")),
+                Qt::ToolTipRole);
+    setCurrentIndex(m_isAll ? count() - 1 : findData(m_shown));
 }
 
 void LogFileBox::choose(int position)
 {
     const QString file = itemData(position).toString();
-    if (file != m_shown)
+    if (file.isEmpty() && !m_isAll)
+        Q_EMIT allChosen();
+    else if (!file.isEmpty() && (file != m_shown || m_isAll))
         Q_EMIT fileChosen(file);
 }
 

@@ -8,7 +8,7 @@
 
 namespace Velocor {
 
-/// The choice between a log file and the older ones beside it. GUI thread.
+/// The choice between a log file, the older ones beside it, and all of them as one. GUI thread.
 class LogFileBox : public QComboBox
 {
     Q_OBJECT
@@ -20,7 +20,9 @@ public:
     void Open(QString const& path);
 
     /// Says which file is shown.
-    void SetShown(QString const& path);
+    ///
+    /// @param isAll  whether the older ones of that log are shown with it
+    void SetShown(QString const& path, bool isAll);
 
     void showPopup() override;
 
@@ -28,11 +30,15 @@ Q_SIGNALS:
     /// The user has chosen another file than the one shown.
     void fileChosen(QString const& path);
 
+    /// The user has chosen to see all of them as one.
+    void allChosen();
+
 private:
     void fill();
     void choose(int position);
 
     QString m_shown;
+    bool m_isAll = false;
 };
 
 } // namespace Velocor

@@ -66,11 +66,23 @@ void LogGoTo::Find(LogPlace const& place, int currentRow)
     request.place = place;
     request.rows = m_model->state().rows;
     request.currentRow = currentRow;
+    if (place.kind == LogPlace::Line && m_model->isAll() && m_model->rowCount() > 0)
+        request.place.value += static_cast<qint64>(firstLine(currentRow));
     m_isLong = place.kind != LogPlace::Line && m_model->rowCount() >= ManyRows;
     if (m_isLong)
         Q_EMIT started(tr("Looking for that time..."));
     m_locator->SetCurrentRequest(m_number);
     Q_EMIT locateRequested(request);
+}
+
+// Of all files, a number means a line of the one that the current line is in; without a current
+// line, of the newest one.
+size_t LogGoTo::firstLine(int currentRow) const
+{
+    int row = currentRow < 0 ? m_model->rowCount() - 1 : currentRow;
+    if (m_model->LineStart(row) < 0 && row + 1 < m_model->rowCount())
+        ++row; // from a heading to the first line below
+    return m_model->FirstLineOfFile(row);
 }
 
 // The rows may have moved in the meantime.

@@ -45,6 +45,7 @@ Q_SIGNALS:
 
 private:
     void startLocator();
+    size_t firstLine(int currentRow) const;
     void take(LogLocation const& location);
 
     LogModel* m_model;

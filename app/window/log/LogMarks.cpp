@@ -34,14 +34,34 @@ LogMarks::~LogMarks()
 
 void LogMarks::Load()
 {
-    m_path = m_model->path();
-    m_marks = m_store ? m_store->Marks(m_path) : QVector<LogMark>();
+    m_source = LogSource(m_model->path());
+    load();
+}
+
+// The files are known only when they have been read; each has marks of its own.
+void LogMarks::load()
+{
+    m_marks = m_store ? m_store->Marks(m_source.path) : QVector<LogMark>();
+    for (LogMark& mark : m_marks)
+        mark.start += m_source.start();
+    const size_t older = m_store && m_source.older ? m_source.older->count() : 0;
+    for (size_t file = 0; file < older; ++file) {
+        QVector<LogMark> marks = m_store->Marks(m_source.older->path(file));
+        for (LogMark& mark : marks)
+            mark.start += m_source.older->start(file);
+        m_marks += marks;
+    }
     ++m_request;
     update();
 }
 
 void LogMarks::noteRefreshed()
 {
+    if (m_model->source() != m_source && m_model->path() == m_source.path) {
+        m_source = m_model->source();
+        load();
+        m_wasReset = true;
+    }
     if (m_wasReset || (m_haveMoved && dropOverwritten()))
         find();
     if (m_wasReset || m_haveMoved) {
@@ -62,7 +82,7 @@ bool LogMarks::dropOverwritten()
 {
     bool isDropped = false;
     LogLineReader reader;
-    const bool isOpen = !m_marks.isEmpty() && reader.Open(m_path, m_model->parser().fileType());
+    const bool isOpen = !m_marks.isEmpty() && reader.Open(m_source, m_model->parser().fileType());
     for (LogMark& mark : m_marks) {
         if (!mark.isFound || (isOpen && LogMark::IdentityOf(reader.Line(mark.start)) == mark.line))
             continue;
@@ -85,7 +105,7 @@ void LogMarks::find()
         m_thread.start();
     }
     m_finder->SetCurrentRequest(++m_request);
-    Q_EMIT findRequested(m_request, m_path, m_marks, m_model->parser().fileType());
+    Q_EMIT findRequested(m_request, m_source, m_marks, m_model->parser().fileType());
 }
 
 void LogMarks::take(int request, QVector<LogMark> const& marks)
@@ -162,7 +182,8 @@ QString LogMarks::SetNote(int row, QString const& note)
         if (m_marks.size() >= LogMark::MaximumMarks)
             return tr("A file can have %1 marks").arg(LogMark::MaximumMarks);
         at = m_marks.size();
-        m_marks.append(LogMark::Of(m_path, m_model->LineStart(row), m_model->parser().fileType()));
+        m_marks.append(
+            LogMark::Of(m_source, m_model->LineStart(row), m_model->parser().fileType()));
     }
     m_marks[at].note = note.simplified().left(LogMark::MaximumNote);
     return save();
@@ -173,7 +194,28 @@ QString LogMarks::save()
 {
     ++m_request;
     update();
-    return m_store ? m_store->SetMarks(m_path, m_marks) : QString();
+    if (!m_store)
+        return QString();
+    return m_source.older ? saveAll() : m_store->SetMarks(m_source.path, m_marks);
+}
+
+// Each mark with the file in which its line is, also if that has been renamed.
+QString LogMarks::saveAll()
+{
+    OlderLogFiles const& older = *m_source.older;
+    std::vector<QVector<LogMark>> marks(older.count() + 1);
+    for (LogMark mark : qAsConst(m_marks)) {
+        const size_t file = older.FileAt(mark.start);
+        mark.start -= file < older.count() ? older.start(file) : older.size();
+        marks[file].append(mark);
+    }
+    QString problem;
+    for (size_t file = 0; file < marks.size(); ++file) {
+        const QString path = file < older.count() ? older.path(file) : m_source.path;
+        if (!marks[file].isEmpty() || !m_store->Marks(path).isEmpty())
+            problem = m_store->SetMarks(path, marks[file]);
+    }
+    return problem;
 }
 
 } // namespace Velocor

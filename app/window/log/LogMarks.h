@@ -4,6 +4,7 @@
 #pragma once
 
 #include "app/logfile/LogMark.h"
+#include "app/logfile/LogSource.h"
 
 #include <QObject>
 #include <QThread>
@@ -59,12 +60,14 @@ Q_SIGNALS:
     void changed();
 
     // To the finder's thread.
-    void findRequested(int request, QString const& path, QVector<Velocor::LogMark> const& marks,
-                       Velocor::LogFileType const& type);
+    void findRequested(int request, Velocor::LogSource const& source,
+                       QVector<Velocor::LogMark> const& marks, Velocor::LogFileType const& type);
 
 private:
     int indexOf(int row) const;
+    void load();
     QString save();
+    QString saveAll();
     void noteRefreshed();
     bool dropOverwritten();
     void find();
@@ -77,7 +80,7 @@ private:
     QThread m_thread;
     LogMarkFinder* m_finder = nullptr;
     int m_request = 0;
-    QString m_path;
+    LogSource m_source;
     QVector<LogMark> m_marks;
     std::shared_ptr<std::vector<int> const> m_rows;
     int m_rowCount = 0;       // rows looked at

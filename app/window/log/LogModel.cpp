@@ -233,6 +233,12 @@ int LogModel::FindProblem(int row, int step) const
     return -1;
 }
 
+// While another log is being read, the rows are still those of the one before.
+bool LogModel::IsFoldable(int row) const
+{
+    return m_state.runs && row >= 0 && row < m_rowCount && isHeading(row);
+}
+
 bool LogModel::isHeading(int row) const
 {
     return m_state.rows->isHeading(static_cast<size_t>(row));
@@ -460,8 +466,8 @@ size_t LogModel::FirstLineOfFile(int row) const
 
 QString LogModel::headingText(int row) const
 {
-    if (m_isAll && m_state.runs)
-        return RunText(runOf(row), ProgramLogs::NameOf(m_path));
+    if (m_state.runs)
+        return RunTextWithArrow(runOf(row), ProgramLogs::NameOf(m_path));
     const qint64 start = m_state.rows->start(static_cast<size_t>(row));
     if (start == LogRows::EarlierHeading)
         return tr("Earlier");
@@ -521,6 +527,10 @@ QVariant LogModel::data(QModelIndex const& index, int role) const
     case Qt::DisplayRole:
         return cellText(row, index.column());
     case Qt::AccessibleTextRole:
+        if (IsFoldable(row)) {
+            const QString run = RunText(runOf(row), ProgramLogs::NameOf(m_path));
+            return index.column() > 0 ? QString() : IsFolded(row) ? tr("%1, folded").arg(run) : run;
+        }
         return index.column() == TimeColumn && m_marks.contains(LineStart(row))
                    ? tr("Marked: %1").arg(cellText(row, TimeColumn))
                    : cellText(row, index.column());

@@ -69,7 +69,7 @@ public:
     bool isAll() const { return m_isAll; }
 
     /// Whether a row is a heading that folds.
-    bool IsFoldable(int row) const { return m_isAll && isHeading(row); }
+    bool IsFoldable(int row) const;
 
     /// Hides the rows under a heading, or shows them again. Does nothing for other rows.
     void SetFolded(int row, bool folded);

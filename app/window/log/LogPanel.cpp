@@ -3,6 +3,7 @@
 
 #include "app/window/log/LogPanel.h"
 
+#include "app/logfile/LogFileList.h"
 #include "app/logfile/LogIndex.h"
 #include "app/window/log/CurrentLine.h"
 #include "app/window/log/GoToDialog.h"
@@ -92,7 +93,9 @@ void LogPanel::makeLayout()
 
 void LogPanel::connectParts()
 {
-    connect(m_files, &LogFileBox::fileChosen, this, &LogPanel::showFile);
+    connect(m_files, &LogFileBox::fileChosen, this,
+            [this](QString const& file) { showFile(file, false); });
+    connect(m_files, &LogFileBox::allChosen, this, [this] { SetAllFiles(true); });
     connect(m_filterBar, &LogFilterBar::filterChanged, this, [this] {
         m_model->SetFilter(m_filterBar->filter());
         m_view->UpdateMarks();
@@ -155,18 +158,19 @@ void LogPanel::Open(QString const& path, bool isCurrent)
 {
     m_currentPath = isCurrent ? path : QString();
     m_files->Open(path);
-    showFile(path);
+    showFile(path, false);
 }
 
-void LogPanel::showFile(QString const& path)
+void LogPanel::showFile(QString const& path, bool isAll)
 {
-    m_files->SetShown(path);
+    m_files->SetShown(path, isAll);
     const LogEncoding kept = m_store ? m_store->Encoding(path) : LogEncoding::Automatic;
     if (kept != LogEncoding::Automatic)
         m_model->SetEncoding(kept);
-    m_model->Open(path, RunningLogParser(), path == m_currentPath);
+    m_model->Open(path, RunningLogParser(), path == m_currentPath, isAll);
     m_marks->Load();
     updatePlaceholder();
+    Q_EMIT stateChanged();
 }
 
 void LogPanel::Reload()
@@ -218,6 +222,17 @@ void LogPanel::SetMarkStore(LogMarkStore* store)
 {
     m_store = store;
     m_marks->SetStore(store);
+}
+
+void LogPanel::SetAllFiles(bool shown)
+{
+    if (shown != showsAllFiles())
+        showFile(LogFileList::CurrentOf(path()), shown);
+}
+
+bool LogPanel::showsAllFiles() const
+{
+    return m_model->isAll();
 }
 
 LogEncoding LogPanel::chosenEncoding() const
@@ -387,8 +402,8 @@ QString LogPanel::path() const
 
 QString LogPanel::summary() const
 {
-    return LogStateText::Summary(*m_model, m_percent,
-                                 m_view->LineNumber(m_view->currentIndex().row()));
+    const int row = m_view->currentIndex().row();
+    return LogStateText::Summary(*m_model, m_percent, row, m_view->LineNumber(row));
 }
 
 void LogPanel::updatePlaceholder()

@@ -60,6 +60,10 @@ public:
     void SetEarlierRuns(bool shown);
     bool showsEarlierRuns() const;
 
+    /// Shows the older files of the log, too, as one; or only the current one again.
+    void SetAllFiles(bool shown);
+    bool showsAllFiles() const;
+
     /// Reads the file in another encoding, also in the next session; Automatic finds out which.
     void SetEncoding(LogEncoding encoding);
     LogEncoding chosenEncoding() const;
@@ -176,7 +180,7 @@ private:
     void connectParts();
     void connectView();
     void connectModel();
-    void showFile(QString const& path);
+    void showFile(QString const& path, bool isAll);
     void showCurrentLine();
     void updatePlaceholder();
     void showContent();

@@ -36,16 +36,19 @@ QString LinesShown(LogModel const& model)
     return shown < lines ? StateText::tr("%1 of %2").arg(locale.toString(shown), all) : all;
 }
 
-QString LineOf(LogModel const& model, qulonglong current)
+QString LineOf(LogModel const& model, int row, qulonglong current)
 {
     const QLocale locale;
+    if (model.isAll())
+        return StateText::tr("Line %1 of %2")
+            .arg(locale.toString(current), QFileInfo(model.FileOf(row)).fileName());
     const qulonglong lines = std::max<qulonglong>(current, model.state().lines);
     return StateText::tr("Line %1 of %2").arg(locale.toString(current), locale.toString(lines));
 }
 
 } // namespace
 
-QString LogStateText::Summary(LogModel const& model, int percent, qulonglong current)
+QString LogStateText::Summary(LogModel const& model, int percent, int row, qulonglong current)
 {
     const bool isReading = model.isReading() && percent < 100;
     LogUpdate const& state = model.state();
@@ -53,7 +56,7 @@ QString LogStateText::Summary(LogModel const& model, int percent, qulonglong cur
         return StateText::tr("Reading: %1%").arg(percent);
     const QString separator = QStringLiteral("  %1  ").arg(QChar(0xb7)); // middle dot
     const QLocale locale;
-    QString text = current > 0 ? LineOf(model, current) : LinesShown(model);
+    QString text = current > 0 ? LineOf(model, row, current) : LinesShown(model);
     const auto problems = static_cast<qlonglong>(state.rows->problems());
     text +=
         separator + (problems == 1 ? StateText::tr("1 problem")
@@ -69,6 +72,14 @@ QString LogStateText::Summary(LogModel const& model, int percent, qulonglong cur
 
 QString LogStateText::ContentNotice(LogModel const& model)
 {
+    QStringList const& unreadable = model.state().unreadable;
+    if (!unreadable.isEmpty()) {
+        QStringList names;
+        for (QString const& path : unreadable)
+            names.append(QFileInfo(path).fileName());
+        return StateText::tr("Cannot be read, so their lines are missing: %1")
+            .arg(names.join(QStringLiteral(", ")));
+    }
     const auto compressed = [&model](char const* program) {
         return StateText::tr("This looks like a compressed file. To read it: %1 %2 | velocor -")
             .arg(QLatin1String(program), QFileInfo(model.path()).fileName());

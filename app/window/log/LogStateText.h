@@ -17,8 +17,9 @@ public:
     /// A short summary of the rows, for the status bar.
     ///
     /// @param percent  how much of the file has been read
-    /// @param current  the number of the current line in the file; 0 if there is none
-    static QString Summary(LogModel const& model, int percent, qulonglong current);
+    /// @param row  the current row; -1 if there is none
+    /// @param current  the number of its line in its file; 0 if there is none
+    static QString Summary(LogModel const& model, int percent, int row, qulonglong current);
 
     /// Says that the file is not text, and how to read it; empty if it seems to be.
     static QString ContentNotice(LogModel const& model);

@@ -43,6 +43,10 @@ LogView::LogView(LogModel* model, QWidget* parent)
     connect(verticalScrollBar(), &QScrollBar::valueChanged, this, &LogView::noteScrolled);
     connect(model, &LogModel::modelAboutToBeReset, this, &LogView::noteCurrent);
     connect(model, &LogModel::refreshed, this, &LogView::afterRefresh);
+    connect(this, &LogView::clicked, this, [this](QModelIndex const& index) {
+        if (m_model->IsFoldable(index.row()))
+            fold(index.row(), !m_model->IsFolded(index.row()));
+    });
 }
 
 LogDelegate* LogView::cells() const
@@ -126,6 +130,10 @@ void LogView::focusInEvent(QFocusEvent* event)
 void LogView::keyPressEvent(QKeyEvent* event)
 {
     const bool isSideways = event->key() == Qt::Key_Left || event->key() == Qt::Key_Right;
+    if (isSideways && m_model->IsFoldable(currentIndex().row())) {
+        fold(currentIndex().row(), event->key() == Qt::Key_Left);
+        return;
+    }
     const QScopedValueRollback<bool> guard(m_goesSideways, isSideways);
     const bool isEnd = event->key() == Qt::Key_Home || event->key() == Qt::Key_End;
     if (!isEnd || !(event->modifiers() & Qt::ControlModifier)) {
@@ -301,7 +309,7 @@ void LogView::afterRefresh()
 {
     const QScopedValueRollback<bool> guard(m_scrollingItself, true);
     // An empty log may get anything.
-    LogUpdate const& state = m_model->state();
+    HistoryUpdate const& state = m_model->state();
     setColumnHidden(LogModel::TimeColumn, !state.hasTimes && state.lines > 0);
     setColumnHidden(LogModel::SeverityColumn, !state.hasSeverities && state.lines > 0);
     setColumnHidden(LogModel::ElapsedColumn, !state.hasElapsed);
@@ -316,6 +324,8 @@ void LogView::afterRefresh()
         goToEnd();
     if (m_hasOtherRows)
         viewport()->update();
+    else if (state.runs) // the counts of the newest run
+        viewport()->update(visualRect(m_model->index(static_cast<int>(state.rows->earlier()), 0)));
     m_hasOtherRows = false;
 }
 
@@ -327,10 +337,19 @@ void LogView::currentChanged(QModelIndex const& current, QModelIndex const& prev
         current.isValid() ? m_model->LineText(current.row(), LogModel::ShownLimit) : QString();
 }
 
+// The rows under the heading are what the user looks at, not the newest one.
+void LogView::fold(int row, bool folded)
+{
+    if (row < static_cast<int>(m_model->state().rows->earlier()))
+        SetFollowing(false);
+    m_model->SetFolded(row, folded);
+}
+
 void LogView::noteCurrent()
 {
     m_hasOtherRows = true;
     const int row = currentIndex().row();
+    m_keepsHeading = m_model->IsFoldable(row) && m_model->LineStart(row) == LogRows::NewestHeading;
     if (row < 0 || m_model->LineStart(row) < 0)
         return;
     m_keptPath = m_model->path();
@@ -370,6 +389,13 @@ int LogView::keptRow(qint64 start) const
 // After the rows were replaced. Another file has its own current line.
 void LogView::restoreCurrent()
 {
+    if (m_keepsHeading && !m_model->isReading()) {
+        m_keepsHeading = false;
+        const int row = static_cast<int>(m_model->state().rows->earlier());
+        if (m_model->IsFoldable(row) && !currentIndex().isValid())
+            selectionModel()->setCurrentIndex(m_model->index(row, 0),
+                                              QItemSelectionModel::NoUpdate);
+    }
     if (m_keptStart < 0 || m_model->isReading())
         return;
     const qint64 start = m_keptStart;
@@ -445,7 +471,8 @@ qulonglong LogView::LineNumber(int row) const
 {
     if (row < 0 || row >= m_model->rowCount() || m_model->LineStart(row) < 0)
         return 0;
-    return m_model->state().rows->line(static_cast<size_t>(row)) + 1;
+    return m_model->state().rows->line(static_cast<size_t>(row)) - m_model->FirstLineOfFile(row) +
+           1;
 }
 
 qulonglong LogView::LineCount() const

@@ -69,7 +69,7 @@ public:
     /// The first cell of a row that is shown.
     QModelIndex FirstCell(int row) const;
 
-    /// The number of a row's line in the file, starting at 1; 0 for a heading and if there is no
+    /// The number of a row's line in its file, starting at 1; 0 for a heading and if there is no
     /// such row.
     qulonglong LineNumber(int row) const;
 
@@ -133,6 +133,7 @@ private:
     void goToEnd();
     void afterRefresh();
     void noteCurrent();
+    void fold(int row, bool folded);
     int keptRow(qint64 start) const;
     void restoreCurrent();
     int firstColumn() const;
@@ -157,6 +158,7 @@ private:
     QString m_keptPath;
     QString m_keptText;
     qint64 m_keptStart = -1;
+    bool m_keepsHeading = false; // of the newest run
     quint16 m_keptCheck = 0;
     int m_keptDistance = 0;
     bool m_wasInView = false;

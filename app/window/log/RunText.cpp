@@ -57,9 +57,13 @@ QString RunText(RunHeading const& run, QString const& program)
         CountOf(run.warnings, RunTexts::tr("1 warning"), RunTexts::tr("%1 warnings")),
         CountOf(run.errors, RunTexts::tr("1 error"), RunTexts::tr("%1 errors"))};
     parts.removeAll(QString());
+    return parts.join(QStringLiteral("  %1  ").arg(QChar(0xb7))); // middle dot
+}
+
+QString RunTextWithArrow(RunHeading const& run, QString const& program)
+{
     const QChar arrow(run.isFolded ? 0x25b8 : 0x25be);
-    const QString separator = QStringLiteral("  %1  ").arg(QChar(0xb7)); // middle dot
-    return QStringLiteral("%1  %2").arg(arrow, parts.join(separator));
+    return QStringLiteral("%1  ").arg(arrow) + RunText(run, program);
 }
 
 } // namespace Velocor

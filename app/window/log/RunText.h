@@ -9,8 +9,11 @@
 
 namespace Velocor {
 
-/// The heading of a run: whether it is folded, the program, when it ran, how it ended, and how many
-/// warnings and errors it logged.
+/// The heading of a run: the program, when it ran, how it ended, and how many warnings and errors
+/// it logged.
 QString RunText(RunHeading const& run, QString const& program);
+
+/// The same after an arrow, which shows whether the run is folded.
+QString RunTextWithArrow(RunHeading const& run, QString const& program);
 
 } // namespace Velocor
