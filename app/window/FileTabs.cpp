@@ -110,6 +110,7 @@ LogPanel* FileTabs::addLog(QString const& path)
     panel->SetTextFont(m_textFont);
     panel->SetLineWrap(m_isWrapped);
     panel->SetLineNumbers(m_hasNumbers);
+    panel->SetActivity(m_showsActivity);
     panel->SetSince(m_showsSince);
     panel->SetLeastGap(m_leastGap);
     if (!path.isEmpty())
@@ -258,6 +259,15 @@ void FileTabs::SetLineNumbers(bool shown)
     for (int i = 0; i < count(); ++i) {
         if (auto* log = qobject_cast<LogPanel*>(widget(i)))
             log->SetLineNumbers(shown);
+    }
+}
+
+void FileTabs::SetActivity(bool shown)
+{
+    m_showsActivity = shown;
+    for (int i = 0; i < count(); ++i) {
+        if (auto* log = qobject_cast<LogPanel*>(widget(i)))
+            log->SetActivity(shown);
     }
 }
 

@@ -82,6 +82,9 @@ public:
     /// Shows the numbers of the lines in all logs or not.
     void SetLineNumbers(bool shown);
 
+    /// Shows the bars of entries by time in all logs or not.
+    void SetActivity(bool shown);
+
     /// Shows the time since another entry in all logs or not.
     void SetSince(bool shown);
 
@@ -133,6 +136,7 @@ private:
     QFont m_textFont;
     bool m_isWrapped = false;
     bool m_hasNumbers = false;
+    bool m_showsActivity = false;
     bool m_showsSince = false;
     qint64 m_leastGap = 0; // milliseconds
 };

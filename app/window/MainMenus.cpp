@@ -284,6 +284,10 @@ void MainMenus::fillTextMenu(QMenu* menu)
 
 void MainMenus::fillAnalyzeMenu(QMenu* menu)
 {
+    m_actions.activity =
+        addSwitch(menu, tr("&Activity"), QKeySequence(tr("Ctrl+Alt+A")),
+                  tr("Show how many entries and problems there are by time, above logs"),
+                  [this](bool shown) { m_targets.tabs->SetActivity(shown); });
     m_actions.since = addSwitch(menu, tr("&Time Since"), QKeySequence(tr("Ctrl+Alt+S")),
                                 tr("Show the time since the entry above or since a chosen one"),
                                 [this](bool shown) { m_targets.tabs->SetSince(shown); });

@@ -49,6 +49,7 @@ struct MenuActions
     QAction* monospaced = nullptr;
     QAction* lineWrap = nullptr;
     QAction* lineNumbers = nullptr;
+    QAction* activity = nullptr;
     QAction* since = nullptr;
     QActionGroup* gaps = nullptr; ///< their data is the least gap shown, in milliseconds
     QAction* reopen = nullptr;

@@ -263,6 +263,8 @@ void MainWindow::restoreState()
     m_tabs->SetLineWrap(actions.lineWrap->isChecked());
     actions.lineNumbers->setChecked(m_settings.Flag(QStringLiteral("lineNumbers"), false));
     m_tabs->SetLineNumbers(actions.lineNumbers->isChecked());
+    actions.activity->setChecked(m_settings.Flag(QStringLiteral("activity"), false));
+    m_tabs->SetActivity(actions.activity->isChecked());
     actions.since->setChecked(m_settings.Flag(QStringLiteral("since"), false));
     m_tabs->SetSince(actions.since->isChecked());
     restoreGaps();
@@ -304,6 +306,7 @@ void MainWindow::saveState()
     m_textFont->Save(m_settings);
     m_settings.SetFlag(QStringLiteral("lineWrap"), actions.lineWrap->isChecked());
     m_settings.SetFlag(QStringLiteral("lineNumbers"), actions.lineNumbers->isChecked());
+    m_settings.SetFlag(QStringLiteral("activity"), actions.activity->isChecked());
     m_settings.SetFlag(QStringLiteral("since"), actions.since->isChecked());
     m_settings.SetNumbers(QStringLiteral("leastGap"),
                           {actions.gaps->checkedAction()->data().toInt()});

@@ -155,6 +155,9 @@ void TakeLogViews(MainWindow& window, Camera const& camera)
     more->setChecked(false);
     table->clearSelection();
 
+    panel->SetActivity(true);
+    camera.take(window, "activity");
+    panel->SetActivity(false);
     panel->SetSince(true);
     panel->SetLeastGap(10 * 1000);
     camera.take(window, "since");

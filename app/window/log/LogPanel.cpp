@@ -5,6 +5,7 @@
 
 #include "app/logfile/LogFileList.h"
 #include "app/logfile/LogIndex.h"
+#include "app/window/log/ActivityStrip.h"
 #include "app/window/log/CurrentLine.h"
 #include "app/window/log/GoToDialog.h"
 #include "app/window/log/HighlightRules.h"
@@ -33,9 +34,10 @@ namespace Velocor {
 
 LogPanel::LogPanel(QWidget* parent)
     : QWidget(parent), m_model(new LogModel(this)), m_view(new LogView(m_model)),
-      m_numbers(new LineNumberMargin(m_view)), m_overview(new LogOverview(m_model, m_view)),
-      m_files(new LogFileBox), m_filterBar(new LogFilterBar), m_findBar(new LogFindBar),
-      m_line(new CurrentLine), m_splitter(new QSplitter(Qt::Vertical)),
+      m_numbers(new LineNumberMargin(m_view)), m_activity(new ActivityStrip(m_model, m_view)),
+      m_overview(new LogOverview(m_model, m_view)), m_files(new LogFileBox),
+      m_filterBar(new LogFilterBar), m_findBar(new LogFindBar), m_line(new CurrentLine),
+      m_splitter(new QSplitter(Qt::Vertical)),
       m_find(new FindControl(m_model, m_view, m_findBar, this)),
       m_marks(new MarkControl(m_model, m_view, this)),
       m_copier(new LineCopier(m_model, m_view, this)), m_goTo(new LogGoTo(m_model, this))
@@ -88,6 +90,7 @@ void LogPanel::makeLayout()
     layout->setSpacing(6);
     layout->addLayout(top);
     layout->addWidget(m_filterBar);
+    layout->addWidget(m_activity);
     layout->addWidget(m_splitter, 1);
 }
 
@@ -120,6 +123,7 @@ void LogPanel::connectParts()
         if (!message.isEmpty())
             Q_EMIT messageReported(message);
     });
+    connect(m_activity, &ActivityStrip::messageReported, this, &LogPanel::messageReported);
     connect(m_goTo, &LogGoTo::started, this, &LogPanel::messageReported);
 }
 
@@ -267,6 +271,11 @@ void LogPanel::SetLineNumbers(bool shown)
     m_numbers->SetShown(shown);
 }
 
+void LogPanel::SetActivity(bool shown)
+{
+    m_activity->SetShown(shown);
+}
+
 void LogPanel::SetSince(bool shown)
 {
     m_view->SetSince(shown);
@@ -293,7 +302,7 @@ void LogPanel::AddBar(QWidget* bar)
 
 QList<QWidget*> LogPanel::Panes() const
 {
-    return {m_filterBar, m_view, m_findBar, m_line};
+    return {m_filterBar, m_activity, m_view, m_findBar, m_line};
 }
 
 void LogPanel::FocusFilter()

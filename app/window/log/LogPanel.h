@@ -20,6 +20,7 @@ class QSplitter;
 
 namespace Velocor {
 
+class ActivityStrip;
 class CurrentLine;
 class HighlightRules;
 class LineNumberMargin;
@@ -77,6 +78,9 @@ public:
 
     /// Shows the numbers of the lines in the file beside the rows.
     void SetLineNumbers(bool shown);
+
+    /// Shows the bars with the number of entries by time.
+    void SetActivity(bool shown);
 
     /// See LogView::SetSince() and LogView::SetLeastGap().
     void SetSince(bool shown);
@@ -191,6 +195,7 @@ private:
     LogModel* m_model;
     LogView* m_view;
     LineNumberMargin* m_numbers;
+    ActivityStrip* m_activity;
     LogOverview* m_overview;
     LogFileBox* m_files;
     LogFilterBar* m_filterBar;
