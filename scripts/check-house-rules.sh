@@ -105,9 +105,11 @@ other_words_for_qt() {
 }
 
 # The framework links Qt Widgets, so the compiler would let the rooms below the window use it.
+# Colors and fonts are values of the store, and need no window.
 widgets_below_the_window() {
     tracked 'app/logfile/*' 'app/history/*' 'app/report/*' 'app/terminal/*' 'app/settingsfile/*' 'app/runninglog/*' |
-        search -nHP '^\s*#\s*include\s*<(Qt(Gui|Widgets)\b|Q\w*(Widget|Dialog|Color|Font|Icon|Image|Pixmap|Paint|Palette|Screen|Style|Menu|Label|Button|Layout|MessageBox|Window|Clipboard|GuiApplication)|QApplication)'
+        search -nHP '^\s*#\s*include\s*<(Qt(Gui|Widgets)\b|Q\w*(Widget|Dialog|Color|Font|Icon|Image|Pixmap|Paint|Palette|Screen|Style|Menu|Label|Button|Layout|MessageBox|Window|Clipboard|GuiApplication)|QApplication)' |
+        grep -v '^app/settingsfile/.*<Q\(Color\|Font\)>'
 }
 
 # Statements, also of several lines, that set a tool tip without calling PlainToolTip().

@@ -66,10 +66,14 @@ public:
                                        "+5",  "007",        "12",  "3.5",        "/a", "Sans",
                                        "50",  "2147483648", "\\",  "-2147483648"};
         static QStringList const separators{",", ",", ",", "-", "|", ""};
+        static QStringList const files{"/a", "\\b", "", "c"};
         QString text("");
         QString const& separator = separators.at(below(separators.size()));
-        for (int fields = below(12); fields >= 0; --fields)
-            text += words.at(below(words.size())) + (fields > 0 ? separator : QString());
+        static QStringList const numbers{"0", "1", "12", "255", "256"};
+        QStringList const& some = separator == "|" ? files : numbers;
+        QStringList const& fields = below(2) ? some : words;
+        for (int left = below(below(2) ? 4 : 12); left >= 0; --left)
+            text += fields.at(below(fields.size())) + (left > 0 ? separator : QString());
         return text;
     }
 
