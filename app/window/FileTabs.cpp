@@ -3,6 +3,7 @@
 
 #include "app/window/FileTabs.h"
 
+#include "app/window/ApplicationProperty.h"
 #include "app/window/DistinctNames.h"
 #include "app/window/log/HighlightDialog.h"
 #include "app/window/log/LogPanel.h"
@@ -127,6 +128,9 @@ SettingsEditor* FileTabs::addEditor(QString const& path)
     const QString name = QFileInfo(path).fileName();
     editor->setAccessibleName(name);
     editor->SetOwnerNote(m_ownerNotes.value(QFileInfo(path).absoluteFilePath()));
+    const QString dataPath = ApplicationProperty("DataPath");
+    if (!dataPath.isEmpty())
+        editor->SetStates(SavedStates(dataPath + QLatin1String("settings-states/")));
     editor->Open(path);
     connect(editor, &SettingsEditor::saved, this, [this, editor] {
         setTabToolTip(indexOf(editor), PlainToolTip(editor->path())); // maybe another file now

@@ -366,14 +366,15 @@ void tst_SettingsAsText::keysAreInTheMenu()
         entries.append(ActionText(action));
         QVERIFY(!action->statusTip().isEmpty());
     }
-    QCOMPARE(entries, QStringList({"Go to Error\tF8", "Show as Settings\tCtrl+T"}));
+    QCOMPARE(entries, QStringList({"Go to Error\tF8", "Show as Settings\tCtrl+T",
+                                   "Saved States...\tCtrl+Shift+T"}));
     QVERIFY(actions.first()->isEnabled());
     shown.mend();
     QTRY_VERIFY_WITH_TIMEOUT(!actions.first()->isEnabled(), Patience);
     QVERIFY(!Action(*shown.window, "What Will Be Written...")->isEnabled());
-    actions.last()->trigger();
+    actions.at(1)->trigger();
     QVERIFY(shown.tree->isVisible());
-    QVERIFY(menu->actions().size() > 2);
+    QVERIFY(menu->actions().size() > 3);
     QVERIFY(Action(*shown.window, "What Will Be Written...")->isEnabled());
 }
 

@@ -13,6 +13,7 @@
 #include "app/window/log/LogSettingsDialog.h"
 #include "app/window/log/NoteDialog.h"
 #include "app/window/settings/DifferenceDialog.h"
+#include "app/window/settings/SavedStatesDialog.h"
 
 #include <QAbstractButton>
 #include <QComboBox>
@@ -131,6 +132,8 @@ void tst_WindowAccessibility::namesInDialogs()
     differences.SetSides({"Left", SettingsDocument(), "a"}, {"Right", SettingsDocument(), "b"});
     differences.AllowTakeOver();
     QCOMPARE(NamelessControls(&differences), QStringList());
+    SavedStatesDialog states(SavedStates(), test.folder() + "some.cfg", true);
+    QCOMPARE(NamelessControls(&states), QStringList());
     HighlightDialog highlights(std::make_shared<HighlightRules>(), nullptr);
     QCOMPARE(NamelessControls(&highlights), QStringList());
 }

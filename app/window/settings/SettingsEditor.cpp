@@ -6,6 +6,7 @@
 #include "app/settingsfile/SettingsFileReader.h"
 #include "app/settingsfile/SettingsFileWriter.h"
 #include "app/window/settings/FileNotice.h"
+#include "app/window/settings/SavedStatesDialog.h"
 #include "app/window/settings/SettingsFindBar.h"
 #include "app/window/settings/SettingsTextPage.h"
 #include "app/window/settings/SettingsTree.h"
@@ -70,6 +71,8 @@ void SettingsEditor::connectParts()
     connect(m_tree, &SettingsTree::rejected, this, &SettingsEditor::messageReported);
     connect(m_tree, &SettingsTree::longValueRequested, this, &SettingsEditor::editLongValueSoon);
     connect(m_tree, &SettingsTree::textRequested, this, &SettingsEditor::ShowAsText);
+    connect(m_tree, &SettingsTree::statesRequested, this, &SettingsEditor::ShowStates);
+    connect(m_text, &SettingsTextPage::statesRequested, this, &SettingsEditor::ShowStates);
     connect(m_text, &SettingsTextPage::settingsRequested, this, &SettingsEditor::ShowAsTree);
     connect(m_text, &SettingsTextPage::saveRequested, this, &SettingsEditor::Save);
     connect(m_text, &SettingsTextPage::stateChanged, this, &SettingsEditor::updateState);
@@ -243,7 +246,10 @@ void SettingsEditor::noteSaved()
     }
     updateState();
     Q_EMIT saved();
-    Q_EMIT messageReported(tr("Saved %1").arg(QFileInfo(m_path).fileName()));
+    QString message = tr("Saved %1").arg(QFileInfo(m_path).fileName());
+    if (!m_saver.statesProblem().isEmpty())
+        message += tr(", but its state is not kept: %1").arg(m_saver.statesProblem());
+    Q_EMIT messageReported(message);
 }
 
 void SettingsEditor::showTree(SettingsDocument const& document)
@@ -365,6 +371,38 @@ void SettingsEditor::editLongValue()
     ValueDialog dialog(name, SettingsModel::FullText(cell), this);
     if (dialog.exec() == QDialog::Accepted && dialog.isModified())
         m_commands.SetText(cell, dialog.value());
+}
+
+void SettingsEditor::ShowStates()
+{
+    if (!m_tree->EndEditing())
+        return;
+    SavedStatesDialog dialog(m_saver.states(), m_path, ShowsTree(), this);
+    connect(&dialog, &SavedStatesDialog::compareRequested, this,
+            [this](QString const& path, QString const& title) {
+                m_comparison.CompareWith(path, title);
+            });
+    connect(&dialog, &SavedStatesDialog::bringBackRequested, this, &SettingsEditor::bringBack);
+    dialog.exec();
+}
+
+// As a tree if it is one; else as text, which every state is.
+void SettingsEditor::bringBack(QString const& statePath, QString const& title)
+{
+    const SettingsDocument state = SettingsFileReader::Read(statePath);
+    if (!state.isReadable) {
+        Q_EMIT messageReported(tr("The state of %1 is gone").arg(title));
+        return;
+    }
+    if (ShowsTree() && state.isParsed && state.rootName == document().rootName) {
+        m_commands.Replace(state, tr("Bring Back"));
+        m_tree->setFocus();
+    } else {
+        ShowAsText();
+        if (!ShowsTree() && !m_text->isReadOnly())
+            m_text->Replace(WholeFile(statePath));
+    }
+    Q_EMIT messageReported(tr("Brought back the state of %1; save to keep it").arg(title));
 }
 
 bool SettingsEditor::ShowsTree() const

@@ -41,6 +41,12 @@ public:
     /// Whose file it is, and what that program will do to it; shown by Open().
     void SetOwnerNote(QString const& note) { m_ownerNote = note; }
 
+    /// Where saved states are kept; nowhere without this.
+    void SetStates(SavedStates const& states) { m_saver.SetStates(states); }
+
+    /// Lists the saved states of the file. One that is brought back can be undone.
+    void ShowStates();
+
     /// Shows a file. Unsaved changes are discarded.
     void Open(QString const& path);
 
@@ -121,6 +127,7 @@ private:
     void showPage(Page page);
     void noteTreeChange();
     bool saveText();
+    void bringBack(QString const& statePath, QString const& title);
     void compareWithFile();
     void keepMine();
     void saveAs();

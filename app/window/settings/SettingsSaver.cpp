@@ -116,6 +116,7 @@ bool SettingsSaver::Save(SettingsDocument const& document)
 {
     if (!confirmOverwrite() || !confirmLosses(document) || !makeBackup())
         return false;
+    m_statesProblem = m_states.Keep(m_path);
     QString error;
     const bool isSaved = SettingsFileWriter::Save(m_path, document, &error);
     if (!noteOutcome(isSaved, error))
@@ -140,6 +141,7 @@ bool SettingsSaver::SaveText(QByteArray const& text, SettingsDocument const& par
 {
     if (!confirmOverwrite() || !confirmMalformed(parsed) || !makeBackup())
         return false;
+    m_statesProblem = m_states.Keep(m_path);
     QString error;
     const bool isSaved = SettingsFileWriter::SaveBytes(m_path, text, &error);
     if (!noteOutcome(isSaved, error))
@@ -162,6 +164,9 @@ bool SettingsSaver::SaveTextAs(QString const& path, QByteArray const& text,
 bool SettingsSaver::noteOutcome(bool isSaved, QString const& error)
 {
     if (isSaved) {
+        const QString problem = m_states.Keep(m_path);
+        if (m_statesProblem.isEmpty())
+            m_statesProblem = problem;
         AcceptFile();
     } else {
         PlainMessageBox(QMessageBox::Critical, m_parent,

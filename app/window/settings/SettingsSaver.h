@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "app/settingsfile/SavedStates.h"
 #include "app/settingsfile/SettingsDocument.h"
 
 #include <QDateTime>
@@ -17,6 +18,13 @@ class SettingsSaver
 public:
     /// @param parent  of its message boxes; not owned
     explicit SettingsSaver(QWidget* parent) : m_parent(parent) {}
+
+    /// Where the states before and after each save are kept.
+    void SetStates(SavedStates const& states) { m_states = states; }
+    SavedStates const& states() const { return m_states; }
+
+    /// Why the states of the last save were not kept; empty if they were.
+    QString const& statesProblem() const { return m_statesProblem; }
 
     /// To be called whenever the file was read.
     ///
@@ -62,6 +70,8 @@ private:
     QString name() const;
 
     QWidget* m_parent;
+    SavedStates m_states;
+    QString m_statesProblem;
     QString m_path;
     QStringList m_fileLosses;
     int m_fileLossCount = 0;

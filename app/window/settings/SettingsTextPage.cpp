@@ -81,6 +81,8 @@ QVector<SettingsTextCommand> SettingsTextPage::AllCommands()
         {tr("Show as Se&ttings"), key("Ctrl+T"),
          tr("Show what can be read of the text as sections, keys and values"),
          &SettingsTextPage::ShowSettings},
+        {tr("Sa&ved States..."), key("Ctrl+Shift+T"), tr("Bring back an earlier state of the file"),
+         &SettingsTextPage::OpenStates},
     };
 }
 
@@ -103,6 +105,8 @@ QPushButton* SettingsTextPage::makeCommandButton(int command)
     const QStringList parts = action->text().split(QLatin1Char('\t'));
     auto* button = new QPushButton(parts.first());
     button->setAutoDefault(false);
+    button->setMinimumWidth(button->sizeHint().width() +
+                            2 * button->fontMetrics().averageCharWidth());
     button->setToolTip(
         PlainToolTip(QStringLiteral("%1 (%2)").arg(action->statusTip(), parts.last())));
     connect(button, &QPushButton::clicked, action, &QAction::trigger);
@@ -233,6 +237,11 @@ void SettingsTextPage::GoToError()
 {
     parsed();
     m_text->GoToError();
+}
+
+void SettingsTextPage::OpenStates()
+{
+    Q_EMIT statesRequested();
 }
 
 void SettingsTextPage::ShowSettings()

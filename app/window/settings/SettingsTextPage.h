@@ -78,11 +78,13 @@ public:
 
     void GoToError();
     void ShowSettings();
+    void OpenStates();
 
 Q_SIGNALS:
     /// Something else can be saved, undone or redone.
     void stateChanged();
     void settingsRequested();
+    void statesRequested();
     void saveRequested();
 
 protected:

@@ -74,6 +74,9 @@ QVector<SettingsCommand> SettingsTree::AllCommands()
          &SettingsTree::FindPrevious},
         {tr("Edit as &Text"), keys("Ctrl+T"), tr("Edit the file as text"),
          &SettingsTree::EditAsText},
+        {tr("S&aved States..."), keys("Ctrl+Shift+T"),
+         tr("Compare with earlier states of the file, and bring one back"),
+         &SettingsTree::OpenStates},
     };
 }
 
@@ -110,7 +113,8 @@ void SettingsTree::updateActions()
     const QVector<SettingsCommand> all = AllCommands();
     for (int i = 0; i < m_actions.size(); ++i)
         m_actions.at(i)->setEnabled(hasRow || all.at(i).work == &SettingsTree::AddSection ||
-                                    all.at(i).work == &SettingsTree::EditAsText);
+                                    all.at(i).work == &SettingsTree::EditAsText ||
+                                    all.at(i).work == &SettingsTree::OpenStates);
 }
 
 // Keys that a field does not use arrive here, too.
@@ -191,6 +195,11 @@ void SettingsTree::FindPrevious()
 void SettingsTree::EditAsText()
 {
     Q_EMIT textRequested();
+}
+
+void SettingsTree::OpenStates()
+{
+    Q_EMIT statesRequested();
 }
 
 bool SettingsTree::isEditing() const

@@ -79,6 +79,7 @@ public:
     void FindNext();
     void FindPrevious();
     void EditAsText();
+    void OpenStates();
 
     void keyboardSearch(QString const& search) override;
 
@@ -101,6 +102,9 @@ Q_SIGNALS:
 
     /// The user wants to edit the file as text.
     void textRequested();
+
+    /// The user wants to see the saved states of the file.
+    void statesRequested();
 
     /// The current value is to be edited, which is too long for its cell.
     void longValueRequested();
