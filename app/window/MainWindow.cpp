@@ -98,7 +98,9 @@ void MainWindow::complete()
         return;
     InitializeResources();
     QGuiApplication::setWindowIcon(WindowIcon());
-    QCoreApplication::setAttribute(Qt::AA_UseHighDpiPixmaps); // or icons are scaled up
+#if QT_VERSION < QT_VERSION_CHECK(6, 0, 0) // or icons are scaled up, which Qt 6 never does
+    QCoreApplication::setAttribute(Qt::AA_UseHighDpiPixmaps);
+#endif
     QGuiApplication::setDesktopFileName(QStringLiteral("org.tork.velocor"));
     new SelectableMessageBoxes(this);
     makeTabs();

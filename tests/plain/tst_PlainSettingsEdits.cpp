@@ -166,7 +166,7 @@ void tst_PlainSettingsEdits::undoneAndRedone()
     }
     QCOMPARE(stack->index(), count);
     std::printf("plain settings edits: %d edits undone and redone, the bytes compared %d times\n",
-                count, 2 * bytes.size() - 2);
+                count, 2 * int(bytes.size()) - 2);
     std::fflush(stdout);
 }
 

@@ -524,8 +524,7 @@ void tst_RunningLog::healthWithoutALimit()
     QCOMPARE(LogHealth().Check(), QString());
 }
 
-// Started with "--hold FOLDER" this is another program that shares a log, until its input ends;
-// with
+// With "--hold FOLDER", this is another program that shares a log until its input ends; with
 // "--health FOLDER" one of an ordinary user, who shows the health of the log there.
 int main(int argc, char** argv)
 {
@@ -533,7 +532,7 @@ int main(int argc, char** argv)
     const QString folder = application.arguments().value(2);
     if (application.arguments().value(1) == "--hold") {
         const InstanceList instances(folder);
-        QTextStream(stdout) << "held\n" << flush;
+        QTextStream(stdout) << "held\n";
         QTextStream(stdin).readAll();
         return 0;
     }

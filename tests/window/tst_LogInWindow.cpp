@@ -11,6 +11,7 @@
 #include "app/window/log/LogSettingsDialog.h"
 #include "app/window/log/LogView.h"
 #include "app/window/widgets/LongText.h"
+#include "support/WheelTurn.h"
 
 #include <QAbstractButton>
 #include <QCheckBox>
@@ -28,7 +29,6 @@
 #include <QTextBlock>
 #include <QToolButton>
 #include <QTreeView>
-#include <QWheelEvent>
 
 using namespace Velocor;
 using namespace WindowParts;
@@ -1107,24 +1107,18 @@ void tst_LogInWindow::wheelZooms()
     auto* line = Child<QPlainTextEdit>(window.get(), "Full text of the current line");
     LogView* view = View(*window);
     const qreal before = view->font().pointSizeF();
-    const auto turn = [](QWidget* widget, int angle, Qt::KeyboardModifiers keys) {
-        const QPointF center = widget->rect().center();
-        QWheelEvent event(center, widget->mapToGlobal(center.toPoint()), QPoint(), QPoint(0, angle),
-                          angle, Qt::Vertical, Qt::NoButton, keys);
-        QCoreApplication::sendEvent(widget, &event);
-    };
-    turn(view->viewport(), 60, Qt::ControlModifier);
+    TurnWheel(view->viewport(), 60, Qt::ControlModifier);
     QCOMPARE(view->font().pointSizeF(), before); // half a step
-    turn(view->viewport(), 60, Qt::ControlModifier);
+    TurnWheel(view->viewport(), 60, Qt::ControlModifier);
     const qreal larger = view->font().pointSizeF();
     QVERIFY(larger > before);
     QVERIFY(Panel(*window)->isFollowing());
     QCOMPARE(line->font().pointSizeF(), larger);
-    turn(line->viewport(), -120, Qt::ControlModifier);
+    TurnWheel(line->viewport(), -120, Qt::ControlModifier);
     QVERIFY(view->font().pointSizeF() < larger);
     QCOMPARE(line->font().pointSizeF(), view->font().pointSizeF());
 
-    turn(view->viewport(), 120, Qt::NoModifier);
+    TurnWheel(view->viewport(), 120, Qt::NoModifier);
     QVERIFY(!Panel(*window)->isFollowing()); // has scrolled
 }
 

@@ -12,13 +12,13 @@
 #include "app/window/log/TickColors.h"
 #include "app/window/widgets/SeverityIcons.h"
 #include "support/TestFiles.h"
+#include "support/WheelTurn.h"
 
 #include <QHelpEvent>
 #include <QLineEdit>
 #include <QScrollBar>
 #include <QTextDocument>
 #include <QToolTip>
-#include <QWheelEvent>
 
 using namespace Velocor;
 using namespace WindowParts;
@@ -342,10 +342,7 @@ void tst_OverviewInWindow::wheel()
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2000, Patience);
     View(*window)->GoToRow(1000);
     const int before = View(*window)->verticalScrollBar()->value();
-    const QPoint place = Overview(*window)->rect().center();
-    QWheelEvent turn(place, Overview(*window)->mapToGlobal(place), QPoint(), QPoint(0, -120), -120,
-                     Qt::Vertical, Qt::NoButton, Qt::NoModifier);
-    QCoreApplication::sendEvent(Overview(*window), &turn);
+    TurnWheel(Overview(*window), -120);
     QVERIFY(View(*window)->verticalScrollBar()->value() > before);
 }
 
