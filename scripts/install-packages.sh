@@ -32,7 +32,7 @@ packages_of() {
     */wayland) echo qtwayland5 ;;
     */test)
         echo xvfb xauth shared-mime-info pkg-config valgrind doxygen locales-all dpkg-dev \
-            desktop-file-utils
+            desktop-file-utils libspdlog-dev
         ;;
     */bench)
         echo python3 xvfb xauth shared-mime-info libbenchmark-dev libspdlog-dev liblog4cplus-dev \

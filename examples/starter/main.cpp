@@ -26,8 +26,8 @@ int main(int argc, char** argv)
     const QuitOnSignal quitOnSignal;
     MainWindow window(application.property("DataPath").toString() + "starter.cfg");
     window.show();
-    if (application.arguments().size() > 1)
-        window.Open(application.arguments().at(1));
+    if (QApplication::arguments().size() > 1)
+        window.Open(QApplication::arguments().at(1));
 
     TorkLog::logger()->write(TorkLog::Notification, "ready");
     return QApplication::exec();
