@@ -35,7 +35,7 @@ public:
     /// does not end, the rest of the text counts as its value.
     static QString WithoutSecretValues(QString const& text);
 
-    static constexpr int MaximumRunLines = 5000;    ///< of each run
+    static constexpr int MaximumRunLines = 2000;    ///< of each run
     static constexpr int MaximumProblems = 50;      ///< in a report
     static constexpr int EntriesAround = 10;        ///< before and after each problem
     static constexpr int LineLimit = 64 * 1024;     ///< longer lines are cut, in bytes

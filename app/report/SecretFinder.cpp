@@ -119,6 +119,9 @@ Pattern AnyCase(SecretKind kind, QString const& expression,
 // Each repetition ends where the next part begins, or is possessive, so that no text takes long.
 std::vector<Pattern> AddressPatterns()
 {
+    const QString domain =
+        QStringLiteral("[\\w-]++(?:\\.[\\w-]++)++(?<!\\.service)(?<!\\.socket)(?<!\\.slice)"
+                       "(?<!\\.timer)(?<!\\.target)(?<!\\.scope)");
     const QString byte = QStringLiteral("(?:25[0-5]|2[0-4][0-9]|1[0-9][0-9]|[1-9]?[0-9])");
     const QString four = byte + QStringLiteral("(?:\\.%1){3}").arg(byte);
     const QString group = QStringLiteral("[0-9a-f]{1,4}");
@@ -133,13 +136,14 @@ std::vector<Pattern> AddressPatterns()
                                                        "[^/\\\\\\s\"'<>:;,|()\\[\\]{}&?*]+")),
         // Not the end of a password before "@", nor units of the system's services.
         {SecretKind::MailAddress,
-         QRegularExpression(
-             QStringLiteral(
-                 "://[^\\s/\"<>]*@(*SKIP)(*F)|(?<![\\w.+%-])(?>(?:(?!%40)[\\w.+%-]|(?<=\\w)"
-                 "'(?=\\w))+)(?:@|%40)(?>[\\w-]+(?:\\.[\\w-]+)+)(?<!\\.service)"
-                 "(?<!\\.socket)(?<!\\.slice)(?<!\\.timer)(?<!\\.target)(?<!\\.scope)"),
-             QRegularExpression::UseUnicodePropertiesOption |
-                 QRegularExpression::CaseInsensitiveOption),
+         QRegularExpression(QStringLiteral("://[^\\s/\"<>]*@(*SKIP)(*F)|(?<![\\w.+%-])[\\w.+%-]++"
+                                           "(?:'[\\w.+%-]++)*+@") +
+                                domain,
+                            QRegularExpression::UseUnicodePropertiesOption),
+         nullptr},
+        {SecretKind::MailAddress,
+         QRegularExpression(QStringLiteral("(?<![\\w.+-])[\\w.+-]++%40") + domain,
+                            QRegularExpression::UseUnicodePropertiesOption),
          nullptr},
         // Not versions such as 1.2.3.4.5, nor addresses that every computer has.
         AnyCase(

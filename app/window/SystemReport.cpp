@@ -4,17 +4,13 @@
 #include "app/window/SystemReport.h"
 
 #include "app/logfile/LogFileList.h"
-#include "app/logfile/LogIndex.h"
 #include "app/runninglog/LogPreferences.h"
 #include "app/runninglog/RunningLog.h"
 #include "app/window/ApplicationProperty.h"
-#include "app/window/log/RunningLogParser.h"
 #include "app/window/widgets/FileSizeText.h"
 #include "common/log/TorkLog.h"
 
 #include <QApplication>
-#include <QDateTime>
-#include <QFile>
 #include <QFileInfo>
 #include <QFont>
 #include <QLocale>
@@ -26,9 +22,6 @@
 namespace Velocor {
 
 namespace {
-
-// The size of one read, in bytes.
-constexpr int SliceSize = 1 << 20;
 
 QString Line(QString const& caption, QString const& text)
 {
@@ -112,47 +105,6 @@ QString LogFiles()
     return QObject::tr("%1, %2 in total").arg(count, FileSizeText(size));
 }
 
-// Reads the whole log, because its newest entries may be anywhere in the file.
-LogRows RowsOf(QFile& file)
-{
-    LogIndex index(RunningLogParser());
-    QByteArray slice(SliceSize, Qt::Uninitialized);
-    qint64 count = 0;
-    file.seek(index.Begin());
-    while ((count = file.read(slice.data(), slice.size())) > 0)
-        index.Feed(slice.constData(), static_cast<int>(count));
-    index.End();
-    return index.Rows(LogFilter());
-}
-
-// A line without its line end; only the start if it is very long.
-QString LineAt(QFile& file, qint64 start)
-{
-    file.seek(start);
-    QByteArray line = file.read(SystemReport::LineLimit + 1);
-    const int end = line.indexOf('\n');
-    const bool isCut = end < 0 && line.size() > SystemReport::LineLimit;
-    line.truncate(end < 0 ? int(SystemReport::LineLimit) : end);
-    return QString::fromLatin1(line) + (isCut ? QString(QChar(0x2026)) : QString());
-}
-
-// The last lines in the order in which they were logged, without headings.
-QStringList LastLines(QString const& path, int count)
-{
-    QFile file(path);
-    if (!QFileInfo(file).isFile() || !file.open(QIODevice::ReadOnly))
-        return QStringList();
-
-    const LogRows rows = RowsOf(file);
-    QStringList lines;
-    for (size_t row = rows.size(); row > 0 && lines.size() < count; --row) {
-        const qint64 start = rows.start(row - 1);
-        if (start >= 0)
-            lines.prepend(LineAt(file, start));
-    }
-    return lines;
-}
-
 QString AvailableSpace()
 {
     const QStorageInfo storage(ApplicationProperty("DataPath"));
@@ -161,13 +113,11 @@ QString AvailableSpace()
 
 } // namespace
 
-QString SystemReport::Facts(QString const& settingsFile)
+QString SystemReport::Versions()
 {
     QString text;
     text += Line(QObject::tr("Program"),
                  QStringLiteral("Velocor %1").arg(QLatin1String(VELOCOR_VERSION)));
-    text += Line(QObject::tr("Organization"), QCoreApplication::organizationName());
-    text += Line(QObject::tr("Product"), QCoreApplication::applicationName());
     text += Line(QObject::tr("Built with Qt"), QLatin1String(QT_VERSION_STR));
     text += Line(QObject::tr("Running with Qt"), QLatin1String(qVersion()));
     text += Line(QObject::tr("Compiler"), Compiler());
@@ -181,6 +131,14 @@ QString SystemReport::Facts(QString const& settingsFile)
     text += Line(QObject::tr("Style"), QApplication::style()->objectName());
     text += Line(QObject::tr("Font"), QApplication::font().toString());
     text += Screens();
+    return text;
+}
+
+QString SystemReport::Places(QString const& settingsFile)
+{
+    QString text;
+    text += Line(QObject::tr("Organization"), QCoreApplication::organizationName());
+    text += Line(QObject::tr("Product"), QCoreApplication::applicationName());
     text += Directory(QObject::tr("Installation"), ApplicationProperty("RootPath"));
     text += Directory(QObject::tr("Data"), ApplicationProperty("DataPath"));
     text += Directory(QObject::tr("Documents"), ApplicationProperty("DocPath"));
@@ -193,8 +151,11 @@ QString SystemReport::Facts(QString const& settingsFile)
     return text;
 }
 
-// The current file alone may not have the end of the previous run: a new run that finds the file
-// full moves it to the older ones first.
+QString SystemReport::Facts(QString const& settingsFile)
+{
+    return Versions() + Places(settingsFile);
+}
+
 QString SystemReport::Licenses()
 {
     return Line(QStringLiteral("License"), QStringLiteral("MIT")) +
@@ -202,22 +163,6 @@ QString SystemReport::Licenses()
                 QStringLiteral("LGPL 3 or GPL 2")) +
            Line(QStringLiteral("rapidxml"), QStringLiteral("Boost Software License 1.0 or MIT")) +
            QLatin1Char('\n');
-}
-
-QString SystemReport::LogTail(int lines)
-{
-    QStringList tail;
-    const QStringList files = LogFileList::FilesOf(RunningLog::FileName()); // newest first
-    for (int i = 0; i < files.size() && tail.size() < lines; ++i)
-        tail = LastLines(files.at(i), lines - tail.size()) + tail;
-    return tail.isEmpty() ? QString() : tail.join(QLatin1Char('\n')) + QLatin1Char('\n');
-}
-
-QString SystemReport::Whole(QString const& settingsFile)
-{
-    const QString time = QDateTime::currentDateTimeUtc().toString(Qt::ISODate);
-    return QObject::tr("Report created %1\n\n").arg(time) + Facts(settingsFile) +
-           QObject::tr("\nLast %1 lines of the log\n\n").arg(TailLines) + LogTail(TailLines);
 }
 
 } // namespace Velocor

@@ -3,9 +3,15 @@
 
 #include "app/window/WindowDialogs.h"
 
+#include "app/report/OwnNames.h"
+#include "app/report/Redactor.h"
+#include "app/report/ReportReader.h"
+#include "app/runninglog/LogPreferences.h"
 #include "app/runninglog/RunningLog.h"
+#include "app/window/ApplicationProperty.h"
 #include "app/window/Manual.h"
 #include "app/window/PlacesPanel.h"
+#include "app/window/ProblemReportDialog.h"
 #include "app/window/ReportDialog.h"
 #include "app/window/ShortcutList.h"
 #include "app/window/SystemReport.h"
@@ -24,8 +30,7 @@ void WindowDialogs::ShowAbout()
     ReportDialog dialog(tr("About %1").arg(QStringLiteral("Velocor")),
                         QStringLiteral("Velocor %1\n").arg(QLatin1String(VELOCOR_VERSION)) +
                             tr("The startup program of the Tork family. MIT license."),
-                        SystemReport::Licenses() + SystemReport::Facts(m_settingsFile), false,
-                        m_window);
+                        SystemReport::Licenses() + SystemReport::Facts(m_settingsFile), m_window);
     dialog.exec();
 }
 
@@ -34,7 +39,7 @@ void WindowDialogs::ShowShortcuts()
     ReportDialog dialog(tr("Keyboard Shortcuts"),
                         tr("Alt and the underlined letter open a menu; Tab goes from one control "
                            "to the next."),
-                        ShortcutList(m_window), false, m_window);
+                        ShortcutList(m_window), m_window);
     dialog.exec();
 }
 
@@ -47,10 +52,17 @@ void WindowDialogs::ShowManual()
 
 void WindowDialogs::SaveReport()
 {
-    ReportDialog dialog(tr("Save Report"),
-                        tr("This is the content of the report. Review it before you share it: "
-                           "the log may contain private information."),
-                        SystemReport::Whole(m_settingsFile), true, m_window);
+    const QString installation = ApplicationProperty("RootPath");
+    QList<ReportPart> parts = {
+        {tr("Versions and system"), SystemReport::Versions(), {}},
+        {tr("Identity and places"), SystemReport::Places(m_settingsFile), {}},
+        ReportReader::Settings(tr("Log settings"), {LogPreferences::FileName()}),
+        ReportReader::Settings(tr("Settings files"),
+                               {m_settingsFile, installation + QLatin1String("appdata.cfg")})};
+    parts += ReportReader::Log(RunningLog::FileName());
+    Redactor redactor;
+    OwnNames::AddTo(redactor);
+    ProblemReportDialog dialog(parts, redactor, m_window);
     dialog.exec();
 }
 

@@ -224,7 +224,7 @@ void tst_Redactor::longLines()
                              "-", "password", "token=", "key ", "<", "\"", "\\", "-----BEGIN "}) {
         Redactor redactor;
         const QString text = QString(part).repeated(100000 / int(qstrlen(part))) + " b@x.org";
-        QVERIFY2(redactor.Redact(text).text.contains("<"), part);
+        QVERIFY2(redactor.Redact(text).text.size() > 99990, part); // not the line instead
         QVERIFY2(!redactor.Redact(text).text.contains("b@x.org"), part);
     }
 }

@@ -8,12 +8,12 @@
 #include "WindowTestCase.h"
 
 #include "app/logfile/LogIndex.h"
+#include "app/report/ReportReader.h"
 #include "app/runninglog/InstanceList.h"
 #include "app/settingsfile/SettingsFileReader.h"
 #include "app/settingsfile/SettingsFileWriter.h"
 #include "app/window/FileTabs.h"
 #include "app/window/RecentFiles.h"
-#include "app/window/ReportDialog.h"
 #include "app/window/SystemReport.h"
 #include "app/window/WindowSettings.h"
 #include "app/window/log/LogModel.h"
@@ -200,10 +200,6 @@ private slots:
     void dialogOfOtherLineBreaks_data();
     void dialogOfOtherLineBreaks();
     void valueDialogPastes();
-
-    void reportEndsWithTheLastLine();
-    void reportOfALongNewestRun();
-    void reportOfLongLines();
 };
 
 void tst_HostileFiles::initTestCase()
@@ -291,8 +287,6 @@ void tst_HostileFiles::readersAndWriters()
     QVERIFY(!SettingsFileWriter::KeepBackup(file, &error));
     QCOMPARE(error, QString("Not a regular file"));
     QCOMPARE(TestFiles::read(file + ".bak"), QByteArray("kept"));
-    const ReportDialog dialog("T", "H", "text", true);
-    QCOMPARE(dialog.SaveTo(file), QString("Not a regular file"));
     QVERIFY(!QFileInfo(file).isFile());
     QVERIFY(!pipe.wasOpened());
     QVERIFY(SystemReport::Facts(file).contains(file + " (not a regular file)"));
@@ -346,7 +340,7 @@ void tst_HostileFiles::logIsAPipe()
 {
     const WindowTest test;
     const Pipe pipe(test.logFile());
-    QCOMPARE(SystemReport::LogTail(10), QString());
+    QVERIFY(ReportReader::Log(test.logFile()).at(0).text.startsWith("The log is empty.\n"));
     LogPanel panel;
     panel.Open(test.logFile(), true);
     QTRY_VERIFY_WITH_TIMEOUT(panel.view()->accessibleDescription().endsWith("\nNot a regular file"),
@@ -818,42 +812,6 @@ void tst_HostileFiles::valueDialogPastes()
     QTest::keyClick(text, Qt::Key_End, Qt::ControlModifier);
     QTest::keyClick(text, Qt::Key_V, Qt::ControlModifier);
     QVERIFY(dialog.value() == value + pasted);
-}
-
-void tst_HostileFiles::reportEndsWithTheLastLine()
-{
-    QByteArray log = DemoLog::run(40000, QTime(1, 0), qPrintable(QString(500, 'x')));
-    QVERIFY(log.size() > 18 << 20);
-    const QByteArray last = DemoLog::entry("23:00:00.000", "Fatal", "the end");
-    const WindowTest test(log + last);
-    const QString tail = SystemReport::LogTail(SystemReport::TailLines);
-    QVERIFY2(tail.endsWith('\n' + last), qPrintable(tail.right(200)));
-    QCOMPARE(tail.count('\n'), int(SystemReport::TailLines));
-}
-
-// The newest run at the top ends after more than 16 MiB, and an older one follows.
-void tst_HostileFiles::reportOfALongNewestRun()
-{
-    const QByteArray padding(500, 'x');
-    const QByteArray older = DemoLog::run(45000, QTime(1, 0), ("old" + padding).constData(), true);
-    const QByteArray newer = DemoLog::run(40000, QTime(1, 0), ("new" + padding).constData());
-    QVERIFY(newer.size() > 18 << 20 && older.size() > newer.size() + (1 << 20));
-    const WindowTest test(DemoLog::writtenOver(older, newer));
-    const QString tail = SystemReport::LogTail(3);
-    QCOMPARE(tail, QString(newer).section('\n', -4));
-}
-
-void tst_HostileFiles::reportOfLongLines()
-{
-    const QByteArray whole = DemoLog::entry("09:00:00.000", "Trace", QString(60000, 'w'));
-    const QByteArray cut = DemoLog::entry("09:00:01.000", "Trace", QString(20 << 20, 'c'));
-    const QByteArray last = DemoLog::entry("09:00:02.000", "Fatal", "the end");
-    const WindowTest test(whole + cut + last);
-    const QStringList lines = SystemReport::LogTail(10).split('\n');
-    QCOMPARE(lines.size(), 4);
-    QCOMPARE(lines.at(0) + '\n', QString(whole));
-    QCOMPARE(lines.at(1), QString(cut.left(SystemReport::LineLimit)) + QChar(0x2026));
-    QCOMPARE(lines.at(2) + '\n', QString(last));
 }
 
 QTEST_MAIN(tst_HostileFiles)

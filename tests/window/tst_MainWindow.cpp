@@ -8,8 +8,8 @@
 
 #include "app/window/FileTabs.h"
 #include "app/window/PlacesPanel.h"
+#include "app/window/ProblemReportDialog.h"
 #include "app/window/ReportDialog.h"
-#include "app/window/SystemReport.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/widgets/ElidedLabel.h"
 #include "app/window/widgets/NoticeBar.h"
@@ -22,6 +22,7 @@
 #include <QFileDialog>
 #include <QLabel>
 #include <QLineEdit>
+#include <QListWidget>
 #include <QMenuBar>
 #include <QMessageBox>
 #include <QMimeData>
@@ -30,6 +31,7 @@
 #include <QScreen>
 #include <QSplitter>
 #include <QStandardPaths>
+#include <QTextBlock>
 #include <QToolBar>
 #include <QToolButton>
 
@@ -45,6 +47,17 @@ QString Place(MainWindow& window, QString const& name)
 {
     auto const* field = Child<QLabel>(&window, name);
     return field ? field->text() : QString();
+}
+
+template <class Button>
+Button* ChildWithText(QWidget* parent, QString const& text)
+{
+    const QList<Button*> all = parent->findChildren<Button*>();
+    for (Button* button : all) {
+        if (button->text().remove('&') == text)
+            return button;
+    }
+    return nullptr;
 }
 
 // Takes what would be shown in another program.
@@ -91,6 +104,8 @@ private slots:
     void toolBar();
     void placesElidePaths();
     void saveReport();
+    void choicesOfAReport();
+    void marksOfAReport();
 
     void keepsItsState();
     void damagedState();
@@ -486,37 +501,80 @@ void tst_MainWindow::placesElidePaths()
     QVERIFY(place->toolTip().contains(QString("a-long-name/").repeated(30)));
 }
 
-// Nothing of a long one is missing: neither on the screen nor in the file nor in the clipboard.
+// What is saved is what is shown.
 void tst_MainWindow::saveReport()
 {
-    const QByteArray log =
-        run(SystemReport::TailLines, QTime(9, 0), QByteArray(900, 'x').constData());
-    const WindowTest test(log);
+    const WindowTest test(run(3, QTime(9, 0), "by ada@example.org"));
     const auto window = WindowTest::show();
-    const QString file = test.folder() + "report.txt";
-    WindowTest::whenShown<ReportDialog>([&](ReportDialog* dialog) {
-        // What is saved is what is shown.
-        auto const* shown = Child<QPlainTextEdit>(dialog, "Save Report");
-        QCOMPARE(shown->toPlainText().right(log.size()), QString(log));
+    const QString folder = test.folder() + "report";
+    QString shown;
+    WindowTest::whenShown<ProblemReportDialog>([&](ProblemReportDialog* dialog) {
+        auto const* text = Child<QPlainTextEdit>(dialog, "Report");
+        QVERIFY2(text->toPlainText().startsWith("# Report\n"), qPrintable(text->toPlainText()));
+        Child<QComboBox>(dialog, "File of the report")->setCurrentText("last-run.log");
+        shown = text->toPlainText();
+        Click(ChildWithText<QPushButton>(dialog, "Copy File"));
         WindowTest::whenShown<QFileDialog>([&](QFileDialog* chooser) {
+            chooser->selectNameFilter("New folder (*)");
             auto* name = chooser->findChild<QLineEdit*>("fileNameEdit");
-            name->setText(file);
+            name->setText(folder);
             QTest::keyClick(name, Qt::Key_Return);
         });
-        const QList<QPushButton*> buttons = dialog->findChildren<QPushButton*>();
-        for (char const* caption : {"Copy", "Save..."}) {
-            for (QPushButton* button : buttons) {
-                if (button->text().remove('&') == caption)
-                    Click(button);
-            }
-        }
+        Click(ChildWithText<QPushButton>(dialog, "Save..."));
     });
     QTest::keyClick(window.get(), Qt::Key_R, Qt::ControlModifier | Qt::ShiftModifier);
-    QTRY_VERIFY_WITH_TIMEOUT(QFile::exists(file), Patience);
-    QVERIFY(TestFiles::read(file).endsWith(log));
-    QCOMPARE(QGuiApplication::clipboard()->text().toUtf8(), TestFiles::read(file));
-    const ReportDialog dialog("T", "H", "text", true);
-    QVERIFY(!dialog.SaveTo(test.folder() + "no/such/file").isEmpty());
+    QTRY_VERIFY_WITH_TIMEOUT(QFile::exists(folder + "/report.md"), Patience);
+    QVERIFY2(shown.contains("by <mail-1> 0\n"), qPrintable(shown));
+    QCOMPARE(QString(TestFiles::read(folder + "/last-run.log")), shown);
+    QCOMPARE(QGuiApplication::clipboard()->text(), shown);
+}
+
+// Parts that are not ticked and words of the user are not in the report; what the user wants back
+// is.
+void tst_MainWindow::choicesOfAReport()
+{
+    ProblemReportDialog dialog({{"One", "ada@example.org and Blue Moon\n", {{"1.log", "x\n"}}},
+                                {"Two", "bob@example.org\n", {{"2.log", "y\n"}}}},
+                               Redactor());
+    dialog.show();
+    auto const* text = Child<QPlainTextEdit>(&dialog, "Report");
+    auto* files = Child<QComboBox>(&dialog, "File of the report");
+    auto* secrets = Child<QListWidget>(&dialog, "Replaced by placeholders");
+    QCOMPARE(files->count(), 3);
+    QCOMPARE(secrets->count(), 2);
+    QCOMPARE(secrets->item(1)->text(), QString("<mail-2>  bob@example.org"));
+    files->setCurrentText("2.log");
+    ChildWithText<QCheckBox>(&dialog, "Two")->setChecked(false);
+    QCOMPARE(files->count(), 2);
+    QCOMPARE(files->currentText(), QString("report.md"));
+    QCOMPARE(secrets->count(), 1);
+    QVERIFY(text->toPlainText().contains("<mail-1> and Blue Moon\n"));
+    QVERIFY(!text->toPlainText().contains("Two"));
+
+    secrets->item(0)->setCheckState(Qt::Unchecked);
+    QTRY_VERIFY_WITH_TIMEOUT(text->toPlainText().contains("ada@example.org and"), Patience);
+    QCOMPARE(secrets->item(0)->checkState(), Qt::Unchecked);
+    secrets->item(0)->setCheckState(Qt::Checked);
+    QTRY_VERIFY_WITH_TIMEOUT(text->toPlainText().contains("<mail-1> and"), Patience);
+    Child<QLineEdit>(&dialog, "Also replace")->setText("xyz, blue moon");
+    QTRY_VERIFY_WITH_TIMEOUT(text->toPlainText().contains("<mail-1> and <word-1>\n"), Patience);
+    QCOMPARE(text->toPlainText(), dialog.report().files().front().content.text);
+}
+
+// Placeholders have another background, and nothing else has.
+void tst_MainWindow::marksOfAReport()
+{
+    ProblemReportDialog dialog({{"One", "1\n12 ada@example.org 3\n", {}}}, Redactor());
+    auto const* text = Child<QPlainTextEdit>(&dialog, "Report");
+    QStringList marked;
+    for (QTextBlock block = text->document()->begin(); block.isValid(); block = block.next()) {
+        const auto formats = block.layout()->formats();
+        for (QTextLayout::FormatRange const& range : formats) {
+            if (range.format.background().style() != Qt::NoBrush)
+                marked.append(block.text().mid(range.start, range.length));
+        }
+    }
+    QCOMPARE(marked, QStringList({"<mail-1>"}));
 }
 
 void tst_MainWindow::keepsItsState()

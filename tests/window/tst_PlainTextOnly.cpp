@@ -10,6 +10,7 @@
 #include "app/runninglog/LogPreferences.h"
 #include "app/window/FileTabs.h"
 #include "app/window/PlacesPanel.h"
+#include "app/window/ProblemReportDialog.h"
 #include "app/window/ReportDialog.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogPanel.h"
@@ -437,7 +438,11 @@ void tst_PlainTextOnly::dialogs()
     const HostilePlace place(markup);
     LogSettingsDialog settings;
     QCOMPARE(Breaches(&settings).join('\n'), QString());
-    ReportDialog report(markup, markup, markup, true);
+    ReportDialog text(markup, markup, markup);
+    QCOMPARE(Breaches(&text).join('\n'), QString());
+    Redactor redactor;
+    redactor.SetWords({markup});
+    ProblemReportDialog report({{markup, markup, {{markup, markup}}}}, redactor);
     QCOMPARE(Breaches(&report).join('\n'), QString());
     Velocor::ValueDialog value(markup, markup);
     QCOMPARE(Breaches(&value).join('\n'), QString());
@@ -554,7 +559,7 @@ void tst_PlainTextOnly::boxOfTheFileDialog()
     const auto window = WindowTest::show();
     QStringList breaches("no box");
     QString text;
-    WindowTest::whenShown<ReportDialog>([&](ReportDialog* dialog) {
+    WindowTest::whenShown<ProblemReportDialog>([&](ProblemReportDialog* dialog) {
         WindowTest::whenShown<QFileDialog>([&](QFileDialog* chooser) {
             auto* name = chooser->findChild<QLineEdit*>("fileNameEdit");
             name->setText(place.log);

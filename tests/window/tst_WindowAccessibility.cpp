@@ -7,6 +7,7 @@
 #include "WindowTestCase.h"
 
 #include "app/UserMessages.h"
+#include "app/window/ProblemReportDialog.h"
 #include "app/window/ReportDialog.h"
 #include "app/window/log/GoToDialog.h"
 #include "app/window/log/HighlightDialog.h"
@@ -122,7 +123,9 @@ void tst_WindowAccessibility::namesInDialogs()
     const WindowTest test;
     LogSettingsDialog settings;
     QCOMPARE(NamelessControls(&settings), QStringList());
-    ReportDialog report("Title", "Heading", "Text", true);
+    ReportDialog text("Title", "Heading", "Text");
+    QCOMPARE(NamelessControls(&text), QStringList());
+    ProblemReportDialog report({{"Part", "Text", {}}}, Redactor());
     QCOMPARE(NamelessControls(&report), QStringList());
     GoToDialog goTo(10, true, nullptr);
     QCOMPARE(NamelessControls(&goTo), QStringList());

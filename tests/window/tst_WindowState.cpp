@@ -5,16 +5,17 @@
 
 #include "WindowTest.h"
 
+#include "app/report/Report.h"
 #include "app/runninglog/LogPreferences.h"
 #include "app/runninglog/RunningLog.h"
 #include "app/window/RecentFiles.h"
-#include "app/window/ReportDialog.h"
 #include "app/window/SystemReport.h"
 #include "app/window/WindowSettings.h"
 #include "app/window/widgets/FileSizeText.h"
 #include "app/window/widgets/SeverityIcons.h"
 #include "support/ProcessLimits.h"
 
+#include <QCryptographicHash>
 #include <QMenu>
 #include <QScreen>
 
@@ -51,8 +52,6 @@ private slots:
     void fileSize();
     void withoutALog();
     void report();
-    void reportIncludesOlderFiles_data();
-    void reportIncludesOlderFiles();
     void reportOfATroubledLog();
     void fullDiskLeavesTheOldReport();
     void severityIcons();
@@ -352,21 +351,13 @@ void tst_WindowState::withoutALog()
     QCOMPARE(LogPreferences::FileName(), QString());
     QCOMPARE(LogPreferences::Read().dateFormat, QString("yyyy-MM-dd hh:mm:ss.z"));
     QCOMPARE(LogPreferences().Apply(), QString("There is no log."));
-    QCOMPARE(SystemReport::LogTail(10), QString());
     const QString facts = SystemReport::Facts(test.settingsFile());
     QVERIFY2(facts.contains("Log: none\n"), qPrintable(facts));
 }
 
 void tst_WindowState::report()
 {
-    const QByteArray older = DemoLog::run(300, QTime(17, 0), "older", true);
-    const QByteArray newer = DemoLog::run(20, QTime(9, 0), "newer");
-    const WindowTest test(DemoLog::writtenOver(older, newer));
-    const QString tail = SystemReport::LogTail(25);
-    QCOMPARE(tail.split('\n').size(), 26);
-    QVERIFY(tail.startsWith(QString(older).section('\n', 295, 295)));
-    QVERIFY(tail.endsWith(QString(newer)));
-
+    const WindowTest test;
     const QString facts = SystemReport::Facts(test.settingsFile());
     for (QString const& expected :
          {QString("Program: Velocor "), QString("Running with Qt: ") + qVersion(),
@@ -374,37 +365,6 @@ void tst_WindowState::report()
           QString("Style: "), QString("Screen 1: "), "Data: " + test.folder() + "data/ (",
           "Log file: " + test.logFile() + " ("})
         QVERIFY2(facts.contains(expected), qPrintable("missing: " + expected + "\n" + facts));
-    const QString whole = SystemReport::Whole(test.settingsFile());
-    QVERIFY(whole.contains(facts));
-    QVERIFY(whole.endsWith(SystemReport::LogTail(SystemReport::TailLines)));
-}
-
-void tst_WindowState::reportIncludesOlderFiles_data()
-{
-    QTest::addColumn<int>("lines");
-    QTest::addColumn<QByteArray>("expected");
-
-    const QByteArray now = DemoLog::run(2, QTime(9, 0), "now");
-    const QByteArray crashed = DemoLog::run(3, QTime(8, 0), "crashed");
-    const QByteArray before = DemoLog::run(4, QTime(7, 0), "before");
-    const auto row = [](char const* name, int lines, QByteArray const& expected) {
-        QTest::newRow(name) << lines << expected;
-    };
-    row("the current one has enough lines", 2, now);
-    row("the end of the newest older one", 4, crashed.mid(crashed.indexOf('\n') + 1) + now);
-    row("all of it", 5, crashed + now);
-    row("all files", 20, before + crashed + now);
-}
-
-// After a restart that moved a full file, the end of the crashed run is in an older one.
-void tst_WindowState::reportIncludesOlderFiles()
-{
-    QFETCH(int, lines);
-    QFETCH(QByteArray, expected);
-    const WindowTest test(DemoLog::run(2, QTime(9, 0), "now"));
-    QVERIFY(TestFiles::write(test.logFile() + ".1", DemoLog::run(3, QTime(8, 0), "crashed")));
-    QVERIFY(TestFiles::write(test.logFile() + ".2", DemoLog::run(4, QTime(7, 0), "before")));
-    QCOMPARE(SystemReport::LogTail(lines), QString(expected));
 }
 
 void tst_WindowState::reportOfATroubledLog()
@@ -415,11 +375,6 @@ void tst_WindowState::reportOfATroubledLog()
     TorkLog::logger()->setEnable(false);
     const QString facts = SystemReport::Facts(test.settingsFile());
     QVERIFY2(facts.contains("Log: off, ") && facts.contains(", last error: "), qPrintable(facts));
-    QCOMPARE(SystemReport::LogTail(10), QString());
-
-    TestFiles::write(test.folder() + "data/logs/only.log", "");
-    QVERIFY(QDir(test.logFile()).removeRecursively());
-    QCOMPARE(SystemReport::LogTail(10), QString());
 }
 
 namespace {
@@ -444,15 +399,19 @@ double Contrast(QColor const& a, QColor const& b)
 void tst_WindowState::fullDiskLeavesTheOldReport()
 {
     const WindowTest test;
-    const QString file = test.folder() + "report.txt";
-    QVERIFY(TestFiles::write(file, "old"));
-    const ReportDialog dialog("T", "H", QString(100000, 'x'), true);
+    const QString path = test.folder() + "report.zip";
+    QVERIFY(TestFiles::write(path, "old"));
+    QByteArray random;
+    for (int i = 0; i < 20000; ++i)
+        random += QCryptographicHash::hash(QByteArray::number(i), QCryptographicHash::Md5).toHex();
+    Redactor redactor;
+    const Report report({{"Part", random, {}}}, redactor);
     if (!ProcessLimits::limitFileSize(1000))
         QSKIP("the size of files cannot be limited here");
-    const QString error = dialog.SaveTo(file);
+    const QString error = report.Save(path);
     ProcessLimits::unlimitFileSize();
     QVERIFY(!error.isEmpty());
-    QCOMPARE(TestFiles::read(file), QByteArray("old"));
+    QCOMPARE(TestFiles::read(path), QByteArray("old"));
 }
 
 void tst_WindowState::severityIcons()
