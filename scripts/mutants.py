@@ -69,7 +69,8 @@ def try_all(mutants, sources, desks, wanted):
         if not left:
             break
         names = sorted({m["file"] for m in left})
-        reached, state = record("plain", desks, sources, build_tests(names, stage, len(desks)), wanted)
+        reached, tests = record("plain", desks, sources, build_tests(names, stage, len(desks)), wanted)
+        state = digest(tests, str(stage))  # of other sources, the same tests may come at another stage
         for number, functions in reached.items():
             reaching.setdefault(number, []).extend(functions)
         left = open_ones(left, state)

@@ -54,7 +54,6 @@ void LogFinder::Find(LogFindRequest const& request)
 
 void LogFinder::findAll(LogLineReader& reader)
 {
-    m_found.clear();
     if (search(reader, 0, m_request.rows->size(), true))
         report(m_request.rows->size(), true);
 }

@@ -8,6 +8,8 @@
 #include <QTemporaryDir>
 #include <QtTest>
 
+#include <random>
+
 using namespace Velocor;
 
 class tst_HistoryMerge : public QObject
@@ -17,6 +19,7 @@ class tst_HistoryMerge : public QObject
 private slots:
     void byTime_data();
     void byTime();
+    void anyLogs();
 };
 
 void tst_HistoryMerge::byTime_data()
@@ -62,6 +65,46 @@ void tst_HistoryMerge::byTime()
         found += QString::fromLatin1(merge.cursor().content().right(1));
     QCOMPARE(found, merged);
     QVERIFY(!merge.Next());
+}
+
+// Always the line that is next by its time, or the one of the first log of several.
+void tst_HistoryMerge::anyLogs()
+{
+    std::mt19937 random(1);
+    for (int round = 0; round < 60; ++round) {
+        const QTemporaryDir folder;
+        std::vector<std::vector<int>> seconds(1 + random() % 14);
+        std::vector<LogHistory> histories(seconds.size());
+        std::vector<HistoryCursor> cursors;
+        for (size_t log = 0; log < seconds.size(); ++log) {
+            QByteArray text;
+            int second = int(random() % 20);
+            for (int line = int(random() % 6); line > 0; --line) {
+                text += "2025-03-03 09:00:" + QByteArray::number(10 + second) + ".0 Trace x\n";
+                seconds[log].push_back(second);
+                second += int(random() % 6);
+            }
+            const QString path = folder.filePath(QString::number(log) + ".log");
+            QVERIFY(TestFiles::write(path, text));
+            QVERIFY(histories[log].ReadLog(path));
+            cursors.emplace_back(histories[log], true);
+        }
+        HistoryMerge merge(std::move(cursors));
+        std::vector<size_t> next(seconds.size());
+        while (merge.Next()) {
+            size_t first = seconds.size();
+            for (size_t log = seconds.size(); log-- > 0;) {
+                if (next[log] < seconds[log].size() &&
+                    (first == seconds.size() ||
+                     seconds[log][next[log]] <= seconds[first][next[first]]))
+                    first = log;
+            }
+            QCOMPARE(merge.log(), first);
+            ++next[first];
+        }
+        for (size_t log = 0; log < seconds.size(); ++log)
+            QCOMPARE(next[log], seconds[log].size());
+    }
 }
 
 QTEST_GUILESS_MAIN(tst_HistoryMerge)

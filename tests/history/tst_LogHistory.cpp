@@ -5,6 +5,7 @@
 
 #include "app/history/HistoryCursor.h"
 #include "app/logfile/ForeignStamp.h"
+#include "app/logfile/LogIndex.h"
 #include "support/TestFiles.h"
 
 #include <QTemporaryDir>
@@ -56,6 +57,8 @@ private slots:
     void dates_data();
     void dates();
     void filter();
+    void wideCharacters();
+    void timeAtTheEndOfALongLine();
 
 private:
     QTemporaryDir m_folder;
@@ -242,6 +245,37 @@ void tst_LogHistory::filter()
     while (cursor.Next())
         lines += QByteArray::number(static_cast<int>(cursor.line()));
     QCOMPARE(lines, QByteArray("5012"));
+}
+
+void tst_LogHistory::wideCharacters()
+{
+    const QString log = m_folder.filePath("wide.log");
+    QByteArray wide("\xff\xfe", 2);
+    for (char c : QByteArray("2025-03-03 09:00:01 ERROR a\n2025-03-03 09:00:02 INFO b\n"))
+        wide.append(c).append('\0');
+    QVERIFY(TestFiles::write(log, wide));
+    LogHistory history;
+    QVERIFY(history.ReadFiles({log}));
+    history.ReadTimes();
+    QCOMPARE(history.runs().size(), size_t(1));
+    QCOMPARE(history.runs()[0].start, KeyOf("2025-03-03 09:00:01"));
+    QCOMPARE(history.runs()[0].end, KeyOf("2025-03-03 09:00:02"));
+}
+
+// As much of a line is looked at as the index does.
+void tst_LogHistory::timeAtTheEndOfALongLine()
+{
+    const QString log = m_folder.filePath("long.log");
+    const QByteArray start("{\"a\":\"");
+    const QByteArray end("\",\"time\":\"2025-03-03 09:00:01\"");
+    const QByteArray first("{\"level\":\"info\",\"msg\":\"x\"}\n");
+    const QByteArray filling(LogIndex::PartsLimit - start.size() - end.size(), 'x');
+    QVERIFY(TestFiles::write(log, first + start + filling + end + "}\n"));
+    LogHistory history;
+    QVERIFY(history.ReadFiles({log}));
+    history.ReadTimes();
+    QCOMPARE(history.runs().size(), size_t(1));
+    QCOMPARE(history.runs()[0].start, KeyOf("2025-03-03 09:00:01"));
 }
 
 QTEST_GUILESS_MAIN(tst_LogHistory)

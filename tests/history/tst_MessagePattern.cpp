@@ -43,6 +43,10 @@ void tst_MessagePattern::pattern_data()
     row("hexadecimal that begins with a digit", "code 1f", "code #");
     row("a short word with a digit", "a4 paper", "a# paper");
     row("letters that could be hexadecimal", "added facade", "added facade");
+    row("number with a comma", "1,234 files", "# files");
+    row("version in a word", "lib v1.2x", "lib v#x");
+    row("digits at the end of a word and of a sentence", "see g4.", "see g#.");
+    row("digits in a word, before a separator", "see g4.x", "see g#.x");
     row("digits in a word", "utf8 id42x", "utf# id#x");
     row("double quotes", "cannot read \"a b.txt\" now", "cannot read \"…\" now");
     row("single quotes", "user 'ada'", "user '…'");
@@ -79,6 +83,12 @@ void tst_MessagePattern::list()
     QCOMPARE(sorted[1].severity, LogEntry::Error); // came before the next one
     QCOMPARE(sorted[2].text, QString("start"));
     QCOMPARE(sorted[2].first, qint64(-1));
+
+    PatternList fromZero;
+    fromZero.Add(LogEntry::Error, "page 1", 0);
+    fromZero.Add(LogEntry::Error, "page 2", 5);
+    QCOMPARE(fromZero.Sorted()[0].first, qint64(0));
+    QCOMPARE(fromZero.Sorted()[0].last, qint64(5));
 }
 
 void tst_MessagePattern::manyPatterns()
@@ -94,6 +104,7 @@ void tst_MessagePattern::manyPatterns()
     QCOMPARE(sorted.size(), size_t(PatternList::MaximumPatterns + 1));
     QCOMPARE(sorted[0].text, QString(QChar(0x2026)));
     QCOMPARE(sorted[0].count, size_t(10));
+    QCOMPARE(sorted[0].severity, LogEntry::None);
 }
 
 QTEST_GUILESS_MAIN(tst_MessagePattern)

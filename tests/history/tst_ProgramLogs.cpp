@@ -9,6 +9,10 @@
 #include <QTemporaryDir>
 #include <QtTest>
 
+#ifdef Q_OS_UNIX
+#include <sys/stat.h>
+#endif
+
 using namespace Velocor;
 
 namespace {
@@ -31,6 +35,10 @@ private slots:
     void programLogs();
     void formats_data();
     void formats();
+    void elapsedPrefix();
+#ifdef Q_OS_UNIX
+    void pipeForSettings();
+#endif
 };
 
 void tst_ProgramLogs::programLogs()
@@ -59,6 +67,12 @@ void tst_ProgramLogs::formats_data()
         << QByteArray("<LogSettings>\n<config>\n<dateTimeFormat><![CDATA[dd/MM/yyyy hh:mm]]>"
                       "</dateTimeFormat>\n</config>\n</LogSettings>\n")
         << true;
+    const QByteArray start("<LogSettings><config><dateTimeFormat>dd/MM/yyyy hh:mm</dateTimeFormat>"
+                           "<x>");
+    const QByteArray end("</x></config></LogSettings>");
+    const QByteArray filling((1 << 20) - start.size() - end.size(), 'x');
+    QTest::newRow("as large as it may be") << start + filling + end << true;
+    QTest::newRow("too large") << start + filling + 'x' + end << false;
     QTest::newRow("no settings file") << QByteArray() << false;
     QTest::newRow("damaged") << QByteArray("<LogSettings><config><dateTimeFormat") << false;
 }
@@ -76,6 +90,32 @@ void tst_ProgramLogs::formats()
     const QByteArray usual = "2025-03-03 09:02:11.031 Trace pages 3";
     QVERIFY(parser.Find(usual.constData(), usual.size()).timeKey >= 0);
 }
+
+void tst_ProgramLogs::elapsedPrefix()
+{
+    const QTemporaryDir folder;
+    QVERIFY(TestFiles::write(folder.filePath("logsettings.cfg"),
+                             "<LogSettings><config><elapsedTimePrefix>took:"
+                             "</elapsedTimePrefix></config></LogSettings>"));
+    const LogLineParser parser = LogFormats::ParserFor(folder.filePath("a.log"));
+    const QByteArray line = "2025-03-03 09:02:11.031 Trace took:[12] x";
+    QVERIFY(parser.Find(line.constData(), line.size()).elapsedLength > 0);
+    const LogLineParser other = LogFormats::ParserFor(folder.filePath("none/a.log"));
+    QCOMPARE(other.Find(line.constData(), line.size()).elapsedLength, 0);
+}
+
+#ifdef Q_OS_UNIX
+// Opening it would wait for somebody who writes.
+void tst_ProgramLogs::pipeForSettings()
+{
+    const QTemporaryDir folder;
+    const QByteArray pipe = QFile::encodeName(folder.filePath("logsettings.cfg"));
+    QCOMPARE(::mkfifo(pipe.constData(), 0666), 0);
+    const LogLineParser parser = LogFormats::ParserFor(folder.filePath("a.log"));
+    const QByteArray usual = "2025-03-03 09:02:11.031 Trace pages 3";
+    QVERIFY(parser.Find(usual.constData(), usual.size()).timeKey >= 0);
+}
+#endif
 
 QTEST_GUILESS_MAIN(tst_ProgramLogs)
 #include "tst_ProgramLogs.moc"

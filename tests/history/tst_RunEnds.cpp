@@ -114,6 +114,7 @@ void tst_RunEnds::damagedRecords()
     const std::vector<RunEnd> ends = RunEnds::Of(log);
     QCOMPARE(ends.size(), size_t(1));
     QCOMPARE(RunEnds::Line(ends[0]), good);
+    QCOMPARE(ends[0].exit, HistoryRun::Abnormal);
     QCOMPARE(ends[0].end - ends[0].start, qint64(1093));
     QCOMPARE(RunEnds::RecordFileOf(folder.filePath("app.log")), QString());
     QCOMPARE(RunEnds::Of(folder.filePath("app.log")).size(), size_t(0));

@@ -81,6 +81,7 @@ private slots:
     void keys();
     void epochs_data();
     void epochs();
+    void epochText();
     void anyBytes();
 };
 
@@ -291,6 +292,11 @@ void tst_ForeignLine::formats_data()
         "1200 E x");
     row("kernel, facility with blanks", "daemon :notice: x", "", note, "x");
     row("kernel, facility without blanks", "user:info:x", "", note, "x");
+    row("access stamp after a prefix", "Log ended: [22/Nov/2026:14:03:02 +0000] x",
+        "22/Nov/2026:14:03:02 +0000", none, "Log ended: [22/Nov/2026:14:03:02 +0000] x");
+    row("priority, and a letter that is none", "<34>E, [x] y", "", fatal, "E, [x] y");
+    row("JSON, empty message before another", R"({"message":"","level":"info","msg":"x"})", "",
+        note, "x");
     row("JSON", R"({"time":"2026-11-22T14:03:02Z","level":"error","msg":"disk full"})",
         "2026-11-22T14:03:02Z", error, "disk full");
     row("JSON, level by number", R"({"level":50,"time":"14:03:02","pid":71,"msg":"x"})", "14:03:02",
@@ -351,6 +357,8 @@ void tst_ForeignLine::formats()
     QCOMPARE(parts.timeLength > 0, !entry.time.isEmpty());
     QCOMPARE(parts.timeKey >= 0, !entry.time.isEmpty());
 
+    const bool hasDate = entry.time.contains(QRegularExpression("[-/ ]|[0-9]T|\\d\\.\\d+\\."));
+    QCOMPARE(parts.hasDate, hasDate);
     QVERIFY(IsCutAnywhere(line));
 }
 
@@ -407,6 +415,8 @@ void tst_ForeignLine::noEntries_data()
     row("JSON without known members", "{\"a\":1}");
     row("assignment", "a=1 b=2");
     row("list of a level's letter", "[E] done");
+    row("letter, comma and no stamp", "E, [x] y");
+    row("JSON, no time", R"({"time":"soon"})");
     row("level after what is no stamp", "Log started: ERROR: x");
     row("facility without a level", "kern : x : y");
     row("facility without a second colon", "kern :err x");
@@ -522,8 +532,19 @@ void tst_ForeignLine::epochs()
     QCOMPARE(entry.severity, LogEntry::Notification);
     const QByteArray written = time.toString("yyyy-MM-dd hh:mm:ss.zzz INFO x").toLatin1();
     const LogLineParser parser = ForeignParser();
+    QVERIFY(parser.Find(line.constData(), line.size()).hasDate);
     QCOMPARE(parser.Find(line.constData(), line.size()).timeKey,
              parser.Find(written.constData(), written.size()).timeKey);
+}
+
+void tst_ForeignLine::epochText()
+{
+    const QString format("yyyy-MM-dd hh:mm:ss.zzz");
+    QCOMPARE(ForeignLine::EpochText("0000000000", 10),
+             QDateTime::fromMSecsSinceEpoch(0).toString(format));
+    QCOMPARE(ForeignLine::EpochText("1795442582.25", 13),
+             QDateTime::fromMSecsSinceEpoch(1795442582250).toString(format));
+    QCOMPARE(ForeignLine::EpochText("179544258", 9), QString());
 }
 
 // No bytes are read beyond the line, and the parts are within it. Also meant for the sanitizers.

@@ -165,6 +165,8 @@ void tst_LogFields::logfmt_data()
     row("quoted, nothing between", "a=\"1\"b=3", {"a=1", "b=3"});
     row("quoted, empty", "a=\"\" b=3", {"a=", "b=3"});
     row("quoted, with escapes", R"(a="1\"2\\" b="3")", {"a=\\1\\\"2\\\\", "b=3"});
+    row("quoted, cut after an escape", R"(a="1\x)", {"a=\\1\\x"});
+    row("quoted, cut after an escaped quotation mark", R"(a="1\")", {"a=\\1\\\""});
     row("quotation mark within", "a=1\"2 b=3", {"a=1\"2", "b=3"});
     row("backslash without quotation marks", R"(a=1\ b=2)", {"a=1\\", "b=2"});
     row("equals sign in the value", "a=b=c d==", {"a=b=c", "d=="});

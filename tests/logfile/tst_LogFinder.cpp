@@ -74,6 +74,7 @@ private slots:
     void slowFirstLine();
     void noFile();
     void obsoleteRequest();
+    void anotherFile();
     void incompleteLine();
     void sameCheck();
     void emptyBefore();
@@ -300,6 +301,9 @@ void tst_LogFinder::slowFirstLine()
         QCOMPARE(hits.slowLine, qint64(1));
         QVERIFY(hits.hits->empty());
     }
+    const LogHits other = find(finder, Text("x"), RowsOf(IndexOf(log)), false);
+    QCOMPARE(other.slowLine, qint64(0));
+    QCOMPARE(other.hits->size(), size_t(9));
 }
 
 void tst_LogFinder::noFile()
@@ -318,6 +322,25 @@ void tst_LogFinder::obsoleteRequest()
     finder.SetCurrentRequest(m_number + 2);
     QVERIFY(!find(finder, Text("a"), RowsOf(IndexOf(log))).rows);
     QVERIFY(find(finder, Text("a"), RowsOf(IndexOf(log)), false).isComplete);
+
+    // What was found before a request that was canceled is not kept for it.
+    finder.SetCurrentRequest(m_number + 2);
+    QVERIFY(!find(finder, Text("a 1"), RowsOf(IndexOf(log)), false).rows);
+    const LogHits hits = find(finder, Text("a 1"), RowsOf(IndexOf(log)), false);
+    QCOMPARE(*hits.hits, std::vector<int>({1}));
+}
+
+// Also where the rows are the same.
+void tst_LogFinder::anotherFile()
+{
+    const QByteArray log = run(3, QTime(9, 0), "a");
+    const auto rows = RowsOf(IndexOf(log));
+    QVERIFY(TestFiles::write(m_file, log));
+    LogFinder finder;
+    QCOMPARE(*find(finder, Text("a 1"), rows).hits, std::vector<int>({1}));
+    m_file += ".1";
+    QVERIFY(TestFiles::write(m_file, QByteArray(log).replace("a 1", "b 1").replace("a 0", "a 1")));
+    QCOMPARE(*find(finder, Text("a 1"), rows, false).hits, std::vector<int>({0}));
 }
 
 // The last line starts where it started before, but it has got its text only now.

@@ -58,6 +58,7 @@ private slots:
     void longestLine();
     void endsBetweenSlices_data();
     void endsBetweenSlices();
+    void carriageReturns();
     void growingFile_data();
     void growingFile();
 
@@ -143,6 +144,25 @@ void tst_LogLineReader::endsBetweenSlices()
 void tst_LogLineReader::growingFile_data()
 {
     endsBetweenSlices_data();
+}
+
+// An incomplete line may still get another character after its carriage return.
+void tst_LogLineReader::carriageReturns()
+{
+    QVERIFY(TestFiles::write(m_file, "ab\r\ncd\r"));
+    LogLineReader reader;
+    QVERIFY(reader.Open(m_file));
+    QCOMPARE(reader.Line(0), QByteArray("ab"));
+    QCOMPARE(reader.nextStart(), qint64(4));
+    QCOMPARE(reader.Line(4), QByteArray("cd\r"));
+    QCOMPARE(reader.nextStart(), qint64(7));
+
+    const LogFileType type = Wide(LogEncoding::Utf16Le);
+    QVERIFY(TestFiles::write(m_file, Encoded("ab\r\ncd\r", type)));
+    QVERIFY(reader.Open(m_file, type));
+    QCOMPARE(reader.Line(0), Encoded("ab", type));
+    QCOMPARE(reader.nextStart(), qint64(8));
+    QCOMPARE(reader.Line(8), Encoded("cd\r", type));
 }
 
 // Read whenever there is another byte.

@@ -133,6 +133,7 @@ void tst_LogLocator::places()
     const LogLocation location = locate(TwoDays(), place.constData(), current);
     QCOMPARE(int(location.answer), answer);
     QCOMPARE(location.row, row);
+    QCOMPARE(location.number, 1);
     QCOMPARE(location.start >= 0, row >= 0);
 }
 

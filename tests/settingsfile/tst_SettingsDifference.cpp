@@ -114,6 +114,7 @@ void tst_SettingsDifference::rows()
     for (SettingsDifference::Row const& row : difference.rows) {
         section = row.isSection() ? row.section : section;
         QCOMPARE(row.section, section);
+        QVERIFY(!row.isMoved || (row.isBefore && row.isAfter));
     }
 }
 
