@@ -20,7 +20,8 @@ bool IndexedLogFile::Open(QString const& path)
 {
     if (!m_file.Open(path))
         return false;
-    m_size = m_file.file()->size();
+    m_wholeSize = m_file.file()->size();
+    m_size = m_wholeSize;
     m_modified = QFileInfo(path).lastModified();
     return true;
 }
@@ -82,8 +83,7 @@ QByteArray IndexedLogFile::Separator() const
 bool IndexedLogFile::IsUnchanged() const
 {
     const QFileInfo info(path());
-    return m_file.IsInPlace() && info.size() == m_file.file()->size() &&
-           info.lastModified() == m_modified;
+    return m_file.IsInPlace() && info.size() == m_wholeSize && info.lastModified() == m_modified;
 }
 
 quint64 IndexedLogFile::IdentityOf(QString const& path)

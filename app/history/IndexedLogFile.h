@@ -58,7 +58,8 @@ public:
 
 private:
     HistoryFile m_file;
-    qint64 m_size = 0;
+    qint64 m_size = 0;      // of what is read
+    qint64 m_wholeSize = 0; // when it was opened
     QDateTime m_modified;
     LogIndex m_index;
     LogRows m_rows;

@@ -13,6 +13,7 @@
 #include "app/window/log/LogFindBar.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogPanel.h"
+#include "app/window/log/LogView.h"
 #include "app/window/settings/SettingsEditor.h"
 #include "common/log/TorkLog.h"
 #include "support/DemoLog.h"
@@ -185,6 +186,7 @@ void TakeAllFiles(MainWindow& window, Camera const& camera)
     panel->model()->SetFolded(0, true);
     QTest::qWait(500);
     panel->GoToProblem(1);
+    panel->view()->scrollToTop();
     camera.take(window, "all-files");
     Trigger(window, "All Files, by Time");
     QTest::qWait(1000);
