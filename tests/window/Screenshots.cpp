@@ -53,6 +53,24 @@ QByteArray const BrokenText("<VelocorSettings>\n"
                             "</Editor>\n"
                             "</VelocorSettings>\n");
 
+// An hour of a program that has more and less to do, and once a lot of trouble.
+QByteArray BusyHour()
+{
+    QByteArray log;
+    QTime time(14, 0);
+    for (int i = 0; time < QTime(15, 0); ++i) {
+        const bool isTrouble = time > QTime(14, 37) && time < QTime(14, 40);
+        char const* severity = i % 90 == 40 ? "Warning" : "Trace";
+        if (isTrouble)
+            severity = i % 3 == 0 ? "Error" : "Warning";
+        log += DemoLog::entry(time.toString("HH:mm:ss.zzz"), severity,
+                              QString("Request %1 answered").arg(4000 + i));
+        const int minute = time.minute();
+        time = time.addMSecs(isTrouble ? 700 : 900 + qAbs(minute * 7 % 23 - 11) * 300);
+    }
+    return log;
+}
+
 QPalette DarkPalette()
 {
     const QColor text(0xe6, 0xe6, 0xe6);
@@ -88,6 +106,7 @@ void SetUpProgram()
     TorkLog::initialize(Home + "logs/", "velocor", QString(), true);
     TestFiles::write(Home + "logs/velocor.log", DemoLog::lifelike());
     TestFiles::write(Home + "logs/velocor.log.1", DemoLog::run(200, QTime(8, 0), "older", true));
+    TestFiles::write(Home + "busy.log", BusyHour());
     TestFiles::write(Home + "viewer.cfg", SettingsText);
     TestFiles::write(Home + "broken.cfg", BrokenText);
 }
@@ -156,9 +175,6 @@ void TakeLogViews(MainWindow& window, Camera const& camera)
     more->setChecked(false);
     table->clearSelection();
 
-    panel->SetActivity(true);
-    camera.take(window, "activity");
-    panel->SetActivity(false);
     panel->SetSince(true);
     panel->SetLeastGap(10 * 1000);
     camera.take(window, "since");
@@ -191,6 +207,18 @@ void TakeAllFiles(MainWindow& window, Camera const& camera)
     Trigger(window, "All Files, by Time");
     QTest::qWait(1000);
     panel->findChild<QTableView*>()->clearSelection();
+}
+
+void TakeActivity(MainWindow& window, Camera const& camera)
+{
+    window.OpenFile(Home + "busy.log");
+    Trigger(window, "Activity");
+    LogPanel* panel = window.findChild<FileTabs*>()->currentLog();
+    QTest::qWait(500);
+    panel->GoToProblem(-1);
+    camera.take(window, "activity");
+    Trigger(window, "Activity");
+    Trigger(window, "Close Tab");
 }
 
 // And the bar that says that something is wrong with the log.
@@ -267,6 +295,7 @@ void TakeAll(QString const& folder, QString const& suffix)
     TakeLogViews(window, camera);
     TakeAllFiles(window, camera);
     TakeHighlights(window, camera);
+    TakeActivity(window, camera);
     TakePlaces(window, camera);
     TakeDialogs(window, camera);
 
