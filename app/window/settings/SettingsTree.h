@@ -71,6 +71,12 @@ public:
     void AddKey();
     void EditValue();
     void EditName();
+    void EditInLargeField();
+    void Toggle();
+
+    /// Shows a menu with the kinds that the current value can have.
+    void ChooseKind();
+
     void Duplicate();
     void Remove();
     void MoveUp();
@@ -98,8 +104,10 @@ Q_SIGNALS:
     void findRequested();
     void findNextRequested(int step);
 
-    /// The current value is to be edited, which is too long for its cell.
-    void longValueRequested();
+    /// The current value is to be edited in a dialog.
+    ///
+    /// @param asText  as a text, whatever its kind
+    void dialogRequested(bool asText);
 
 protected:
     void keyPressEvent(QKeyEvent* event) override;
