@@ -109,7 +109,7 @@ other_words_for_qt() {
 widgets_below_the_window() {
     tracked 'app/logfile/*' 'app/history/*' 'app/terminal/*' 'app/settingsfile/*' 'app/runninglog/*' |
         search -nHP '^\s*#\s*include\s*<(Qt(Gui|Widgets)\b|Q\w*(Widget|Dialog|Color|Font|Icon|Image|Pixmap|Paint|Palette|Screen|Style|Menu|Label|Button|Layout|MessageBox|Window|Clipboard|GuiApplication)|QApplication)' |
-        grep -v '^app/settingsfile/.*<Q\(Color\|Font\)>'
+        { grep -v '^app/settingsfile/.*<Q\(Color\|Font\)>' || true; }
 }
 
 # Statements, also of several lines, that set a tool tip without calling PlainToolTip().
