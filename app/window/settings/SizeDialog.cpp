@@ -25,6 +25,13 @@ QSpinBox* NewPixelField(QString const& accessibleName, int minimum, int value)
     return field;
 }
 
+void AddPixelField(QFormLayout* form, QString const& text, QSpinBox* field)
+{
+    QLabel* label = NewPlainLabel(text);
+    label->setBuddy(field);
+    form->addRow(label, field);
+}
+
 SizeDialog::SizeDialog(QString const& name, QSize size, QWidget* parent)
     : QDialog(parent), m_width(NewPixelField(tr("Width"), 0, size.width())),
       m_height(NewPixelField(tr("Height"), 0, size.height()))
@@ -38,8 +45,8 @@ SizeDialog::SizeDialog(QString const& name, QSize size, QWidget* parent)
     connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
     auto* layout = new QFormLayout(this);
     layout->addRow(heading);
-    layout->addRow(tr("&Width"), m_width);
-    layout->addRow(tr("&Height"), m_height);
+    AddPixelField(layout, tr("&Width"), m_width);
+    AddPixelField(layout, tr("&Height"), m_height);
     layout->addRow(buttons);
     m_width->setFocus();
     m_width->selectAll();

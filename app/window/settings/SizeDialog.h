@@ -6,6 +6,7 @@
 #include <QDialog>
 #include <QSize>
 
+class QFormLayout;
 class QSpinBox;
 
 namespace Velocor {
@@ -32,5 +33,10 @@ private:
 /// @param minimum  the maximum is that of the store
 /// @return owned by the caller, or by the layout that takes it
 QSpinBox* NewPixelField(QString const& accessibleName, int minimum, int value);
+
+/// Adds a field to a form, which takes ownership of it.
+///
+/// @param text  of its label, with a mnemonic
+void AddPixelField(QFormLayout* form, QString const& text, QSpinBox* field);
 
 } // namespace Velocor

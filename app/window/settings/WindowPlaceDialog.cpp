@@ -92,10 +92,10 @@ WindowPlaceDialog::WindowPlaceDialog(QString const& name, QPoint const& position
     connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
     auto* layout = new QFormLayout(this);
     layout->addRow(heading);
-    layout->addRow(tr("From the &left"), m_x);
-    layout->addRow(tr("From the &top"), m_y);
-    layout->addRow(tr("&Width"), m_width);
-    layout->addRow(tr("&Height"), m_height);
+    AddPixelField(layout, tr("From the &left"), m_x);
+    AddPixelField(layout, tr("From the &top"), m_y);
+    AddPixelField(layout, tr("&Width"), m_width);
+    AddPixelField(layout, tr("&Height"), m_height);
     layout->addRow(m_picture);
     layout->addRow(m_place);
     layout->addRow(buttons);
