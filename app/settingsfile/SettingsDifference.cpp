@@ -150,17 +150,19 @@ QVector<Group> GroupsOf(QVector<Row> const& rows, QSet<int> const& chosen)
     return groups;
 }
 
-// The entries of the first document that stay, each followed by those new ones that come after it
-// in the rows.
+// The entries of the first document that stay where they are, each followed by those that come
+// after it in the rows and are new or moved there.
 template <class Entry>
 class Merge
 {
 public:
-    // In the order of the rows.
-    void keep(QString const& name, Entry const& entry)
+    // In the order of the rows. What the second document has elsewhere says nothing about the place
+    // of others.
+    void keep(QString const& name, Entry const& entry, bool isElsewhere)
     {
         m_kept.insert(name, entry);
-        m_last = name;
+        if (!isElsewhere)
+            m_last = name;
     }
     void add(Entry const& entry) { m_new[m_last].append(entry); }
 
@@ -188,8 +190,9 @@ QVector<Item> MergedItems(Group const& group, QVector<Item> const& before)
     Merge<Item> merge;
     for (Row const& row : group.items) {
         const bool isTaken = group.taken.contains(row.key);
-        if (row.isBefore && !(isTaken && !row.isAfter))
-            merge.keep(row.key, {row.key, isTaken ? row.after : row.before});
+        const bool leaves = isTaken && (!row.isAfter || row.isMoved);
+        if (row.isBefore && !leaves)
+            merge.keep(row.key, {row.key, isTaken ? row.after : row.before}, row.isMoved);
         else if (isTaken && row.isAfter)
             merge.add({row.key, row.after});
     }
@@ -250,8 +253,12 @@ SettingsDocument SettingsDifference::TakeOver(SettingsDocument const& before,
         const bool isRemoved = group.isTaken && !group.section.isAfter;
         if (group.section.isBefore && !isRemoved) {
             Section const& old = before.sections.at(positions.value(name));
-            merge.keep(name,
-                       {name, group.taken.isEmpty() ? old.items : MergedItems(group, old.items)});
+            const Section merged{name,
+                                 group.taken.isEmpty() ? old.items : MergedItems(group, old.items)};
+            if (group.isTaken && group.section.isMoved)
+                merge.add(merged);
+            else
+                merge.keep(name, merged, group.section.isMoved);
         } else if (!isRemoved && (group.isTaken || !group.taken.isEmpty())) {
             merge.add({name, MergedItems(group, {})});
         }

@@ -59,7 +59,8 @@ struct SettingsDifference
     /// @param before  the first document
     SettingsDocument Apply(SettingsDocument const& before) const;
 
-    /// The first document with some rows as in the second one. What both have stays where it is.
+    /// The first document with some rows as in the second one. What both have stays where it is,
+    /// unless it is moved and chosen.
     ///
     /// @param before  the first document
     /// @param chosen  positions in `rows`; that of a section stands for all its rows. An item

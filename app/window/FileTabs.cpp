@@ -133,7 +133,13 @@ SettingsEditor* FileTabs::addEditor(QString const& path)
         editor->SetStates(SavedStates(dataPath + QLatin1String("settings-states/")));
     editor->Open(path);
     connect(editor, &SettingsEditor::saved, this, [this, editor] {
-        setTabToolTip(indexOf(editor), PlainToolTip(editor->path())); // maybe another file now
+        // Maybe another file now.
+        const QString savedName = QFileInfo(editor->path()).fileName();
+        editor->setAccessibleName(savedName);
+        setTabToolTip(indexOf(editor), PlainToolTip(editor->path()));
+        tabBar()
+            ->tabButton(indexOf(editor), QTabBar::RightSide)
+            ->setAccessibleName(tr("Close %1").arg(savedName));
         Q_EMIT saved(editor->path());
     });
     connect(editor, &SettingsEditor::messageReported, this, &FileTabs::messageReported);

@@ -248,8 +248,19 @@ void tst_PlainSettingsDifference::takesOverWhatIsChosen()
         QCOMPARE(result.rootName, before.rootName);
         QCOMPARE(Plain(difference.TakeOver(before, {})), Plain(before));
 
-        // What stays, stays in its order.
-        const QStringList names = SectionNames(before);
+        QSet<int> all;
+        for (int row = 0; row < difference.rows.size(); ++row)
+            all.insert(row);
+        SettingsDocument second = difference.TakeOver(before, all);
+        second.rootName = after.rootName;
+        QCOMPARE(Plain(second), Plain(after));
+
+        // What stays, stays in its order, unless it was moved.
+        QStringList names = SectionNames(before);
+        for (int row : chosen) {
+            if (difference.rows.at(row).isSection() && difference.rows.at(row).isMoved)
+                names.removeOne(difference.rows.at(row).section);
+        }
         const QStringList left = SectionNames(result);
         int both = 0;
         for (QString const& name : names)

@@ -124,6 +124,7 @@ private slots:
     void otherFileIsCompared();
     void valuesAreTakenOver_data();
     void valuesAreTakenOver();
+    void takingOverMoves();
     void takingOverIsUndone();
     void changedFileIsCompared();
     void unreadableFileIsTold();
@@ -285,6 +286,25 @@ void tst_SettingsCompared::valuesAreTakenOver()
     QCOMPARE(shown.editor->undoStack()->undoText(), QString("Take Over"));
     QTest::keyClick(shown.window.get(), Qt::Key_S, Qt::ControlModifier);
     QCOMPARE(TestFiles::read(shown.file), "<VelocorSettings>\n" + inside + "</VelocorSettings>\n");
+}
+
+void tst_SettingsCompared::takingOverMoves()
+{
+    const ShownSettings shown;
+    const QString other = shown.folder() + "other.cfg";
+    const QByteArray moved("<VelocorSettings>\n<Editor>\n<wrap>yes</wrap>\n<font>Serif</font>\n"
+                           "</Editor>\n</VelocorSettings>\n");
+    QVERIFY(TestFiles::write(other, moved));
+    WithOther(shown, other, [&](DifferenceDialog* dialog) {
+        GoToRow(dialog, "wrap");
+        TakeOver(dialog);
+        QVERIFY(dialog->tree()->difference().isEmpty());
+    });
+    QTest::keyClick(shown.window.get(), Qt::Key_S, Qt::ControlModifier);
+    QCOMPARE(TestFiles::read(shown.file), moved);
+    QTest::keyClick(shown.window.get(), Qt::Key_Z, Qt::ControlModifier);
+    QTest::keyClick(shown.window.get(), Qt::Key_S, Qt::ControlModifier);
+    QCOMPARE(TestFiles::read(shown.file), Settings);
 }
 
 void tst_SettingsCompared::takingOverIsUndone()

@@ -829,10 +829,11 @@ void tst_SettingsInWindow::commandsAreInTheMenus()
         QVERIFY(!action->statusTip().isEmpty());
         letters += action->text().at(action->text().indexOf('&') + 1).toLower();
     }
-    QCOMPARE(entries, QStringList({"Edit Value\tF2", "Rename\tShift+F2", "Add Key\tIns",
-                                   "Add Section\tAlt+Ins", "Duplicate\tCtrl+D", "Remove\tDel",
-                                   "Move Up\tAlt+Up", "Move Down\tAlt+Down", "Find\tCtrl+F",
-                                   "Find Next\tF3", "Find Previous\tShift+F3",
+    QCOMPARE(entries, QStringList({"Edit Value\tF2", "Edit in Large Field\tCtrl+Return",
+                                   "Toggle\tSpace", "Choose Kind\tCtrl+K", "Rename\tShift+F2",
+                                   "Add Key\tIns", "Add Section\tAlt+Ins", "Duplicate\tCtrl+D",
+                                   "Remove\tDel", "Move Up\tAlt+Up", "Move Down\tAlt+Down",
+                                   "Find\tCtrl+F", "Find Next\tF3", "Find Previous\tShift+F3",
                                    "Edit as Text\tCtrl+T", "Saved States...\tCtrl+Shift+T"}));
     for (QChar letter : letters)
         QCOMPARE(letters.count(letter), 1);
@@ -843,7 +844,7 @@ void tst_SettingsInWindow::commandsAreInTheMenus()
     QCOMPARE(inContext, actions);
 
     GoTo(shown.tree, Cell(shown.tree, 0));
-    actions.at(5)->trigger();
+    actions.at(8)->trigger();
     QCOMPARE(shown.tree->model()->rowCount(), 2);
     shown.window->findChild<FileTabs*>()->setCurrentIndex(0);
     QVERIFY(menu->isEmpty() && !menu->menuAction()->isEnabled());

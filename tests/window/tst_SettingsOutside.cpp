@@ -215,6 +215,8 @@ void tst_SettingsOutside::folderIsGone()
     QVERIFY(!state->isVisible() && !editor->isModified());
     QCOMPARE(window->findChild<FileTabs*>()->tabText(1), QString("other.cfg"));
     QCOMPARE(window->findChild<FileTabs*>()->tabToolTip(1), other);
+    QCOMPARE(editor->accessibleName(), QString("other.cfg"));
+    QVERIFY(Child<QAbstractButton>(window.get(), "Close other.cfg"));
 }
 
 // Only to those who may not write it: the administrator may write everything.

@@ -14,7 +14,10 @@
 #include "app/window/log/LogSettingsDialog.h"
 #include "app/window/log/NoteDialog.h"
 #include "app/window/settings/DifferenceDialog.h"
+#include "app/window/settings/FileListDialog.h"
 #include "app/window/settings/SavedStatesDialog.h"
+#include "app/window/settings/SizeDialog.h"
+#include "app/window/settings/WindowPlaceDialog.h"
 
 #include <QAbstractButton>
 #include <QComboBox>
@@ -137,6 +140,12 @@ void tst_WindowAccessibility::namesInDialogs()
     QCOMPARE(NamelessControls(&differences), QStringList());
     SavedStatesDialog states(SavedStates(), test.folder() + "some.cfg", true);
     QCOMPARE(NamelessControls(&states), QStringList());
+    SizeDialog size("name", QSize(1, 2));
+    QCOMPARE(NamelessControls(&size), QStringList());
+    WindowPlaceDialog place("name", QPoint(1, 2), QSize(3, 4));
+    QCOMPARE(NamelessControls(&place), QStringList());
+    FileListDialog files("name", {"a", "b"});
+    QCOMPARE(NamelessControls(&files), QStringList());
     HighlightDialog highlights(std::make_shared<HighlightRules>(), nullptr);
     QCOMPARE(NamelessControls(&highlights), QStringList());
 }

@@ -210,7 +210,7 @@ bool DifferenceTree::hasSelectedValues() const
         const bool isSelected = selected.contains(i);
         if (row.isSection())
             isSectionSelected = isSelected;
-        if (!row.hasSameValue() && (isSelected || isSectionSelected))
+        if (!row.isSame() && (isSelected || isSectionSelected))
             return true;
     }
     return false;

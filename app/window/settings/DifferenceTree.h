@@ -37,7 +37,7 @@ public:
     /// The positions of the selected rows in the difference.
     QSet<int> selectedRows() const;
 
-    /// Whether taking over the selected rows changes a value.
+    /// Whether taking over the selected rows changes a value or the order.
     bool hasSelectedValues() const;
 
 private:

@@ -293,6 +293,15 @@ void SettingsCommands::Move(QModelIndex const& index, int step)
     push({edit}, isSection ? tr("Move Section") : tr("Move Key"));
 }
 
+void SettingsCommands::Toggle(QModelIndex const& index)
+{
+    if (SettingsModel::KindOf(index) != ValueKind::YesNo)
+        return;
+    const QModelIndex cell = index.sibling(index.row(), SettingsModel::ValueColumn);
+    const bool isYes = TypedText::ToYesNo(SettingsModel::FullText(cell));
+    SetText(cell, TypedText::FromYesNo(!isYes));
+}
+
 SettingsCommands::NameProblem SettingsCommands::CheckName(QModelIndex const& index,
                                                           QString const& name) const
 {

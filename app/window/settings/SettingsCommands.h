@@ -73,6 +73,9 @@ public:
     /// @return why the old name is kept, for the user; empty if the text was accepted
     QString SetText(QModelIndex const& index, QString const& text);
 
+    /// Changes a value of yes or no to the other one. Nothing changes for any other kind.
+    void Toggle(QModelIndex const& index);
+
     /// Whether a text could be the name of an existing section or item.
     NameProblem CheckName(QModelIndex const& index, QString const& name) const;
 

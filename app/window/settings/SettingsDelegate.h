@@ -6,13 +6,15 @@
 #include <QPointer>
 #include <QStyledItemDelegate>
 
+class QLineEdit;
+
 namespace Velocor {
 
 class SettingsCommands;
 
 /// Edits the cells of a SettingsModel through SettingsCommands, and says what is wrong with a text
-/// while it is being typed. A cell that shows only the start of its text is not edited. GUI thread
-/// only.
+/// while it is being typed. Up and Down step a number. A value that has a dialog, and a name of
+/// which the cell shows only the start, are not edited. GUI thread only.
 class SettingsDelegate : public QStyledItemDelegate
 {
     Q_OBJECT
@@ -28,6 +30,8 @@ public:
     QWidget* createEditor(QWidget* parent, QStyleOptionViewItem const& option,
                           QModelIndex const& index) const override;
     void destroyEditor(QWidget* editor, QModelIndex const& index) const override;
+    bool editorEvent(QEvent* event, QAbstractItemModel* model, QStyleOptionViewItem const& option,
+                     QModelIndex const& index) override;
     void setModelData(QWidget* editor, QAbstractItemModel* model,
                       QModelIndex const& index) const override;
 
@@ -40,14 +44,19 @@ Q_SIGNALS: // const, as they come from the functions of a delegate, which are
     /// @param reason  for the user
     void rejected(QString const& reason) const; // clazy:exclude=const-signal-or-slot
 
-    /// A cell is to be edited whose text is too long for that.
-    void longTextRequested() const; // clazy:exclude=const-signal-or-slot
+    /// A value is to be edited that has a dialog.
+    void dialogRequested() const; // clazy:exclude=const-signal-or-slot
+
+protected:
+    bool eventFilter(QObject* object, QEvent* event) override;
 
 private:
+    void step(QLineEdit* field, int by) const;
     QString problemOf(QModelIndex const& index, QString const& text) const;
 
     SettingsCommands* m_commands;
     mutable QPointer<QWidget> m_field;
+    mutable bool m_isNumber = false; ///< whether the user is typing one
 };
 
 } // namespace Velocor

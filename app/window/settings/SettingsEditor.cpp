@@ -10,7 +10,7 @@
 #include "app/window/settings/SettingsFindBar.h"
 #include "app/window/settings/SettingsTextPage.h"
 #include "app/window/settings/SettingsTree.h"
-#include "app/window/settings/ValueDialog.h"
+#include "app/window/settings/ValueEditing.h"
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
 
@@ -69,7 +69,6 @@ void SettingsEditor::connectParts()
     connect(m_tree, &SettingsTree::findNextRequested, m_find, &SettingsFindBar::FindNext);
     connect(m_tree, &SettingsTree::editingChanged, this, &SettingsEditor::updateState);
     connect(m_tree, &SettingsTree::rejected, this, &SettingsEditor::messageReported);
-    connect(m_tree, &SettingsTree::longValueRequested, this, &SettingsEditor::editLongValueSoon);
     connect(m_tree, &SettingsTree::textRequested, this, &SettingsEditor::ShowAsText);
     connect(m_tree, &SettingsTree::statesRequested, this, &SettingsEditor::ShowStates);
     connect(m_text, &SettingsTextPage::statesRequested, this, &SettingsEditor::ShowStates);
@@ -78,6 +77,7 @@ void SettingsEditor::connectParts()
     connect(m_text, &SettingsTextPage::stateChanged, this, &SettingsEditor::updateState);
     connect(m_commands.undoStack(), &QUndoStack::indexChanged, this,
             &SettingsEditor::noteTreeChange);
+    connect(m_tree, &SettingsTree::dialogRequested, this, &SettingsEditor::editInDialogSoon);
     connect(m_commands.undoStack(), &QUndoStack::indexChanged, m_removal, &NoticeBar::Dismiss);
     connect(m_commands.undoStack(), &QUndoStack::indexChanged, this, &SettingsEditor::updateState);
     connect(m_commands.undoStack(), &QUndoStack::cleanChanged, this, &SettingsEditor::updateState);
@@ -346,31 +346,33 @@ void SettingsEditor::ShowAsTree()
 }
 
 // Delayed, because the tree is still handling the key or click.
-void SettingsEditor::editLongValueSoon()
+void SettingsEditor::editInDialogSoon(bool asText)
 {
-    if (m_editingLongValue)
+    if (m_isInDialog)
         return;
-    m_editingLongValue = true;
-    QTimer::singleShot(0, this, [this] {
-        editLongValue();
-        m_editingLongValue = false;
+    m_isInDialog = true;
+    QTimer::singleShot(0, this, [this, asText] {
+        editInDialog(asText);
+        m_isInDialog = false;
     });
 }
 
-void SettingsEditor::editLongValue()
+void SettingsEditor::editInDialog(bool asText)
 {
     const QModelIndex current = m_tree->currentIndex();
     const QModelIndex cell = current.sibling(current.row(), SettingsModel::ValueColumn);
-    if (!cell.isValid() || SettingsModel::IsSection(cell) || !SettingsModel::IsLong(cell))
+    if (!cell.isValid() || SettingsModel::IsSection(cell))
         return;
     const SettingsModel::Place place = SettingsModel::PlaceOf(cell);
     SettingsDocument::Section const& section = m_model.document().sections.at(place.section);
     const QString name =
         tr("%1 / %2").arg(Shortened(section.name, MaximumTitlePartLength),
                           Shortened(section.items.at(place.item).key, MaximumTitlePartLength));
-    ValueDialog dialog(name, SettingsModel::FullText(cell), this);
-    if (dialog.exec() == QDialog::Accepted && dialog.isModified())
-        m_commands.SetText(cell, dialog.value());
+    const ValueKind kind = asText ? ValueKind::Text : SettingsModel::KindOf(cell);
+    const QPersistentModelIndex edited(cell); // the file may change while the dialog is open
+    const QString text = EditedValue(kind, name, SettingsModel::FullText(cell), this);
+    if (!text.isNull() && edited.isValid())
+        m_commands.SetText(edited, text);
 }
 
 void SettingsEditor::ShowStates()

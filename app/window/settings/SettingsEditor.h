@@ -28,8 +28,8 @@ class SettingsTree;
 /// by saving. A malformed file is shown as text, with the position of the error, to be mended; what
 /// can be read of it can be shown as a tree, and every file as text.
 ///
-/// A cell shows only the start of a long text, with its size. A long value is edited in a separate
-/// dialog, and a long name cannot be edited; both are saved in full.
+/// A cell shows only the start of a long text, with its size. A long value, and one whose kind has
+/// a dialog, is edited there; a long name cannot be edited. Both are saved in full.
 class SettingsEditor : public QWidget
 {
     Q_OBJECT
@@ -134,11 +134,11 @@ private:
     void noteSaved();
     void updateState();
     void updateButtons();
-    void editLongValueSoon();
-    void editLongValue();
+    void editInDialogSoon(bool asText);
+    void editInDialog(bool asText);
 
     QString m_path;
-    bool m_editingLongValue = false;
+    bool m_isInDialog = false;
 
     SettingsSaver m_saver;
     SettingsModel m_model;

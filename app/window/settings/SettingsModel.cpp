@@ -3,9 +3,13 @@
 
 #include "app/window/settings/SettingsModel.h"
 
+#include "app/window/settings/ValueEditing.h"
+#include "app/window/settings/ValueIcons.h"
 #include "app/window/widgets/PlainText.h"
 
 #include <QFont>
+#include <QGuiApplication>
+#include <QPalette>
 
 #include <algorithm>
 
@@ -21,6 +25,7 @@ void SettingsModel::SetDocument(SettingsDocument const& document)
 {
     beginResetModel();
     m_document = document;
+    m_chosenKinds.clear();
     m_rows.clear();
     for (int i = 0; i < document.sections.size(); ++i)
         m_rows.push_back(std::make_unique<int>(i));
@@ -188,6 +193,71 @@ bool SettingsModel::IsLong(QModelIndex const& index)
     return FullText(index).size() > MaximumCellLength;
 }
 
+ValueKind SettingsModel::KindOf(QModelIndex const& index)
+{
+    return static_cast<ValueKind>(index.data(KindRole).toInt());
+}
+
+bool SettingsModel::HasDialog(QModelIndex const& index)
+{
+    const QModelIndex cell = index.sibling(index.row(), ValueColumn);
+    return HasValueDialog(KindOf(cell)) || IsLong(cell) ||
+           FullText(cell).contains(QLatin1Char('\n'));
+}
+
+QPair<QString, QString> SettingsModel::namesOf(QModelIndex const& index) const
+{
+    const Place place = PlaceOf(index);
+    if (place.item < 0)
+        return {};
+    SettingsDocument::Section const& section = m_document.sections.at(place.section);
+    return {section.name, section.items.at(place.item).key};
+}
+
+void SettingsModel::ChooseKind(QModelIndex const& index, ValueKind kind)
+{
+    m_chosenKinds.insert(namesOf(index), kind);
+    const QModelIndex cell = index.sibling(index.row(), ValueColumn);
+    Q_EMIT dataChanged(cell, cell);
+}
+
+void SettingsModel::GuessKind(QModelIndex const& index)
+{
+    m_chosenKinds.remove(namesOf(index));
+    const QModelIndex cell = index.sibling(index.row(), ValueColumn);
+    Q_EMIT dataChanged(cell, cell);
+}
+
+bool SettingsModel::HasChosenKind(QModelIndex const& index) const
+{
+    return m_chosenKinds.contains(namesOf(index));
+}
+
+ValueKind SettingsModel::kind(Place place) const
+{
+    if (place.item < 0)
+        return ValueKind::Text;
+    SettingsDocument::Section const& section = m_document.sections.at(place.section);
+    SettingsDocument::Item const& item = section.items.at(place.item);
+    const auto chosen = m_chosenKinds.constFind({section.name, item.key});
+    return chosen != m_chosenKinds.constEnd() ? chosen.value()
+                                              : TypedText::Guess(section.name, item.value);
+}
+
+// What the cell of a value shows besides its text: a check box, or the icon of its kind.
+QVariant SettingsModel::valueData(Place place, int role) const
+{
+    const ValueKind valueKind = kind(place);
+    QString const& value = m_document.sections.at(place.section).items.at(place.item).value;
+    if (role == Qt::CheckStateRole && valueKind == ValueKind::YesNo)
+        return TypedText::ToYesNo(value) ? Qt::Checked : Qt::Unchecked;
+    if (role == Qt::DecorationRole && valueKind != ValueKind::YesNo)
+        return ValueIcon(valueKind, value, QGuiApplication::palette());
+    if (role == Qt::AccessibleDescriptionRole)
+        return ValueKindName(valueKind);
+    return QVariant();
+}
+
 QModelIndex SettingsModel::index(int row, int column, QModelIndex const& parent) const
 {
     if (row < 0 || row >= rowCount(parent) || column < 0 || column >= ColumnCount)
@@ -238,6 +308,10 @@ QVariant SettingsModel::data(QModelIndex const& index, int role) const
         const QString full = text(index);
         return full.size() > MaximumCellLength ? Shortened(full, ShortenedLength) : full;
     }
+    if (role == KindRole)
+        return static_cast<int>(kind(PlaceOf(index)));
+    if (!IsSection(index) && index.column() == ValueColumn)
+        return valueData(PlaceOf(index), role);
     if (role == Qt::FontRole && IsSection(index)) {
         QFont bold;
         bold.setBold(true);

@@ -4,8 +4,11 @@
 #pragma once
 
 #include "app/settingsfile/SettingsEdit.h"
+#include "app/settingsfile/TypedText.h"
 
 #include <QAbstractItemModel>
+#include <QHash>
+#include <QPair>
 
 #include <memory>
 #include <vector>
@@ -22,6 +25,7 @@ class SettingsModel : public QAbstractItemModel
 
 public:
     enum Column { NameColumn, ValueColumn, ColumnCount };
+    enum Role { KindRole = Qt::UserRole };
 
     /// The number of characters up to which a cell shows a text in full and may be edited in place.
     /// Qt lays out the whole text each time the cell is drawn.
@@ -61,6 +65,23 @@ public:
     /// @param withFrom  whether to look at that place first instead of last
     QModelIndex Find(QString const& text, Place from, int step, bool withFrom) const;
 
+    /// Makes the value of a row count as one of a kind, until another document is shown. The
+    /// choice is that of its section and key, whatever the value becomes.
+    void ChooseKind(QModelIndex const& index, ValueKind kind);
+
+    /// Takes such a choice back: the kind is guessed from the value, as at first.
+    void GuessKind(QModelIndex const& index);
+
+    /// Whether the kind of a row's value was chosen.
+    bool HasChosenKind(QModelIndex const& index) const;
+
+    /// The kind of the value of a row; of a section, text.
+    static ValueKind KindOf(QModelIndex const& index);
+
+    /// Whether the value of a row is edited in a dialog, because of its kind, its length or its
+    /// line breaks.
+    static bool HasDialog(QModelIndex const& index);
+
     static Place PlaceOf(QModelIndex const& index);
     static bool IsSection(QModelIndex const& index);
 
@@ -89,10 +110,14 @@ private:
     SettingsEdit applyText(SettingsEdit const& edit);
     void renumber();
     QString text(QModelIndex const& index) const;
+    ValueKind kind(Place place) const;
+    QVariant valueData(Place place, int role) const;
+    QPair<QString, QString> namesOf(QModelIndex const& index) const;
     Place rowBeside(Place place, int step) const;
     QModelIndex matchIn(Place place, QString const& text) const;
 
     SettingsDocument m_document;
+    QHash<QPair<QString, QString>, ValueKind> m_chosenKinds; ///< by section and key
     /// The row of each section. Indexes of items refer to that of their section, so they hold
     /// while other sections come, go and move.
     std::vector<std::unique_ptr<int>> m_rows;

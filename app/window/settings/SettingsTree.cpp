@@ -5,12 +5,15 @@
 
 #include "app/window/settings/SettingsCommands.h"
 #include "app/window/settings/SettingsDelegate.h"
+#include "app/window/settings/ValueIcons.h"
 
 #include <QAction>
+#include <QActionGroup>
 #include <QClipboard>
 #include <QGuiApplication>
 #include <QHeaderView>
 #include <QKeyEvent>
+#include <QMenu>
 
 namespace Velocor {
 
@@ -33,8 +36,8 @@ SettingsTree::SettingsTree(SettingsModel* model, SettingsCommands* commands, QWi
         m_isRejected = true;
         Q_EMIT rejected(reason);
     });
-    connect(m_delegate, &SettingsDelegate::longTextRequested, this,
-            &SettingsTree::longValueRequested);
+    connect(m_delegate, &SettingsDelegate::dialogRequested, this,
+            [this] { Q_EMIT dialogRequested(false); });
     connect(model, &SettingsModel::applied, this,
             [this](QModelIndex const& index) { m_changed = index; });
     connect(model, &SettingsModel::rowsInserted, this, &SettingsTree::expandNew);
@@ -55,6 +58,12 @@ QVector<SettingsCommand> SettingsTree::AllCommands()
     return {
         {tr("&Edit Value"), keys("F2") + keys("Return") + keys("Enter"), tr("Edit the value"),
          &SettingsTree::EditValue},
+        {tr("Edit in &Large Field"), keys("Ctrl+Return") + keys("Ctrl+Enter"),
+         tr("Edit the value as a text of several lines"), &SettingsTree::EditInLargeField},
+        {tr("&Toggle"), keys("Space"), tr("Change yes to no, and no to yes"),
+         &SettingsTree::Toggle},
+        {tr("C&hoose Kind"), keys("Ctrl+K"), tr("Choose what kind of value this is"),
+         &SettingsTree::ChooseKind},
         {tr("Re&name"), keys("Shift+F2"), tr("Edit the name of the section or key"),
          &SettingsTree::EditName},
         {tr("Add &Key"), keys("Ins"), tr("Add a key to the section"), &SettingsTree::AddKey},
@@ -250,6 +259,54 @@ void SettingsTree::EditName()
     editCell(currentIndex(), SettingsModel::NameColumn);
 }
 
+void SettingsTree::EditInLargeField()
+{
+    if (currentIndex().isValid() && !SettingsModel::IsSection(currentIndex()))
+        Q_EMIT dialogRequested(true);
+}
+
+void SettingsTree::Toggle()
+{
+    m_commands->Toggle(currentIndex());
+}
+
+void SettingsTree::ChooseKind()
+{
+    const QPersistentModelIndex row = currentIndex();
+    if (!row.isValid() || SettingsModel::IsSection(row))
+        return;
+    const SettingsModel::Place place = SettingsModel::PlaceOf(row);
+    SettingsDocument::Section const& section = m_model->document().sections.at(place.section);
+    auto* menu = new QMenu(tr("Kind of value"), this);
+    menu->setAttribute(Qt::WA_DeleteOnClose);
+    menu->setAccessibleName(menu->title());
+    auto* group = new QActionGroup(menu);
+    const auto add = [&](QString const& text, bool isChecked) {
+        QAction* action = group->addAction(text);
+        action->setCheckable(true);
+        action->setChecked(isChecked);
+        menu->addAction(action);
+        return action;
+    };
+    const bool isChosen = m_model->HasChosenKind(row);
+    const ValueKind guess = TypedText::Guess(section.name, section.items.at(place.item).value);
+    connect(add(tr("&Guess: %1").arg(ValueKindName(guess)), !isChosen), &QAction::triggered, this,
+            [this, row] { m_model->GuessKind(row); });
+    const QList<ValueKind> kinds = TypedText::AllKinds();
+    for (ValueKind kind : kinds) {
+        if (!TypedText::IsPossible(kind, section.name))
+            continue;
+        QAction const* action =
+            add(ValueKindName(kind), isChosen && SettingsModel::KindOf(row) == kind);
+        connect(action, &QAction::triggered, this,
+                [this, row, kind] { m_model->ChooseKind(row, kind); });
+    }
+    const QModelIndex cell =
+        currentIndex().sibling(currentIndex().row(), SettingsModel::ValueColumn);
+    menu->setActiveAction(group->checkedAction());
+    menu->popup(viewport()->mapToGlobal(visualRect(cell).bottomLeft()));
+}
+
 void SettingsTree::Duplicate()
 {
     EndEditing();
@@ -306,7 +363,7 @@ void SettingsTree::closeEditor(QWidget* editor, QAbstractItemDelegate::EndEditHi
         editValueBeside(isNext ? 1 : -1);
 }
 
-// From the name of a key, the next value is its own. A long one is only gone to: its dialog would
+// From the name of a key, the next value is its own. One with a dialog is only gone to: that would
 // be in the way of somebody who is typing.
 void SettingsTree::editValueBeside(int step)
 {
@@ -318,7 +375,7 @@ void SettingsTree::editValueBeside(int step)
     if (!value.isValid())
         return;
     GoTo(value);
-    if (!SettingsModel::IsLong(value))
+    if (!SettingsModel::HasDialog(value))
         edit(value);
 }
 

@@ -71,6 +71,12 @@ public:
     void AddKey();
     void EditValue();
     void EditName();
+    void EditInLargeField();
+    void Toggle();
+
+    /// Shows a menu with the kinds that the current value can have.
+    void ChooseKind();
+
     void Duplicate();
     void Remove();
     void MoveUp();
@@ -106,8 +112,10 @@ Q_SIGNALS:
     /// The user wants to see the saved states of the file.
     void statesRequested();
 
-    /// The current value is to be edited, which is too long for its cell.
-    void longValueRequested();
+    /// The current value is to be edited in a dialog.
+    ///
+    /// @param asText  as a text, whatever its kind
+    void dialogRequested(bool asText);
 
 protected:
     void keyPressEvent(QKeyEvent* event) override;

@@ -21,6 +21,8 @@ namespace Velocor {
 ///         value = dialog.value();
 class ValueDialog : public QDialog
 {
+    Q_OBJECT
+
 public:
     /// @param name  the name of the value
     /// @param value  of any length
