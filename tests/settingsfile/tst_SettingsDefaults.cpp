@@ -34,7 +34,8 @@ void tst_SettingsDefaults::init()
     m_folder = std::make_unique<QTemporaryDir>();
     qputenv("XDG_DATA_HOME", QFile::encodeName(m_folder->filePath("home")));
     qputenv("XDG_DATA_DIRS", QFile::encodeName(m_folder->filePath("local")) + ':' +
-                                 QFile::encodeName(m_folder->filePath("system")));
+                                 QFile::encodeName(m_folder->filePath("system")) + ':' +
+                                 QFile::encodeName(m_folder->filePath("deep/er")));
 }
 
 void tst_SettingsDefaults::found_data()
@@ -56,6 +57,7 @@ void tst_SettingsDefaults::found_data()
     row("installed by the system", "home/O/P/x.cfg", "system/O/P/x.defaults.cfg", true);
     row("of another product", "home/O/P/x.cfg", "system/O/Q/x.defaults.cfg", false);
     row("not from the data directory", "any/O/P/x.cfg", "system/O/P/x.defaults.cfg", false);
+    row("not at the same place outside", "O/x.cfg", "deep/O/x.defaults.cfg", false);
     row("from a folder with a similar name", "home2/O/P/x.cfg", "system/O/P/x.defaults.cfg", false);
 }
 
@@ -66,6 +68,7 @@ void tst_SettingsDefaults::found()
     QFETCH(bool, isFound);
     QVERIFY(TestFiles::write(m_folder->filePath(settings), "x"));
     QVERIFY(TestFiles::write(m_folder->filePath(defaults), "x"));
+    QVERIFY(QDir().mkpath(m_folder->filePath("deep/er")));
     QCOMPARE(SettingsDefaults::FileFor(m_folder->filePath(settings)),
              isFound ? m_folder->filePath(defaults) : QString());
 }

@@ -7,7 +7,7 @@
 #include "WindowParts.h"
 #include "WindowTestCase.h"
 
-#include "app/settingsfile/SettingsFileWriter.h"
+#include "app/settingsfile/SettingsFileReader.h"
 
 #include <QMenu>
 #include <QTreeView>
@@ -26,6 +26,7 @@ private slots:
     void backToDefault();
     void whatHasNoDefaultStays();
     void undoneInOneStep();
+    void windowsOwnDefaults();
 };
 
 namespace {
@@ -145,6 +146,23 @@ void tst_DefaultsInWindow::undoneInOneStep()
     QTest::keyClick(shown.window.get(), Qt::Key_Z, Qt::ControlModifier);
     QCOMPARE(shown.values(), before);
     QVERIFY(!shown.editor->isModified());
+}
+
+// What is installed is what the window saves after a first start.
+void tst_DefaultsInWindow::windowsOwnDefaults()
+{
+    const SettingsDocument defaults =
+        SettingsFileReader::Read(PROJECT_FOLDER "/packaging/velocor.defaults.cfg");
+    QVERIFY(defaults.isParsed && defaults.lossCount == 0);
+    const WindowTest test;
+    QVERIFY(WindowTest::show()->close());
+    const SettingsDocument saved = SettingsFileReader::Read(test.settingsFile());
+    QVERIFY(!defaults.sections.isEmpty());
+    for (SettingsDocument::Section const& section : defaults.sections) {
+        for (SettingsDocument::Item const& item : section.items)
+            QCOMPARE(item.key + '=' + saved.Value(section.name, item.key, "(none)"),
+                     item.key + '=' + item.value);
+    }
 }
 
 QTEST_MAIN(tst_DefaultsInWindow)

@@ -256,13 +256,10 @@ QString SettingsCommands::removalText(Edits const& removals) const
 void SettingsCommands::BackToDefault(QModelIndexList const& indexes)
 {
     Edits edits;
-    QSet<QPair<int, int>> done;
     const auto add = [&](QModelIndex const& item) {
-        const Place place = SettingsModel::PlaceOf(item);
-        if (done.contains({place.section, place.item}) || !m_model->DiffersFromDefault(item))
+        if (!m_model->DiffersFromDefault(item))
             return;
-        done.insert({place.section, place.item});
-        edits.append(EditAt(SettingsEdit::SetValue, place));
+        edits.append(EditAt(SettingsEdit::SetValue, SettingsModel::PlaceOf(item)));
         edits.last().text = m_model->DefaultOf(item);
     };
     for (QModelIndex const& index : indexes) {
