@@ -9,7 +9,7 @@ namespace Velocor {
 
 namespace {
 
-const QByteArray ByteOrderMark("\xEF\xBB\xBF");
+constexpr char ByteOrderMark[] = "\xEF\xBB\xBF";
 
 QByteArray Encoded(QString const& text, bool isLatin1)
 {
@@ -29,7 +29,8 @@ SettingsText SettingsText::Of(QByteArray const& bytes)
 {
     SettingsText file;
     file.hasMark = bytes.startsWith(ByteOrderMark);
-    const QByteArray content = file.hasMark ? bytes.mid(ByteOrderMark.size()) : bytes;
+    const QByteArray content =
+        file.hasMark ? bytes.mid(static_cast<int>(sizeof ByteOrderMark) - 1) : bytes;
     file.isLatin1 = Decoded(content, false).toUtf8() != content;
     file.text = Decoded(content, file.isLatin1);
     const int breaks = content.count('\n');

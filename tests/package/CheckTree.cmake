@@ -14,6 +14,9 @@ set(expected
     lib/cmake/Tork/VelocorTargets.cmake
     lib/pkgconfig/tork.pc
     lib/pkgconfig/velocor-frame.pc)
+if(NOT EXISTS "${PREFIX}/Velocor.app")
+    list(APPEND expected share/Tork/Velocor/velocor.defaults.cfg)
+endif()
 
 file(GLOB headers RELATIVE "${SOURCE}" "${SOURCE}/app/*.h" "${SOURCE}/common/*.h" "${SOURCE}/common/*/*.h")
 list(FILTER headers EXCLUDE REGEX "_p\\.h$")

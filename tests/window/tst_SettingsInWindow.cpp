@@ -829,12 +829,14 @@ void tst_SettingsInWindow::commandsAreInTheMenus()
         QVERIFY(!action->statusTip().isEmpty());
         letters += action->text().at(action->text().indexOf('&') + 1).toLower();
     }
-    QCOMPARE(entries, QStringList({"Edit Value\tF2", "Edit in Large Field\tCtrl+Return",
-                                   "Toggle\tSpace", "Choose Kind\tCtrl+K", "Rename\tShift+F2",
-                                   "Add Key\tIns", "Add Section\tAlt+Ins", "Duplicate\tCtrl+D",
-                                   "Remove\tDel", "Move Up\tAlt+Up", "Move Down\tAlt+Down",
-                                   "Find\tCtrl+F", "Find Next\tF3", "Find Previous\tShift+F3",
-                                   "Edit as Text\tCtrl+T", "Saved States...\tCtrl+Shift+T"}));
+    QCOMPARE(entries,
+             QStringList(
+                 {"Edit Value\tF2", "Edit in Large Field\tCtrl+Return", "Toggle\tSpace",
+                  "Choose Kind\tCtrl+K", "Rename\tShift+F2", "Add Key\tIns", "Add Section\tAlt+Ins",
+                  "Duplicate\tCtrl+D", "Remove\tDel", "Move Up\tAlt+Up", "Move Down\tAlt+Down",
+                  "Back to Default\tCtrl+Backspace", "All Back to Default\tCtrl+Shift+Backspace",
+                  "Find\tCtrl+F", "Find Next\tF3", "Find Previous\tShift+F3",
+                  "Edit as Text\tCtrl+T", "Saved States...\tCtrl+Shift+T"}));
     for (QChar letter : letters)
         QCOMPARE(letters.count(letter), 1);
     QList<QAction*> inContext = shown.tree->actions();

@@ -253,6 +253,36 @@ QString SettingsCommands::removalText(Edits const& removals) const
     return tr("Removed ") + of + tr(", with %1 keys: ").arg(keys) + list;
 }
 
+void SettingsCommands::BackToDefault(QModelIndexList const& indexes)
+{
+    Edits edits;
+    const auto add = [&](QModelIndex const& item) {
+        if (!m_model->DiffersFromDefault(item))
+            return;
+        edits.append(EditAt(SettingsEdit::SetValue, SettingsModel::PlaceOf(item)));
+        edits.last().text = m_model->DefaultOf(item);
+    };
+    for (QModelIndex const& index : indexes) {
+        if (!SettingsModel::IsSection(index)) {
+            add(index);
+            continue;
+        }
+        const Place place = SettingsModel::PlaceOf(index);
+        for (int i = 0; i < m_model->document().sections.at(place.section).items.size(); ++i)
+            add(m_model->IndexOf({place.section, i}));
+    }
+    if (!edits.isEmpty())
+        push(edits, tr("Back to Default"));
+}
+
+void SettingsCommands::AllBackToDefault()
+{
+    QModelIndexList sections;
+    for (int i = 0; i < m_model->document().sections.size(); ++i)
+        sections.append(m_model->IndexOf({i, -1}));
+    BackToDefault(sections);
+}
+
 // Rows that stay keep their place on the screen.
 SettingsCommands::Edits SettingsCommands::editsTo(SettingsDocument const& document) const
 {

@@ -62,6 +62,15 @@ public:
     /// @param text  what the step is called in "Undo ..."
     void Replace(SettingsDocument const& document, QString const& text);
 
+    /// Gives items their default values, in one step. Those without a default, and those that have
+    /// it already, stay as they are.
+    ///
+    /// @param indexes  in any order; a section stands for all its items
+    void BackToDefault(QModelIndexList const& indexes);
+
+    /// The same for all items.
+    void AllBackToDefault();
+
     /// Moves a section among the sections, or an item within its section.
     ///
     /// @param step  1 moves down, -1 up

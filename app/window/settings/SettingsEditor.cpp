@@ -3,6 +3,7 @@
 
 #include "app/window/settings/SettingsEditor.h"
 
+#include "app/settingsfile/SettingsDefaults.h"
 #include "app/settingsfile/SettingsFileReader.h"
 #include "app/settingsfile/SettingsFileWriter.h"
 #include "app/window/settings/FileNotice.h"
@@ -144,6 +145,7 @@ void SettingsEditor::Open(QString const& path)
     const SettingsDocument document = SettingsFileReader::Read(path);
     m_saver.NoteRead(path, document);
     m_model.SetDocument(document.isParsed ? document : SettingsDocument());
+    m_model.SetDefaults(SettingsDefaults::Of(path));
     m_commands.undoStack()->clear();
     m_hasTree = document.isParsed;
     m_hasText = !document.isParsed;
@@ -231,6 +233,7 @@ void SettingsEditor::saveAs()
     if (!isSaved)
         return;
     m_path = path;
+    m_model.SetDefaults(SettingsDefaults::Of(path));
     noteSaved();
 }
 

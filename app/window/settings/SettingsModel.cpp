@@ -32,6 +32,31 @@ void SettingsModel::SetDocument(SettingsDocument const& document)
     endResetModel();
 }
 
+void SettingsModel::SetDefaults(SettingsValues const& defaults)
+{
+    m_defaults = defaults;
+    for (int i = 0; i < m_document.sections.size(); ++i) {
+        const int last = m_document.sections.at(i).items.size() - 1;
+        if (last >= 0)
+            Q_EMIT dataChanged(IndexOf({i, 0}, ValueColumn), IndexOf({i, last}, ValueColumn));
+    }
+}
+
+QString SettingsModel::DefaultOf(QModelIndex const& index) const
+{
+    const Place place = PlaceOf(index);
+    if (place.item < 0 || m_defaults.isEmpty())
+        return QString();
+    SettingsDocument::Section const& section = m_document.sections.at(place.section);
+    return m_defaults.value({section.name, section.items.at(place.item).key});
+}
+
+bool SettingsModel::DiffersFromDefault(QModelIndex const& index) const
+{
+    const QString byDefault = DefaultOf(index);
+    return !byDefault.isNull() && byDefault != FullText(index.sibling(index.row(), ValueColumn));
+}
+
 void SettingsModel::renumber()
 {
     int row = 0;
@@ -310,14 +335,30 @@ QVariant SettingsModel::data(QModelIndex const& index, int role) const
     }
     if (role == KindRole)
         return static_cast<int>(kind(PlaceOf(index)));
-    if (!IsSection(index) && index.column() == ValueColumn)
-        return valueData(PlaceOf(index), role);
-    if (role == Qt::FontRole && IsSection(index)) {
+    const QVariant look = lookOf(index, role);
+    if (IsSection(index) || index.column() != ValueColumn)
+        return look;
+    const QVariant value = valueData(PlaceOf(index), role);
+    if (role == Qt::AccessibleDescriptionRole && look.isValid())
+        return tr("%1. %2").arg(value.toString(), look.toString());
+    return look.isValid() ? look : value;
+}
+
+// A difference is not only bold, which a screen reader does not tell.
+QVariant SettingsModel::lookOf(QModelIndex const& index, int role) const
+{
+    const bool isValue = index.column() == ValueColumn;
+    const bool isBold = IsSection(index) || (isValue && DiffersFromDefault(index));
+    if (role == Qt::FontRole && isBold) {
         QFont bold;
         bold.setBold(true);
         return bold;
     }
-    return QVariant();
+    const bool isText = role == Qt::ToolTipRole || role == Qt::AccessibleDescriptionRole;
+    if (!isText || !isValue || !DiffersFromDefault(index))
+        return QVariant();
+    const QString text = tr("Default: %1").arg(Shortened(DefaultOf(index), ShortenedLength));
+    return role == Qt::ToolTipRole ? PlainToolTip(text) : text;
 }
 
 QVariant SettingsModel::headerData(int section, Qt::Orientation orientation, int role) const

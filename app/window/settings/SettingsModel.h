@@ -44,6 +44,16 @@ public:
     void SetDocument(SettingsDocument const& document);
     SettingsDocument const& document() const { return m_document; }
 
+    /// The values to which DefaultOf() refers. Those that differ are bold.
+    void SetDefaults(SettingsValues const& defaults);
+    bool hasDefaults() const { return !m_defaults.isEmpty(); }
+
+    /// The default of an item, whichever its column; a null text if there is none.
+    QString DefaultOf(QModelIndex const& index) const;
+
+    /// Whether an item has a default, and another value.
+    bool DiffersFromDefault(QModelIndex const& index) const;
+
     /// Changes the document, and emits `applied`.
     ///
     /// @return what takes the change back
@@ -113,11 +123,13 @@ private:
     ValueKind kind(Place place) const;
     QVariant valueData(Place place, int role) const;
     QPair<QString, QString> namesOf(QModelIndex const& index) const;
+    QVariant lookOf(QModelIndex const& index, int role) const;
     Place rowBeside(Place place, int step) const;
     QModelIndex matchIn(Place place, QString const& text) const;
 
     SettingsDocument m_document;
     QHash<QPair<QString, QString>, ValueKind> m_chosenKinds; ///< by section and key
+    SettingsValues m_defaults;
     /// The row of each section. Indexes of items refer to that of their section, so they hold
     /// while other sections come, go and move.
     std::vector<std::unique_ptr<int>> m_rows;

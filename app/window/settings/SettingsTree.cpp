@@ -76,6 +76,10 @@ QVector<SettingsCommand> SettingsTree::AllCommands()
         {tr("Move &Up"), keys("Alt+Up"), tr("Move the section or key up"), &SettingsTree::MoveUp},
         {tr("Move &Down"), keys("Alt+Down"), tr("Move the section or key down"),
          &SettingsTree::MoveDown},
+        {tr("&Back to Default"), keys("Ctrl+Backspace"),
+         tr("Give the selected keys their default values"), &SettingsTree::BackToDefault},
+        {tr("A&ll Back to Default"), keys("Ctrl+Shift+Backspace"),
+         tr("Give all keys of the file their default values"), &SettingsTree::AllBackToDefault},
         {tr("&Find"), keys("Ctrl+F"), tr("Find a text in names and values"),
          &SettingsTree::OpenFind},
         {tr("Find Ne&xt"), keys("F3"), tr("Go to the next match"), &SettingsTree::FindNext},
@@ -120,10 +124,16 @@ void SettingsTree::updateActions()
 {
     const bool hasRow = currentIndex().isValid();
     const QVector<SettingsCommand> all = AllCommands();
-    for (int i = 0; i < m_actions.size(); ++i)
-        m_actions.at(i)->setEnabled(hasRow || all.at(i).work == &SettingsTree::AddSection ||
-                                    all.at(i).work == &SettingsTree::EditAsText ||
-                                    all.at(i).work == &SettingsTree::OpenStates);
+    for (int i = 0; i < m_actions.size(); ++i) {
+        const auto work = all.at(i).work;
+        const bool isOfFile = work == &SettingsTree::AddSection ||
+                              work == &SettingsTree::EditAsText ||
+                              work == &SettingsTree::OpenStates;
+        const bool isOfDefaults =
+            work == &SettingsTree::BackToDefault || work == &SettingsTree::AllBackToDefault;
+        m_actions.at(i)->setEnabled(isOfFile ||
+                                    (hasRow && (!isOfDefaults || m_model->hasDefaults())));
+    }
 }
 
 // Keys that a field does not use arrive here, too.
@@ -204,6 +214,18 @@ void SettingsTree::FindPrevious()
 void SettingsTree::EditAsText()
 {
     Q_EMIT textRequested();
+}
+
+void SettingsTree::BackToDefault()
+{
+    EndEditing();
+    m_commands->BackToDefault(chosenRows());
+}
+
+void SettingsTree::AllBackToDefault()
+{
+    EndEditing();
+    m_commands->AllBackToDefault();
 }
 
 void SettingsTree::OpenStates()
@@ -313,13 +335,19 @@ void SettingsTree::Duplicate()
     GoTo(m_commands->Duplicate(currentIndex()));
 }
 
-void SettingsTree::Remove()
+// The selected ones or, without any, the current one.
+QModelIndexList SettingsTree::chosenRows() const
 {
-    EndEditing();
     QModelIndexList rows = selectionModel()->selectedRows();
     if (rows.isEmpty() && currentIndex().isValid())
         rows.append(currentIndex().sibling(currentIndex().row(), SettingsModel::NameColumn));
-    m_commands->Remove(rows);
+    return rows;
+}
+
+void SettingsTree::Remove()
+{
+    EndEditing();
+    m_commands->Remove(chosenRows());
     GoToChanged();
 }
 

@@ -49,6 +49,9 @@ public:
     /// Shows all sections with their keys, with the first one current.
     void ShowAll();
 
+    /// Enables the commands that can do something now.
+    void updateActions();
+
     /// Makes a row current and visible.
     void GoTo(QModelIndex const& index);
 
@@ -86,6 +89,8 @@ public:
     void FindPrevious();
     void EditAsText();
     void OpenStates();
+    void BackToDefault();
+    void AllBackToDefault();
 
     void keyboardSearch(QString const& search) override;
 
@@ -127,7 +132,7 @@ protected Q_SLOTS:
 private:
     void makeActions();
     void expandNew(QModelIndex const& parent, int first, int last);
-    void updateActions();
+    QModelIndexList chosenRows() const;
     void editCell(QModelIndex const& row, SettingsModel::Column column);
     void editValueBeside(int step);
 
