@@ -43,13 +43,14 @@ void NotesWindow::MakeMenus()
 {
     QMenu* file = menuBar()->addMenu(tr("&File"));
     m_recentMenu = new QMenu(tr("Open &Recent"), this);
-    file->addAction(
-        tr("&Open..."), this, [this] { OpenNote(QFileDialog::getOpenFileName(this)); },
-        QKeySequence::Open);
+    QAction* open = file->addAction(tr("&Open..."), this,
+                                    [this] { OpenNote(QFileDialog::getOpenFileName(this)); });
+    open->setShortcut(QKeySequence::Open);
     file->addMenu(m_recentMenu);
-    file->addAction(tr("&Save"), this, &NotesWindow::Save, QKeySequence::Save);
-    file->addAction(tr("Save &As..."), this, &NotesWindow::SaveAs, QKeySequence::SaveAs);
-    file->addAction(tr("&Quit"), this, &QWidget::close, QKeySequence::Quit);
+    file->addAction(tr("&Save"), this, &NotesWindow::Save)->setShortcut(QKeySequence::Save);
+    file->addAction(tr("Save &As..."), this, &NotesWindow::SaveAs)
+        ->setShortcut(QKeySequence::SaveAs);
+    file->addAction(tr("&Quit"), this, &QWidget::close)->setShortcut(QKeySequence::Quit);
 
     // Populated just before it is shown: populating it while one of its own actions runs would
     // delete that action.

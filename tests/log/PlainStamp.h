@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include "common/TorkQt_p.h"
+
 #include <QByteArray>
 #include <QDateTime>
 #include <QLocale>
@@ -12,7 +14,7 @@
 /// lacks a character of that.
 inline QByteArray plainStamp(QDateTime const& time, QString const& format)
 {
-    const QString stamp = time.toString(format);
+    const QString stamp = TorkQt::DateText(time, format);
     if (QString::fromLatin1(stamp.toLatin1()) == stamp)
         return stamp.toLatin1();
     return QLocale::c().toString(time, format).toLatin1();

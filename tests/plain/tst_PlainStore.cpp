@@ -4,6 +4,7 @@
 // Compares a settings file with a plain model, a list of lists, through random programs: sections,
 // texts and typed values, ownership, loading and saving.
 
+#include "common/TorkQt_p.h"
 #include "common/config/TorkConfigFile.h"
 #include "plain/PlainLine.h"
 #include "plain/PlainLoader.h"
@@ -480,7 +481,7 @@ private:
             QFont font("Serif", 8 + (a & 15));
             tell("WriteFont(#, #, #)", section, item, font.toString());
             written = m_store.WriteFont(section, item, font);
-            text = font.toString();
+            text = TorkQt::FontText(font);
             break;
         }
         default: {

@@ -468,7 +468,12 @@ Outcome Plain(int device, Steps const& steps, Kind const& kind)
     SmallDevice small(SmallSize);
     QBuffer buffer(&bytes);
     buffer.open(QIODevice::WriteOnly);
-    QTextStream stream(device == FullDevice ? static_cast<QIODevice*>(&small) : &buffer);
+    QString text;
+    QTextStream stream(&text, QIODevice::WriteOnly);
+    if (device == FullDevice)
+        stream.setDevice(&small);
+    else if (device != String)
+        stream.setDevice(&buffer);
     stream.setFieldWidth(kind.fieldWidth);
     PlainWriter writer(device == NoDevice ? nullptr : &stream, kind);
     Outcome outcome;
@@ -476,6 +481,8 @@ Outcome Plain(int device, Steps const& steps, Kind const& kind)
     stream.flush();
     outcome.codes.append(stream.status());
     outcome.calls = writer.record.calls;
+    if (device == String)
+        bytes = text.toLocal8Bit();
     outcome.bytes = device == FullDevice ? small.taken : bytes;
     return outcome;
 }
@@ -585,8 +592,6 @@ public:
             outcome = OfStream(m_device, m_steps, m_kind);
         else
             outcome = OfBase(m_device, m_steps, m_kind);
-        if (m_device == String && !m_kind.isFile)
-            outcome.codes.last() = expected.codes.last() = 0; // only a codec misses half a letter
         if (!(outcome == expected))
             same("outcome", Words(outcome), Words(expected));
     }
@@ -636,7 +641,7 @@ public:
             m_kind.overridden = Kind::Write;
         else if (m_overrides == WritersWithoutTypes::Overrides::ElementValue)
             m_kind.overridden = Kind::Value;
-        Outcome expected = Plain(IoDevice, m_steps, m_kind);
+        Outcome expected = Plain(m_kind.isFile ? IoDevice : String, m_steps, m_kind);
         expected.codes.removeLast();
         if (codes != expected.codes)
             same("codes", Words({codes, {}, {}}), Words({expected.codes, {}, {}}));

@@ -569,7 +569,7 @@ bool othersAreUntouched(LogFolder const& folder)
 void noteCrash(int signal)
 {
     ScarceMemory::mend();
-    s_progress->isCrashOfQt = QByteArray(CrashSite::file()).startsWith("libQt5");
+    s_progress->isCrashOfQt = QByteArray(CrashSite::file()).startsWith("libQt");
     std::signal(signal, SIG_DFL);
     std::raise(signal);
 }

@@ -607,7 +607,9 @@ void tst_SettingsFile::noBackup()
     // A link to nowhere is no file that could be removed, and nothing is copied over it.
     QVERIFY(QFile::link(folder.filePath("nowhere/y"), copy));
     QVERIFY(!SettingsFileWriter::KeepBackup(path, &error));
-    QCOMPARE(error, "Cannot create " + copy + " for output");
+    QFile file(path);
+    QVERIFY(!file.copy(copy));
+    QCOMPARE(error, file.errorString());
     QCOMPARE(TestFiles::read(path), QByteArray("one"));
 }
 

@@ -121,9 +121,9 @@ public:
         QTest::qWait(500);
         const QString path = m_folder + "/" + name + m_suffix + ".png";
         if (widget.grab().save(path))
-            QTextStream(stdout) << path << endl;
+            QTextStream(stdout) << path << "\n";
         else
-            QTextStream(stderr) << path << " cannot be written" << endl;
+            QTextStream(stderr) << path << " cannot be written\n";
     }
 
 private:

@@ -443,9 +443,11 @@ QModelIndex UniformTable::moveCursor(CursorAction action, Qt::KeyboardModifiers 
 
 void UniformTable::setSelection(QRect const& rect, QItemSelectionModel::SelectionFlags command)
 {
-    const QRect area = rect.normalized();
-    const QModelIndex first = indexAt(area.topLeft());
-    const QModelIndex last = indexAt(area.bottomRight());
+    // From one corner to the other. QRect::normalized() of Qt 6 leaves the corners out.
+    const auto [left, right] = std::minmax({rect.left(), rect.right()});
+    const auto [top, bottom] = std::minmax({rect.top(), rect.bottom()});
+    const QModelIndex first = indexAt(QPoint(left, top));
+    const QModelIndex last = indexAt(QPoint(right, bottom));
     if (!selectionModel() || !first.isValid() || !last.isValid())
         return;
     selectionModel()->select(QItemSelection(first, last), command);
