@@ -13,6 +13,7 @@
 #     scripts/install-packages.sh build fuzz     and clang with its fuzzing runtime
 #     scripts/install-packages.sh build lint     and to check format and lint
 #     scripts/install-packages.sh build package  and to validate and build the package
+#     scripts/install-packages.sh build reproducible   and to build twice and compare
 #     scripts/install-packages.sh build abi      and to compare the binary interface
 #     scripts/install-packages.sh consumers      the compilers of projects that use the package
 #     scripts/install-packages.sh build check    and the other tools of ./check
@@ -41,6 +42,7 @@ packages_of() {
         ;;
     */fuzz) echo clang-14 libclang-rt-14-dev ;;
     */package) echo dpkg-dev debhelper doxygen lintian devscripts blhc desktop-file-utils appstream man-db ;;
+    */reproducible) echo reprotest faketime disorderfs dpkg-dev ;;
     */consumers) echo g++-12 clang-14 clang-16 clang-19 pkg-config ;;
     */abi) echo abigail-tools binutils ;;
     */check) echo clazy cppcheck gcovr valgrind python3 python3-clang-14 ;;
