@@ -4,7 +4,6 @@
 #include "app/runninglog/RunMark.h"
 
 #include "app/history/HistoryTime.h"
-#include "app/history/RunEnds.h"
 #include "app/history/RunMarkFile.h"
 
 #include <QDir>
@@ -121,23 +120,44 @@ bool RunMark::addRecord(QByteArray const& line) const
     return isWritten;
 }
 
-void RunMark::CollectOthers()
+std::vector<RunEnd> RunMark::CollectOthers()
 {
+    std::vector<RunEnd> ends;
     if (m_path.isEmpty())
-        return;
+        return ends;
     const QString folder = QFile::decodeName(m_folder);
     const QStringList names = RunMarkFile::NamesIn(folder);
     for (QString const& name : names) {
         const QString path = folder + QLatin1Char('/') + name;
         const RunMarkFile mark(path);
         // A program that started before this one, so its entries are not later.
-        const bool isOver =
-            mark.state() == RunMarkFile::LeftBehind && mark.start() <= ProgramStart() &&
-            addRecord(RunEnds::Line({mark.start(), ProgramStart(), HistoryRun::Abnormal}));
+        const RunEnd end = {mark.start(), ProgramStart(), HistoryRun::Abnormal};
+        const bool isOver = mark.state() == RunMarkFile::LeftBehind &&
+                            mark.start() <= ProgramStart() && addRecord(RunEnds::Line(end));
+        if (isOver)
+            ends.push_back(end);
         if (isOver || (mark.state() == RunMarkFile::Damaged && !mark.isNew()))
             QFile::remove(path);
     }
     shortenRecord();
+    return withoutNormal(std::move(ends));
+}
+
+// A program that is killed right after its record leaves its mark behind.
+std::vector<RunEnd> RunMark::withoutNormal(std::vector<RunEnd> ends) const
+{
+    if (ends.empty())
+        return ends;
+    const std::vector<RunEnd> known = RunEnds::Of(m_log);
+    const auto endedNormally = [&known](RunEnd const& end) {
+        return std::any_of(known.begin(), known.end(), [&end](RunEnd const& other) {
+            return other.start == end.start && other.exit == HistoryRun::Normal;
+        });
+    };
+    ends.erase(std::remove_if(ends.begin(), ends.end(), endedNormally), ends.end());
+    std::sort(ends.begin(), ends.end(),
+              [](RunEnd const& a, RunEnd const& b) { return a.start < b.start; });
+    return ends;
 }
 
 // Without a lock: a program that ends at this moment may be missing, so nobody knows how it ended.

@@ -3,8 +3,12 @@
 
 #pragma once
 
+#include "app/history/RunEnds.h"
+
 #include <QByteArray>
 #include <QString>
+
+#include <vector>
 
 namespace Velocor {
 
@@ -31,7 +35,10 @@ public:
     RunMark& operator=(RunMark const&) = delete;
 
     /// Records the ends of programs that left their marks behind, and removes these.
-    void CollectOthers();
+    ///
+    /// @return those that did not end normally, which no other program will be told again; the
+    ///         earliest first
+    std::vector<RunEnd> CollectOthers();
 
     /// When this program began, see HistoryCursor::time().
     static qint64 ProgramStart();
@@ -42,6 +49,7 @@ private:
     void end();
     bool addRecord(QByteArray const& line) const;
     void shortenRecord() const;
+    std::vector<RunEnd> withoutNormal(std::vector<RunEnd> ends) const;
 
     QString m_log;
     QByteArray m_recordFile;

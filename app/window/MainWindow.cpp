@@ -5,6 +5,7 @@
 
 #include "app/ScreenlessPlatform_p.h"
 #include "app/UserMessages.h"
+#include "app/history/HistoryTime.h"
 #include "app/runninglog/LogHealth.h"
 #include "app/runninglog/LogPreferences.h"
 #include "app/runninglog/RunMark.h"
@@ -31,6 +32,7 @@
 #include <QFileInfo>
 #include <QGuiApplication>
 #include <QMenuBar>
+#include <QPushButton>
 #include <QScreen>
 #include <QSplitter>
 #include <QStatusBar>
@@ -311,7 +313,7 @@ bool MainWindow::event(QEvent* event)
 void MainWindow::startWork()
 {
     m_tabs->ownLog()->Open(RunningLog::FileName(), true);
-    m_runMark->CollectOthers();
+    tellOfAbnormalEnds(m_runMark->CollectOthers());
     m_logHealth = std::make_unique<LogHealth>();
     connect(&m_healthTimer, &QTimer::timeout, this, &MainWindow::checkLog);
     connect(m_logHealth.get(), &LogHealth::mayHaveChanged, this, [this] {
@@ -319,6 +321,23 @@ void MainWindow::startWork()
             m_healthTimer.start(HealthInterval);
     });
     checkLog();
+}
+
+void MainWindow::tellOfAbnormalEnds(std::vector<RunEnd> const& ends)
+{
+    if (ends.empty())
+        return;
+    auto* bar = new NoticeBar(tr("How the last run ended"));
+    QPushButton* showButton = bar->AddButton(tr("Show"));
+    showButton->setAccessibleName(tr("Show the last entries of that run"));
+    connect(showButton, &QPushButton::clicked, m_dialogs.get(), &WindowDialogs::ShowEndOfRun);
+    QPushButton* reportButton = bar->AddButton(tr("Report..."));
+    reportButton->setAccessibleName(tr("Report how the last run ended"));
+    connect(reportButton, &QPushButton::clicked, m_dialogs.get(), &WindowDialogs::SaveReport);
+    m_tabs->ownLog()->AddBar(bar);
+    const QString start =
+        HistoryTime::DateTime(ends.back().start).toString(QStringLiteral("yyyy-MM-dd hh:mm:ss"));
+    bar->ShowMessage(tr("The program that was started at %1 did not end normally.").arg(start));
 }
 
 void MainWindow::checkLog()

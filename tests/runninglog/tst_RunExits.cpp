@@ -6,8 +6,10 @@
 #include "app/Installation.h"
 #include "app/history/RunEnds.h"
 #include "app/runninglog/RunMark.h"
+#include "support/LeftMark.h"
 #include "support/TestFiles.h"
 
+#include <QJsonArray>
 #include <QTemporaryDir>
 #include <QtTest>
 
@@ -56,6 +58,20 @@ QByteArrayList DistinctOf(QByteArrayList list)
     return list;
 }
 
+// Whether a window that starts now, and is closed, tells that an earlier one did not end normally.
+// It has a spy.
+bool SaysAbnormal(Installation const& installation)
+{
+    QFile::remove(installation.top + "report.json");
+    RunningProgram program(installation);
+    if (program.ExitCode() != 0)
+        qWarning("the window did not close");
+    const QString texts = QJsonDocument(installation.Report()["texts"].toArray()).toJson();
+    if (!texts.contains("Aa"))
+        qWarning("no texts");
+    return texts.contains("did not end normally");
+}
+
 QStringList Words(QString const& text)
 {
     return text.isEmpty() ? QStringList() : text.split(' ');
@@ -85,6 +101,8 @@ class tst_RunExits : public QObject
 private slots:
     void exits_data();
     void exits();
+    void toldAtTheNextStart_data();
+    void toldAtTheNextStart();
     void endOfTheSession();
     void secondWindow();
     void copiedFolder();
@@ -92,6 +110,7 @@ private slots:
     void assigned();
     void damagedRecords();
     void markOfAForkedChild();
+    void killedAfterItsRecord();
     void longRecord();
 
 private:
@@ -184,6 +203,34 @@ void tst_RunExits::compareAfterNextStart(Installation const& installation,
     program.Send(SIGTERM);
     program.ExitCode();
     QCOMPARE(Exits(installation, log), QByteArrayList({expected, "normal"}));
+}
+
+void tst_RunExits::toldAtTheNextStart_data()
+{
+    exits_data();
+}
+
+// Once, by the next window; never if another one is running, nor if nothing is known.
+void tst_RunExits::toldAtTheNextStart()
+{
+    QFETCH(QString, how);
+    QFETCH(QByteArray, expected);
+    Installation installation;
+    if (how == "closed")
+        installation.AddSpy("close");
+    RunningProgram program(installation);
+    if (how == "closed") {
+        QCOMPARE(program.ExitCode(), 0);
+    } else {
+        QTRY_COMPARE_WITH_TIMEOUT(Exits(installation, LogOf(installation)),
+                                  QByteArrayList({"running"}), Patience);
+        if (how != "still running")
+            endLike(installation, program, how);
+    }
+    installation.AddSpy("close");
+    installation.environment.insert("SPY_AWAIT", "Aa"); // made with the notices
+    QCOMPARE(SaysAbnormal(installation), expected == "abnormal");
+    QVERIFY(!SaysAbnormal(installation));
 }
 
 // The display goes away, and the program exits without returning to main().
@@ -345,6 +392,23 @@ void tst_RunExits::markOfAForkedChild()
     QCOMPARE(RunEnds::Of(log).size(), size_t(1));
     QCOMPARE(RunEnds::Of(log)[0].exit, HistoryRun::Normal);
     QCOMPARE(RunEnds::Of(log)[0].start, RunMark::ProgramStart());
+}
+
+// Its record counts, so nobody is told.
+void tst_RunExits::killedAfterItsRecord()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("logs/app.log");
+    const qint64 start = RunMark::ProgramStart() - 60000;
+    QVERIFY(!LeftMark::make(log, start).isEmpty());
+    QVERIFY(!LeftMark::make(log, start - 1).isEmpty());
+    QVERIFY(TestFiles::write(RunEnds::RecordFileOf(log),
+                             RunEnds::Line({start, start + 5, HistoryRun::Normal})));
+    RunMark mark(log);
+    const std::vector<RunEnd> ends = mark.CollectOthers();
+    QCOMPARE(ends.size(), size_t(1));
+    QCOMPARE(ends[0].start, start - 1);
+    QVERIFY(mark.CollectOthers().empty());
 }
 
 // The file does not grow forever. The newest stay.
