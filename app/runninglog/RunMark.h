@@ -40,6 +40,10 @@ public:
     ///         earliest first
     std::vector<RunEnd> CollectOthers();
 
+    /// Notes that the program has been running for a while, so that its end is not one soon after
+    /// the start. To be called after RunEnds::ShortRun.
+    void NoteLongLife() const;
+
     /// When this program began, see HistoryCursor::time().
     static qint64 ProgramStart();
 
@@ -47,6 +51,7 @@ private:
     static void endAll();
     void make(QString const& folder);
     void end();
+    static qint64 latestEnd(QString const& mark, qint64 start);
     bool addRecord(QByteArray const& line) const;
     void shortenRecord() const;
     std::vector<RunEnd> withoutNormal(std::vector<RunEnd> ends) const;

@@ -50,6 +50,7 @@ namespace {
 
 constexpr int HealthInterval = 2000;       // milliseconds, while there is a problem or a change
 constexpr int IdleHealthInterval = 60000;  // milliseconds; nothing tells of a disk that fills up
+constexpr int SuspiciousRuns = 3;          // in a row
 constexpr int MessageTime = 6000;          // milliseconds
 constexpr int MaximumMessageLength = 1000; // characters
 
@@ -321,6 +322,7 @@ void MainWindow::startWork()
             m_healthTimer.start(HealthInterval);
     });
     checkLog();
+    QTimer::singleShot(RunEnds::ShortRun, this, [this] { m_runMark->NoteLongLife(); });
 }
 
 void MainWindow::tellOfAbnormalEnds(std::vector<RunEnd> const& ends)
@@ -338,6 +340,31 @@ void MainWindow::tellOfAbnormalEnds(std::vector<RunEnd> const& ends)
     const QString start =
         HistoryTime::DateTime(ends.back().start).toString(QStringLiteral("yyyy-MM-dd hh:mm:ss"));
     bar->ShowMessage(tr("The program that was started at %1 did not end normally.").arg(start));
+    const int shortRuns =
+        RunEnds::ShortRunsBefore(RunEnds::Of(RunningLog::FileName()), RunMark::ProgramStart());
+    if (shortRuns >= SuspiciousRuns && QFileInfo(m_settings.fileName()).isFile())
+        offerDefaults(bar);
+}
+
+// The window cannot know that its settings are the reason, so it leaves them alone until it is
+// told.
+void MainWindow::offerDefaults(NoticeBar* bar)
+{
+    bar->ShowMessage(
+        tr("It ended within ten seconds at least three times in a row. If that is because "
+           "of its settings, set them aside: %1")
+            .arg(m_settings.fileName()));
+    QPushButton* button = bar->AddButton(tr("Set Aside"));
+    button->setAccessibleName(tr("Set the settings of this window aside"));
+    connect(button, &QPushButton::clicked, this, [this, bar, button] {
+        QString name;
+        const QString error = m_settings.SetAside(name);
+        button->setVisible(!error.isEmpty());
+        bar->ShowMessage(
+            error.isEmpty()
+                ? tr("The next start uses default settings. These are now in %1").arg(name)
+                : error);
+    });
 }
 
 void MainWindow::checkLog()

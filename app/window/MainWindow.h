@@ -82,6 +82,7 @@ private:
     void startWork();
     void openFilesOfStart();
     void tellOfAbnormalEnds(std::vector<RunEnd> const& ends);
+    void offerDefaults(NoticeBar* bar);
     void checkLog();
     void showMessage(QString const& text);
 

@@ -72,9 +72,29 @@ bool SaysAbnormal(Installation const& installation)
     return texts.contains("did not end normally");
 }
 
+// What the last spied window showed.
+bool Says(Installation const& installation, QString const& text)
+{
+    return QString(QJsonDocument(installation.Report()["texts"].toArray()).toJson()).contains(text);
+}
+
 QStringList Words(QString const& text)
 {
     return text.isEmpty() ? QStringList() : text.split(' ');
+}
+
+std::vector<RunEnd> EndsOf(QString const& texts)
+{
+    const QString letters = "UNAR";
+    std::vector<RunEnd> ends;
+    for (QString const& text : Words(texts)) {
+        RunEnd end;
+        end.start = text.section('-', 0, 0).toLongLong();
+        end.end = text.section('-', 1).chopped(1).toLongLong();
+        end.exit = static_cast<HistoryRun::Exit>(letters.indexOf(text.right(1)));
+        ends.push_back(end);
+    }
+    return ends;
 }
 
 bool CopyFolder(QString const& from, QString const& to)
@@ -111,6 +131,10 @@ private slots:
     void damagedRecords();
     void markOfAForkedChild();
     void killedAfterItsRecord();
+    void shortRuns_data();
+    void shortRuns();
+    void longLife();
+    void offersDefaultsAfterThreeShortRuns();
     void longRecord();
 
 private:
@@ -333,14 +357,6 @@ void tst_RunExits::assigned()
     QFETCH(QString, ends);
     QFETCH(QString, runs);
     const QString letters = "UNAR";
-    std::vector<RunEnd> known;
-    for (QString const& text : Words(ends)) {
-        RunEnd end;
-        end.start = text.section('-', 0, 0).toLongLong();
-        end.end = text.section('-', 1).chopped(1).toLongLong();
-        end.exit = static_cast<HistoryRun::Exit>(letters.indexOf(text.right(1)));
-        known.push_back(end);
-    }
     std::vector<HistoryRun> all;
     for (QString const& text : runs.split(' ')) {
         HistoryRun run;
@@ -348,7 +364,7 @@ void tst_RunExits::assigned()
         run.start = QString(text).remove('c').toLongLong();
         all.push_back(run);
     }
-    RunEnds::Assign(known, all);
+    RunEnds::Assign(EndsOf(ends), all);
     QString found;
     for (HistoryRun const& run : all)
         found += letters.at(run.exit);
@@ -409,6 +425,76 @@ void tst_RunExits::killedAfterItsRecord()
     QCOMPARE(ends.size(), size_t(1));
     QCOMPARE(ends[0].start, start - 1);
     QVERIFY(mark.CollectOthers().empty());
+}
+
+void tst_RunExits::shortRuns_data()
+{
+    QTest::addColumn<QString>("ends"); // start-end and first letter of the exit
+    QTest::addColumn<int>("expected");
+    QTest::newRow("none") << "" << 0;
+    QTest::newRow("three") << "1000-11000A 20000-20005A 40000-50000A" << 3;
+    QTest::newRow("in any order") << "40000-50000A 1000-11000A 20000-20005A" << 3;
+    QTest::newRow("last one too long") << "1000-2000A 20000-30001A" << 0;
+    QTest::newRow("one too long") << "1000-2000A 20000-30001A 40000-40001A 60000-60001A" << 2;
+    QTest::newRow("a normal one between") << "1000-2000A 20000-20001N 40000-40001A" << 1;
+    QTest::newRow("killed after its record") << "1000-2000A 1000-1500N 40000-40001A" << 1;
+    QTest::newRow("another one is running") << "1000-2000A 20000-90000R 40000-40001A" << 2;
+    QTest::newRow("later ones do not count") << "1000-2000A 100000-100001A" << 1;
+}
+
+void tst_RunExits::shortRuns()
+{
+    QFETCH(QString, ends);
+    QTEST(RunEnds::ShortRunsBefore(EndsOf(ends), 100000), "expected");
+}
+
+void tst_RunExits::longLife()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("logs/app.log");
+    const qint64 start = RunMark::ProgramStart() - 60000;
+    {
+        RunMark mark(log);
+        const QString note = LeftMark::make(log, start) + ".long";
+        QVERIFY(TestFiles::write(note, ""));
+        QVERIFY(!LeftMark::make(log, start + 1).isEmpty());
+        const std::vector<RunEnd> ends = mark.CollectOthers();
+        QCOMPARE(ends.size(), size_t(2));
+        QCOMPARE(ends[0].end, RunMark::ProgramStart());
+        QCOMPARE(ends[1].end, start + 1 + RunEnds::ShortRun);
+        QVERIFY(!QFile::exists(note));
+
+        const QDir marks(RunEnds::MarkFolderOf(log));
+        QCOMPARE(marks.entryList(QDir::Files).size(), 1);
+        mark.NoteLongLife();
+        QCOMPARE(marks.entryList({"*.run.long"}, QDir::Files).size(), 1);
+    }
+    QVERIFY(!QFile::exists(RunEnds::MarkFolderOf(log)));
+}
+
+// Not after two, and not without settings.
+void tst_RunExits::offersDefaultsAfterThreeShortRuns()
+{
+    Installation installation;
+    const QString settings = installation.LogFolder() + "../velocor.cfg";
+    installation.AddSpy("close");
+    installation.environment.insert("SPY_AWAIT", "Aa");
+    for (int run = 0; run < 3; ++run)
+        LeftMark::make(LogOf(installation), RunMark::ProgramStart() - 60000 + 1000 * run);
+    QVERIFY(SaysAbnormal(installation));
+    QVERIFY(!Says(installation, "Set Aside"));
+    QVERIFY(QFile::exists(settings)); // the spied one has closed normally
+    QVERIFY(QFile::remove(RunEnds::RecordFileOf(LogOf(installation))));
+    for (int run = 0; run < 2; ++run)
+        LeftMark::make(LogOf(installation), RunMark::ProgramStart() - 50000 + 1000 * run);
+    QVERIFY(SaysAbnormal(installation));
+    QVERIFY(!Says(installation, "Set Aside"));
+    QVERIFY(QFile::remove(RunEnds::RecordFileOf(LogOf(installation))));
+    for (int run = 0; run < 3; ++run)
+        LeftMark::make(LogOf(installation), RunMark::ProgramStart() - 40000 + 1000 * run);
+    QVERIFY(SaysAbnormal(installation));
+    QVERIFY(Says(installation, "Set Aside"));
+    QVERIFY(Says(installation, "velocor.cfg"));
 }
 
 // The file does not grow forever. The newest stay.

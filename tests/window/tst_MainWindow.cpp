@@ -106,6 +106,7 @@ private slots:
     void toolBar();
     void placesElidePaths();
     void tellsHowTheLastRunEnded();
+    void setsItsSettingsAside();
     void saveReport();
     void choicesOfAReport();
     void marksOfAReport();
@@ -536,6 +537,27 @@ void tst_MainWindow::tellsHowTheLastRunEnded()
     QVERIFY(isReported);
     Click(Child<QPushButton>(window.get(), "Dismiss how the last run ended"));
     QVERIFY(!text->isVisible());
+}
+
+// Only when the user says so, and then it does not write them again.
+void tst_MainWindow::setsItsSettingsAside()
+{
+    const WindowTest test(run(3, QTime(9, 0), "now"));
+    QVERIFY(TestFiles::write(test.settingsFile(), Settings));
+    QVERIFY(TestFiles::write(test.settingsFile() + ".set-aside-1", "earlier"));
+    for (int end : {30000, 40000, 50000})
+        QVERIFY(!LeftMark::make(test.logFile(), RunMark::ProgramStart() - end).isEmpty());
+    const auto window = WindowTest::show();
+    auto const* text = Child<QLabel>(window.get(), "How the last run ended");
+    QVERIFY2(text->text().contains(test.settingsFile()), qPrintable(text->text()));
+    QCOMPARE(TestFiles::read(test.settingsFile()), Settings);
+    auto* button = Child<QPushButton>(window.get(), "Set the settings of this window aside");
+    Click(button);
+    QVERIFY2(text->text().contains(test.settingsFile() + ".set-aside-2"), qPrintable(text->text()));
+    QVERIFY(!button->isVisible());
+    window->close();
+    QVERIFY(!QFile::exists(test.settingsFile()));
+    QCOMPARE(TestFiles::read(test.settingsFile() + ".set-aside-2"), Settings);
 }
 
 // What is saved is what is shown.
