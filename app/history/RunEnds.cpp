@@ -145,6 +145,21 @@ void RunEnds::Assign(std::vector<RunEnd> const& ends, std::vector<HistoryRun>& r
     }
 }
 
+int RunEnds::ShortRunsBefore(std::vector<RunEnd> const& ends, qint64 start)
+{
+    std::vector<RunEnd> earlier;
+    std::copy_if(ends.begin(), ends.end(), std::back_inserter(earlier), [&](RunEnd const& end) {
+        return end.start < start && end.exit != HistoryRun::Running && !IsContradicted(end, ends);
+    });
+    std::sort(earlier.begin(), earlier.end(),
+              [](RunEnd const& a, RunEnd const& b) { return a.start > b.start; });
+    const auto isLong = [](RunEnd const& end) {
+        return end.exit != HistoryRun::Abnormal || end.end - end.start > ShortRun;
+    };
+    const auto last = std::find_if(earlier.begin(), earlier.end(), isLong);
+    return static_cast<int>(last - earlier.begin());
+}
+
 QString RunEnds::RecordFileOf(QString const& log)
 {
     return InDataFolder(log, "ended-");

@@ -41,6 +41,13 @@ public:
     /// @param runs  of one log, with times
     static void Assign(std::vector<RunEnd> const& ends, std::vector<HistoryRun>& runs);
 
+    /// How many of the last runs before a time, in a row, were killed or crashed no later than
+    /// ShortRun after their start. Programs that are running do not count.
+    static int ShortRunsBefore(std::vector<RunEnd> const& ends, qint64 start);
+
+    /// The life of a run that ended soon after its start, in milliseconds.
+    static constexpr qint64 ShortRun = 10000;
+
     /// The file with the records for a log. Empty if it is not in a folder "logs".
     static QString RecordFileOf(QString const& log);
 

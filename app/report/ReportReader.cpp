@@ -19,6 +19,7 @@
 
 #include <algorithm>
 #include <deque>
+#include <numeric>
 #include <vector>
 
 namespace Velocor {
@@ -71,6 +72,13 @@ QString RunText(HistoryRun const& run)
         .arg(ExitText(run.exit));
 }
 
+QString LineText(HistoryCursor const& cursor)
+{
+    const bool isLong = cursor.content().size() > ReportReader::LineLimit;
+    return cursor.file().parser().Text(cursor.content().left(ReportReader::LineLimit)) +
+           (isLong ? QString(QChar(0x2026)) : QString()) + QLatin1Char('\n');
+}
+
 struct Entry
 {
     QString text; // of all lines
@@ -103,14 +111,7 @@ private:
 
 void LogCollector::add(HistoryCursor& cursor)
 {
-    QByteArray content = cursor.content();
-    const bool isLong = content.size() > ReportReader::LineLimit;
-    content.truncate(ReportReader::LineLimit);
-    QString line = cursor.file().parser().Text(content);
-    if (isLong)
-        line += QChar(0x2026);
-    line += QLatin1Char('\n');
-
+    const QString line = LineText(cursor);
     const auto run = static_cast<size_t>(&cursor.run() - m_history.runs().data());
     const size_t runsAfter = m_history.runs().size() - 1 - run;
     if (runsAfter < 2) {
@@ -119,7 +120,8 @@ void LogCollector::add(HistoryCursor& cursor)
         if (lines.size() > ReportReader::MaximumRunLines)
             lines.pop_front();
     }
-    const LogEntry entry = cursor.file().parser().Parse(content);
+    const LogEntry entry =
+        cursor.file().parser().Parse(cursor.content().left(ReportReader::LineLimit));
     if (entry.isEntry || m_entries.empty() || m_entries.back().run != run) {
         m_entries.push_back({line, LogSeverities::IsProblem(entry.severity), run});
         if (m_entries.size() > MaximumEntries)
@@ -131,10 +133,7 @@ void LogCollector::add(HistoryCursor& cursor)
 
 QString LogCollector::endOf(size_t run) const
 {
-    QString text;
-    for (QString const& line : m_lines[run])
-        text += line;
-    return text;
+    return std::accumulate(m_lines[run].begin(), m_lines[run].end(), QString());
 }
 
 ReportPart LogCollector::Runs() const
@@ -238,6 +237,30 @@ QList<ReportPart> ReportReader::Log(QString const& path)
     for (QString const& error : history.errors())
         runs.text += error + QLatin1Char('\n');
     return {runs, {QObject::tr("Problems"), collector.Problems(), {}}};
+}
+
+QString ReportReader::EndOfAbnormalRun(QString const& path)
+{
+    LogHistory history(LogFormats::ParserFor(path));
+    history.ReadLog(path);
+    history.ReadTimes();
+    history.ReadEnds(path);
+    std::vector<HistoryRun> const& runs = history.runs();
+    auto wanted = std::find_if(runs.rbegin(), runs.rend(), [](HistoryRun const& run) {
+        return run.exit == HistoryRun::Abnormal;
+    });
+    if (wanted == runs.rend() && runs.size() > 1)
+        wanted = runs.rbegin() + 1;
+    std::deque<QString> lines;
+    HistoryCursor cursor(history, false);
+    while (wanted != runs.rend() && cursor.Next()) {
+        if (&cursor.run() != &*wanted)
+            continue;
+        lines.push_back(LineText(cursor));
+        if (lines.size() > LastLines)
+            lines.pop_front();
+    }
+    return std::accumulate(lines.begin(), lines.end(), QString());
 }
 
 QString ReportReader::WithoutSecretValues(QString const& text)

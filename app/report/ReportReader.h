@@ -31,11 +31,16 @@ public:
     /// @param path  the current file; an empty one has no runs
     static QList<ReportPart> Log(QString const& path);
 
+    /// The last lines of the last run of a log that did not end normally; of the run before the
+    /// last one if it is not known which that is, and empty if there is none.
+    static QString EndOfAbnormalRun(QString const& path);
+
     /// The text of a settings file without the values whose names look secret. Where an element
     /// does not end, the rest of the text counts as its value.
     static QString WithoutSecretValues(QString const& text);
 
     static constexpr int MaximumRunLines = 2000;    ///< of each run
+    static constexpr int LastLines = 200;           ///< of a run that did not end normally
     static constexpr int MaximumProblems = 50;      ///< in a report
     static constexpr int EntriesAround = 10;        ///< before and after each problem
     static constexpr int LineLimit = 64 * 1024;     ///< longer lines are cut, in bytes

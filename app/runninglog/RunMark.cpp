@@ -4,7 +4,6 @@
 #include "app/runninglog/RunMark.h"
 
 #include "app/history/HistoryTime.h"
-#include "app/history/RunEnds.h"
 #include "app/history/RunMarkFile.h"
 
 #include <QDir>
@@ -30,11 +29,23 @@ constexpr qint64 MaximumRecordSize = 512 << 10; // some thousand runs
 // Before main(), so before the first entry.
 const std::chrono::system_clock::time_point s_start = std::chrono::system_clock::now();
 
+// Beside a mark; a change of the mark itself would make it doubtful.
+QByteArray LongLifeOf(QByteArray const& mark)
+{
+    return mark + ".long";
+}
+
 // Never deleted, because it is used when the program exits.
 std::vector<RunMark*>& AllMarks()
 {
     static auto* const marks = new std::vector<RunMark*>;
     return *marks;
+}
+
+void RemoveMark(QString const& path)
+{
+    QFile::remove(path);
+    QFile::remove(QFile::decodeName(LongLifeOf(QFile::encodeName(path))));
 }
 
 } // namespace
@@ -95,6 +106,7 @@ void RunMark::end()
         return;
     addRecord(RunEnds::Line({ProgramStart(), HistoryTime::Now(), HistoryRun::Normal}));
     ::unlink(m_path.constData());
+    ::unlink(LongLifeOf(m_path).constData());
     ::close(m_file);
     ::rmdir(m_folder.constData()); // fails if others are still using it
     m_path.clear();
@@ -121,23 +133,60 @@ bool RunMark::addRecord(QByteArray const& line) const
     return isWritten;
 }
 
-void RunMark::CollectOthers()
+void RunMark::NoteLongLife() const
 {
     if (m_path.isEmpty())
         return;
+    const int file = ::open(LongLifeOf(m_path).constData(), O_WRONLY | O_CREAT | O_CLOEXEC, 0666);
+    if (file >= 0)
+        ::close(file);
+}
+
+// Of a run that was killed, nobody knows more than this.
+qint64 RunMark::latestEnd(QString const& mark, qint64 start)
+{
+    const bool isLong = QFile::exists(QFile::decodeName(LongLifeOf(QFile::encodeName(mark))));
+    return isLong ? ProgramStart() : std::min(ProgramStart(), start + RunEnds::ShortRun);
+}
+
+std::vector<RunEnd> RunMark::CollectOthers()
+{
+    std::vector<RunEnd> ends;
+    if (m_path.isEmpty())
+        return ends;
     const QString folder = QFile::decodeName(m_folder);
     const QStringList names = RunMarkFile::NamesIn(folder);
     for (QString const& name : names) {
         const QString path = folder + QLatin1Char('/') + name;
         const RunMarkFile mark(path);
         // A program that started before this one, so its entries are not later.
-        const bool isOver =
-            mark.state() == RunMarkFile::LeftBehind && mark.start() <= ProgramStart() &&
-            addRecord(RunEnds::Line({mark.start(), ProgramStart(), HistoryRun::Abnormal}));
+        const RunEnd end = {mark.start(), latestEnd(path, mark.start()), HistoryRun::Abnormal};
+        const bool isOver = mark.state() == RunMarkFile::LeftBehind &&
+                            mark.start() <= ProgramStart() && addRecord(RunEnds::Line(end));
+        if (isOver)
+            ends.push_back(end);
         if (isOver || (mark.state() == RunMarkFile::Damaged && !mark.isNew()))
-            QFile::remove(path);
+            RemoveMark(path);
     }
     shortenRecord();
+    return withoutNormal(std::move(ends));
+}
+
+// A program that is killed right after its record leaves its mark behind.
+std::vector<RunEnd> RunMark::withoutNormal(std::vector<RunEnd> ends) const
+{
+    if (ends.empty())
+        return ends;
+    const std::vector<RunEnd> known = RunEnds::Of(m_log);
+    const auto endedNormally = [&known](RunEnd const& end) {
+        return std::any_of(known.begin(), known.end(), [&end](RunEnd const& other) {
+            return other.start == end.start && other.exit == HistoryRun::Normal;
+        });
+    };
+    ends.erase(std::remove_if(ends.begin(), ends.end(), endedNormally), ends.end());
+    std::sort(ends.begin(), ends.end(),
+              [](RunEnd const& a, RunEnd const& b) { return a.start < b.start; });
+    return ends;
 }
 
 // Without a lock: a program that ends at this moment may be missing, so nobody knows how it ended.

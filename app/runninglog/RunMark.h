@@ -3,8 +3,12 @@
 
 #pragma once
 
+#include "app/history/RunEnds.h"
+
 #include <QByteArray>
 #include <QString>
+
+#include <vector>
 
 namespace Velocor {
 
@@ -31,7 +35,14 @@ public:
     RunMark& operator=(RunMark const&) = delete;
 
     /// Records the ends of programs that left their marks behind, and removes these.
-    void CollectOthers();
+    ///
+    /// @return those that did not end normally, which no other program will be told again; the
+    ///         earliest first
+    std::vector<RunEnd> CollectOthers();
+
+    /// Notes that the program has been running for a while, so that its end is not one soon after
+    /// the start. To be called after RunEnds::ShortRun.
+    void NoteLongLife() const;
 
     /// When this program began, see HistoryCursor::time().
     static qint64 ProgramStart();
@@ -40,8 +51,10 @@ private:
     static void endAll();
     void make(QString const& folder);
     void end();
+    static qint64 latestEnd(QString const& mark, qint64 start);
     bool addRecord(QByteArray const& line) const;
     void shortenRecord() const;
+    std::vector<RunEnd> withoutNormal(std::vector<RunEnd> ends) const;
 
     QString m_log;
     QByteArray m_recordFile;

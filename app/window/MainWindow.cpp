@@ -5,6 +5,7 @@
 
 #include "app/ScreenlessPlatform_p.h"
 #include "app/UserMessages.h"
+#include "app/history/HistoryTime.h"
 #include "app/runninglog/LogHealth.h"
 #include "app/runninglog/LogPreferences.h"
 #include "app/runninglog/RunMark.h"
@@ -32,6 +33,7 @@
 #include <QFileInfo>
 #include <QGuiApplication>
 #include <QMenuBar>
+#include <QPushButton>
 #include <QScreen>
 #include <QSplitter>
 #include <QStatusBar>
@@ -49,6 +51,7 @@ namespace {
 
 constexpr int HealthInterval = 2000;       // milliseconds, while there is a problem or a change
 constexpr int IdleHealthInterval = 60000;  // milliseconds; nothing tells of a disk that fills up
+constexpr int SuspiciousRuns = 3;          // in a row
 constexpr int MessageTime = 6000;          // milliseconds
 constexpr int MaximumMessageLength = 1000; // characters
 
@@ -341,7 +344,7 @@ bool MainWindow::event(QEvent* event)
 void MainWindow::startWork()
 {
     m_tabs->ownLog()->Open(RunningLog::FileName(), true);
-    m_runMark->CollectOthers();
+    tellOfAbnormalEnds(m_runMark->CollectOthers());
     m_logHealth = std::make_unique<LogHealth>();
     connect(&m_healthTimer, &QTimer::timeout, this, &MainWindow::checkLog);
     connect(m_logHealth.get(), &LogHealth::mayHaveChanged, this, [this] {
@@ -349,6 +352,49 @@ void MainWindow::startWork()
             m_healthTimer.start(HealthInterval);
     });
     checkLog();
+    QTimer::singleShot(RunEnds::ShortRun, this, [this] { m_runMark->NoteLongLife(); });
+}
+
+void MainWindow::tellOfAbnormalEnds(std::vector<RunEnd> const& ends)
+{
+    if (ends.empty())
+        return;
+    auto* bar = new NoticeBar(tr("How the last run ended"));
+    QPushButton* showButton = bar->AddButton(tr("Show"));
+    showButton->setAccessibleName(tr("Show the last entries of that run"));
+    connect(showButton, &QPushButton::clicked, m_dialogs.get(), &WindowDialogs::ShowEndOfRun);
+    QPushButton* reportButton = bar->AddButton(tr("Report..."));
+    reportButton->setAccessibleName(tr("Report how the last run ended"));
+    connect(reportButton, &QPushButton::clicked, m_dialogs.get(), &WindowDialogs::SaveReport);
+    m_tabs->ownLog()->AddBar(bar);
+    const QString start =
+        HistoryTime::DateTime(ends.back().start).toString(QStringLiteral("yyyy-MM-dd hh:mm:ss"));
+    bar->ShowMessage(tr("The program that was started at %1 did not end normally.").arg(start));
+    const int shortRuns =
+        RunEnds::ShortRunsBefore(RunEnds::Of(RunningLog::FileName()), RunMark::ProgramStart());
+    if (shortRuns >= SuspiciousRuns && QFileInfo(m_settings.fileName()).isFile())
+        offerDefaults(bar);
+}
+
+// The window cannot know that its settings are the reason, so it leaves them alone until it is
+// told.
+void MainWindow::offerDefaults(NoticeBar* bar)
+{
+    bar->ShowMessage(
+        tr("It ended within ten seconds at least three times in a row. If that is because "
+           "of its settings, set them aside: %1")
+            .arg(m_settings.fileName()));
+    QPushButton* button = bar->AddButton(tr("Set Aside"));
+    button->setAccessibleName(tr("Set the settings of this window aside"));
+    connect(button, &QPushButton::clicked, this, [this, bar, button] {
+        QString name;
+        const QString error = m_settings.SetAside(name);
+        button->setVisible(!error.isEmpty());
+        bar->ShowMessage(
+            error.isEmpty()
+                ? tr("The next start uses default settings. These are now in %1").arg(name)
+                : error);
+    });
 }
 
 void MainWindow::checkLog()

@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "app/history/RunEnds.h"
 #include "app/window/FileOpener.h"
 #include "app/window/MarksFile.h"
 #include "app/window/WindowSettings.h"
@@ -11,6 +12,7 @@
 #include <QTimer>
 
 #include <memory>
+#include <vector>
 
 class QMenu;
 class QSplitter;
@@ -80,6 +82,8 @@ private:
     void saveState();
     void startWork();
     void openFilesOfStart();
+    void tellOfAbnormalEnds(std::vector<RunEnd> const& ends);
+    void offerDefaults(NoticeBar* bar);
     void checkLog();
     void showMessage(QString const& text);
 

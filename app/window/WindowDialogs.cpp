@@ -66,6 +66,16 @@ void WindowDialogs::SaveReport()
     dialog.exec();
 }
 
+void WindowDialogs::ShowEndOfRun()
+{
+    const QString text = ReportReader::EndOfAbnormalRun(RunningLog::FileName());
+    ReportDialog dialog(tr("Last Entries"),
+                        text.isEmpty() ? tr("The log no longer has the entries of that run.")
+                                       : tr("The last entries before the program ended:"),
+                        text, m_window);
+    dialog.exec();
+}
+
 void WindowDialogs::ChangeLogSettings()
 {
     LogSettingsDialog dialog(m_window);

@@ -25,6 +25,10 @@ public:
     void ShowShortcuts();
     void ShowManual();
     void SaveReport();
+
+    /// Shows the last entries of the last run that did not end normally.
+    void ShowEndOfRun();
+
     void ChangeLogSettings();
 
     /// Shows the folder of the program's log in the file manager.

@@ -137,15 +137,30 @@ void WindowSettings::take(QString const& section, QString const& key, QString co
         isPlain ? value : TorkConfigText::EncodeValue(TorkUnescaped(QLatin1Char('\\'), value)));
 }
 
-QString WindowSettings::renameDamagedFile()
+// To the first free name with this ending and a number.
+bool WindowSettings::rename(QString const& ending, QString& name)
 {
     for (int number = 1; number < 1000; ++number) {
         // Not by arg(): a product or user whose name holds "%1" would get the number there.
-        const QString name = m_fileName + QLatin1String(".damaged-") + QString::number(number);
-        if (QFile::exists(name))
-            continue;
-        if (!QFile::rename(m_fileName, name))
-            break;
+        name = m_fileName + ending + QString::number(number);
+        if (!QFile::exists(name))
+            return QFile::rename(m_fileName, name);
+    }
+    return false;
+}
+
+QString WindowSettings::SetAside(QString& name)
+{
+    if (!rename(QStringLiteral(".set-aside-"), name))
+        return QObject::tr("%1 cannot be renamed").arg(m_fileName);
+    m_mayWrite = false;
+    return QString();
+}
+
+QString WindowSettings::renameDamagedFile()
+{
+    QString name;
+    if (rename(QStringLiteral(".damaged-"), name)) {
         return QObject::tr("The settings file was damaged, so default settings are used. "
                            "The damaged file was kept as %1.")
             .arg(name);

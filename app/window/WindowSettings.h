@@ -38,6 +38,12 @@ public:
     /// @return the reason for a failure; empty on success
     QString Save();
 
+    /// Renames the file, so that the next start uses defaults, and saves nothing any more.
+    ///
+    /// @param name  set to the new name of the file
+    /// @return the reason for a failure, which leaves the file as it is; empty on success
+    QString SetAside(QString& name);
+
     /// Keeps what somebody has changed in the file since Load() or the last call: Save() writes
     /// those values instead of the window's own, and none where a key was removed. To be called
     /// after the user has saved the file in an editor; it takes effect at the next start. Does
@@ -65,6 +71,7 @@ public:
 
 private:
     QString renameDamagedFile();
+    bool rename(QString const& ending, QString& name);
     void applyEdits();
     void take(QString const& section, QString const& key, QString const& value);
 

@@ -70,6 +70,7 @@ private slots:
     void problems();
     void problemsOfOtherRuns();
     void runs();
+    void endOfAbnormalRun();
     void longRun();
     void noLog();
     void savedFolder();
@@ -212,6 +213,27 @@ void tst_Report::runs()
     QCOMPARE(part.files[0].text, QString(Run(9, 3, {})));
     QCOMPARE(part.files[1].name, QString("run-before.log"));
     QCOMPARE(part.files[1].text, QString(Run(8, 4, {1, 2})));
+}
+
+// Whichever files they are in; without records, the run before the last one.
+void tst_Report::endOfAbnormalRun()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("logs/app.log");
+    QVERIFY(TestFiles::write(log + ".2", Run(7, 300, {})));
+    QVERIFY(TestFiles::write(log + ".1", Run(8, 4, {})));
+    QVERIFY(TestFiles::write(log, Run(9, 3, {})));
+    QCOMPARE(ReportReader::EndOfAbnormalRun(log), QString(Run(8, 4, {})));
+    const QString records = RunEnds::RecordFileOf(log);
+    const QByteArray first = "2026-11-20T06:59:59.000 2026-11-20T07:30:00.000 abnormal\n";
+    QVERIFY(TestFiles::write(records, first));
+    QCOMPARE(Numbers(ReportReader::EndOfAbnormalRun(log)), Range(100, 299));
+    QVERIFY(TestFiles::write(records,
+                             first + "2026-11-20T07:59:59.000 2026-11-20T08:30:00.000 abnormal\n"));
+    QCOMPARE(ReportReader::EndOfAbnormalRun(log), QString(Run(8, 4, {})));
+    QVERIFY(QFile::remove(records) && QFile::remove(log + ".1") && QFile::remove(log + ".2"));
+    QCOMPARE(ReportReader::EndOfAbnormalRun(log), QString());
+    QCOMPARE(ReportReader::EndOfAbnormalRun(folder.filePath("logs/none.log")), QString());
 }
 
 void tst_Report::longRun()

@@ -6,8 +6,10 @@
 #include "app/Installation.h"
 #include "app/history/RunEnds.h"
 #include "app/runninglog/RunMark.h"
+#include "support/LeftMark.h"
 #include "support/TestFiles.h"
 
+#include <QJsonArray>
 #include <QTemporaryDir>
 #include <QtTest>
 
@@ -56,6 +58,45 @@ QByteArrayList DistinctOf(QByteArrayList list)
     return list;
 }
 
+// Whether a window that starts now, and is closed, tells that an earlier one did not end normally.
+// It has a spy.
+bool SaysAbnormal(Installation const& installation)
+{
+    QFile::remove(installation.top + "report.json");
+    RunningProgram program(installation);
+    if (program.ExitCode() != 0)
+        qWarning("the window did not close");
+    const QString texts = QJsonDocument(installation.Report()["texts"].toArray()).toJson();
+    if (!texts.contains("Aa"))
+        qWarning("no texts");
+    return texts.contains("did not end normally");
+}
+
+// What the last spied window showed.
+bool Says(Installation const& installation, QString const& text)
+{
+    return QString(QJsonDocument(installation.Report()["texts"].toArray()).toJson()).contains(text);
+}
+
+QStringList Words(QString const& text)
+{
+    return text.isEmpty() ? QStringList() : text.split(' ');
+}
+
+std::vector<RunEnd> EndsOf(QString const& texts)
+{
+    const QString letters = "UNAR";
+    std::vector<RunEnd> ends;
+    for (QString const& text : Words(texts)) {
+        RunEnd end;
+        end.start = text.section('-', 0, 0).toLongLong();
+        end.end = text.section('-', 1).chopped(1).toLongLong();
+        end.exit = static_cast<HistoryRun::Exit>(letters.indexOf(text.right(1)));
+        ends.push_back(end);
+    }
+    return ends;
+}
+
 bool CopyFolder(QString const& from, QString const& to)
 {
     return QProcess::execute("cp", {"-a", from, to}) == 0;
@@ -80,10 +121,17 @@ class tst_RunExits : public QObject
 private slots:
     void exits_data();
     void exits();
+    void toldAtTheNextStart_data();
+    void toldAtTheNextStart();
     void endOfTheSession();
     void secondWindow();
     void copiedFolder();
     void markOfAForkedChild();
+    void killedAfterItsRecord();
+    void shortRuns_data();
+    void shortRuns();
+    void longLife();
+    void offersDefaultsAfterThreeShortRuns();
     void longRecord();
 
 private:
@@ -178,6 +226,34 @@ void tst_RunExits::compareAfterNextStart(Installation const& installation,
     QCOMPARE(Exits(installation, log), QByteArrayList({expected, "normal"}));
 }
 
+void tst_RunExits::toldAtTheNextStart_data()
+{
+    exits_data();
+}
+
+// Once, by the next window; never if another one is running, nor if nothing is known.
+void tst_RunExits::toldAtTheNextStart()
+{
+    QFETCH(QString, how);
+    QFETCH(QByteArray, expected);
+    Installation installation;
+    if (how == "closed")
+        installation.AddSpy("close");
+    RunningProgram program(installation);
+    if (how == "closed") {
+        QCOMPARE(program.ExitCode(), 0);
+    } else {
+        QTRY_COMPARE_WITH_TIMEOUT(Exits(installation, LogOf(installation)),
+                                  QByteArrayList({"running"}), Patience);
+        if (how != "still running")
+            endLike(installation, program, how);
+    }
+    installation.AddSpy("close");
+    installation.environment.insert("SPY_AWAIT", "Aa"); // made with the notices
+    QCOMPARE(SaysAbnormal(installation), expected == "abnormal");
+    QVERIFY(!SaysAbnormal(installation));
+}
+
 // The display goes away, and the program exits without returning to main().
 void tst_RunExits::endOfTheSession()
 {
@@ -256,6 +332,93 @@ void tst_RunExits::markOfAForkedChild()
     QCOMPARE(RunEnds::Of(log).size(), size_t(1));
     QCOMPARE(RunEnds::Of(log)[0].exit, HistoryRun::Normal);
     QCOMPARE(RunEnds::Of(log)[0].start, RunMark::ProgramStart());
+}
+
+// Its record counts, so nobody is told.
+void tst_RunExits::killedAfterItsRecord()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("logs/app.log");
+    const qint64 start = RunMark::ProgramStart() - 60000;
+    QVERIFY(!LeftMark::make(log, start).isEmpty());
+    QVERIFY(!LeftMark::make(log, start - 1).isEmpty());
+    QVERIFY(TestFiles::write(RunEnds::RecordFileOf(log),
+                             RunEnds::Line({start, start + 5, HistoryRun::Normal})));
+    RunMark mark(log);
+    const std::vector<RunEnd> ends = mark.CollectOthers();
+    QCOMPARE(ends.size(), size_t(1));
+    QCOMPARE(ends[0].start, start - 1);
+    QVERIFY(mark.CollectOthers().empty());
+}
+
+void tst_RunExits::shortRuns_data()
+{
+    QTest::addColumn<QString>("ends"); // start-end and first letter of the exit
+    QTest::addColumn<int>("expected");
+    QTest::newRow("none") << "" << 0;
+    QTest::newRow("three") << "1000-11000A 20000-20005A 40000-50000A" << 3;
+    QTest::newRow("in any order") << "40000-50000A 1000-11000A 20000-20005A" << 3;
+    QTest::newRow("last one too long") << "1000-2000A 20000-30001A" << 0;
+    QTest::newRow("one too long") << "1000-2000A 20000-30001A 40000-40001A 60000-60001A" << 2;
+    QTest::newRow("a normal one between") << "1000-2000A 20000-20001N 40000-40001A" << 1;
+    QTest::newRow("killed after its record") << "1000-2000A 1000-1500N 40000-40001A" << 1;
+    QTest::newRow("another one is running") << "1000-2000A 20000-90000R 40000-40001A" << 2;
+    QTest::newRow("later ones do not count") << "1000-2000A 100000-100001A" << 1;
+}
+
+void tst_RunExits::shortRuns()
+{
+    QFETCH(QString, ends);
+    QTEST(RunEnds::ShortRunsBefore(EndsOf(ends), 100000), "expected");
+}
+
+void tst_RunExits::longLife()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("logs/app.log");
+    const qint64 start = RunMark::ProgramStart() - 60000;
+    {
+        RunMark mark(log);
+        const QString note = LeftMark::make(log, start) + ".long";
+        QVERIFY(TestFiles::write(note, ""));
+        QVERIFY(!LeftMark::make(log, start + 1).isEmpty());
+        const std::vector<RunEnd> ends = mark.CollectOthers();
+        QCOMPARE(ends.size(), size_t(2));
+        QCOMPARE(ends[0].end, RunMark::ProgramStart());
+        QCOMPARE(ends[1].end, start + 1 + RunEnds::ShortRun);
+        QVERIFY(!QFile::exists(note));
+
+        const QDir marks(RunEnds::MarkFolderOf(log));
+        QCOMPARE(marks.entryList(QDir::Files).size(), 1);
+        mark.NoteLongLife();
+        QCOMPARE(marks.entryList({"*.run.long"}, QDir::Files).size(), 1);
+    }
+    QVERIFY(!QFile::exists(RunEnds::MarkFolderOf(log)));
+}
+
+// Not after two, and not without settings.
+void tst_RunExits::offersDefaultsAfterThreeShortRuns()
+{
+    Installation installation;
+    const QString settings = installation.LogFolder() + "../velocor.cfg";
+    installation.AddSpy("close");
+    installation.environment.insert("SPY_AWAIT", "Aa");
+    for (int run = 0; run < 3; ++run)
+        LeftMark::make(LogOf(installation), RunMark::ProgramStart() - 60000 + 1000 * run);
+    QVERIFY(SaysAbnormal(installation));
+    QVERIFY(!Says(installation, "Set Aside"));
+    QVERIFY(QFile::exists(settings)); // the spied one has closed normally
+    QVERIFY(QFile::remove(RunEnds::RecordFileOf(LogOf(installation))));
+    for (int run = 0; run < 2; ++run)
+        LeftMark::make(LogOf(installation), RunMark::ProgramStart() - 50000 + 1000 * run);
+    QVERIFY(SaysAbnormal(installation));
+    QVERIFY(!Says(installation, "Set Aside"));
+    QVERIFY(QFile::remove(RunEnds::RecordFileOf(LogOf(installation))));
+    for (int run = 0; run < 3; ++run)
+        LeftMark::make(LogOf(installation), RunMark::ProgramStart() - 40000 + 1000 * run);
+    QVERIFY(SaysAbnormal(installation));
+    QVERIFY(Says(installation, "Set Aside"));
+    QVERIFY(Says(installation, "velocor.cfg"));
 }
 
 // The file does not grow forever. The newest stay.

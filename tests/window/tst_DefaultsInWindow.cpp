@@ -77,7 +77,7 @@ void tst_DefaultsInWindow::differingValuesAreBold()
     QVERIFY(shown.isBold(2, 0));
     QVERIFY(!ItemCell(shown.tree, 0, 1, 0).data(Qt::FontRole).value<QFont>().bold());
     const QModelIndex cell = ItemCell(shown.tree, 0, 1, 1);
-    QCOMPARE(cell.data(Qt::AccessibleDescriptionRole).toString(), QString("Default: 20"));
+    QCOMPARE(cell.data(Qt::AccessibleDescriptionRole).toString(), QString("Number. Default: 20"));
     QCOMPARE(cell.data(Qt::ToolTipRole).toString(), QString("Default: 20"));
     QVERIFY(ItemCell(shown.tree, 0, 0, 1).data(Qt::ToolTipRole).isNull());
     SetValue(shown.tree, 1, "20");

@@ -6,6 +6,7 @@
 #include "WindowParts.h"
 #include "WindowTestCase.h"
 
+#include "app/runninglog/RunMark.h"
 #include "app/window/FileTabs.h"
 #include "app/window/PlacesPanel.h"
 #include "app/window/ProblemReportDialog.h"
@@ -13,6 +14,7 @@
 #include "app/window/log/LogModel.h"
 #include "app/window/widgets/ElidedLabel.h"
 #include "app/window/widgets/NoticeBar.h"
+#include "support/LeftMark.h"
 
 #include <QAbstractButton>
 #include <QClipboard>
@@ -103,6 +105,8 @@ private slots:
     void opensTheManual();
     void toolBar();
     void placesElidePaths();
+    void tellsHowTheLastRunEnded();
+    void setsItsSettingsAside();
     void saveReport();
     void choicesOfAReport();
     void marksOfAReport();
@@ -499,6 +503,61 @@ void tst_MainWindow::placesElidePaths()
     QVERIFY2(place->ShownText().startsWith("/home/"), qPrintable(place->ShownText()));
     QVERIFY2(place->ShownText().endsWith("documents/"), qPrintable(place->ShownText()));
     QVERIFY(place->toolTip().contains(QString("a-long-name/").repeated(30)));
+}
+
+// It says so in a bar, from which the user can see the end of that run and make a report.
+void tst_MainWindow::tellsHowTheLastRunEnded()
+{
+    const WindowTest test(run(3, QTime(9, 0), "now"));
+    QVERIFY(TestFiles::write(test.logFile() + ".1", run(2, QTime(8, 0), "crashed")));
+    {
+        const auto window = WindowTest::show();
+        for (QLabel const* label : window->findChildren<QLabel*>())
+            QVERIFY(label->accessibleName() != "How the last run ended");
+    }
+    QVERIFY(!LeftMark::make(test.logFile(), RunMark::ProgramStart() - 60000).isEmpty());
+    const auto window = WindowTest::show();
+    auto const* text = Child<QLabel>(window.get(), "How the last run ended");
+    QVERIFY(text && text->isVisible());
+    QVERIFY2(text->text().endsWith(" did not end normally."), qPrintable(text->text()));
+
+    QString shown;
+    WindowTest::whenShown<ReportDialog>([&](ReportDialog* dialog) {
+        shown = Child<QPlainTextEdit>(dialog, "Last Entries")->toPlainText();
+        dialog->reject();
+    });
+    Click(Child<QPushButton>(window.get(), "Show the last entries of that run"));
+    QCOMPARE(shown, QString(run(2, QTime(8, 0), "crashed")));
+    bool isReported = false;
+    WindowTest::whenShown<ProblemReportDialog>([&](ProblemReportDialog* dialog) {
+        isReported = true;
+        dialog->reject();
+    });
+    Click(Child<QPushButton>(window.get(), "Report how the last run ended"));
+    QVERIFY(isReported);
+    Click(Child<QPushButton>(window.get(), "Dismiss how the last run ended"));
+    QVERIFY(!text->isVisible());
+}
+
+// Only when the user says so, and then it does not write them again.
+void tst_MainWindow::setsItsSettingsAside()
+{
+    const WindowTest test(run(3, QTime(9, 0), "now"));
+    QVERIFY(TestFiles::write(test.settingsFile(), Settings));
+    QVERIFY(TestFiles::write(test.settingsFile() + ".set-aside-1", "earlier"));
+    for (int end : {30000, 40000, 50000})
+        QVERIFY(!LeftMark::make(test.logFile(), RunMark::ProgramStart() - end).isEmpty());
+    const auto window = WindowTest::show();
+    auto const* text = Child<QLabel>(window.get(), "How the last run ended");
+    QVERIFY2(text->text().contains(test.settingsFile()), qPrintable(text->text()));
+    QCOMPARE(TestFiles::read(test.settingsFile()), Settings);
+    auto* button = Child<QPushButton>(window.get(), "Set the settings of this window aside");
+    Click(button);
+    QVERIFY2(text->text().contains(test.settingsFile() + ".set-aside-2"), qPrintable(text->text()));
+    QVERIFY(!button->isVisible());
+    window->close();
+    QVERIFY(!QFile::exists(test.settingsFile()));
+    QCOMPARE(TestFiles::read(test.settingsFile() + ".set-aside-2"), Settings);
 }
 
 // What is saved is what is shown.
