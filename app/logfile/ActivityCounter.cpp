@@ -135,9 +135,10 @@ qint64 ActivityCounter::timeAt(size_t row)
     if (known != m_times.end())
         return known->second;
     const LogLineParser::Parts parts = firstTimed(row, -1);
-    const qint64 time = parts.timeKey >= 0 ? parts.timeKey : firstTimed(row, 1).timeKey;
-    m_times.emplace(row, time);
-    return time;
+    if (parts.timeKey < 0)
+        return firstTimed(row, 1).timeKey; // may be another one when the rows below are others
+    m_times.emplace(row, parts.timeKey);
+    return parts.timeKey;
 }
 
 int ActivityCounter::barOf(qint64 time, Activity const& activity) const

@@ -120,7 +120,7 @@ private:
     QFile m_file;
     std::shared_ptr<LogRows const> m_rows;      // of the last request
     std::vector<LogCounts> m_sums;              // of the rows before each block
-    std::unordered_map<size_t, qint64> m_times; // of rows that were read; -1 if there is none
+    std::unordered_map<size_t, qint64> m_times; // of rows, as known from them or those above
     std::vector<size_t> m_firstRows;            // of the bars, and the row after the last one
 };
 
