@@ -13,6 +13,7 @@
 #     scripts/install-packages.sh build fuzz     and clang with its fuzzing runtime
 #     scripts/install-packages.sh build lint     and to check format and lint
 #     scripts/install-packages.sh build package  and to validate and build the package
+#     scripts/install-packages.sh package-test   and to test the packages in a bare root
 #     scripts/install-packages.sh build reproducible   and to build twice and compare
 #     scripts/install-packages.sh build abi      and to compare the binary interface
 #     scripts/install-packages.sh consumers      the compilers of projects that use the package
@@ -27,7 +28,7 @@ packages_of() {
     Darwin/build) echo cmake ninja qt@5 rapidxml ;;
     Darwin/qt6) echo qt ;;
     Darwin/lint) echo clang-format@14 llvm@14 shellcheck ;;
-    Darwin/test | Darwin/wayland | Darwin/package | Darwin/consumers) ;;
+    Darwin/test | Darwin/wayland | Darwin/package | Darwin/package-test | Darwin/consumers) ;;
     */build) echo g++ cmake ninja-build qtbase5-dev librapidxml-dev ;;
     */qt6) echo qt6-base-dev qt6-5compat-dev ;;
     */wayland) echo qtwayland5 ;;
@@ -42,6 +43,7 @@ packages_of() {
         ;;
     */fuzz) echo clang-14 libclang-rt-14-dev ;;
     */package) echo dpkg-dev debhelper doxygen lintian devscripts blhc desktop-file-utils appstream man-db ;;
+    */package-test) echo debootstrap piuparts autopkgtest ;;
     */reproducible) echo reprotest faketime disorderfs dpkg-dev ;;
     */consumers) echo g++-12 clang-14 clang-16 clang-19 pkg-config ;;
     */abi) echo abigail-tools binutils ;;
