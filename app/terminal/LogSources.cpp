@@ -24,9 +24,9 @@ QList<ProgramLog> FamilyLogs()
     return ProgramLogs::In(LogSources::FamilyFolder());
 }
 
-LogSource SourceOf(ProgramLog const& log)
+PrintedLog SourceOf(ProgramLog const& log)
 {
-    LogSource source;
+    PrintedLog source;
     source.name = log.name;
     source.log = log.path;
     return source;
@@ -47,7 +47,7 @@ void SortOldestFirst(QStringList& files)
 
 } // namespace
 
-QString LogSource::CurrentPath() const
+QString PrintedLog::CurrentPath() const
 {
     return LogFileList::CurrentOf(QFileInfo(path()).absoluteFilePath());
 }
@@ -61,7 +61,7 @@ LogSources::LogSources(QStringList const& names, bool joinsFiles) : m_joinsFiles
     }
     for (QString const& name : names)
         add(name);
-    for (LogSource& source : m_sources) {
+    for (PrintedLog& source : m_sources) {
         if (source.files.size() > 1)
             SortOldestFirst(source.files);
     }
@@ -93,7 +93,7 @@ void LogSources::add(QString const& name)
 
 void LogSources::addFile(QString const& path)
 {
-    const auto sameLog = [&path](LogSource const& source) {
+    const auto sameLog = [&path](PrintedLog const& source) {
         return !source.files.isEmpty() && !source.isInput &&
                LogFileList::CurrentOf(QFileInfo(source.files.first()).absoluteFilePath()) ==
                    LogFileList::CurrentOf(QFileInfo(path).absoluteFilePath());
@@ -103,7 +103,7 @@ void LogSources::addFile(QString const& path)
         known->files.append(path);
         return;
     }
-    LogSource source;
+    PrintedLog source;
     source.name = ProgramLogs::NameOf(path);
     source.files = QStringList(path);
     m_sources.append(source);
@@ -128,7 +128,7 @@ void LogSources::addInput()
         m_errors.append(QLatin1String("-: ") + QObject::tr("Standard input cannot be read"));
         return;
     }
-    LogSource source;
+    PrintedLog source;
     source.name = QLatin1String("-");
     source.files = QStringList(m_input->fileName());
     source.isInput = true;

@@ -15,7 +15,7 @@
 namespace Velocor {
 
 /// A log that the command line names.
-struct LogSource
+struct PrintedLog
 {
     QString name;         ///< of the program or file, for users
     QString log;          ///< the current file, if all files of the log are meant
@@ -48,7 +48,7 @@ public:
     /// Where the data folders of this user's programs are.
     static QString FamilyFolder();
 
-    QList<LogSource> const& sources() const { return m_sources; }
+    QList<PrintedLog> const& sources() const { return m_sources; }
 
     /// Of the names that are neither a file nor a program, for users.
     QStringList const& errors() const { return m_errors; }
@@ -59,7 +59,7 @@ private:
     void addInput();
 
     bool m_joinsFiles;
-    QList<LogSource> m_sources;
+    QList<PrintedLog> m_sources;
     QStringList m_errors;
     std::unique_ptr<QTemporaryFile> m_input;
 };

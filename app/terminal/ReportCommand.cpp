@@ -77,7 +77,8 @@ ReportCommand::ReportCommand(QStringList const& arguments)
     parser.addPositionalArgument(QStringLiteral("report"), QString(), QStringLiteral("report"));
     parser.addPositionalArgument(QStringLiteral("PATH"), QObject::tr("The report."),
                                  QStringLiteral("[PATH]"));
-    if (!parser.parse(QStringList(QCoreApplication::arguments().first()) + arguments)) {
+    const QStringList all = QCoreApplication::arguments();
+    if (!parser.parse(all.mid(0, 1) + arguments)) {
         m_error = parser.errorText();
     } else if (parser.isSet(QStringLiteral("help"))) {
         m_answer = parser.helpText().toLocal8Bit();

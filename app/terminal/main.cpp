@@ -45,7 +45,7 @@ public:
     int run();
 
 private:
-    std::unique_ptr<LogHistory> read(LogSource const& source, LogFilter const& filter);
+    std::unique_ptr<LogHistory> read(PrintedLog const& source, LogFilter const& filter);
     void complain(QString const& problem);
     void printRuns();
     void printLines();
@@ -53,8 +53,8 @@ private:
     void printMerged(LineWriter& writer);
     void printPatterns();
     void print(TextTable const& table);
-    void print(LogSource const& source, HistoryCursor& cursor, LineWriter& writer);
-    void addFollower(LogSource const& source, LogHistory const& history, LineWriter& writer);
+    void print(PrintedLog const& source, HistoryCursor& cursor, LineWriter& writer);
+    void addFollower(PrintedLog const& source, LogHistory const& history, LineWriter& writer);
     void follow();
     bool isInSpan(qint64 time) const;
 
@@ -73,7 +73,7 @@ void Command::complain(QString const& problem)
     PrintError(problem);
 }
 
-std::unique_ptr<LogHistory> Command::read(LogSource const& source, LogFilter const& filter)
+std::unique_ptr<LogHistory> Command::read(PrintedLog const& source, LogFilter const& filter)
 {
     auto history = std::make_unique<LogHistory>(LogFormats::ParserFor(source.path()), filter);
     source.Read(*history);
@@ -99,7 +99,7 @@ std::unique_ptr<LogHistory> Command::read(LogSource const& source, LogFilter con
 void Command::printRuns()
 {
     RunTable table;
-    for (LogSource const& source : m_sources.sources()) {
+    for (PrintedLog const& source : m_sources.sources()) {
         const std::unique_ptr<LogHistory> history = read(source, LogFilter());
         history->ReadTimes();
         history->ReadEnds(source.CurrentPath());
@@ -127,7 +127,7 @@ bool Command::isInSpan(qint64 time) const
 void Command::printPatterns()
 {
     PatternList patterns;
-    for (LogSource const& source : m_sources.sources()) {
+    for (PrintedLog const& source : m_sources.sources()) {
         const std::unique_ptr<LogHistory> history = read(source, m_options.filter);
         HistoryCursor cursor(*history, true);
         while (cursor.Next()) {
@@ -139,7 +139,7 @@ void Command::printPatterns()
     print(PatternTable(patterns));
 }
 
-void Command::print(LogSource const& source, HistoryCursor& cursor, LineWriter& writer)
+void Command::print(PrintedLog const& source, HistoryCursor& cursor, LineWriter& writer)
 {
     // It is printed once it is complete.
     const bool isIncomplete =
@@ -151,7 +151,7 @@ void Command::print(LogSource const& source, HistoryCursor& cursor, LineWriter& 
                   cursor.content(), cursor.mark(), cursor.line() + 1, cursor.time()});
 }
 
-void Command::addFollower(LogSource const& source, LogHistory const& history, LineWriter& writer)
+void Command::addFollower(PrintedLog const& source, LogHistory const& history, LineWriter& writer)
 {
     if (!m_options.follows)
         return;
@@ -182,7 +182,7 @@ void Command::follow()
 // One log after the other, so that only one is in memory.
 void Command::printOneByOne(LineWriter& writer, bool withTimes)
 {
-    for (LogSource const& source : m_sources.sources()) {
+    for (PrintedLog const& source : m_sources.sources()) {
         const std::unique_ptr<LogHistory> history = read(source, m_options.filter);
         HistoryCursor cursor(*history, withTimes);
         while (m_output.error() == 0 && cursor.Next())
@@ -195,7 +195,7 @@ void Command::printMerged(LineWriter& writer)
 {
     std::vector<std::unique_ptr<LogHistory>> histories;
     std::vector<HistoryCursor> cursors;
-    for (LogSource const& source : m_sources.sources()) {
+    for (PrintedLog const& source : m_sources.sources()) {
         histories.push_back(read(source, m_options.filter));
         cursors.emplace_back(*histories.back(), true);
     }
@@ -209,7 +209,7 @@ void Command::printMerged(LineWriter& writer)
 void Command::printLines()
 {
     QStringList names;
-    for (LogSource const& source : m_sources.sources())
+    for (PrintedLog const& source : m_sources.sources())
         names.append(source.name);
     const auto writer = LineWriter::Make(m_options, isatty(STDOUT_FILENO) == 1, names, m_output);
     const bool withTimes = m_options.hasTimes() || m_options.format == TerminalOptions::Csv ||

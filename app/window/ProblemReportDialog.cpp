@@ -54,7 +54,8 @@ ProblemReportDialog::ProblemReportDialog(QList<ReportPart> const& parts, Redacto
     connect(save, &QPushButton::clicked, this, &ProblemReportDialog::chooseFile);
     connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
     RemoveButtonIcons(buttons);
-    for (QAbstractButton* button : buttons->buttons())
+    const QList<QAbstractButton*> all = buttons->buttons();
+    for (QAbstractButton* button : all)
         static_cast<QPushButton*>(button)->setAutoDefault(false); // Enter ends the words
 
     auto* layout = new QVBoxLayout(this);

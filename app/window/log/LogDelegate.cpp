@@ -314,8 +314,8 @@ void LogDelegate::paintGap(QPainter* painter, QStyleOptionViewItem const& option
     const bool isSelected = option.state & QStyle::State_Selected;
     // Not the cell's own, in which a severity has its color.
     const QPalette palette = option.widget ? option.widget->palette() : option.palette;
-    const QColor text = palette.color(isSelected ? QPalette::HighlightedText : QPalette::Text);
-    const QColor ground = palette.color(isSelected ? QPalette::Highlight : QPalette::Base);
+    QColor const& text = palette.color(isSelected ? QPalette::HighlightedText : QPalette::Text);
+    QColor const& ground = palette.color(isSelected ? QPalette::Highlight : QPalette::Base);
     painter->save();
     painter->setClipRect(option.rect);
     painter->fillRect(option.rect.left(), option.rect.top(), option.rect.width(), 1,
