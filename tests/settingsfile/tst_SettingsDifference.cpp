@@ -149,15 +149,16 @@ void tst_SettingsDifference::takeOver_data()
     row("items added within", "s: a=1 b=2", "s: a=1 x=9 y=8 b=2", {2, 3}, "s: a=1 x=9 y=8 b=2");
     row("one of two added items", "s: a=1 b=2", "s: a=1 x=9 y=8 b=2", {3}, "s: a=1 y=8 b=2");
     row("added beside one that is removed", "s: a=1 b=2", "s: x=9 b=2", {1, 2}, "s: x=9 b=2");
-    row("moved items stay", "s: a=1 b=2", "s: b=6 a=1", {0}, "s: a=1 b=6");
-    row("added after a moved item", "s: a=1 b=2", "s: b=2 x=9 a=1", {2}, "s: a=1 b=2 x=9");
+    row("moved items", "s: a=1 b=2", "s: b=6 a=1", {0}, "s: b=6 a=1");
+    row("added before an item that was below", "s: a=1 b=2", "s: b=2 x=9 a=1", {2},
+        "s: x=9 a=1 b=2");
     row("added section", "s: a=1", "r: b=2 c=3; s: a=1", {0}, "r: b=2 c=3; s: a=1");
     row("added section without items", "s: a=1", "s: a=1; t:", {2}, "s: a=1; t:");
     row("item of an added section", "s: a=1", "s: a=1; t: b=2 c=3", {4}, "s: a=1; t: c=3");
     row("nothing of an added section", "s: a=1", "s: a=5; t: b=2", {1}, "s: a=5");
     row("removed section", "s: a=1; t: b=2", "s: a=1", {2}, "s: a=1");
     row("item of a removed section", "s: a=1; t: b=2 c=3", "s: a=1", {3}, "s: a=1; t: c=3");
-    row("moved section stays", "s: a=1; t: b=2", "t: b=6; s: a=1", {0}, "s: a=1; t: b=6");
+    row("moved section", "s: a=1; t: b=2", "t: b=6; s: a=1", {0}, "t: b=6; s: a=1");
 }
 
 void tst_SettingsDifference::takeOver()

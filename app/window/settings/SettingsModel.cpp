@@ -3,6 +3,7 @@
 
 #include "app/window/settings/SettingsModel.h"
 
+#include "app/window/settings/ValueDialog.h"
 #include "app/window/settings/ValueEditing.h"
 #include "app/window/settings/ValueIcons.h"
 #include "app/window/widgets/PlainText.h"
@@ -226,8 +227,11 @@ ValueKind SettingsModel::KindOf(QModelIndex const& index)
 bool SettingsModel::HasDialog(QModelIndex const& index)
 {
     const QModelIndex cell = index.sibling(index.row(), ValueColumn);
-    return HasValueDialog(KindOf(cell)) || IsLong(cell) ||
-           FullText(cell).contains(QLatin1Char('\n'));
+    if (HasValueDialog(KindOf(cell)) || IsLong(cell))
+        return true;
+    // A field in the cell loses line feeds that are typed, but keeps the breaks that are there.
+    const QString text = FullText(cell);
+    return text.contains(QLatin1Char('\n')) && ValueDialog::CanEdit(text);
 }
 
 QPair<QString, QString> SettingsModel::namesOf(QModelIndex const& index) const

@@ -116,7 +116,7 @@ ValueDialog::ValueDialog(QString const& name, QString const& value, QWidget* par
         heading += QLatin1Char('\n') +
                    QObject::tr("Long lines are split for display; only %1 marks a line break.")
                        .arg(m_mark);
-    m_text->setReadOnly(HasOtherBreaks(value));
+    m_text->setReadOnly(!CanEdit(value));
     if (m_text->isReadOnly())
         heading +=
             QLatin1Char('\n') +
@@ -151,6 +151,11 @@ QString ValueDialog::value() const
         return text.replace(QChar(QChar::ParagraphSeparator), QLatin1Char('\n'));
     text.remove(QChar(QChar::ParagraphSeparator));
     return text.replace(m_mark, QLatin1Char('\n'));
+}
+
+bool ValueDialog::CanEdit(QString const& value)
+{
+    return !HasOtherBreaks(value);
 }
 
 } // namespace Velocor

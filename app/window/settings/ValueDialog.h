@@ -37,6 +37,10 @@ public:
     /// The maximum length of a line that is not split, in characters.
     static constexpr int MaximumLineLength = 10000;
 
+    /// Whether the dialog can show all line breaks of a value as what they are. It cannot edit
+    /// others.
+    static bool CanEdit(QString const& value);
+
 private:
     QString m_value;
     QChar m_mark; ///< marks real line breaks; null if lines are not split
