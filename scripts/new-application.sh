@@ -18,6 +18,8 @@ fail() {
 [ $# -eq 2 ] || fail "usage: new-application.sh NAME FOLDER"
 name=$1
 folder=$2
+[ -n "$folder" ] || fail "no folder"
+[[ $folder != -* ]] || folder=./$folder
 
 here=$(cd "$(dirname "${BASH_SOURCE[0]}")" && pwd -P)
 starter=$here/../examples/starter
@@ -28,7 +30,7 @@ LC_ALL=C
 small=$(tr '[:upper:]' '[:lower:]' <<<"$name")
 case $small in
 # Targets and projects of CMake, and of the package.
-all | clean | edit | help | install | package | rebuild | test | tork | velocor)
+all | clean | edit | help | install | package | preinstall | rebuild | test | tork | velocor)
     fail "the name is taken: $name"
     ;;
 esac

@@ -9,6 +9,7 @@
 #include "app/logfile/LogFields.h"
 
 #include <QDateTime>
+#include <QLocale>
 
 #include <algorithm>
 #include <cstring>
@@ -668,8 +669,8 @@ QString ForeignLine::EpochText(char const* number, int length)
     const qint64 milliseconds = EpochOf(number, length);
     if (milliseconds < 0)
         return QString();
-    return QDateTime::fromMSecsSinceEpoch(milliseconds)
-        .toString(QStringLiteral("yyyy-MM-dd hh:mm:ss.zzz"));
+    return QLocale::c().toString(QDateTime::fromMSecsSinceEpoch(milliseconds),
+                                 QStringLiteral("yyyy-MM-dd hh:mm:ss.zzz"));
 }
 
 } // namespace Velocor

@@ -7,6 +7,7 @@
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
+#include <QLocale>
 #include <QObject>
 #include <QSaveFile>
 
@@ -49,7 +50,7 @@ QVector<SavedStates::State> SavedStates::named(QString const& pattern) const
     const QFileInfoList files = QDir(m_folder).entryInfoList({pattern}, QDir::Files, QDir::NoSort);
     for (QFileInfo const& file : files) {
         const QString name = file.completeBaseName();
-        QDateTime time = QDateTime::fromString(name.mid(HashLength + 1), TimeFormat);
+        QDateTime time = QLocale::c().toDateTime(name.mid(HashLength + 1), TimeFormat);
         time.setTimeSpec(Qt::UTC);
         if (time.isValid() && name.at(HashLength) == QLatin1Char('-') && !file.isSymLink())
             states.append({file.filePath(), time.toLocalTime(), file.size()});
@@ -99,7 +100,8 @@ QString SavedStates::Keep(QString const& path) const
     QDateTime time = QDateTime::currentDateTimeUtc();
     if (!states.isEmpty() && states.first().time >= time)
         time = states.first().time.toUTC().addMSecs(1);
-    QSaveFile copy(m_folder + HashOf(path) + QLatin1Char('-') + time.toString(TimeFormat) + Ending);
+    QSaveFile copy(m_folder + HashOf(path) + QLatin1Char('-') +
+                   QLocale::c().toString(time, TimeFormat) + Ending);
     const QFileDevice::Permissions ofOwner =
         QFileDevice::ReadOwner | QFileDevice::WriteOwner | QFileDevice::ExeOwner;
     const bool isKept =

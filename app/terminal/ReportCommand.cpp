@@ -12,6 +12,7 @@
 #include <QDateTime>
 #include <QDir>
 #include <QFileInfo>
+#include <QLocale>
 #include <QObject>
 
 namespace Velocor {
@@ -88,7 +89,7 @@ ReportCommand::ReportCommand(QStringList const& arguments)
         QStringList without = parser.value(QStringLiteral("without")).split(QLatin1Char(','));
         without.removeAll(QString());
         const QString time =
-            QDateTime::currentDateTime().toString(QStringLiteral("yyyyMMdd-hhmmss"));
+            QLocale::c().toString(QDateTime::currentDateTime(), QStringLiteral("yyyyMMdd-hhmmss"));
         const QString usual = QStringLiteral("velocor-report-%1.zip").arg(time);
         save(parser.positionalArguments().value(1, usual), without,
              parser.values(QStringLiteral("hide")));

@@ -83,7 +83,9 @@ QString TextFormats::Harmless(QString text)
 
 QString TextFormats::Time(qint64 time)
 {
-    return HistoryTime::DateTime(time).toString(QStringLiteral("yyyy-MM-ddThh:mm:ss.zzz"));
+    // Other programs read it, so the digits must not be those of the locale.
+    return HistoryTime::DateTime(time).isValid() ? QString::fromLatin1(HistoryTime::Text(time))
+                                                 : QString();
 }
 
 } // namespace Velocor

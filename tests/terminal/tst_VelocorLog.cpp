@@ -39,6 +39,8 @@ private slots:
     void lines();
     void formats_data();
     void formats();
+    void formatsInAnyLocale_data();
+    void formatsInAnyLocale();
     void runs();
     void tables();
     void problems_data();
@@ -186,6 +188,27 @@ void tst_VelocorLog::formats()
     const ProgramResult result = run(Words(arguments));
     QCOMPARE(result.output, output);
     QCOMPARE(result.exitCode, 0);
+}
+
+void tst_VelocorLog::formatsInAnyLocale_data()
+{
+    QTest::addColumn<QString>("locale");
+    for (char const* locale : {"fa_IR.UTF-8", "ar_EG.UTF-8", "de_DE.UTF-8"})
+        QTest::newRow(locale) << locale;
+}
+
+// Other programs read them, so the digits are always Western.
+void tst_VelocorLog::formatsInAnyLocale()
+{
+    QFETCH(QString, locale);
+    QProcessEnvironment environment = m_environment;
+    environment.insert("LC_ALL", locale);
+    for (char const* arguments :
+         {"mail notes --format csv", "mail notes --format json", "--runs", "notes --patterns"}) {
+        const QByteArray output = run(Words(arguments)).output;
+        QVERIFY(!output.isEmpty());
+        QCOMPARE(RunProgram(VELOCOR_LOG, Words(arguments), environment).output, output);
+    }
 }
 
 void tst_VelocorLog::runs()
