@@ -51,8 +51,8 @@ QStringList Marks(Installation const& installation)
     return marks;
 }
 
-// An entry at the start of a second may come from a log with stamps in seconds. Which of two runs in
-// that second it belongs to would be unknown.
+// An entry at the start of a second may come from a log with stamps in seconds. Which of two runs
+// in that second it belongs to would be unknown.
 void WaitForNextSecond()
 {
     const qint64 second = QDateTime::currentSecsSinceEpoch();
