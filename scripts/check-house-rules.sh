@@ -112,6 +112,11 @@ widgets_below_the_window() {
         sed '/^app\/settingsfile\/.*<Q\(Color\|Font\)>/d'
 }
 
+# The compiler sees only one of them at a time, and the linker takes either one's functions for both.
+types_of_one_name() {
+    tracked 'app/*.h' | search -hoP '^(class|struct) \K\w+(?=[^;]*$)' | sort | uniq -d
+}
+
 # Statements, also of several lines, that set a tool tip without calling PlainToolTip().
 bare_tool_tips() {
     local rest='((?!PlainToolTip\()[^;{}])*'
@@ -186,6 +191,7 @@ rule "an installed header that includes a private one" private_headers_in_public
 rule "British spelling" british_spelling
 rule "another word for Qt" other_words_for_qt
 rule "widgets used below the window" widgets_below_the_window
+rule "a name of two types" types_of_one_name
 rule "a tool tip that does not come from PlainToolTip()" bare_tool_tips
 rule "a widget that guesses its text format; see app/window/widgets/PlainText.h" guessing_widgets
 rule "an installed header with less than 60 % comment lines" undocumented_headers
