@@ -12,6 +12,10 @@ if(CMAKE_CXX_COMPILER_ID MATCHES "GNU|Clang")
         # Qt's test macros cause this warning when called with a single string.
         target_compile_options(velocor_build INTERFACE -Wno-gnu-zero-variadic-macro-arguments)
     endif()
+    if(CMAKE_UNITY_BUILD)
+        # A parameter may have the name of a constant in another source.
+        target_compile_options(velocor_build INTERFACE -Wno-shadow)
+    endif()
     if(VELOCOR_WERROR)
         target_compile_options(velocor_build INTERFACE -Werror)
     endif()
