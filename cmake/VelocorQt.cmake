@@ -37,3 +37,8 @@ else()
     message(FATAL_ERROR "VELOCOR_QT is \"${VELOCOR_QT}\", but only Qt 5 and Qt 6 are supported")
 endif()
 find_package(${VELOCOR_QT_PACKAGE} REQUIRED COMPONENTS ${VELOCOR_QT_COMPONENTS})
+
+# Catalogs of the program; another project builds none.
+if(VELOCOR_IS_TOP_LEVEL)
+    find_package(Qt${VELOCOR_QT}LinguistTools REQUIRED)
+endif()

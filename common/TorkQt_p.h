@@ -5,6 +5,7 @@
 
 #include <QDateTime>
 #include <QFont>
+#include <QLibraryInfo>
 #include <QLocale>
 #include <QString>
 #include <QStringList>
@@ -50,6 +51,16 @@ inline QString FontText(QFont const& font)
     if (!font.styleName().isEmpty())
         fields.append(font.styleName());
     return fields.join(QLatin1Char(','));
+#endif
+}
+
+/// Where Qt's own translations are installed.
+inline QString TranslationsFolder()
+{
+#if QT_VERSION < QT_VERSION_CHECK(6, 0, 0)
+    return QLibraryInfo::location(QLibraryInfo::TranslationsPath);
+#else
+    return QLibraryInfo::path(QLibraryInfo::TranslationsPath);
 #endif
 }
 

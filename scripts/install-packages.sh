@@ -29,8 +29,8 @@ packages_of() {
     Darwin/qt6) echo qt ;;
     Darwin/lint) echo clang-format@14 llvm@14 shellcheck ;;
     Darwin/test | Darwin/wayland | Darwin/package | Darwin/package-test | Darwin/consumers) ;;
-    */build) echo g++ cmake ninja-build qtbase5-dev librapidxml-dev ;;
-    */qt6) echo qt6-base-dev qt6-5compat-dev ;;
+    */build) echo g++ cmake ninja-build qtbase5-dev qttools5-dev librapidxml-dev ;;
+    */qt6) echo qt6-base-dev qt6-5compat-dev qt6-tools-dev qt6-l10n-tools ;;
     */wayland) echo qtwayland5 ;;
     */test)
         echo xvfb xauth shared-mime-info pkg-config valgrind doxygen locales-all dpkg-dev \

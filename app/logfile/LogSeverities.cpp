@@ -3,7 +3,7 @@
 
 #include "app/logfile/LogSeverities.h"
 
-#include <QObject>
+#include <QCoreApplication>
 
 #include <iterator>
 
@@ -11,11 +11,15 @@ namespace Velocor {
 
 namespace {
 
-// In the order of LogEntry::Severity. The context is the one that the log uses for translation.
+// In the order of LogEntry::Severity. Not in the context in which the log translates them: logs of
+// all languages read alike, and only what is shown is translated.
 constexpr char const* Names[] = {
-    QT_TRANSLATE_NOOP("QObject", "Trace"),   QT_TRANSLATE_NOOP("QObject", "Notification"),
-    QT_TRANSLATE_NOOP("QObject", "Warning"), QT_TRANSLATE_NOOP("QObject", "Error"),
-    QT_TRANSLATE_NOOP("QObject", "Fatal"),   "",
+    QT_TRANSLATE_NOOP("Velocor::LogSeverities", "Trace"),
+    QT_TRANSLATE_NOOP("Velocor::LogSeverities", "Notification"),
+    QT_TRANSLATE_NOOP("Velocor::LogSeverities", "Warning"),
+    QT_TRANSLATE_NOOP("Velocor::LogSeverities", "Error"),
+    QT_TRANSLATE_NOOP("Velocor::LogSeverities", "Fatal"),
+    "",
 };
 static_assert(std::size(Names) == LogEntry::None + 1, "a name for each severity");
 
@@ -28,7 +32,9 @@ char const* LogSeverities::LoggedName(LogEntry::Severity severity)
 
 QString LogSeverities::Name(LogEntry::Severity severity)
 {
-    return severity == LogEntry::None ? QString() : QObject::tr(LoggedName(severity));
+    return severity == LogEntry::None
+               ? QString()
+               : QCoreApplication::translate("Velocor::LogSeverities", LoggedName(severity));
 }
 
 } // namespace Velocor

@@ -84,11 +84,9 @@ void LineCommands::saveTo(QString const& path)
         if (!error.isEmpty())
             Q_EMIT problemReported(
                 tr("Could not save lines to %1: %2").arg(saver->target(), error));
-        else if (saver->count() == 1)
-            Q_EMIT messageReported(tr("1 line saved to %1").arg(saver->target()));
         else
             Q_EMIT messageReported(
-                tr("%L1 lines saved to %2").arg(saver->count()).arg(saver->target()));
+                tr("%Ln line(s) saved to %1", nullptr, saver->count()).arg(saver->target()));
     });
     saver->start();
 }

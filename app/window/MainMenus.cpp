@@ -3,6 +3,7 @@
 
 #include "app/window/MainMenus.h"
 
+#include "app/language/Language.h"
 #include "app/logfile/Milliseconds.h"
 #include "app/window/FileOpener.h"
 #include "app/window/FileTabs.h"
@@ -184,6 +185,7 @@ void MainMenus::fillViewMenu(QMenu* menu)
     fillEncodingMenu(menu->addMenu(tr("En&coding")));
     fillTextMenu(menu->addMenu(tr("Te&xt")));
     fillAnalyzeMenu(menu->addMenu(tr("Anal&yze")));
+    fillLanguageMenu(menu->addMenu(tr("Lan&guage")));
     add(menu, tr("&Highlight Rules..."), QKeySequence(tr("Ctrl+Shift+H")),
         tr("Give lines with certain texts a color"),
         [this] { m_targets.tabs->EditHighlightRules(); });
@@ -314,6 +316,25 @@ void MainMenus::fillGapMenu(QMenu* menu)
     addSpan(tr("1 &Minute"), Milliseconds::Minute);
     addSpan(tr("10 M&inutes"), 10 * Milliseconds::Minute);
     addSpan(tr("1 &Hour"), Milliseconds::Hour);
+}
+
+// A new language takes effect at the next start: by then the window has built many of its texts
+// from others, which it does not keep.
+void MainMenus::fillLanguageMenu(QMenu* menu)
+{
+    m_actions.languages = new QActionGroup(menu);
+    const auto addLanguage = [&](QString const& text, QString const& statusTip,
+                                 QString const& code) {
+        QAction* action = addSwitch(menu, text, QKeySequence(), statusTip, [](bool) {});
+        action->setData(code);
+        m_actions.languages->addAction(action);
+    };
+    addLanguage(tr("&System Language"), tr("Use the language of the system from the next start on"),
+                QString());
+    const QList<Language> languages = Language::All();
+    for (Language const& language : languages)
+        addLanguage(language.name, tr("Use %1 from the next start on").arg(language.name),
+                    language.code);
 }
 
 void MainMenus::fillHelpMenu(QMenu* menu)

@@ -54,8 +54,9 @@ struct MenuActions
     QActionGroup* gaps = nullptr; ///< their data is the least gap shown, in milliseconds
     QAction* reopen = nullptr;
     QActionGroup* encodings = nullptr;
-    QList<QAction*> ofSettings; ///< those that need a settings file that can be edited
-    QList<QAction*> ofLogs;     ///< those that need a log in the current tab
+    QActionGroup* languages = nullptr; ///< the data is the code, empty for that of the system
+    QList<QAction*> ofSettings;        ///< those that need a settings file that can be edited
+    QList<QAction*> ofLogs;            ///< those that need a log in the current tab
 };
 
 /// Fills the menus, and does what their items say.
@@ -100,6 +101,7 @@ private:
     void fillTextMenu(QMenu* menu);
     void fillAnalyzeMenu(QMenu* menu);
     void fillGapMenu(QMenu* menu);
+    void fillLanguageMenu(QMenu* menu);
     void fillHelpMenu(QMenu* menu);
 
     QAction* add(QMenu* menu, QString const& text, QKeySequence const& shortcut,

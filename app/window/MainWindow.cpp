@@ -6,6 +6,7 @@
 #include "app/ScreenlessPlatform_p.h"
 #include "app/UserMessages.h"
 #include "app/history/HistoryTime.h"
+#include "app/language/Language.h"
 #include "app/runninglog/LogHealth.h"
 #include "app/runninglog/LogPreferences.h"
 #include "app/runninglog/RunMark.h"
@@ -75,8 +76,19 @@ MainWindow::MainWindow(QWidget* parent)
     // support them.
     if (IsScreenlessPlatform())
         layout()->setSizeConstraint(QLayout::SetNoConstraint);
+    readSettings();
     makeFirstContent();
     restoreFirstState();
+}
+
+// What is wrong with the settings is said in the system's language.
+void MainWindow::readSettings()
+{
+    Language::Use(QString());
+    m_startupMessage = m_settings.Load();
+    const QString language = m_settings.Text(QStringLiteral("language"));
+    if (!language.isEmpty())
+        Language::Use(language);
 }
 
 // Deleting an open window hides it, which ends cell editing and makes the tabs send signals. Qt
@@ -197,6 +209,8 @@ void MainWindow::makeMenus()
         if (!m_menus->actions().since->isChecked())
             m_menus->actions().since->trigger();
     });
+    connect(actions.languages, &QActionGroup::triggered, this,
+            [this] { showMessage(tr("The language changes when the program starts again.")); });
     m_currentTab = std::make_unique<CurrentTab>(m_tabs, actions, m_summary, this);
 }
 
@@ -253,7 +267,6 @@ void MainWindow::restoreFirstState()
     if (QScreen const* screen = QGuiApplication::primaryScreen())
         resize(QSize(1080, 680).boundedTo(screen->availableSize() * 9 / 10));
 
-    m_startupMessage = m_settings.Load();
     m_settings.RestoreGeometry(this);
 }
 
@@ -285,6 +298,9 @@ void MainWindow::restoreState()
     actions.showToolBar->setChecked(toolBarShown);
     m_toolBar->setVisible(toolBarShown);
     actions.reopen->setChecked(m_settings.Flag(QStringLiteral("reopenFiles"), true));
+    const QString language = m_settings.Text(QStringLiteral("language"));
+    for (QAction* action : actions.languages->actions())
+        action->setChecked(action->data() == language);
 }
 
 // One of those in the menu; none if it is another one.
@@ -321,6 +337,8 @@ void MainWindow::saveState()
     m_settings.SetNumbers(QStringLiteral("linePane"), m_tabs->ownLog()->paneSizes());
     m_settings.SetText(QStringLiteral("filters"), m_tabs->filterHistory().join(QLatin1Char('\n')));
     m_settings.SetFlag(QStringLiteral("reopenFiles"), actions.reopen->isChecked());
+    m_settings.SetText(QStringLiteral("language"),
+                       actions.languages->checkedAction()->data().toString());
     m_files->Save(m_settings);
 
     // No message box: the window may be closing because of a system shutdown.

@@ -67,6 +67,7 @@ protected:
     void dropEvent(QDropEvent* event) override;
 
 private:
+    void readSettings();
     void makeFirstContent();
     void complete();
     void makeTabs();

@@ -87,8 +87,7 @@ QString LogState()
         return QObject::tr("none");
     QString text = log->enabled() ? QObject::tr("on") : QObject::tr("off");
     text += QObject::tr(", limit %1 per file, ").arg(FileSizeText(log->maxLogFileSize()));
-    text += log->maxLogFiles() == 1 ? QObject::tr("1 older file")
-                                    : QObject::tr("%1 older files").arg(log->maxLogFiles());
+    text += QObject::tr("%Ln older file(s)", nullptr, static_cast<int>(log->maxLogFiles()));
     if (!log->errorString().isEmpty())
         text += QObject::tr(", last error: %1").arg(log->errorString());
     return text;
@@ -100,8 +99,7 @@ QString LogFiles()
     const QStringList files = LogFileList::FilesOf(RunningLog::FileName());
     for (QString const& file : files)
         size += QFileInfo(file).size();
-    const QString count =
-        files.size() == 1 ? QObject::tr("1 file") : QObject::tr("%1 files").arg(files.size());
+    const QString count = QObject::tr("%Ln file(s)", nullptr, files.size());
     return QObject::tr("%1, %2 in total").arg(count, FileSizeText(size));
 }
 

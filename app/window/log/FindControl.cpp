@@ -92,7 +92,7 @@ QString FindControl::countText() const
         return m_search->isComplete() ? tr("Not found") : QString();
     if (number > 0)
         return tr("%L1 of %L2").arg(number).arg(count);
-    return count == 1 ? tr("1 line") : tr("%L1 lines").arg(count);
+    return tr("%Ln line(s)", nullptr, count);
 }
 
 } // namespace Velocor

@@ -49,8 +49,7 @@ void GoToDialog::check()
 {
     m_place = LogPlace::Parse(m_text->text());
     if (m_place.kind == LogPlace::Line && m_place.value > m_lines)
-        m_place.error = m_lines == 1 ? tr("The file has only one line.")
-                                     : tr("The file has only %L1 lines.").arg(m_lines);
+        m_place.error = tr("The file has only %Ln line(s).", nullptr, static_cast<int>(m_lines));
     else if (m_place.kind == LogPlace::Interval && !m_hasCurrent)
         m_place.error = tr("Select an entry first, from which to count.");
     m_error->setText(m_place.error);

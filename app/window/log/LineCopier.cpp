@@ -53,8 +53,7 @@ void LineCopier::take(int count, QString const& text)
     else if (count >= LogView::MaximumCopiedLines)
         Q_EMIT messageReported(tr("Copied only the first %L1 selected lines").arg(count));
     else
-        Q_EMIT messageReported(count == 1 ? tr("1 line copied")
-                                          : tr("%L1 lines copied").arg(count));
+        Q_EMIT messageReported(tr("%Ln line(s) copied", nullptr, count));
 }
 
 } // namespace Velocor

@@ -30,8 +30,7 @@ QString LinesShown(LogModel const& model)
 {
     const QLocale locale;
     const qulonglong lines = model.state().lines;
-    const QString all = lines == 1 ? StateText::tr("1 line")
-                                   : StateText::tr("%1 lines").arg(locale.toString(lines));
+    const QString all = StateText::tr("%Ln line(s)", nullptr, static_cast<int>(lines));
     const qulonglong shown = ShownLines(model);
     return shown < lines ? StateText::tr("%1 of %2").arg(locale.toString(shown), all) : all;
 }
@@ -58,9 +57,7 @@ QString LogStateText::Summary(LogModel const& model, int percent, int row, qulon
     const QLocale locale;
     QString text = current > 0 ? LineOf(model, row, current) : LinesShown(model);
     const auto problems = static_cast<qlonglong>(state.rows->problems());
-    text +=
-        separator + (problems == 1 ? StateText::tr("1 problem")
-                                   : StateText::tr("%1 problems").arg(locale.toString(problems)));
+    text += separator + StateText::tr("%Ln problem(s)", nullptr, static_cast<int>(problems));
     if (current > 0 && ShownLines(model) < state.lines)
         text += separator + StateText::tr("%1 shown").arg(locale.toString(ShownLines(model)));
     if (isReading)

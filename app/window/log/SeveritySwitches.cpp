@@ -150,8 +150,7 @@ void SeveritySwitches::showCount(int severity)
             ? tr("lines without a severity")
             : tr("%1 entries").arg(LogSeverities::Name(static_cast<LogEntry::Severity>(severity)));
     const QString number =
-        count == 1 ? tr("1 in this file")
-                   : tr("%1 in this file").arg(QLocale().toString(static_cast<qulonglong>(count)));
+        tr("%1 in this file").arg(QLocale().toString(static_cast<qulonglong>(count)));
     QToolButton* button = m_buttons.at(severity);
     SetText(button, ShortCount(count));
     button->setAccessibleDescription(number);

@@ -128,7 +128,7 @@ void DifferenceDialog::SetSides(Side const& left, Side const& right,
     m_tree->SetTitles(left.title, right.title);
     m_tree->SetDifference(SettingsDifference::Between(left.document, right.document), losses);
     const int count = m_tree->difference().count();
-    QString summary = count == 1 ? tr("1 difference") : tr("%1 differences").arg(count);
+    QString summary = tr("%Ln difference(s)", nullptr, count);
     if (m_tree->difference().isEmpty())
         summary = tr("No differences");
     if (!losses.isEmpty())

@@ -253,10 +253,11 @@ QString SettingsCommands::removalText(Edits const& removals) const
         names.append(tr("and %1 more").arg(keys - MaximumNamedKeys));
     const QString list = names.join(QLatin1String(", "));
     if (sectionNames.isEmpty())
-        return tr("Removed %1 keys: ").arg(keys) + list;
-    const QString of = sectionNames.size() == 1 ? tr("section ") + sectionNames.first()
-                                                : tr("%1 sections").arg(sectionNames.size());
-    return tr("Removed ") + of + tr(", with %1 keys: ").arg(keys) + list;
+        return tr("Removed %Ln key(s): ", nullptr, keys) + list;
+    const QString of = sectionNames.size() == 1
+                           ? tr("section ") + sectionNames.first()
+                           : tr("%Ln section(s)", nullptr, sectionNames.size());
+    return tr("Removed ") + of + tr(", with %Ln key(s): ", nullptr, keys) + list;
 }
 
 void SettingsCommands::backToDefault(QVector<Place> const& items)

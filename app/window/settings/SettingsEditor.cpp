@@ -269,9 +269,7 @@ void SettingsEditor::showTree(SettingsDocument const& document)
     showPage(TreePage);
     if (document.lossCount > 0)
         m_notice->ShowMessage(
-            document.lossCount == 1
-                ? tr("Saving would lose 1 item in this file.")
-                : tr("Saving would lose %1 items in this file.").arg(document.lossCount));
+            tr("Saving would lose %Ln item(s) in this file.", nullptr, document.lossCount));
 }
 
 void SettingsEditor::showMalformed(SettingsDocument const& document)

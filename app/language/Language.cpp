@@ -1,0 +1,76 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#include "app/language/Language.h"
+
+#include "common/TorkQt_p.h"
+
+#include <QCoreApplication>
+#include <QDir>
+#include <QLocale>
+#include <QTranslator>
+
+#include <algorithm>
+#include <memory>
+
+// Resources of a static library must be initialized explicitly, outside any namespace.
+static void InitializeCatalogs()
+{
+    Q_INIT_RESOURCE(catalogs);
+}
+
+namespace Velocor {
+
+namespace {
+
+// Tells the translators of this file from those of others.
+QString ObjectName()
+{
+    return QStringLiteral("VelocorCatalog");
+}
+
+QString Catalogs()
+{
+    return QStringLiteral(":/catalogs");
+}
+
+void Install(QLocale const& locale, QString const& prefix, QString const& folder)
+{
+    auto translator = std::make_unique<QTranslator>(QCoreApplication::instance());
+    translator->setObjectName(ObjectName());
+    if (translator->load(locale, prefix, QStringLiteral("_"), folder))
+        QCoreApplication::installTranslator(translator.release());
+}
+
+} // namespace
+
+QList<Language> Language::All()
+{
+    InitializeCatalogs();
+    QList<Language> languages;
+    const QStringList files = QDir(Catalogs()).entryList(QDir::Files, QDir::Name);
+    for (QString const& file : files) {
+        const QString code = file.section(QLatin1Char('_'), 1).section(QLatin1Char('.'), 0, 0);
+        QString name = QLocale(code).nativeLanguageName();
+        name[0] = name.at(0).toUpper();
+        languages.append({code, name});
+    }
+    return languages;
+}
+
+void Language::Use(QString const& code)
+{
+    const QList<Language> all = All();
+    const bool isKnown =
+        std::any_of(all.begin(), all.end(), [&](Language const& one) { return one.code == code; });
+    const QLocale locale = isKnown ? QLocale(code) : QLocale::system();
+
+    qDeleteAll(QCoreApplication::instance()->findChildren<QTranslator*>(ObjectName()));
+    // The last one installed is asked first. English has the plural forms of what the others lack.
+    Install(QLocale(QStringLiteral("en")), QStringLiteral("velocor"), Catalogs());
+    Install(locale, QStringLiteral("qtbase"), TorkQt::TranslationsFolder());
+    if (locale.language() != QLocale::English)
+        Install(locale, QStringLiteral("velocor"), Catalogs());
+}
+
+} // namespace Velocor
