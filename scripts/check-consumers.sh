@@ -17,9 +17,12 @@ work=$(mktemp -d)
 trap 'rm -rf "$work"' EXIT
 export QT_QPA_PLATFORM=offscreen HOME=$work XDG_DATA_HOME=$work/data
 
-qt=$(PKG_CONFIG_PATH=$static/lib/pkgconfig pkg-config --print-requires tork |
-    sed -n 's/^Qt\([56]\)Widgets.*/\1/p')
-[ -n "$qt" ]
+qt=5
+suffix=
+if [ -e "$static/lib/pkgconfig/tork-qt6.pc" ]; then
+    qt=6
+    suffix=-qt6
+fi
 
 passed=0
 failed=0
@@ -36,7 +39,7 @@ verdict() {
 
 # consumer PREFIX PACKAGE SOURCE COMPILER FLAG...
 consumer() {
-    local prefix=$1 package=$2 source=$3 compiler=$4 flags=()
+    local prefix=$1 package=$2$suffix source=$3 compiler=$4 flags=()
     shift 4
     read -r -a flags < <(PKG_CONFIG_PATH=$prefix/lib/pkgconfig pkg-config --cflags --libs "$package")
     local status=0
@@ -101,7 +104,7 @@ find_package(Tork 0.1 REQUIRED COMPONENTS Common)
 find_package(Tork 0.1 REQUIRED COMPONENTS Common Frame)
 END
     cp -R "$static" "$work/framework"
-    rm -f "$work"/framework/lib/cmake/Tork/VelocorTargets*
+    rm -f "$work"/framework/lib/cmake/Tork*/VelocorTargets*
     local status=1
     if ! answer=$(cmake -S "$work/components" -B "$work/components/build" \
         -DCMAKE_PREFIX_PATH="$work/framework" 2>&1) &&
