@@ -67,7 +67,7 @@ if(strays)
 endif()
 
 set(shared "${PREFIX}/lib/libtork${SUFFIX}.so")
-if(NOT EXISTS "${shared}")
+if(EXISTS "${PREFIX}/lib/libtork${SUFFIX}.a")
     return()
 endif()
 
