@@ -7,6 +7,8 @@
 #                       installed
 #   VELOCOR_QT_PACKAGE  with its version, for find_package()
 #   VELOCOR_QT_XML      the libraries with Qt's XML classes, which Qt 6 has moved
+#   VELOCOR_QT_SUFFIX   of the names of the installed libraries: those for Qt 5 and for Qt 6 fit into
+#                       one prefix
 
 if(NOT VELOCOR_QT)
     if(QT_VERSION_MAJOR AND NOT VELOCOR_IS_TOP_LEVEL)
@@ -29,10 +31,12 @@ if(VELOCOR_QT EQUAL 5)
     set(VELOCOR_QT_PACKAGE Qt5 5.9)
     set(VELOCOR_QT_XML Qt5::Xml)
     set(VELOCOR_QT_COMPONENTS Core Gui Widgets Xml)
+    set(VELOCOR_QT_SUFFIX "")
 elseif(VELOCOR_QT EQUAL 6)
     set(VELOCOR_QT_PACKAGE Qt6 6.4)
     set(VELOCOR_QT_XML Qt6::Xml Qt6::Core5Compat)
     set(VELOCOR_QT_COMPONENTS Core Gui Widgets Xml Core5Compat)
+    set(VELOCOR_QT_SUFFIX -qt6)
 else()
     message(FATAL_ERROR "VELOCOR_QT is \"${VELOCOR_QT}\", but only Qt 5 and Qt 6 are supported")
 endif()

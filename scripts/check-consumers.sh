@@ -17,9 +17,12 @@ work=$(mktemp -d)
 trap 'rm -rf "$work"' EXIT
 export QT_QPA_PLATFORM=offscreen HOME=$work XDG_DATA_HOME=$work/data
 
-qt=$(PKG_CONFIG_PATH=$static/lib/pkgconfig pkg-config --print-requires tork |
-    sed -n 's/^Qt\([56]\)Widgets.*/\1/p')
-[ -n "$qt" ]
+qt=5
+suffix=
+if [ -e "$static/lib/pkgconfig/tork-qt6.pc" ]; then
+    qt=6
+    suffix=-qt6
+fi
 
 passed=0
 failed=0
@@ -36,7 +39,7 @@ verdict() {
 
 # consumer PREFIX PACKAGE SOURCE COMPILER FLAG...
 consumer() {
-    local prefix=$1 package=$2 source=$3 compiler=$4 flags=()
+    local prefix=$1 package=$2$suffix source=$3 compiler=$4 flags=()
     shift 4
     read -r -a flags < <(PKG_CONFIG_PATH=$prefix/lib/pkgconfig pkg-config --cflags --libs "$package")
     local status=0
@@ -90,27 +93,38 @@ other_qt() {
     verdict $status "a project with Qt $((11 - qt))"
 }
 
-# Only the framework is installed: the project learns what is missing.
-components() {
-    local answer
-    mkdir "$work/components"
-    cat >"$work/components/CMakeLists.txt" <<'END'
+# refused WHAT PREFIX LINES ANSWER: a project does not get the package, and learns why.
+refused() {
+    local what=$1 prefix=$2 lines=$3 expected=$4 answer status=1 folder=$work/refused
+    rm -rf "$folder"
+    mkdir "$folder"
+    cat >"$folder/CMakeLists.txt" <<END
 cmake_minimum_required(VERSION 3.16)
-project(Components LANGUAGES CXX)
-find_package(Tork 0.1 REQUIRED COMPONENTS Common)
-find_package(Tork 0.1 REQUIRED COMPONENTS Common Frame)
+project(Refused LANGUAGES CXX)
+$lines
 END
-    cp -R "$static" "$work/framework"
-    rm -f "$work"/framework/lib/cmake/Tork/VelocorTargets*
-    local status=1
-    if ! answer=$(cmake -S "$work/components" -B "$work/components/build" \
-        -DCMAKE_PREFIX_PATH="$work/framework" 2>&1) &&
-        [[ $answer == *"Velocor::Frame is not installed"* ]]; then
+    # CMake breaks lines where it likes.
+    if ! answer=$(cmake -G Ninja -S "$folder" -B "$folder/build" -DCMAKE_PREFIX_PATH="$prefix" 2>&1) &&
+        [[ $(tr -s '\n ' ' ' <<<"$answer") == *"$expected"* ]]; then
         status=0
     else
         echo "$answer"
     fi
-    verdict $status "find_package() without the frame"
+    verdict $status "find_package() $what"
+}
+
+refusals() {
+    refused "of a later version" "$static" "find_package(Tork 0.2 REQUIRED)" \
+        'compatible with requested version "0.2". The following configuration files were considered'
+    refused "of an unknown component" "$static" "find_package(Tork 0.1 REQUIRED COMPONENTS Common Paint)" \
+        "There is no component Paint: the components of Tork are Common and Frame."
+    refused "without Qt" "$static" "set(CMAKE_FIND_USE_CMAKE_SYSTEM_PATH OFF)
+        set(CMAKE_FIND_USE_SYSTEM_ENVIRONMENT_PATH OFF)
+        find_package(Tork 0.1 REQUIRED)" "provided by \"Qt$qt\""
+    cp -R "$static" "$work/framework"
+    rm -f "$work"/framework/lib/cmake/Tork*/VelocorTargets*
+    refused "without the frame" "$work/framework" "find_package(Tork 0.1 REQUIRED COMPONENTS Frame)" \
+        "Velocor::Frame is not installed in $work/framework"
 }
 
 for compiler in g++-12 clang++-14 clang++-16 clang++-19; do
@@ -135,7 +149,7 @@ done
 exported "$static"
 exported "$shared"
 other_qt
-components
+refusals
 
 echo "consumers: $passed work with Qt $qt, $failed do not"
 [ "$failed" -eq 0 ]

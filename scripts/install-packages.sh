@@ -46,7 +46,7 @@ packages_of() {
     */package-test) echo debootstrap piuparts autopkgtest ;;
     */reproducible) echo reprotest faketime disorderfs dpkg-dev ;;
     */consumers) echo g++-12 clang-14 clang-16 clang-19 pkg-config ;;
-    */abi) echo abigail-tools binutils ;;
+    */abi) echo abigail-tools binutils qt6-base-dev qt6-5compat-dev ;;
     */check) echo clazy cppcheck gcovr valgrind python3 python3-clang-14 ;;
     */lint) echo git clang-format-14 clang-tidy-14 reuse shellcheck ;;
     *)

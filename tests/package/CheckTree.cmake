@@ -3,17 +3,18 @@
 
 # Compares the names in PREFIX with those an application developer is promised: no file missing,
 # and no additional header or folder. Names that differ between systems and builds are ignored.
+# SUFFIX tells the libraries for Qt 6 from those for Qt 5.
 # SOURCE is the source tree, whose headers are for applications unless their names end in _p.h.
 
 set(expected
     appdata.cfg
-    lib/cmake/Tork/TorkConfig.cmake
-    lib/cmake/Tork/TorkConfigVersion.cmake
-    lib/cmake/Tork/TorkLaunchData.cmake
-    lib/cmake/Tork/TorkTargets.cmake
-    lib/cmake/Tork/VelocorTargets.cmake
-    lib/pkgconfig/tork.pc
-    lib/pkgconfig/velocor-frame.pc)
+    lib/cmake/Tork${SUFFIX}/TorkConfig.cmake
+    lib/cmake/Tork${SUFFIX}/TorkConfigVersion.cmake
+    lib/cmake/Tork${SUFFIX}/TorkLaunchData.cmake
+    lib/cmake/Tork${SUFFIX}/TorkTargets.cmake
+    lib/cmake/Tork${SUFFIX}/VelocorTargets.cmake
+    lib/pkgconfig/tork${SUFFIX}.pc
+    lib/pkgconfig/velocor-frame${SUFFIX}.pc)
 if(NOT EXISTS "${PREFIX}/Velocor.app")
     list(APPEND expected share/Tork/Velocor/velocor.defaults.cfg)
 endif()
@@ -25,8 +26,8 @@ list(APPEND expected ${headers})
 
 file(GLOB_RECURSE found RELATIVE "${PREFIX}" "${PREFIX}/*")
 list(FILTER found EXCLUDE REGEX "^(bin|Velocor\\.app)/")
-list(FILTER found EXCLUDE REGEX "^lib/lib")
-list(FILTER found EXCLUDE REGEX "^lib/cmake/Tork/[A-Za-z]+Targets-[a-z]+\\.cmake$")
+list(FILTER found EXCLUDE REGEX "^lib/lib(tork|velocor_frame)${SUFFIX}\\.")
+list(FILTER found EXCLUDE REGEX "^lib/cmake/Tork${SUFFIX}/[A-Za-z]+Targets-[a-z]+\\.cmake$")
 
 list(SORT expected)
 list(SORT found)

@@ -49,7 +49,7 @@ NumberedText::NumberedText(QWidget* parent) : QPlainTextEdit(parent), m_margin(n
 
 int NumberedText::marginWidth() const
 {
-    const int digits = std::max(MinimumDigits, QString::number(blockCount()).size());
+    const int digits = std::max(MinimumDigits, int(QString::number(blockCount()).size()));
     return 2 * MarginPadding +
            fontMetrics().boundingRect(QString(digits, QLatin1Char('8'))).width();
 }
