@@ -499,7 +499,9 @@ Qt::ItemFlags SettingsModel::flags(QModelIndex const& index) const
     if (!index.isValid())
         return Qt::NoItemFlags;
     const Qt::ItemFlags usual = Qt::ItemIsEnabled | Qt::ItemIsSelectable;
-    return IsSection(index) && index.column() == ValueColumn ? usual : usual | Qt::ItemIsEditable;
+    if (!IsSection(index)) // which spares the tree a persistent index for each item
+        return usual | Qt::ItemIsEditable | Qt::ItemNeverHasChildren;
+    return index.column() == ValueColumn ? usual : usual | Qt::ItemIsEditable;
 }
 
 } // namespace Velocor
