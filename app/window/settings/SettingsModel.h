@@ -141,7 +141,7 @@ private:
     /// so they hold while other sections come, go and move.
     struct SectionRows
     {
-        int section;
+        int section = 0;
         SettingsRows items;
     };
 
