@@ -3,7 +3,7 @@
 
 #include "app/settingsfile/SettingsFilter.h"
 
-#include <QStringMatcher>
+#include "app/settingsfile/CaselessText.h"
 
 namespace Velocor {
 
@@ -11,10 +11,7 @@ SettingsFilter::Shown SettingsFilter::Of(SettingsDocument const& document,
                                          SettingsValues const& saved,
                                          SettingsValues const& defaults) const
 {
-    const QStringMatcher matcher(text, Qt::CaseInsensitive);
-    const auto matches = [&](QString const& candidate) {
-        return matcher.indexIn(candidate) >= 0;
-    };
+    const CaselessText wanted(text);
     const auto isWanted = [&](QString const& section, SettingsDocument::Item const& item) {
         if (onlyChanged) {
             const auto inFile = saved.constFind({section, item.key});
@@ -30,11 +27,11 @@ SettingsFilter::Shown SettingsFilter::Of(SettingsDocument const& document,
     Shown shown;
     int number = 0;
     for (SettingsDocument::Section const& section : document.sections) {
-        const bool isNamed = matches(section.name);
+        const bool isNamed = wanted.IsIn(section.name);
         std::vector<int> items;
         for (int i = 0; i < section.items.size(); ++i) {
             SettingsDocument::Item const& item = section.items.at(i);
-            if ((isNamed || matches(item.key) || matches(item.value)) &&
+            if ((isNamed || wanted.IsIn(item.key) || wanted.IsIn(item.value)) &&
                 isWanted(section.name, item))
                 items.push_back(i);
         }

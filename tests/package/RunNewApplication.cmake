@@ -29,6 +29,7 @@ set(expected
     bin/cellar
     lib/cellar/appdata.cfg
     lib/cellar/bin/cellar
+    share/Tork/Cellar/cellar.defaults.cfg
     share/applications/cellar.desktop
     share/doc/cellar/copyright
     share/icons/hicolor/scalable/apps/cellar.svg)
@@ -51,6 +52,13 @@ run(sh -c [[
 if(NOT EXISTS "${prefix}.home/Tork/Cellar/cellar.cfg")
     message(FATAL_ERROR "the installed program saved no settings")
 endif()
+file(STRINGS "${prefix}/share/Tork/Cellar/cellar.defaults.cfg" defaults REGEX "</[a-z]+>$")
+file(STRINGS "${prefix}.home/Tork/Cellar/cellar.cfg" saved)
+foreach(value IN LISTS defaults)
+    if(NOT value IN_LIST saved)
+        message(FATAL_ERROR "the first start does not save the default ${value}: ${saved}")
+    endif()
+endforeach()
 
 find_program(DESKTOP_FILE_VALIDATE NAMES desktop-file-validate)
 if(DESKTOP_FILE_VALIDATE)

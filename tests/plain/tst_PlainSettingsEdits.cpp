@@ -5,6 +5,7 @@
 // each of them; redone, the same as the first time. The tree's model is checked along the way, with
 // filters that come and go.
 
+#include "app/settingsfile/CaselessText.h"
 #include "app/settingsfile/SettingsFileWriter.h"
 #include "app/window/settings/SettingsCommands.h"
 #include "plain/Rounds.h"
@@ -177,6 +178,7 @@ class tst_PlainSettingsEdits : public QObject
 private slots:
     void modelIsConsistent();
     void filterHidesTheOthers();
+    void textInAnyCase();
     void undoneAndRedone();
 };
 
@@ -220,6 +222,41 @@ void tst_PlainSettingsEdits::filterHidesTheOthers()
     QVERIFY(hidden > count / 30);
     std::printf("plain settings filter: %d filters compared, %d of which hid keys\n", count / 3,
                 hidden);
+    std::fflush(stdout);
+}
+
+// Every code unit as a text of one letter, and random texts of few letters.
+void tst_PlainSettingsEdits::textInAnyCase()
+{
+    std::mt19937 random(Rounds::seed() + 3);
+    const QString few =
+        QString::fromUtf8("aAsS\u017fkK\u212a\u00df\u1e9e\u0130i\u0131I \u03c3\u03c2\u03a3");
+    const int count = Rounds::count(2000, 0x10000 * 2);
+    int found = 0;
+    for (int i = 0; i < count; ++i) {
+        const bool isLetter = i % 2 == 0;
+        const int code = Rounds::isFull() ? i / 2 : static_cast<int>(random() % 0x600);
+        QString text(QChar(static_cast<ushort>(code)));
+        for (int more = isLetter ? 0 : static_cast<int>(random() % 3); more > 0; --more)
+            text.append(few.at(static_cast<int>(random() % unsigned(few.size()))));
+        const CaselessText wanted(text);
+        QStringList others{QString(), text, text.toUpper(), text.toLower(), text.toCaseFolded()};
+        for (int j = 0; j < 20; ++j) {
+            QString other;
+            for (int length = static_cast<int>(random() % 6); length > 0; --length)
+                other.append(random() % 3 == 0
+                                 ? text.at(0).toUpper()
+                                 : few.at(static_cast<int>(random() % unsigned(few.size()))));
+            others.append(other);
+        }
+        for (QString const& other : qAsConst(others)) {
+            const bool isIn = other.contains(text, Qt::CaseInsensitive);
+            QVERIFY2(wanted.IsIn(other) == isIn, qPrintable(text + " in " + other));
+            found += isIn ? 1 : 0;
+        }
+    }
+    QVERIFY(found > count);
+    std::printf("plain text in any case: %d texts, found %d times\n", count, found);
     std::fflush(stdout);
 }
 

@@ -281,7 +281,10 @@ void TakeEditing(MainWindow& window, Camera const& camera)
     editor->Undo();
     QTest::keyClick(tree, Qt::Key_F, Qt::ControlModifier);
     QTest::keyClicks(ByName<QLineEdit>(editor, "Find in names and values"), "255");
+    auto* onlyMatches = ByName<QAbstractButton>(editor, "Only Matches");
+    onlyMatches->click();
     camera.take(window, "settings-find");
+    onlyMatches->click();
     QTest::keyClick(ByName<QLineEdit>(editor, "Find in names and values"), Qt::Key_Escape);
 }
 

@@ -8,6 +8,7 @@
 #include "WindowTestCase.h"
 
 #include "app/settingsfile/SettingsFileReader.h"
+#include "common/config/TorkConfigText.h"
 
 #include <QMenu>
 #include <QTreeView>
@@ -27,6 +28,8 @@ private slots:
     void whatHasNoDefaultStays();
     void undoneInOneStep();
     void windowsOwnDefaults();
+    void defaultsOfTheExamples_data();
+    void defaultsOfTheExamples();
 };
 
 namespace {
@@ -163,6 +166,37 @@ void tst_DefaultsInWindow::windowsOwnDefaults()
             QCOMPARE(item.key + '=' + saved.Value(section.name, item.key, "(none)"),
                      item.key + '=' + item.value);
     }
+}
+
+void tst_DefaultsInWindow::defaultsOfTheExamples_data()
+{
+    QTest::addColumn<QString>("place");
+    QTest::addColumn<QString>("section");
+    QTest::newRow("notes") << "notes/notes"
+                           << "Notes";
+    QTest::newRow("starter") << "starter/starter"
+                             << "Files";
+}
+
+// At the place where they are installed.
+void tst_DefaultsInWindow::defaultsOfTheExamples()
+{
+    QFETCH(QString, place);
+    QFETCH(QString, section);
+    const QByteArray defaults =
+        TestFiles::read(PROJECT_FOLDER "/examples/" + place + ".defaults.cfg");
+    const QByteArray name = section.toLatin1();
+    const ShownSettings shown("<VelocorSettings>\n<" + name + ">\n<recent>one|two</recent>\n</" +
+                              name + ">\n</VelocorSettings>\n");
+    QVERIFY(TestFiles::write(shown.folder() + "some.defaults.cfg", defaults));
+    shown.editor->Open(shown.file);
+    QVERIFY(shown.editor->ShowsTree());
+    shown.tree->setFocus();
+    QVERIFY(ItemCell(shown.tree, 0, 0, 1).data(Qt::FontRole).value<QFont>().bold());
+    QTest::keyClick(shown.tree, Qt::Key_Backspace, Qt::ControlModifier | Qt::ShiftModifier);
+    QCOMPARE(CellText(shown.tree, 0, 0, 1), TorkConfigText::EncodeValue(QString()));
+    QVERIFY(shown.editor->Save());
+    QCOMPARE(TestFiles::read(shown.file), defaults);
 }
 
 QTEST_MAIN(tst_DefaultsInWindow)

@@ -14,10 +14,13 @@
 
 #include <QClipboard>
 #include <QLabel>
+#include <QLineEdit>
 #include <QMenu>
 #include <QMessageBox>
 #include <QPushButton>
+#include <QSpinBox>
 #include <QTextBlock>
+#include <QTimer>
 #include <QTreeView>
 
 using namespace Velocor;
@@ -44,6 +47,11 @@ private slots:
     void lostCommentIsAChange();
     void reloadCanBeUndone();
     void closingAsks();
+    void findsInTheText_data();
+    void findsInTheText();
+    void findBarOfTheText();
+    void goesToALine_data();
+    void goesToALine();
     void keysAreInTheMenu();
     void numbersAndErrorAreDrawn();
 };
@@ -356,6 +364,105 @@ void tst_SettingsAsText::closingAsks()
     QCOMPARE(shown.saved(), Settings);
 }
 
+void tst_SettingsAsText::findsInTheText_data()
+{
+    QTest::addColumn<QString>("wanted");
+    QTest::addColumn<QString>("keys"); // n: next, p: previous
+    QTest::addColumn<QString>("found");
+    QTest::addColumn<QString>("result");
+
+    const auto row = [](char const* name, char const* wanted, char const* keys, char const* found,
+                        char const* result) {
+        QTest::newRow(name) << wanted << keys << found << result;
+    };
+    // <R> / <A>font</A> / <B>Font font</B> / </R>
+    row("the first", "font", "", "2:3 font", "");
+    row("in another case", "FONT", "n", "3:3 Font", "");
+    row("the next on the same line", "font", "nn", "3:8 font", "");
+    row("around the end", "font", "nnn", "2:3 font", "Continued at the start");
+    row("the previous one, around the start", "font", "p", "3:8 font", "Continued at the end");
+    row("back again", "font", "pp", "3:3 Font", "");
+    row("nowhere", "zzz", "", "1:0 ", "No match");
+    row("nowhere, asked again", "zzz", "np", "1:0 ", "No match");
+}
+
+void tst_SettingsAsText::findsInTheText()
+{
+    QFETCH(QString, wanted);
+    QFETCH(QString, keys);
+    const QByteArray content("<R>\n<A>font</A>\n<B>Font font</B>\n</R>\n");
+    const ShownText shown(content);
+    shown.press(Qt::Key_T, Qt::ControlModifier);
+    shown.press(Qt::Key_Home, Qt::ControlModifier);
+    shown.press(Qt::Key_F, Qt::ControlModifier);
+    auto* field = Child<QLineEdit>(shown.editor, "Find in the text");
+    QVERIFY(field->isVisible() && field->hasFocus());
+    QTest::keyClicks(field, wanted);
+    for (QChar key : keys)
+        QTest::keyClick(field, Qt::Key_F3, key == 'p' ? Qt::ShiftModifier : Qt::NoModifier);
+    QTextCursor cursor = shown.text->textCursor();
+    const QString found = cursor.selectedText();
+    cursor.setPosition(cursor.selectionStart());
+    QTEST(
+        QString("%1:%2 %3").arg(cursor.blockNumber() + 1).arg(cursor.positionInBlock()).arg(found),
+        "found");
+    QTEST(Child<QLabel>(shown.editor, "Result of the search in the text")->text(), "result");
+    QVERIFY(!shown.editor->isModified());
+}
+
+void tst_SettingsAsText::findBarOfTheText()
+{
+    const ShownText shown(Broken);
+    shown.press(Qt::Key_F3); // nothing to find yet
+    auto* field = Child<QLineEdit>(shown.editor, "Find in the text");
+    QVERIFY(field->isVisible() && field->hasFocus());
+    QTest::keyClicks(field, "wrap");
+    QTest::keyClick(field, Qt::Key_Escape);
+    QVERIFY(!field->isVisible() && shown.text->hasFocus());
+    QCOMPARE(shown.text->textCursor().selectedText(), QString("wrap"));
+    const int first = shown.text->textCursor().selectionStart();
+    shown.press(Qt::Key_F3);
+    QVERIFY(shown.text->textCursor().selectionStart() > first);
+    shown.press(Qt::Key_F3, Qt::ShiftModifier);
+    QCOMPARE(shown.text->textCursor().selectionStart(), first);
+
+    // Opened again, typing replaces what was searched for; the keys of the page work in the field.
+    shown.press(Qt::Key_F, Qt::ControlModifier);
+    QTest::keyClicks(field, "Ed");
+    QCOMPARE(field->text(), QString("Ed"));
+    QTest::keyClick(field, Qt::Key_F8);
+    QCOMPARE(shown.text->textCursor().blockNumber(), 2);
+}
+
+void tst_SettingsAsText::goesToALine_data()
+{
+    QTest::addColumn<QString>("typed");
+    QTest::addColumn<Qt::Key>("key");
+    QTest::addColumn<int>("line");
+    QTest::newRow("a line") << "4" << Qt::Key_Return << 4;
+    QTest::newRow("cancelled") << "4" << Qt::Key_Escape << 3;
+    QTest::newRow("beyond the end") << "99" << Qt::Key_Return << 3;
+}
+
+void tst_SettingsAsText::goesToALine()
+{
+    QFETCH(QString, typed);
+    QFETCH(Qt::Key, key);
+    const ShownText shown(Broken); // with the cursor in line 3, where the error is
+    QTimer::singleShot(0, shown.text, [&] {
+        QTRY_VERIFY_WITH_TIMEOUT(QApplication::activeModalWidget(), Patience);
+        QWidget* dialog = QApplication::activeModalWidget();
+        auto* number = dialog->findChild<QSpinBox*>();
+        QTest::keyClicks(number, typed);
+        QTest::keyClick(number, key);
+        if (dialog->isVisible()) // a number that cannot be entered
+            QTest::keyClick(dialog, Qt::Key_Escape);
+    });
+    shown.press(Qt::Key_G, Qt::ControlModifier);
+    QTEST(shown.text->textCursor().blockNumber() + 1, "line");
+    QVERIFY(shown.text->hasFocus());
+}
+
 void tst_SettingsAsText::keysAreInTheMenu()
 {
     const ShownText shown(Broken);
@@ -366,15 +473,16 @@ void tst_SettingsAsText::keysAreInTheMenu()
         entries.append(ActionText(action));
         QVERIFY(!action->statusTip().isEmpty());
     }
-    QCOMPARE(entries, QStringList({"Go to Error\tF8", "Show as Settings\tCtrl+T",
-                                   "Saved States...\tCtrl+Shift+T"}));
+    QCOMPARE(entries, QStringList({"Go to Error\tF8", "Show as Settings\tCtrl+T", "Find\tCtrl+F",
+                                   "Find Next\tF3", "Find Previous\tShift+F3",
+                                   "Go to Line...\tCtrl+G", "Saved States...\tCtrl+Shift+T"}));
     QVERIFY(actions.first()->isEnabled());
     shown.mend();
     QTRY_VERIFY_WITH_TIMEOUT(!actions.first()->isEnabled(), Patience);
     QVERIFY(!Action(*shown.window, "What Will Be Written...")->isEnabled());
     actions.at(1)->trigger();
     QVERIFY(shown.tree->isVisible());
-    QVERIFY(menu->actions().size() > 3);
+    QVERIFY(menu->actions().size() > 7);
     QVERIFY(Action(*shown.window, "What Will Be Written...")->isEnabled());
 }
 

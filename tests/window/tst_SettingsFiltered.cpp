@@ -38,6 +38,7 @@ private slots:
     void tabSkipsWhatIsHidden();
     void reloadedFileIsFiltered();
     void editingIsTakenFirst();
+    void tabReachesEverySwitch();
 };
 
 namespace {
@@ -348,6 +349,20 @@ void tst_SettingsFiltered::editingIsTakenFirst()
     QTest::keyClicks(shown.field(), "mono");
     QCOMPARE(shown.rows(), QString("Editor: font"));
     QVERIFY(shown.bytes().contains("<font>Mono</font>"));
+}
+
+void tst_SettingsFiltered::tabReachesEverySwitch()
+{
+    const ShownFilter shown;
+    shown.filter("", "");
+    QStringList order;
+    for (int i = 0; i < 8; ++i) {
+        order.append(QApplication::focusWidget()->accessibleName());
+        QTest::keyClick(QApplication::focusWidget(), Qt::Key_Tab);
+    }
+    QCOMPARE(QStringList(order.mid(0, 7)),
+             QStringList({"Find in names and values", "Only Matches", "Changed", "Not Default",
+                          "Find previous", "Find next", "Close the find bar"}));
 }
 
 QTEST_MAIN(tst_SettingsFiltered)

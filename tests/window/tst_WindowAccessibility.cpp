@@ -15,8 +15,10 @@
 #include "app/window/log/NoteDialog.h"
 #include "app/window/settings/DifferenceDialog.h"
 #include "app/window/settings/FileListDialog.h"
+#include "app/window/settings/LineDialog.h"
 #include "app/window/settings/SavedStatesDialog.h"
 #include "app/window/settings/SizeDialog.h"
+#include "app/window/settings/ValueDialog.h"
 #include "app/window/settings/WindowPlaceDialog.h"
 
 #include <QAbstractButton>
@@ -142,6 +144,10 @@ void tst_WindowAccessibility::namesInDialogs()
     QCOMPARE(NamelessControls(&states), QStringList());
     SizeDialog size("name", QSize(1, 2));
     QCOMPARE(NamelessControls(&size), QStringList());
+    LineDialog line(1, 10);
+    QCOMPARE(NamelessControls(&line), QStringList());
+    ValueDialog value("name", "a\nb");
+    QCOMPARE(NamelessControls(&value), QStringList());
     WindowPlaceDialog place("name", QPoint(1, 2), QSize(3, 4));
     QCOMPARE(NamelessControls(&place), QStringList());
     FileListDialog files("name", {"a", "b"});

@@ -143,7 +143,7 @@ void SettingsEditor::Open(QString const& path)
     m_path = path;
     m_notice->Dismiss();
     m_fileNotice->SetFile(path); // first, so that it tells of a change while the file is read
-    const SettingsDocument document = SettingsFileReader::Read(path);
+    const SettingsDocument document = SettingsFileReader::Read(path, SettingsFileReader::ShownKeys);
     m_saver.NoteRead(path, document);
     m_model.SetSaved(document);
     m_model.SetDefaults(SettingsDefaults::Of(path));
@@ -163,7 +163,8 @@ void SettingsEditor::Open(QString const& path)
 void SettingsEditor::Reload()
 {
     m_fileNotice->SetFile(m_path);
-    const SettingsDocument document = SettingsFileReader::Read(m_path);
+    const SettingsDocument document =
+        SettingsFileReader::Read(m_path, SettingsFileReader::ShownKeys);
     if (!ShowsTree() && m_text->isModified() && document.isReadable) {
         m_text->Replace(WholeFile(m_path));
         m_text->SetModified(false);
@@ -275,7 +276,7 @@ void SettingsEditor::showTree(SettingsDocument const& document)
 void SettingsEditor::showMalformed(SettingsDocument const& document)
 {
     QString message = tr("Cannot show %1 as a tree: %2").arg(m_path, document.error);
-    if (document.line > 0)
+    if (document.line > 0 && !document.hasTooManyKeys)
         message += tr(" (line %1, column %2)").arg(document.line).arg(document.column);
     m_notice->ShowMessage(message);
     m_text->Show(WholeFile(m_path), document);
@@ -325,7 +326,12 @@ void SettingsEditor::ShowAsTree()
     if (ShowsTree())
         return;
     const SettingsDocument parsed =
-        m_text->isReadOnly() ? SettingsFileReader::Read(m_path) : m_text->parsed();
+        m_text->isReadOnly() ? SettingsFileReader::Read(m_path, SettingsFileReader::ShownKeys)
+                             : m_text->parsed();
+    if (parsed.hasTooManyKeys) {
+        Q_EMIT messageReported(tr("This file has too many keys to be shown as settings"));
+        return;
+    }
     const SettingsDocument settings = parsed.WithErrorAsLoss();
     m_saver.NoteLosses(settings);
     if (m_hasTree && m_text->bytes() == m_shownText) {

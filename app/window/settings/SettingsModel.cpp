@@ -3,6 +3,7 @@
 
 #include "app/window/settings/SettingsModel.h"
 
+#include "app/settingsfile/CaselessText.h"
 #include "app/window/settings/ValueDialog.h"
 #include "app/window/settings/ValueEditing.h"
 #include "app/window/settings/ValueIcons.h"
@@ -11,7 +12,6 @@
 #include <QFont>
 #include <QGuiApplication>
 #include <QPalette>
-#include <QStringMatcher>
 
 #include <algorithm>
 
@@ -278,16 +278,16 @@ SettingsModel::Row SettingsModel::rowBeside(Row row, int step) const
     return Row{section, itemCount(section) - 1};
 }
 
-QModelIndex SettingsModel::matchIn(Row row, QStringMatcher const& text) const
+QModelIndex SettingsModel::matchIn(Row row, CaselessText const& text) const
 {
     const int number = m_shownSections.at(row.section);
     SettingsDocument::Section const& section = m_document.sections.at(number);
     if (row.item < 0)
-        return text.indexIn(section.name) >= 0 ? index(row.section, NameColumn) : QModelIndex();
+        return text.IsIn(section.name) ? index(row.section, NameColumn) : QModelIndex();
     SettingsDocument::Item const& item =
         section.items.at(m_rows[static_cast<std::size_t>(number)]->items.at(row.item));
-    const bool isName = text.indexIn(item.key) >= 0;
-    if (!isName && text.indexIn(item.value) < 0)
+    const bool isName = text.IsIn(item.key);
+    if (!isName && !text.IsIn(item.value))
         return QModelIndex();
     return index(row.item, isName ? NameColumn : ValueColumn, index(row.section, NameColumn));
 }
@@ -297,14 +297,14 @@ QModelIndex SettingsModel::Find(QString const& text, QModelIndex const& from, in
 {
     if (m_shownSections.count() == 0)
         return QModelIndex();
-    const QStringMatcher matcher(text, Qt::CaseInsensitive);
+    const CaselessText wanted(text);
     Row start;
     if (from.isValid())
         start = IsSection(from) ? Row{from.row(), -1} : Row{parent(from).row(), from.row()};
     Row row = withFrom ? start : rowBeside(start, step);
     const Row last = withFrom ? rowBeside(start, -step) : start;
     for (;; row = rowBeside(row, step)) {
-        const QModelIndex match = matchIn(row, matcher);
+        const QModelIndex match = matchIn(row, wanted);
         if (match.isValid() || (row.section == last.section && row.item == last.item))
             return match;
     }
@@ -499,7 +499,9 @@ Qt::ItemFlags SettingsModel::flags(QModelIndex const& index) const
     if (!index.isValid())
         return Qt::NoItemFlags;
     const Qt::ItemFlags usual = Qt::ItemIsEnabled | Qt::ItemIsSelectable;
-    return IsSection(index) && index.column() == ValueColumn ? usual : usual | Qt::ItemIsEditable;
+    if (!IsSection(index)) // which spares the tree a persistent index for each item
+        return usual | Qt::ItemIsEditable | Qt::ItemNeverHasChildren;
+    return index.column() == ValueColumn ? usual : usual | Qt::ItemIsEditable;
 }
 
 } // namespace Velocor

@@ -15,9 +15,9 @@
 #include <memory>
 #include <vector>
 
-class QStringMatcher;
-
 namespace Velocor {
+
+class CaselessText;
 
 /// A settings document as a tree: sections at the top, their keys and values below, those that a
 /// filter shows. What an edit changes stays shown until the filter is set again. GUI thread.
@@ -141,7 +141,7 @@ private:
     /// so they hold while other sections come, go and move.
     struct SectionRows
     {
-        int section;
+        int section = 0;
         SettingsRows items;
     };
 
@@ -167,7 +167,7 @@ private:
     QPair<QString, QString> namesOf(QModelIndex const& index) const;
     QVariant lookOf(QModelIndex const& index, int role) const;
     Row rowBeside(Row row, int step) const;
-    QModelIndex matchIn(Row row, QStringMatcher const& text) const;
+    QModelIndex matchIn(Row row, CaselessText const& text) const;
 
     SettingsDocument m_document;
     QHash<QPair<QString, QString>, ValueKind> m_chosenKinds; ///< by section and key

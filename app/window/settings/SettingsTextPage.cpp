@@ -4,7 +4,9 @@
 #include "app/window/settings/SettingsTextPage.h"
 
 #include "app/settingsfile/SettingsFileReader.h"
+#include "app/window/settings/LineDialog.h"
 #include "app/window/settings/NumberedText.h"
+#include "app/window/settings/TextFindBar.h"
 #include "app/window/widgets/PlainText.h"
 
 #include <QAction>
@@ -12,6 +14,7 @@
 #include <QKeyEvent>
 #include <QLabel>
 #include <QPushButton>
+#include <QTextBlock>
 #include <QTextDocument>
 
 namespace Velocor {
@@ -38,8 +41,8 @@ QString Contents(SettingsDocument const& document)
 } // namespace
 
 SettingsTextPage::SettingsTextPage(QWidget* parent)
-    : QWidget(parent), m_text(new NumberedText), m_state(NewPlainLabel()),
-      m_save(new QPushButton(tr("Sa&ve")))
+    : QWidget(parent), m_text(new NumberedText), m_find(new TextFindBar(m_text)),
+      m_state(NewPlainLabel()), m_save(new QPushButton(tr("Sa&ve")))
 {
     m_text->setAccessibleName(tr("File text"));
     m_state->setAccessibleName(tr("State of the text"));
@@ -59,6 +62,7 @@ SettingsTextPage::SettingsTextPage(QWidget* parent)
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(0, 0, 0, 0);
     layout->addWidget(m_text, 1);
+    layout->addWidget(m_find);
     layout->addWidget(m_state);
     layout->addLayout(buttons);
     setFocusProxy(m_text);
@@ -81,6 +85,13 @@ QVector<SettingsTextCommand> SettingsTextPage::AllCommands()
         {tr("Show as Se&ttings"), key("Ctrl+T"),
          tr("Show what can be read of the text as sections, keys and values"),
          &SettingsTextPage::ShowSettings},
+        {tr("&Find"), key("Ctrl+F"), tr("Find a text in the file"), &SettingsTextPage::OpenFind},
+        {tr("Find Ne&xt"), key("F3"), tr("Go to the next match in the text"),
+         &SettingsTextPage::FindNext},
+        {tr("Find &Previous"), key("Shift+F3"), tr("Go to the previous match in the text"),
+         &SettingsTextPage::FindPrevious},
+        {tr("&Go to Line..."), key("Ctrl+G"), tr("Go to a line of the text by its number"),
+         &SettingsTextPage::GoToLine},
         {tr("Sa&ved States..."), key("Ctrl+Shift+T"), tr("Bring back an earlier state of the file"),
          &SettingsTextPage::OpenStates},
     };
@@ -213,8 +224,11 @@ void SettingsTextPage::showState()
 {
     const QString found = Contents(m_parsed);
     QString state;
+    const bool isMalformed = !m_parsed.isParsed && !m_parsed.hasTooManyKeys;
     if (m_parsed.isParsed)
         state = tr("This text can be read: %1.").arg(found);
+    else if (m_parsed.hasTooManyKeys)
+        state = tr("This file has more keys than can be shown as settings.");
     else if (m_parsed.line > 0)
         state = tr("Line %1, column %2: %3. Programs get what is before it: %4.")
                     .arg(m_parsed.line)
@@ -227,8 +241,9 @@ void SettingsTextPage::showState()
     else if (isReadOnly())
         state += tr(" This file cannot be edited as text.");
     m_state->setText(state);
-    m_text->SetError(m_parsed.isParsed ? 0 : m_parsed.line, m_parsed.column);
-    m_actions.at(GoToErrorCommand)->setEnabled(!m_parsed.isParsed && m_parsed.line > 0);
+    m_text->SetError(isMalformed ? m_parsed.line : 0, m_parsed.column);
+    m_actions.at(GoToErrorCommand)->setEnabled(isMalformed && m_parsed.line > 0);
+    m_actions.at(ShowSettingsCommand)->setEnabled(!m_parsed.hasTooManyKeys);
     m_save->setEnabled(isModified());
     Q_EMIT stateChanged();
 }
@@ -237,6 +252,30 @@ void SettingsTextPage::GoToError()
 {
     parsed();
     m_text->GoToError();
+}
+
+void SettingsTextPage::OpenFind()
+{
+    m_find->Open();
+}
+
+void SettingsTextPage::FindNext()
+{
+    m_find->FindNext(1);
+}
+
+void SettingsTextPage::FindPrevious()
+{
+    m_find->FindNext(-1);
+}
+
+void SettingsTextPage::GoToLine()
+{
+    QTextDocument const* document = m_text->document();
+    LineDialog dialog(m_text->textCursor().blockNumber() + 1, document->blockCount(), this);
+    if (dialog.exec() == QDialog::Accepted)
+        m_text->setTextCursor(QTextCursor(document->findBlockByNumber(dialog.line() - 1)));
+    m_text->setFocus();
 }
 
 void SettingsTextPage::OpenStates()

@@ -18,6 +18,7 @@ namespace Velocor {
 
 class NumberedText;
 class SettingsTextPage;
+class TextFindBar;
 
 /// A command of the page, as menus and the list of keyboard shortcuts show it.
 struct SettingsTextCommand
@@ -79,6 +80,12 @@ public:
     void GoToError();
     void ShowSettings();
     void OpenStates();
+    void OpenFind();
+    void FindNext();
+    void FindPrevious();
+
+    /// Asks for the number of a line, and goes there.
+    void GoToLine();
 
 Q_SIGNALS:
     /// Something else can be saved, undone or redone.
@@ -103,6 +110,7 @@ private:
     QTimer m_pause; ///< runs from a change until the text is read
     QList<QAction*> m_actions;
     NumberedText* m_text;
+    TextFindBar* m_find;
     QLabel* m_state;
     QPushButton* m_save;
 };

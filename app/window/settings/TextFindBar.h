@@ -1,0 +1,49 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+#include <QWidget>
+
+class QLabel;
+class QLineEdit;
+class QPlainTextEdit;
+class QToolButton;
+
+namespace Velocor {
+
+/// Finds a text, in any letter case, in a text editor and selects it there. Hidden until it is
+/// opened. GUI thread only.
+class TextFindBar : public QWidget
+{
+    Q_OBJECT
+
+public:
+    /// @param text  not owned; outlives the bar
+    explicit TextFindBar(QPlainTextEdit* text, QWidget* parent = nullptr);
+
+    /// Shows the bar, with its text selected for typing over it.
+    void Open();
+
+    /// Hides the bar, and gives the text editor the keyboard focus.
+    void Close();
+
+    /// Selects the next match after the cursor, around the end if necessary; opens the bar if there
+    /// is no text yet.
+    ///
+    /// @param step  1, or -1 for the previous one
+    void FindNext(int step);
+
+protected:
+    void keyPressEvent(QKeyEvent* event) override;
+
+private:
+    void find(int step, bool fromSelection);
+    QToolButton* makeButton(QChar sign, QString const& name, QString const& toolTip);
+
+    QPlainTextEdit* m_text;
+    QLineEdit* m_wanted;
+    QLabel* m_result;
+};
+
+} // namespace Velocor
