@@ -27,6 +27,10 @@ private slots:
     void secretNames_data();
     void secretNames();
     void namesOfThisComputer();
+    void ownHome_data();
+    void ownHome();
+    void fullNames_data();
+    void fullNames();
 };
 
 void tst_Redactor::redacts_data()
@@ -247,13 +251,71 @@ void tst_Redactor::secretNames()
 
 void tst_Redactor::namesOfThisComputer()
 {
+    qputenv("HOME", "/srv/home folder");
     qputenv("USER", "quentin");
     qputenv("LOGNAME", "root");
+    qputenv("SUDO_USER", "ada");
     Redactor redactor;
     OwnNames::AddTo(redactor);
-    QCOMPARE(redactor.Redact("quentin root").text, QString("<user-1> root"));
-    QCOMPARE(redactor.Redact(QDir::homePath() + "/x").text, QString("<home>/x"));
+    QCOMPARE(redactor.Redact("quentin root ada").text, QString("<user-1> root <user-2>"));
+    QCOMPARE(redactor.Redact("/srv/home folder/x").text, QString("<home>/x"));
     QVERIFY(OwnNames::IsCommon("Localhost") && !OwnNames::IsCommon("lab7"));
+    const QString host = QSysInfo::machineHostName();
+    const QString shortHost = host.section('.', 0, 0);
+    if (!OwnNames::IsCommon(host) && shortHost.size() > 1) {
+        QCOMPARE(redactor.Redact("on " + shortHost + " now").text, QString("on <host-1> now"));
+        QVERIFY(redactor.Redact("on " + host).text.startsWith("on <host-"));
+    }
+}
+
+void tst_Redactor::ownHome_data()
+{
+    QTest::addColumn<QString>("home");
+    QTest::addColumn<QString>("expected"); // of a file in it
+    QTest::newRow("a user's") << "/srv/ada"
+                              << "<home>/x";
+    QTest::newRow("a service's") << "/srv"
+                                 << "/srv/x";
+    QTest::newRow("none") << "/"
+                          << "//x";
+}
+
+void tst_Redactor::ownHome()
+{
+    QFETCH(QString, home);
+    qputenv("HOME", QFile::encodeName(home));
+    Redactor redactor;
+    OwnNames::AddTo(redactor);
+    QTEST(redactor.Redact(home + "/x").text, "expected");
+}
+
+void tst_Redactor::fullNames_data()
+{
+    QTest::addColumn<QString>("entry");
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QString>("expected");
+    const auto row = [](char const* name, char const* entry, char const* text,
+                        char const* expected) {
+        QTest::newRow(name) << QString(entry) << QString(text) << QString(expected);
+    };
+    row("whole", "Ada Lovelace,Room 5", "ada lovelace", "<name-1>");
+    row("parts", "Ada Lovelace,Room 5", "Lovelace, Ada", "<name-1>, <name-2>");
+    row("parts in another case", "Will Root", "will root", "<name-1>");
+    row("a part in another case", "Will Lovelace", "will", "will");
+    row("a short part", "Jo Lovelace", "Jo Lovelace Jo", "<name-1> Jo");
+    row("a part that many have", "Guest Lovelace", "Guest", "Guest");
+    row("one that many have", "root", "root", "root");
+    row("what is not the name", "Ada Lovelace,Room 5", "Room 5", "Room 5");
+    row("with spaces around it", " Ada Lovelace ,", "Ada Lovelace", "<name-1>");
+}
+
+void tst_Redactor::fullNames()
+{
+    QFETCH(QString, entry);
+    QFETCH(QString, text);
+    Redactor redactor;
+    OwnNames::AddFullName(redactor, entry);
+    QTEST(redactor.Redact(text).text, "expected");
 }
 
 QTEST_GUILESS_MAIN(tst_Redactor)
