@@ -94,15 +94,26 @@ void tst_Report::archive()
     reader.start(
         "python3",
         {"-c",
-         "import sys, zipfile\n"
+         "import struct, sys, zipfile, zlib\n"
          "archive = zipfile.ZipFile(sys.argv[1])\n"
          "assert archive.testzip() is None\n"
          "for name in archive.namelist():\n"
-         "    print(ascii(name), len(archive.read(name)), sorted(set(archive.read(name))))\n",
+         "    print(ascii(name), len(archive.read(name)), sorted(set(archive.read(name))))\n"
+         "bytes = open(sys.argv[1], 'rb').read()\n"
+         "for file in archive.infolist():\n"
+         "    assert file.date_time == (1980, 1, 1, 0, 0, 0), file.date_time\n"
+         "    assert (file.volume, file.internal_attr, file.external_attr) == (0, 0, 0)\n"
+         "    start = file.header_offset + 30 + len(file.filename.encode())\n"
+         "    data = bytes[start:start + file.compress_size]\n"
+         "    inflate = zlib.decompressobj(-15)\n"
+         "    inflate.decompress(data)\n"
+         "    assert inflate.eof and not inflate.unused_data, file\n"
+         "end = struct.unpack('<LHHHHLLH', bytes[-22:])\n"
+         "assert end[1:5] == (0, 0, 3, 3) and end[7] == 0, end\n",
          folder.filePath("a.zip")});
     QVERIFY(reader.waitForFinished(60000));
     QCOMPARE(
-        QString(reader.readAllStandardOutput()),
+        QString(reader.readAllStandardOutput() + reader.readAllStandardError()),
         QString("'report.md' 5 [10, 101, 116, 120]\n'\\xf6/empty' 0 []\n'zeros' 100000 [0]\n"));
 }
 
