@@ -51,6 +51,8 @@ private slots:
     void runs();
     void refused_data();
     void refused();
+    void fileWithoutSize();
+    void ends();
     void withoutCurrentFile();
     void overwrittenMeanwhile();
     void rotatedMeanwhile();
@@ -124,6 +126,10 @@ void tst_LogHistory::refused_data()
                             << "Not a regular file";
     QTest::newRow("pipe") << "pipe.log"
                           << "Not a regular file";
+    for (char const* tool : {"zcat", "xzcat", "bzcat", "zstdcat"})
+        QTest::newRow(tool) << QString(tool) + ".log"
+                            << QString("A compressed file. To read it: %1 FILE | velocor-log -")
+                                   .arg(QLatin1String(tool));
 }
 
 void tst_LogHistory::refused()
@@ -132,12 +138,51 @@ void tst_LogHistory::refused()
     QFETCH(QString, error);
     QDir(m_folder.path()).mkpath("folder.log");
     ::mkfifo(qPrintable(m_folder.filePath("pipe.log")), 0600);
+    const QHash<QString, QByteArray> compressed{{"zcat.log", QByteArray("\x1f\x8b\x08\0", 4)},
+                                                {"xzcat.log", QByteArray("\xfd"
+                                                                         "7zXZ\0",
+                                                                         6)},
+                                                {"bzcat.log", "BZh91AY&SY"},
+                                                {"zstdcat.log", "\x28\xb5\x2f\xfd"}};
+    if (compressed.contains(name))
+        QVERIFY(TestFiles::write(m_folder.filePath(name), compressed.value(name)));
     const QString good = m_folder.filePath("good.log");
     QVERIFY(TestFiles::write(good, "x\n"));
     LogHistory history;
     QVERIFY(!history.ReadFiles({m_folder.filePath(name), good}));
     QCOMPARE(history.errors(), QStringList(m_folder.filePath(name) + ": " + error));
     QCOMPARE(Lines(history), QByteArray("x\n"));
+    QVERIFY(history.ReadFiles({good})); // of before, nothing is left
+    QCOMPARE(history.errors(), QStringList());
+    QCOMPARE(history.runs().size(), size_t(1));
+    QCOMPARE(Lines(history), QByteArray("x\n"));
+}
+
+// The system tells such things in files that claim to be empty.
+void tst_LogHistory::fileWithoutSize()
+{
+    QFile file("/proc/version");
+    if (!file.open(QIODevice::ReadOnly) || file.size() != 0)
+        QSKIP("this system has none");
+    LogHistory history;
+    QVERIFY(history.ReadFiles({file.fileName()}));
+    QCOMPARE(Lines(history), file.readAll());
+}
+
+void tst_LogHistory::ends()
+{
+    const QString log = m_folder.filePath("logs/app.log");
+    QVERIFY(TestFiles::write(log, "2025-03-03 09:00:00.001 Trace a\n"));
+    QVERIFY(TestFiles::write(m_folder.filePath("ended-app.log"),
+                             "2025-03-03T08:59:59.000 2025-03-03T09:30:00.000 normal\n"));
+    LogHistory history;
+    QVERIFY(history.ReadLog(log));
+    history.ReadTimes();
+    history.ReadTimes(); // counts nothing twice
+    QCOMPARE(history.runs()[0].counts[LogEntry::Trace], size_t(1));
+    QCOMPARE(int(history.runs()[0].exit), int(HistoryRun::Unknown));
+    history.ReadEnds(log);
+    QCOMPARE(int(history.runs()[0].exit), int(HistoryRun::Normal));
 }
 
 void tst_LogHistory::withoutCurrentFile()
