@@ -59,6 +59,11 @@ private slots:
     void dates_data();
     void dates();
     void filter();
+    void timesOfHiddenLines();
+    void logWithoutTimes();
+    void runWithoutTimes();
+    void overwrittenStamps();
+    void opensAgain();
     void wideCharacters();
     void timeAtTheEndOfALongLine();
 
@@ -246,6 +251,8 @@ void tst_LogHistory::dates_data()
         "2025-05-05 00:00:00", {"2025-03-02 23:59:00", "2025-03-03 00:01:00"});
     row("before the first stamp", "torn\n2025-03-03 09:00:00 Trace a\n", "2025-05-05 00:00:00",
         {"2025-03-03 09:00:00", "2025-03-03 09:00:00"});
+    row("at midnight", "torn\n00:00:00 Trace a\n00:00:01 Trace b\n", "2025-03-03 00:00:01",
+        {"2025-03-03 00:00:00", "2025-03-03 00:00:00", "2025-03-03 00:00:01"});
     row("an earlier run ended before the next one began",
         "08:00:00 Trace a\n08:00:01 Trace b\nrn\n07:00:00 Trace c\n07:30:00 Trace d\n",
         "2025-03-03 08:00:01",
@@ -290,6 +297,88 @@ void tst_LogHistory::filter()
     while (cursor.Next())
         lines += QByteArray::number(static_cast<int>(cursor.line()));
     QCOMPARE(lines, QByteArray("5012"));
+}
+
+// They count the midnights between those that are shown.
+void tst_LogHistory::timesOfHiddenLines()
+{
+    const QString log = m_folder.filePath("hidden.log");
+    QVERIFY(TestFiles::write(log, "23:50:00 Trace disk\n00:10:00 Trace x\n12:05:00 Trace x\n"
+                                  "22:00:00 Trace x\n23:55:00 Trace disk\n"
+                                  "23:58:00 Trace disk\n"));
+    QVERIFY(SetModified(log, "2025-03-03 23:58:00"));
+    LogFilter disk;
+    QVERIFY(disk.SetText("disk", false, true));
+    LogHistory history(LogLineParser({"hh:mm:ss"}, {}), disk);
+    QVERIFY(history.ReadLog(log));
+    HistoryCursor cursor(history, true);
+    for (char const* time : {"2025-03-02 23:50:00", "2025-03-03 23:55:00", "2025-03-03 23:58:00"}) {
+        QVERIFY(cursor.Next());
+        QCOMPARE(cursor.time(), KeyOf(time));
+    }
+    QVERIFY(!cursor.Next());
+}
+
+// Among others, it is where its file was last written.
+void tst_LogHistory::logWithoutTimes()
+{
+    const QString log = m_folder.filePath("plain.log");
+    for (char const* text : {"x\ny\n", "x\n2025-03-03 09:00:00.001 Trace a\n"}) {
+        QVERIFY(TestFiles::write(log, text));
+        QVERIFY(SetModified(log, "2025-03-03 10:00:00"));
+        LogHistory history;
+        QVERIFY(history.ReadLog(log));
+        HistoryCursor cursor(history, true);
+        QVERIFY(cursor.Next());
+        QCOMPARE(cursor.key(), QByteArray(text).contains("Trace") ? KeyOf("2025-03-03 09:00:00") + 1
+                                                                  : KeyOf("2025-03-03 10:00:00"));
+    }
+}
+
+void tst_LogHistory::runWithoutTimes()
+{
+    const QString log = m_folder.filePath("partly.log");
+    QVERIFY(TestFiles::write(log + ".1", "2025-03-03 09:00:00.001 Trace a\n"));
+    QVERIFY(TestFiles::write(log, "x\n"));
+    LogHistory history;
+    QVERIFY(history.ReadLog(log));
+    HistoryCursor cursor(history, true);
+    QVERIFY(cursor.Next());
+    QCOMPARE(cursor.time(), KeyOf("2025-03-03 09:00:00") + 1);
+    QVERIFY(cursor.Next());
+    QCOMPARE(cursor.time(), qint64(-1));
+    QVERIFY(!cursor.Next());
+}
+
+void tst_LogHistory::overwrittenStamps()
+{
+    const QString log = m_folder.filePath("stamps.log");
+    const QByteArray first = "2025-03-03 09:00:00.001 Trace a\n";
+    const QByteArray second = "2025-03-03 10:00:00.001 Trace b\n";
+    QVERIFY(TestFiles::write(log, "torn\n" + first + second));
+    LogHistory history;
+    QVERIFY(history.ReadLog(log));
+    QVERIFY(
+        TestFiles::writeOver(log, "torn\n" + QByteArray(first.size() - 1, 'x') + '\n' + second));
+    HistoryCursor cursor(history, true);
+    QVERIFY(cursor.Next());
+    QCOMPARE(cursor.time(), KeyOf("2025-03-03 10:00:00") + 1);
+    history.ReadTimes();
+    QCOMPARE(history.runs()[0].start, KeyOf("2025-03-03 10:00:00") + 1);
+}
+
+void tst_LogHistory::opensAgain()
+{
+    const QString log = m_folder.filePath("one.log");
+    QVERIFY(TestFiles::write(log, "z"));
+    HistoryFile file;
+    QVERIFY(!file.Open(m_folder.filePath("none.log")));
+    QVERIFY(file.Open(log));
+    for (int time = 0; time < 2; ++time) {
+        QVERIFY(file.Read(LogLineParser(), LogFilter()));
+        QCOMPARE(file.rows().lines().size(), size_t(1));
+        QCOMPARE(file.error(), QString());
+    }
 }
 
 void tst_LogHistory::wideCharacters()
