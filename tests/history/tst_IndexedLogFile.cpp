@@ -44,6 +44,8 @@ private slots:
     void rows();
     void searchesAgain();
     void searchesWhatIsLeft();
+    void searchesPiecesThatAreLeft();
+    void readsWhatIsLeft();
     void stops();
     void isUnchanged_data();
     void isUnchanged();
@@ -144,6 +146,31 @@ void tst_IndexedLogFile::searchesWhatIsLeft()
     QVERIFY(QFile::resize(m_path, 0));
     QVERIFY(file.Search(files, files.start(1), Text("\001"), GoesOn));
     QCOMPARE(shown(file), QStringList());
+}
+
+// What was there in an earlier piece is not in a later one.
+void tst_IndexedLogFile::searchesPiecesThatAreLeft()
+{
+    QVERIFY(TestFiles::write(m_path, ManyLines(3000)));
+    IndexedLogFile file;
+    QVERIFY(file.Open(m_path));
+    QVERIFY(file.Read(LogLineParser(), LogFilter(), GoesOn));
+    OlderLogFiles files;
+    join(file, files);
+    QVERIFY(QFile::resize(m_path, ManyLines(100).size()));
+    QVERIFY(file.Search(files, files.start(1), Text("line"), GoesOn));
+    QCOMPARE(shown(file).size(), 100);
+}
+
+void tst_IndexedLogFile::readsWhatIsLeft()
+{
+    QVERIFY(TestFiles::write(m_path, "line a\nline b\nline c\n"));
+    IndexedLogFile file;
+    QVERIFY(file.Open(m_path));
+    QVERIFY(QFile::resize(m_path, 9));
+    QVERIFY(file.Read(LogLineParser(), LogFilter(), GoesOn));
+    QCOMPARE(file.size(), qint64(9));
+    QCOMPARE(file.index().size(), size_t(2));
 }
 
 void tst_IndexedLogFile::stops()
