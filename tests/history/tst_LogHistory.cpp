@@ -64,6 +64,8 @@ private slots:
     void runWithoutTimes();
     void overwrittenStamps();
     void opensAgain();
+    void shares();
+    void placesOfLines();
     void wideCharacters();
     void timeAtTheEndOfALongLine();
 
@@ -379,6 +381,41 @@ void tst_LogHistory::opensAgain()
         QCOMPARE(file.rows().lines().size(), size_t(1));
         QCOMPARE(file.error(), QString());
     }
+}
+
+// Another history may read what this one has opened.
+void tst_LogHistory::shares()
+{
+    const QString log = m_folder.filePath("shared.log");
+    QVERIFY(TestFiles::write(log, "a\nb\n"));
+    HistoryFile file;
+    QVERIFY(!file.isOpen());
+    QVERIFY(file.Open(log));
+    QVERIFY(file.isOpen());
+    HistoryFile other;
+    other.Share(file);
+    QCOMPARE(other.path(), log);
+    QCOMPARE(other.file(), file.file());
+    file.file()->close();
+    QVERIFY(!other.isOpen());
+}
+
+void tst_LogHistory::placesOfLines()
+{
+    const QString log = m_folder.filePath("places.log");
+    QVERIFY(TestFiles::write(log, "2025-03-03 09:00:00.001 Trace a\nmore\n"));
+    LogHistory history;
+    QVERIFY(history.ReadLog(log));
+    HistoryCursor cursor(history, false);
+    QVERIFY(cursor.Next());
+    QCOMPARE(cursor.start(), qint64(0));
+    QCOMPARE(cursor.end(), qint64(32));
+    QVERIFY(cursor.mark() & LogRows::Timed);
+    QVERIFY(cursor.Next());
+    QCOMPARE(cursor.start(), qint64(32));
+    QCOMPARE(cursor.end(), qint64(37));
+    QVERIFY(!(cursor.mark() & LogRows::Timed));
+    QVERIFY(cursor.mark() & LogRows::Continued);
 }
 
 void tst_LogHistory::wideCharacters()
