@@ -27,6 +27,7 @@ ROOMS = {
     "common/xml": ("xml", "config plain", "hostile"),
     "app/history": ("history", "tst_HistoryLives tst_PlainTerminal"),
     "app/logfile": ("logfile", PLAIN_LOGS),
+    "app/report": ("report", "tst_PlainRedaction"),
     "app/settingsfile": ("settingsfile", "plain hostile", "window"),
     "app/runninglog": ("runninglog", "window"),
 }

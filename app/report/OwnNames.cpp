@@ -30,21 +30,6 @@ void AddUser(Redactor& redactor, QString const& name)
         redactor.AddSecret(SecretKind::UserName, name);
 }
 
-// "Ada Lovelace,Room 5,...". The parts, too; a word like "will" is none unless it is spelled so.
-void AddFullName(Redactor& redactor, QString const& entry)
-{
-    constexpr int ShortestPart = 3;
-    const QString name = entry.section(QLatin1Char(','), 0, 0).trimmed();
-    if (OwnNames::IsCommon(name))
-        return;
-    redactor.AddSecret(SecretKind::FullName, name);
-    const QStringList parts = name.split(QLatin1Char(' '));
-    for (QString const& part : parts) {
-        if (part.size() >= ShortestPart && !OwnNames::IsCommon(part))
-            redactor.AddSecret(SecretKind::FullName, part, true);
-    }
-}
-
 void AddAccount(Redactor& redactor)
 {
     constexpr int Size = 16 * 1024;
@@ -55,7 +40,7 @@ void AddAccount(Redactor& redactor)
         return;
     AddUser(redactor, QString::fromLocal8Bit(entry.pw_name));
     AddHome(redactor, QFile::decodeName(entry.pw_dir));
-    AddFullName(redactor, QString::fromUtf8(entry.pw_gecos));
+    OwnNames::AddFullName(redactor, QString::fromUtf8(entry.pw_gecos));
 }
 
 } // namespace
@@ -75,6 +60,21 @@ bool OwnNames::IsCommon(QString const& name)
         QStringLiteral("fedora"),        QStringLiteral("none"),
         QStringLiteral("local"),         QStringLiteral("host")};
     return names.contains(name, Qt::CaseInsensitive);
+}
+
+void OwnNames::AddFullName(Redactor& redactor, QString const& description)
+{
+    constexpr int ShortestPart = 3;
+    const QString name = description.section(QLatin1Char(','), 0, 0).trimmed();
+    if (IsCommon(name))
+        return;
+    redactor.AddSecret(SecretKind::FullName, name);
+    const QStringList parts = name.split(QLatin1Char(' '));
+    for (QString const& part : parts) {
+        // A word like "will" is a name only with a capital.
+        if (part.size() >= ShortestPart && !IsCommon(part))
+            redactor.AddSecret(SecretKind::FullName, part, true);
+    }
 }
 
 void OwnNames::AddTo(Redactor& redactor)

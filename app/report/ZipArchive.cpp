@@ -19,6 +19,16 @@ constexpr quint16 FirstDay = (1 << 5) + 1; // January 1, 1980
 constexpr int BeforeData = 6;
 constexpr int AfterData = 4;
 
+constexpr char NoData[] = "\x03"; // a last block without anything in it, with the NUL
+
+QByteArray Compressed(QByteArray const& content)
+{
+    if (content.isEmpty()) // for which qCompress() makes no block
+        return QByteArray(NoData, sizeof NoData);
+    const QByteArray compressed = qCompress(content);
+    return compressed.mid(BeforeData, compressed.size() - BeforeData - AfterData);
+}
+
 void Add16(QByteArray& bytes, quint32 number)
 {
     bytes += static_cast<char>(number & 0xff);
@@ -51,8 +61,7 @@ quint32 SizeOf(QByteArray const& bytes)
 
 void ZipArchive::Add(QString const& name, QByteArray const& content)
 {
-    const QByteArray compressed = qCompress(content);
-    const QByteArray data = compressed.mid(BeforeData, compressed.size() - BeforeData - AfterData);
+    const QByteArray data = Compressed(content);
     const QByteArray nameBytes = name.toUtf8();
     const quint32 start = SizeOf(m_files);
 

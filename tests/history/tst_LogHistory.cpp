@@ -51,12 +51,21 @@ private slots:
     void runs();
     void refused_data();
     void refused();
+    void fileWithoutSize();
+    void ends();
     void withoutCurrentFile();
     void overwrittenMeanwhile();
     void rotatedMeanwhile();
     void dates_data();
     void dates();
     void filter();
+    void timesOfHiddenLines();
+    void logWithoutTimes();
+    void runWithoutTimes();
+    void overwrittenStamps();
+    void opensAgain();
+    void shares();
+    void placesOfLines();
     void wideCharacters();
     void timeAtTheEndOfALongLine();
 
@@ -124,6 +133,10 @@ void tst_LogHistory::refused_data()
                             << "Not a regular file";
     QTest::newRow("pipe") << "pipe.log"
                           << "Not a regular file";
+    for (char const* tool : {"zcat", "xzcat", "bzcat", "zstdcat"})
+        QTest::newRow(tool) << QString(tool) + ".log"
+                            << QString("A compressed file. To read it: %1 FILE | velocor-log -")
+                                   .arg(QLatin1String(tool));
 }
 
 void tst_LogHistory::refused()
@@ -132,12 +145,51 @@ void tst_LogHistory::refused()
     QFETCH(QString, error);
     QDir(m_folder.path()).mkpath("folder.log");
     ::mkfifo(qPrintable(m_folder.filePath("pipe.log")), 0600);
+    const QHash<QString, QByteArray> compressed{{"zcat.log", QByteArray("\x1f\x8b\x08\0", 4)},
+                                                {"xzcat.log", QByteArray("\xfd"
+                                                                         "7zXZ\0",
+                                                                         6)},
+                                                {"bzcat.log", "BZh91AY&SY"},
+                                                {"zstdcat.log", "\x28\xb5\x2f\xfd"}};
+    if (compressed.contains(name))
+        QVERIFY(TestFiles::write(m_folder.filePath(name), compressed.value(name)));
     const QString good = m_folder.filePath("good.log");
     QVERIFY(TestFiles::write(good, "x\n"));
     LogHistory history;
     QVERIFY(!history.ReadFiles({m_folder.filePath(name), good}));
     QCOMPARE(history.errors(), QStringList(m_folder.filePath(name) + ": " + error));
     QCOMPARE(Lines(history), QByteArray("x\n"));
+    QVERIFY(history.ReadFiles({good})); // of before, nothing is left
+    QCOMPARE(history.errors(), QStringList());
+    QCOMPARE(history.runs().size(), size_t(1));
+    QCOMPARE(Lines(history), QByteArray("x\n"));
+}
+
+// The system tells such things in files that claim to be empty.
+void tst_LogHistory::fileWithoutSize()
+{
+    QFile file("/proc/version");
+    if (!file.open(QIODevice::ReadOnly) || file.size() != 0)
+        QSKIP("this system has none");
+    LogHistory history;
+    QVERIFY(history.ReadFiles({file.fileName()}));
+    QCOMPARE(Lines(history), file.readAll());
+}
+
+void tst_LogHistory::ends()
+{
+    const QString log = m_folder.filePath("logs/app.log");
+    QVERIFY(TestFiles::write(log, "2025-03-03 09:00:00.001 Trace a\n"));
+    QVERIFY(TestFiles::write(m_folder.filePath("ended-app.log"),
+                             "2025-03-03T08:59:59.000 2025-03-03T09:30:00.000 normal\n"));
+    LogHistory history;
+    QVERIFY(history.ReadLog(log));
+    history.ReadTimes();
+    history.ReadTimes(); // counts nothing twice
+    QCOMPARE(history.runs()[0].counts[LogEntry::Trace], size_t(1));
+    QCOMPARE(int(history.runs()[0].exit), int(HistoryRun::Unknown));
+    history.ReadEnds(log);
+    QCOMPARE(int(history.runs()[0].exit), int(HistoryRun::Normal));
 }
 
 void tst_LogHistory::withoutCurrentFile()
@@ -201,6 +253,8 @@ void tst_LogHistory::dates_data()
         "2025-05-05 00:00:00", {"2025-03-02 23:59:00", "2025-03-03 00:01:00"});
     row("before the first stamp", "torn\n2025-03-03 09:00:00 Trace a\n", "2025-05-05 00:00:00",
         {"2025-03-03 09:00:00", "2025-03-03 09:00:00"});
+    row("at midnight", "torn\n00:00:00 Trace a\n00:00:01 Trace b\n", "2025-03-03 00:00:01",
+        {"2025-03-03 00:00:00", "2025-03-03 00:00:00", "2025-03-03 00:00:01"});
     row("an earlier run ended before the next one began",
         "08:00:00 Trace a\n08:00:01 Trace b\nrn\n07:00:00 Trace c\n07:30:00 Trace d\n",
         "2025-03-03 08:00:01",
@@ -245,6 +299,123 @@ void tst_LogHistory::filter()
     while (cursor.Next())
         lines += QByteArray::number(static_cast<int>(cursor.line()));
     QCOMPARE(lines, QByteArray("5012"));
+}
+
+// They count the midnights between those that are shown.
+void tst_LogHistory::timesOfHiddenLines()
+{
+    const QString log = m_folder.filePath("hidden.log");
+    QVERIFY(TestFiles::write(log, "23:50:00 Trace disk\n00:10:00 Trace x\n12:05:00 Trace x\n"
+                                  "22:00:00 Trace x\n23:55:00 Trace disk\n"
+                                  "23:58:00 Trace disk\n"));
+    QVERIFY(SetModified(log, "2025-03-03 23:58:00"));
+    LogFilter disk;
+    QVERIFY(disk.SetText("disk", false, true));
+    LogHistory history(LogLineParser({"hh:mm:ss"}, {}), disk);
+    QVERIFY(history.ReadLog(log));
+    HistoryCursor cursor(history, true);
+    for (char const* time : {"2025-03-02 23:50:00", "2025-03-03 23:55:00", "2025-03-03 23:58:00"}) {
+        QVERIFY(cursor.Next());
+        QCOMPARE(cursor.time(), KeyOf(time));
+    }
+    QVERIFY(!cursor.Next());
+}
+
+// Among others, it is where its file was last written.
+void tst_LogHistory::logWithoutTimes()
+{
+    const QString log = m_folder.filePath("plain.log");
+    for (char const* text : {"x\ny\n", "x\n2025-03-03 09:00:00.001 Trace a\n"}) {
+        QVERIFY(TestFiles::write(log, text));
+        QVERIFY(SetModified(log, "2025-03-03 10:00:00"));
+        LogHistory history;
+        QVERIFY(history.ReadLog(log));
+        HistoryCursor cursor(history, true);
+        QVERIFY(cursor.Next());
+        QCOMPARE(cursor.key(), QByteArray(text).contains("Trace") ? KeyOf("2025-03-03 09:00:00") + 1
+                                                                  : KeyOf("2025-03-03 10:00:00"));
+    }
+}
+
+void tst_LogHistory::runWithoutTimes()
+{
+    const QString log = m_folder.filePath("partly.log");
+    QVERIFY(TestFiles::write(log + ".1", "2025-03-03 09:00:00.001 Trace a\n"));
+    QVERIFY(TestFiles::write(log, "x\n"));
+    LogHistory history;
+    QVERIFY(history.ReadLog(log));
+    HistoryCursor cursor(history, true);
+    QVERIFY(cursor.Next());
+    QCOMPARE(cursor.time(), KeyOf("2025-03-03 09:00:00") + 1);
+    QVERIFY(cursor.Next());
+    QCOMPARE(cursor.time(), qint64(-1));
+    QVERIFY(!cursor.Next());
+}
+
+void tst_LogHistory::overwrittenStamps()
+{
+    const QString log = m_folder.filePath("stamps.log");
+    const QByteArray first = "2025-03-03 09:00:00.001 Trace a\n";
+    const QByteArray second = "2025-03-03 10:00:00.001 Trace b\n";
+    QVERIFY(TestFiles::write(log, "torn\n" + first + second));
+    LogHistory history;
+    QVERIFY(history.ReadLog(log));
+    QVERIFY(
+        TestFiles::writeOver(log, "torn\n" + QByteArray(first.size() - 1, 'x') + '\n' + second));
+    HistoryCursor cursor(history, true);
+    QVERIFY(cursor.Next());
+    QCOMPARE(cursor.time(), KeyOf("2025-03-03 10:00:00") + 1);
+    history.ReadTimes();
+    QCOMPARE(history.runs()[0].start, KeyOf("2025-03-03 10:00:00") + 1);
+}
+
+void tst_LogHistory::opensAgain()
+{
+    const QString log = m_folder.filePath("one.log");
+    QVERIFY(TestFiles::write(log, "z"));
+    HistoryFile file;
+    QVERIFY(!file.Open(m_folder.filePath("none.log")));
+    QVERIFY(file.Open(log));
+    for (int time = 0; time < 2; ++time) {
+        QVERIFY(file.Read(LogLineParser(), LogFilter()));
+        QCOMPARE(file.rows().lines().size(), size_t(1));
+        QCOMPARE(file.error(), QString());
+    }
+}
+
+// Another history may read what this one has opened.
+void tst_LogHistory::shares()
+{
+    const QString log = m_folder.filePath("shared.log");
+    QVERIFY(TestFiles::write(log, "a\nb\n"));
+    HistoryFile file;
+    QVERIFY(!file.isOpen());
+    QVERIFY(file.Open(log));
+    QVERIFY(file.isOpen());
+    HistoryFile other;
+    other.Share(file);
+    QCOMPARE(other.path(), log);
+    QCOMPARE(other.file(), file.file());
+    file.file()->close();
+    QVERIFY(!other.isOpen());
+}
+
+void tst_LogHistory::placesOfLines()
+{
+    const QString log = m_folder.filePath("places.log");
+    QVERIFY(TestFiles::write(log, "2025-03-03 09:00:00.001 Trace a\nmore\n"));
+    LogHistory history;
+    QVERIFY(history.ReadLog(log));
+    HistoryCursor cursor(history, false);
+    QVERIFY(cursor.Next());
+    QCOMPARE(cursor.start(), qint64(0));
+    QCOMPARE(cursor.end(), qint64(32));
+    QVERIFY(cursor.mark() & LogRows::Timed);
+    QVERIFY(cursor.Next());
+    QCOMPARE(cursor.start(), qint64(32));
+    QCOMPARE(cursor.end(), qint64(37));
+    QVERIFY(!(cursor.mark() & LogRows::Timed));
+    QVERIFY(cursor.mark() & LogRows::Continued);
 }
 
 void tst_LogHistory::wideCharacters()

@@ -48,6 +48,15 @@ void tst_MessagePattern::pattern_data()
     row("digits at the end of a word and of a sentence", "see g4.", "see g#.");
     row("digits in a word, before a separator", "see g4.x", "see g#.x");
     row("digits in a word", "utf8 id42x", "utf# id#x");
+    row("number before a colon", "line 5: x", "line #: x");
+    row("number with a unit", "12g of it", "#g of it");
+    row("two numbers with a letter between", "8x86 pixels", "#x# pixels");
+    row("address of one digit", "at 0xa", "at #");
+    row("letter between digits of a word", "v1x2 on", "v#x# on");
+    row("version at the end", "lib v1.2", "lib v#");
+    row("shortest hash", "commit abcde1", "commit #");
+    row("shorter than a hash", "commit abcd1", "commit abcd#");
+    row("apostrophe before quotes", "the user's 'disk'", "the user's '…'");
     row("double quotes", "cannot read \"a b.txt\" now", "cannot read \"…\" now");
     row("single quotes", "user 'ada'", "user '…'");
     row("backquotes", "run `ls -l`", "run `…`");

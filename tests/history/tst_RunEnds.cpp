@@ -13,6 +13,7 @@
 
 #include <fcntl.h>
 #include <sys/file.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 using namespace Velocor;
@@ -22,6 +23,22 @@ namespace {
 QStringList Words(QString const& text)
 {
     return text.isEmpty() ? QStringList() : text.split(' ');
+}
+
+const QString Letters = QStringLiteral("UNAR"); // of the exits
+
+// Of texts such as "10000-20001N 30000-40001A".
+std::vector<RunEnd> Ends(QString const& texts)
+{
+    std::vector<RunEnd> ends;
+    for (QString const& text : Words(texts)) {
+        RunEnd end;
+        end.start = text.section('-', 0, 0).toLongLong();
+        end.end = text.section('-', 1).chopped(1).toLongLong();
+        end.exit = static_cast<HistoryRun::Exit>(Letters.indexOf(text.right(1)));
+        ends.push_back(end);
+    }
+    return ends;
 }
 
 } // namespace
@@ -36,6 +53,9 @@ private slots:
     void damagedRecords();
     void recordsAndMarks();
     void noRecords();
+    void copiedMark();
+    void shortRuns_data();
+    void shortRuns();
 };
 
 void tst_RunEnds::assigned_data()
@@ -61,6 +81,8 @@ void tst_RunEnds::assigned_data()
     row("each its own", "10000-20001N 30000-40001A", "10001 30001", "NA");
     row("run without a mark between", "10000-20001N 30000-40001A", "10001 25001 30001", "NUA");
     row("run without a mark after a killed one", "10000-40001A", "10001 25001", "AU");
+    row("run without a mark after one with its start", "10001-40001A", "10001 25001", "AU");
+    row("at the first moment of all", "0-5N", "0", "N");
     row("in two parts, because a clock was set back", "10000-40001N", "10001 25001", "NN");
     row("later one overwrote the start", "10000-20001N 30000-40001A", "15001c 30001", "NA");
     row("two at once, both normal", "10000-90001N 30000-80001N", "31001c", "N");
@@ -78,15 +100,6 @@ void tst_RunEnds::assigned()
 {
     QFETCH(QString, ends);
     QFETCH(QString, runs);
-    const QString letters = "UNAR";
-    std::vector<RunEnd> known;
-    for (QString const& text : Words(ends)) {
-        RunEnd end;
-        end.start = text.section('-', 0, 0).toLongLong();
-        end.end = text.section('-', 1).chopped(1).toLongLong();
-        end.exit = static_cast<HistoryRun::Exit>(letters.indexOf(text.right(1)));
-        known.push_back(end);
-    }
     std::vector<HistoryRun> all;
     for (QString const& text : runs.split(' ')) {
         HistoryRun run;
@@ -94,10 +107,10 @@ void tst_RunEnds::assigned()
         run.start = QString(text).remove('c').toLongLong();
         all.push_back(run);
     }
-    RunEnds::Assign(known, all);
+    RunEnds::Assign(Ends(ends), all);
     QString found;
     for (HistoryRun const& run : all)
-        found += letters.at(run.exit);
+        found += Letters.at(run.exit);
     QTEST(found, "expected");
 }
 
@@ -168,6 +181,58 @@ void tst_RunEnds::noRecords()
     QVERIFY(QDir().mkpath(RunEnds::RecordFileOf(log)));
     QCOMPARE(RunEnds::Of(log).size(), size_t(0));
     QCOMPARE(RunEnds::MarkFolderOf(folder.filePath("app.log")), QString());
+}
+
+// It tells nothing, and neither does a pipe instead of the records.
+void tst_RunEnds::copiedMark()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("logs/app.log");
+    const QString mark = RunEnds::MarkFolderOf(log) + "/1-1.run";
+    const qint64 start = qint64(740000) * 24 * 60 * 60 * 1000;
+    QCOMPARE(::mkfifo(QFile::encodeName(RunEnds::RecordFileOf(log)).constData(), 0600), 0);
+    QVERIFY(TestFiles::write(mark, ""));
+    QFile file(mark);
+    QVERIFY(file.open(QIODevice::WriteOnly | QIODevice::Unbuffered));
+    QVERIFY(file.write(RunMarkFile::TextFor(start, file.handle())) > 0);
+    file.close();
+    std::vector<RunEnd> ends = RunEnds::Of(log);
+    QCOMPARE(ends.size(), size_t(1));
+    QCOMPARE(ends[0].start, start);
+    QCOMPARE(ends[0].exit, HistoryRun::Abnormal);
+
+    QVERIFY(QFile::copy(mark, RunEnds::MarkFolderOf(log) + "/2-2.run"));
+    QVERIFY(QFile::remove(mark));
+    QCOMPARE(RunEnds::Of(log).size(), size_t(0));
+}
+
+void tst_RunEnds::shortRuns_data()
+{
+    QTest::addColumn<QString>("ends");
+    QTest::addColumn<int>("start");
+    QTest::addColumn<int>("expected");
+    const auto row = [](char const* name, char const* ends, int start, int expected) {
+        QTest::newRow(name) << QString(ends) << start << expected;
+    };
+    row("nothing known", "", 50000, 0);
+    row("killed", "1000-2000A", 50000, 1);
+    row("as long as a short one may be", "1000-11000A", 50000, 1);
+    row("longer", "1000-11001A", 50000, 0);
+    row("ended normally", "1000-2000N", 50000, 0);
+    row("before a normal one", "1000-2000A 3000-4000N", 50000, 0);
+    row("after a normal one", "3000-4000A 1000-2000N", 50000, 1);
+    row("in any order", "5000-5001A 1000-1001A 3000-3001N 7000-7001A", 50000, 2);
+    row("this run", "1000-2000A", 1000, 0);
+    row("a later one", "6000-7000A", 5000, 0);
+    row("beside one that is running", "1000-2000A 3000-9000R", 50000, 1);
+    row("killed right after it ended normally", "1000-2000A 1000-2000N", 50000, 0);
+}
+
+void tst_RunEnds::shortRuns()
+{
+    QFETCH(QString, ends);
+    QFETCH(int, start);
+    QTEST(RunEnds::ShortRunsBefore(Ends(ends), start), "expected");
 }
 
 QTEST_GUILESS_MAIN(tst_RunEnds)

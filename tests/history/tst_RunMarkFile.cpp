@@ -12,6 +12,7 @@
 #include <QtTest>
 
 #include <fcntl.h>
+#include <sched.h>
 #include <sys/file.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -56,6 +57,8 @@ private slots:
     void changedTexts();
     void noMarks();
     void names();
+    void nameOfTheComputer();
+    void descriptors();
 
 private:
     QTemporaryDir m_folder;
@@ -151,6 +154,31 @@ void tst_RunMarkFile::names()
     QCOMPARE(RunMarkFile::NamesIn(folder.path()), QStringList({"a.run", "b.run"}));
     QCOMPARE(RunMarkFile::NamesIn(folder.filePath("none")), QStringList());
     QCOMPARE(RunMarkFile::NameFor(7), QString("7-%1.run").arg(QCoreApplication::applicationPid()));
+}
+
+void tst_RunMarkFile::nameOfTheComputer()
+{
+    if (::unshare(CLONE_NEWUTS) != 0 || ::sethostname("my lab-7", 8) != 0)
+        QSKIP("only the administrator can give this process another name of the computer");
+    Mark mark(m_path);
+    QVERIFY2(mark.Text().endsWith(" my-lab-7\n"), mark.Text());
+    QVERIFY(mark.Write(mark.Text()));
+    QCOMPARE(RunMarkFile(m_path).state(), RunMarkFile::LeftBehind);
+}
+
+// Also of a program that has no standard input, so that the file gets its number.
+void tst_RunMarkFile::descriptors()
+{
+    Mark mark(m_path);
+    QVERIFY(mark.Write(mark.Text()));
+    const int input = ::dup(0);
+    ::close(0);
+    const RunMarkFile read(m_path);
+    const int free = ::open("/dev/null", O_RDONLY);
+    ::dup2(input, 0);
+    ::close(input);
+    QCOMPARE(read.state(), RunMarkFile::LeftBehind);
+    QCOMPARE(free, 0); // again: the mark is closed
 }
 
 QTEST_GUILESS_MAIN(tst_RunMarkFile)

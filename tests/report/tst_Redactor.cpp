@@ -4,7 +4,12 @@
 #include "app/report/OwnNames.h"
 #include "app/report/Redactor.h"
 
+#include <QTemporaryDir>
 #include <QtTest>
+
+#include <pwd.h>
+#include <sched.h>
+#include <unistd.h>
 
 using namespace Velocor;
 
@@ -20,13 +25,28 @@ private slots:
     void sameSecretSamePlaceholder();
     void shownAgain();
     void words();
+    void wordsReplaceOthers();
     void places();
+    void overlapping_data();
+    void overlapping();
+    void spellings_data();
+    void spellings();
+    void knownTwice();
+    void endlessLine();
     void keyBlocks_data();
     void keyBlocks();
     void longLines();
     void secretNames_data();
     void secretNames();
     void namesOfThisComputer();
+    void ownHome_data();
+    void ownHome();
+    void linkedHome();
+    void fullNames_data();
+    void fullNames();
+    void account();
+    void hostNames_data();
+    void hostNames();
 };
 
 void tst_Redactor::redacts_data()
@@ -49,6 +69,8 @@ void tst_Redactor::redacts_data()
         "<address-1>, [<address-2>%eth0]:80, addr:<address-3>.");
     row("IPv6 with IPv4", "::ffff:10.0.0.7 64:ff9b::192.0.2.33", "<address-1> <address-2>");
     row("no IPv6", "14:03:02 std::vector a::b face::dead() ::x 12:30:00.007");
+    row("IPv6 without digits", "fe::dead:beef", "<address-1>");
+    row("too many groups", "1:2:3:4::5:6:7:8");
     row("MAC", "52:54:00:AB:cd:01, 52-54-00-ab-cd-02, 5254.00ab.cd03",
         "<hardware-1>, <hardware-2>, <hardware-3>");
     row("no MAC", "00:00:00:00:00:00 ff:ff:ff:ff:ff:ff 2026-11-22-14-03-02");
@@ -63,6 +85,8 @@ void tst_Redactor::redacts_data()
         "<token-1> <token-2>");
     row("token", "token=7f3a9c1e, \"api_key\": \"Zx81Qw\\/Rt5\"",
         "token=<token-1>, \"api_key\": \"<token-2>\"");
+    row("longest word", "token=abcdefghijklmnopqrst");
+    row("longer than a word", "token=abcdefghijklmnopqrstu", "token=<token-1>");
     row("token as an element", "<accessToken>a81f9c3e77</accessToken>",
         "<accessToken><token-1></accessToken>");
     row("authorization", "Authorization: Bearer abc", "Authorization: Bearer <token-1>");
@@ -140,7 +164,9 @@ void tst_Redactor::sameSecretSamePlaceholder()
              QString("<user-1> <mail-1> <mail-2> <hardware-1>"));
     QCOMPARE(redactor.Redact("c@x.org B@X.ORG a%40x.org 52-54-00-AB-CD-01 ada").text,
              QString("<mail-3> <mail-2> <mail-1> <hardware-1> <user-1>"));
-    QCOMPARE(redactor.count(), 5);
+    QCOMPARE(redactor.Redact("5254.00ab.cd01 /home/ada/x %2Fhome%2Fada").text,
+             QString("<hardware-1> <home-1>/x <home-1>"));
+    QCOMPARE(redactor.count(), 6);
     QCOMPARE(redactor.Original(1), QString("a@x.org"));
     QCOMPARE(redactor.Placeholder(1), QString("<mail-1>"));
     QCOMPARE(int(redactor.Kind(1)), int(SecretKind::MailAddress));
@@ -174,6 +200,18 @@ void tst_Redactor::words()
     QCOMPARE(redactor.Redact("a+b blue moon").text, QString("a+b blue moon"));
 }
 
+// Those of before are neither found nor remembered as spellings of others.
+void tst_Redactor::wordsReplaceOthers()
+{
+    Redactor redactor;
+    redactor.SetWords({"R&"});
+    QCOMPARE(redactor.Redact("R&amp;x R&").text, QString("<word-1>x <word-1>"));
+    redactor.SetWords({"R&amp;"});
+    QCOMPARE(redactor.Redact("R&amp; R&").text, QString("<word-2> R&"));
+    redactor.SetWords({"ab"});
+    QCOMPARE(redactor.Redact("ab R&amp;").text, QString("<word-3> R&amp;"));
+}
+
 // Where two overlap, both are replaced as one.
 void tst_Redactor::places()
 {
@@ -187,6 +225,90 @@ void tst_Redactor::places()
     for (Redactor::Place const& place : text.places)
         placed.append(text.text.mid(place.start, place.length));
     QCOMPARE(placed, QStringList({"<mail-1>", "<home-1>", "<user-1>"}));
+}
+
+void tst_Redactor::overlapping_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QString>("expected");
+    QTest::newRow("neighbors") << "onetwo"
+                               << "<word-1><word-2>";
+    QTest::newRow("the first is longer") << "bob@y.org/x"
+                                         << "<mail-1>";
+    QTest::newRow("equally long, the first counts") << "ab-cd-ef"
+                                                    << "<word-1>";
+    QTest::newRow("equally long, the second counts") << "ef-cd-ef-gh"
+                                                     << "<word-1>";
+}
+
+void tst_Redactor::overlapping()
+{
+    QFETCH(QString, text);
+    Redactor redactor;
+    redactor.AddSecret(SecretKind::UserName, "cd-ef");
+    redactor.AddSecret(SecretKind::UserName, "ef-cd");
+    redactor.SetWords({"one", "two", "org/x", "ab-cd", "ef-gh", "cd-ef-gh"});
+    QTEST(redactor.Redact(text).text, "expected");
+}
+
+void tst_Redactor::spellings_data()
+{
+    QTest::addColumn<QString>("secret");
+    QTest::addColumn<QString>("text");
+    QTest::newRow("blank in a settings file") << QString::fromUtf8("ö x") << "\\u00f6\\u0020x";
+    QTest::newRow("first and last character that a settings file has")
+        << QString::fromUtf8("ö!~") << "\\u00f6!~";
+    QTest::newRow("character that a settings file lacks") << QString(QChar(0x7f)) + "x"
+                                                          << "\\u007fx";
+    QTest::newRow("backslash in JSON") << "LAB\\ada"
+                                       << "LAB\\\\ada";
+    QTest::newRow("two letters") << "jo"
+                                 << "jo";
+}
+
+void tst_Redactor::spellings()
+{
+    QFETCH(QString, secret);
+    QFETCH(QString, text);
+    Redactor redactor;
+    redactor.AddSecret(SecretKind::UserName, secret);
+    QCOMPARE(redactor.Redact(text).text, QString("<user-1>"));
+}
+
+// Once as something else or in any case.
+void tst_Redactor::knownTwice()
+{
+    Redactor redactor;
+    redactor.AddSecret(SecretKind::HostName, "ada");
+    redactor.AddSecret(SecretKind::UserName, "ada");
+    redactor.AddSecret(SecretKind::FullName, "Will", true);
+    redactor.AddSecret(SecretKind::FullName, "Will");
+    redactor.AddSecret(SecretKind::HomeFolder, "/srv/ada");
+    QCOMPARE(redactor.Redact("ada will /srv/ada").text, QString("<user-1> <name-1> <home>"));
+}
+
+// From the last match on, lines that a search cannot get through are secrets as a whole.
+void tst_Redactor::endlessLine()
+{
+    const QString endless = QString(100, 'a') + "c\n";
+    const QString text = "x ok\n" + endless + "ok\nx";
+    std::vector<SecretFinder::Place> places;
+    SecretFinder::FindMatches(text, QRegularExpression("(?:a+)+b|x"), SecretKind::Token, nullptr,
+                              places);
+    QStringList found;
+    for (SecretFinder::Place const& place : places)
+        found.append(text.mid(place.start, place.length));
+    QCOMPARE(found, QStringList({"x", " ok\n", endless, "x"}));
+    places.clear();
+    SecretFinder::FindMatches("\n" + endless + "x", QRegularExpression("(?:a+)+b|x"),
+                              SecretKind::Token, nullptr, places);
+    QCOMPARE(places.size(), size_t(3));
+    QCOMPARE(places[0].length, 1);
+    places.clear();
+    SecretFinder::FindMatches(endless.trimmed(), QRegularExpression("(?:a+)+b|x"),
+                              SecretKind::Token, nullptr, places);
+    QCOMPARE(places.size(), size_t(1));
+    QCOMPARE(places[0].length, int(endless.size()) - 1);
 }
 
 void tst_Redactor::keyBlocks_data()
@@ -207,6 +329,9 @@ void tst_Redactor::keyBlocks_data()
         "<key-1>\nc\n<key-2>");
     row("without its beginning", line + "\n" + line.toLower() + "\nb",
         qPrintable("<key-1>\n" + line.toLower() + "\nb"));
+    const QString longest(64 * 1024 - end.size(), '.');
+    row("longest", begin + longest + end, "<key-1>");
+    row("too long", begin + longest + "." + end, qPrintable("<key-1>" + longest + "." + end));
     row("public", "-----BEGIN PUBLIC KEY-----\nx", "-----BEGIN PUBLIC KEY-----\nx");
 }
 
@@ -247,13 +372,137 @@ void tst_Redactor::secretNames()
 
 void tst_Redactor::namesOfThisComputer()
 {
+    qputenv("HOME", "/srv/home folder");
     qputenv("USER", "quentin");
     qputenv("LOGNAME", "root");
+    qputenv("SUDO_USER", "ada");
     Redactor redactor;
     OwnNames::AddTo(redactor);
-    QCOMPARE(redactor.Redact("quentin root").text, QString("<user-1> root"));
-    QCOMPARE(redactor.Redact(QDir::homePath() + "/x").text, QString("<home>/x"));
+    QCOMPARE(redactor.Redact("quentin root ada").text, QString("<user-1> root <user-2>"));
+    QCOMPARE(redactor.Redact("/srv/home folder/x").text, QString("<home>/x"));
     QVERIFY(OwnNames::IsCommon("Localhost") && !OwnNames::IsCommon("lab7"));
+}
+
+void tst_Redactor::ownHome_data()
+{
+    QTest::addColumn<QString>("home");
+    QTest::addColumn<QString>("expected"); // of a file in it
+    QTest::newRow("a user's") << "/srv/ada"
+                              << "<home>/x";
+    QTest::newRow("a service's") << "/srv"
+                                 << "/srv/x";
+    QTest::newRow("none") << "/"
+                          << "//x";
+}
+
+void tst_Redactor::ownHome()
+{
+    QFETCH(QString, home);
+    qputenv("HOME", QFile::encodeName(home));
+    Redactor redactor;
+    OwnNames::AddTo(redactor);
+    QTEST(redactor.Redact(home + "/x").text, "expected");
+}
+
+void tst_Redactor::linkedHome()
+{
+    const QTemporaryDir folder;
+    const QString real = QFileInfo(folder.path()).canonicalFilePath() + "/real";
+    QVERIFY(QDir().mkpath(real));
+    QVERIFY(QFile::link(real, folder.filePath("link")));
+    qputenv("HOME", QFile::encodeName(folder.filePath("link")));
+    Redactor redactor;
+    OwnNames::AddTo(redactor);
+    QCOMPARE(redactor.Redact(folder.filePath("link/x")).text, QString("<home>/x"));
+    QCOMPARE(redactor.Redact(real + "/x").text, QString("<home-1>/x"));
+}
+
+void tst_Redactor::fullNames_data()
+{
+    QTest::addColumn<QString>("entry");
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QString>("expected");
+    const auto row = [](char const* name, char const* entry, char const* text,
+                        char const* expected) {
+        QTest::newRow(name) << QString(entry) << QString(text) << QString(expected);
+    };
+    row("whole", "Ada Lovelace,Room 5", "ada lovelace", "<name-1>");
+    row("parts", "Ada Lovelace,Room 5", "Lovelace, Ada", "<name-1>, <name-2>");
+    row("parts in another case", "Will Root", "will root", "<name-1>");
+    row("a part in another case", "Will Lovelace", "will", "will");
+    row("a short part", "Jo Lovelace", "Jo Lovelace Jo", "<name-1> Jo");
+    row("a part that many have", "Guest Lovelace", "Guest", "Guest");
+    row("one that many have", "root", "root", "root");
+    row("what is not the name", "Ada Lovelace,Room 5", "Room 5", "Room 5");
+    row("with spaces around it", " Ada Lovelace ,", "Ada Lovelace", "<name-1>");
+}
+
+void tst_Redactor::fullNames()
+{
+    QFETCH(QString, entry);
+    QFETCH(QString, text);
+    Redactor redactor;
+    OwnNames::AddFullName(redactor, entry);
+    QTEST(redactor.Redact(text).text, "expected");
+}
+
+// Of a user who is in no variable.
+void tst_Redactor::account()
+{
+    if (geteuid() != 0)
+        QSKIP("only the administrator can become another user");
+    passwd const* found = nullptr;
+    setpwent();
+    do
+        found = getpwent();
+    while (found && (found->pw_uid == 0 || OwnNames::IsCommon(found->pw_name) ||
+                     QByteArray(found->pw_gecos).size() < 3 ||
+                     QByteArray(found->pw_gecos).startsWith(found->pw_name) ||
+                     QByteArray(found->pw_dir) == "/"));
+    if (!found)
+        QSKIP("there is no other user");
+    const uid_t uid = found->pw_uid;
+    const QString user = found->pw_name;
+    const QString name = QString::fromUtf8(found->pw_gecos).section(',', 0, 0);
+    endpwent();
+
+    for (char const* variable : {"USER", "LOGNAME", "SUDO_USER"})
+        qunsetenv(variable);
+    qputenv("HOME", "/");
+    Redactor redactor;
+    QCOMPARE(setreuid(uid, uid_t(-1)), 0);
+    OwnNames::AddTo(redactor);
+    QCOMPARE(setreuid(0, uid_t(-1)), 0);
+    QCOMPARE(redactor.Redact(user + "!").text, QString("<user-1>!"));
+    QCOMPARE(redactor.Redact(name + "!").text, QString("<name-1>!"));
+    OwnNames::AddTo(redactor);
+    passwd const* root = getpwuid(0);
+    if (root && QByteArray(root->pw_dir) != "/")
+        QVERIFY(redactor.Redact(QString(root->pw_dir) + "/x").text.startsWith("<home"));
+}
+
+void tst_Redactor::hostNames_data()
+{
+    QTest::addColumn<QByteArray>("host");
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QString>("expected");
+    QTest::newRow("short") << QByteArray("lab7") << "lab7: x"
+                           << "<host-1>: x";
+    QTest::newRow("in a domain") << QByteArray("lab7.x.org") << "lab7: lab7.x.org, x.org"
+                                 << "<host-1>: <host-2>, x.org";
+    QTest::newRow("one that many have") << QByteArray("localhost") << "localhost"
+                                        << "localhost";
+}
+
+void tst_Redactor::hostNames()
+{
+    QFETCH(QByteArray, host);
+    QFETCH(QString, text);
+    if (unshare(CLONE_NEWUTS) != 0 || sethostname(host.constData(), size_t(host.size())) != 0)
+        QSKIP("only the administrator can give this process another name of the computer");
+    Redactor redactor;
+    OwnNames::AddTo(redactor);
+    QTEST(redactor.Redact(text).text, "expected");
 }
 
 QTEST_GUILESS_MAIN(tst_Redactor)

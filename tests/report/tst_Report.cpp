@@ -73,6 +73,14 @@ private slots:
     void endOfAbnormalRun();
     void longRun();
     void noLog();
+    void entriesOfManyLines();
+    void longEntries();
+    void manyEntries();
+    void gapBetweenRuns();
+    void unreadableFile();
+    void logWithoutTimes();
+    void longSettings();
+    void versionsAndPlaces();
     void savedFolder();
     void savedArchive();
     void codeBlocks();
@@ -94,15 +102,26 @@ void tst_Report::archive()
     reader.start(
         "python3",
         {"-c",
-         "import sys, zipfile\n"
+         "import struct, sys, zipfile, zlib\n"
          "archive = zipfile.ZipFile(sys.argv[1])\n"
          "assert archive.testzip() is None\n"
          "for name in archive.namelist():\n"
-         "    print(ascii(name), len(archive.read(name)), sorted(set(archive.read(name))))\n",
+         "    print(ascii(name), len(archive.read(name)), sorted(set(archive.read(name))))\n"
+         "bytes = open(sys.argv[1], 'rb').read()\n"
+         "for file in archive.infolist():\n"
+         "    assert file.date_time == (1980, 1, 1, 0, 0, 0), file.date_time\n"
+         "    assert (file.volume, file.internal_attr, file.external_attr) == (0, 0, 0)\n"
+         "    start = file.header_offset + 30 + len(file.filename.encode())\n"
+         "    data = bytes[start:start + file.compress_size]\n"
+         "    inflate = zlib.decompressobj(-15)\n"
+         "    inflate.decompress(data)\n"
+         "    assert inflate.eof and not inflate.unused_data, file\n"
+         "end = struct.unpack('<LHHHHLLH', bytes[-22:])\n"
+         "assert end[1:5] == (0, 0, 3, 3) and end[7] == 0, end\n",
          folder.filePath("a.zip")});
     QVERIFY(reader.waitForFinished(60000));
     QCOMPARE(
-        QString(reader.readAllStandardOutput()),
+        QString(reader.readAllStandardOutput() + reader.readAllStandardError()),
         QString("'report.md' 5 [10, 101, 116, 120]\n'\\xf6/empty' 0 []\n'zeros' 100000 [0]\n"));
 }
 
@@ -204,6 +223,7 @@ void tst_Report::runs()
                              "2026-11-20T07:59:59.000 2026-11-20T08:30:00.000 abnormal\n"
                              "2026-11-20T08:59:59.000 2026-11-20T09:30:00.000 normal\n"));
     const ReportPart part = ReportReader::Log(log).at(0);
+    QCOMPARE(part.title, QString("This run and the one before"));
     QCOMPARE(part.text,
              QString("The last run (last-run.log): from 2026-11-20T09:00:00.001 to "
                      "2026-11-20T09:00:02.001, 3 lines, problems: 0; it ended normally\n"
@@ -231,7 +251,9 @@ void tst_Report::endOfAbnormalRun()
     QVERIFY(TestFiles::write(records,
                              first + "2026-11-20T07:59:59.000 2026-11-20T08:30:00.000 abnormal\n"));
     QCOMPARE(ReportReader::EndOfAbnormalRun(log), QString(Run(8, 4, {})));
-    QVERIFY(QFile::remove(records) && QFile::remove(log + ".1") && QFile::remove(log + ".2"));
+    QVERIFY(QFile::remove(records) && QFile::remove(log + ".2"));
+    QCOMPARE(ReportReader::EndOfAbnormalRun(log), QString(Run(8, 4, {})));
+    QVERIFY(QFile::remove(log + ".1"));
     QCOMPARE(ReportReader::EndOfAbnormalRun(log), QString());
     QCOMPARE(ReportReader::EndOfAbnormalRun(folder.filePath("logs/none.log")), QString());
 }
@@ -255,6 +277,107 @@ void tst_Report::noLog()
     QCOMPARE(ReportReader::Log("").at(0).text, QString("The log is empty.\n"));
     QCOMPARE(ReportReader::Log("").at(0).files.size(), 0);
     QCOMPARE(ReportReader::Log("").at(1).text, QString("None.\n"));
+}
+
+// However many lines they have, they count once; what another run left belongs to none.
+void tst_Report::entriesOfManyLines()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("app.log");
+    const QByteArray lines = QByteArray("more\n").repeated(2 * ReportReader::EntriesAround);
+    QVERIFY(TestFiles::write(log, Run(8, 1, {0}) + lines + Run(9, 100, {})));
+    QCOMPARE(ReportReader::Log(log).at(1).text,
+             QString(Run(8, 1, {0}) + lines + Run(9, ReportReader::EntriesAround, {})));
+
+    QVERIFY(TestFiles::write(log + ".1", Run(7, 3, {2})));
+    QVERIFY(TestFiles::write(log, "torn\n" + Run(9, 3, {})));
+    QCOMPARE(ReportReader::Log(log).at(1).text, QString(Run(7, 3, {2})));
+}
+
+// Lines are added to an entry until it is long.
+void tst_Report::longEntries()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("app.log");
+    const QByteArray start = "2026-11-20 12:00:00.001 Error ";
+    const auto problems = [&](int length) { // of an entry with this line
+        const QByteArray line = start + QByteArray(length - start.size(), 'x');
+        TestFiles::write(log, line + "\nmore\n");
+        return ReportReader::Log(log).at(1).text;
+    };
+    const int limit = ReportReader::LineLimit;
+    QCOMPARE(problems(limit - 2).right(7), QString("x\nmore\n"));
+    QCOMPARE(problems(limit - 1).right(3), QString("xx\n"));
+    QCOMPARE(problems(limit).right(3), QString("xx\n"));
+    QCOMPARE(problems(limit + 1).right(3), QString("x") + QChar(0x2026) + '\n');
+}
+
+void tst_Report::manyEntries()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("app.log");
+    const QByteArray problem = "2026-11-20 09:00:00.001 Error x\n";
+    const QByteArray others = QByteArray("2026-11-20 09:00:00.001 Trace x\n").repeated(99999);
+    QVERIFY(TestFiles::write(log, problem + others));
+    QVERIFY(ReportReader::Log(log).at(1).text.startsWith(problem));
+    QVERIFY(TestFiles::write(log, problem + problem.left(24) + "Trace x\n" + others));
+    QCOMPARE(ReportReader::Log(log).at(1).text, QString("None.\n"));
+}
+
+void tst_Report::gapBetweenRuns()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("app.log");
+    QVERIFY(TestFiles::write(log + ".1", Run(7, 1, {0})));
+    QVERIFY(TestFiles::write(log, Run(9, 1, {0})));
+    QCOMPARE(ReportReader::Log(log).at(1).text, QString(Run(7, 1, {0}) + "...\n" + Run(9, 1, {0})));
+}
+
+void tst_Report::unreadableFile()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("app.log");
+    QVERIFY(TestFiles::write(log + ".1", QByteArray("\x1f\x8b\x08\0", 4)));
+    QVERIFY(TestFiles::write(log, Run(9, 1, {})));
+    const QString text = ReportReader::Log(log).at(0).text;
+    QVERIFY2(text.contains("\n" + log + ".1: "), qPrintable(text));
+    QVERIFY2(text.endsWith("velocor-log -\n"), qPrintable(text));
+}
+
+void tst_Report::logWithoutTimes()
+{
+    const QTemporaryDir folder;
+    const QString log = folder.filePath("app.log");
+    QVERIFY(TestFiles::write(log, "x\n"));
+    const QString text = ReportReader::Log(log).at(0).text;
+    QVERIFY2(text.contains("from unknown to unknown, 1 lines"), qPrintable(text));
+}
+
+void tst_Report::longSettings()
+{
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("a.cfg");
+    const int most = ReportReader::MaximumFileSize;
+    for (int size : {most, most + 1}) {
+        QVERIFY(TestFiles::write(path, QByteArray(size, 'x')));
+        QCOMPARE(ReportReader::Settings("T", {path}).files[0].text.size(), most);
+    }
+}
+
+void tst_Report::versionsAndPlaces()
+{
+    const QStringList versions = ReportReader::Versions().split('\n');
+    QCOMPARE(versions.size(), 9); // the last one is empty
+    QVERIFY(versions[0].startsWith("Program: Velocor "));
+    QCOMPARE(versions[2], QString("Running with Qt: ") + qVersion());
+
+    const QTemporaryDir folder;
+    QCoreApplication* app = QCoreApplication::instance();
+    app->setProperty("RootPath", folder.path());
+    app->setProperty("DataPath", folder.filePath("none"));
+    const QStringList places = ReportReader::Places().split('\n');
+    QVERIFY(places.contains("Installation: " + folder.path()));
+    QVERIFY(places.contains("Data: " + folder.filePath("none") + " (does not exist)"));
 }
 
 void tst_Report::savedFolder()
