@@ -110,6 +110,7 @@ private slots:
     void onlyWhatIsShown();
     void allFiles();
     void withoutDates();
+    void linesWrittenOver();
     void stop();
     void closedWhileCounting();
     void emptyLog();
@@ -249,6 +250,26 @@ void tst_PatternsInWindow::withoutDates()
     });
     QCOMPARE(rows, QStringList({"3|Error|23:59:58.000|00:00:01.000|page #"}));
     QCOMPARE(Current(*window), QString("page 3"));
+}
+
+void tst_PatternsInWindow::linesWrittenOver()
+{
+    const WindowTest test("");
+    const QString path = test.folder() + "other.log";
+    const QByteArray first = "2025-03-03 09:00:01 [error] page 1\n";
+    TestFiles::write(path, first + "2025-03-03 09:00:02 [error] page 2\n");
+    const auto window = WindowTest::show({path});
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 2, Patience);
+    Panel(*window)->SetPaused(true);
+    TestFiles::writeOver(path, first + "2025-03-03 09:00:02 [error] text a\n");
+    QStringList rows;
+    InPatterns(*window, [&](QDialog* dialog) {
+        rows = Listed(List(dialog));
+        QTest::keyClick(dialog, Qt::Key_Escape);
+    });
+    QCOMPARE(rows.size(), 1);
+    QVERIFY(rows[0].startsWith("1|"));
+    QVERIFY(rows[0].endsWith("|page #"));
 }
 
 // Without a thread's luck: the counter is stopped before it has looked at a row.

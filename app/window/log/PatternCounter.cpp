@@ -7,6 +7,7 @@
 
 #include <QElapsedTimer>
 
+#include <algorithm>
 #include <utility>
 
 namespace Velocor {
@@ -15,6 +16,9 @@ namespace {
 
 constexpr int CountReportInterval = 300; // milliseconds
 constexpr size_t RowsBetweenChecks = 1024;
+
+// How far a row with a time is looked for.
+constexpr size_t MostRowsWithoutTime = 10 * 1000;
 
 } // namespace
 
@@ -40,24 +44,54 @@ void PatternCounter::Count()
             sinceReport.start();
         }
         const qint64 start = starts.start(row);
-        if (start < 0) {
-            m_time = -1; // a heading
-            continue;
+        const bool isHeading = start < 0;
+        // Of all earlier runs of one file, only the first has a heading.
+        if (isHeading || (m_rows->mark(row) & LogRows::Torn)) {
+            m_time = -1;
+            m_isAtStart = true;
         }
+        if (isHeading)
+            continue;
         const QByteArray line = reader.Line(start);
-        if (LogRows::CheckOf(line.constData(), line.size()) == m_rows->check(row))
-            add(patterns, line, start);
+        if (isThere(row, line))
+            add(patterns, row, line, start);
     }
     report(patterns, row);
 }
 
-void PatternCounter::add(PatternList& patterns, QByteArray const& line, qint64 start)
+bool PatternCounter::isThere(size_t row, QByteArray const& line) const
+{
+    return LogRows::CheckOf(line.constData(), line.size()) == m_rows->check(row);
+}
+
+// Of the first row of the run, from this one on, that has a time; -1 if there is none.
+qint64 PatternCounter::timeBelow(size_t row) const
+{
+    LogLineReader reader;
+    if (!reader.Open(m_source, m_parser.fileType()))
+        return -1;
+    const size_t end = std::min(m_rows->size(), row + MostRowsWithoutTime);
+    for (; row < end && !m_rows->isHeading(row); ++row) {
+        if (!(m_rows->mark(row) & LogRows::Timed))
+            continue;
+        const QByteArray line = reader.Line(m_rows->start(row));
+        const LogEntry entry = isThere(row, line) ? m_parser.Parse(line) : LogEntry();
+        if (entry.timeKey >= 0)
+            return HistoryClock(m_clock).Read(entry.timeKey, entry.hasDate);
+    }
+    return -1;
+}
+
+void PatternCounter::add(PatternList& patterns, size_t row, QByteArray const& line, qint64 start)
 {
     const LogEntry entry = m_parser.Parse(line);
     if (entry.timeKey >= 0) {
         m_time = m_clock.Read(entry.timeKey, entry.hasDate);
         m_isDated = m_isDated && entry.hasDate;
+    } else if (m_isAtStart) {
+        m_time = timeBelow(row);
     }
+    m_isAtStart = false;
     if (!entry.isEntry)
         return;
     patterns.Add(entry.severity, entry.message, m_time, start);

@@ -31,8 +31,8 @@ struct CountedPatterns
 /// Counts the messages of some rows by pattern, in its own thread and with its own file handle.
 ///
 /// The place of an entry is where its line starts. An entry without a time has that of the row
-/// above, unless another run begins between them. Lines that are no longer in the file, and those
-/// that continue an entry, do not count.
+/// above or, at the start of a run, of the next row that has one. Lines that are no longer in the
+/// file, and those that continue an entry, do not count.
 ///
 /// Stop() may be called from any thread, everything else only from the counter's.
 class PatternCounter : public QObject
@@ -54,7 +54,9 @@ Q_SIGNALS:
     void counted(std::shared_ptr<Velocor::CountedPatterns const> const& patterns);
 
 private:
-    void add(PatternList& patterns, QByteArray const& line, qint64 start);
+    bool isThere(size_t row, QByteArray const& line) const;
+    void add(PatternList& patterns, size_t row, QByteArray const& line, qint64 start);
+    qint64 timeBelow(size_t row) const;
     void report(PatternList const& patterns, size_t rows);
 
     LogSource m_source;
@@ -62,7 +64,9 @@ private:
     std::shared_ptr<LogRows const> m_rows;
     std::atomic<bool> m_isStopped{false};
     HistoryClock m_clock;
-    qint64 m_time = -1; // of the row above
+    qint64 m_time =
+        -1; // of the row above; of those before the first one of a run, the time of that
+    bool m_isAtStart = true; // of a run
     bool m_isDated = true;
     size_t m_entries = 0;
 };
