@@ -126,7 +126,7 @@ void tst_PlainPatternCounts::randomLogs()
     static const QStringList matches = {QString(), QString(), "L[0-9]*5",
                                         "mmm|cc",  "nowhere", "Error"};
     std::mt19937 random(Rounds::seed());
-    const int count = Rounds::count(30, 3000, 30000);
+    const int count = Rounds::count(30, 1000, 10000);
     while (m_lists < count) {
         const quint32 seed = random();
         const QString path = m_folder.filePath("program.log");

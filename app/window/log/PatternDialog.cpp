@@ -46,6 +46,9 @@ PatternDialog::PatternDialog(LogModel const& model, QWidget* parent)
 
 PatternDialog::~PatternDialog()
 {
+    // The list would still tell that its model and its rows are gone.
+    m_list->selectionModel()->disconnect(this);
+    m_patterns->disconnect(this);
     m_counter->Stop();
     m_thread.quit();
     m_thread.wait();

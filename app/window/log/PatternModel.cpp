@@ -68,11 +68,22 @@ void PatternModel::sortRows()
 
 void PatternModel::sort(int column, Qt::SortOrder order)
 {
-    beginResetModel();
+    Q_EMIT layoutAboutToBeChanged();
+    const QModelIndexList before = persistentIndexList();
+    std::vector<size_t> numbers;
+    for (QModelIndex const& index : before)
+        numbers.push_back(m_order[static_cast<size_t>(index.row())]);
     m_column = column;
     m_sortOrder = order;
     sortRows();
-    endResetModel();
+    std::vector<int> rows(m_order.size());
+    for (size_t row = 0; row < m_order.size(); ++row)
+        rows[m_order[row]] = static_cast<int>(row);
+    QModelIndexList after;
+    for (int i = 0; i < before.size(); ++i)
+        after.append(index(rows[numbers[static_cast<size_t>(i)]], before[i].column()));
+    changePersistentIndexList(before, after);
+    Q_EMIT layoutChanged();
 }
 
 PatternList::Pattern const& PatternModel::pattern(int row) const
