@@ -134,7 +134,28 @@ QString MessagePattern::Of(QString const& message)
     return Folder(message).fold();
 }
 
-void PatternList::Add(LogEntry::Severity severity, QString const& message, qint64 time)
+QString MessagePattern::Expression(QString const& pattern)
+{
+    static const QString special = QStringLiteral("\\^$.|?*+()[]{}");
+    QString expression;
+    for (int at = 0; at < pattern.size(); ++at) {
+        const QChar c = pattern.at(at);
+        const bool isQuoted = c == Ellipsis && at > 0 && at + 1 < pattern.size() &&
+                              pattern.at(at - 1) == pattern.at(at + 1);
+        if (c == NumberSign)
+            expression += QLatin1String("[#0-9a-fA-Fx.:,-]+");
+        else if (isQuoted)
+            expression += QLatin1String(".*");
+        else if (special.contains(c))
+            expression += QLatin1Char('\\') + QString(c);
+        else
+            expression += c;
+    }
+    return expression;
+}
+
+void PatternList::Add(LogEntry::Severity severity, QString const& message, qint64 time,
+                      qint64 place)
 {
     QString pattern = MessagePattern::Of(message);
     QString key = QChar(severity) + pattern;
@@ -155,10 +176,19 @@ void PatternList::Add(LogEntry::Severity severity, QString const& message, qint6
     }
     Pattern& counted = m_patterns[number];
     ++counted.count;
-    if (time < 0)
-        return;
-    counted.first = counted.first < 0 ? time : std::min(counted.first, time);
-    counted.last = std::max(counted.last, time);
+    if (counted.count == 1 || (time >= 0 && (counted.first < 0 || time < counted.first))) {
+        counted.first = time;
+        counted.firstPlace = place;
+    }
+    if (time >= counted.last) {
+        counted.last = time;
+        counted.lastPlace = place;
+    }
+}
+
+bool PatternList::IsRest(Pattern const& pattern)
+{
+    return pattern.severity == LogEntry::None && pattern.text == QString(Ellipsis);
 }
 
 std::vector<PatternList::Pattern> PatternList::Sorted() const

@@ -294,6 +294,9 @@ void MainMenus::fillAnalyzeMenu(QMenu* menu)
                                 tr("Show the time since the entry above or since a chosen one"),
                                 [this](bool shown) { m_targets.tabs->SetSince(shown); });
     fillGapMenu(menu->addMenu(tr("&Gaps")));
+    addForLog(menu, tr("&Patterns..."), QKeySequence(tr("Ctrl+Alt+P")),
+              tr("List what messages have in common, and how often"),
+              [](LogPanel* log) { log->ShowPatterns(); });
 }
 
 void MainMenus::fillGapMenu(QMenu* menu)

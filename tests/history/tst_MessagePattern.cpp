@@ -3,6 +3,7 @@
 
 #include "app/history/MessagePattern.h"
 
+#include <QRegularExpression>
 #include <QtTest>
 
 using namespace Velocor;
@@ -15,6 +16,9 @@ private slots:
     void pattern_data();
     void pattern();
     void list();
+    void places();
+    void expression_data();
+    void expression();
     void manyPatterns();
 };
 
@@ -98,6 +102,50 @@ void tst_MessagePattern::list()
     fromZero.Add(LogEntry::Error, "page 2", 5);
     QCOMPARE(fromZero.Sorted()[0].first, qint64(0));
     QCOMPARE(fromZero.Sorted()[0].last, qint64(5));
+}
+
+void tst_MessagePattern::places()
+{
+    PatternList list;
+    list.Add(LogEntry::Error, "page 1", -1, 100);
+    QCOMPARE(list.Sorted()[0].firstPlace, qint64(100));
+    QCOMPARE(list.Sorted()[0].lastPlace, qint64(100));
+    list.Add(LogEntry::Error, "page 2", -1, 200);
+    QCOMPARE(list.Sorted()[0].firstPlace, qint64(100));
+    QCOMPARE(list.Sorted()[0].lastPlace, qint64(200));
+    list.Add(LogEntry::Error, "page 3", 50, 300);
+    list.Add(LogEntry::Error, "page 4", 50, 400);
+    list.Add(LogEntry::Error, "page 5", 20, 500);
+    list.Add(LogEntry::Error, "page 6", -1, 600);
+    QCOMPARE(list.Sorted()[0].first, qint64(20));
+    QCOMPARE(list.Sorted()[0].firstPlace, qint64(500));
+    QCOMPARE(list.Sorted()[0].last, qint64(50));
+    QCOMPARE(list.Sorted()[0].lastPlace, qint64(400));
+}
+
+void tst_MessagePattern::expression_data()
+{
+    QTest::addColumn<QString>("message");
+    QTest::addColumn<QString>("other");
+    const auto row = [](char const* name, char const* message, char const* other) {
+        QTest::newRow(name) << QString(message) << QString(other);
+    };
+    row("number", "page 12 of 3", "page xyz of 3");
+    row("address", "at 0x7F31c0", "at z");
+    row("number sign", "issue #12", "issue none");
+    row("quoted", "no \"a.txt\"", "no a.txt");
+    row("special characters", "f(1) [a] {b} \\c ^d$ e|f? *+.", "f(1)");
+    row("ellipsis", "wait\u2026", "wait x");
+    row("plain", "x", "X");
+}
+
+void tst_MessagePattern::expression()
+{
+    QFETCH(QString, message);
+    QFETCH(QString, other);
+    const QRegularExpression expression(MessagePattern::Expression(MessagePattern::Of(message)));
+    QVERIFY(expression.match(message).hasMatch());
+    QVERIFY(!expression.match(other).hasMatch());
 }
 
 void tst_MessagePattern::manyPatterns()

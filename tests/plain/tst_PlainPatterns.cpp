@@ -100,6 +100,7 @@ private slots:
 
 private:
     void compare(QString const& message);
+    void find(QString const& message, QString const& pattern);
 
     qint64 m_messages = 0;
     qint64 m_folded = 0;
@@ -112,8 +113,19 @@ void tst_PlainPatterns::compare(QString const& message)
     const QString plain = PlainPattern(message);
     if (pattern != plain)
         QCOMPARE(message + " -> " + pattern, message + " -> " + plain);
+    if (m_messages % 8 == 0)
+        find(message, pattern);
     ++m_messages;
     m_folded += pattern != message;
+}
+
+// No line of a log has line breaks.
+void tst_PlainPatterns::find(QString const& message, QString const& pattern)
+{
+    const QRegularExpression expression(MessagePattern::Expression(pattern),
+                                        QRegularExpression::DotMatchesEverythingOption);
+    if (!expression.match(message).hasMatch())
+        QCOMPARE(message, "a message that " + expression.pattern() + " finds");
 }
 
 void tst_PlainPatterns::everyShortMessage()

@@ -252,6 +252,20 @@ void TakeDialogs(MainWindow& window, Camera const& camera)
     TakeDialog(window, "Save Report...", camera, "report");
 }
 
+// Sorted by severity, as soon as all is counted.
+void TakePatterns(MainWindow& window, Camera const& camera)
+{
+    QTest::qWait(500); // a tab that was closed is gone before the dialog waits
+    QTimer::singleShot(0, [&] {
+        QWidget* dialog = QApplication::activeModalWidget();
+        QTest::qWait(500);
+        dialog->findChild<QTreeView*>()->sortByColumn(1, Qt::DescendingOrder);
+        camera.take(*dialog, "patterns");
+        dialog->close();
+    });
+    Trigger(window, "Patterns...");
+}
+
 void TakeHighlights(MainWindow& window, Camera const& camera)
 {
     HighlightRules* rules = window.findChild<FileTabs*>()->highlightRules();
@@ -299,6 +313,7 @@ void TakeAll(QString const& folder, QString const& suffix)
     TakeAllFiles(window, camera);
     TakeHighlights(window, camera);
     TakeActivity(window, camera);
+    TakePatterns(window, camera);
     TakePlaces(window, camera);
     TakeDialogs(window, camera);
 

@@ -172,8 +172,18 @@ void LogFilterBar::showMore()
 
 void LogFilterBar::FilterBy(QString const& text)
 {
+    filterBy(text, false);
+}
+
+void LogFilterBar::FilterByExpression(QString const& expression)
+{
+    filterBy(expression, true);
+}
+
+void LogFilterBar::filterBy(QString const& text, bool isExpression)
+{
     const QSignalBlocker blocker(m_expression);
-    m_expression->setChecked(false);
+    m_expression->setChecked(isExpression);
     m_text->setText(text);
     keepText();
     apply();

@@ -51,6 +51,9 @@ public:
     /// Shows only lines with this text, as it is.
     void FilterBy(QString const& text);
 
+    /// Shows only lines that match a regular expression.
+    void FilterByExpression(QString const& expression);
+
     /// Hides the lines with this text as well.
     void Hide(QString const& text);
 
@@ -88,6 +91,7 @@ private:
     void showMore();
     void keepText();
     void showHistory();
+    void filterBy(QString const& text, bool isExpression);
     void apply();
     void showError(QString const& error);
 

@@ -20,6 +20,7 @@
 #include "app/window/log/LogStateText.h"
 #include "app/window/log/LogTableMenu.h"
 #include "app/window/log/LogView.h"
+#include "app/window/log/PatternDialog.h"
 #include "app/window/log/RunningLogParser.h"
 #include "app/window/log/WheelZoom.h"
 #include "app/window/widgets/NoticeBar.h"
@@ -346,6 +347,19 @@ void LogPanel::AskGoTo()
         return;
     m_view->setFocus();
     m_goTo->Find(dialog.place(), m_view->currentIndex().row());
+}
+
+void LogPanel::ShowPatterns()
+{
+    PatternDialog dialog(*m_model, this);
+    dialog.exec();
+    if (dialog.answer() == PatternDialog::Filter)
+        m_filterBar->FilterByExpression(dialog.expression());
+    const int row =
+        dialog.answer() == PatternDialog::GoToEntry ? m_model->RowNear(dialog.start()) : -1;
+    if (row >= 0)
+        m_view->GoToRow(row);
+    m_view->setFocus();
 }
 
 void LogPanel::SetFilterHistory(std::shared_ptr<QStringList> const& history)

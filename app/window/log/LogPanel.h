@@ -109,6 +109,9 @@ public:
     /// Asks for a line number or a time, and goes there.
     void AskGoTo();
 
+    /// Lists what the messages shown have in common, to go to an entry or to filter by it.
+    void ShowPatterns();
+
     /// See LogFilterBar::SetHistory().
     void SetFilterHistory(std::shared_ptr<QStringList> const& history);
 
