@@ -16,7 +16,7 @@ import time
 
 from gi.repository import Gio, GLib
 
-PATIENCE = 60  # seconds, for a crowded machine
+PATIENCE = 6  # seconds, for a crowded machine
 
 # The bits of states that are used here.
 ACTIVE, CHECKED, ENABLED, FOCUSABLE, FOCUSED, SELECTED, SHOWING = 1, 4, 8, 11, 12, 23, 25
@@ -98,9 +98,17 @@ class Part:
     def role(self):
         return self.ask("Accessible", "GetRoleName")
 
+    @property
+    def role_number(self):
+        """0 is an invalid role, 67 an unknown one."""
+        return self.ask("Accessible", "GetRole")
+
     def has(self, state):
         low, high = self.ask("Accessible", "GetState")
         return bool((high << 32 | low) >> state & 1)
+
+    def parent(self):
+        return Part(*self.get("Accessible", "Parent"))
 
     def children(self):
         return [
@@ -199,6 +207,63 @@ def desktop():
 
 
 REGISTRY = Part("org.a11y.atspi.Registry", "/org/a11y/atspi/accessible/root")
+REGISTRY_OF_EVENTS = Part("org.a11y.atspi.Registry", "/org/a11y/atspi/registry")
+
+
+class News:
+    """Changes of descriptions, which screen readers announce."""
+
+    def __init__(self):
+        self.changes = []
+        REGISTRY_OF_EVENTS.ask(
+            "Registry",
+            "RegisterEvent",
+            "(sass)",
+            "object:property-change:accessible-description",
+            [],
+            "",
+        )
+        Part.bus.signal_subscribe(
+            None,
+            "org.a11y.atspi.Event.Object",
+            "PropertyChange",
+            None,
+            "accessible-description",
+            Gio.DBusSignalFlags.NONE,
+            self.take,
+        )
+
+    def take(self, _connection, service, path, _interface, _signal, values):
+        self.changes.append((Part(service, path), values.unpack()))
+
+    def forget(self):
+        self.changes.clear()
+
+    def of(self, name):
+        """What the next part of this name announces."""
+
+        def said():
+            for part, _ in self.changes:
+                if part.name == name and part.description:
+                    return part.description
+            return None
+
+        return wait(f"{name!r} says something", said)
+
+
+def bus_call(method, *arguments):
+    name = "org.freedesktop.DBus"
+    variant = GLib.Variant("(s)", arguments) if arguments else None
+    return ask(Part.bus, name, "/org/freedesktop/DBus", name, method, variant)
+
+
+def service_of(process):
+    """The name of a process on the accessibility bus, or None."""
+    for service in bus_call("ListNames"):
+        with contextlib.suppress(GLib.Error):  # it has gone meanwhile
+            if bus_call("GetConnectionUnixProcessID", service) == process:
+                return service
+    return None
 
 
 class Program:
@@ -216,33 +281,19 @@ class Program:
             QT_QPA_PLATFORM="xcb",
         )
         os.makedirs(home, exist_ok=True)
-        def process_of(application):
-            return ask(
-                Part.bus,
-                "org.freedesktop.DBus",
-                "/",
-                "org.freedesktop.DBus",
-                "GetConnectionUnixProcessID",
-                GLib.Variant("(s)", (application.service,)),
-            )
-
-        def registered():
-            for application in REGISTRY.children():
-                if process_of(application) == self.process.pid:
-                    return application
-            return None
-
-        # Qt 5.15 loses a race when it connects to the accessibility bus, and then stays off it.
-        for patience in (1, 1, 1, 1, 2, 2, 2, 4, 4, 8, 8, 16, 32, PATIENCE):
+        # Qt 5.15 loses a race in many starts: it connects to the accessibility bus, but never
+        # registers there, so that nobody can find the program. Then only another start helps.
+        for _ in range(100):
             self.process = subprocess.Popen([program, *files], env=environment, cwd=folder)
-            try:
-                self.application = wait("being on the accessibility bus", registered, patience)
+            service = wait("being on the accessibility bus", lambda: service_of(self.process.pid))
+            self.application = Part(service, "/org/a11y/atspi/accessible/root")
+            with contextlib.suppress(Failed):
+                wait("being registered", lambda: self.application in REGISTRY.children(), 0.7)
                 break
-            except Failed:
-                self.process.terminate()
-                self.process.wait()
+            self.process.terminate()
+            self.process.wait()
         else:
-            raise Failed("the program is never on the accessibility bus")
+            raise Failed("the program is never registered")
         try:
             wait("an active window", lambda: any(w.has(ACTIVE) for w in self.windows()))
         except BaseException:
@@ -329,9 +380,10 @@ class Program:
         return Part(*self.table(name).ask("Table", "GetAccessibleAt", "(ii)", row, column))
 
     def row(self, row, name="Log entries"):
-        """What a screen reader says for a row."""
+        """What a screen reader says for a row, without columns that are hidden."""
         columns = self.table(name).get("Table", "NColumns")
-        return " ".join(filter(None, (self.cell(row, c, name).name for c in range(columns))))
+        cells = (self.cell(row, column, name) for column in range(columns))
+        return " ".join(cell.name for cell in cells if cell.rectangle()[2] and cell.name)
 
     def parts_of(self, name):
         """All cells and other children of a table, which is short."""

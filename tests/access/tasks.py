@@ -245,6 +245,7 @@ def main():
         sys.exit(1)
 
 
-in_own_session()
-with desktop():
-    main()
+if __name__ == "__main__":
+    in_own_session()
+    with desktop():
+        main()
