@@ -18,13 +18,8 @@ namespace Velocor {
 
 namespace {
 
-// A folder like "/srv/home" is the one of everybody, and says nothing about anybody.
 void AddHome(Redactor& redactor, QString const& path)
 {
-    const QString name = path.section(QLatin1Char('/'), -1);
-    const bool isShared = name == QLatin1String("home") || name == QLatin1String("Users");
-    if (isShared)
-        return;
     if (path.count(QLatin1Char('/')) > 1 || path == QLatin1String("/root"))
         redactor.AddSecret(SecretKind::HomeFolder, path);
 }
