@@ -334,8 +334,8 @@ class Program:
     def press(self, role, name):
         self.find(role, name).act()
 
-    def menu(self, *names):
-        """Chooses from the menus, which need not be open for this."""
+    def entry(self, *names):
+        """An entry of the menus, which need not be open for this."""
         part = self.find("menu bar", "Menus")
         for name in names:
             entries = part.children()
@@ -345,7 +345,11 @@ class Program:
             part = next((e for e in entries if e.name.split("\t")[0] == name), None)
             if part is None:
                 raise Failed(f"no {name!r} among {[entry.name for entry in entries]}")
-        part.act()
+        return part
+
+    def menu(self, *names):
+        """Chooses from the menus."""
+        self.entry(*names).act()
 
     def write(self, name, text):
         field = self.find("text", name)
@@ -390,8 +394,12 @@ class Program:
         return self.table(name).children()
 
     def file(self, name):
-        with open(os.path.join(self.folder, name), "rb") as file:
-            return file.read()
+        """What is in a file of the folder; nothing if it does not exist."""
+        try:
+            with open(os.path.join(self.folder, name), "rb") as file:
+                return file.read()
+        except FileNotFoundError:
+            return b""
 
     def current(self):
         """The whole current line, as the pane below the table has it."""
@@ -400,12 +408,15 @@ class Program:
 
 @contextlib.contextmanager
 def running(program, files):
-    """Runs the program with files that are written to a new folder: names and bytes."""
+    """Runs the program with files that are written to a new folder: names and bytes.
+
+    Those whose names end in .1 are only written.
+    """
     with tempfile.TemporaryDirectory() as folder:
         for name, content in files.items():
             with open(os.path.join(folder, name), "wb") as file:
                 file.write(content)
-        run = Program(program, folder, [name for name in files if not name.startswith("_")])
+        run = Program(program, folder, [name for name in files if not name.endswith(".1")])
         try:
             yield run
         except BaseException:
