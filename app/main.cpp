@@ -8,7 +8,9 @@
 #include "app/ScreenlessPlatform_p.h"
 #include "app/StandardStreams_p.h"
 #include "app/WithoutOpenGl_p.h"
+#include "app/window/AccessibleParts.h"
 #include "app/window/MainWindow.h"
+#include "app/window/ReachableStyle.h"
 #include "common/log/TorkLog.h"
 
 #include <QApplication>
@@ -57,6 +59,9 @@ int main(int argc, char** argv)
     AppPaths::SetOrganizationAndProduct();
     TorkLog::initialize(QStringLiteral("velocor"));
     application.setProperty("caption", Caption());
+
+    QApplication::setStyle(new Velocor::ReachableStyle);
+    Velocor::InstallAccessibleParts();
 
     QuitOnSignal quitOnSignal;
     const Velocor::CommandLine commandLine(QApplication::arguments());

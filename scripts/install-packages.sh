@@ -34,6 +34,7 @@ packages_of() {
     */wayland) echo qtwayland5 ;;
     */test)
         echo xvfb xauth shared-mime-info pkg-config valgrind doxygen locales-all dpkg-dev \
+            at-spi2-core dbus dbus-daemon python3-gi openbox xdotool \
             desktop-file-utils libspdlog-dev
         ;;
     */bench)

@@ -100,6 +100,21 @@ QString Comparable(SecretKind kind, QString const& text)
     return same;
 }
 
+// In the home folder "/data/home", what "/home/" is followed by is not a name but a file of the
+// user.
+void DropHomesInside(std::vector<SecretFinder::Place> const& known,
+                     std::vector<SecretFinder::Place>& found)
+{
+    const auto isInside = [&known](SecretFinder::Place const& place) {
+        return place.kind == SecretKind::HomeFolder &&
+               std::any_of(known.begin(), known.end(), [&place](SecretFinder::Place const& home) {
+                   return home.kind == SecretKind::HomeFolder && home.start < place.start &&
+                          place.start < home.start + home.length;
+               });
+    };
+    found.erase(std::remove_if(found.begin(), found.end(), isInside), found.end());
+}
+
 // Everything that any of them covers; of those that overlap, the longest tells what it is.
 void Merge(std::vector<SecretFinder::Place>& places)
 {
@@ -214,7 +229,10 @@ Redactor::Text Redactor::Redact(QString const& text)
     learn();
     std::vector<SecretFinder::Place> places;
     findKnown(text, places);
-    SecretFinder::Find(text, places);
+    std::vector<SecretFinder::Place> found;
+    SecretFinder::Find(text, found);
+    DropHomesInside(places, found);
+    places.insert(places.end(), found.begin(), found.end());
     Merge(places);
 
     Text redacted;

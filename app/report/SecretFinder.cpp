@@ -12,7 +12,7 @@ namespace {
 constexpr int LongestKeyBlock = 64 * 1024; // characters
 
 // The value that follows these is a secret, whatever it looks like.
-char const* const PasswordWords = "passw(?:or)?d|passphrase|passcode|pwd";
+char const* const PasswordWords = "passw(?:or)?d|passwort|kennwort|passphrase|passcode|pwd";
 
 // It is one if it is no plain word.
 char const* const TokenWords =
@@ -65,6 +65,16 @@ bool IsNoPlaceholder(QString const& text)
     return !placeholders.match(text).hasMatch();
 }
 
+// What "Basic" is followed by in a header: a name and a password.
+bool IsBasicCredentials(QString const& text)
+{
+    const QByteArray decoded = QByteArray::fromBase64(text.toLatin1());
+    const auto isPrintable = [](char character) {
+        return static_cast<unsigned char>(character) >= ' ';
+    };
+    return decoded.contains(':') && std::all_of(decoded.begin(), decoded.end(), isPrintable);
+}
+
 // Not "a::b", which is code, nor the address of every computer.
 bool IsNetworkAddress(QString const& text)
 {
@@ -99,9 +109,28 @@ QString Assigned(QString const& name, char const* value)
 {
     return QStringLiteral("</[^<>\\s]*>(*SKIP)(*F)|") + name +
            QStringLiteral("(?:\\\\*[\"']?\\s{0,3}(?:=>|:=|[:=])\\s{0,3}|"
-                          "\\\\?[\"']?(?:\\s[^<>\\n]{0,80})?>\\s*(?:<!\\[CDATA\\[)?)"
+                          "\\\\?[\"']?(?:\\s[^<>\\n]{0,80})?(?<!/)>\\s*(?:<!\\[CDATA\\[)?)"
                           "\\\\*[\"']?\\K") +
            QStringLiteral("(?:%1)").arg(QLatin1String(value));
+}
+
+// What a shell passes as one argument.
+char const* const Argument = "(?:\\\\?\"\\K[^\"\\\\\\n]+|\\\\?'\\K[^'\\\\\\n]+|\\K[^\\s\"'<>]+)";
+
+QString NameBeforeValue(QString const& name)
+{
+    return QStringLiteral("\\b(?:name|key|id)\"?\\s{0,3}[:=]\\s{0,3}[\"'][^\"'<>\\n]{0,80}%1[\"']"
+                          "[^<>{}\\n]{0,200}?[\\s\"',]value\"?\\s{0,3}[:=]\\s{0,3}"
+                          "(?:\"\\K[^\"\\n]+|'\\K[^'\\n]+|\\K[^\\s\"'<>/,}]+)")
+        .arg(name);
+}
+
+QString ValueBeforeName(QString const& name)
+{
+    return QStringLiteral("\\bvalue\"?\\s{0,3}[:=]\\s{0,3}(?:\"\\K[^\"\\n]{1,200}(?=\")|"
+                          "'\\K[^'\\n]{1,200}(?='))(?=[\"'][^<>{}\\n]{0,200}?\\b(?:name|key|id)"
+                          "\"?\\s{0,3}[:=]\\s{0,3}[\"'][^\"'<>\\n]{0,80}%1[\"'])")
+        .arg(name);
 }
 
 Pattern Case(SecretKind kind, QString const& expression, bool (*filter)(QString const&) = nullptr)
@@ -178,7 +207,7 @@ std::vector<Pattern> TokenPatterns()
             QStringLiteral(
                 "(?<![A-Za-z0-9])(?:gh[a-z]_[A-Za-z0-9]{20,}|github_pat_\\w{20,}|glpat-[\\w-]{16,}|"
                 "[spr]k(?:[-_][a-z0-9]{2,8})*[-_][A-Za-z0-9_-]{16,}|xox[a-z]-[A-Za-z0-9-]{10,}|"
-                "A(?:KIA|SIA|IDA|ROA)[A-Z0-9]{16}|AIza[\\w-]{35}|ya29\\.[\\w-]{20,}|"
+                "A(?:KIA|SIA|IDA|ROA)[A-Z0-9]{16,}|AIza[\\w-]{35,}|ya29\\.[\\w-]{20,}|"
                 "npm_[A-Za-z0-9]{30,}|pypi-[\\w-]{20,}|hf_[A-Za-z0-9]{20,}|"
                 "SG\\.[\\w-]{16,}\\.[\\w-]{16,}|do[a-z]_v1_[a-f0-9]{32,}|"
                 "shp[a-z]{2}_[A-Fa-f0-9]{32}|dckr_pat_[\\w-]{16,})")),
@@ -205,11 +234,39 @@ std::vector<Pattern> TokenPatterns()
                 QStringLiteral("authorization\\\\?[\"']?\\s*[:=]\\s*\\\\?[\"']?(?:bearer|basic|"
                                "digest|token|negotiate|ntlm)\\s+\\K[^\\s\"'<>]+")),
         AnyCase(SecretKind::Token, QStringLiteral("\\bcookie\\s*:\\s*\\K[^\\s<>\"][^\\n<>\"]*")),
-        AnyCase(
-            SecretKind::Password,
-            QStringLiteral("--[\\w-]*(?:%1|token|secret|api-?key)[\\w-]*[= ]\\s*\\K[^\\s\"'<>]+")
-                .arg(QLatin1String(PasswordWords)),
-            IsNoPlaceholder),
+        AnyCase(SecretKind::Password,
+                QStringLiteral("--[\\w-]*(?:%1|token|secret|api-?key)[\\w-]*[= ]\\s*%2")
+                    .arg(QLatin1String(PasswordWords), QLatin1String(Argument)),
+                IsNoPlaceholder),
+        // Programs whose -p is a password, and not a port or a folder.
+        Case(SecretKind::Password,
+             QStringLiteral("\\b(?:mysql|mariadb)[\\w-]*+(?=\\s)[^\\n]{0,200}?\\s-p%1")
+                 .arg(QLatin1String(Argument)),
+             IsNoPlaceholder),
+        Case(SecretKind::Password,
+             QStringLiteral("\\bsshpass\\s+-p\\s*%1").arg(QLatin1String(Argument)),
+             IsNoPlaceholder),
+        AnyCase(SecretKind::Password,
+                Word(PasswordWords) +
+                    QStringLiteral("\\s+(?:is\\s+|was\\s+)?(?:\"\\K[^\"\\n]+(?=\")|"
+                                   "'\\K[^'\\n]+(?='))"),
+                IsNoPlaceholder),
+        AnyCase(SecretKind::Password,
+                Word(PasswordWords) + QStringLiteral("%3D\\K(?:(?!%26)[^\\s\"'<>&])+"),
+                IsNoPlaceholder),
+        AnyCase(SecretKind::Token,
+                Word(TokenWords) + QStringLiteral("%3D\\K(?:(?!%26)[^\\s\"'<>&]){8,}"), IsNoWord),
+        AnyCase(SecretKind::Password,
+                QStringLiteral("(?<![\\p{L}\\p{N}])pin(?:[-_ ]?code)?[\"']?"
+                               "\\s{0,3}[:=]\\s{0,3}[\"']?\\K[0-9]{4,12}(?![0-9])")),
+        AnyCase(SecretKind::Token,
+                QStringLiteral("\\bbasic\\s+\\K[A-Za-z0-9+/]{4,}={0,2}(?![\\w+/])"),
+                IsBasicCredentials),
+        // The name is the value of an attribute, or of a member in JSON, and the value is another.
+        AnyCase(SecretKind::Password, NameBeforeValue(Word(PasswordWords)), IsNoPlaceholder),
+        AnyCase(SecretKind::Token, NameBeforeValue(Word(TokenWords)), IsNoWord),
+        AnyCase(SecretKind::Password, ValueBeforeName(Word(PasswordWords)), IsNoPlaceholder),
+        AnyCase(SecretKind::Token, ValueBeforeName(Word(TokenWords)), IsNoWord),
     };
 }
 

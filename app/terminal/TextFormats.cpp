@@ -20,6 +20,13 @@ constexpr QLatin1Char Quote('"');
 constexpr char const* JsonEscaped = "\"\\\b\f\n\r\t";
 constexpr char const* JsonNames = "\"\\bfnrt";
 
+// What turns the rest of a line around, or ends it, without being seen.
+bool ReordersLine(ushort code)
+{
+    return (code >= 0x202a && code <= 0x202e) || (code >= 0x2066 && code <= 0x2069) ||
+           code == 0x2028 || code == 0x2029;
+}
+
 } // namespace
 
 QByteArray TextFormats::CsvRecord(QVector<QString> const& fields)
@@ -75,7 +82,7 @@ QString TextFormats::Harmless(QString text)
             c = QChar(0x2400 + code);
         else if (code == 0x7f)
             c = QChar(0x2421);
-        else if (code >= 0x80 && code < 0xa0)
+        else if ((code >= 0x80 && code < 0xa0) || ReordersLine(code))
             c = QChar(QChar::ReplacementCharacter);
     }
     return text;

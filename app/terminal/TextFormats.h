@@ -28,7 +28,8 @@ public:
     /// Lines as a code block, fenced so that none of them ends it.
     static QByteArray MarkdownBlock(QByteArray const& lines);
 
-    /// A text without the characters that control a terminal; symbols stand for them.
+    /// A text without the characters that control a terminal or the direction of text; symbols
+    /// stand for them.
     static QString Harmless(QString text);
 
     /// A time as ISO 8601 has it, without a time zone; empty if it is unknown.

@@ -179,6 +179,8 @@ void MainWindow::makeStatusBar()
     m_summary->setContentsMargins(4, 0, 6, 0); // starts where the messages do
     m_summary->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
     statusBar()->setAccessibleName(tr("Status"));
+    statusBar()->setSizeGripEnabled(
+        false); // too small to hit, and the edges of the window do the same
     statusBar()->addWidget(m_summary, 1); // not permanent, to leave all room to messages
 }
 

@@ -199,9 +199,13 @@ private:
                                           "<arg key=\"%1\">|</arg>",
                                           "<%1><![CDATA[|]]></%1>",
                                           "{\\\"%1\\\":\\\"|\\\"}",
+                                          "<item name=\"%1\" value=\"|\"/>",
+                                          "<item value='|' name='%1'/>",
+                                          "{\"name\":\"%1\",\"value\":\"|\"}",
+                                          "next=x%26%1%3D|%26b",
                                           "?a=1&%1=|&b=2"};
         const QString form = pick(forms);
-        say(form.section('|', 0, 0).arg(key));
+        say(QString(form.section('|', 0, 0)).replace("%1", key));
         hide(value);
         say(QString(form.section('|', 1)).replace("%1", key) + " ");
     }

@@ -104,6 +104,38 @@ void tst_Redactor::redacts_data()
         "{\\\"password\\\":\\\"<password-1>\\\",\\\"x\\\":1}");
     row("password in a query", "?password=a&b=c", "?password=<password-1>&b=c");
     row("password as an argument", "--db-password x1 -v", "--db-password <password-1> -v");
+    row("quoted password as an argument", "--password \"a b\" --token='c d'",
+        "--password \"<password-1>\" --token='<password-2>'");
+    row("password of a client", "mysql -u ada -phunter2 shop; mysqldump --opt -p'a b'",
+        "mysql -u ada -p<password-1> shop; mysqldump --opt -p'<password-2>'");
+    row("password of sshpass", "sshpass -p s3cret ssh host", "sshpass -p <password-1> ssh host");
+    row("no password of a client", "ssh -p22 host, mkdir -pv x, mysql -P3306 -p");
+    row("quoted password after a blank", "password \"a b\", the password is 'c'",
+        "password \"<password-1>\", the password is '<password-2>'");
+    row("encoded assignment", "next=%2Fx%3Fpassword%3Dhunter2%26token%3Da81f9c3e77%26b",
+        "next=%2Fx%3Fpassword%3D<password-1>%26token%3D<token-1>%26b");
+    row("Basic without a header", "sent Basic YWRhOmh1bnRlcjI= and basic authentication",
+        "sent Basic <token-1> and basic authentication");
+    row("other languages", "Passwort: geheim, Kennwort=x1",
+        "Passwort: <password-1> Kennwort=<password-2>");
+    row("PIN", "pin: 4711, PIN=\"081500\", pin: A7, spin: 4711, pins=1234",
+        "pin: <password-1>, PIN=\"<password-2>\", pin: A7, spin: 4711, pins=1234");
+    row("password as another attribute", "<item name=\"dbPassword\" value=\"a &amp; b\"/>",
+        "<item name=\"dbPassword\" value=\"<password-1>\"/>");
+    row("text after an empty element", "<item name=\"password\" value=\"x1\"/> next",
+        "<item name=\"password\" value=\"<password-1>\"/> next");
+    row("password before its name", "<item value='x1' name='password'/>",
+        "<item value='<password-1>' name='password'/>");
+    row("password as a member", "{\"name\":\"password\",\"value\":\"x1\"}",
+        "{\"name\":\"password\",\"value\":\"<password-1>\"}");
+    row("password as an attribute", "<item name=\"x\" password=x1><item password='x2'/>",
+        "<item name=\"x\" password=<password-1>><item password='<password-2>'/>");
+    row("token as another attribute", "<item name=\"apiKey\" value=\"a81f9c3e77\"/>",
+        "<item name=\"apiKey\" value=\"<token-1>\"/>");
+    row("known start with a long rest",
+        "AIzaSyA1234567890abcdefghijklmnopqrstuvwx AKIAIOSFODNN7EXAMPLEX", "<token-1> <token-2>");
+    row("no password elsewhere", "<item name=\"columns\" value=\"12\"/> <item name=\"password\"/>"
+                                 " <item name=\"x\" value=\"12\"/> name=password value");
     row("no password", "password accepted, password=(null), password: ****, passwordLength=8");
     row("password in an address", "https://bob:p@ss:w0rd@example.org/x and ftp://:pw@h",
         "https://bob:<password-1>@example.org/x and ftp://:<password-2>@h");
@@ -130,6 +162,8 @@ void tst_Redactor::ownNames_data()
     row("part of a word", "adamant canada ada1");
     row("host", "lab7: Lab7.example.org", "<host-1>: <host-1>.example.org");
     row("home", "/home/åke b/x (/home/åke b)", "<home>/x (<home>)");
+    row("home called home", "/data/home/x.cfg (/data/home), /home/ada/x, /data2/home/ada",
+        "<home-1>/x.cfg (<home-1>), <home-2>/x, /data2<home-2>");
     row("home in an address", "file:///home/%C3%A5ke%20b/x", "file://<home>/x");
     row("home, all of it encoded", "%2Fhome%2F%C3%A5ke%20b", "<home>");
     row("home in a settings file", "/home/\\u00e5ke b/x", "<home>/x");
@@ -146,6 +180,7 @@ void tst_Redactor::ownNames()
     QFETCH(QString, expected);
     Redactor redactor;
     redactor.AddSecret(SecretKind::HomeFolder, QString::fromUtf8("/home/åke b"));
+    redactor.AddSecret(SecretKind::HomeFolder, "/data/home");
     redactor.AddSecret(SecretKind::UserName, "ada");
     redactor.AddSecret(SecretKind::UserName, QString::fromUtf8("Łukasz"));
     redactor.AddSecret(SecretKind::HostName, "lab7");
@@ -345,8 +380,32 @@ void tst_Redactor::keyBlocks()
 // None takes so long that nobody would wait, and what is at their ends is found.
 void tst_Redactor::longLines()
 {
-    for (char const* part : {"a", "1", "a.", "1.", "a:", "0:", "%40", "@", "://", ":", "/home/",
-                             "-", "password", "token=", "key ", "<", "\"", "\\", "-----BEGIN "}) {
+    for (char const* part : {"a",
+                             "1",
+                             "a.",
+                             "1.",
+                             "a:",
+                             "0:",
+                             "%40",
+                             "@",
+                             "://",
+                             ":",
+                             "/home/",
+                             "-",
+                             "password",
+                             "password ",
+                             "token=",
+                             "key ",
+                             "mysql ",
+                             "mysql -p ",
+                             "name=\"password\" ",
+                             "value=\"a\" ",
+                             "value=",
+                             "basic ",
+                             "<",
+                             "\"",
+                             "\\",
+                             "-----BEGIN "}) {
         Redactor redactor;
         const QString text = QString(part).repeated(100000 / int(qstrlen(part))) + " b@x.org";
         QVERIFY2(redactor.Redact(text).text.size() > 99990, part); // not the line instead

@@ -297,6 +297,8 @@ void tst_VelocorLog::problems_data()
         "Not a time: someday. Times are such as 2026-11-20, 14:03, \"2026-11-20 14:03\" or, until "
         "now, -2h, -30m and -1d.");
     row("control characters", "a\033[2Jb\n", "a\u241b[2Jb\u240a: No such file or program");
+    row("directions of text", "a\u202eb\u2066c\u2028d",
+        "a\ufffdb\ufffdc\ufffdd: No such file or program");
     row("control characters of an option", "--severity=\033c", "Not a list of severities: \u241bc");
     row("gzip", "old.log.gz",
         "old.log.gz: A compressed file. To read it: zcat FILE | velocor-log -");

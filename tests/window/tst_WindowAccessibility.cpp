@@ -91,6 +91,7 @@ private slots:
 
     void names();
     void namesInDialogs();
+    void tableTellsWhatIsShown();
     void shortcuts();
     void menusByKeyboard();
     void tabOrder();
@@ -154,6 +155,22 @@ void tst_WindowAccessibility::namesInDialogs()
     QCOMPARE(NamelessControls(&files), QStringList());
     HighlightDialog highlights(std::make_shared<HighlightRules>(), nullptr);
     QCOMPARE(NamelessControls(&highlights), QStringList());
+}
+
+void tst_WindowAccessibility::tableTellsWhatIsShown()
+{
+    const WindowTest test(run(5, QTime(9, 0), "x"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    QTRY_VERIFY_WITH_TIMEOUT(View(*window)->accessibleDescription().startsWith("5 lines"),
+                             Patience);
+    auto* filter = Child<QLineEdit>(window.get(), "Filter by text");
+    filter->setText("x 3");
+    QTRY_VERIFY_WITH_TIMEOUT(View(*window)->accessibleDescription().startsWith("1 of 5 lines"),
+                             Patience);
+    filter->setText("y");
+    QTRY_VERIFY_WITH_TIMEOUT(View(*window)->accessibleDescription().startsWith("No lines match"),
+                             Patience);
 }
 
 // Every action that does something has a shortcut and a status tip, and no two share one. One of

@@ -431,7 +431,12 @@ QString LogPanel::summary() const
 
 void LogPanel::updatePlaceholder()
 {
-    m_view->SetPlaceholder(LogStateText::Placeholder(*m_model, m_percent));
+    const QString placeholder = LogStateText::Placeholder(*m_model, m_percent);
+    m_view->SetPlaceholder(placeholder);
+    const QString description =
+        m_model->rowCount() > 0 ? LogStateText::Summary(*m_model, m_percent, -1, 0) : placeholder;
+    if (description != m_view->accessibleDescription())
+        m_view->setAccessibleDescription(description);
 }
 
 void LogPanel::showContent()

@@ -546,7 +546,6 @@ void LogView::SetPlaceholder(QString const& text)
     if (text == m_placeholder)
         return;
     m_placeholder = text;
-    setAccessibleDescription(text);
     viewport()->update();
 }
 

@@ -1,0 +1,14 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+#pragma once
+
+namespace Velocor {
+
+/// Tells assistive technology about widgets of which Qt says too little: a label with an accessible
+/// name says its text, too, and when it changes; the handle of a splitter is a separator.
+///
+/// Applies to widgets that assistive technology has not asked about yet. Only in the GUI thread.
+void InstallAccessibleParts();
+
+} // namespace Velocor
