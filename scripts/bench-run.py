@@ -65,6 +65,10 @@ SAVES = ["save 20x50 values", "save 200x500 values"]
 WRITES = ["document to file", "document to bytes"]
 LARGE_LOG = ["log of 100 MB, 1,000,000 lines"]
 GIANT_LOG = "log of 1 GiB, "
+LARGE_SETTINGS = [
+    "settings file of 100,000 values in 1 section",
+    "settings file of 100,000 values in 1,000 sections",
+]
 FOLLOWING = "following 50 lines a second, share of a processor"
 WRITTEN = "a line written until it is seen"
 LONGEST_TURN = "longest turn of the event loop, 10,000 lines a second"
@@ -133,6 +137,7 @@ SECTIONS = {
             ("bench_window", "display"),
             ("bench_log_index", "google"),
             ("bench_large_log", "display"),
+            ("bench_settings", "display"),
         ],
         (3, 2),
         unit="line",
@@ -140,6 +145,10 @@ SECTIONS = {
             Limit(LARGE_LOG, "open", 2e9, quick=True),
             Limit(LARGE_LOG, "longest moment", 50e6, quick=True),
             Limit(LARGE_LOG, "scroll", 16e6, quick=True),
+            Limit(LARGE_SETTINGS, "open", 0.5e9, quick=True),
+            Limit(LARGE_SETTINGS, "a key to find, no match", 16e6),
+            Limit(LARGE_SETTINGS, "a key to filter, all match", 16e6),
+            Limit(LARGE_SETTINGS, "a key to filter, no match", 16e6),
             Limit([GIANT_LOG + "opening, processor time"], "velocor, log view", 0.6e9),
             Limit([GIANT_LOG + "memory a line"], "velocor, log view", 4, "bytes"),
             Limit([GIANT_LOG + "filter by text, processor time"], "velocor", 0.5e9),

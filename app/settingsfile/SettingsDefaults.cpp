@@ -51,7 +51,8 @@ SettingsValues SettingsDefaults::Of(QString const& path)
 {
     const QString file = FileFor(path);
     const SettingsDocument document =
-        file.isEmpty() ? SettingsDocument() : SettingsFileReader::Read(file);
+        file.isEmpty() ? SettingsDocument()
+                       : SettingsFileReader::Read(file, SettingsFileReader::ShownKeys);
     return document.isParsed ? document.AllValues() : SettingsValues();
 }
 

@@ -29,11 +29,12 @@ bool IsDefaultDeclaration(QByteArray const& start)
 
 } // namespace
 
-SettingsFileReader::SettingsFileReader(TorkConfigFile& store, SettingsDocument& document)
-    : TorkConfigFileDocHandler(&store), m_store(store), m_document(document)
+SettingsFileReader::SettingsFileReader(TorkConfigFile& store, SettingsDocument& document,
+                                       int mostKeys)
+    : TorkConfigFileDocHandler(&store), m_store(store), m_document(document), m_mostKeys(mostKeys)
 {}
 
-SettingsDocument SettingsFileReader::Read(QString const& path)
+SettingsDocument SettingsFileReader::Read(QString const& path, int mostKeys)
 {
     SettingsDocument document;
     QFile file(path);
@@ -46,7 +47,7 @@ SettingsDocument SettingsFileReader::Read(QString const& path)
     else if (!file.open(QIODevice::ReadOnly))
         document.error = file.errorString();
     else
-        read(file, document);
+        read(file, document, mostKeys);
     return document;
 }
 
@@ -56,11 +57,11 @@ SettingsDocument SettingsFileReader::ReadBytes(QByteArray const& bytes)
     QBuffer buffer;
     buffer.setData(bytes);
     buffer.open(QIODevice::ReadOnly);
-    read(buffer, document);
+    read(buffer, document, std::numeric_limits<int>::max());
     return document;
 }
 
-void SettingsFileReader::read(QIODevice& device, SettingsDocument& document)
+void SettingsFileReader::read(QIODevice& device, SettingsDocument& document, int mostKeys)
 {
     document.isReadable = true;
     if (device.peek(5) == "<?xml" && !IsDefaultDeclaration(device.peek(MaximumDeclaration)))
@@ -68,7 +69,7 @@ void SettingsFileReader::read(QIODevice& device, SettingsDocument& document)
     document.lossCount = document.losses.size();
 
     TorkConfigFile store((QString()));
-    SettingsFileReader reader(store, document);
+    SettingsFileReader reader(store, document, mostKeys);
     document.isParsed = store.LoadFrom(&device, reader);
 
     const QStringList names = store.sectionList();
@@ -97,6 +98,10 @@ bool SettingsFileReader::startElement(QString const& namespaceURI, QString const
 {
     m_isAfterValue = false;
     const int newDepth = depth() + 1;
+    if (newDepth == 3 && ++m_keyCount > m_mostKeys) {
+        m_document.hasTooManyKeys = true;
+        return false;
+    }
     if (newDepth == 1) {
         m_document.rootName = localName;
         m_store.SetRootElementName(localName);
@@ -185,7 +190,9 @@ bool SettingsFileReader::startDTD(QString const& name, QString const&, QString c
 
 bool SettingsFileReader::fatalError(QXmlParseException const& exception)
 {
-    m_document.error = exception.message();
+    m_document.error = m_document.hasTooManyKeys
+                           ? QObject::tr("It has more than %L1 keys").arg(m_mostKeys)
+                           : exception.message();
     m_document.line = exception.lineNumber();
     m_document.column = exception.columnNumber();
     return false;

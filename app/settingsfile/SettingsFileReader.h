@@ -6,6 +6,8 @@
 #include "app/settingsfile/SettingsDocument.h"
 #include "common/config/TorkConfigFileDocHandler.h"
 
+#include <limits>
+
 class QIODevice;
 class TorkConfigFile;
 
@@ -23,8 +25,14 @@ namespace Velocor {
 class SettingsFileReader : private TorkConfigFileDocHandler
 {
 public:
+    /// The number of keys up to which a document is fit to be shown.
+    static constexpr int ShownKeys = 1000000;
+
     /// Reads a file. Only regular files and links to them are read.
-    static SettingsDocument Read(QString const& path);
+    ///
+    /// @param mostKeys  reading ends at the first key after these
+    static SettingsDocument Read(QString const& path,
+                                 int mostKeys = std::numeric_limits<int>::max());
 
     /// Reads the content of a file from memory.
     static SettingsDocument ReadBytes(QByteArray const& bytes);
@@ -33,9 +41,9 @@ public:
     static constexpr int MaximumLosses = 50;
 
 private:
-    SettingsFileReader(TorkConfigFile& store, SettingsDocument& document);
+    SettingsFileReader(TorkConfigFile& store, SettingsDocument& document, int mostKeys);
 
-    static void read(QIODevice& device, SettingsDocument& document);
+    static void read(QIODevice& device, SettingsDocument& document, int mostKeys);
     void noteLoss(QString const& what) { noteLossAt(depth(), what); }
     void noteLossAt(int depth, QString const& what);
     void noteLossOfValue();
@@ -53,6 +61,8 @@ private:
 
     TorkConfigFile& m_store;
     SettingsDocument& m_document;
+    int m_mostKeys;
+    int m_keyCount = 0;
     QXmlLocator* m_locator = nullptr; // set before anything is read
     QString m_section;                // the names of the last section and item that began
     QString m_item;

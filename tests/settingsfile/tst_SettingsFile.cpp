@@ -56,6 +56,8 @@ private slots:
     void errors_data();
     void errors();
     void unreadable();
+    void endsAfterSoManyKeys_data();
+    void endsAfterSoManyKeys();
     void deepNesting();
     void deepDocumentType();
     void losses_data();
@@ -314,6 +316,32 @@ void tst_SettingsFile::unreadable()
         QVERIFY(!document.isParsed);
         QVERIFY(!document.error.isEmpty());
     }
+}
+
+void tst_SettingsFile::endsAfterSoManyKeys_data()
+{
+    QTest::addColumn<int>("most");
+    QTest::addColumn<bool>("isParsed");
+    QTest::addColumn<int>("keys");
+    QTest::addColumn<QString>("error");
+    QTest::newRow("more than it has") << 4 << true << 3 << "";
+    QTest::newRow("as many") << 3 << true << 3 << "";
+    QTest::newRow("one fewer") << 2 << false << 2 << "It has more than 2 keys";
+    QTest::newRow("of the first section") << 1 << false << 1 << "It has more than 1 keys";
+}
+
+void tst_SettingsFile::endsAfterSoManyKeys()
+{
+    QFETCH(int, most);
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("x.cfg");
+    QVERIFY(TestFiles::write(path, "<R><S><a>1</a><b>2<c>no key</c></b></S><T><a>3</a></T></R>"));
+    const SettingsDocument document = SettingsFileReader::Read(path, most);
+    QVERIFY(document.isReadable);
+    QTEST(document.isParsed, "isParsed");
+    QCOMPARE(document.hasTooManyKeys, !document.isParsed);
+    QTEST(int(document.AllValues().size()), "keys");
+    QTEST(document.error, "error");
 }
 
 void tst_SettingsFile::deepNesting()

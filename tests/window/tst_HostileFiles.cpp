@@ -183,6 +183,7 @@ private slots:
     void longNamesInTheMenu();
     void recentFilesInTheWindow();
 
+    void tooManyKeysAreShownAsText();
     void longValueIsShownShortened();
     void longValueSurvivesOtherEdits();
     void longValueIsEdited_data();
@@ -418,6 +419,32 @@ void tst_HostileFiles::recentFilesInTheWindow()
         window->close();
     }
     QVERIFY(QFileInfo(test.settingsFile()).size() < 2000);
+}
+
+void tst_HostileFiles::tooManyKeysAreShownAsText()
+{
+    const QByteArray key("<k>1</k>\n");
+    const QByteArray content =
+        "<R><S>\n" + key.repeated(SettingsFileReader::ShownKeys + 1) + "</S></R>";
+    const ShownSettings shown(content);
+    SettingsEditor* editor = shown.editor;
+    QVERIFY(!editor->ShowsTree());
+    auto const* notice = editor->findChild<NoticeBar*>();
+    QCOMPARE(notice->text(),
+             "Cannot show " + shown.file + " as a tree: It has more than 1,000,000 keys");
+    QCOMPARE(Child<QLabel>(editor, "State of the text")->text(),
+             QString("This file has more keys than can be shown as settings. Only the start of the "
+                     "file is shown, and it cannot be edited as text."));
+    auto* text = Child<QPlainTextEdit>(editor, "File text");
+    QVERIFY(text->isReadOnly() && text->extraSelections().isEmpty());
+    QVERIFY(text->toPlainText().startsWith("<R><S>\n<k>1</k>\n"));
+
+    // A part of them as a tree could be saved in place of all.
+    QTest::keyClick(text, Qt::Key_T, Qt::ControlModifier);
+    editor->ShowAsTree();
+    QVERIFY(!editor->ShowsTree());
+    QCOMPARE(Status(*shown.window), QString("This file has too many keys to be shown as settings"));
+    QCOMPARE(TestFiles::read(shown.file), content);
 }
 
 void tst_HostileFiles::longValueIsShownShortened()

@@ -56,29 +56,6 @@ SettingsEdit EditAt(SettingsEdit::Kind kind, Place place)
     return edit;
 }
 
-// From the end of the document to its start, each row once, and no item of a removed section.
-QVector<Place> PlacesToRemove(QModelIndexList const& indexes)
-{
-    QVector<Place> places;
-    for (QModelIndex const& index : indexes) {
-        if (index.isValid() && index.column() == SettingsModel::NameColumn)
-            places.append(SettingsModel::PlaceOf(index));
-    }
-    const auto before = [](Place a, Place b) {
-        return a.section != b.section ? a.section < b.section : a.item < b.item;
-    };
-    std::sort(places.begin(), places.end(), before);
-    QVector<Place> result;
-    for (Place place : qAsConst(places)) {
-        const Place last = result.isEmpty() ? Place() : result.last();
-        const bool isCovered = last.item < 0 || last.item == place.item;
-        if (last.section != place.section || !isCovered)
-            result.append(place);
-    }
-    std::reverse(result.begin(), result.end());
-    return result;
-}
-
 QString const& NameOf(SettingsDocument::Section const& section)
 {
     return section.name;
@@ -202,10 +179,39 @@ QModelIndex SettingsCommands::Duplicate(QModelIndex const& index)
     return m_model->IndexOf({place.section, place.item + 1});
 }
 
+// From the end of the document to its start, each row once, and no item of a removed section.
+QVector<Place> SettingsCommands::placesToRemove(QModelIndexList const& indexes) const
+{
+    QVector<Place> places;
+    for (QModelIndex const& index : indexes) {
+        if (!index.isValid() || index.column() != SettingsModel::NameColumn)
+            continue;
+        const Place place = SettingsModel::PlaceOf(index);
+        const bool isPart = place.item < 0 && m_model->HidesItemsOf(place.section);
+        if (isPart)
+            places += m_model->ShownItemsOf(place.section);
+        else
+            places.append(place);
+    }
+    const auto before = [](Place a, Place b) {
+        return a.section != b.section ? a.section < b.section : a.item < b.item;
+    };
+    std::sort(places.begin(), places.end(), before);
+    QVector<Place> result;
+    for (Place place : qAsConst(places)) {
+        const Place last = result.isEmpty() ? Place() : result.last();
+        const bool isCovered = last.item < 0 || last.item == place.item;
+        if (last.section != place.section || !isCovered)
+            result.append(place);
+    }
+    std::reverse(result.begin(), result.end());
+    return result;
+}
+
 void SettingsCommands::Remove(QModelIndexList const& indexes)
 {
     Edits edits;
-    const QVector<Place> places = PlacesToRemove(indexes);
+    const QVector<Place> places = placesToRemove(indexes);
     for (Place place : places)
         edits.append(
             EditAt(place.item < 0 ? SettingsEdit::RemoveSection : SettingsEdit::RemoveItem, place));
@@ -254,34 +260,40 @@ QString SettingsCommands::removalText(Edits const& removals) const
     return tr("Removed ") + of + tr(", with %Ln key(s): ", nullptr, keys) + list;
 }
 
-void SettingsCommands::BackToDefault(QModelIndexList const& indexes)
+void SettingsCommands::backToDefault(QVector<Place> const& items)
 {
     Edits edits;
-    const auto add = [&](QModelIndex const& item) {
-        if (!m_model->DiffersFromDefault(item))
-            return;
-        edits.append(EditAt(SettingsEdit::SetValue, SettingsModel::PlaceOf(item)));
-        edits.last().text = m_model->DefaultOf(item);
-    };
-    for (QModelIndex const& index : indexes) {
-        if (!SettingsModel::IsSection(index)) {
-            add(index);
+    for (Place place : items) {
+        if (!m_model->DiffersFromDefault(place))
             continue;
-        }
-        const Place place = SettingsModel::PlaceOf(index);
-        for (int i = 0; i < m_model->document().sections.at(place.section).items.size(); ++i)
-            add(m_model->IndexOf({place.section, i}));
+        edits.append(EditAt(SettingsEdit::SetValue, place));
+        edits.last().text = m_model->DefaultOf(place);
     }
     if (!edits.isEmpty())
         push(edits, tr("Back to Default"));
 }
 
+void SettingsCommands::BackToDefault(QModelIndexList const& indexes)
+{
+    QVector<Place> items;
+    for (QModelIndex const& index : indexes) {
+        if (SettingsModel::IsSection(index))
+            items += m_model->ShownItemsOf(SettingsModel::PlaceOf(index).section);
+        else
+            items.append(SettingsModel::PlaceOf(index));
+    }
+    backToDefault(items);
+}
+
 void SettingsCommands::AllBackToDefault()
 {
-    QModelIndexList sections;
-    for (int i = 0; i < m_model->document().sections.size(); ++i)
-        sections.append(m_model->IndexOf({i, -1}));
-    BackToDefault(sections);
+    QVector<Place> items;
+    auto const& sections = m_model->document().sections;
+    for (int section = 0; section < sections.size(); ++section) {
+        for (int item = 0; item < sections.at(section).items.size(); ++item)
+            items.append(Place{section, item});
+    }
+    backToDefault(items);
 }
 
 // Rows that stay keep their place on the screen.
@@ -313,14 +325,15 @@ void SettingsCommands::Move(QModelIndex const& index, int step)
 {
     if (!index.isValid())
         return;
-    const Place place = SettingsModel::PlaceOf(index);
-    const int target = index.row() + step;
-    if (target < 0 || target >= m_model->rowCount(m_model->parent(index)))
+    const QModelIndex beside = index.sibling(index.row() + step, SettingsModel::NameColumn);
+    if (!beside.isValid())
         return;
+    const Place place = SettingsModel::PlaceOf(index);
+    const Place target = SettingsModel::PlaceOf(beside);
     const bool isSection = place.item < 0;
     SettingsEdit edit =
         EditAt(isSection ? SettingsEdit::MoveSection : SettingsEdit::MoveItem, place);
-    edit.target = target;
+    edit.target = isSection ? target.section : target.item;
     push({edit}, isSection ? tr("Move Section") : tr("Move Key"));
 }
 

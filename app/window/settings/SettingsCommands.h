@@ -50,8 +50,8 @@ public:
     /// @return its name cell; invalid if the index is
     QModelIndex Duplicate(QModelIndex const& index);
 
-    /// Removes sections and items; in one step, however many. Emits `removed` for more than one
-    /// key.
+    /// Removes sections and items; in one step, however many. Of a section with hidden items, only
+    /// those that are shown are removed. Emits `removed` for more than one key.
     ///
     /// @param indexes  in any order; of each row, only the first column counts
     void Remove(QModelIndexList const& indexes);
@@ -65,13 +65,13 @@ public:
     /// Gives items their default values, in one step. Those without a default, and those that have
     /// it already, stay as they are.
     ///
-    /// @param indexes  in any order; a section stands for all its items
+    /// @param indexes  in any order; a section stands for its items that are shown
     void BackToDefault(QModelIndexList const& indexes);
 
-    /// The same for all items.
+    /// The same for all items, shown or not.
     void AllBackToDefault();
 
-    /// Moves a section among the sections, or an item within its section.
+    /// Moves a section among the sections that are shown, or an item within its section.
     ///
     /// @param step  1 moves down, -1 up
     void Move(QModelIndex const& index, int step);
@@ -97,6 +97,8 @@ Q_SIGNALS:
 private:
     using Edits = QVector<SettingsEdit>;
 
+    QVector<SettingsModel::Place> placesToRemove(QModelIndexList const& indexes) const;
+    void backToDefault(QVector<SettingsModel::Place> const& items);
     Edits editsTo(SettingsDocument const& document) const;
     void push(Edits const& edits, QString const& text);
     QStringList namesBeside(SettingsModel::Place place) const;

@@ -45,7 +45,7 @@ SettingsEditor::SettingsEditor(QWidget* parent)
       m_comparison(&m_model, &m_commands, this), m_notice(new NoticeBar),
       m_fileNotice(new FileNotice), m_removal(new NoticeBar(tr("Removal"))),
       m_pages(new QStackedWidget), m_tree(new SettingsTree(&m_model, &m_commands)),
-      m_find(new SettingsFindBar(m_tree)), m_text(new SettingsTextPage)
+      m_find(new SettingsFindBar(m_tree, &m_model)), m_text(new SettingsTextPage)
 {
     m_pages->addWidget(makeTreePage());
     m_pages->addWidget(m_text);
@@ -120,6 +120,7 @@ QWidget* SettingsEditor::makeTreePage()
     connect(m_save, &QPushButton::clicked, this, &SettingsEditor::Save);
     connect(m_tree->selectionModel(), &QItemSelectionModel::currentChanged, this,
             &SettingsEditor::updateButtons);
+    connect(&m_model, &SettingsModel::modelReset, this, &SettingsEditor::updateButtons);
 
     auto* buttons = new QHBoxLayout;
     buttons->addWidget(m_addSection);
@@ -142,10 +143,11 @@ void SettingsEditor::Open(QString const& path)
     m_path = path;
     m_notice->Dismiss();
     m_fileNotice->SetFile(path); // first, so that it tells of a change while the file is read
-    const SettingsDocument document = SettingsFileReader::Read(path);
+    const SettingsDocument document = SettingsFileReader::Read(path, SettingsFileReader::ShownKeys);
     m_saver.NoteRead(path, document);
-    m_model.SetDocument(document.isParsed ? document : SettingsDocument());
+    m_model.SetSaved(document);
     m_model.SetDefaults(SettingsDefaults::Of(path));
+    m_model.SetDocument(document.isParsed ? document : SettingsDocument());
     m_commands.undoStack()->clear();
     m_hasTree = document.isParsed;
     m_hasText = !document.isParsed;
@@ -161,7 +163,8 @@ void SettingsEditor::Open(QString const& path)
 void SettingsEditor::Reload()
 {
     m_fileNotice->SetFile(m_path);
-    const SettingsDocument document = SettingsFileReader::Read(m_path);
+    const SettingsDocument document =
+        SettingsFileReader::Read(m_path, SettingsFileReader::ShownKeys);
     if (!ShowsTree() && m_text->isModified() && document.isReadable) {
         m_text->Replace(WholeFile(m_path));
         m_text->SetModified(false);
@@ -180,6 +183,8 @@ void SettingsEditor::Reload()
     m_commands.Replace(document, tr("Reload"));
     m_commands.undoStack()->setClean();
     m_saver.NoteRead(m_path, document);
+    m_model.SetSaved(document);
+    m_find->Refresh();
     m_hasText = false;
     m_tree->GoTo(m_model.IndexOf(place));
     m_tree->setFocus();
@@ -212,6 +217,7 @@ void SettingsEditor::CompareWithOther()
 void SettingsEditor::keepMine()
 {
     m_saver.AcceptFile();
+    m_model.SetSaved(SettingsFileReader::Read(m_path));
     m_fileNotice->SetFile(m_path);
     if (ShowsTree())
         m_commands.undoStack()->resetClean();
@@ -241,6 +247,7 @@ void SettingsEditor::noteSaved()
 {
     m_notice->Dismiss();
     m_fileNotice->SetFile(m_path);
+    m_model.SetSaved(ShowsTree() ? document() : m_text->parsed());
     if (ShowsTree()) {
         m_commands.undoStack()->setClean();
         m_hasText = false;
@@ -258,6 +265,7 @@ void SettingsEditor::noteSaved()
 void SettingsEditor::showTree(SettingsDocument const& document)
 {
     m_tree->ShowAll();
+    m_find->Refresh();
     updateButtons();
     showPage(TreePage);
     if (document.lossCount > 0)
@@ -268,7 +276,7 @@ void SettingsEditor::showTree(SettingsDocument const& document)
 void SettingsEditor::showMalformed(SettingsDocument const& document)
 {
     QString message = tr("Cannot show %1 as a tree: %2").arg(m_path, document.error);
-    if (document.line > 0)
+    if (document.line > 0 && !document.hasTooManyKeys)
         message += tr(" (line %1, column %2)").arg(document.line).arg(document.column);
     m_notice->ShowMessage(message);
     m_text->Show(WholeFile(m_path), document);
@@ -318,7 +326,12 @@ void SettingsEditor::ShowAsTree()
     if (ShowsTree())
         return;
     const SettingsDocument parsed =
-        m_text->isReadOnly() ? SettingsFileReader::Read(m_path) : m_text->parsed();
+        m_text->isReadOnly() ? SettingsFileReader::Read(m_path, SettingsFileReader::ShownKeys)
+                             : m_text->parsed();
+    if (parsed.hasTooManyKeys) {
+        Q_EMIT messageReported(tr("This file has too many keys to be shown as settings"));
+        return;
+    }
     const SettingsDocument settings = parsed.WithErrorAsLoss();
     m_saver.NoteLosses(settings);
     if (m_hasTree && m_text->bytes() == m_shownText) {
@@ -326,6 +339,7 @@ void SettingsEditor::ShowAsTree()
     } else {
         if (m_hasTree && settings.rootName == m_model.document().rootName) {
             m_commands.Replace(settings, tr("Edit as Text"));
+            m_find->Refresh();
             showPage(TreePage);
         } else {
             m_commands.undoStack()->clear();
@@ -399,6 +413,7 @@ void SettingsEditor::bringBack(QString const& statePath, QString const& title)
     }
     if (ShowsTree() && state.isParsed && state.rootName == document().rootName) {
         m_commands.Replace(state, tr("Bring Back"));
+        m_find->Refresh();
         m_tree->setFocus();
     } else {
         ShowAsText();

@@ -3,6 +3,8 @@
 
 #include "app/window/settings/SettingsFindBar.h"
 
+#include "app/settingsfile/SettingsFilter.h"
+#include "app/window/settings/SettingsModel.h"
 #include "app/window/settings/SettingsTree.h"
 #include "app/window/widgets/PlainText.h"
 
@@ -14,8 +16,15 @@
 
 namespace Velocor {
 
-SettingsFindBar::SettingsFindBar(SettingsTree* tree, QWidget* parent)
-    : QWidget(parent), m_tree(tree), m_text(new QLineEdit), m_result(NewPlainLabel())
+SettingsFindBar::SettingsFindBar(SettingsTree* tree, SettingsModel const* model, QWidget* parent)
+    : QWidget(parent), m_tree(tree), m_model(model), m_text(new QLineEdit),
+      m_onlyMatches(makeSwitch(tr("&Only Matches"),
+                               tr("Show only the sections and keys that match (Alt+O)"))),
+      m_onlyChanged(makeSwitch(tr("&Changed"),
+                               tr("Show only values that are not yet saved like that (Alt+C)"))),
+      m_onlyDiffering(makeSwitch(tr("Not &Default"),
+                                 tr("Show only values that differ from their default (Alt+D)"))),
+      m_result(NewPlainLabel())
 {
     m_text->setPlaceholderText(tr("Find in names and values"));
     m_text->setAccessibleName(tr("Find in names and values"));
@@ -31,11 +40,14 @@ SettingsFindBar::SettingsFindBar(SettingsTree* tree, QWidget* parent)
     connect(previous, &QToolButton::clicked, this, [this] { FindNext(-1); });
     connect(next, &QToolButton::clicked, this, [this] { FindNext(1); });
     connect(close, &QToolButton::clicked, this, &SettingsFindBar::Close);
-    connect(m_text, &QLineEdit::textChanged, this, [this] { find(1, true); });
+    connect(m_text, &QLineEdit::textChanged, this, &SettingsFindBar::search);
 
     auto* layout = new QHBoxLayout(this);
     layout->setContentsMargins(0, 0, 0, 0);
     layout->addWidget(m_text, 1);
+    layout->addWidget(m_onlyMatches);
+    layout->addWidget(m_onlyChanged);
+    layout->addWidget(m_onlyDiffering);
     layout->addWidget(m_result);
     layout->addWidget(previous);
     layout->addWidget(next);
@@ -54,9 +66,20 @@ QToolButton* SettingsFindBar::makeButton(QString const& text, QString const& nam
     return button;
 }
 
+QToolButton* SettingsFindBar::makeSwitch(QString const& text, QString const& toolTip)
+{
+    QToolButton* button = makeButton(text, QString(text).remove(QLatin1Char('&')), toolTip);
+    button->setCheckable(true);
+    connect(button, &QToolButton::toggled, this, &SettingsFindBar::search);
+    return button;
+}
+
 void SettingsFindBar::Open()
 {
+    const bool wasHidden = isHidden();
     show();
+    if (wasHidden)
+        Refresh();
     m_text->setFocus();
     m_text->selectAll();
 }
@@ -64,7 +87,39 @@ void SettingsFindBar::Open()
 void SettingsFindBar::Close()
 {
     hide();
+    if (!m_model->filter().isEmpty())
+        m_tree->SetFilter(SettingsFilter());
     m_tree->setFocus();
+}
+
+SettingsFilter SettingsFindBar::filter() const
+{
+    SettingsFilter filter;
+    if (!isHidden()) {
+        filter.text = m_onlyMatches->isChecked() ? m_text->text() : QString();
+        filter.onlyChanged = m_onlyChanged->isChecked();
+        filter.onlyDiffering = m_onlyDiffering->isChecked() && m_onlyDiffering->isEnabled();
+    }
+    return filter;
+}
+
+void SettingsFindBar::Refresh()
+{
+    m_onlyDiffering->setEnabled(m_model->hasDefaults());
+    if (!filter().isEmpty() || !m_model->filter().isEmpty())
+        search();
+}
+
+// Without a filter, only the current row changes.
+void SettingsFindBar::search()
+{
+    const SettingsFilter wanted = filter();
+    if (wanted.isEmpty() && m_model->filter().isEmpty()) {
+        find(1, true);
+        return;
+    }
+    m_tree->SetFilter(wanted);
+    find(1, true);
 }
 
 void SettingsFindBar::FindNext(int step)
@@ -79,7 +134,13 @@ void SettingsFindBar::find(int step, bool fromCurrent)
 {
     const QString text = m_text->text();
     const bool isFound = text.isEmpty() || m_tree->Find(text, step, fromCurrent);
-    m_result->setText(isFound ? QString() : tr("No match"));
+    const int shown = m_model->shownCount();
+    if (!isFound || m_model->rowCount() == 0)
+        m_result->setText(tr("No match"));
+    else if (m_model->filter().isEmpty())
+        m_result->clear();
+    else
+        m_result->setText(shown == 1 ? tr("1 key") : tr("%L1 keys").arg(shown));
 }
 
 void SettingsFindBar::keyPressEvent(QKeyEvent* event)

@@ -11,23 +11,29 @@ class QToolButton;
 
 namespace Velocor {
 
+class SettingsModel;
 class SettingsTree;
+struct SettingsFilter;
 
-/// Finds names and values that contain a text, in any letter case, and goes to them in the tree.
-/// Hidden until it is opened. GUI thread only.
+/// Finds names and values that contain a text, in any letter case, and goes to them in the tree, or
+/// makes it show only them, only what was changed, or only what differs from defaults. Hidden until
+/// it is opened. GUI thread only.
 class SettingsFindBar : public QWidget
 {
     Q_OBJECT
 
 public:
-    /// @param tree  not owned; outlives the bar
-    explicit SettingsFindBar(SettingsTree* tree, QWidget* parent = nullptr);
+    /// @param tree, model  not owned; outlive the bar
+    SettingsFindBar(SettingsTree* tree, SettingsModel const* model, QWidget* parent = nullptr);
 
     /// Shows the bar, with its text selected for typing over it.
     void Open();
 
-    /// Hides the bar, and gives the tree the keyboard focus.
+    /// Hides the bar, shows all keys again, and gives the tree the keyboard focus.
     void Close();
+
+    /// Applies the filter to what the keys are now, and offers only what the file has.
+    void Refresh();
 
     /// Goes to the next match after the current row, around the end if necessary; opens the bar if
     /// there is no text yet.
@@ -39,11 +45,18 @@ protected:
     void keyPressEvent(QKeyEvent* event) override;
 
 private:
+    SettingsFilter filter() const;
+    void search();
     void find(int step, bool fromCurrent);
     QToolButton* makeButton(QString const& text, QString const& name, QString const& toolTip);
+    QToolButton* makeSwitch(QString const& text, QString const& toolTip);
 
     SettingsTree* m_tree;
+    SettingsModel const* m_model;
     QLineEdit* m_text;
+    QToolButton* m_onlyMatches;
+    QToolButton* m_onlyChanged;
+    QToolButton* m_onlyDiffering;
     QLabel* m_result;
 };
 

@@ -3,6 +3,7 @@
 
 #include "app/window/settings/SettingsModel.h"
 
+#include "app/settingsfile/CaselessText.h"
 #include "app/window/settings/ValueDialog.h"
 #include "app/window/settings/ValueEditing.h"
 #include "app/window/settings/ValueIcons.h"
@@ -27,74 +28,166 @@ void SettingsModel::SetDocument(SettingsDocument const& document)
     beginResetModel();
     m_document = document;
     m_chosenKinds.clear();
-    m_rows.clear();
-    for (int i = 0; i < document.sections.size(); ++i)
-        m_rows.push_back(std::make_unique<int>(i));
+    makeRows();
     endResetModel();
+}
+
+void SettingsModel::SetFilter(SettingsFilter const& filter)
+{
+    beginResetModel();
+    m_filter = filter;
+    makeRows();
+    endResetModel();
+}
+
+void SettingsModel::makeRows()
+{
+    SettingsFilter::Shown shown = m_filter.Of(
+        m_document, m_filter.onlyChanged ? m_saved.AllValues() : SettingsValues(), m_defaults);
+    m_shownSections = SettingsRows(std::move(shown.sections));
+    m_rows.clear();
+    for (std::vector<int>& items : shown.items)
+        m_rows.push_back(std::make_unique<SectionRows>(
+            SectionRows{static_cast<int>(m_rows.size()), SettingsRows(std::move(items))}));
+}
+
+int SettingsModel::shownCount() const
+{
+    int count = 0;
+    for (int row = 0; row < m_shownSections.count(); ++row)
+        count += itemCount(row);
+    return count;
 }
 
 void SettingsModel::SetDefaults(SettingsValues const& defaults)
 {
     m_defaults = defaults;
-    for (int i = 0; i < m_document.sections.size(); ++i) {
-        const int last = m_document.sections.at(i).items.size() - 1;
-        if (last >= 0)
-            Q_EMIT dataChanged(IndexOf({i, 0}, ValueColumn), IndexOf({i, last}, ValueColumn));
+    for (int row = 0; row < m_shownSections.count(); ++row) {
+        const QModelIndex section = index(row, NameColumn);
+        if (itemCount(row) > 0)
+            Q_EMIT dataChanged(index(0, ValueColumn, section),
+                               index(itemCount(row) - 1, ValueColumn, section));
     }
 }
 
-QString SettingsModel::DefaultOf(QModelIndex const& index) const
+QString SettingsModel::DefaultOf(Place place) const
 {
-    const Place place = PlaceOf(index);
     if (place.item < 0 || m_defaults.isEmpty())
         return QString();
     SettingsDocument::Section const& section = m_document.sections.at(place.section);
     return m_defaults.value({section.name, section.items.at(place.item).key});
 }
 
-bool SettingsModel::DiffersFromDefault(QModelIndex const& index) const
+bool SettingsModel::DiffersFromDefault(Place place) const
 {
-    const QString byDefault = DefaultOf(index);
-    return !byDefault.isNull() && byDefault != FullText(index.sibling(index.row(), ValueColumn));
+    const QString byDefault = DefaultOf(place);
+    return !byDefault.isNull() &&
+           byDefault != m_document.sections.at(place.section).items.at(place.item).value;
+}
+
+bool SettingsModel::HidesItemsOf(int section) const
+{
+    return m_rows[static_cast<std::size_t>(section)]->items.count() <
+           m_document.sections.at(section).items.size();
+}
+
+QVector<SettingsModel::Place> SettingsModel::ShownItemsOf(int section) const
+{
+    QVector<Place> places;
+    SettingsRows const& items = m_rows[static_cast<std::size_t>(section)]->items;
+    for (int row = 0; row < items.count(); ++row)
+        places.append(Place{section, items.at(row)});
+    return places;
 }
 
 void SettingsModel::renumber()
 {
-    int row = 0;
-    for (auto const& entry : m_rows)
-        *entry = row++;
+    int number = 0;
+    for (auto const& rows : m_rows)
+        rows->section = number++;
+}
+
+// The rows among which an edit adds, removes or moves one.
+SettingsRows& SettingsModel::shownBeside(SettingsEdit const& edit)
+{
+    return edit.isOfSection() ? m_shownSections
+                              : m_rows[static_cast<std::size_t>(edit.section)]->items;
+}
+
+// Adds the row of a place, if it is hidden.
+void SettingsModel::show(Place place)
+{
+    if (m_shownSections.RowOf(place.section) < 0) {
+        const int row = m_shownSections.RowFor(place.section);
+        beginInsertRows(QModelIndex(), row, row);
+        m_shownSections.Show(place.section);
+        endInsertRows();
+    }
+    SettingsRows& items = m_rows[static_cast<std::size_t>(place.section)]->items;
+    if (place.item >= 0 && items.RowOf(place.item) < 0) {
+        const int row = items.RowFor(place.item);
+        beginInsertRows(IndexOf({place.section, -1}), row, row);
+        items.Show(place.item);
+        endInsertRows();
+    }
 }
 
 SettingsEdit SettingsModel::Apply(SettingsEdit const& edit)
 {
-    SettingsEdit back;
-    const QModelIndex parent = edit.isOfSection() ? QModelIndex() : IndexOf({edit.section, -1});
-    const int row = edit.isOfSection() ? edit.section : edit.item;
     switch (edit.kind) {
     case SettingsEdit::InsertSection:
     case SettingsEdit::InsertItem:
-        beginInsertRows(parent, row, row);
-        back = edit.Apply(m_document);
-        if (edit.isOfSection())
-            m_rows.insert(m_rows.begin() + row, std::make_unique<int>(row));
-        renumber();
-        endInsertRows();
-        break;
+        return applyInsertion(edit);
     case SettingsEdit::RemoveSection:
     case SettingsEdit::RemoveItem:
-        beginRemoveRows(parent, row, row);
-        back = edit.Apply(m_document);
-        if (edit.isOfSection())
-            m_rows.erase(m_rows.begin() + row);
-        renumber();
-        endRemoveRows();
-        break;
+        return applyRemoval(edit);
     case SettingsEdit::MoveSection:
     case SettingsEdit::MoveItem:
         return applyMove(edit);
     default:
         return applyText(edit);
     }
+}
+
+SettingsEdit SettingsModel::applyInsertion(SettingsEdit const& edit)
+{
+    if (!edit.isOfSection())
+        show({edit.section, -1});
+    const QModelIndex parent = edit.isOfSection() ? QModelIndex() : IndexOf({edit.section, -1});
+    const int number = edit.isOfSection() ? edit.section : edit.item;
+    SettingsRows& shown = shownBeside(edit);
+    const int row = shown.RowFor(number);
+    beginInsertRows(parent, row, row);
+    const SettingsEdit back = edit.Apply(m_document);
+    shown.Insert(number);
+    if (edit.isOfSection())
+        m_rows.insert(m_rows.begin() + number,
+                      std::make_unique<SectionRows>(
+                          SectionRows{number, SettingsRows::All(edit.addedSection.items.size())}));
+    renumber();
+    endInsertRows();
+    Q_EMIT applied(index(row, NameColumn, parent));
+    return back;
+}
+
+SettingsEdit SettingsModel::applyRemoval(SettingsEdit const& edit)
+{
+    if (!edit.isOfSection())
+        show({edit.section, -1});
+    const QModelIndex parent = edit.isOfSection() ? QModelIndex() : IndexOf({edit.section, -1});
+    const int number = edit.isOfSection() ? edit.section : edit.item;
+    SettingsRows& shown = shownBeside(edit);
+    const bool isShown = shown.RowOf(number) >= 0;
+    const int row = shown.RowFor(number);
+    if (isShown)
+        beginRemoveRows(parent, row, row);
+    const SettingsEdit back = edit.Apply(m_document);
+    shown.Remove(number);
+    if (edit.isOfSection())
+        m_rows.erase(m_rows.begin() + number);
+    renumber();
+    if (isShown)
+        endRemoveRows();
     const int left = rowCount(parent);
     Q_EMIT applied(left > 0 ? index(std::min(row, left - 1), NameColumn, parent) : parent);
     return back;
@@ -102,11 +195,17 @@ SettingsEdit SettingsModel::Apply(SettingsEdit const& edit)
 
 SettingsEdit SettingsModel::applyMove(SettingsEdit const& edit)
 {
-    const QModelIndex parent = edit.isOfSection() ? QModelIndex() : IndexOf({edit.section, -1});
     const int from = edit.isOfSection() ? edit.section : edit.item;
     const int to = edit.target;
-    beginMoveRows(parent, from, from, parent, to > from ? to + 1 : to);
+    show({edit.section, edit.isOfSection() ? -1 : from});
+    const QModelIndex parent = edit.isOfSection() ? QModelIndex() : IndexOf({edit.section, -1});
+    SettingsRows& shown = shownBeside(edit);
+    const int row = shown.RowOf(from);
+    const int rowAfter = shown.RowAfterMove(from, to);
+    if (rowAfter != row)
+        beginMoveRows(parent, row, row, parent, rowAfter > row ? rowAfter + 1 : rowAfter);
     const SettingsEdit back = edit.Apply(m_document);
+    shown.Move(from, to);
     if (edit.isOfSection()) {
         const auto start = m_rows.begin();
         if (to > from)
@@ -115,13 +214,15 @@ SettingsEdit SettingsModel::applyMove(SettingsEdit const& edit)
             std::rotate(start + to, start + from, start + from + 1);
         renumber();
     }
-    endMoveRows();
-    Q_EMIT applied(index(to, NameColumn, parent));
+    if (rowAfter != row)
+        endMoveRows();
+    Q_EMIT applied(index(rowAfter, NameColumn, parent));
     return back;
 }
 
 SettingsEdit SettingsModel::applyText(SettingsEdit const& edit)
 {
+    show({edit.section, edit.isOfSection() ? -1 : edit.item});
     const SettingsEdit back = edit.Apply(m_document);
     const QModelIndex cell =
         IndexOf({edit.section, edit.isOfSection() ? -1 : edit.item},
@@ -133,64 +234,78 @@ SettingsEdit SettingsModel::applyText(SettingsEdit const& edit)
 
 QModelIndex SettingsModel::IndexOf(Place place, Column column) const
 {
-    const QModelIndex section = index(place.section, place.item < 0 ? int(column) : 0);
-    return place.item < 0 || !section.isValid() ? section : index(place.item, column, section);
+    const int sectionRow = m_shownSections.RowOf(place.section);
+    const QModelIndex section = index(sectionRow, place.item < 0 ? int(column) : 0);
+    if (place.item < 0 || !section.isValid())
+        return section;
+    const int row = m_rows[static_cast<std::size_t>(place.section)]->items.RowOf(place.item);
+    return index(row, column, section);
 }
 
-QModelIndex SettingsModel::ItemBeside(Place place, int step) const
+int SettingsModel::itemCount(int sectionRow) const
 {
-    auto const& sections = m_document.sections;
-    int section = place.section;
-    int item = place.item + step;
-    while (section >= 0 && section < sections.size()) {
-        const int count = sections.at(section).items.size();
-        if (item >= 0 && item < count)
-            return IndexOf({section, item});
+    return m_rows[static_cast<std::size_t>(m_shownSections.at(sectionRow))]->items.count();
+}
+
+QModelIndex SettingsModel::ItemBeside(QModelIndex const& index, int step) const
+{
+    const bool isSection = IsSection(index);
+    int section = isSection ? index.row() : parent(index).row();
+    int item = (isSection ? -1 : index.row()) + step;
+    while (section >= 0 && section < m_shownSections.count()) {
+        if (item >= 0 && item < itemCount(section))
+            return this->index(item, NameColumn, this->index(section, NameColumn));
         section += step;
         item = 0;
         if (step < 0 && section >= 0)
-            item = sections.at(section).items.size() - 1;
+            item = itemCount(section) - 1;
     }
     return QModelIndex();
 }
 
 // In the order of the tree, around its end.
-SettingsModel::Place SettingsModel::rowBeside(Place place, int step) const
+SettingsModel::Row SettingsModel::rowBeside(Row row, int step) const
 {
-    auto const& sections = m_document.sections;
+    const int count = m_shownSections.count();
     if (step > 0) {
-        if (place.item + 1 < sections.at(place.section).items.size())
-            return Place{place.section, place.item + 1};
-        return Place{(place.section + 1) % int(sections.size()), -1};
+        if (row.item + 1 < itemCount(row.section))
+            return Row{row.section, row.item + 1};
+        return Row{(row.section + 1) % count, -1};
     }
-    if (place.item >= 0)
-        return Place{place.section, place.item - 1};
-    const int count = sections.size();
-    const int section = (place.section + count - 1) % count;
-    return Place{section, int(sections.at(section).items.size()) - 1};
+    if (row.item >= 0)
+        return Row{row.section, row.item - 1};
+    const int section = (row.section + count - 1) % count;
+    return Row{section, itemCount(section) - 1};
 }
 
-QModelIndex SettingsModel::matchIn(Place place, QString const& text) const
+QModelIndex SettingsModel::matchIn(Row row, CaselessText const& text) const
 {
-    SettingsDocument::Section const& section = m_document.sections.at(place.section);
-    QString const& name = place.item < 0 ? section.name : section.items.at(place.item).key;
-    if (name.contains(text, Qt::CaseInsensitive))
-        return IndexOf(place, NameColumn);
-    if (place.item >= 0 && section.items.at(place.item).value.contains(text, Qt::CaseInsensitive))
-        return IndexOf(place, ValueColumn);
-    return QModelIndex();
-}
-
-QModelIndex SettingsModel::Find(QString const& text, Place from, int step, bool withFrom) const
-{
-    if (m_document.sections.isEmpty())
+    const int number = m_shownSections.at(row.section);
+    SettingsDocument::Section const& section = m_document.sections.at(number);
+    if (row.item < 0)
+        return text.IsIn(section.name) ? index(row.section, NameColumn) : QModelIndex();
+    SettingsDocument::Item const& item =
+        section.items.at(m_rows[static_cast<std::size_t>(number)]->items.at(row.item));
+    const bool isName = text.IsIn(item.key);
+    if (!isName && !text.IsIn(item.value))
         return QModelIndex();
-    const Place start = from.section < 0 ? Place{0, -1} : from;
-    Place place = withFrom ? start : rowBeside(start, step);
-    const Place last = withFrom ? rowBeside(start, -step) : start;
-    for (;; place = rowBeside(place, step)) {
-        const QModelIndex match = matchIn(place, text);
-        if (match.isValid() || (place.section == last.section && place.item == last.item))
+    return index(row.item, isName ? NameColumn : ValueColumn, index(row.section, NameColumn));
+}
+
+QModelIndex SettingsModel::Find(QString const& text, QModelIndex const& from, int step,
+                                bool withFrom) const
+{
+    if (m_shownSections.count() == 0)
+        return QModelIndex();
+    const CaselessText wanted(text);
+    Row start;
+    if (from.isValid())
+        start = IsSection(from) ? Row{from.row(), -1} : Row{parent(from).row(), from.row()};
+    Row row = withFrom ? start : rowBeside(start, step);
+    const Row last = withFrom ? rowBeside(start, -step) : start;
+    for (;; row = rowBeside(row, step)) {
+        const QModelIndex match = matchIn(row, wanted);
+        if (match.isValid() || (row.section == last.section && row.item == last.item))
             return match;
     }
 }
@@ -199,9 +314,12 @@ SettingsModel::Place SettingsModel::PlaceOf(QModelIndex const& index)
 {
     if (!index.isValid())
         return Place();
-    if (IsSection(index))
-        return Place{index.row(), -1};
-    return Place{*static_cast<int const*>(index.internalPointer()), index.row()};
+    if (IsSection(index)) {
+        auto const* model = static_cast<SettingsModel const*>(index.model());
+        return Place{model->m_shownSections.at(index.row()), -1};
+    }
+    auto const* rows = static_cast<SectionRows const*>(index.internalPointer());
+    return Place{rows->section, rows->items.at(index.row())};
 }
 
 bool SettingsModel::IsSection(QModelIndex const& index)
@@ -291,24 +409,26 @@ QModelIndex SettingsModel::index(int row, int column, QModelIndex const& parent)
 {
     if (row < 0 || row >= rowCount(parent) || column < 0 || column >= ColumnCount)
         return QModelIndex();
-    int* section =
-        parent.isValid() ? m_rows[static_cast<std::size_t>(parent.row())].get() : nullptr;
-    return createIndex(row, column, section);
+    if (!parent.isValid())
+        return createIndex(row, column, nullptr);
+    const int section = m_shownSections.at(parent.row());
+    return createIndex(row, column, m_rows[static_cast<std::size_t>(section)].get());
 }
 
 QModelIndex SettingsModel::parent(QModelIndex const& index) const
 {
     if (!index.isValid() || IsSection(index))
         return QModelIndex();
-    return createIndex(PlaceOf(index).section, NameColumn, nullptr);
+    const int section = static_cast<SectionRows const*>(index.internalPointer())->section;
+    return createIndex(m_shownSections.RowOf(section), NameColumn, nullptr);
 }
 
 int SettingsModel::rowCount(QModelIndex const& parent) const
 {
     if (!parent.isValid())
-        return m_document.sections.size();
+        return m_shownSections.count();
     const bool hasItems = IsSection(parent) && parent.column() == NameColumn;
-    return hasItems ? m_document.sections.at(parent.row()).items.size() : 0;
+    return hasItems ? itemCount(parent.row()) : 0;
 }
 
 int SettingsModel::columnCount(QModelIndex const&) const
@@ -352,16 +472,18 @@ QVariant SettingsModel::data(QModelIndex const& index, int role) const
 QVariant SettingsModel::lookOf(QModelIndex const& index, int role) const
 {
     const bool isValue = index.column() == ValueColumn;
-    const bool isBold = IsSection(index) || (isValue && DiffersFromDefault(index));
+    const bool isDifferent = isValue && DiffersFromDefault(PlaceOf(index));
+    const bool isBold = IsSection(index) || isDifferent;
     if (role == Qt::FontRole && isBold) {
         QFont bold;
         bold.setBold(true);
         return bold;
     }
     const bool isText = role == Qt::ToolTipRole || role == Qt::AccessibleDescriptionRole;
-    if (!isText || !isValue || !DiffersFromDefault(index))
+    if (!isText || !isDifferent)
         return QVariant();
-    const QString text = tr("Default: %1").arg(Shortened(DefaultOf(index), ShortenedLength));
+    const QString text =
+        tr("Default: %1").arg(Shortened(DefaultOf(PlaceOf(index)), ShortenedLength));
     return role == Qt::ToolTipRole ? PlainToolTip(text) : text;
 }
 
@@ -377,7 +499,9 @@ Qt::ItemFlags SettingsModel::flags(QModelIndex const& index) const
     if (!index.isValid())
         return Qt::NoItemFlags;
     const Qt::ItemFlags usual = Qt::ItemIsEnabled | Qt::ItemIsSelectable;
-    return IsSection(index) && index.column() == ValueColumn ? usual : usual | Qt::ItemIsEditable;
+    if (!IsSection(index)) // which spares the tree a persistent index for each item
+        return usual | Qt::ItemIsEditable | Qt::ItemNeverHasChildren;
+    return index.column() == ValueColumn ? usual : usual | Qt::ItemIsEditable;
 }
 
 } // namespace Velocor

@@ -4,7 +4,9 @@
 #pragma once
 
 #include "app/settingsfile/SettingsEdit.h"
+#include "app/settingsfile/SettingsFilter.h"
 #include "app/settingsfile/TypedText.h"
+#include "app/window/settings/SettingsRows.h"
 
 #include <QAbstractItemModel>
 #include <QHash>
@@ -15,7 +17,10 @@
 
 namespace Velocor {
 
-/// A settings document as a tree: sections at the top, their keys and values below. GUI thread.
+class CaselessText;
+
+/// A settings document as a tree: sections at the top, their keys and values below, those that a
+/// filter shows. What an edit changes stays shown until the filter is set again. GUI thread.
 ///
 /// Cells show the start of a long text and its size; Qt::EditRole has all of it. The model only
 /// changes by Apply() and SetDocument(): SettingsCommands decides what may be changed.
@@ -40,7 +45,7 @@ public:
 
     explicit SettingsModel(QObject* parent = nullptr) : QAbstractItemModel(parent) {}
 
-    /// Shows another document.
+    /// Shows another document, filtered as before.
     void SetDocument(SettingsDocument const& document);
     SettingsDocument const& document() const { return m_document; }
 
@@ -48,32 +53,48 @@ public:
     void SetDefaults(SettingsValues const& defaults);
     bool hasDefaults() const { return !m_defaults.isEmpty(); }
 
-    /// The default of an item, whichever its column; a null text if there is none.
-    QString DefaultOf(QModelIndex const& index) const;
+    /// The default of an item; a null text if there is none.
+    QString DefaultOf(Place place) const;
 
     /// Whether an item has a default, and another value.
-    bool DiffersFromDefault(QModelIndex const& index) const;
+    bool DiffersFromDefault(Place place) const;
 
-    /// Changes the document, and emits `applied`.
+    /// What is in the file, for a filter that is set later.
+    void SetSaved(SettingsDocument const& saved) { m_saved = saved; }
+
+    /// Shows only some of the keys, from now on. Emits `modelReset`.
+    void SetFilter(SettingsFilter const& filter);
+    SettingsFilter const& filter() const { return m_filter; }
+
+    /// The number of keys that are shown.
+    int shownCount() const;
+
+    /// Changes the document, and emits `applied`. What is changed is shown.
     ///
     /// @return what takes the change back
     SettingsEdit Apply(SettingsEdit const& edit);
 
-    /// The cell of a place; invalid if there is none.
+    /// Whether a section has items that are not shown.
+    bool HidesItemsOf(int section) const;
+
+    /// The items of a section that are shown, in their order.
+    QVector<Place> ShownItemsOf(int section) const;
+
+    /// The cell of a place; invalid if there is none, or it is not shown.
     QModelIndex IndexOf(Place place, Column column = NameColumn) const;
 
-    /// The next item, in whatever section; invalid if there is none.
+    /// The next item that is shown, in whatever section; invalid if there is none.
     ///
     /// @param step  1, or -1 for the previous one
-    QModelIndex ItemBeside(Place place, int step) const;
+    QModelIndex ItemBeside(QModelIndex const& index, int step) const;
 
-    /// The next cell whose text contains another in any letter case, around the end; of a row, the
-    /// first. Invalid if there is none.
+    /// The next cell that is shown and whose text contains another in any letter case, around the
+    /// end; of a row, the first. Invalid if there is none.
     ///
-    /// @param from  a place of the document, or the first one if it is invalid
+    /// @param from  a row, or the first one if it is invalid
     /// @param step  1, or -1 for the previous one
-    /// @param withFrom  whether to look at that place first instead of last
-    QModelIndex Find(QString const& text, Place from, int step, bool withFrom) const;
+    /// @param withFrom  whether to look at that row first instead of last
+    QModelIndex Find(QString const& text, QModelIndex const& from, int step, bool withFrom) const;
 
     /// Makes the value of a row count as one of a kind, until another document is shown. The
     /// choice is that of its section and key, whatever the value becomes.
@@ -116,23 +137,45 @@ Q_SIGNALS:
     void applied(QModelIndex const& index);
 
 private:
+    /// A section of the document, and which of its items are shown. Indexes of items refer to it,
+    /// so they hold while other sections come, go and move.
+    struct SectionRows
+    {
+        int section;
+        SettingsRows items;
+    };
+
+    /// A row, by its position in the tree.
+    struct Row
+    {
+        int section = 0;
+        int item = -1; ///< -1 for the section itself
+    };
+
+    SettingsEdit applyInsertion(SettingsEdit const& edit);
+    SettingsEdit applyRemoval(SettingsEdit const& edit);
     SettingsEdit applyMove(SettingsEdit const& edit);
     SettingsEdit applyText(SettingsEdit const& edit);
+    void show(Place place);
+    void makeRows();
     void renumber();
+    SettingsRows& shownBeside(SettingsEdit const& edit);
+    int itemCount(int sectionRow) const;
     QString text(QModelIndex const& index) const;
     ValueKind kind(Place place) const;
     QVariant valueData(Place place, int role) const;
     QPair<QString, QString> namesOf(QModelIndex const& index) const;
     QVariant lookOf(QModelIndex const& index, int role) const;
-    Place rowBeside(Place place, int step) const;
-    QModelIndex matchIn(Place place, QString const& text) const;
+    Row rowBeside(Row row, int step) const;
+    QModelIndex matchIn(Row row, CaselessText const& text) const;
 
     SettingsDocument m_document;
     QHash<QPair<QString, QString>, ValueKind> m_chosenKinds; ///< by section and key
     SettingsValues m_defaults;
-    /// The row of each section. Indexes of items refer to that of their section, so they hold
-    /// while other sections come, go and move.
-    std::vector<std::unique_ptr<int>> m_rows;
+    SettingsDocument m_saved;
+    SettingsFilter m_filter;
+    SettingsRows m_shownSections;
+    std::vector<std::unique_ptr<SectionRows>> m_rows; ///< of each section
 };
 
 } // namespace Velocor

@@ -213,8 +213,11 @@ void SettingsTextPage::showState()
 {
     const QString found = Contents(m_parsed);
     QString state;
+    const bool isMalformed = !m_parsed.isParsed && !m_parsed.hasTooManyKeys;
     if (m_parsed.isParsed)
         state = tr("This text can be read: %1.").arg(found);
+    else if (m_parsed.hasTooManyKeys)
+        state = tr("This file has more keys than can be shown as settings.");
     else if (m_parsed.line > 0)
         state = tr("Line %1, column %2: %3. Programs get what is before it: %4.")
                     .arg(m_parsed.line)
@@ -227,8 +230,9 @@ void SettingsTextPage::showState()
     else if (isReadOnly())
         state += tr(" This file cannot be edited as text.");
     m_state->setText(state);
-    m_text->SetError(m_parsed.isParsed ? 0 : m_parsed.line, m_parsed.column);
-    m_actions.at(GoToErrorCommand)->setEnabled(!m_parsed.isParsed && m_parsed.line > 0);
+    m_text->SetError(isMalformed ? m_parsed.line : 0, m_parsed.column);
+    m_actions.at(GoToErrorCommand)->setEnabled(isMalformed && m_parsed.line > 0);
+    m_actions.at(ShowSettingsCommand)->setEnabled(!m_parsed.hasTooManyKeys);
     m_save->setEnabled(isModified());
     Q_EMIT stateChanged();
 }

@@ -119,7 +119,7 @@ void SettingsTree::AddOuterActions(QList<QAction*> const& actions)
     insertAction(m_actions.first(), separator);
 }
 
-// Without a current row, there is nothing to change or to find.
+// Without a current row, there is nothing to change.
 void SettingsTree::updateActions()
 {
     const bool hasRow = currentIndex().isValid();
@@ -128,7 +128,7 @@ void SettingsTree::updateActions()
         const auto work = all.at(i).work;
         const bool isOfFile = work == &SettingsTree::AddSection ||
                               work == &SettingsTree::EditAsText ||
-                              work == &SettingsTree::OpenStates;
+                              work == &SettingsTree::OpenFind || work == &SettingsTree::OpenStates;
         const bool isOfDefaults =
             work == &SettingsTree::BackToDefault || work == &SettingsTree::AllBackToDefault;
         m_actions.at(i)->setEnabled(isOfFile ||
@@ -168,7 +168,35 @@ void SettingsTree::ShowAll()
     resizeColumnToContents(SettingsModel::NameColumn);
     setColumnWidth(SettingsModel::NameColumn,
                    qBound(160, columnWidth(SettingsModel::NameColumn) + 24, 360));
-    GoTo(m_model->IndexOf({0, -1}));
+    GoTo(m_model->index(0, SettingsModel::NameColumn));
+    updateActions();
+}
+
+void SettingsTree::noteCollapsed()
+{
+    m_collapsed.clear();
+    for (int row = 0; row < m_model->rowCount(); ++row) {
+        const QModelIndex section = m_model->index(row, SettingsModel::NameColumn);
+        if (!isExpanded(section))
+            m_collapsed.insert(section.data(Qt::EditRole).toString());
+    }
+}
+
+void SettingsTree::SetFilter(SettingsFilter const& filter)
+{
+    EndEditing();
+    const SettingsModel::Place place = SettingsModel::PlaceOf(currentIndex());
+    if (m_model->filter().isEmpty())
+        noteCollapsed();
+    m_model->SetFilter(filter);
+    expandAll();
+    for (int row = 0; row < m_model->rowCount() && filter.isEmpty(); ++row) {
+        const QModelIndex section = m_model->index(row, SettingsModel::NameColumn);
+        if (m_collapsed.contains(section.data(Qt::EditRole).toString()))
+            collapse(section);
+    }
+    const QModelIndex same = m_model->IndexOf(place);
+    GoTo(same.isValid() ? same : m_model->Find(filter.text, QModelIndex(), 1, true));
     updateActions();
 }
 
@@ -190,8 +218,7 @@ void SettingsTree::GoToChanged()
 
 bool SettingsTree::Find(QString const& text, int step, bool fromCurrent)
 {
-    const QModelIndex match =
-        m_model->Find(text, SettingsModel::PlaceOf(currentIndex()), step, fromCurrent);
+    const QModelIndex match = m_model->Find(text, currentIndex(), step, fromCurrent);
     GoTo(match);
     return match.isValid();
 }
@@ -398,7 +425,8 @@ void SettingsTree::editValueBeside(int step)
     const SettingsModel::Place place = SettingsModel::PlaceOf(currentIndex());
     const bool isName = currentIndex().column() == SettingsModel::NameColumn;
     const bool isOwn = isName && place.item >= 0 && step > 0;
-    const QModelIndex row = isOwn ? m_model->IndexOf(place) : m_model->ItemBeside(place, step);
+    const QModelIndex row =
+        isOwn ? m_model->IndexOf(place) : m_model->ItemBeside(currentIndex(), step);
     const QModelIndex value = row.sibling(row.row(), SettingsModel::ValueColumn);
     if (!value.isValid())
         return;

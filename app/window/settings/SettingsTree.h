@@ -6,6 +6,7 @@
 #include "app/window/settings/SettingsModel.h"
 
 #include <QKeySequence>
+#include <QSet>
 #include <QTreeView>
 #include <QVector>
 
@@ -51,6 +52,10 @@ public:
 
     /// Enables the commands that can do something now.
     void updateActions();
+
+    /// Shows only some of the keys, in expanded sections. The current row stays current if it is
+    /// shown. Without a filter, sections are collapsed again that were so before.
+    void SetFilter(SettingsFilter const& filter);
 
     /// Makes a row current and visible.
     void GoTo(QModelIndex const& index);
@@ -133,6 +138,7 @@ private:
     void makeActions();
     void expandNew(QModelIndex const& parent, int first, int last);
     QModelIndexList chosenRows() const;
+    void noteCollapsed();
     void editCell(QModelIndex const& row, SettingsModel::Column column);
     void editValueBeside(int step);
 
@@ -141,6 +147,7 @@ private:
     SettingsDelegate* m_delegate;
     QList<QAction*> m_actions;
     QPersistentModelIndex m_changed;
+    QSet<QString> m_collapsed; ///< the names of such sections before the filter
     bool m_hasOuterActions = false;
     bool m_isRejected = false;
 };
