@@ -96,7 +96,7 @@ private_headers_in_public_ones() {
 # The words are split so that the check does not find itself.
 british_spelling() {
     local stems='behav''iour|organ''is|initial''is|serial''is|recogn''is|optim''is|normal''is|sanit''is'
-    tracked ':!LICENSES/*' | search -nHIiE "\\b(un|de|re)?($stems)|\\b(lic""ence|cen""tre|neigh""bour|fav""our)"
+    tracked ':!LICENSES/*' ':!translations/*' | search -nHIiE "\\b(un|de|re)?($stems)|\\b(lic""ence|cen""tre|neigh""bour|fav""our)"
 }
 
 # Except where CONTRIBUTING.md forbids it.

@@ -38,7 +38,8 @@ for catalog in "$checked"/*.ts; do
         echo "$name: $(grep -c 'type="unfinished"' "$catalog") texts are not translated" >&2
         status=1
     fi
-    if grep -A1 '<name>QObject</name>' -A100000 "$catalog" | grep -E '<source>(Trace|Notification|Warning|Error|Fatal)</source>'; then
+    if sed -n '/<name>QObject</,/<\/context>/p' "$catalog" |
+        grep -E '<source>(Trace|Notification|Warning|Error|Fatal)</source>'; then
         echo "$name: names of severities would be translated in logs" >&2
         status=1
     fi

@@ -185,7 +185,7 @@ void MainMenus::fillViewMenu(QMenu* menu)
     fillEncodingMenu(menu->addMenu(tr("En&coding")));
     fillTextMenu(menu->addMenu(tr("Te&xt")));
     fillAnalyzeMenu(menu->addMenu(tr("Anal&yze")));
-    fillLanguageMenu(menu->addMenu(tr("Lan&guage")));
+    fillLanguageMenu(menu->addMenu(tr("&Display Language")));
     add(menu, tr("&Highlight Rules..."), QKeySequence(tr("Ctrl+Shift+H")),
         tr("Give lines with certain texts a color"),
         [this] { m_targets.tabs->EditHighlightRules(); });

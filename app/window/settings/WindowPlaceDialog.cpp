@@ -8,6 +8,7 @@
 #include "app/window/widgets/PlainText.h"
 #include "app/window/widgets/TextDialog.h"
 
+#include <QCoreApplication>
 #include <QDialogButtonBox>
 #include <QFormLayout>
 #include <QGuiApplication>
@@ -31,6 +32,8 @@ constexpr int TitleBarHeight = 30; // of the window in the picture, in pixels of
 /// The desktop with one window on it.
 class WindowPicture : public QWidget
 {
+    Q_DECLARE_TR_FUNCTIONS(Velocor::WindowPicture)
+
 public:
     WindowPicture()
     {
