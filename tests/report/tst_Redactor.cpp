@@ -3,12 +3,12 @@
 
 #include "app/report/OwnNames.h"
 #include "app/report/Redactor.h"
+#include "support/HostName.h"
 
 #include <QTemporaryDir>
 #include <QtTest>
 
 #include <pwd.h>
-#include <sched.h>
 #include <unistd.h>
 
 using namespace Velocor;
@@ -557,7 +557,7 @@ void tst_Redactor::hostNames()
 {
     QFETCH(QByteArray, host);
     QFETCH(QString, text);
-    if (unshare(CLONE_NEWUTS) != 0 || sethostname(host.constData(), size_t(host.size())) != 0)
+    if (!HostName::set(host))
         QSKIP("only the administrator can give this process another name of the computer");
     Redactor redactor;
     OwnNames::AddTo(redactor);
