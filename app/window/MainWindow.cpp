@@ -300,9 +300,20 @@ void MainWindow::restoreState()
     actions.showToolBar->setChecked(toolBarShown);
     m_toolBar->setVisible(toolBarShown);
     actions.reopen->setChecked(m_settings.Flag(QStringLiteral("reopenFiles"), true));
-    const QString language = m_settings.Text(QStringLiteral("language"));
-    for (QAction* action : actions.languages->actions())
-        action->setChecked(action->data() == language);
+    restoreLanguage();
+}
+
+// One of those in the menu; that of the system if it is another one, such as that of a newer
+// version.
+void MainWindow::restoreLanguage()
+{
+    const QString saved = m_settings.Text(QStringLiteral("language"));
+    const QList<QAction*> languages = m_menus->actions().languages->actions();
+    languages.constFirst()->setChecked(true);
+    for (QAction* action : languages) {
+        if (action->data() == saved)
+            action->setChecked(true);
+    }
 }
 
 // One of those in the menu; none if it is another one.

@@ -80,6 +80,7 @@ private:
     void restoreFirstState();
     void restoreState();
     void restoreGaps();
+    void restoreLanguage();
     void saveState();
     void startWork();
     void openFilesOfStart();

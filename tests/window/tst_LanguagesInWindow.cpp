@@ -1,0 +1,166 @@
+// SPDX-FileCopyrightText: The Velocor authors
+// SPDX-License-Identifier: MIT
+
+// The window in each of its languages.
+
+#include "WindowParts.h"
+#include "WindowTestCase.h"
+
+#include "app/language/Language.h"
+
+#include "common/log/TorkLog.h"
+
+#include <QDirIterator>
+#include <QMap>
+#include <QMenu>
+#include <QMenuBar>
+#include <QRegularExpression>
+
+using namespace Velocor;
+using namespace WindowParts;
+
+namespace {
+
+// A program's surroundings in which a language was chosen.
+class ChosenLanguage : public WindowTest
+{
+public:
+    explicit ChosenLanguage(QString const& code)
+    {
+        if (!TestFiles::write(settingsFile(),
+                              "<VelocorSettings>\n<MainWindow>\n<language>" + code.toUtf8() +
+                                  "</language>\n</MainWindow>\n</VelocorSettings>\n"))
+            qFatal("the settings cannot be written");
+    }
+};
+
+// Those that have the letter of another one in the same menu, and those of menus below.
+QStringList SameMnemonics(QList<QAction*> const& actions, QString const& menu)
+{
+    QStringList same;
+    QMap<QString, QString> letters;
+    for (QAction* action : actions) {
+        const QString text = QString(action->text()).remove("&&");
+        const int at = text.indexOf('&');
+        if (at >= 0) {
+            const QString letter = text.mid(at + 1, 1).toLower();
+            if (letters.contains(letter))
+                same.append(menu + ": " + letters.value(letter) + ", " + text);
+            letters.insert(letter, text);
+        }
+        if (action->menu())
+            same += SameMnemonics(action->menu()->actions(), text);
+    }
+    return same;
+}
+
+// What the program leaves behind, without stamps, the folder of the test, the choice itself, and
+// the widths of columns, which fit the names of severities as shown.
+QMap<QString, QByteArray> Files(TestRun const& run)
+{
+    const QRegularExpression stamp("\\d{4}-\\d\\d-\\d\\d[ T]\\d\\d:\\d\\d:\\d\\d\\.\\d{1,3}");
+    QMap<QString, QByteArray> files;
+    QDirIterator all(run.folder(), QDir::Files | QDir::Hidden, QDirIterator::Subdirectories);
+    while (all.hasNext()) {
+        const QString path = all.next();
+        QString text = QString::fromLatin1(TestFiles::read(path));
+        text.replace(stamp, "STAMP").replace(run.folder(), "FOLDER/");
+        text.remove(QRegularExpression("<language>[^<]*</language>|<columns>[^<]*</columns>"));
+        files.insert(path.mid(run.folder().size()), text.toLatin1());
+    }
+    return files;
+}
+
+QMap<QString, QByteArray> FilesOfAWindow(QString const& language)
+{
+    const ChosenLanguage test(language);
+    {
+        const auto window = WindowTest::show();
+        for (QtMsgType type : {QtDebugMsg, QtInfoMsg, QtWarningMsg, QtCriticalMsg})
+            TorkLog_MessageHandler(type, QMessageLogContext(), "entry");
+        [&] {
+            QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) >= 4, Patience);
+        }();
+        window->close();
+    }
+    return Files(test);
+}
+
+} // namespace
+
+class tst_LanguagesInWindow : public WindowTestCase
+{
+    Q_OBJECT
+
+private slots:
+    void menus_data();
+    void menus();
+    void unknownLanguage();
+    void filesDoNotDependOnIt();
+
+protected slots:
+    void cleanup() override;
+};
+
+void tst_LanguagesInWindow::cleanup()
+{
+    WindowTestCase::cleanup();
+    Language::Use("en");
+}
+
+void tst_LanguagesInWindow::menus_data()
+{
+    QTest::addColumn<QString>("open");
+    QTest::newRow("en") << "Open...";
+    QTest::newRow("de") << QString::fromUtf8("\xC3\x96"
+                                             "ffnen...");
+    QTest::newRow("fr") << "Ouvrir...";
+}
+
+void tst_LanguagesInWindow::menus()
+{
+    const QString code = QTest::currentDataTag();
+    const ChosenLanguage test(code);
+    const auto window = WindowTest::show();
+    QFETCH(QString, open);
+    QVERIFY(Action(*window, open));
+    const QStringList same = SameMnemonics(window->menuBar()->actions(), "menu bar");
+    QVERIFY2(same.isEmpty(), qPrintable(same.join('\n')));
+    QStringList chosen;
+    const QList<QAction*> actions = window->findChildren<QAction*>();
+    for (QAction* action : actions) {
+        if (action->isChecked() && action->data() == code)
+            chosen.append(action->text());
+    }
+    QCOMPARE(chosen.size(), 1);
+}
+
+void tst_LanguagesInWindow::unknownLanguage()
+{
+    const ChosenLanguage test("tlh");
+    {
+        const auto window = WindowTest::show();
+        QVERIFY(Action(*window, "System Language"));
+        QVERIFY(Action(*window, "System Language")->isChecked());
+        window->close();
+    }
+    QVERIFY(!TestFiles::read(test.settingsFile()).contains("tlh"));
+}
+
+void tst_LanguagesInWindow::filesDoNotDependOnIt()
+{
+    const QMap<QString, QByteArray> english = FilesOfAWindow("en");
+    QVERIFY(english.value("data/logs/app.log").contains("Warning"));
+    QVERIFY(english.contains("data/velocor.cfg"));
+    const QStringList names = english.keys();
+    for (char const* code : {"de", "fr"}) {
+        const QMap<QString, QByteArray> others = FilesOfAWindow(code);
+        QCOMPARE(QStringList(others.keys()), names);
+        for (QString const& name : names)
+            QCOMPARE(others.value(name).split('\n'), english.value(name).split('\n'));
+    }
+}
+
+QTEST_MAIN(tst_LanguagesInWindow)
+
+#include "tst_LanguagesInWindow.moc"
