@@ -97,8 +97,14 @@ void Turn(MainWindow& window, int steps)
     const QPoint place = CenterOf(window, BarCount(window) / 2);
     const QPoint global = Strip(window)->mapToGlobal(place);
     QCursor::setPos(global);
-    QWheelEvent turn(place, global, QPoint(), QPoint(0, 120 * steps), 120 * steps, Qt::Vertical,
-                     Qt::NoButton, Qt::NoModifier);
+    const QPoint angle(0, 120 * steps);
+#if QT_VERSION < QT_VERSION_CHECK(6, 0, 0)
+    QWheelEvent turn(place, global, QPoint(), angle, angle.y(), Qt::Vertical, Qt::NoButton,
+                     Qt::NoModifier);
+#else
+    QWheelEvent turn(place, global, QPoint(), angle, Qt::NoButton, Qt::NoModifier,
+                     Qt::NoScrollPhase, false);
+#endif
     QCoreApplication::sendEvent(Strip(window), &turn);
 }
 
