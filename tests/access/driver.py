@@ -16,7 +16,7 @@ import time
 
 from gi.repository import Gio, GLib
 
-PATIENCE = 6  # seconds, for a crowded machine
+PATIENCE = 30  # seconds, for a crowded machine
 
 # The bits of states that are used here.
 ACTIVE, CHECKED, ENABLED, FOCUSABLE, FOCUSED, SELECTED, SHOWING = 1, 4, 8, 11, 12, 23, 25
@@ -283,12 +283,12 @@ class Program:
         os.makedirs(home, exist_ok=True)
         # Qt 5.15 loses a race in many starts: it connects to the accessibility bus, but never
         # registers there, so that nobody can find the program. Then only another start helps.
-        for _ in range(100):
+        for attempt in range(40):
             self.process = subprocess.Popen([program, *files], env=environment, cwd=folder)
             service = wait("being on the accessibility bus", lambda: service_of(self.process.pid))
             self.application = Part(service, "/org/a11y/atspi/accessible/root")
             with contextlib.suppress(Failed):
-                wait("being registered", lambda: self.application in REGISTRY.children(), 0.7)
+                wait("being registered", lambda: self.application in REGISTRY.children(), 0.7 + attempt / 5)
                 break
             self.process.terminate()
             self.process.wait()

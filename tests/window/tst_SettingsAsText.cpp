@@ -379,8 +379,8 @@ void tst_SettingsAsText::findsInTheText_data()
     row("the first", "font", "", "2:3 font", "");
     row("in another case", "FONT", "n", "3:3 Font", "");
     row("the next on the same line", "font", "nn", "3:8 font", "");
-    row("around the end", "font", "nnn", "2:3 font", "Continued at the start");
-    row("the previous one, around the start", "font", "p", "3:8 font", "Continued at the end");
+    row("around the end", "font", "nnn", "2:3 font", "Continued from the top");
+    row("the previous one, around the start", "font", "p", "3:8 font", "Continued from the bottom");
     row("back again", "font", "pp", "3:3 Font", "");
     row("nowhere", "zzz", "", "1:0 ", "No match");
     row("nowhere, asked again", "zzz", "np", "1:0 ", "No match");

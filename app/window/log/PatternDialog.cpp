@@ -127,8 +127,8 @@ QString PatternDialog::stateText(CountedPatterns const& counted) const
     if (counted.isComplete)
         return found;
     const auto percent = static_cast<int>(counted.rows * 100 / std::max<size_t>(m_rows, 1));
-    return m_isStopped ? tr("%1; stopped at %2 %").arg(found).arg(percent)
-                       : tr("%1; counting, %2 %").arg(found).arg(percent);
+    return m_isStopped ? tr("%1; stopped at %2%").arg(found).arg(percent)
+                       : tr("%1; counting, %2%").arg(found).arg(percent);
 }
 
 void PatternDialog::select(int row)

@@ -91,8 +91,8 @@ void TextFindBar::find(int step, bool fromSelection)
         from.movePosition(step < 0 ? QTextCursor::End : QTextCursor::Start);
         match = m_text->document()->find(wanted, from, flags);
         m_result->setText(match.isNull() ? tr("No match")
-                          : step < 0     ? tr("Continued at the end")
-                                         : tr("Continued at the start"));
+                          : step < 0     ? tr("Continued from the bottom")
+                                         : tr("Continued from the top"));
     }
     if (!match.isNull())
         m_text->setTextCursor(match);
