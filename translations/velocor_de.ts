@@ -1474,6 +1474,21 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
     </message>
 </context>
 <context>
+    <name>Velocor::LineDialog</name>
+    <message>
+        <source>Go to Line</source>
+        <translation>Zu Zeile gehen</translation>
+    </message>
+    <message>
+        <source>Line</source>
+        <translation>Zeile</translation>
+    </message>
+    <message>
+        <source>&amp;Line, 1 to %L1</source>
+        <translation>Zei&amp;le, 1 bis %L1</translation>
+    </message>
+</context>
+<context>
     <name>Velocor::LineNumberMargin</name>
     <message>
         <source>Line numbers</source>
@@ -2817,6 +2832,18 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <source>&amp;Display Language</source>
         <translation>Anzeigespra&amp;che</translation>
     </message>
+    <message>
+        <source>&amp;Patterns...</source>
+        <translation>&amp;Muster...</translation>
+    </message>
+    <message>
+        <source>Ctrl+Alt+P</source>
+        <translation>Ctrl+Alt+P</translation>
+    </message>
+    <message>
+        <source>List what messages have in common, and how often</source>
+        <translation>Auflisten, was Meldungen gemeinsam haben, und wie oft</translation>
+    </message>
 </context>
 <context>
     <name>Velocor::MainToolBar</name>
@@ -3001,6 +3028,80 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
     </message>
 </context>
 <context>
+    <name>Velocor::PatternDialog</name>
+    <message>
+        <source>Message Patterns</source>
+        <translation>Muster der Meldungen</translation>
+    </message>
+    <message>
+        <source>What has been counted</source>
+        <translation>Was gezählt wurde</translation>
+    </message>
+    <message>
+        <source>Message patterns</source>
+        <translation>Muster der Meldungen</translation>
+    </message>
+    <message>
+        <source>Go to &amp;First</source>
+        <translation>Zum &amp;ersten gehen</translation>
+    </message>
+    <message>
+        <source>Go to &amp;Last</source>
+        <translation>Zum &amp;letzten gehen</translation>
+    </message>
+    <message>
+        <source>F&amp;ilter</source>
+        <translation>F&amp;iltern</translation>
+    </message>
+    <message>
+        <source>&amp;Stop Counting</source>
+        <translation>Zählen &amp;anhalten</translation>
+    </message>
+    <message>
+        <source>Counting…</source>
+        <translation>Es wird gezählt …</translation>
+    </message>
+    <message>
+        <source>%L1 patterns in %L2 entries</source>
+        <translation>%L1 Muster in %L2 Einträgen</translation>
+    </message>
+    <message>
+        <source>%1; stopped at %2%</source>
+        <translation>%1; bei %2&#xa0;% angehalten</translation>
+    </message>
+    <message>
+        <source>%1; counting, %2%</source>
+        <translation>%1; es wird gezählt, %2&#xa0;%</translation>
+    </message>
+</context>
+<context>
+    <name>Velocor::PatternModel</name>
+    <message>
+        <source>… (other messages)</source>
+        <translation>… (andere Meldungen)</translation>
+    </message>
+    <message>
+        <source>Count</source>
+        <translation>Anzahl</translation>
+    </message>
+    <message>
+        <source>Severity</source>
+        <translation>Schweregrad</translation>
+    </message>
+    <message>
+        <source>First</source>
+        <translation>Erste</translation>
+    </message>
+    <message>
+        <source>Last</source>
+        <translation>Letzte</translation>
+    </message>
+    <message>
+        <source>Pattern</source>
+        <translation>Muster</translation>
+    </message>
+</context>
+<context>
     <name>Velocor::PlacesPanel</name>
     <message>
         <source>Organization</source>
@@ -3126,6 +3227,17 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
 %2</source>
         <translation>%1 konnte nicht gespeichert werden.
 %2</translation>
+    </message>
+</context>
+<context>
+    <name>Velocor::ReachableStyle</name>
+    <message>
+        <source>Clear</source>
+        <translation>Leeren</translation>
+    </message>
+    <message>
+        <source>More tools</source>
+        <translation>Weitere Werkzeuge</translation>
     </message>
 </context>
 <context>
@@ -3690,6 +3802,38 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <source>This file has more keys than can be shown as settings.</source>
         <translation>Diese Datei hat mehr Schlüssel, als sich als Einstellungen zeigen lassen.</translation>
     </message>
+    <message>
+        <source>&amp;Find</source>
+        <translation>&amp;Suchen</translation>
+    </message>
+    <message>
+        <source>Find a text in the file</source>
+        <translation>Einen Text in der Datei suchen</translation>
+    </message>
+    <message>
+        <source>Find Ne&amp;xt</source>
+        <translation>&amp;Weitersuchen</translation>
+    </message>
+    <message>
+        <source>Go to the next match in the text</source>
+        <translation>Zum nächsten Treffer im Text gehen</translation>
+    </message>
+    <message>
+        <source>Find &amp;Previous</source>
+        <translation>&amp;Vorheriges suchen</translation>
+    </message>
+    <message>
+        <source>Go to the previous match in the text</source>
+        <translation>Zum vorherigen Treffer im Text gehen</translation>
+    </message>
+    <message>
+        <source>&amp;Go to Line...</source>
+        <translation>&amp;Zu Zeile gehen...</translation>
+    </message>
+    <message>
+        <source>Go to a line of the text by its number</source>
+        <translation>Zu einer Zeile des Textes gehen, mit ihrer Nummer</translation>
+    </message>
 </context>
 <context>
     <name>Velocor::SettingsTree</name>
@@ -3921,6 +4065,53 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
     <message>
         <source>Standard input is cut off, because %1 cannot be written: %2</source>
         <translation>Die Standardeingabe ist abgeschnitten, weil %1 nicht geschrieben werden kann: %2</translation>
+    </message>
+</context>
+<context>
+    <name>Velocor::TextFindBar</name>
+    <message>
+        <source>Find in the text</source>
+        <translation>Im Text suchen</translation>
+    </message>
+    <message>
+        <source>Result of the search in the text</source>
+        <translation>Ergebnis der Suche im Text</translation>
+    </message>
+    <message>
+        <source>Find previous in the text</source>
+        <translation>Vorheriges im Text suchen</translation>
+    </message>
+    <message>
+        <source>Go to the previous match (Shift+F3)</source>
+        <translation>Zum vorherigen Treffer gehen (Umschalt+F3)</translation>
+    </message>
+    <message>
+        <source>Find next in the text</source>
+        <translation>Nächstes im Text suchen</translation>
+    </message>
+    <message>
+        <source>Go to the next match (F3)</source>
+        <translation>Zum nächsten Treffer gehen (F3)</translation>
+    </message>
+    <message>
+        <source>Close the find bar of the text</source>
+        <translation>Die Suchleiste des Textes schließen</translation>
+    </message>
+    <message>
+        <source>Close (Esc)</source>
+        <translation>Schließen (Esc)</translation>
+    </message>
+    <message>
+        <source>No match</source>
+        <translation>Kein Treffer</translation>
+    </message>
+    <message>
+        <source>Continued from the bottom</source>
+        <translation>Vom Ende fortgesetzt</translation>
+    </message>
+    <message>
+        <source>Continued from the top</source>
+        <translation>Vom Anfang fortgesetzt</translation>
     </message>
 </context>
 <context>

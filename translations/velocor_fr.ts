@@ -1474,6 +1474,21 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
     </message>
 </context>
 <context>
+    <name>Velocor::LineDialog</name>
+    <message>
+        <source>Go to Line</source>
+        <translation>Aller à la ligne</translation>
+    </message>
+    <message>
+        <source>Line</source>
+        <translation>Ligne</translation>
+    </message>
+    <message>
+        <source>&amp;Line, 1 to %L1</source>
+        <translation>&amp;Ligne, 1 à %L1</translation>
+    </message>
+</context>
+<context>
     <name>Velocor::LineNumberMargin</name>
     <message>
         <source>Line numbers</source>
@@ -2817,6 +2832,18 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <source>&amp;Display Language</source>
         <translation>Lan&amp;gue d’affichage</translation>
     </message>
+    <message>
+        <source>&amp;Patterns...</source>
+        <translation>&amp;Modèles...</translation>
+    </message>
+    <message>
+        <source>Ctrl+Alt+P</source>
+        <translation>Ctrl+Alt+P</translation>
+    </message>
+    <message>
+        <source>List what messages have in common, and how often</source>
+        <translation>Lister ce que les messages ont en commun, et combien de fois</translation>
+    </message>
 </context>
 <context>
     <name>Velocor::MainToolBar</name>
@@ -3001,6 +3028,80 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
     </message>
 </context>
 <context>
+    <name>Velocor::PatternDialog</name>
+    <message>
+        <source>Message Patterns</source>
+        <translation>Modèles de messages</translation>
+    </message>
+    <message>
+        <source>What has been counted</source>
+        <translation>Ce qui a été compté</translation>
+    </message>
+    <message>
+        <source>Message patterns</source>
+        <translation>Modèles de messages</translation>
+    </message>
+    <message>
+        <source>Go to &amp;First</source>
+        <translation>Aller au &amp;premier</translation>
+    </message>
+    <message>
+        <source>Go to &amp;Last</source>
+        <translation>Aller au &amp;dernier</translation>
+    </message>
+    <message>
+        <source>F&amp;ilter</source>
+        <translation>F&amp;iltrer</translation>
+    </message>
+    <message>
+        <source>&amp;Stop Counting</source>
+        <translation>&amp;Arrêter le comptage</translation>
+    </message>
+    <message>
+        <source>Counting…</source>
+        <translation>Comptage…</translation>
+    </message>
+    <message>
+        <source>%L1 patterns in %L2 entries</source>
+        <translation>%L1 modèles dans %L2 entrées</translation>
+    </message>
+    <message>
+        <source>%1; stopped at %2%</source>
+        <translation>%1&#x202f;; arrêté à %2&#xa0;%</translation>
+    </message>
+    <message>
+        <source>%1; counting, %2%</source>
+        <translation>%1&#x202f;; comptage, %2&#xa0;%</translation>
+    </message>
+</context>
+<context>
+    <name>Velocor::PatternModel</name>
+    <message>
+        <source>… (other messages)</source>
+        <translation>… (autres messages)</translation>
+    </message>
+    <message>
+        <source>Count</source>
+        <translation>Nombre</translation>
+    </message>
+    <message>
+        <source>Severity</source>
+        <translation>Gravité</translation>
+    </message>
+    <message>
+        <source>First</source>
+        <translation>Premier</translation>
+    </message>
+    <message>
+        <source>Last</source>
+        <translation>Dernier</translation>
+    </message>
+    <message>
+        <source>Pattern</source>
+        <translation>Modèle</translation>
+    </message>
+</context>
+<context>
     <name>Velocor::PlacesPanel</name>
     <message>
         <source>Organization</source>
@@ -3126,6 +3227,17 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
 %2</source>
         <translation>%1 n’a pas pu être enregistré.
 %2</translation>
+    </message>
+</context>
+<context>
+    <name>Velocor::ReachableStyle</name>
+    <message>
+        <source>Clear</source>
+        <translation>Effacer</translation>
+    </message>
+    <message>
+        <source>More tools</source>
+        <translation>Autres outils</translation>
     </message>
 </context>
 <context>
@@ -3690,6 +3802,38 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <source>This file has more keys than can be shown as settings.</source>
         <translation>Ce fichier a plus de clés qu’il n’est possible d’en afficher comme réglages.</translation>
     </message>
+    <message>
+        <source>&amp;Find</source>
+        <translation>Rec&amp;hercher</translation>
+    </message>
+    <message>
+        <source>Find a text in the file</source>
+        <translation>Rechercher un texte dans le fichier</translation>
+    </message>
+    <message>
+        <source>Find Ne&amp;xt</source>
+        <translation>Rechercher le s&amp;uivant</translation>
+    </message>
+    <message>
+        <source>Go to the next match in the text</source>
+        <translation>Aller au résultat suivant dans le texte</translation>
+    </message>
+    <message>
+        <source>Find &amp;Previous</source>
+        <translation>Rechercher le &amp;précédent</translation>
+    </message>
+    <message>
+        <source>Go to the previous match in the text</source>
+        <translation>Aller au résultat précédent dans le texte</translation>
+    </message>
+    <message>
+        <source>&amp;Go to Line...</source>
+        <translation>A&amp;ller à la ligne...</translation>
+    </message>
+    <message>
+        <source>Go to a line of the text by its number</source>
+        <translation>Aller à une ligne du texte par son numéro</translation>
+    </message>
 </context>
 <context>
     <name>Velocor::SettingsTree</name>
@@ -3921,6 +4065,53 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
     <message>
         <source>Standard input is cut off, because %1 cannot be written: %2</source>
         <translation>L’entrée standard est coupée, car %1 ne peut pas être écrit&#xa0;: %2</translation>
+    </message>
+</context>
+<context>
+    <name>Velocor::TextFindBar</name>
+    <message>
+        <source>Find in the text</source>
+        <translation>Rechercher dans le texte</translation>
+    </message>
+    <message>
+        <source>Result of the search in the text</source>
+        <translation>Résultat de la recherche dans le texte</translation>
+    </message>
+    <message>
+        <source>Find previous in the text</source>
+        <translation>Rechercher le précédent dans le texte</translation>
+    </message>
+    <message>
+        <source>Go to the previous match (Shift+F3)</source>
+        <translation>Aller au résultat précédent (Maj+F3)</translation>
+    </message>
+    <message>
+        <source>Find next in the text</source>
+        <translation>Rechercher le suivant dans le texte</translation>
+    </message>
+    <message>
+        <source>Go to the next match (F3)</source>
+        <translation>Aller au résultat suivant (F3)</translation>
+    </message>
+    <message>
+        <source>Close the find bar of the text</source>
+        <translation>Fermer la barre de recherche du texte</translation>
+    </message>
+    <message>
+        <source>Close (Esc)</source>
+        <translation>Fermer (Échap)</translation>
+    </message>
+    <message>
+        <source>No match</source>
+        <translation>Aucun résultat</translation>
+    </message>
+    <message>
+        <source>Continued from the bottom</source>
+        <translation>Reprise depuis la fin</translation>
+    </message>
+    <message>
+        <source>Continued from the top</source>
+        <translation>Reprise depuis le début</translation>
     </message>
 </context>
 <context>
