@@ -4,8 +4,9 @@
 #pragma once
 
 #include "app/history/HistoryUpdate.h"
-#include "app/history/IndexedLogFile.h"
+#include "app/history/OlderHistory.h"
 #include "app/history/RunEnds.h"
+#include "app/history/RunList.h"
 #include "app/logfile/LogFilter.h"
 #include "app/logfile/LogLineParser.h"
 #include "app/logfile/LogScanner.h"
@@ -76,29 +77,12 @@ Q_SIGNALS:
 private:
     bool isCurrentRequest() const { return m_currentRequest == m_request; }
     LogFilter wholeFilter(LogFilter filter) const;
-    void forgetOlder();
-    QStringList listOlder() const;
-    void openOlder();
-    bool isOlderChanged() const;
-    bool prepareOlder();
-    bool readOlder();
-    bool searchOlder();
-    void reportProgress(qint64 done, qint64 total);
-    void joinOlder();
-    static void addRuns(std::vector<size_t> const& starts, size_t first, size_t end, quint64 file,
-                        std::vector<HistoryRun>& runs, std::vector<RunHeading>& headings);
-    void makeOlderRows();
-    void addEarlierRows(LogRows const& from, std::vector<size_t> const& starts, size_t offset,
-                        size_t& run, std::vector<RunHeading> const& headings, LogRows& rows) const;
-    void addNewestRows(LogRows const& from, size_t offset, size_t run,
-                       std::vector<RunHeading> const& headings, LogRows& rows) const;
     void take(LogUpdate const& update);
     void checkOlder();
     void checkEnds();
     void appendCurrentLines();
-    std::vector<RunHeading> makeHeadings();
+    RunList makeRuns();
     void report(bool isFolding);
-    void addOlder(HistoryUpdate& update) const;
 
     LogScanner* m_scanner;
     QTimer* m_endTimer = nullptr;
@@ -107,26 +91,11 @@ private:
     bool m_isAll = false;
     bool m_isWatched = false;
     QString m_path;
-    LogLineParser m_parser; // with the type of all files
-    LogFilter m_filter;
 
-    // The older files, oldest first.
-    std::vector<IndexedLogFile> m_files;
-    std::vector<size_t> m_firstLines; // of each, in the table
-    QStringList m_listed;             // also those that cannot be read
-    QStringList m_unreadable;
-    std::shared_ptr<OlderLogFiles const> m_older;
-    bool m_isOlderRead = false;
-    bool m_isOlderSearched = false; // for the text of the filter
-    bool m_hasOlderRows = false;
-    int m_olderPercent = 0; // of all bytes, as far as they have been read
-    LogRows m_olderRows;
-    std::vector<HistoryRun> m_olderRuns;
-    std::vector<RunHeading> m_olderHeadings;
-    size_t m_olderLines = 0;
-
-    LineTable m_lines;    // of all files
-    LineTable m_appended; // of the current file, as they are in m_lines
+    OlderHistory m_older;
+    std::shared_ptr<OlderLogFiles const> m_files; // whose lines are in m_lines
+    LineTable m_lines;                            // of all files
+    LineTable m_appended;                         // of the current file, as they are in m_lines
     LogUpdate m_current;
     bool m_hasCurrent = false;
     bool m_isReset = true;

@@ -84,6 +84,7 @@ private slots:
     void slowLine();
     void counts();
     void isReadAgain();
+    void linesAddedToOlderFile();
     void emptyCurrentFile();
     void changesOnlyWhatIsNew();
     void obsoleteRequest();
@@ -199,6 +200,21 @@ void tst_HistoryScanner::isReadAgain()
     const int updates = scanner.updates;
     scanner->Poll();
     QCOMPARE(scanner.updates, updates);
+}
+
+// The lines of the current file move back in the table of all lines.
+void tst_HistoryScanner::linesAddedToOlderFile()
+{
+    const QString path = log("added.log");
+    const QByteArray a = Entry("2025-03-01", "a");
+    QVERIFY(TestFiles::write(path + ".1", a));
+    QVERIFY(TestFiles::write(path, Entry("2025-03-02", "b") + Entry("2025-03-02", "long e")));
+    Scanner scanner;
+    scanner.open(path);
+    QCOMPARE(scanner.shown(), QString("|a|be"));
+    QVERIFY(TestFiles::write(path + ".1", a + QByteArray(100, 'c') + "\nd\n"));
+    scanner->Poll();
+    QCOMPARE(scanner.shown(), QString("|acd|be"));
 }
 
 void tst_HistoryScanner::emptyCurrentFile()
