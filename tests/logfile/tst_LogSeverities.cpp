@@ -40,7 +40,7 @@ void tst_LogSeverities::severities()
     QTEST(LogSeverities::IsProblem(asked), "isProblem");
 }
 
-// The log translates its names in the context of QObject, and so does this test.
+// Only for the window: what a log has stays as it is.
 void tst_LogSeverities::translatedName()
 {
     class Translator : public QTranslator
@@ -54,7 +54,7 @@ void tst_LogSeverities::translatedName()
     };
     Translator translator;
     QCoreApplication::installTranslator(&translator);
-    QCOMPARE(LogSeverities::Name(LogEntry::Error), QString("QObject/Error"));
+    QCOMPARE(LogSeverities::Name(LogEntry::Error), QString("Velocor::LogSeverities/Error"));
     QCOMPARE(LogSeverities::LoggedName(LogEntry::Error), "Error");
     QCOMPARE(LogSeverities::Name(LogEntry::None), QString());
 }
