@@ -283,12 +283,12 @@ class Program:
         os.makedirs(home, exist_ok=True)
         # Qt 5.15 loses a race in many starts: it connects to the accessibility bus, but never
         # registers there, so that nobody can find the program. Then only another start helps.
-        for attempt in range(40):
+        for attempt in range(60):
             self.process = subprocess.Popen([program, *files], env=environment, cwd=folder)
             service = wait("being on the accessibility bus", lambda: service_of(self.process.pid))
             self.application = Part(service, "/org/a11y/atspi/accessible/root")
             with contextlib.suppress(Failed):
-                wait("being registered", lambda: self.application in REGISTRY.children(), 0.7 + attempt / 5)
+                wait("being registered", lambda: self.application in REGISTRY.children(), 0.3 + attempt / 20)
                 break
             self.process.terminate()
             self.process.wait()
