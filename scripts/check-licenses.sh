@@ -11,7 +11,9 @@ set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")/.."
 
 if [ "${1:-}" != --list ]; then
-    reuse lint >/dev/null || { reuse lint && exit 1; }
+    reuse lint >/dev/null || {
+        reuse lint || exit 1
+    }
     echo "licenses: $(git ls-files | wc -l) files have one"
     exit
 fi

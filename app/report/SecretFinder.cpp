@@ -234,6 +234,13 @@ std::vector<Pattern> TokenPatterns()
                 QStringLiteral("authorization\\\\?[\"']?\\s*[:=]\\s*\\\\?[\"']?(?:bearer|basic|"
                                "digest|token|negotiate|ntlm)\\s+\\K[^\\s\"'<>]+")),
         AnyCase(SecretKind::Token, QStringLiteral("\\bcookie\\s*:\\s*\\K[^\\s<>\"][^\\n<>\"]*")),
+    };
+}
+
+// What is named beside it, in the arguments of programs, addresses, sentences and attributes.
+std::vector<Pattern> NamedPatterns()
+{
+    return {
         AnyCase(SecretKind::Password,
                 QStringLiteral("--[\\w-]*(?:%1|token|secret|api-?key)[\\w-]*[= ]\\s*%2")
                     .arg(QLatin1String(PasswordWords), QLatin1String(Argument)),
@@ -326,8 +333,9 @@ void SecretFinder::Find(QString const& text, std::vector<Place>& places)
 {
     static const std::vector<Pattern> addresses = AddressPatterns();
     static const std::vector<Pattern> tokens = TokenPatterns();
+    static const std::vector<Pattern> named = NamedPatterns();
     FindKeyBlocks(text, places);
-    for (auto const* patterns : {&addresses, &tokens}) {
+    for (auto const* patterns : {&addresses, &tokens, &named}) {
         for (Pattern const& pattern : *patterns)
             FindMatches(text, pattern.expression, pattern.kind, pattern.filter, places);
     }
