@@ -59,11 +59,11 @@ LogLineParser::LogLineParser(QStringList const& dateFormats, QStringList const& 
     for (QString const& prefix : prefixes)
         m_elapsedPrefixes.push_back(prefix.toLatin1());
 
-    // The log translates its severity names, so a file may hold both kinds.
+    // A program may translate the names in its log, so a file may hold both kinds.
     for (int i = 0; i < LogEntry::None; ++i) {
         const auto severity = static_cast<LogEntry::Severity>(i);
         const QByteArray name = LogSeverities::LoggedName(severity);
-        const QByteArray translated = LogSeverities::Name(severity).toLatin1();
+        const QByteArray translated = LogSeverities::NameInLog(severity).toLatin1();
         m_names.emplace_back(name, severity);
         if (translated != name && !translated.isEmpty())
             m_names.emplace_back(translated, severity);

@@ -4,6 +4,7 @@
 #include "app/logfile/LogSeverities.h"
 
 #include <QCoreApplication>
+#include <QObject>
 
 #include <iterator>
 
@@ -28,6 +29,11 @@ static_assert(std::size(Names) == LogEntry::None + 1, "a name for each severity"
 char const* LogSeverities::LoggedName(LogEntry::Severity severity)
 {
     return Names[severity];
+}
+
+QString LogSeverities::NameInLog(LogEntry::Severity severity)
+{
+    return severity == LogEntry::None ? QString() : QObject::tr(LoggedName(severity));
 }
 
 QString LogSeverities::Name(LogEntry::Severity severity)

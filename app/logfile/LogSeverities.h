@@ -16,8 +16,11 @@ public:
     /// The untranslated name in log entries; empty for None.
     static char const* LoggedName(LogEntry::Severity severity);
 
-    /// The name in the user's language, which a translated program also uses in its entries; empty
-    /// for None.
+    /// The name in the entries of this program's log: as the framework's texts are translated,
+    /// which no catalog of the window does but a program's own may; empty for None.
+    static QString NameInLog(LogEntry::Severity severity);
+
+    /// The name to show, in the language of the window; empty for None.
     static QString Name(LogEntry::Severity severity);
 
     /// Whether it is a warning or worse.

@@ -5,6 +5,7 @@
 
 #include "app/logfile/ForeignLine.h"
 
+#include <QTranslator>
 #include <QtTest>
 
 #include <random>
@@ -26,6 +27,7 @@ private slots:
     void foreignFile_data();
     void foreignFile();
     void wideLine();
+    void translatedLog();
     void settings_data();
     void settings();
     void anyBytes();
@@ -208,6 +210,30 @@ void tst_LogLineParser::wideLine()
     QCOMPARE(entry.time, QString("2025-03-03 09:02:11.031"));
     QCOMPARE(entry.severity, LogEntry::Error);
     QCOMPARE(entry.message, QString(QChar(0xE9)));
+}
+
+// A program may translate the framework's texts; what the window shows is in none of its logs.
+void tst_LogLineParser::translatedLog()
+{
+    class Translator : public QTranslator
+    {
+    public:
+        QString translate(char const* context, char const* text, char const*, int) const override
+        {
+            const QString name = QString(text).replace("Error", "Fehler");
+            return qstrcmp(context, "QObject") == 0 ? name : name + " shown";
+        }
+        bool isEmpty() const override { return false; }
+    };
+    Translator translator;
+    QCoreApplication::installTranslator(&translator);
+    const LogLineParser parser;
+    for (char const* name : {"Error", "Fehler"}) {
+        const LogEntry entry = parser.Parse(QByteArray("2025-03-03 09:02:11.031 ") + name + " x");
+        QCOMPARE(entry.severity, LogEntry::Error);
+        QCOMPARE(entry.message, QString("x"));
+    }
+    QCOMPARE(parser.Parse("2025-03-03 09:02:11.031 Fehler shown").message, QString("shown"));
 }
 
 void tst_LogLineParser::settings_data()

@@ -40,7 +40,7 @@ void tst_LogSeverities::severities()
     QTEST(LogSeverities::IsProblem(asked), "isProblem");
 }
 
-// Only for the window: what a log has stays as it is.
+// What a log has is translated where the framework does it, what the window shows in its catalogs.
 void tst_LogSeverities::translatedName()
 {
     class Translator : public QTranslator
@@ -55,6 +55,8 @@ void tst_LogSeverities::translatedName()
     Translator translator;
     QCoreApplication::installTranslator(&translator);
     QCOMPARE(LogSeverities::Name(LogEntry::Error), QString("Velocor::LogSeverities/Error"));
+    QCOMPARE(LogSeverities::NameInLog(LogEntry::Error), QString("QObject/Error"));
+    QCOMPARE(LogSeverities::NameInLog(LogEntry::None), QString());
     QCOMPARE(LogSeverities::LoggedName(LogEntry::Error), "Error");
     QCOMPARE(LogSeverities::Name(LogEntry::None), QString());
 }

@@ -23,3 +23,10 @@ void WindowTestCase::cleanup()
         window->hide();
     QGuiApplication::clipboard()->clear();
 }
+
+// A clear button fades for a moment even if its window has gone, and no one tells when that is
+// over.
+void WindowTestCase::cleanupTestCase()
+{
+    QTest::qWait(250);
+}

@@ -15,4 +15,7 @@ protected slots:
 
     /// Leaves no window on the screen, nothing on the clipboard, and nobody waiting for a dialog.
     virtual void cleanup();
+
+    /// Lets animations end, which Qt deletes only then.
+    void cleanupTestCase();
 };

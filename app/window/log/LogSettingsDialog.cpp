@@ -126,7 +126,8 @@ QString LogSettingsDialog::problem() const
 void LogSettingsDialog::check()
 {
     QString sample = QDateTime::currentDateTime().toString(m_dateFormat->text()) +
-                     QLatin1Char(' ') + LogSeverities::Name(LogEntry::Trace) + QLatin1Char(' ');
+                     QLatin1Char(' ') + LogSeverities::NameInLog(LogEntry::Trace) +
+                     QLatin1Char(' ');
     if (m_elapsed->isChecked())
         sample += m_elapsedPrefix->text() + QLatin1String("[250] ");
     m_sample->setText(sample + tr("message"));
