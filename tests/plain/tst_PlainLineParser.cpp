@@ -196,7 +196,7 @@ std::vector<PlainName> PlainNames()
     for (int i = 0; i < LogEntry::None; ++i) {
         const auto severity = static_cast<LogEntry::Severity>(i);
         names.push_back({LogSeverities::LoggedName(severity), severity});
-        names.push_back({LogSeverities::Name(severity).toLatin1(), severity});
+        names.push_back({LogSeverities::NameInLog(severity).toLatin1(), severity});
     }
     return names;
 }
