@@ -11,6 +11,7 @@
 #include <QStringList>
 #include <QSysInfo>
 
+#include <array>
 #include <pwd.h>
 #include <unistd.h>
 
@@ -32,11 +33,10 @@ void AddUser(Redactor& redactor, QString const& name)
 
 void AddAccount(Redactor& redactor)
 {
-    constexpr int Size = 16 * 1024;
-    QByteArray buffer(Size, '\0');
+    std::array<char, 16 * 1024> buffer = {};
     passwd entry = {};
     passwd* found = nullptr;
-    if (::getpwuid_r(::getuid(), &entry, buffer.data(), Size, &found) != 0 || !found)
+    if (::getpwuid_r(::getuid(), &entry, buffer.data(), buffer.size(), &found) != 0 || !found)
         return;
     AddUser(redactor, QString::fromLocal8Bit(entry.pw_name));
     AddHome(redactor, QFile::decodeName(entry.pw_dir));
