@@ -18,7 +18,7 @@ trap 'rm -rf "$home"' EXIT
 export HOME=$home XDG_RUNTIME_DIR=$home QT_QPA_PLATFORM=offscreen
 unset XDG_DATA_HOME XDG_CONFIG_HOME
 
-answer=$(./run --version | tee /dev/stderr | tail -n 1) 
+answer=$(./run --version | tee /dev/stderr | tail -n 1) # which shows what the compiler says, too
 [[ $answer =~ ^velocor\ [0-9.]+$ ]] || fail "./run --version printed: $answer"
 [ "$(dist/bin/velocor-log --version)" = "velocor-log ${answer#velocor }" ] ||
     fail "velocor-log has another version than $answer"
