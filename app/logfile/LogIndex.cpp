@@ -110,6 +110,7 @@ qint64 LogIndex::Begin()
     m_formerEnd = m_position;
     m_knownEnd = completeOffset();
     m_knownSeam = hasSeam ? m_lines.start(m_runs[1].firstLine) : -1;
+    m_hasLostRun = false;
     m_isSeamUnchanged = false;
     m_hasMoved = false;
     // What follows a run that was read to its end was added to it, however old it looks. Without a
@@ -145,8 +146,10 @@ void LogIndex::keepKnownLines()
     if (!m_lastIsComplete)
         m_known.Truncate(m_known.size() - 1);
     m_knownMatches.resize(std::min(m_knownMatches.size(), m_known.size()));
-    while (m_knownRuns.size() > 1 && m_knownRuns.back().firstLine >= m_known.size())
-        m_knownRuns.pop_back();
+    while (m_knownRuns.size() > 1 && m_knownRuns.back().firstLine >= m_known.size()) {
+        m_knownRuns.pop_back(); // all of it is the incomplete line
+        m_hasLostRun = true;
+    }
 }
 
 void LogIndex::forgetKnownLines()
@@ -202,7 +205,8 @@ void LogIndex::End()
     forgetKnownLines();
     if (m_lineIsPartial)
         addLine(m_partialLine.constData(), m_partialLine.size(), false);
-    m_hasLostSeam = m_knownSeam >= 0 && m_runs.size() == 1 && !m_isOneRun;
+    const bool hasLostAll = m_knownSeam >= 0 && m_runs.size() == 1;
+    m_hasLostSeam = (hasLostAll || m_hasLostRun) && !m_isOneRun;
 }
 
 // Whether the line with this index matches the text filter.

@@ -142,7 +142,8 @@ public:
 
     /// Whether the last pass found no seam, although there had been one. Either the newest run has
     /// overwritten all earlier ones, or it has changed what follows it in a way that a pass over
-    /// the new lines cannot recognize: the file should be read from the start by a new index.
+    /// the new lines cannot recognize: the file should be read from the start by a new index. The
+    /// same is true if the seam before an incomplete last line may be lost.
     bool hasLostSeam() const { return m_hasLostSeam; }
 
     /// The number of the first line, starting at 1, that the filter's expression takes too long
@@ -260,6 +261,7 @@ private:
     qint64 m_formerEnd = 0;
     qint64 m_knownEnd = 0;
     qint64 m_knownSeam = -1; // -1: there was none
+    bool m_hasLostRun = false;
     bool m_isSeamUnchanged = false;
     LineTable m_known;       // from m_knownFirst on
     size_t m_knownFirst = 0; // the first line after the seam

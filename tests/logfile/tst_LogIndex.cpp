@@ -171,6 +171,7 @@ private slots:
     void olderEntryOverATornOne();
     void restartOfARunWithoutTimes();
     void lostSeam();
+    void lostRunAtTheEnd();
     void anyBytes();
 };
 
@@ -876,6 +877,30 @@ void tst_LogIndex::seams()
     LogIndex index(LogLineParser({format}, {}));
     Pass(index, newer + older, 4096);
     QTEST(index.RunStarts().size() == 2, "isSeam");
+}
+
+// Of the oldest run, only the start of a line is left. Passes that read just that line again cannot
+// tell that it is older.
+void tst_LogIndex::lostRunAtTheEnd()
+{
+    const QByteArray newest = entry("12:00:00.000", "Trace", "newest");
+    QByteArray file =
+        newest + entry("09:00:00.000", "Trace", "older") + entry("06:00:00.000", "Trace", "oldest");
+    file.chop(3);
+    LogIndex index;
+    Pass(index, file, 4096);
+    QCOMPARE(index.RunStarts(), (std::vector<size_t>{0, 1, 2}));
+    QVERIFY(!index.hasLostSeam());
+    Pass(index, file, 4096);
+    QVERIFY(index.hasLostSeam());
+
+    file += "est\n";
+    index = LogIndex();
+    for (int pass = 0; pass < 3; ++pass) {
+        Pass(index, file, 4096);
+        QCOMPARE(index.RunStarts(), (std::vector<size_t>{0, 1, 2}));
+        QVERIFY(!index.hasLostSeam());
+    }
 }
 
 void tst_LogIndex::passesOverAWritingRun_data()
