@@ -45,7 +45,7 @@ public:
     HistoryRun const& run() const { return m_history->runs()[m_run]; }
     HistoryFile const& file() const { return m_lines->file(); }
     size_t line() const { return m_line; } ///< its number in the file, starting at 0
-    quint8 mark() const { return file().rows().mark(m_row - 1); } ///< of its row, see LogRows
+    LogEntry::Severity severity() const { return m_lines->severity(m_line); } ///< of its entry
 
     /// Where the line starts in the file, and the one after it.
     qint64 start() { return m_lines->start(m_line); }

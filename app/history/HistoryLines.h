@@ -22,6 +22,10 @@ public:
 
     size_t size() const { return m_lines->size(); }
     quint8 mark(size_t line) const { return m_lines->mark(line); }
+    LogEntry::Severity severity(size_t line) const
+    {
+        return static_cast<LogEntry::Severity>(mark(line) & LogRows::SeverityMask);
+    }
 
     /// Where a line starts in the file; where the file ended for the line after the last one.
     qint64 start(size_t line);

@@ -172,6 +172,7 @@ bool LogIndex::Feed(char const* bytes, int count)
 {
     if (m_position == 0)
         m_search.Learn(bytes, count);
+    m_candidate = -1;
     char const* at = bytes;
     char const* const end = bytes + count;
     while (at != end) {
@@ -179,6 +180,8 @@ bool LogIndex::Feed(char const* bytes, int count)
         char const* const lineEnd = m_lineEnd.Find(at, end, m_position + (at - bytes), before);
         const int length = static_cast<int>((lineEnd ? lineEnd : end) - at);
         if (lineEnd && !m_lineIsPartial) {
+            if (m_filter.hasText() && m_candidate < m_lineStart)
+                m_candidate = m_lineStart + distanceOfCandidate(at, end);
             if (!addLine(at, length, true))
                 return false;
         } else {
@@ -200,9 +203,18 @@ bool LogIndex::Feed(char const* bytes, int count)
     return true;
 }
 
+// Candidates are looked for in all bytes rather than in each line, for the goal "filter by
+// expression in a terminal" in docs/performance.md; compared in tst_PlainSearch. A line in UTF-16
+// is narrowed before it is searched.
+std::ptrdiff_t LogIndex::distanceOfCandidate(char const* at, char const* end) const
+{
+    return m_parser.fileType().encoding.isWide() ? 0 : m_search.Find(at, end) - at;
+}
+
 void LogIndex::End()
 {
     forgetKnownLines();
+    m_candidate = -1;
     if (m_lineIsPartial)
         addLine(m_partialLine.constData(), m_partialLine.size(), false);
     const bool hasLostAll = m_knownSeam >= 0 && m_runs.size() == 1;
@@ -278,8 +290,11 @@ bool LogIndex::addLine(char const* line, int length, bool complete)
     }
     if (m_isSeamUnchanged && m_lineStart >= m_formerEnd)
         joinRuns();
-    if (m_filter.hasText())
-        m_matches.push_back(matchOf(line, length, m_lines.size()));
+    if (m_filter.hasText()) {
+        const bool isCandidate = m_candidate < end || m_slowLine > 0;
+        m_matches.push_back(isCandidate ? matchOf(line, length, m_lines.size())
+                                        : m_search.answer());
+    }
     const quint8 mark = markOf(parts);
     m_lines.Append(m_lineStart, mark, check);
     count(mark, 1);

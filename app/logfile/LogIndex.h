@@ -206,6 +206,7 @@ private:
     bool addLine(char const* line, int length, bool complete);
     quint8 markOf(LogLineParser::Parts const& parts);
     int contentLength(char const* line, int length, bool complete) const;
+    std::ptrdiff_t distanceOfCandidate(char const* at, char const* end) const;
     LogFilter::Match matchOf(char const* line, int length, size_t index);
     qint64 endOf(size_t line) const;
     void searchLine(char const* line, qint64 length);
@@ -249,6 +250,7 @@ private:
     // The current pass.
     qint64 m_seamLimit = 0; // no seam from here on
     qint64 m_position = 0;
+    qint64 m_candidate = -1; // the next in the bytes being fed; -1 if it is not known
     qint64 m_lineStart = 0;
     QByteArray m_partialLine;
     bool m_lineIsPartial = false;

@@ -81,11 +81,10 @@ public:
 
     void Write(PrintedLine const& line) override
     {
-        const auto severity = static_cast<LogEntry::Severity>(line.mark & LogRows::SeverityMask);
         const QString shown = TextFormats::Harmless(line.parser.Text(line.content));
         const QByteArray text = (m_programs.text(line.program) + shown).toLocal8Bit();
-        if (m_isColored && LogSeverities::IsProblem(severity))
-            m_output->Write((severity == LogEntry::Warning ? "\033[33m" : "\033[31m") + text +
+        if (m_isColored && LogSeverities::IsProblem(line.severity))
+            m_output->Write((line.severity == LogEntry::Warning ? "\033[33m" : "\033[31m") + text +
                             "\033[0m\n");
         else
             m_output->Write(text + '\n');

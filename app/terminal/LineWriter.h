@@ -21,11 +21,11 @@ struct PrintedLine
     QString const& program;
     QString const& path;
     LogLineParser const& parser;
-    QByteArray const& bytes;   ///< as stored in the file, with its line end
-    QByteArray const& content; ///< the same without its line end
-    quint8 mark;               ///< of its row, see LogRows
-    size_t number;             ///< in the file, starting at 1
-    qint64 time;               ///< see HistoryCursor::time()
+    QByteArray const& bytes;     ///< as stored in the file, with its line end
+    QByteArray const& content;   ///< the same without its line end
+    LogEntry::Severity severity; ///< of its entry
+    size_t number;               ///< in the file, starting at 1
+    qint64 time;                 ///< see HistoryCursor::time()
 };
 
 /// Prints lines of logs in a format.

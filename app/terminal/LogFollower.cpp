@@ -185,8 +185,8 @@ void LogFollower::print(LogRows const& rows, size_t row, QByteArray const& conte
 {
     const qint64 time = timeOf(content);
     const QByteArray bytes = content + lineEnd;
-    m_print(
-        {m_program, m_path, m_parser, bytes, content, rows.mark(row), rows.line(row) + 1, time});
+    m_print({m_program, m_path, m_parser, bytes, content, rows.severity(row), rows.line(row) + 1,
+             time});
 }
 
 // A stamp without a date is of today.

@@ -4,6 +4,7 @@
 #include "app/terminal/OutputBuffer.h"
 
 #include <cerrno>
+#include <fcntl.h>
 #include <poll.h>
 #include <unistd.h>
 
@@ -11,7 +12,7 @@ namespace Velocor {
 
 namespace {
 
-constexpr int BufferSize = 64 << 10;
+constexpr int BufferSize = 256 << 10;
 
 // Standard output may be a terminal or pipe that another program has made non-blocking.
 void WaitForRoom()
@@ -21,6 +22,18 @@ void WaitForRoom()
 }
 
 } // namespace
+
+// A pipe usually takes less than the buffer has, and whoever writes would have to wait for the
+// reader again and again. For the goal "merge logs in a terminal" in docs/performance.md. What is
+// no pipe refuses, and so does a pipe of a user who has too many; both work as they are.
+OutputBuffer::OutputBuffer()
+{
+#ifdef F_SETPIPE_SZ
+    constexpr int PipeSize = 1 << 20; // the most that a user may ask for
+    if (fcntl(STDOUT_FILENO, F_GETPIPE_SZ) < PipeSize)
+        fcntl(STDOUT_FILENO, F_SETPIPE_SZ, PipeSize);
+#endif
+}
 
 void OutputBuffer::Write(char const* bytes, int size)
 {

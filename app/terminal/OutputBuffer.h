@@ -14,6 +14,9 @@ namespace Velocor {
 class OutputBuffer
 {
 public:
+    /// Enlarges the pipe that standard output may be, for all who use it.
+    OutputBuffer();
+
     void Write(char const* bytes, int size);
     void Write(QByteArray const& bytes) { Write(bytes.constData(), bytes.size()); }
 

@@ -148,7 +148,7 @@ void Command::print(PrintedLog const& source, HistoryCursor& cursor, LineWriter&
         return;
     m_isFound = true;
     writer.Write({source.name, cursor.file().path(), cursor.file().parser(), cursor.bytes(),
-                  cursor.content(), cursor.mark(), cursor.line() + 1, cursor.time()});
+                  cursor.content(), cursor.severity(), cursor.line() + 1, cursor.time()});
 }
 
 void Command::addFollower(PrintedLog const& source, LogHistory const& history, LineWriter& writer)
