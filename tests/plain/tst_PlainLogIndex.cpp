@@ -146,7 +146,8 @@ struct PlainRows
 };
 
 // The whole file, split and sorted out again. It may be told which entries were seen after the
-// newest run: by where they start, with their text.
+// newest run: by where they start, with their text; or that it was seen growing, so that all of it
+// is one run.
 class PlainIndex
 {
 public:
@@ -155,7 +156,8 @@ public:
     PlainIndex() = default;
 
     PlainIndex(QByteArray const& file, bool readsTimes, LogFilter const& filter,
-               Entries const& known = Entries())
+               Entries const& known = Entries(), bool isGrown = false)
+        : m_isGrown(isGrown)
     {
         std::vector<PlainLine> lines;
         for (int at = 0; at < file.size();) {
@@ -206,6 +208,8 @@ public:
         collect(filter);
     }
 
+    bool isOneRun() const { return runs.size() == 1 && runs.front().timed > 0; }
+
     PlainRows rows;
     LogCounts counts{};
     size_t lineCount = 0;
@@ -234,7 +238,7 @@ private:
     bool isOlder(PlainLine const& line, bool isKnown) const
     {
         Run const& run = runs.back();
-        if (!line.isTimed || run.timed == 0 || runs.size() >= 64)
+        if (!line.isTimed || run.timed == 0 || runs.size() >= 64 || m_isGrown)
             return false;
         const bool followsRest = run.rows.size() > run.afterTimed;
         if (line.hasDate != run.hasDate)
@@ -304,6 +308,7 @@ private:
     }
 
     std::vector<Run> runs{1};
+    bool m_isGrown = false;
 };
 
 // Rows as text: where each line begins, and its mark.
@@ -608,16 +613,27 @@ private:
         // What the scanner knows about the order depends on when it had to read from the start.
         const QByteArray file = m_exists ? m_file : QByteArray();
         const PlainIndex fresh(file, m_readsTimes, m_filter);
+        const PlainIndex grown(file, m_readsTimes, m_filter, {}, true);
         PlainIndex plain(file, m_readsTimes, m_filter, m_known);
-        if (IsSame(m_rows, fresh.rows))
+        const bool isGrown = m_mayBeOneRun && file.startsWith(m_before) && isShown(grown);
+        if (isShown(fresh))
             plain = fresh;
-        else if (!IsSame(m_rows, plain.rows))
-            same("rows", Text(m_rows), Text(plain.rows));
+        else if (isGrown && !isShown(plain))
+            plain = grown;
         m_known = plain.older;
+        m_mayBeOneRun = plain.isOneRun() || isGrown;
+        m_before = file;
         same("exists", m_update.exists, m_exists);
         same("error", m_update.error, QString());
+        if (!IsSame(m_rows, plain.rows))
+            same("rows", Text(m_rows), Text(plain.rows));
         same("lines", m_update.lines, plain.lineCount);
         same("counts", Text(m_update.counts), Text(plain.counts));
+    }
+
+    bool isShown(PlainIndex const& plain) const
+    {
+        return IsSame(m_rows, plain.rows) && m_update.counts == plain.counts;
     }
 
     // What a view makes of an update.
@@ -708,6 +724,8 @@ private:
     LogScanner m_scanner;
     LogUpdate m_update;
     PlainIndex::Entries m_known; // perhaps, to the scanner
+    bool m_mayBeOneRun = false;  // to the scanner
+    QByteArray m_before;         // what it was compared with last
     PlainRows m_rows;
     bool m_exists = false;
     bool m_isOpen = false;
