@@ -23,6 +23,11 @@ namespace Velocor {
 
 namespace {
 
+// Qt asks the catalogs for it whenever the language changes. Its own may not be installed.
+//: "RTL" if the language is written from right to left, else "LTR"
+[[maybe_unused]] char const* const Direction =
+    QT_TRANSLATE_NOOP("QGuiApplication", "QT_LAYOUT_DIRECTION");
+
 // Tells the translators of this file from those of others.
 QString ObjectName()
 {

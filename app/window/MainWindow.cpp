@@ -400,7 +400,8 @@ void MainWindow::tellOfAbnormalEnds(std::vector<RunEnd> const& ends)
     m_tabs->ownLog()->AddBar(bar);
     const QString start =
         HistoryTime::DateTime(ends.back().start).toString(QStringLiteral("yyyy-MM-dd hh:mm:ss"));
-    bar->ShowMessage(tr("The program that was started at %1 did not end normally.").arg(start));
+    bar->ShowMessage(
+        tr("The program that was started at %1 did not end normally.").arg(LeftToRight(start)));
     const int shortRuns =
         RunEnds::ShortRunsBefore(RunEnds::Of(RunningLog::FileName()), RunMark::ProgramStart());
     if (shortRuns >= SuspiciousRuns && QFileInfo(m_settings.fileName()).isFile())
@@ -414,7 +415,7 @@ void MainWindow::offerDefaults(NoticeBar* bar)
     bar->ShowMessage(
         tr("It ended within ten seconds at least three times in a row. If that is because "
            "of its settings, set them aside: %1")
-            .arg(m_settings.fileName()));
+            .arg(LeftToRight(m_settings.fileName())));
     QPushButton* button = bar->AddButton(tr("Set Aside"));
     button->setAccessibleName(tr("Set the settings of this window aside"));
     connect(button, &QPushButton::clicked, this, [this, bar, button] {

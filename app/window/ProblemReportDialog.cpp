@@ -170,10 +170,10 @@ void ProblemReportDialog::listSecrets()
     m_secrets->clear();
     for (int secret : present) {
         const QString text = m_redactor.Original(secret).simplified();
-        auto* item =
-            new QListWidgetItem(QStringLiteral("%1  %2").arg(m_redactor.Placeholder(secret),
-                                                             Shortened(text, MaximumShownSecret)),
-                                m_secrets);
+        auto* item = new QListWidgetItem(
+            LeftToRight(QStringLiteral("%1  %2").arg(m_redactor.Placeholder(secret),
+                                                     Shortened(text, MaximumShownSecret))),
+            m_secrets);
         item->setData(Qt::UserRole, secret);
         item->setFlags(item->flags() | Qt::ItemIsUserCheckable);
         item->setCheckState(m_redactor.isShown(secret) ? Qt::Unchecked : Qt::Checked);
@@ -219,7 +219,8 @@ void ProblemReportDialog::chooseFile()
     if (error.isEmpty())
         accept();
     else
-        PlainMessageBox(QMessageBox::Critical, this, tr("Could not save %1.\n%2").arg(path, error))
+        PlainMessageBox(QMessageBox::Critical, this,
+                        tr("Could not save %1.\n%2").arg(LeftToRight(path), error))
             .exec();
 }
 

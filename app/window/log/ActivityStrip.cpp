@@ -55,6 +55,7 @@ ActivityStrip::ActivityStrip(LogModel* model, LogView* view, QWidget* parent)
     : QWidget(parent), m_model(model), m_view(view)
 {
     setAccessibleName(tr("Activity"));
+    setLayoutDirection(Qt::LeftToRight); // as are the bars: the end of the log is on the right
     setFocusPolicy(Qt::StrongFocus);
     setSizePolicy(QSizePolicy::Expanding, QSizePolicy::Fixed);
     hide();
@@ -245,6 +246,7 @@ void ActivityStrip::paintTimes(QPainter& painter) const
 void ActivityStrip::paintEvent(QPaintEvent* /*event*/)
 {
     QPainter painter(this);
+    painter.setLayoutDirection(layoutDirection()); // the painter has that of the application
     const QRect frame = ground().adjusted(-Frame, -Frame, Frame, Frame);
     const bool isFocused = hasFocus();
     painter.fillRect(frame, isFocused ? palette().color(QPalette::Highlight)

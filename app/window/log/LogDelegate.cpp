@@ -112,6 +112,7 @@ void LayOutLines(QTextLayout& layout, qreal width, int mostLines)
 void LayOut(QTextLayout& layout, int width, int mostLines)
 {
     QTextOption option(Qt::AlignLeft);
+    option.setTextDirection(Qt::LeftToRight);
     option.setWrapMode(mostLines == 1 ? QTextOption::NoWrap
                                       : QTextOption::WrapAtWordBoundaryOrAnywhere);
     layout.setTextOption(option);
@@ -347,6 +348,7 @@ void LogDelegate::paintHeading(QPainter* painter, QStyleOptionViewItem const& op
     const QColor text = option.palette.color(QPalette::Text);
     const QColor background = Blended(option.palette.color(QPalette::Base), text, 0.14);
     painter->save();
+    painter->setLayoutDirection(option.direction);
     painter->fillRect(option.rect, background);
     painter->setFont(option.font);
     painter->setPen(text);
