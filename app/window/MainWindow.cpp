@@ -40,6 +40,8 @@
 #include <QStatusBar>
 #include <QVBoxLayout>
 
+#include <algorithm>
+
 // Resources of a static library must be initialized explicitly, outside any namespace.
 static void InitializeResources()
 {
@@ -55,6 +57,7 @@ constexpr int IdleHealthInterval = 60000;  // milliseconds; nothing tells of a d
 constexpr int SuspiciousRuns = 3;          // in a row
 constexpr int MessageTime = 6000;          // milliseconds
 constexpr int MaximumMessageLength = 1000; // characters
+constexpr qreal UsualTextHeight = 18;      // pixels; larger text needs a larger window
 
 QIcon WindowIcon()
 {
@@ -266,8 +269,10 @@ void MainWindow::showPlaces(bool shown)
 
 void MainWindow::restoreFirstState()
 {
-    if (QScreen const* screen = QGuiApplication::primaryScreen())
-        resize(QSize(1080, 680).boundedTo(screen->availableSize() * 9 / 10));
+    if (QScreen const* screen = QGuiApplication::primaryScreen()) {
+        const qreal scale = std::max(1.0, fontMetrics().height() / UsualTextHeight);
+        resize((QSize(1080, 680) * scale).boundedTo(screen->availableSize() * 9 / 10));
+    }
 
     m_settings.RestoreGeometry(this);
 }

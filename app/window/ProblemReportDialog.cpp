@@ -24,6 +24,7 @@
 #include <QVBoxLayout>
 #include <QVariant>
 
+#include <algorithm>
 #include <set>
 
 namespace Velocor {
@@ -63,12 +64,13 @@ ProblemReportDialog::ProblemReportDialog(QList<ReportPart> const& parts, Redacto
     layout->addLayout(newHeading());
     layout->addLayout(middle, 1);
     layout->addWidget(buttons);
-    resize(760, 540);
-
     m_wordsTimer.setSingleShot(true);
     m_wordsTimer.setInterval(TypingPause);
     connect(&m_wordsTimer, &QTimer::timeout, this, &ProblemReportDialog::update);
     update();
+    // With a wrapped label, Qt does not see to the least height.
+    const int width = std::max(760, layout->sizeHint().width());
+    resize(width, std::max(540, layout->heightForWidth(width)));
 }
 
 ProblemReportDialog::~ProblemReportDialog() = default;
@@ -102,7 +104,8 @@ QLayout* ProblemReportDialog::newChoices()
     QLabel* secretsLabel = NewPlainLabel(tr("&Replaced; untick to keep:"));
     secretsLabel->setBuddy(m_secrets);
     m_secrets->setAccessibleName(tr("Replaced by placeholders"));
-    m_secrets->setFixedWidth(ChoicesWidth);
+    m_secrets->setMinimumWidth(ChoicesWidth);
+    m_secrets->setSizePolicy(QSizePolicy::Preferred, QSizePolicy::Expanding);
     connect(m_secrets, &QListWidget::itemChanged, this, &ProblemReportDialog::choose);
     layout->addSpacing(6);
     layout->addWidget(secretsLabel);

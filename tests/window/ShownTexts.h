@@ -145,7 +145,10 @@ inline QStringList overlapping(QWidget* window)
     QStringList found;
     const QList<QWidget*> all = parts(window);
     const auto placeOf = [window](QWidget const* widget) {
-        return QRect(widget->mapTo(window, QPoint()), widget->size());
+        QRect place = widget->rect();
+        for (QWidget const* inner = widget; inner != window; inner = inner->parentWidget())
+            place = place.translated(inner->pos()) & inner->parentWidget()->rect();
+        return place;
     };
     for (int i = 0; i < all.size(); ++i) {
         for (int j = i + 1; j < all.size(); ++j) {
