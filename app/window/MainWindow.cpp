@@ -294,7 +294,7 @@ void MainWindow::restoreState()
     m_tabs->SetSince(actions.since->isChecked());
     restoreGaps();
     m_tabs->highlightRules()->SetFromText(m_settings.Text(QStringLiteral("highlights")));
-    m_tabs->ownLog()->SetColumnWidths(m_settings.Numbers(QStringLiteral("columns")));
+    restoreColumns();
     m_tabs->ownLog()->SetPaneSizes(m_settings.Numbers(QStringLiteral("linePane")));
     m_files->RestoreRecent(m_settings);
     QStringList filters = m_settings.Text(QStringLiteral("filters")).split(QLatin1Char('\n'));
@@ -306,6 +306,15 @@ void MainWindow::restoreState()
     m_toolBar->setVisible(toolBarShown);
     actions.reopen->setChecked(m_settings.Flag(QStringLiteral("reopenFiles"), true));
     restoreLanguage();
+}
+
+// Those of another language would be too narrow for titles and severities, or too wide. Older
+// versions have not saved for which they were.
+void MainWindow::restoreColumns()
+{
+    const QString language = m_settings.Text(QStringLiteral("columnsLanguage"));
+    if (language.isEmpty() || language == Language::Used())
+        m_tabs->ownLog()->SetColumnWidths(m_settings.Numbers(QStringLiteral("columns")));
 }
 
 // One of those in the menu; that of the system if it is another one, such as that of a newer
@@ -352,6 +361,7 @@ void MainWindow::saveState()
     m_settings.SetText(QStringLiteral("highlights"), m_tabs->highlightRules()->ToText());
     m_settings.SetFlag(QStringLiteral("toolBarShown"), actions.showToolBar->isChecked());
     m_settings.SetNumbers(QStringLiteral("columns"), m_tabs->ownLog()->columnWidths());
+    m_settings.SetText(QStringLiteral("columnsLanguage"), Language::Used());
     m_settings.SetNumbers(QStringLiteral("linePane"), m_tabs->ownLog()->paneSizes());
     m_settings.SetText(QStringLiteral("filters"), m_tabs->filterHistory().join(QLatin1Char('\n')));
     m_settings.SetFlag(QStringLiteral("reopenFiles"), actions.reopen->isChecked());
