@@ -77,8 +77,8 @@
         <translation>Nicht lesbar, ihre Zeilen fehlen daher: %1</translation>
     </message>
     <message>
-        <source>This looks like a compressed file. To read it: %1 %2 | velocor -</source>
-        <translation>Das scheint eine komprimierte Datei zu sein. Um sie zu lesen: %1 %2 | velocor -</translation>
+        <source>This looks like a compressed file. To read it: %1</source>
+        <translation>Das scheint eine komprimierte Datei zu sein. Um sie zu lesen: %1</translation>
     </message>
     <message>
         <source>This looks like a binary file. Its bytes are shown as text.</source>
@@ -107,6 +107,14 @@ Mit Strg+Umschalt+F wird er gelöscht.</translation>
 New lines appear here as they are written.</source>
         <translation>Das Protokoll ist leer.
 Neue Zeilen erscheinen hier, sobald sie geschrieben werden.</translation>
+    </message>
+</context>
+<context>
+    <name>QGuiApplication</name>
+    <message>
+        <source>QT_LAYOUT_DIRECTION</source>
+        <extracomment>&quot;RTL&quot; if the language is written from right to left, else &quot;LTR&quot;</extracomment>
+        <translation>LTR</translation>
     </message>
 </context>
 <context>
@@ -1306,16 +1314,6 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <translation>Zeile oder Zeit</translation>
     </message>
     <message>
-        <source>214		line 214 of the file
-14:03		time, on the day of the current entry
-2026-11-20 14:03	date and time
-+5m  -30s  +2h	from the current entry</source>
-        <translation>214		Zeile 214 der Datei
-14:03		Zeit, am Tag des aktuellen Eintrags
-2026-11-20 14:03	Datum und Zeit
-+5m  -30s  +2h	vom aktuellen Eintrag aus</translation>
-    </message>
-    <message>
         <source>Problem</source>
         <translation>Problem</translation>
     </message>
@@ -1329,6 +1327,22 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
     <message>
         <source>Select an entry first, from which to count.</source>
         <translation>Zuerst einen Eintrag auswählen, von dem aus gezählt wird.</translation>
+    </message>
+    <message>
+        <source>line 214 of the file</source>
+        <translation>Zeile 214 der Datei</translation>
+    </message>
+    <message>
+        <source>time, on the day of the current entry</source>
+        <translation>Zeit, am Tag des aktuellen Eintrags</translation>
+    </message>
+    <message>
+        <source>date and time</source>
+        <translation>Datum und Zeit</translation>
+    </message>
+    <message>
+        <source>from the current entry</source>
+        <translation>vom aktuellen Eintrag aus</translation>
     </message>
 </context>
 <context>

@@ -77,8 +77,8 @@
         <translation>Illisibles, leurs lignes manquent donc&#xa0;: %1</translation>
     </message>
     <message>
-        <source>This looks like a compressed file. To read it: %1 %2 | velocor -</source>
-        <translation>Ceci ressemble à un fichier compressé. Pour le lire&#xa0;: %1 %2 | velocor -</translation>
+        <source>This looks like a compressed file. To read it: %1</source>
+        <translation>Ceci ressemble à un fichier compressé. Pour le lire&#xa0;: %1</translation>
     </message>
     <message>
         <source>This looks like a binary file. Its bytes are shown as text.</source>
@@ -107,6 +107,14 @@ Ctrl+Maj+F l’efface.</translation>
 New lines appear here as they are written.</source>
         <translation>Le journal est vide.
 Les nouvelles lignes apparaissent ici dès qu’elles sont écrites.</translation>
+    </message>
+</context>
+<context>
+    <name>QGuiApplication</name>
+    <message>
+        <source>QT_LAYOUT_DIRECTION</source>
+        <extracomment>&quot;RTL&quot; if the language is written from right to left, else &quot;LTR&quot;</extracomment>
+        <translation>LTR</translation>
     </message>
 </context>
 <context>
@@ -1306,16 +1314,6 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <translation>Ligne ou heure</translation>
     </message>
     <message>
-        <source>214		line 214 of the file
-14:03		time, on the day of the current entry
-2026-11-20 14:03	date and time
-+5m  -30s  +2h	from the current entry</source>
-        <translation>214		ligne 214 du fichier
-14:03		heure, le jour de l’entrée courante
-2026-11-20 14:03	date et heure
-+5m  -30s  +2h	à partir de l’entrée courante</translation>
-    </message>
-    <message>
         <source>Problem</source>
         <translation>Problème</translation>
     </message>
@@ -1329,6 +1327,22 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
     <message>
         <source>Select an entry first, from which to count.</source>
         <translation>Sélectionnez d’abord une entrée à partir de laquelle compter.</translation>
+    </message>
+    <message>
+        <source>line 214 of the file</source>
+        <translation>ligne 214 du fichier</translation>
+    </message>
+    <message>
+        <source>time, on the day of the current entry</source>
+        <translation>heure, le jour de l’entrée courante</translation>
+    </message>
+    <message>
+        <source>date and time</source>
+        <translation>date et heure</translation>
+    </message>
+    <message>
+        <source>from the current entry</source>
+        <translation>à partir de l’entrée courante</translation>
     </message>
 </context>
 <context>

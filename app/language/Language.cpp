@@ -23,6 +23,11 @@ namespace Velocor {
 
 namespace {
 
+// Qt asks the catalogs for it whenever the language changes. Its own may not be installed.
+//: "RTL" if the language is written from right to left, else "LTR"
+[[maybe_unused]] char const* const Direction =
+    QT_TRANSLATE_NOOP("QGuiApplication", "QT_LAYOUT_DIRECTION");
+
 // Tells the translators of this file from those of others.
 QString ObjectName()
 {
@@ -34,12 +39,31 @@ QString Catalogs()
     return QStringLiteral(":/catalogs");
 }
 
-void Install(QLocale const& locale, QString const& prefix, QString const& folder)
+QString& UsedCode()
+{
+    static QString code;
+    return code;
+}
+
+// Not that of a country: Qt's name for "en" is "American English".
+QString NameOf(QString const& code)
+{
+    const QLocale locale(code);
+    QString name = locale.language() == QLocale::English
+                       ? QLocale::languageToString(QLocale::English)
+                       : locale.nativeLanguageName();
+    name[0] = name.at(0).toUpper();
+    return name;
+}
+
+bool Install(QLocale const& locale, QString const& prefix, QString const& folder)
 {
     auto translator = std::make_unique<QTranslator>(QCoreApplication::instance());
     translator->setObjectName(ObjectName());
-    if (translator->load(locale, prefix, QStringLiteral("_"), folder))
-        QCoreApplication::installTranslator(translator.release());
+    if (!translator->load(locale, prefix, QStringLiteral("_"), folder))
+        return false;
+    QCoreApplication::installTranslator(translator.release());
+    return true;
 }
 
 } // namespace
@@ -51,9 +75,7 @@ QList<Language> Language::All()
     const QStringList files = QDir(Catalogs()).entryList(QDir::Files, QDir::Name);
     for (QString const& file : files) {
         const QString code = file.section(QLatin1Char('_'), 1).section(QLatin1Char('.'), 0, 0);
-        QString name = QLocale(code).nativeLanguageName();
-        name[0] = name.at(0).toUpper();
-        languages.append({code, name});
+        languages.append({code, NameOf(code)});
     }
     return languages;
 }
@@ -69,8 +91,15 @@ void Language::Use(QString const& code)
     // The last one installed is asked first. English has the plural forms of what the others lack.
     Install(QLocale(QStringLiteral("en")), QStringLiteral("velocor"), Catalogs());
     Install(locale, QStringLiteral("qtbase"), TorkQt::TranslationsFolder());
-    if (locale.language() != QLocale::English)
-        Install(locale, QStringLiteral("velocor"), Catalogs());
+    const bool isTranslated = locale.language() != QLocale::English &&
+                              Install(locale, QStringLiteral("velocor"), Catalogs());
+    UsedCode() =
+        isTranslated ? locale.name().section(QLatin1Char('_'), 0, 0) : QStringLiteral("en");
+}
+
+QString Language::Used()
+{
+    return UsedCode();
 }
 
 } // namespace Velocor

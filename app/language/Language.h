@@ -20,6 +20,9 @@ struct Language
     /// Those with a catalog, ordered by code.
     static QList<Language> All();
 
+    /// The code of the language that is in use; empty before Use().
+    static QString Used();
+
     /// Makes the application use a language: its texts, and Qt's own if Qt's catalog is installed.
     /// What no catalog has stays English. It replaces the language that was used before; texts that
     /// were translated by then stay as they are. Numbers and dates are always those of the system.

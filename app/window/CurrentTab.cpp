@@ -33,8 +33,8 @@ void CurrentTab::Update()
     updateEditing();
     m_actions.close->setEnabled(m_tabs->currentWidget() != m_tabs->ownLog());
     const QString path = FileTabs::PathOf(m_tabs->currentWidget());
-    m_summary->setText(log ? log->summary() : path);
-    m_summary->setToolTip(PlainToolTip(log ? QString() : path));
+    m_summary->setText(log ? log->summary() : LeftToRight(path));
+    m_summary->setToolTip(PlainToolTip(log ? QString() : LeftToRight(path)));
     if (log)
         updateSwitches(log);
 }

@@ -102,11 +102,11 @@ QString FileOpener::open(QString const& path)
 {
     const QFileInfo info(path);
     if (!info.exists())
-        return tr("%1 does not exist").arg(path);
+        return tr("%1 does not exist").arg(LeftToRight(path));
     if (info.isDir())
-        return tr("%1 is a folder").arg(path);
+        return tr("%1 is a folder").arg(LeftToRight(path));
     if (!info.isFile()) // opening a pipe would block, and a device may have no end
-        return tr("%1 is not a regular file").arg(path);
+        return tr("%1 is not a regular file").arg(LeftToRight(path));
     m_tabs->OpenFile(path);
     m_recent->Add(path);
     return QString();
@@ -135,7 +135,7 @@ QString FileOpener::openInput(int descriptor)
     if (input->path().isEmpty()) {
         delete input;
         return tr("Standard input cannot be shown, because no file can be created in %1")
-            .arg(QDir::tempPath());
+            .arg(LeftToRight(QDir::tempPath()));
     }
     connect(input, &StandardInput::failed, this, &FileOpener::problemReported);
     input->setParent(m_tabs->OpenLog(input->path())); // ends with its tab
@@ -145,12 +145,12 @@ QString FileOpener::openInput(int descriptor)
 void FileOpener::offerToForget(QString const& path)
 {
     if (!m_recent->Contains(path)) {
-        Q_EMIT messageReported(tr("%1 does not exist").arg(path));
+        Q_EMIT messageReported(tr("%1 does not exist").arg(LeftToRight(path)));
         return;
     }
     PlainMessageBox box(
         QMessageBox::Question, m_window,
-        tr("%1 no longer exists.\nRemove it from the list of recent files?").arg(path),
+        tr("%1 no longer exists.\nRemove it from the list of recent files?").arg(LeftToRight(path)),
         QMessageBox::Yes | QMessageBox::No);
     if (box.exec() == QMessageBox::Yes)
         m_recent->Remove(path);

@@ -116,7 +116,7 @@ LogPanel* FileTabs::addLog(QString const& path)
     panel->SetLeastGap(m_leastGap);
     if (!path.isEmpty())
         panel->Open(path, false);
-    setTabToolTip(addTab(panel, QString()), PlainToolTip(path));
+    setTabToolTip(addTab(panel, QString()), PlainToolTip(LeftToRight(path)));
     if (!path.isEmpty())
         addCloseButton(panel, name);
     return panel;
@@ -136,7 +136,7 @@ SettingsEditor* FileTabs::addEditor(QString const& path)
         // Maybe another file now.
         const QString savedName = QFileInfo(editor->path()).fileName();
         editor->setAccessibleName(savedName);
-        setTabToolTip(indexOf(editor), PlainToolTip(editor->path()));
+        setTabToolTip(indexOf(editor), PlainToolTip(LeftToRight(editor->path())));
         tabBar()
             ->tabButton(indexOf(editor), QTabBar::RightSide)
             ->setAccessibleName(tr("Close %1").arg(savedName));
@@ -144,7 +144,7 @@ SettingsEditor* FileTabs::addEditor(QString const& path)
     });
     connect(editor, &SettingsEditor::messageReported, this, &FileTabs::messageReported);
     connect(editor, &SettingsEditor::stateChanged, this, &FileTabs::stateChanged);
-    setTabToolTip(addTab(editor, QString()), PlainToolTip(path));
+    setTabToolTip(addTab(editor, QString()), PlainToolTip(LeftToRight(path)));
     addCloseButton(editor, name);
     return editor;
 }

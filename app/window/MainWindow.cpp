@@ -40,6 +40,8 @@
 #include <QStatusBar>
 #include <QVBoxLayout>
 
+#include <algorithm>
+
 // Resources of a static library must be initialized explicitly, outside any namespace.
 static void InitializeResources()
 {
@@ -55,6 +57,7 @@ constexpr int IdleHealthInterval = 60000;  // milliseconds; nothing tells of a d
 constexpr int SuspiciousRuns = 3;          // in a row
 constexpr int MessageTime = 6000;          // milliseconds
 constexpr int MaximumMessageLength = 1000; // characters
+constexpr qreal UsualTextHeight = 18;      // pixels; larger text needs a larger window
 
 QIcon WindowIcon()
 {
@@ -266,8 +269,10 @@ void MainWindow::showPlaces(bool shown)
 
 void MainWindow::restoreFirstState()
 {
-    if (QScreen const* screen = QGuiApplication::primaryScreen())
-        resize(QSize(1080, 680).boundedTo(screen->availableSize() * 9 / 10));
+    if (QScreen const* screen = QGuiApplication::primaryScreen()) {
+        const qreal scale = std::max(1.0, fontMetrics().height() / UsualTextHeight);
+        resize((QSize(1080, 680) * scale).boundedTo(screen->availableSize() * 9 / 10));
+    }
 
     m_settings.RestoreGeometry(this);
 }
@@ -289,7 +294,7 @@ void MainWindow::restoreState()
     m_tabs->SetSince(actions.since->isChecked());
     restoreGaps();
     m_tabs->highlightRules()->SetFromText(m_settings.Text(QStringLiteral("highlights")));
-    m_tabs->ownLog()->SetColumnWidths(m_settings.Numbers(QStringLiteral("columns")));
+    restoreColumns();
     m_tabs->ownLog()->SetPaneSizes(m_settings.Numbers(QStringLiteral("linePane")));
     m_files->RestoreRecent(m_settings);
     QStringList filters = m_settings.Text(QStringLiteral("filters")).split(QLatin1Char('\n'));
@@ -301,6 +306,15 @@ void MainWindow::restoreState()
     m_toolBar->setVisible(toolBarShown);
     actions.reopen->setChecked(m_settings.Flag(QStringLiteral("reopenFiles"), true));
     restoreLanguage();
+}
+
+// Those of another language would be too narrow for titles and severities, or too wide. Older
+// versions have not saved for which they were.
+void MainWindow::restoreColumns()
+{
+    const QString language = m_settings.Text(QStringLiteral("columnsLanguage"));
+    if (language.isEmpty() || language == Language::Used())
+        m_tabs->ownLog()->SetColumnWidths(m_settings.Numbers(QStringLiteral("columns")));
 }
 
 // One of those in the menu; that of the system if it is another one, such as that of a newer
@@ -347,6 +361,7 @@ void MainWindow::saveState()
     m_settings.SetText(QStringLiteral("highlights"), m_tabs->highlightRules()->ToText());
     m_settings.SetFlag(QStringLiteral("toolBarShown"), actions.showToolBar->isChecked());
     m_settings.SetNumbers(QStringLiteral("columns"), m_tabs->ownLog()->columnWidths());
+    m_settings.SetText(QStringLiteral("columnsLanguage"), Language::Used());
     m_settings.SetNumbers(QStringLiteral("linePane"), m_tabs->ownLog()->paneSizes());
     m_settings.SetText(QStringLiteral("filters"), m_tabs->filterHistory().join(QLatin1Char('\n')));
     m_settings.SetFlag(QStringLiteral("reopenFiles"), actions.reopen->isChecked());
@@ -400,7 +415,8 @@ void MainWindow::tellOfAbnormalEnds(std::vector<RunEnd> const& ends)
     m_tabs->ownLog()->AddBar(bar);
     const QString start =
         HistoryTime::DateTime(ends.back().start).toString(QStringLiteral("yyyy-MM-dd hh:mm:ss"));
-    bar->ShowMessage(tr("The program that was started at %1 did not end normally.").arg(start));
+    bar->ShowMessage(
+        tr("The program that was started at %1 did not end normally.").arg(LeftToRight(start)));
     const int shortRuns =
         RunEnds::ShortRunsBefore(RunEnds::Of(RunningLog::FileName()), RunMark::ProgramStart());
     if (shortRuns >= SuspiciousRuns && QFileInfo(m_settings.fileName()).isFile())
@@ -414,7 +430,7 @@ void MainWindow::offerDefaults(NoticeBar* bar)
     bar->ShowMessage(
         tr("It ended within ten seconds at least three times in a row. If that is because "
            "of its settings, set them aside: %1")
-            .arg(m_settings.fileName()));
+            .arg(LeftToRight(m_settings.fileName())));
     QPushButton* button = bar->AddButton(tr("Set Aside"));
     button->setAccessibleName(tr("Set the settings of this window aside"));
     connect(button, &QPushButton::clicked, this, [this, bar, button] {

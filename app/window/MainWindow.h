@@ -80,6 +80,7 @@ private:
     void restoreFirstState();
     void restoreState();
     void restoreGaps();
+    void restoreColumns();
     void restoreLanguage();
     void saveState();
     void startWork();

@@ -4,6 +4,7 @@
 #include "app/window/MarksFile.h"
 
 #include "app/settingsfile/SettingsFileReader.h"
+#include "app/window/widgets/PlainText.h"
 #include "common/config/TorkConfigFile.h"
 #include "common/config/TorkConfigText.h"
 
@@ -67,7 +68,8 @@ QVector<MarksFile::Log> MarksFile::read(QString& error) const
         return logs;
     const SettingsDocument document = SettingsFileReader::Read(m_fileName);
     if (!document.isReadable || !document.isParsed) {
-        error = QObject::tr("%1 is damaged, so marks and encodings are not saved").arg(m_fileName);
+        error = QObject::tr("%1 is damaged, so marks and encodings are not saved")
+                    .arg(LeftToRight(m_fileName));
         return logs;
     }
     for (SettingsDocument::Section const& section : document.sections) {

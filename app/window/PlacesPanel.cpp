@@ -16,13 +16,23 @@
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QScrollArea>
+#include <QScrollBar>
 #include <QToolButton>
 #include <QUrl>
 #include <QVBoxLayout>
 
+#include <algorithm>
+
 namespace Velocor {
 
-PlacesPanel::PlacesPanel(QString const& settingsFile, QWidget* parent) : QWidget(parent)
+namespace {
+
+constexpr int LeastWidth = 200; // pixels
+
+} // namespace
+
+PlacesPanel::PlacesPanel(QString const& settingsFile, QWidget* parent)
+    : QWidget(parent), m_scroller(new QScrollArea)
 {
     auto* content = new QWidget;
     m_layout = new QVBoxLayout(content);
@@ -37,26 +47,32 @@ PlacesPanel::PlacesPanel(QString const& settingsFile, QWidget* parent) : QWidget
     addValue(tr("Settings file"), settingsFile, true);
     m_layout->addStretch(1);
 
-    auto* scroller = new QScrollArea;
-    scroller->setAccessibleName(tr("Identity and places"));
-    scroller->setFrameShape(QFrame::NoFrame);
-    scroller->setWidgetResizable(true);
-    scroller->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
-    scroller->setFocusPolicy(Qt::NoFocus);
-    scroller->setWidget(content);
+    m_scroller->setAccessibleName(tr("Identity and places"));
+    m_scroller->setFrameShape(QFrame::NoFrame);
+    m_scroller->setWidgetResizable(true);
+    m_scroller->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
+    m_scroller->setFocusPolicy(Qt::NoFocus);
+    m_scroller->setWidget(content);
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(0, 0, 0, 0);
-    layout->addWidget(scroller);
-    setMinimumWidth(200);
+    layout->addWidget(m_scroller);
+}
+
+// It only scrolls up and down. Values are elided, captions and buttons are not.
+QSize PlacesPanel::minimumSizeHint() const
+{
+    const int width = m_scroller->widget()->minimumSizeHint().width() +
+                      m_scroller->verticalScrollBar()->sizeHint().width();
+    return QSize(std::max(LeastWidth, width), QWidget::minimumSizeHint().height());
 }
 
 void PlacesPanel::addValue(QString const& caption, QString const& text, bool isPlace)
 {
     auto* value = new ElidedLabel(Qt::ElideMiddle);
-    value->setText(text);
+    value->setText(LeftToRight(text));
     value->setAccessibleName(caption);
     value->setAccessibleDescription(text);
-    value->setToolTip(PlainToolTip(text));
+    value->setToolTip(PlainToolTip(LeftToRight(text)));
     value->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
 
     QLabel* label = NewPlainLabel(caption);
@@ -100,8 +116,8 @@ bool PlacesPanel::OpenPlace(QString const& path)
 void PlacesPanel::openPlace(QString const& path)
 {
     if (!OpenPlace(path))
-        Q_EMIT messageReported(
-            tr("Cannot open %1: it does not exist, or there is no file manager").arg(path));
+        Q_EMIT messageReported(tr("Cannot open %1: it does not exist, or there is no file manager")
+                                   .arg(LeftToRight(path)));
 }
 
 void PlacesPanel::copy(QString const& caption, QString const& text)

@@ -9,6 +9,7 @@
 #include <functional>
 
 class QLayout;
+class QScrollArea;
 class QVBoxLayout;
 
 namespace Velocor {
@@ -27,6 +28,8 @@ public:
     /// @return false if the folder does not exist or there is no file manager
     static bool OpenPlace(QString const& path);
 
+    QSize minimumSizeHint() const override;
+
 Q_SIGNALS:
     /// The result of a button click, for the status bar.
     void messageReported(QString const& text);
@@ -39,6 +42,7 @@ private:
     void copy(QString const& caption, QString const& text);
 
     QVBoxLayout* m_layout;
+    QScrollArea* m_scroller;
 };
 
 } // namespace Velocor

@@ -24,6 +24,7 @@
 #include <QVBoxLayout>
 #include <QVariant>
 
+#include <algorithm>
 #include <set>
 
 namespace Velocor {
@@ -63,12 +64,13 @@ ProblemReportDialog::ProblemReportDialog(QList<ReportPart> const& parts, Redacto
     layout->addLayout(newHeading());
     layout->addLayout(middle, 1);
     layout->addWidget(buttons);
-    resize(760, 540);
-
     m_wordsTimer.setSingleShot(true);
     m_wordsTimer.setInterval(TypingPause);
     connect(&m_wordsTimer, &QTimer::timeout, this, &ProblemReportDialog::update);
     update();
+    // With a wrapped label, Qt does not see to the least height.
+    const int width = std::max(760, layout->sizeHint().width());
+    resize(width, std::max(540, layout->heightForWidth(width)));
 }
 
 ProblemReportDialog::~ProblemReportDialog() = default;
@@ -102,7 +104,8 @@ QLayout* ProblemReportDialog::newChoices()
     QLabel* secretsLabel = NewPlainLabel(tr("&Replaced; untick to keep:"));
     secretsLabel->setBuddy(m_secrets);
     m_secrets->setAccessibleName(tr("Replaced by placeholders"));
-    m_secrets->setFixedWidth(ChoicesWidth);
+    m_secrets->setMinimumWidth(ChoicesWidth);
+    m_secrets->setSizePolicy(QSizePolicy::Preferred, QSizePolicy::Expanding);
     connect(m_secrets, &QListWidget::itemChanged, this, &ProblemReportDialog::choose);
     layout->addSpacing(6);
     layout->addWidget(secretsLabel);
@@ -170,10 +173,10 @@ void ProblemReportDialog::listSecrets()
     m_secrets->clear();
     for (int secret : present) {
         const QString text = m_redactor.Original(secret).simplified();
-        auto* item =
-            new QListWidgetItem(QStringLiteral("%1  %2").arg(m_redactor.Placeholder(secret),
-                                                             Shortened(text, MaximumShownSecret)),
-                                m_secrets);
+        auto* item = new QListWidgetItem(
+            LeftToRight(QStringLiteral("%1  %2").arg(m_redactor.Placeholder(secret),
+                                                     Shortened(text, MaximumShownSecret))),
+            m_secrets);
         item->setData(Qt::UserRole, secret);
         item->setFlags(item->flags() | Qt::ItemIsUserCheckable);
         item->setCheckState(m_redactor.isShown(secret) ? Qt::Unchecked : Qt::Checked);
@@ -219,7 +222,8 @@ void ProblemReportDialog::chooseFile()
     if (error.isEmpty())
         accept();
     else
-        PlainMessageBox(QMessageBox::Critical, this, tr("Could not save %1.\n%2").arg(path, error))
+        PlainMessageBox(QMessageBox::Critical, this,
+                        tr("Could not save %1.\n%2").arg(LeftToRight(path), error))
             .exec();
 }
 

@@ -7,9 +7,9 @@
 
 namespace Velocor {
 
-/// The desktop's style with controls that everybody can hit, and that have a name: Fusion makes
-/// check boxes, menu titles and some buttons a few pixels too low, and Qt's own buttons in fields
-/// and tool bars have only an icon.
+/// The desktop's style with controls that everybody can hit and read, and that have a name: Fusion
+/// makes check boxes, menu titles and some buttons a few pixels too low, and the placeholders of
+/// fields and selected rows too pale; Qt's own buttons in fields and tool bars have only an icon.
 class ReachableStyle : public QProxyStyle
 {
     Q_OBJECT
@@ -20,12 +20,29 @@ public:
 
     using QProxyStyle::polish;
     void polish(QWidget* widget) override;
+    void unpolish(QWidget* widget) override;
+
+    /// Changes only colors whose contrast is too low.
+    void polish(QPalette& palette) override;
 
     QSize sizeFromContents(ContentsType type, QStyleOption const* option, QSize const& size,
                            QWidget const* widget) const override;
 
+    /// The part with the keyboard focus has a frame, also where Fusion shows nothing, as on lists,
+    /// or tints the text.
+    void drawPrimitive(PrimitiveElement element, QStyleOption const* option, QPainter* painter,
+                       QWidget const* widget) const override;
+
+    void drawControl(ControlElement element, QStyleOption const* option, QPainter* painter,
+                     QWidget const* widget) const override;
+
+    int styleHint(StyleHint hint, QStyleOption const* option, QWidget const* widget,
+                  QStyleHintReturn* returned) const override;
+
     QRect subElementRect(SubElement element, QStyleOption const* option,
                          QWidget const* widget) const override;
+
+    bool eventFilter(QObject* watched, QEvent* event) override;
 };
 
 } // namespace Velocor

@@ -37,7 +37,7 @@ QString UsableEntries(QString const& list)
 // "&" would mark a mnemonic, and a tab would start the shortcut column.
 QString MenuText(QString const& path)
 {
-    QString name = Shortened(QFileInfo(path).fileName(), MaximumNameLength);
+    QString name = LeftToRight(Shortened(QFileInfo(path).fileName(), MaximumNameLength));
     name.replace(QLatin1Char('\t'), QLatin1Char(' '));
     return name.replace(QLatin1Char('&'), QLatin1String("&&"));
 }
@@ -100,8 +100,8 @@ void RecentFiles::fillMenu()
         const QString path = action->text();
         const QString name = MenuText(path);
         action->setData(path);
-        action->setToolTip(PlainToolTip(path));
-        action->setStatusTip(path);
+        action->setToolTip(PlainToolTip(LeftToRight(path)));
+        action->setStatusTip(LeftToRight(path));
         action->setText(++number < 10 ? QStringLiteral("&%1 %2").arg(number).arg(name) : name);
     }
     m_menu->addSeparator();

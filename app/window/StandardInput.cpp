@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 
 #include "app/window/StandardInput.h"
+#include "app/window/widgets/PlainText.h"
 
 #include <QDir>
 #include <QRegularExpression>
@@ -79,7 +80,7 @@ void StandardInput::readSome()
         stop(QString());
     else if (m_file.write(slice.data(), size) != size)
         stop(tr("Standard input is cut off, because %1 cannot be written: %2")
-                 .arg(m_file.fileName(), m_file.errorString()));
+                 .arg(LeftToRight(m_file.fileName()), m_file.errorString()));
 }
 
 void StandardInput::stop(QString const& reason)

@@ -4,6 +4,7 @@
 #include "app/window/WindowSettings.h"
 
 #include "app/settingsfile/SettingsFileReader.h"
+#include "app/window/widgets/PlainText.h"
 #include "common/config/TorkConfigEscapes_p.h"
 #include "common/config/TorkConfigText.h"
 
@@ -70,7 +71,7 @@ QString WindowSettings::Load()
     if (!document.isReadable) {
         m_mayWrite = false;
         return QObject::tr("Cannot read the settings file %1 (%2). It is left unchanged.")
-            .arg(m_fileName, document.error);
+            .arg(LeftToRight(m_fileName), document.error);
     }
     if (!document.isParsed)
         return renameDamagedFile();
@@ -152,7 +153,7 @@ bool WindowSettings::rename(QString const& ending, QString& name)
 QString WindowSettings::SetAside(QString& name)
 {
     if (!rename(QStringLiteral(".set-aside-"), name))
-        return QObject::tr("%1 cannot be renamed").arg(m_fileName);
+        return QObject::tr("%1 cannot be renamed").arg(LeftToRight(m_fileName));
     m_mayWrite = false;
     return QString();
 }
@@ -163,12 +164,12 @@ QString WindowSettings::renameDamagedFile()
     if (rename(QStringLiteral(".damaged-"), name)) {
         return QObject::tr("The settings file was damaged, so default settings are used. "
                            "The damaged file was kept as %1.")
-            .arg(name);
+            .arg(LeftToRight(name));
     }
     m_mayWrite = false;
     return QObject::tr("The settings file %1 is damaged and cannot be renamed. It is left "
                        "unchanged, and window settings will not be saved.")
-        .arg(m_fileName);
+        .arg(LeftToRight(m_fileName));
 }
 
 QString WindowSettings::Save()
@@ -176,7 +177,8 @@ QString WindowSettings::Save()
     if (!m_mayWrite)
         return QString();
     if (QFileInfo::exists(m_fileName) && !QFileInfo(m_fileName).isFile())
-        return QObject::tr("The settings file %1 is not a regular file").arg(m_fileName);
+        return QObject::tr("The settings file %1 is not a regular file")
+            .arg(LeftToRight(m_fileName));
     QDir().mkpath(QFileInfo(m_fileName).path());
     applyEdits();
     return m_file.SaveAtomically() ? QString() : m_file.m_lastError;

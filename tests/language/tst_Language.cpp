@@ -40,7 +40,7 @@ void tst_Language::all()
     const QList<Language> all = Language::All();
     for (Language const& language : all)
         languages.append(language.code + "=" + language.name);
-    QCOMPARE(languages, QStringList({"de=Deutsch", "en=American English",
+    QCOMPARE(languages, QStringList({"de=Deutsch", "en=English",
                                      QString::fromUtf8("fr=Fran\xC3\xA7"
                                                        "ais")}));
 }
@@ -48,28 +48,29 @@ void tst_Language::all()
 void tst_Language::texts_data()
 {
     QTest::addColumn<QString>("code");
+    QTest::addColumn<QString>("used");
     QTest::addColumn<QString>("green");
     QTest::addColumn<QString>("none");
     QTest::addColumn<QString>("one");
     QTest::addColumn<QString>("many");
 
-    const auto row = [](char const* name, char const* code, char const* green, char const* none,
-                        char const* one, char const* many) {
-        QTest::newRow(name) << code << QString::fromUtf8(green) << none << one << many;
+    const auto row = [](char const* name, char const* code, char const* used, char const* green,
+                        char const* none, char const* one, char const* many) {
+        QTest::newRow(name) << code << used << QString::fromUtf8(green) << none << one << many;
     };
-    row("English", "en", "Green", "0 lines", "1 line", "2 lines");
-    row("German", "de", "Gr\xC3\xBCn", "0 Zeilen", "1 Zeile", "2 Zeilen");
-    row("French has no plural of zero", "fr", "Vert", "0 ligne", "1 ligne", "2 lignes");
+    row("English", "en", "en", "Green", "0 lines", "1 line", "2 lines");
+    row("German", "de", "de", "Gr\xC3\xBCn", "0 Zeilen", "1 Zeile", "2 Zeilen");
+    row("French has no plural of zero", "fr", "fr", "Vert", "0 ligne", "1 ligne", "2 lignes");
     // The tests run in the locales C, de_DE and fr_FR.
     const QLocale::Language system = QLocale::system().language();
     for (char const* code : {"", "xx", "tlh_KX", "de\n", "../de"}) {
         const QByteArray name = QByteArray("language of the system for \"") + code + "\"";
         if (system == QLocale::German)
-            row(name, code, "Gr\xC3\xBCn", "0 Zeilen", "1 Zeile", "2 Zeilen");
+            row(name, code, "de", "Gr\xC3\xBCn", "0 Zeilen", "1 Zeile", "2 Zeilen");
         else if (system == QLocale::French)
-            row(name, code, "Vert", "0 ligne", "1 ligne", "2 lignes");
+            row(name, code, "fr", "Vert", "0 ligne", "1 ligne", "2 lignes");
         else
-            row(name, code, "Green", "0 lines", "1 line", "2 lines");
+            row(name, code, "en", "Green", "0 lines", "1 line", "2 lines");
     }
 }
 
@@ -80,6 +81,7 @@ void tst_Language::texts()
     Language::Use("fr");
     Language::Use("de");
     Language::Use(code);
+    QTEST(Language::Used(), "used");
     QTEST(Translated("HighlightColors", "Green"), "green");
     QTEST(Translated("LogStateText", "%Ln line(s)", 0), "none");
     QTEST(Translated("LogStateText", "%Ln line(s)", 1), "one");

@@ -65,7 +65,8 @@ QMap<QString, QByteArray> Files(TestRun const& run)
         const QString path = all.next();
         QString text = QString::fromLatin1(TestFiles::read(path));
         text.replace(stamp, "STAMP").replace(run.folder(), "FOLDER/");
-        text.remove(QRegularExpression("<language>[^<]*</language>|<columns>[^<]*</columns>"));
+        text.remove(QRegularExpression(
+            "<language>[^<]*</language>|<columns(Language)?>[^<]*</columns(Language)?>"));
         files.insert(path.mid(run.folder().size()), text.toLatin1());
     }
     return files;
@@ -96,6 +97,7 @@ private slots:
     void menus_data();
     void menus();
     void unknownLanguage();
+    void columnsFitTheLanguage();
     void filesDoNotDependOnIt();
 
 protected slots:
@@ -145,6 +147,36 @@ void tst_LanguagesInWindow::unknownLanguage()
         window->close();
     }
     QVERIFY(!TestFiles::read(test.settingsFile()).contains("tlh"));
+}
+
+// A width that the user chose is kept, but only for the language that it was chosen in.
+void tst_LanguagesInWindow::columnsFitTheLanguage()
+{
+    const ChosenLanguage test("en");
+    const auto widthsIn = [](QString const& code, std::function<void(MainWindow&)> const& work) {
+        const auto window = WindowTest::show();
+        Panel(*window)->SetTextFont(QFont());
+        work(*window);
+        const QList<int> widths = Panel(*window)->columnWidths();
+        const QList<QAction*> actions = window->findChildren<QAction*>();
+        for (QAction* action : actions) {
+            if (action->actionGroup() && action->data() == code)
+                action->trigger();
+        }
+        window->close();
+        return widths;
+    };
+    const QList<int> english = widthsIn("en", [](MainWindow& window) {
+        View(window)->setColumnWidth(LogModel::SeverityColumn, 60);
+    });
+    QCOMPARE(english.at(LogModel::SeverityColumn), 60);
+    QCOMPARE(widthsIn("fr", [](MainWindow&) {}), english);
+    const QList<int> french = widthsIn("de", [](MainWindow& window) {
+        const QString longest = "Avertissement";
+        QVERIFY(View(window)->columnWidth(LogModel::SeverityColumn) >
+                View(window)->fontMetrics().boundingRect(longest).width() + 24);
+    });
+    QVERIFY(french != english);
 }
 
 void tst_LanguagesInWindow::filesDoNotDependOnIt()

@@ -1,77 +1,30 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// The window in a generated language: each text of the catalogs is longer, has accents and is in
-// brackets. A text without brackets cannot be translated.
+// Window, dialogs and menus in two generated languages, one of them written from right to left.
 
+#include "AllDialogs.h"
+#include "PseudoLanguage.h"
+#include "ShownTexts.h"
 #include "WindowParts.h"
 #include "WindowTestCase.h"
 
 #include "app/language/Language.h"
 
-#include <QAbstractButton>
-#include <QDomDocument>
-#include <QHeaderView>
-#include <QLabel>
-#include <QLineEdit>
-#include <QRegularExpression>
-#include <QSet>
-#include <QTabBar>
-#include <QTranslator>
+#include <QMenu>
+#include <QMenuBar>
 
 using namespace Velocor;
 using namespace WindowParts;
 
 namespace {
 
-QString lengthened(QString const& text)
-{
-    // Longer than it is by two fifths, without a change to placeholders and mnemonics.
-    QString longer = text;
-    longer.replace('a', QString::fromUtf8("\xC3\xA1")).replace('o', QString::fromUtf8("\xC3\xB6"));
-    return "[" + longer + QString(text.size() * 2 / 5, '~') + "]";
-}
-
-class PseudoLanguage : public QTranslator
-{
-public:
-    PseudoLanguage()
-    {
-        QDomDocument catalog;
-        catalog.setContent(TestFiles::read(PROJECT_FOLDER "/translations/velocor_de.ts"));
-        const QDomNodeList messages = catalog.elementsByTagName("message");
-        for (int i = 0; i < messages.size(); ++i) {
-            const QDomElement message = messages.at(i).toElement();
-            const QString source = message.firstChildElement("source").text();
-            const bool isKey = source.contains(QRegularExpression("^(Ctrl|Shift|Alt|F\\d)"));
-            if (!isKey && !message.hasAttribute("numerus"))
-                m_texts.insert(message.parentNode().toElement().firstChildElement("name").text() +
-                               '\n' + source);
-        }
-        QCoreApplication::installTranslator(this);
-    }
-
-    ~PseudoLanguage() override { QCoreApplication::removeTranslator(this); }
-
-    bool isEmpty() const override { return m_texts.isEmpty(); }
-
-    QString translate(char const* context, char const* text, char const*, int) const override
-    {
-        const QString source = QString::fromUtf8(text);
-        return m_texts.contains(QString::fromUtf8(context) + '\n' + source) ? lengthened(source)
-                                                                            : QString();
-    }
-
-private:
-    QSet<QString> m_texts;
-};
-
 // Whether it is a text for people, and not a name, a number or a plural form, which English has.
 bool isText(QString const& text)
 {
     static const QRegularExpression word("[A-Za-z]{2}");
     static const QRegularExpression plural("^[0-9., ]+\\S* (line|problem|file|key|item)");
-    static const QRegularExpression file("[/\\\\]|^\\w+\\.(cfg|log)$|^(Org|Product)$");
+    static const QRegularExpression file("[/\\\\]|\\.(cfg|log)\\W?$|^\\W?(Org|Product)\\W?$");
     return text.contains(word) && !text.contains(plural) && !text.contains(file);
 }
 
@@ -81,19 +34,40 @@ void check(QString const& text, QString const& where, QStringList& found)
         found.append(where + ": " + text);
 }
 
-// The texts of a window that have no brackets.
-QStringList untranslated(QWidget* window)
+bool isLanguage(QAction const* action)
 {
-    QStringList found;
+    const QList<Language> languages = Language::All();
+    return std::any_of(languages.begin(), languages.end(), [action](Language const& language) {
+        return language.name == action->text();
+    });
+}
+
+void checkActions(QWidget const* window, QStringList& found)
+{
     const QList<QAction*> actions = window->findChildren<QAction*>();
     for (QAction const* action : actions) {
-        const QString name = action->data().toString();
-        if (action->text().isEmpty() ||
-            QString(action->parent()->metaObject()->className())[0] == 'Q')
+        QObject const* parent = action->parent();
+        const bool isOfQt = qobject_cast<QLineEdit const*>(parent) ||
+                            qobject_cast<QPlainTextEdit const*>(parent) ||
+                            action->objectName().startsWith("_q_");
+        if (action->text().isEmpty() || isOfQt || isLanguage(action))
             continue;
         check(action->text(), "action", found);
         check(action->statusTip(), "status tip of " + action->text(), found);
     }
+}
+
+void checkHeader(QHeaderView const* header, QStringList& found)
+{
+    for (int i = 0; header->orientation() == Qt::Horizontal && i < header->count(); ++i)
+        check(header->model()->headerData(i, Qt::Horizontal).toString(), "column", found);
+}
+
+// The texts of a window that have no brackets.
+QStringList untranslated(QWidget* window)
+{
+    QStringList found;
+    checkActions(window, found);
     const QList<QWidget*> widgets = window->findChildren<QWidget*>();
     for (QWidget const* widget : widgets) {
         const QString name = widget->metaObject()->className();
@@ -109,33 +83,29 @@ QStringList untranslated(QWidget* window)
             check(label->text(), name, found);
         if (auto const* line = qobject_cast<QLineEdit const*>(widget))
             check(line->placeholderText(), name, found);
-        if (auto const* header = qobject_cast<QHeaderView const*>(widget)) {
-            for (int i = 0; header->orientation() == Qt::Horizontal && i < header->count(); ++i)
-                check(header->model()->headerData(i, Qt::Horizontal).toString(), name, found);
-        }
+        if (auto const* header = qobject_cast<QHeaderView const*>(widget))
+            checkHeader(header, found);
     }
     found.removeDuplicates();
     return found;
 }
 
-// Buttons and labels that are too small for their texts, or not whole in the window.
-QStringList cutOff(QWidget* window)
+// What is wrong with a window in a generated language.
+QString problems(QWidget* window)
 {
-    QStringList found;
-    const QList<QWidget*> widgets = window->findChildren<QWidget*>();
-    for (QWidget const* widget : widgets) {
-        auto const* button = qobject_cast<QAbstractButton const*>(widget);
-        auto const* label = qobject_cast<QLabel const*>(widget);
-        const QString text = button ? button->text() : label ? label->text() : QString();
-        if (!text.contains('[') || !widget->isVisible() || widget->window() != window)
-            continue;
-        const QRect place(widget->mapTo(window, QPoint()), widget->size());
-        const bool isSmall = widget->width() < widget->minimumSizeHint().width() ||
-                             widget->height() < widget->minimumSizeHint().height();
-        if (isSmall || !window->rect().contains(place))
-            found.append(text);
+    return (untranslated(window) + ShownTexts::cutOff(window) + ShownTexts::overlapping(window))
+        .join('\n');
+}
+
+void addLanguages(QStringList const& names)
+{
+    QTest::addColumn<PseudoLanguage::Writing>("writing");
+    QTest::addColumn<QString>("shown");
+    for (QString const& name : names) {
+        const QByteArray row = QString(name).remove('&').toUtf8();
+        QTest::newRow(row) << PseudoLanguage::Accented << name;
+        QTest::newRow(row + ", mirrored") << PseudoLanguage::Mirrored << name;
     }
-    return found;
 }
 
 } // namespace
@@ -145,62 +115,108 @@ class tst_PseudoLanguage : public WindowTestCase
     Q_OBJECT
 
 private slots:
-    void log();
-    void settings();
+    void files_data();
+    void files();
     void bars_data();
     void bars();
+    void dialogs_data();
+    void dialogs();
+    void menus_data();
+    void menus();
 };
 
-void tst_PseudoLanguage::log()
+void tst_PseudoLanguage::files_data()
 {
-    const PseudoLanguage language;
-    QVERIFY(!language.isEmpty());
-    const WindowTest test(DemoLog::run(5, QTime(12, 0), "entry"));
-    const auto window = WindowTest::show();
-    QCOMPARE(untranslated(window.get()).join('\n'), QString());
-    QCOMPARE(cutOff(window.get()).join('\n'), QString());
+    addLanguages({"log", "settings", "broken settings"});
 }
 
-void tst_PseudoLanguage::settings()
+void tst_PseudoLanguage::files()
 {
-    const PseudoLanguage language;
+    QFETCH(PseudoLanguage::Writing, writing);
+    QFETCH(QString, shown);
+    const PseudoLanguage language(writing);
+    QVERIFY(!language.isEmpty());
     const WindowTest test(DemoLog::run(5, QTime(12, 0), "entry"));
-    const QString settings = test.folder() + "a.cfg";
-    QVERIFY(TestFiles::write(settings, "<VelocorSettings><S><k>1</k></S></VelocorSettings>"));
-    const auto window = WindowTest::show({settings});
-    QCOMPARE(untranslated(window.get()).join('\n'), QString());
-    QCOMPARE(cutOff(window.get()).join('\n'), QString());
+    QStringList files;
+    if (shown != "log") {
+        files.append(test.folder() + "a.cfg");
+        QVERIFY(TestFiles::write(files.first(), shown == "settings" ? Settings : "<a"));
+    }
+    const auto window = WindowTest::show(files);
+    QCOMPARE(problems(window.get()), QString());
 }
 
 void tst_PseudoLanguage::bars_data()
 {
-    QTest::addColumn<QString>("action");
-    QTest::newRow("find") << "&Find";
-    QTest::newRow("places") << "&Places";
-    QTest::newRow("activity") << "&Activity";
-    QTest::newRow("time since") << "&Time Since";
-    QTest::newRow("all files") << "All Files, &by Time";
-    QTest::newRow("further terms") << "Als&o Filter";
+    addLanguages({"&Find", "&Places", "&Activity", "&Time Since", "All Files, &by Time",
+                  "Als&o Filter", "Line N&umbers"});
 }
 
 // What is shown on request.
 void tst_PseudoLanguage::bars()
 {
-    QFETCH(QString, action);
-    const PseudoLanguage language;
+    QFETCH(PseudoLanguage::Writing, writing);
+    QFETCH(QString, shown);
+    const PseudoLanguage language(writing);
     const WindowTest test(DemoLog::run(5, QTime(12, 0), "entry"));
     const auto window = WindowTest::show();
-    QAction* shown = nullptr;
-    const QList<QAction*> actions = window->findChildren<QAction*>();
-    for (QAction* one : actions) {
-        if (one->text() == lengthened(action))
-            shown = one;
-    }
-    QVERIFY(shown);
-    shown->trigger();
+    QAction* action = Action(*window, language.of(shown).remove('&'));
+    QVERIFY(action);
+    action->trigger();
     QTest::qWait(0);
-    QCOMPARE(untranslated(window.get()).join('\n'), QString());
-    QCOMPARE(cutOff(window.get()).join('\n'), QString());
+    QCOMPARE(problems(window.get()), QString());
+}
+
+void tst_PseudoLanguage::dialogs_data()
+{
+    addLanguages(AllDialogs::names());
+}
+
+void tst_PseudoLanguage::dialogs()
+{
+    QFETCH(PseudoLanguage::Writing, writing);
+    QFETCH(QString, shown);
+    const PseudoLanguage language(writing);
+    const WindowTest test(DemoLog::run(5, QTime(12, 0), "entry"));
+    const QString settings = test.folder() + "a.cfg";
+    QVERIFY(TestFiles::write(settings, Settings));
+    const auto window = WindowTest::show({settings});
+    window->findChild<FileTabs*>()->setCurrentIndex(0);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 5, Patience);
+    AllDialogs dialogs(*window, [&](QString const& text) { return language.of(text); });
+    bool isShown = false;
+    dialogs.with(shown, [&](QDialog* dialog) {
+        isShown = true;
+        QCOMPARE(problems(dialog), QString());
+    });
+    QVERIFY(isShown);
+}
+
+void tst_PseudoLanguage::menus_data()
+{
+    addLanguages({"0", "1", "2", "3"});
+}
+
+// Menus are on the screen as a whole. Their texts are those of the window's actions.
+void tst_PseudoLanguage::menus()
+{
+    QFETCH(PseudoLanguage::Writing, writing);
+    QFETCH(QString, shown);
+    const PseudoLanguage language(writing);
+    const WindowTest test(DemoLog::run(5, QTime(12, 0), "entry"));
+    const auto window = WindowTest::show();
+    QMenu* menu = window->menuBar()->actions().at(shown.toInt())->menu();
+    QList<QMenu*> menus = menu->findChildren<QMenu*>();
+    menus.prepend(menu);
+    for (QMenu* one : qAsConst(menus)) {
+        if (one->isEmpty())
+            continue;
+        one->popup(window->geometry().center());
+        QVERIFY(QTest::qWaitForWindowExposed(one, Patience));
+        QVERIFY2(one->windowHandle()->screen()->geometry().contains(one->geometry()),
+                 qPrintable(one->title()));
+        one->close();
+    }
 }
 
 QTEST_MAIN(tst_PseudoLanguage)

@@ -8,6 +8,7 @@
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogView.h"
 #include "app/window/widgets/BlendedColor.h"
+#include "app/window/widgets/Contrast.h"
 #include "app/window/widgets/PlainText.h"
 #include "app/window/widgets/SeverityIcons.h"
 
@@ -55,6 +56,7 @@ ActivityStrip::ActivityStrip(LogModel* model, LogView* view, QWidget* parent)
     : QWidget(parent), m_model(model), m_view(view)
 {
     setAccessibleName(tr("Activity"));
+    setLayoutDirection(Qt::LeftToRight); // as are the bars: the end of the log is on the right
     setFocusPolicy(Qt::StrongFocus);
     setSizePolicy(QSizePolicy::Expanding, QSizePolicy::Fixed);
     hide();
@@ -245,12 +247,15 @@ void ActivityStrip::paintTimes(QPainter& painter) const
 void ActivityStrip::paintEvent(QPaintEvent* /*event*/)
 {
     QPainter painter(this);
+    painter.setLayoutDirection(layoutDirection()); // the painter has that of the application
     const QRect frame = ground().adjusted(-Frame, -Frame, Frame, Frame);
     const bool isFocused = hasFocus();
-    painter.fillRect(frame, isFocused ? palette().color(QPalette::Highlight)
-                                      : Blended(palette().color(QPalette::Window),
-                                                palette().color(QPalette::WindowText), 0.3));
-    painter.fillRect(ground(), palette().color(QPalette::Base));
+    const QColor base = palette().color(QPalette::Base);
+    painter.fillRect(
+        frame, isFocused ? WithContrast(palette().color(QPalette::Highlight), base, PartContrast)
+                         : Blended(palette().color(QPalette::Window),
+                                   palette().color(QPalette::WindowText), 0.3));
+    painter.fillRect(isFocused ? ground().adjusted(Frame, Frame, -Frame, -Frame) : ground(), base);
     if (m_activity.state != Activity::Known) {
         painter.setPen(palette().color(QPalette::Text));
         painter.drawText(ground(), Qt::AlignCenter, placeholder());

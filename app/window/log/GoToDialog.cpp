@@ -6,10 +6,14 @@
 #include "app/window/widgets/PlainText.h"
 
 #include <QDialogButtonBox>
+#include <QGridLayout>
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
 #include <QVBoxLayout>
+
+#include <initializer_list>
+#include <utility>
 
 namespace Velocor {
 
@@ -22,10 +26,6 @@ GoToDialog::GoToDialog(qint64 lines, bool hasCurrent, QWidget* parent)
     QLabel* label = NewPlainLabel(tr("&Line or time:"));
     label->setBuddy(m_text);
     m_text->setAccessibleName(tr("Line or time"));
-    QLabel* samples = NewPlainLabel(tr("214\t\tline 214 of the file\n"
-                                       "14:03\t\ttime, on the day of the current entry\n"
-                                       "2026-11-20 14:03\tdate and time\n"
-                                       "+5m  -30s  +2h\tfrom the current entry"));
     m_error->setAccessibleName(tr("Problem"));
     m_error->setMinimumHeight(m_error->fontMetrics().lineSpacing());
 
@@ -39,10 +39,29 @@ GoToDialog::GoToDialog(qint64 lines, bool hasCurrent, QWidget* parent)
     layout->addWidget(label);
     layout->addWidget(m_text);
     layout->addWidget(m_error);
-    layout->addWidget(samples);
+    layout->addLayout(newSamples());
     layout->addWidget(buttons);
     layout->setSizeConstraint(QLayout::SetFixedSize);
     check();
+}
+
+QLayout* GoToDialog::newSamples()
+{
+    const std::initializer_list<std::pair<char const*, QString>> samples = {
+        {"214", tr("line 214 of the file")},
+        {"14:03", tr("time, on the day of the current entry")},
+        {"2026-11-20 14:03", tr("date and time")},
+        {"+5m  -30s  +2h", tr("from the current entry")}};
+    auto* rows = new QGridLayout;
+    rows->setVerticalSpacing(0);
+    rows->setHorizontalSpacing(16);
+    rows->setColumnStretch(1, 1);
+    for (auto const& sample : samples) {
+        const int row = rows->rowCount();
+        rows->addWidget(NewPlainLabel(LeftToRight(QLatin1String(sample.first))), row, 0);
+        rows->addWidget(NewPlainLabel(sample.second), row, 1);
+    }
+    return rows;
 }
 
 void GoToDialog::check()

@@ -27,6 +27,7 @@ public:
     LogPlace const& place() const { return m_place; }
 
 private:
+    static QLayout* newSamples();
     void check();
 
     qint64 m_lines;

@@ -53,6 +53,7 @@ HighlightDialog::HighlightDialog(std::shared_ptr<HighlightRules> const& rules, Q
 QLayout* HighlightDialog::makeList()
 {
     m_list->setAccessibleName(tr("Highlight rules"));
+    m_list->setLayoutDirection(Qt::LeftToRight);
     m_list->setTextElideMode(Qt::ElideRight);
     m_list->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
     connect(m_list, &QListWidget::currentRowChanged, this, &HighlightDialog::showRule);

@@ -82,6 +82,7 @@ void LineNumberMargin::changeEvent(QEvent* event)
 void LineNumberMargin::paintEvent(QPaintEvent* /*event*/)
 {
     QPainter painter(this);
+    painter.setLayoutDirection(layoutDirection());
     painter.fillRect(rect(), palette().color(QPalette::Window));
     const int first = m_view->rowAt(0);
     for (int row = first; row >= 0 && row < m_view->model()->rowCount(); ++row) {

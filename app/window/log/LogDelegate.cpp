@@ -8,6 +8,7 @@
 #include "app/window/log/LogModel.h"
 #include "app/window/log/TickColors.h"
 #include "app/window/widgets/BlendedColor.h"
+#include "app/window/widgets/Contrast.h"
 #include "app/window/widgets/RowHeight.h"
 #include "app/window/widgets/SeverityIcons.h"
 
@@ -24,15 +25,29 @@ namespace {
 constexpr int MarkWidth = 3; // pixels, as is the next one
 constexpr int GapMargin = 8;
 
-// Dimmed, but still with a contrast of more than 4.5:1.
 constexpr qreal ContextFade = 0.4;
 
-// Of the line above a gap: a contrast of more than 3:1.
+// Of the line above a gap.
 constexpr qreal GapStrength = 0.55;
 
 QStyle const* StyleOf(QStyleOptionViewItem const& option)
 {
     return option.widget ? option.widget->style() : QApplication::style();
+}
+
+// What a text is painted on if it is not selected.
+QColor GroundOf(QStyleOptionViewItem const& option)
+{
+    if (option.backgroundBrush.style() != Qt::NoBrush)
+        return option.backgroundBrush.color();
+    const bool isAlternate = option.features & QStyleOptionViewItem::Alternate;
+    return option.palette.color(isAlternate ? QPalette::AlternateBase : QPalette::Base);
+}
+
+// Dimmed, but not too pale to be read.
+QColor Faded(QColor const& text, QColor const& ground)
+{
+    return WithContrast(Blended(text, ground, ContextFade), ground, TextContrast);
 }
 
 // Dark text on yellow, readable on any background; underlined for users who cannot see yellow.
@@ -112,6 +127,7 @@ void LayOutLines(QTextLayout& layout, qreal width, int mostLines)
 void LayOut(QTextLayout& layout, int width, int mostLines)
 {
     QTextOption option(Qt::AlignLeft);
+    option.setTextDirection(Qt::LeftToRight);
     option.setWrapMode(mostLines == 1 ? QTextOption::NoWrap
                                       : QTextOption::WrapAtWordBoundaryOrAnywhere);
     layout.setTextOption(option);
@@ -188,8 +204,7 @@ void LogDelegate::initStyleOption(QStyleOptionViewItem* option, QModelIndex cons
                     option->palette.color(QPalette::Text), 0.045);
     if (index.data(LogModel::ContextRole).toBool())
         option->palette.setColor(QPalette::Text,
-                                 Blended(option->palette.color(QPalette::Text),
-                                         option->palette.color(QPalette::Base), ContextFade));
+                                 Faded(option->palette.color(QPalette::Text), GroundOf(*option)));
     const int color = ruleColor(index);
     if (color >= 0) {
         option->backgroundBrush = HighlightColors::Background(color, option->palette);
@@ -315,18 +330,18 @@ void LogDelegate::paintGap(QPainter* painter, QStyleOptionViewItem const& option
     // Not the cell's own, in which a severity has its color.
     const QPalette palette = option.widget ? option.widget->palette() : option.palette;
     QColor const& text = palette.color(isSelected ? QPalette::HighlightedText : QPalette::Text);
-    QColor const& ground = palette.color(isSelected ? QPalette::Highlight : QPalette::Base);
+    const QColor ground = isSelected ? palette.color(QPalette::Highlight) : GroundOf(option);
     painter->save();
     painter->setClipRect(option.rect);
     painter->fillRect(option.rect.left(), option.rect.top(), option.rect.width(), 1,
-                      Blended(ground, text, GapStrength));
+                      WithContrast(Blended(ground, text, GapStrength), ground, PartContrast));
     const int width = index.column() == LogModel::MessageColumn
                           ? GapWidth(gap, option.fontMetrics, option.rect.width())
                           : 0;
     if (width > 0) {
         const QRect area(option.rect.right() + 1 - width, option.rect.top(), width,
                          std::min(option.rect.height(), RowHeight(option.fontMetrics)));
-        painter->setPen(Blended(text, ground, ContextFade));
+        painter->setPen(Faded(text, ground));
         painter->setFont(option.font);
         painter->drawText(area, Qt::AlignCenter, gap);
     }
@@ -347,6 +362,7 @@ void LogDelegate::paintHeading(QPainter* painter, QStyleOptionViewItem const& op
     const QColor text = option.palette.color(QPalette::Text);
     const QColor background = Blended(option.palette.color(QPalette::Base), text, 0.14);
     painter->save();
+    painter->setLayoutDirection(option.direction);
     painter->fillRect(option.rect, background);
     painter->setFont(option.font);
     painter->setPen(text);

@@ -25,7 +25,7 @@ void LogFileBox::Open(QString const& path)
 {
     const QSignalBlocker blocker(this);
     clear();
-    addItem(QFileInfo(path).fileName(), path);
+    addItem(LeftToRight(QFileInfo(path).fileName()), path);
 }
 
 void LogFileBox::SetShown(QString const& path, bool isAll)
@@ -35,7 +35,7 @@ void LogFileBox::SetShown(QString const& path, bool isAll)
     m_isAll = isAll;
     if (isOther)
         fill();
-    setToolTip(PlainToolTip(path));
+    setToolTip(PlainToolTip(LeftToRight(path)));
     setAccessibleDescription(path);
 }
 
@@ -53,8 +53,8 @@ void LogFileBox::fill()
     for (QString const& file : files) {
         const QFileInfo info(file);
         const QString size = info.exists() ? FileSizeText(info.size()) : tr("does not exist");
-        addItem(tr("%1 (%2)").arg(info.fileName(), size), file);
-        setItemData(count() - 1, PlainToolTip(file), Qt::ToolTipRole);
+        addItem(tr("%1 (%2)").arg(LeftToRight(info.fileName()), size), file);
+        setItemData(count() - 1, PlainToolTip(LeftToRight(file)), Qt::ToolTipRole);
     }
     addItem(tr("All files, by time"));
     setItemData(count() - 1, PlainToolTip(tr("Every run that the files still have, oldest first")),

@@ -5,11 +5,11 @@
 
 #include "app/logfile/LogSeverities.h"
 #include "app/window/log/SeveritySwitches.h"
+#include "app/window/widgets/FlowLayout.h"
 #include "app/window/widgets/PlainText.h"
 
 #include <QCheckBox>
 #include <QComboBox>
-#include <QHBoxLayout>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
@@ -22,6 +22,7 @@ namespace Velocor {
 namespace {
 
 constexpr int TypingPause = 150; // milliseconds
+constexpr int Gap = 6;           // pixels
 constexpr int MaximumShown = 80; // characters of an earlier filter
 
 } // namespace
@@ -72,7 +73,7 @@ QLayout* LogFilterBar::makeFirstRow()
     connect(earlier, &QToolButton::clicked, this, &LogFilterBar::showHistory);
 
     m_case = makeOption(tr("Aa"), tr("Match case"), tr("Match case"));
-    m_expression = makeOption(tr(".*"), tr("Regular expression"),
+    m_expression = makeOption(LeftToRight(tr(".*")), tr("Regular expression"),
                               tr("Search each line with a regular expression"));
     m_more = new QToolButton;
     m_more->setText(tr("More"));
@@ -81,15 +82,11 @@ QLayout* LogFilterBar::makeFirstRow()
     m_more->setAccessibleName(tr("More filters"));
     m_more->setToolTip(PlainToolTip(tr("More terms, terms to hide, least severity, context")));
 
-    auto* row = new QHBoxLayout;
-    row->setSpacing(6);
-    row->addWidget(m_text, 1);
-    row->addWidget(earlier);
-    row->addWidget(m_case);
-    row->addWidget(m_expression);
-    row->addSpacing(8);
-    row->addWidget(m_severities);
-    row->addWidget(m_more);
+    auto* row = new FlowLayout(Gap);
+    for (QWidget* widget : {static_cast<QWidget*>(m_text), static_cast<QWidget*>(earlier),
+                            static_cast<QWidget*>(m_case), static_cast<QWidget*>(m_expression),
+                            static_cast<QWidget*>(m_severities), static_cast<QWidget*>(m_more)})
+        row->addWidget(widget);
     return row;
 }
 
@@ -118,13 +115,11 @@ QWidget* LogFilterBar::makeSecondRow()
     m_context = makeContext();
 
     auto* second = new QWidget;
-    auto* row = new QHBoxLayout(second);
-    row->setContentsMargins(0, 0, 0, 0);
-    row->setSpacing(6);
+    auto* row = new FlowLayout(Gap, second);
     row->addWidget(NewPlainLabel(tr("Also:")));
-    row->addWidget(m_required, 1);
+    row->addWidget(m_required);
     row->addWidget(NewPlainLabel(tr("Hide:")));
-    row->addWidget(m_hidden, 1);
+    row->addWidget(m_hidden);
     row->addWidget(m_least);
     row->addWidget(m_context);
     second->hide();

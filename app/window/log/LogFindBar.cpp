@@ -3,10 +3,10 @@
 
 #include "app/window/log/LogFindBar.h"
 
+#include "app/window/widgets/FlowLayout.h"
 #include "app/window/widgets/PlainText.h"
 
 #include <QCheckBox>
-#include <QHBoxLayout>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
@@ -48,18 +48,16 @@ LogFindBar::LogFindBar(QWidget* parent)
     m_error->hide();
 
     m_case = makeOption(tr("Aa"), tr("Match case when finding"));
-    m_expression = makeOption(tr(".*"), tr("Find a regular expression"));
+    m_expression = makeOption(LeftToRight(tr(".*")), tr("Find a regular expression"));
     QToolButton* next = NewButton(tr("Next"), tr("Find next"), tr("Next line found (F3)"));
     QToolButton* previous =
         NewButton(tr("Previous"), tr("Find previous"), tr("Previous line found (Shift+F3)"));
     QToolButton* close = NewButton(QString(QChar(0xd7)), tr("Close find bar"), tr("Close (Esc)"));
     close->setAutoRaise(true);
 
-    auto* row = new QHBoxLayout;
-    row->setSpacing(6);
-    row->addWidget(m_text, 1);
-    row->addWidget(m_count);
-    for (QWidget* widget : {static_cast<QWidget*>(m_case), static_cast<QWidget*>(m_expression),
+    auto* row = new FlowLayout(6);
+    for (QWidget* widget : {static_cast<QWidget*>(m_text), static_cast<QWidget*>(m_count),
+                            static_cast<QWidget*>(m_case), static_cast<QWidget*>(m_expression),
                             static_cast<QWidget*>(next), static_cast<QWidget*>(previous),
                             static_cast<QWidget*>(close)})
         row->addWidget(widget);

@@ -539,7 +539,7 @@ QVariant LogModel::data(QModelIndex const& index, int role) const
             return SeverityIcons::Icon(entry(row).severity, QGuiApplication::palette());
         return QVariant();
     case Qt::ToolTipRole:
-        return PlainToolTip(toolTip(row, index.column()));
+        return PlainToolTip(LeftToRight(toolTip(row, index.column())));
     case Qt::TextAlignmentRole:
         return index.column() == ElapsedColumn || index.column() == SinceColumn
                    ? int(Qt::AlignRight | Qt::AlignVCenter)

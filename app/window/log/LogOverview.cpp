@@ -293,7 +293,7 @@ QString LogOverview::textOf(Place const& place) const
     QStringList lines;
     const auto add = [&](QString const& what, int row) {
         if (row >= 0)
-            lines.append(tr("%1: %2").arg(what, lineOf(row)));
+            lines.append(tr("%1: %2").arg(what, LeftToRight(lineOf(row))));
     };
     if (place.rows[Problems] >= 0) {
         const auto row = static_cast<size_t>(place.rows[Problems]);

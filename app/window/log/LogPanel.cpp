@@ -57,15 +57,20 @@ void LogPanel::focusInEvent(QFocusEvent*)
 
 QWidget* LogPanel::makeTable()
 {
+    // A log reads from left to right in any language.
+    auto* rows = new QWidget;
+    rows->setLayoutDirection(Qt::LeftToRight);
+    auto* row = new QHBoxLayout(rows);
+    row->setContentsMargins(0, 0, 0, 0);
+    row->setSpacing(0);
+    row->addWidget(m_view, 1);
+    row->addWidget(m_overview);
+
     auto* table = new QWidget;
     auto* layout = new QVBoxLayout(table);
     layout->setContentsMargins(0, 0, 0, 2);
     layout->setSpacing(6);
-    auto* rows = new QHBoxLayout;
-    rows->setSpacing(0);
-    rows->addWidget(m_view, 1);
-    rows->addWidget(m_overview);
-    layout->addLayout(rows, 1);
+    layout->addWidget(rows, 1);
     layout->addWidget(m_findBar);
     return table;
 }

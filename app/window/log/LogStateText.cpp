@@ -4,6 +4,7 @@
 #include "app/window/log/LogStateText.h"
 
 #include "app/window/log/LogModel.h"
+#include "app/window/widgets/PlainText.h"
 
 #include <QCoreApplication>
 #include <QFileInfo>
@@ -40,7 +41,7 @@ QString LineOf(LogModel const& model, int row, qulonglong current)
     const QLocale locale;
     if (model.isAll())
         return StateText::tr("Line %1 of %2")
-            .arg(locale.toString(current), QFileInfo(model.FileOf(row)).fileName());
+            .arg(locale.toString(current), LeftToRight(QFileInfo(model.FileOf(row)).fileName()));
     const qulonglong lines = std::max<qulonglong>(current, model.state().lines);
     return StateText::tr("Line %1 of %2").arg(locale.toString(current), locale.toString(lines));
 }
@@ -73,13 +74,14 @@ QString LogStateText::ContentNotice(LogModel const& model)
     if (!unreadable.isEmpty()) {
         QStringList names;
         for (QString const& path : unreadable)
-            names.append(QFileInfo(path).fileName());
+            names.append(LeftToRight(QFileInfo(path).fileName()));
         return StateText::tr("Cannot be read, so their lines are missing: %1")
             .arg(names.join(QStringLiteral(", ")));
     }
     const auto compressed = [&model](char const* program) {
-        return StateText::tr("This looks like a compressed file. To read it: %1 %2 | velocor -")
-            .arg(QLatin1String(program), QFileInfo(model.path()).fileName());
+        return StateText::tr("This looks like a compressed file. To read it: %1")
+            .arg(LeftToRight(QStringLiteral("%1 %2 | velocor -")
+                                 .arg(QLatin1String(program), QFileInfo(model.path()).fileName())));
     };
     switch (model.state().type.content) {
     case LogFileType::Gzip:
@@ -104,10 +106,10 @@ QString LogStateText::Placeholder(LogModel const& model, int percent)
     if (model.isReading())
         return percent < 100 ? StateText::tr("Reading: %1%").arg(percent) : QString();
     if (!state.error.isEmpty())
-        return StateText::tr("Cannot read %1:\n%2").arg(model.path(), state.error);
+        return StateText::tr("Cannot read %1:\n%2").arg(LeftToRight(model.path()), state.error);
     if (!state.exists)
         return StateText::tr("%1 does not exist.\nIt is shown here as soon as it is created.")
-            .arg(model.path());
+            .arg(LeftToRight(model.path()));
     if (state.lines > 0)
         return StateText::tr("No lines match the filter.\nClear it with Ctrl+Shift+F.");
     return StateText::tr("The log is empty.\nNew lines appear here as they are written.");

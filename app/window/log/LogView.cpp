@@ -88,13 +88,19 @@ void LogView::SetDefaultWidths()
     setColumnWidth(LogModel::TimeColumn,
                    metrics.boundingRect(QStringLiteral("2000-00-00 00:00:00.000")).width() +
                        padding);
-    setColumnWidth(LogModel::SeverityColumn,
-                   metrics.boundingRect(LogSeverities::Name(LogEntry::Notification)).width() + 24 +
-                       padding);
+    int severity = 0;
+    for (int i = 0; i < LogEntry::None; ++i) {
+        const QString name = LogSeverities::Name(static_cast<LogEntry::Severity>(i));
+        severity = std::max(severity, metrics.boundingRect(name).width());
+    }
+    setColumnWidth(LogModel::SeverityColumn, severity + 24 + padding);
     setColumnWidth(LogModel::ElapsedColumn,
                    metrics.boundingRect(QStringLiteral("00000 ms")).width() + padding);
     setColumnWidth(LogModel::SinceColumn,
                    metrics.boundingRect(QStringLiteral("00 min 00 s")).width() + padding);
+    for (int column = 0; column < LogModel::MessageColumn; ++column)
+        setColumnWidth(column,
+                       std::max(columnWidth(column), horizontalHeader()->sectionSizeHint(column)));
 }
 
 void LogView::changeEvent(QEvent* event)
@@ -262,6 +268,8 @@ bool LogView::MeasureFrom(int row)
         return false;
     viewport()->update();
     horizontalHeader()->viewport()->update();
+    const int title = horizontalHeader()->sectionSizeHint(LogModel::SinceColumn);
+    setColumnWidth(LogModel::SinceColumn, std::max(columnWidth(LogModel::SinceColumn), title));
     return true;
 }
 

@@ -95,7 +95,7 @@ public:
     /// Updates the highlighting to the model's filter.
     void UpdateMarks();
 
-    /// Sets column widths that match the font.
+    /// Sets column widths that match the font and the language.
     void SetDefaultWidths();
 
     /// The maximum number of lines copied.

@@ -34,6 +34,7 @@ MarkListDialog::MarkListDialog(LogMarks const& marks, LogView const& view, QWidg
     setWindowTitle(tr("Marks"));
     setWindowFlags(windowFlags() & ~Qt::WindowContextHelpButtonHint);
     m_list->setAccessibleName(tr("Marked lines"));
+    m_list->setLayoutDirection(Qt::LeftToRight);
     m_list->setHeaderLabels({tr("Line"), tr("Time"), tr("Note"), tr("Text")});
     m_list->setRootIsDecorated(false);
     m_list->setUniformRowHeights(true);

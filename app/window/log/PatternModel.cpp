@@ -147,7 +147,7 @@ QVariant PatternModel::data(QModelIndex const& index, int role) const
     case Qt::DisplayRole:
         return cellText(shown, index.column());
     case Qt::ToolTipRole:
-        return PlainToolTip(cellText(shown, index.column()));
+        return PlainToolTip(LeftToRight(cellText(shown, index.column())));
     case Qt::DecorationRole:
         return index.column() == SeverityColumn
                    ? QVariant(SeverityIcons::Icon(shown.severity, QGuiApplication::palette()))

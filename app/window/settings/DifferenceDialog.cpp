@@ -10,12 +10,15 @@
 
 #include <QCheckBox>
 #include <QHBoxLayout>
+#include <QHeaderView>
 #include <QLabel>
 #include <QPlainTextEdit>
 #include <QPushButton>
 #include <QScrollBar>
 #include <QStackedWidget>
 #include <QTextBlock>
+
+#include <algorithm>
 
 namespace Velocor {
 
@@ -135,7 +138,8 @@ void DifferenceDialog::SetSides(Side const& left, Side const& right,
         summary += tr("; saving would lose what the last column names");
     m_summary->setText(summary);
     for (int i = 0; i < DifferenceTree::ColumnCount; ++i)
-        m_tree->setColumnWidth(i, i == DifferenceTree::StateColumn ? 110 : 150);
+        m_tree->setColumnWidth(i, std::max(i == DifferenceTree::StateColumn ? 110 : 150,
+                                           m_tree->header()->sectionSizeHint(i)));
     m_leftLines->setPlainText(QString::fromUtf8(left.bytes.left(ShownLimit)));
     m_rightLines->setPlainText(QString::fromUtf8(right.bytes.left(ShownLimit)));
     m_leftLines->setAccessibleName(tr("Lines: %1").arg(left.title));

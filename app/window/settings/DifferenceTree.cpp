@@ -31,6 +31,7 @@ QString ShownValue(QString const& value)
 DifferenceTree::DifferenceTree(QWidget* parent) : QTreeWidget(parent)
 {
     setAccessibleName(tr("Differences"));
+    setLayoutDirection(Qt::LeftToRight); // as the settings
     header()->setAccessibleName(tr("Columns of the differences"));
     setColumnCount(ColumnCount);
     setSelectionMode(ExtendedSelection);

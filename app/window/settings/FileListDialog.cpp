@@ -24,6 +24,7 @@ FileListDialog::FileListDialog(QString const& name, QStringList const& entries, 
     QLabel* heading = NewPlainLabel(name);
     heading->setWordWrap(true);
     m_list->setAccessibleName(tr("Files"));
+    m_list->setLayoutDirection(Qt::LeftToRight);
     m_list->setTextElideMode(Qt::ElideLeft); // names end in what differs
     m_problem->setAccessibleName(tr("Problem with the files"));
     m_problem->setWordWrap(true);

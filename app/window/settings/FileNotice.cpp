@@ -57,7 +57,7 @@ void FileNotice::SetComparable(bool isComparable)
 void FileNotice::check()
 {
     const QFileInfo file(m_path);
-    const QString name = file.fileName();
+    const QString name = LeftToRight(file.fileName());
     const Stamp now = stampOf(m_path);
     const bool isChanged = file.isFile() && (!m_known.exists || now.changed != m_known.changed ||
                                              now.size != m_known.size);

@@ -77,6 +77,7 @@ void NumberedText::changeEvent(QEvent* event)
 void NumberedText::paintMargin(QPaintEvent const* event)
 {
     QPainter painter(m_margin);
+    painter.setLayoutDirection(layoutDirection());
     const QColor base = palette().color(QPalette::Base);
     const QColor ink = palette().color(QPalette::Text);
     painter.fillRect(event->rect(), palette().color(QPalette::AlternateBase));

@@ -117,7 +117,8 @@ void SavedStatesDialog::fill()
         const SettingsDocument before =
             isOldest ? SettingsDocument() : SettingsFileReader::Read(states.at(i + 1).path);
         auto* item = new QTreeWidgetItem(m_list);
-        item->setText(TimeColumn, state.time.toString(QStringLiteral("yyyy-MM-dd HH:mm:ss")));
+        item->setText(TimeColumn,
+                      LeftToRight(state.time.toString(QStringLiteral("yyyy-MM-dd HH:mm:ss"))));
         item->setText(SizeColumn, FileSizeText(state.size));
         item->setText(ChangeColumn, isOldest && document.isParsed ? tr("Oldest one kept")
                                                                   : ChangeText(before, document));

@@ -49,8 +49,9 @@ void SettingsComparison::CompareWith(QString const& path, QString const& title)
 {
     const SettingsDocument other = SettingsFileReader::Read(path, SettingsFileReader::ShownKeys);
     if (!other.isParsed) {
-        PlainMessageBox(QMessageBox::Critical, m_parent,
-                        QObject::tr("Cannot compare with %1.\n%2").arg(path, other.error))
+        PlainMessageBox(
+            QMessageBox::Critical, m_parent,
+            QObject::tr("Cannot compare with %1.\n%2").arg(LeftToRight(path), other.error))
             .exec();
         return;
     }

@@ -256,7 +256,7 @@ void SettingsEditor::noteSaved()
     }
     updateState();
     Q_EMIT saved();
-    QString message = tr("Saved %1").arg(QFileInfo(m_path).fileName());
+    QString message = tr("Saved %1").arg(LeftToRight(QFileInfo(m_path).fileName()));
     if (!m_saver.statesProblem().isEmpty())
         message += tr(", but its state is not kept: %1").arg(m_saver.statesProblem());
     Q_EMIT messageReported(message);
@@ -275,7 +275,7 @@ void SettingsEditor::showTree(SettingsDocument const& document)
 
 void SettingsEditor::showMalformed(SettingsDocument const& document)
 {
-    QString message = tr("Cannot show %1 as a tree: %2").arg(m_path, document.error);
+    QString message = tr("Cannot show %1 as a tree: %2").arg(LeftToRight(m_path), document.error);
     if (document.line > 0 && !document.hasTooManyKeys)
         message += tr(" (line %1, column %2)").arg(document.line).arg(document.column);
     m_notice->ShowMessage(message);
@@ -537,7 +537,7 @@ bool SettingsEditor::MayClose()
     if (!isModified())
         return true;
     PlainMessageBox box(QMessageBox::Question, this,
-                        tr("Save changes to %1?").arg(QFileInfo(m_path).fileName()),
+                        tr("Save changes to %1?").arg(LeftToRight(QFileInfo(m_path).fileName())),
                         QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel);
     box.setDefaultButton(QMessageBox::Save);
     const int answer = box.exec();

@@ -6,9 +6,9 @@
 #include "app/settingsfile/SettingsFilter.h"
 #include "app/window/settings/SettingsModel.h"
 #include "app/window/settings/SettingsTree.h"
+#include "app/window/widgets/FlowLayout.h"
 #include "app/window/widgets/PlainText.h"
 
-#include <QHBoxLayout>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
@@ -42,9 +42,8 @@ SettingsFindBar::SettingsFindBar(SettingsTree* tree, SettingsModel const* model,
     connect(close, &QToolButton::clicked, this, &SettingsFindBar::Close);
     connect(m_text, &QLineEdit::textChanged, this, &SettingsFindBar::search);
 
-    auto* layout = new QHBoxLayout(this);
-    layout->setContentsMargins(0, 0, 0, 0);
-    layout->addWidget(m_text, 1);
+    auto* layout = new FlowLayout(6, this);
+    layout->addWidget(m_text);
     layout->addWidget(m_onlyMatches);
     layout->addWidget(m_onlyChanged);
     layout->addWidget(m_onlyDiffering);

@@ -484,7 +484,7 @@ QVariant SettingsModel::lookOf(QModelIndex const& index, int role) const
         return QVariant();
     const QString text =
         tr("Default: %1").arg(Shortened(DefaultOf(PlaceOf(index)), ShortenedLength));
-    return role == Qt::ToolTipRole ? PlainToolTip(text) : text;
+    return role == Qt::ToolTipRole ? PlainToolTip(LeftToRight(text)) : text;
 }
 
 QVariant SettingsModel::headerData(int section, Qt::Orientation orientation, int role) const

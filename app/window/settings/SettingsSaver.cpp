@@ -170,7 +170,7 @@ bool SettingsSaver::noteOutcome(bool isSaved, QString const& error)
         AcceptFile();
     } else {
         PlainMessageBox(QMessageBox::Critical, m_parent,
-                        QObject::tr("Could not save %1.\n%2").arg(m_path, error))
+                        QObject::tr("Could not save %1.\n%2").arg(LeftToRight(m_path), error))
             .exec();
     }
     return isSaved;

@@ -22,6 +22,7 @@ SettingsTree::SettingsTree(SettingsModel* model, SettingsCommands* commands, QWi
       m_delegate(new SettingsDelegate(commands, this))
 {
     setAccessibleName(tr("Settings"));
+    setLayoutDirection(Qt::LeftToRight); // in any language: names and values are code
     header()->setAccessibleName(tr("Settings columns"));
     setEditTriggers(DoubleClicked);
     setSelectionMode(ExtendedSelection);

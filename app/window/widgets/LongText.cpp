@@ -3,6 +3,8 @@
 
 #include "app/window/widgets/LongText.h"
 
+#include "app/window/widgets/PlainText.h"
+
 #include <QMimeData>
 #include <QTextCursor>
 
@@ -10,7 +12,10 @@
 
 namespace Velocor {
 
-LongText::LongText(QWidget* parent) : QPlainTextEdit(parent) {}
+LongText::LongText(QWidget* parent) : QPlainTextEdit(parent)
+{
+    KeepLeftToRight(this);
+}
 
 void LongText::SetText(QString const& text)
 {

@@ -6,8 +6,11 @@
 #include "app/window/widgets/FileSizeText.h"
 
 #include <QCoreApplication>
+#include <QGuiApplication>
 #include <QLabel>
+#include <QPlainTextEdit>
 #include <QTextDocument>
+#include <QTextOption>
 #include <QToolTip>
 #include <QVariant>
 
@@ -50,6 +53,22 @@ QLabel* NewPlainLabel(QString const& text)
     label->setTextFormat(Qt::PlainText);
     label->setText(text);
     return label;
+}
+
+QString LeftToRight(QString const& text)
+{
+    const QChar embedding(0x202a);
+    const QChar end(0x202c);
+    return QGuiApplication::isRightToLeft() && !text.isEmpty() ? embedding + text + end : text;
+}
+
+// Without the option, a line would have the direction of its first word.
+void KeepLeftToRight(QPlainTextEdit* text)
+{
+    text->setLayoutDirection(Qt::LeftToRight);
+    QTextOption option = text->document()->defaultTextOption();
+    option.setTextDirection(Qt::LeftToRight);
+    text->document()->setDefaultTextOption(option);
 }
 
 // The labels are set to plain text before they get their text: the box creates the label for the

@@ -7,6 +7,7 @@
 #include <QString>
 
 class QLabel;
+class QPlainTextEdit;
 class QPoint;
 class QWidget;
 
@@ -43,6 +44,14 @@ QString Shortened(QString const& text, int limit);
 ///
 /// @return owned by the caller, or by the layout that takes it
 QLabel* NewPlainLabel(QString const& text = QString());
+
+/// A path, a name or a value as part of a text that is shown. In a language that is written from
+/// right to left, it is enclosed in the characters that keep it left to right: its slashes, dots
+/// and numbers would change places. In other languages, it is returned as it is.
+QString LeftToRight(QString const& text);
+
+/// Shows all lines of a text from left to right in any language, because they are from a file.
+void KeepLeftToRight(QPlainTextEdit* text);
 
 /// A message box with plain text only.
 ///

@@ -3,6 +3,8 @@
 
 #include "app/window/widgets/TextDialog.h"
 
+#include "app/window/widgets/PlainText.h"
+
 #include <QAbstractButton>
 #include <QDialog>
 #include <QDialogButtonBox>
@@ -22,6 +24,7 @@ void RemoveButtonIcons(QDialogButtonBox* buttons)
 
 void ShowUnwrapped(QPlainTextEdit* text)
 {
+    KeepLeftToRight(text);
     text->setLineWrapMode(QPlainTextEdit::NoWrap);
     text->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
     text->setTabChangesFocus(true);
