@@ -14,7 +14,7 @@
 #     scripts/install-packages.sh build lint     and to check format and lint
 #     scripts/install-packages.sh build package  and to validate and build the package
 #     scripts/install-packages.sh package-test   and to test the packages in a bare root
-#     scripts/install-packages.sh build reproducible   and to build twice and compare
+#     scripts/install-packages.sh build package reproducible   and to build twice and compare
 #     scripts/install-packages.sh build abi      and to compare the binary interface
 #     scripts/install-packages.sh consumers      the compilers of projects that use the package
 #     scripts/install-packages.sh build check    and the other tools of ./check
