@@ -25,6 +25,14 @@ QColor FocusColor(QPalette const& palette, QColor const& ground, qreal least = P
     return WithContrast(palette.color(QPalette::Highlight), ground, least);
 }
 
+// Of what would not be recognized without it.
+QColor BoundaryColor(QPalette const& palette)
+{
+    const QColor window = palette.color(QPalette::Window);
+    const QColor frame = WithContrast(window, window, PartContrast);
+    return WithContrast(frame, palette.color(QPalette::Base), PartContrast);
+}
+
 void DrawFrame(QPainter* painter, QRect const& place, QColor const& color)
 {
     painter->save();
@@ -114,9 +122,25 @@ QSize ReachableStyle::sizeFromContents(ContentsType type, QStyleOption const* op
     }
 }
 
+// The field in a spin box has no frame of its own.
+void ReachableStyle::drawComplexControl(ComplexControl control, QStyleOptionComplex const* option,
+                                        QPainter* painter, QWidget const* widget) const
+{
+    QProxyStyle::drawComplexControl(control, option, painter, widget);
+    if (control == CC_SpinBox && !(option->state & State_HasFocus))
+        DrawFrame(painter, option->rect, BoundaryColor(option->palette));
+}
+
 void ReachableStyle::drawPrimitive(PrimitiveElement element, QStyleOption const* option,
                                    QPainter* painter, QWidget const* widget) const
 {
+    if (element == PE_FrameLineEdit || element == PE_IndicatorCheckBox) {
+        QProxyStyle::drawPrimitive(element, option, painter, widget);
+        const bool isFocused = element == PE_FrameLineEdit && (option->state & State_HasFocus);
+        if (!isFocused)
+            DrawFrame(painter, option->rect, BoundaryColor(option->palette));
+        return;
+    }
     auto const* focus = qstyleoption_cast<QStyleOptionFocusRect const*>(option);
     if (element != PE_FrameFocusRect || !focus)
         QProxyStyle::drawPrimitive(element, option, painter, widget);

@@ -28,8 +28,13 @@ public:
     QSize sizeFromContents(ContentsType type, QStyleOption const* option, QSize const& size,
                            QWidget const* widget) const override;
 
+    /// Fields and check boxes have a frame that can be seen in any colors.
+    ///
     /// The part with the keyboard focus has a frame, also where Fusion shows nothing, as on lists,
     /// or tints the text.
+    void drawComplexControl(ComplexControl control, QStyleOptionComplex const* option,
+                            QPainter* painter, QWidget const* widget) const override;
+
     void drawPrimitive(PrimitiveElement element, QStyleOption const* option, QPainter* painter,
                        QWidget const* widget) const override;
 

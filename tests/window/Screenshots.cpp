@@ -1,14 +1,19 @@
 // SPDX-FileCopyrightText: The Velocor authors
 // SPDX-License-Identifier: MIT
 
-// Takes screenshots of every view of the window, in light and dark:
+// Takes screenshots of every view of the window, in light and dark, and of the first ones in
+// German, mirrored, in high contrast and with large text:
 //
 //     window_screenshots FOLDER
 //
 // The build target "screenshots" runs it on a virtual display and puts them into docs/images.
 
+#include "Palettes.h"
+
+#include "app/language/Language.h"
 #include "app/window/FileTabs.h"
 #include "app/window/MainWindow.h"
+#include "app/window/ReachableStyle.h"
 #include "app/window/log/HighlightRules.h"
 #include "app/window/log/LogFindBar.h"
 #include "app/window/log/LogModel.h"
@@ -24,12 +29,13 @@
 #include <QApplication>
 #include <QComboBox>
 #include <QLineEdit>
-#include <QStyleFactory>
+#include <QStyle>
 #include <QTabWidget>
 #include <QTableView>
 #include <QTest>
 #include <QTextStream>
 #include <QTimer>
+#include <QTranslator>
 #include <QTreeView>
 
 using namespace Velocor;
@@ -71,27 +77,29 @@ QByteArray BusyHour()
     return log;
 }
 
-QPalette DarkPalette()
+// As the catalog of a language that is written from right to left, with English texts.
+class MirroredLayout : public QTranslator
 {
-    const QColor text(0xe6, 0xe6, 0xe6);
-    const QColor window(0x2b, 0x2d, 0x30);
-    QPalette palette(QColor(0x36, 0x38, 0x3c), window); // computes the shades
-    palette.setColor(QPalette::Window, window);
-    palette.setColor(QPalette::WindowText, text);
-    palette.setColor(QPalette::Base, QColor(0x1e, 0x1f, 0x22));
-    palette.setColor(QPalette::AlternateBase, QColor(0x26, 0x28, 0x2b));
-    palette.setColor(QPalette::Text, text);
-    palette.setColor(QPalette::Button, QColor(0x36, 0x38, 0x3c));
-    palette.setColor(QPalette::ButtonText, text);
-    palette.setColor(QPalette::ToolTipBase, window);
-    palette.setColor(QPalette::ToolTipText, text);
-    palette.setColor(QPalette::Highlight, QColor(0x2f, 0x65, 0xca));
-    palette.setColor(QPalette::HighlightedText, Qt::white);
-    palette.setColor(QPalette::Link, QColor(0x78, 0xae, 0xed));
-    palette.setColor(QPalette::PlaceholderText, QColor(0x9a, 0x9a, 0x9a));
-    for (QPalette::ColorRole role : {QPalette::WindowText, QPalette::Text, QPalette::ButtonText})
-        palette.setColor(QPalette::Disabled, role, QColor(0x80, 0x80, 0x80));
-    return palette;
+public:
+    MirroredLayout() { QCoreApplication::installTranslator(this); }
+    ~MirroredLayout() override { QCoreApplication::removeTranslator(this); }
+
+    MirroredLayout(MirroredLayout const&) = delete;
+    MirroredLayout& operator=(MirroredLayout const&) = delete;
+
+    bool isEmpty() const override { return false; }
+
+    QString translate(char const*, char const* text, char const*, int) const override
+    {
+        return qstrcmp(text, "QT_LAYOUT_DIRECTION") == 0 ? "RTL" : QString();
+    }
+};
+
+// The style polishes the colors of a desktop by itself.
+void SetColors(QPalette palette)
+{
+    QApplication::style()->polish(palette);
+    QApplication::setPalette(palette);
 }
 
 void SetUpProgram()
@@ -335,19 +343,53 @@ void TakeAll(QString const& folder, QString const& suffix)
     QDir(Home).remove("velocor.cfg.damaged-1"); // or the next one gets another name
 }
 
+// The first view for other readers.
+void TakeWindow(QString const& folder, QString const& name)
+{
+    const Camera camera(folder, QString());
+    MainWindow window;
+    window.show();
+    QTest::qWait(1000);
+    PanelOf(window)->GoToProblem(-1);
+    camera.take(window, name);
+    window.OpenFile(Home + "viewer.cfg");
+    camera.take(window, "settings" + name.mid(QString("window").size()));
+}
+
+void TakeForOthers(QString const& folder)
+{
+    TestFiles::write(Home + "velocor.cfg", "<VelocorSettings><MainWindow><language>de</language>"
+                                           "</MainWindow></VelocorSettings>");
+    TakeWindow(folder, "window-german");
+    QDir(Home).remove("velocor.cfg");
+    Language::Use("en");
+    {
+        const MirroredLayout mirrored;
+        TakeWindow(folder, "window-mirrored");
+    }
+    SetColors(Palettes::highContrast());
+    TakeWindow(folder, "window-contrast");
+    SetColors(Palettes::light());
+    QFont large = QApplication::font();
+    large.setPointSize(24);
+    QApplication::setFont(large);
+    TakeWindow(folder, "window-large");
+}
+
 } // namespace
 
 int main(int argc, char** argv)
 {
     QApplication application(argc, argv);
     const QString folder = application.arguments().value(1, ".");
-    QApplication::setStyle(QStyleFactory::create("Fusion"));
-    const QPalette light = QApplication::style()->standardPalette();
+    QApplication::setStyle(new ReachableStyle); // of Fusion, on a display without a desktop
     SetUpProgram();
-    QApplication::setPalette(light);
+    SetColors(Palettes::light());
     TakeAll(folder, QString());
-    QApplication::setPalette(DarkPalette());
+    SetColors(Palettes::dark());
     TakeAll(folder, "-dark");
+    SetColors(Palettes::light());
+    TakeForOthers(folder);
     TorkLog::shutdown();
     QDir(Home).removeRecursively();
     return 0;

@@ -210,6 +210,22 @@ void checkHeaders(Pale& pale, QAbstractItemView const* view)
     }
 }
 
+// Frames without which one would not see where to click.
+void checkBoundary(Pale& pale, QWidget const* widget)
+{
+    if (qobject_cast<QLineEdit const*>(widget))
+        pale.part(pale.placeOf(widget, QRect(-3, widget->height() / 2, 5, 2)),
+                  "frame of " + widget->accessibleName());
+    auto const* box = qobject_cast<QCheckBox const*>(widget);
+    if (!box)
+        return;
+    QStyleOptionButton option;
+    option.initFrom(box);
+    const QRect check = box->style()->subElementRect(QStyle::SE_CheckBoxIndicator, &option, box);
+    pale.part(pale.placeOf(box, check.adjusted(-1, 4, 1 - check.width() / 2, -4)),
+              "frame of " + box->accessibleName());
+}
+
 // All that is enabled: what cannot be used may be pale.
 QString tooPale(QWidget* window)
 {
@@ -218,6 +234,7 @@ QString tooPale(QWidget* window)
     for (QWidget const* widget : parts) {
         if (!widget->isEnabled())
             continue;
+        checkBoundary(pale, widget);
         if (auto const* button = qobject_cast<QAbstractButton const*>(widget)) {
             checkButton(pale, button);
         } else if (auto const* view = qobject_cast<QAbstractItemView const*>(widget)) {

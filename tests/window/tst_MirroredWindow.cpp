@@ -17,6 +17,7 @@
 #include "app/window/widgets/PlainText.h"
 
 #include <QComboBox>
+#include <QHeaderView>
 #include <QLabel>
 #include <QMenuBar>
 #include <QScrollBar>
@@ -133,6 +134,15 @@ void tst_MirroredWindow::staysLeftToRight_data()
     row("quotes", cell(0, LogModel::MessageColumn));
     row("parentheses", cell(1, LogModel::MessageColumn));
     row("path", cell(2, LogModel::MessageColumn));
+    row("titles of columns", [](MainWindow& window, PseudoLanguage const&) {
+        // The titles themselves are translated: black if one begins at the left of its column.
+        auto* header = View(window)->horizontalHeader();
+        const QRect start(header->sectionViewportPosition(LogModel::MessageColumn), 3, 24, 16);
+        const QImage title = header->viewport()->grab(start).toImage();
+        QImage where(16, 16, QImage::Format_RGB32);
+        where.fill(ink(title).width() > 4 ? Qt::black : Qt::white);
+        return where;
+    });
     row("match of the filter", [](MainWindow& window, PseudoLanguage const& language) {
         Child<QLineEdit>(&window, language.of("Filter by text"))->setText("ada");
         [&] {

@@ -576,7 +576,7 @@ QVariant LogModel::headerData(int section, Qt::Orientation orientation, int role
     if (role == Qt::TextAlignmentRole)
         return int(
             (section == ElapsedColumn || section == SinceColumn ? Qt::AlignRight : Qt::AlignLeft) |
-            Qt::AlignVCenter);
+            Qt::AlignVCenter | Qt::AlignAbsolute);
     if (role == Qt::ToolTipRole && section == SinceColumn)
         return PlainToolTip(m_spans.base().isEmpty() ? tr("Time since the entry above")
                                                      : tr("Time since %1").arg(m_spans.base()));

@@ -35,6 +35,7 @@ MarkListDialog::MarkListDialog(LogMarks const& marks, LogView const& view, QWidg
     setWindowFlags(windowFlags() & ~Qt::WindowContextHelpButtonHint);
     m_list->setAccessibleName(tr("Marked lines"));
     m_list->setLayoutDirection(Qt::LeftToRight);
+    KeepLeftToRight(m_list->header());
     m_list->setHeaderLabels({tr("Line"), tr("Time"), tr("Note"), tr("Text")});
     m_list->setRootIsDecorated(false);
     m_list->setUniformRowHeights(true);

@@ -59,6 +59,7 @@ void PatternDialog::makeList()
     m_list->setAccessibleName(tr("Message patterns"));
     m_list->setModel(m_patterns);
     m_list->setLayoutDirection(Qt::LeftToRight);
+    KeepLeftToRight(m_list->header());
     m_list->setRootIsDecorated(false);
     m_list->setUniformRowHeights(true);
     m_list->setAlternatingRowColors(true);

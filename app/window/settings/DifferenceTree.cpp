@@ -33,6 +33,7 @@ DifferenceTree::DifferenceTree(QWidget* parent) : QTreeWidget(parent)
     setAccessibleName(tr("Differences"));
     setLayoutDirection(Qt::LeftToRight); // as the settings
     header()->setAccessibleName(tr("Columns of the differences"));
+    KeepLeftToRight(header());
     setColumnCount(ColumnCount);
     setSelectionMode(ExtendedSelection);
     setUniformRowHeights(true);

@@ -6,6 +6,7 @@
 #include "app/window/settings/SettingsCommands.h"
 #include "app/window/settings/SettingsDelegate.h"
 #include "app/window/settings/ValueIcons.h"
+#include "app/window/widgets/PlainText.h"
 
 #include <QAction>
 #include <QActionGroup>
@@ -24,6 +25,7 @@ SettingsTree::SettingsTree(SettingsModel* model, SettingsCommands* commands, QWi
     setAccessibleName(tr("Settings"));
     setLayoutDirection(Qt::LeftToRight); // in any language: names and values are code
     header()->setAccessibleName(tr("Settings columns"));
+    KeepLeftToRight(header());
     setEditTriggers(DoubleClicked);
     setSelectionMode(ExtendedSelection);
     setAlternatingRowColors(true);

@@ -7,6 +7,7 @@
 
 #include <QCoreApplication>
 #include <QGuiApplication>
+#include <QHeaderView>
 #include <QLabel>
 #include <QPlainTextEdit>
 #include <QTextDocument>
@@ -60,6 +61,12 @@ QString LeftToRight(QString const& text)
     const QChar embedding(0x202a);
     const QChar end(0x202c);
     return QGuiApplication::isRightToLeft() && !text.isEmpty() ? embedding + text + end : text;
+}
+
+// Qt aligns titles as the language of the window does.
+void KeepLeftToRight(QHeaderView* header)
+{
+    header->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter | Qt::AlignAbsolute);
 }
 
 // Without the option, a line would have the direction of its first word.

@@ -6,6 +6,7 @@
 #include <QMessageBox>
 #include <QString>
 
+class QHeaderView;
 class QLabel;
 class QPlainTextEdit;
 class QPoint;
@@ -49,6 +50,9 @@ QLabel* NewPlainLabel(QString const& text = QString());
 /// right to left, it is enclosed in the characters that keep it left to right: its slashes, dots
 /// and numbers would change places. In other languages, it is returned as it is.
 QString LeftToRight(QString const& text);
+
+/// Shows the titles of columns from left to right in any language, as what is in the columns.
+void KeepLeftToRight(QHeaderView* header);
 
 /// Shows all lines of a text from left to right in any language, because they are from a file.
 void KeepLeftToRight(QPlainTextEdit* text);

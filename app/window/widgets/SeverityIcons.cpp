@@ -156,9 +156,12 @@ QIcon SeverityIcons::Icon(LogEntry::Severity severity, QPalette const& palette)
         return QIcon();
 
     // Never deleted, because pixmaps must not be destroyed after the application object.
-    static auto* const icons = new QHash<int, QIcon>;
-    const int key = severity * 2 + (IsDark(palette) ? 1 : 0);
-    QIcon& icon = (*icons)[key];
+    static auto* const icons = new QHash<QPair<quint64, quint64>, QIcon>;
+    const auto pair = [&palette](QPalette::ColorRole first, QPalette::ColorRole second) {
+        return quint64(palette.color(first).rgb()) << 32 | palette.color(second).rgb();
+    };
+    QIcon& icon = (*icons)[qMakePair(pair(QPalette::Text, QPalette::Base) ^ quint64(severity) << 24,
+                                     pair(QPalette::Highlight, QPalette::HighlightedText))];
     if (icon.isNull()) {
         const QColor color = IconColor(severity, palette);
         QColor const& selected = palette.color(QPalette::HighlightedText);
