@@ -28,7 +28,7 @@ QColor FocusColor(QPalette const& palette, QColor const& ground, qreal least = P
 // Of what would not be recognized without it.
 QColor BoundaryColor(QPalette const& palette)
 {
-    const QColor window = palette.color(QPalette::Window);
+    QColor const& window = palette.color(QPalette::Window);
     const QColor frame = WithContrast(window, window, PartContrast);
     return WithContrast(frame, palette.color(QPalette::Base), PartContrast);
 }
