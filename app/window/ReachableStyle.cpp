@@ -28,7 +28,7 @@ QColor FocusColor(QPalette const& palette, QColor const& ground, qreal least = P
 // Of what would not be recognized without it.
 QColor BoundaryColor(QPalette const& palette)
 {
-    const QColor window = palette.color(QPalette::Window);
+    QColor const& window = palette.color(QPalette::Window);
     const QColor frame = WithContrast(window, window, PartContrast);
     return WithContrast(frame, palette.color(QPalette::Base), PartContrast);
 }
@@ -120,6 +120,15 @@ QSize ReachableStyle::sizeFromContents(ContentsType type, QStyleOption const* op
     default:
         return usual;
     }
+}
+
+// The field in a spin box has no frame of its own.
+void ReachableStyle::drawComplexControl(ComplexControl control, QStyleOptionComplex const* option,
+                                        QPainter* painter, QWidget const* widget) const
+{
+    QProxyStyle::drawComplexControl(control, option, painter, widget);
+    if (control == CC_SpinBox && !(option->state & State_HasFocus))
+        DrawFrame(painter, option->rect, BoundaryColor(option->palette));
 }
 
 void ReachableStyle::drawPrimitive(PrimitiveElement element, QStyleOption const* option,

@@ -32,6 +32,9 @@ public:
     ///
     /// The part with the keyboard focus has a frame, also where Fusion shows nothing, as on lists,
     /// or tints the text.
+    void drawComplexControl(ComplexControl control, QStyleOptionComplex const* option,
+                            QPainter* painter, QWidget const* widget) const override;
+
     void drawPrimitive(PrimitiveElement element, QStyleOption const* option, QPainter* painter,
                        QWidget const* widget) const override;
 
