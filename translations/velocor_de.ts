@@ -3688,13 +3688,23 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <source>No match</source>
         <translation>Kein Treffer</translation>
     </message>
-    <message>
-        <source>1 key</source>
-        <translation>1 Schlüssel</translation>
+    <message numerus="yes">
+        <source>%Ln key(s)</source>
+        <translation>
+            <numerusform>%Ln Schlüssel</numerusform>
+            <numerusform>%Ln Schlüssel</numerusform>
+        </translation>
+    </message>
+    <message numerus="yes">
+        <source>%Ln match(es)</source>
+        <translation>
+            <numerusform>%Ln Treffer</numerusform>
+            <numerusform>%Ln Treffer</numerusform>
+        </translation>
     </message>
     <message>
-        <source>%L1 keys</source>
-        <translation>%L1 Schlüssel</translation>
+        <source>%L1 of %L2</source>
+        <translation>%L1 von %L2</translation>
     </message>
 </context>
 <context>
@@ -4105,13 +4115,24 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <source>No match</source>
         <translation>Kein Treffer</translation>
     </message>
-    <message>
-        <source>Continued from the bottom</source>
-        <translation>Vom Ende fortgesetzt</translation>
+    <message numerus="yes">
+        <source>%Ln match(es)</source>
+        <translation>
+            <numerusform>%Ln Treffer</numerusform>
+            <numerusform>%Ln Treffer</numerusform>
+        </translation>
     </message>
     <message>
-        <source>Continued from the top</source>
-        <translation>Vom Anfang fortgesetzt</translation>
+        <source>%L1 of %L2</source>
+        <translation>%L1 von %L2</translation>
+    </message>
+    <message>
+        <source>%L1 of %L2, continued from the bottom</source>
+        <translation>%L1 von %L2, vom Ende fortgesetzt</translation>
+    </message>
+    <message>
+        <source>%L1 of %L2, continued from the top</source>
+        <translation>%L1 von %L2, vom Anfang fortgesetzt</translation>
     </message>
 </context>
 <context>

@@ -3688,13 +3688,23 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <source>No match</source>
         <translation>Aucun résultat</translation>
     </message>
-    <message>
-        <source>1 key</source>
-        <translation>1 clé</translation>
+    <message numerus="yes">
+        <source>%Ln key(s)</source>
+        <translation>
+            <numerusform>%Ln clé</numerusform>
+            <numerusform>%Ln clés</numerusform>
+        </translation>
+    </message>
+    <message numerus="yes">
+        <source>%Ln match(es)</source>
+        <translation>
+            <numerusform>%Ln résultat</numerusform>
+            <numerusform>%Ln résultats</numerusform>
+        </translation>
     </message>
     <message>
-        <source>%L1 keys</source>
-        <translation>%L1 clés</translation>
+        <source>%L1 of %L2</source>
+        <translation>%L1 sur %L2</translation>
     </message>
 </context>
 <context>
@@ -4105,13 +4115,24 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <source>No match</source>
         <translation>Aucun résultat</translation>
     </message>
-    <message>
-        <source>Continued from the bottom</source>
-        <translation>Reprise depuis la fin</translation>
+    <message numerus="yes">
+        <source>%Ln match(es)</source>
+        <translation>
+            <numerusform>%Ln résultat</numerusform>
+            <numerusform>%Ln résultats</numerusform>
+        </translation>
     </message>
     <message>
-        <source>Continued from the top</source>
-        <translation>Reprise depuis le début</translation>
+        <source>%L1 of %L2</source>
+        <translation>%L1 sur %L2</translation>
+    </message>
+    <message>
+        <source>%L1 of %L2, continued from the bottom</source>
+        <translation>%L1 sur %L2, repris depuis la fin</translation>
+    </message>
+    <message>
+        <source>%L1 of %L2, continued from the top</source>
+        <translation>%L1 sur %L2, repris depuis le début</translation>
     </message>
 </context>
 <context>
