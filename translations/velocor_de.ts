@@ -747,6 +747,14 @@ Erstellt %1
         <source>It has more than %L1 keys</source>
         <translation>Sie hat mehr als %L1 Schlüssel</translation>
     </message>
+    <message>
+        <source>It is larger than %L1 MiB</source>
+        <translation>Sie ist größer als %L1&#xa0;MiB</translation>
+    </message>
+    <message>
+        <source>%1 cannot be read any more.</source>
+        <translation>%1 kann nicht mehr gelesen werden.</translation>
+    </message>
 </context>
 <context>
     <name>RunText</name>
@@ -3622,8 +3630,8 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <translation>Änderungen an %1 speichern?</translation>
     </message>
     <message>
-        <source>This file has too many keys to be shown as settings</source>
-        <translation>Diese Datei hat zu viele Schlüssel, um als Einstellungen gezeigt zu werden</translation>
+        <source>This file is too large to be shown as settings</source>
+        <translation>Diese Datei ist zu groß, um als Einstellungen gezeigt zu werden</translation>
     </message>
 </context>
 <context>
@@ -3809,10 +3817,6 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <translation> Diese Datei kann nicht als Text bearbeitet werden.</translation>
     </message>
     <message>
-        <source>This file has more keys than can be shown as settings.</source>
-        <translation>Diese Datei hat mehr Schlüssel, als sich als Einstellungen zeigen lassen.</translation>
-    </message>
-    <message>
         <source>&amp;Find</source>
         <translation>&amp;Suchen</translation>
     </message>
@@ -3843,6 +3847,10 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
     <message>
         <source>Go to a line of the text by its number</source>
         <translation>Zu einer Zeile des Textes gehen, mit ihrer Nummer</translation>
+    </message>
+    <message>
+        <source>This file is too large to be shown as settings.</source>
+        <translation>Diese Datei ist zu groß, um als Einstellungen gezeigt zu werden.</translation>
     </message>
 </context>
 <context>

@@ -747,6 +747,14 @@ Créé le %1
         <source>It has more than %L1 keys</source>
         <translation>Il a plus de %L1 clés</translation>
     </message>
+    <message>
+        <source>It is larger than %L1 MiB</source>
+        <translation>Il dépasse %L1&#xa0;Mio</translation>
+    </message>
+    <message>
+        <source>%1 cannot be read any more.</source>
+        <translation>%1 ne peut plus être lu.</translation>
+    </message>
 </context>
 <context>
     <name>RunText</name>
@@ -3622,8 +3630,8 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <translation>Enregistrer les modifications de %1&#x202f;?</translation>
     </message>
     <message>
-        <source>This file has too many keys to be shown as settings</source>
-        <translation>Ce fichier a trop de clés pour être affiché comme réglages</translation>
+        <source>This file is too large to be shown as settings</source>
+        <translation>Ce fichier est trop volumineux pour être affiché comme réglages</translation>
     </message>
 </context>
 <context>
@@ -3809,10 +3817,6 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <translation> Ce fichier ne peut pas être modifié comme texte.</translation>
     </message>
     <message>
-        <source>This file has more keys than can be shown as settings.</source>
-        <translation>Ce fichier a plus de clés qu’il n’est possible d’en afficher comme réglages.</translation>
-    </message>
-    <message>
         <source>&amp;Find</source>
         <translation>Rec&amp;hercher</translation>
     </message>
@@ -3843,6 +3847,10 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
     <message>
         <source>Go to a line of the text by its number</source>
         <translation>Aller à une ligne du texte par son numéro</translation>
+    </message>
+    <message>
+        <source>This file is too large to be shown as settings.</source>
+        <translation>Ce fichier est trop volumineux pour être affiché comme réglages.</translation>
     </message>
 </context>
 <context>
