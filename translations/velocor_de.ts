@@ -755,6 +755,14 @@ Erstellt %1
         <source>It has more than %L1 keys</source>
         <translation>Sie hat mehr als %L1 Schlüssel</translation>
     </message>
+    <message>
+        <source>It is larger than %L1 MiB</source>
+        <translation>Sie ist größer als %L1&#xa0;MiB</translation>
+    </message>
+    <message>
+        <source>%1 cannot be read any more.</source>
+        <translation>%1 kann nicht mehr gelesen werden.</translation>
+    </message>
 </context>
 <context>
     <name>RunText</name>
@@ -3636,8 +3644,8 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <translation>Änderungen an %1 speichern?</translation>
     </message>
     <message>
-        <source>This file has too many keys to be shown as settings</source>
-        <translation>Diese Datei hat zu viele Schlüssel, um als Einstellungen gezeigt zu werden</translation>
+        <source>This file is too large to be shown as settings</source>
+        <translation>Diese Datei ist zu groß, um als Einstellungen gezeigt zu werden</translation>
     </message>
 </context>
 <context>
@@ -3702,13 +3710,23 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <source>No match</source>
         <translation>Kein Treffer</translation>
     </message>
-    <message>
-        <source>1 key</source>
-        <translation>1 Schlüssel</translation>
+    <message numerus="yes">
+        <source>%Ln key(s)</source>
+        <translation>
+            <numerusform>%Ln Schlüssel</numerusform>
+            <numerusform>%Ln Schlüssel</numerusform>
+        </translation>
+    </message>
+    <message numerus="yes">
+        <source>%Ln match(es)</source>
+        <translation>
+            <numerusform>%Ln Treffer</numerusform>
+            <numerusform>%Ln Treffer</numerusform>
+        </translation>
     </message>
     <message>
-        <source>%L1 keys</source>
-        <translation>%L1 Schlüssel</translation>
+        <source>%L1 of %L2</source>
+        <translation>%L1 von %L2</translation>
     </message>
 </context>
 <context>
@@ -3813,10 +3831,6 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <translation> Diese Datei kann nicht als Text bearbeitet werden.</translation>
     </message>
     <message>
-        <source>This file has more keys than can be shown as settings.</source>
-        <translation>Diese Datei hat mehr Schlüssel, als sich als Einstellungen zeigen lassen.</translation>
-    </message>
-    <message>
         <source>&amp;Find</source>
         <translation>&amp;Suchen</translation>
     </message>
@@ -3847,6 +3861,10 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
     <message>
         <source>Go to a line of the text by its number</source>
         <translation>Zu einer Zeile des Textes gehen, mit ihrer Nummer</translation>
+    </message>
+    <message>
+        <source>This file is too large to be shown as settings.</source>
+        <translation>Diese Datei ist zu groß, um als Einstellungen gezeigt zu werden.</translation>
     </message>
 </context>
 <context>
@@ -4119,13 +4137,24 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <source>No match</source>
         <translation>Kein Treffer</translation>
     </message>
-    <message>
-        <source>Continued from the bottom</source>
-        <translation>Vom Ende fortgesetzt</translation>
+    <message numerus="yes">
+        <source>%Ln match(es)</source>
+        <translation>
+            <numerusform>%Ln Treffer</numerusform>
+            <numerusform>%Ln Treffer</numerusform>
+        </translation>
     </message>
     <message>
-        <source>Continued from the top</source>
-        <translation>Vom Anfang fortgesetzt</translation>
+        <source>%L1 of %L2</source>
+        <translation>%L1 von %L2</translation>
+    </message>
+    <message>
+        <source>%L1 of %L2, continued from the bottom</source>
+        <translation>%L1 von %L2, vom Ende fortgesetzt</translation>
+    </message>
+    <message>
+        <source>%L1 of %L2, continued from the top</source>
+        <translation>%L1 von %L2, vom Anfang fortgesetzt</translation>
     </message>
 </context>
 <context>

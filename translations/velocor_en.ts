@@ -119,4 +119,31 @@
         </translation>
     </message>
 </context>
+<context>
+    <name>Velocor::SettingsFindBar</name>
+    <message numerus="yes">
+        <source>%Ln key(s)</source>
+        <translation>
+            <numerusform>%Ln key</numerusform>
+            <numerusform>%Ln keys</numerusform>
+        </translation>
+    </message>
+    <message numerus="yes">
+        <source>%Ln match(es)</source>
+        <translation>
+            <numerusform>%Ln match</numerusform>
+            <numerusform>%Ln matches</numerusform>
+        </translation>
+    </message>
+</context>
+<context>
+    <name>Velocor::TextFindBar</name>
+    <message numerus="yes">
+        <source>%Ln match(es)</source>
+        <translation>
+            <numerusform>%Ln match</numerusform>
+            <numerusform>%Ln matches</numerusform>
+        </translation>
+    </message>
+</context>
 </TS>

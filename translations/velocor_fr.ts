@@ -755,6 +755,14 @@ Créé le %1
         <source>It has more than %L1 keys</source>
         <translation>Il a plus de %L1 clés</translation>
     </message>
+    <message>
+        <source>It is larger than %L1 MiB</source>
+        <translation>Il dépasse %L1&#xa0;Mio</translation>
+    </message>
+    <message>
+        <source>%1 cannot be read any more.</source>
+        <translation>%1 ne peut plus être lu.</translation>
+    </message>
 </context>
 <context>
     <name>RunText</name>
@@ -3636,8 +3644,8 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <translation>Enregistrer les modifications de %1&#x202f;?</translation>
     </message>
     <message>
-        <source>This file has too many keys to be shown as settings</source>
-        <translation>Ce fichier a trop de clés pour être affiché comme réglages</translation>
+        <source>This file is too large to be shown as settings</source>
+        <translation>Ce fichier est trop volumineux pour être affiché comme réglages</translation>
     </message>
 </context>
 <context>
@@ -3702,13 +3710,23 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <source>No match</source>
         <translation>Aucun résultat</translation>
     </message>
-    <message>
-        <source>1 key</source>
-        <translation>1 clé</translation>
+    <message numerus="yes">
+        <source>%Ln key(s)</source>
+        <translation>
+            <numerusform>%Ln clé</numerusform>
+            <numerusform>%Ln clés</numerusform>
+        </translation>
+    </message>
+    <message numerus="yes">
+        <source>%Ln match(es)</source>
+        <translation>
+            <numerusform>%Ln résultat</numerusform>
+            <numerusform>%Ln résultats</numerusform>
+        </translation>
     </message>
     <message>
-        <source>%L1 keys</source>
-        <translation>%L1 clés</translation>
+        <source>%L1 of %L2</source>
+        <translation>%L1 sur %L2</translation>
     </message>
 </context>
 <context>
@@ -3813,10 +3831,6 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <translation> Ce fichier ne peut pas être modifié comme texte.</translation>
     </message>
     <message>
-        <source>This file has more keys than can be shown as settings.</source>
-        <translation>Ce fichier a plus de clés qu’il n’est possible d’en afficher comme réglages.</translation>
-    </message>
-    <message>
         <source>&amp;Find</source>
         <translation>Rec&amp;hercher</translation>
     </message>
@@ -3847,6 +3861,10 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
     <message>
         <source>Go to a line of the text by its number</source>
         <translation>Aller à une ligne du texte par son numéro</translation>
+    </message>
+    <message>
+        <source>This file is too large to be shown as settings.</source>
+        <translation>Ce fichier est trop volumineux pour être affiché comme réglages.</translation>
     </message>
 </context>
 <context>
@@ -4119,13 +4137,24 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <source>No match</source>
         <translation>Aucun résultat</translation>
     </message>
-    <message>
-        <source>Continued from the bottom</source>
-        <translation>Reprise depuis la fin</translation>
+    <message numerus="yes">
+        <source>%Ln match(es)</source>
+        <translation>
+            <numerusform>%Ln résultat</numerusform>
+            <numerusform>%Ln résultats</numerusform>
+        </translation>
     </message>
     <message>
-        <source>Continued from the top</source>
-        <translation>Reprise depuis le début</translation>
+        <source>%L1 of %L2</source>
+        <translation>%L1 sur %L2</translation>
+    </message>
+    <message>
+        <source>%L1 of %L2, continued from the bottom</source>
+        <translation>%L1 sur %L2, repris depuis la fin</translation>
+    </message>
+    <message>
+        <source>%L1 of %L2, continued from the top</source>
+        <translation>%L1 sur %L2, repris depuis le début</translation>
     </message>
 </context>
 <context>

@@ -51,8 +51,7 @@ SettingsValues SettingsDefaults::Of(QString const& path)
 {
     const QString file = FileFor(path);
     const SettingsDocument document =
-        file.isEmpty() ? SettingsDocument()
-                       : SettingsFileReader::Read(file, SettingsFileReader::ShownKeys);
+        file.isEmpty() ? SettingsDocument() : SettingsFileReader::ReadShown(file);
     return document.isParsed ? document.AllValues() : SettingsValues();
 }
 

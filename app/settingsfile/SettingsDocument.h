@@ -43,9 +43,9 @@ struct SettingsDocument
 
     bool isReadable = false; ///< whether the file could be read from disk
     bool isParsed = false;
-    bool hasTooManyKeys = false; ///< why it is not parsed: it has only the first ones
-    QString error;               ///< message of the system or the parser; empty on success
-    int line = 0;                ///< position of the error, starting at 1; 0 if unknown
+    bool isTooLarge = false; ///< why it is not parsed: it has the first keys, or none
+    QString error;           ///< message of the system or the parser; empty on success
+    int line = 0;            ///< position of the error, starting at 1; 0 if unknown
     int column = 0;
 
     QVector<Loss> losses; ///< what the store does not keep of a file

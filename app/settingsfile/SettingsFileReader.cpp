@@ -34,7 +34,7 @@ SettingsFileReader::SettingsFileReader(TorkConfigFile& store, SettingsDocument& 
     : TorkConfigFileDocHandler(&store), m_store(store), m_document(document), m_mostKeys(mostKeys)
 {}
 
-SettingsDocument SettingsFileReader::Read(QString const& path, int mostKeys)
+SettingsDocument SettingsFileReader::Read(QString const& path, int mostKeys, qint64 mostBytes)
 {
     SettingsDocument document;
     QFile file(path);
@@ -46,9 +46,18 @@ SettingsDocument SettingsFileReader::Read(QString const& path, int mostKeys)
         document.error = QObject::tr("Not a regular file");
     else if (!file.open(QIODevice::ReadOnly))
         document.error = file.errorString();
+    else if (file.size() > mostBytes)
+        noteSize(mostBytes, document);
     else
         read(file, document, mostKeys);
     return document;
+}
+
+void SettingsFileReader::noteSize(qint64 mostBytes, SettingsDocument& document)
+{
+    document.isReadable = true;
+    document.isTooLarge = true;
+    document.error = QObject::tr("It is larger than %L1 MiB").arg(mostBytes >> 20);
 }
 
 SettingsDocument SettingsFileReader::ReadBytes(QByteArray const& bytes)
@@ -99,7 +108,7 @@ bool SettingsFileReader::startElement(QString const& namespaceURI, QString const
     m_isAfterValue = false;
     const int newDepth = depth() + 1;
     if (newDepth == 3 && ++m_keyCount > m_mostKeys) {
-        m_document.hasTooManyKeys = true;
+        m_document.isTooLarge = true;
         return false;
     }
     if (newDepth == 1) {
@@ -190,7 +199,7 @@ bool SettingsFileReader::startDTD(QString const& name, QString const&, QString c
 
 bool SettingsFileReader::fatalError(QXmlParseException const& exception)
 {
-    m_document.error = m_document.hasTooManyKeys
+    m_document.error = m_document.isTooLarge
                            ? QObject::tr("It has more than %L1 keys").arg(m_mostKeys)
                            : exception.message();
     m_document.line = exception.lineNumber();

@@ -28,11 +28,23 @@ public:
     /// The number of keys up to which a document is fit to be shown.
     static constexpr int ShownKeys = 1000000;
 
+    /// The size of a file, in bytes, up to which it is read to be shown: reading takes several
+    /// times as much memory, and nobody waits for it at the end of a long value.
+    static constexpr qint64 ShownSize = 128 << 20;
+
     /// Reads a file. Only regular files and links to them are read.
     ///
     /// @param mostKeys  reading ends at the first key after these
+    /// @param mostBytes  of a larger file nothing is read; at least 1 MiB
     static SettingsDocument Read(QString const& path,
-                                 int mostKeys = std::numeric_limits<int>::max());
+                                 int mostKeys = std::numeric_limits<int>::max(),
+                                 qint64 mostBytes = std::numeric_limits<qint64>::max());
+
+    /// Reads a file if it is fit to be shown. Otherwise, the document says so in `isTooLarge`.
+    static SettingsDocument ReadShown(QString const& path)
+    {
+        return Read(path, ShownKeys, ShownSize);
+    }
 
     /// Reads the content of a file from memory.
     static SettingsDocument ReadBytes(QByteArray const& bytes);
@@ -43,6 +55,7 @@ public:
 private:
     SettingsFileReader(TorkConfigFile& store, SettingsDocument& document, int mostKeys);
 
+    static void noteSize(qint64 mostBytes, SettingsDocument& document);
     static void read(QIODevice& device, SettingsDocument& document, int mostKeys);
     void noteLoss(QString const& what) { noteLossAt(depth(), what); }
     void noteLossAt(int depth, QString const& what);

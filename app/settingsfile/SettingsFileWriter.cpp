@@ -7,6 +7,7 @@
 #include "common/config/TorkConfigFile.h"
 #include "common/config/TorkConfigText.h"
 
+#include <QBuffer>
 #include <QFile>
 #include <QFileInfo>
 #include <QObject>
@@ -91,6 +92,39 @@ bool IsOurs(QFileInfo const& file)
 #endif
 }
 
+// In pieces, because a file may be larger than what fits into memory.
+bool CopyAll(QIODevice& from, QIODevice& to)
+{
+    QByteArray piece(1 << 16, '\0');
+    qint64 size = 0;
+    while ((size = from.read(piece.data(), piece.size())) > 0) {
+        if (to.write(piece.constData(), size) != size)
+            return false;
+    }
+    return size == 0;
+}
+
+bool SaveContent(QString const& path, QIODevice& content, QString* error)
+{
+    const QFileInfo info(path);
+    if (info.exists() && !info.isFile()) {
+        *error = QObject::tr("Not a regular file");
+        return false;
+    }
+    QSaveFile replacement(path);
+    QFile original(path);
+    QFileDevice& file =
+        info.exists() && !IsOurs(info) ? static_cast<QFileDevice&>(original) : replacement;
+    bool isSaved = file.open(QIODevice::WriteOnly) && CopyAll(content, file);
+    if (&file == &replacement)
+        isSaved = isSaved && replacement.commit();
+    else
+        isSaved = isSaved && original.flush();
+    if (!isSaved)
+        *error = file.errorString();
+    return isSaved;
+}
+
 } // namespace
 
 QString SettingsFileWriter::ValueProblem(QString const& value)
@@ -156,25 +190,21 @@ bool SettingsFileWriter::Save(QString const& path, SettingsDocument const& docum
 
 bool SettingsFileWriter::SaveBytes(QString const& path, QByteArray const& bytes, QString* error)
 {
-    const QFileInfo info(path);
-    if (info.exists() && !info.isFile()) {
-        *error = QObject::tr("Not a regular file");
-        return false;
-    }
-    QSaveFile replacement(path);
-    QFile original(path);
-    QFileDevice& file =
-        info.exists() && !IsOurs(info) ? static_cast<QFileDevice&>(original) : replacement;
-    bool isSaved = file.open(QIODevice::WriteOnly) && file.write(bytes) == bytes.size();
-    if (&file == &replacement)
-        isSaved = isSaved && replacement.commit();
-    else
-        isSaved = isSaved && original.flush();
-    if (!isSaved)
-        *error = file.errorString();
-    return isSaved;
+    QBuffer content;
+    content.setData(bytes);
+    content.open(QIODevice::ReadOnly);
+    return SaveContent(path, content, error);
 }
 
+bool SettingsFileWriter::SaveCopy(QString const& path, QString const& original, QString* error)
+{
+    QFile content(original);
+    if (!QFileInfo(original).isFile() || !content.open(QIODevice::ReadOnly)) {
+        *error = QObject::tr("%1 cannot be read any more.").arg(original);
+        return false;
+    }
+    return SaveContent(path, content, error);
+}
 bool SettingsFileWriter::KeepBackup(QString const& path, QString* error)
 {
     const QString copy = path + QLatin1String(".bak");

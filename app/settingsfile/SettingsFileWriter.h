@@ -38,6 +38,9 @@ public:
     /// @param error  receives the reason for a failure
     static bool SaveBytes(QString const& path, QByteArray const& bytes, QString* error);
 
+    /// As SaveBytes(), with the content of another file, however large.
+    static bool SaveCopy(QString const& path, QString const& original, QString* error);
+
     /// Copies a file to the same name with ".bak" appended, replacing an earlier copy.
     static bool KeepBackup(QString const& path, QString* error);
 };

@@ -58,6 +58,10 @@ private slots:
     void unreadable();
     void endsAfterSoManyKeys_data();
     void endsAfterSoManyKeys();
+    void readsUpToASize_data();
+    void readsUpToASize();
+    void copiesAFile_data();
+    void copiesAFile();
     void deepNesting();
     void deepDocumentType();
     void losses_data();
@@ -339,9 +343,64 @@ void tst_SettingsFile::endsAfterSoManyKeys()
     const SettingsDocument document = SettingsFileReader::Read(path, most);
     QVERIFY(document.isReadable);
     QTEST(document.isParsed, "isParsed");
-    QCOMPARE(document.hasTooManyKeys, !document.isParsed);
+    QCOMPARE(document.isTooLarge, !document.isParsed);
     QTEST(int(document.AllValues().size()), "keys");
     QTEST(document.error, "error");
+}
+
+void tst_SettingsFile::readsUpToASize_data()
+{
+    QTest::addColumn<qint64>("size");
+    QTest::addColumn<bool>("isTooLarge");
+    QTest::newRow("as large") << SettingsFileReader::ShownSize << false;
+    QTest::newRow("one byte more") << SettingsFileReader::ShownSize + 1 << true;
+    QTest::newRow("two gigabytes") << (qint64(1) << 31) << true;
+    QTest::newRow("far more than memory") << (qint64(1) << 42) << true;
+}
+
+// The files have holes, so they take no space.
+void tst_SettingsFile::readsUpToASize()
+{
+    QFETCH(qint64, size);
+    QFETCH(bool, isTooLarge);
+    const QTemporaryDir folder;
+    QFile file(folder.filePath("x.cfg"));
+    QVERIFY(file.open(QIODevice::WriteOnly) && file.write("<R><S><a>1</a></S></R>") > 0);
+    QVERIFY(file.resize(size));
+    file.close();
+    const SettingsDocument document = SettingsFileReader::ReadShown(file.fileName());
+    QVERIFY(document.isReadable && !document.isParsed);
+    QCOMPARE(document.isTooLarge, isTooLarge);
+    QCOMPARE(document.sections.isEmpty(), isTooLarge);
+    QCOMPARE(document.error == "It is larger than 128 MiB", isTooLarge);
+}
+
+void tst_SettingsFile::copiesAFile_data()
+{
+    QTest::addColumn<QByteArray>("content");
+    QTest::addColumn<QByteArray>("before");
+    QTest::newRow("nothing") << QByteArray() << QByteArray("old");
+    QTest::newRow("less than a piece") << QByteArray("<R/>") << QByteArray("longer than that");
+    QTest::newRow("several pieces") << QByteArray("0123456789").repeated(100000) << QByteArray();
+}
+
+void tst_SettingsFile::copiesAFile()
+{
+    QFETCH(QByteArray, content);
+    QFETCH(QByteArray, before);
+    const QTemporaryDir folder;
+    const QString from = folder.filePath("from.cfg");
+    const QString to = folder.filePath("to.cfg");
+    QVERIFY(TestFiles::write(from, content) && TestFiles::write(to, before));
+    QString error;
+    QVERIFY(SettingsFileWriter::SaveCopy(to, from, &error));
+    QCOMPARE(TestFiles::read(to), content);
+    QCOMPARE(error, QString());
+
+    QVERIFY(QFile::remove(from));
+    QVERIFY(!SettingsFileWriter::SaveCopy(to, from, &error));
+    QCOMPARE(error, from + " cannot be read any more.");
+    QCOMPARE(TestFiles::read(to), content);
 }
 
 void tst_SettingsFile::deepNesting()

@@ -20,6 +20,7 @@
 #include "app/window/log/LogPanel.h"
 #include "app/window/log/LogView.h"
 #include "app/window/settings/SettingsEditor.h"
+#include "app/window/settings/SettingsTextPage.h"
 #include "app/window/settings/ValueDialog.h"
 #include "app/window/widgets/NoticeBar.h"
 
@@ -184,6 +185,7 @@ private slots:
     void recentFilesInTheWindow();
 
     void tooManyKeysAreShownAsText();
+    void hugeFileIsShownAsText();
     void longValueIsShownShortened();
     void longValueSurvivesOtherEdits();
     void longValueIsEdited_data();
@@ -432,9 +434,10 @@ void tst_HostileFiles::tooManyKeysAreShownAsText()
     auto const* notice = editor->findChild<NoticeBar*>();
     QCOMPARE(notice->text(),
              "Cannot show " + shown.file + " as a tree: It has more than 1,000,000 keys");
-    QCOMPARE(Child<QLabel>(editor, "State of the text")->text(),
-             QString("This file has more keys than can be shown as settings. Only the start of the "
-                     "file is shown, and it cannot be edited as text."));
+    QCOMPARE(
+        Child<QLabel>(editor, "State of the text")->text(),
+        QString("This file is too large to be shown as settings. Only the start of the file is "
+                "shown, and it cannot be edited as text."));
     auto* text = Child<QPlainTextEdit>(editor, "File text");
     QVERIFY(text->isReadOnly() && text->extraSelections().isEmpty());
     QVERIFY(text->toPlainText().startsWith("<R><S>\n<k>1</k>\n"));
@@ -443,8 +446,42 @@ void tst_HostileFiles::tooManyKeysAreShownAsText()
     QTest::keyClick(text, Qt::Key_T, Qt::ControlModifier);
     editor->ShowAsTree();
     QVERIFY(!editor->ShowsTree());
-    QCOMPARE(Status(*shown.window), QString("This file has too many keys to be shown as settings"));
+    QCOMPARE(Status(*shown.window), QString("This file is too large to be shown as settings"));
     QCOMPARE(TestFiles::read(shown.file), content);
+}
+
+// With a hole, so it takes no space.
+void tst_HostileFiles::hugeFileIsShownAsText()
+{
+    const QByteArray start = "<R><S>\n<k>1</k>\n" + QByteArray(2000000, ' ');
+    const ShownSettings shown;
+    SettingsEditor* editor = shown.editor;
+    QFile file(shown.file);
+    QVERIFY(TestFiles::writeOver(shown.file, start));
+    const qint64 size = qint64(5) << 30;
+    QVERIFY(file.resize(size));
+
+    // Changed while it is open, then opened.
+    Child<QTreeView>(editor, "Settings")->setFocus();
+    QString told;
+    WindowTest::whenShown<QMessageBox>([&](QMessageBox* box) {
+        told = box->text();
+        QTest::keyClick(box, Qt::Key_Escape);
+    });
+    editor->ShowWhatWillBeWritten();
+    QVERIFY2(told.endsWith("It is larger than 128 MiB"), qPrintable(told));
+    editor->Reload();
+    QVERIFY(!editor->ShowsTree());
+    QCOMPARE(editor->findChild<NoticeBar*>()->text(),
+             "Cannot show " + shown.file + " as a tree: It is larger than 128 MiB");
+    auto* text = Child<QPlainTextEdit>(editor, "File text");
+    QVERIFY(text->isReadOnly());
+    QCOMPARE(text->document()->characterCount(), SettingsTextPage::EditLimit + 1);
+    QTest::keyClick(text, Qt::Key_T, Qt::ControlModifier);
+    editor->ShowAsTree();
+    QVERIFY(!editor->ShowsTree() && !editor->isModified());
+    QCOMPARE(QFileInfo(shown.file).size(), size);
+    QCOMPARE(Status(*shown.window), QString("This file is too large to be shown as settings"));
 }
 
 void tst_HostileFiles::longValueIsShownShortened()

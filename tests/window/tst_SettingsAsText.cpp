@@ -49,6 +49,7 @@ private slots:
     void closingAsks();
     void findsInTheText_data();
     void findsInTheText();
+    void countFollowsTheText();
     void findBarOfTheText();
     void goesToALine_data();
     void goesToALine();
@@ -376,12 +377,19 @@ void tst_SettingsAsText::findsInTheText_data()
         QTest::newRow(name) << wanted << keys << found << result;
     };
     // <R> / <A>font</A> / <B>Font font</B> / </R>
-    row("the first", "font", "", "2:3 font", "");
-    row("in another case", "FONT", "n", "3:3 Font", "");
-    row("the next on the same line", "font", "nn", "3:8 font", "");
-    row("around the end", "font", "nnn", "2:3 font", "Continued from the top");
-    row("the previous one, around the start", "font", "p", "3:8 font", "Continued from the bottom");
-    row("back again", "font", "pp", "3:3 Font", "");
+    row("the first", "font", "", "2:3 font", "1 of 3");
+    row("in another case", "FONT", "n", "3:3 Font", "2 of 3");
+    row("the next on the same line", "font", "nn", "3:8 font", "3 of 3");
+    row("around the end", "font", "nnn", "2:3 font", "1 of 3, continued from the top");
+    row("the previous one, around the start", "font", "p", "3:8 font",
+        "3 of 3, continued from the bottom");
+    row("back again", "font", "pp", "3:3 Font", "2 of 3");
+    row("on again", "font", "pppnn", "3:8 font", "3 of 3");
+    row("no overlap", "ff", "", "4:3 ff", "1 of 2");
+    row("no overlap, the next", "ff", "n", "4:5 ff", "2 of 2");
+    row("no overlap, backward", "ff", "p", "4:5 ff", "2 of 2, continued from the bottom");
+    row("no overlap, the previous", "ff", "pp", "4:3 ff", "1 of 2");
+    row("a space is also a non-breaking one", "o n", "", "4:9 o\u00a0n", "1 of 1");
     row("nowhere", "zzz", "", "1:0 ", "No match");
     row("nowhere, asked again", "zzz", "np", "1:0 ", "No match");
 }
@@ -390,7 +398,8 @@ void tst_SettingsAsText::findsInTheText()
 {
     QFETCH(QString, wanted);
     QFETCH(QString, keys);
-    const QByteArray content("<R>\n<A>font</A>\n<B>Font font</B>\n</R>\n");
+    const QByteArray content("<R>\n<A>font</A>\n<B>Font font</B>\n"
+                             "<C>fffff o\xC2\xA0n</C>\n</R>\n");
     const ShownText shown(content);
     shown.press(Qt::Key_T, Qt::ControlModifier);
     shown.press(Qt::Key_Home, Qt::ControlModifier);
@@ -408,6 +417,41 @@ void tst_SettingsAsText::findsInTheText()
         "found");
     QTEST(Child<QLabel>(shown.editor, "Result of the search in the text")->text(), "result");
     QVERIFY(!shown.editor->isModified());
+}
+
+void tst_SettingsAsText::countFollowsTheText()
+{
+    const ShownText shown("<R>\n<A>font</A>\n<B>Font font</B>\n</R>\n");
+    shown.press(Qt::Key_T, Qt::ControlModifier);
+    shown.press(Qt::Key_Home, Qt::ControlModifier);
+    shown.press(Qt::Key_F, Qt::ControlModifier);
+    auto* field = Child<QLineEdit>(shown.editor, "Find in the text");
+    const auto result = [&] {
+        return Child<QLabel>(shown.editor, "Result of the search in the text")->text();
+    };
+    QTest::keyClicks(field, "font");
+    QTest::keyClick(field, Qt::Key_F3, Qt::ShiftModifier);
+    QCOMPARE(result(), QString("3 of 3, continued from the bottom"));
+    shown.press(Qt::Key_Home, Qt::ControlModifier);
+    QTRY_COMPARE_WITH_TIMEOUT(result(), QString("3 matches"), Patience);
+    QTest::keyClicks(shown.text, "font Font ");
+    QTRY_COMPARE_WITH_TIMEOUT(result(), QString("5 matches"), Patience);
+    shown.press(Qt::Key_F3);
+    QCOMPARE(result(), QString("3 of 5"));
+    shown.press(Qt::Key_Delete);
+    QTRY_COMPARE_WITH_TIMEOUT(result(), QString("4 matches"), Patience);
+    shown.press(Qt::Key_Z, Qt::ControlModifier);
+    QTRY_COMPARE_WITH_TIMEOUT(result(), QString("5 matches"), Patience);
+    QTest::keyClick(field, Qt::Key_Escape);
+    shown.press(Qt::Key_A, Qt::ControlModifier);
+    QTest::keyClicks(shown.text, "font");
+    shown.press(Qt::Key_F, Qt::ControlModifier);
+    QCOMPARE(result(), QString("1 match"));
+    QTest::keyClick(field, Qt::Key_End);
+    QTest::keyClick(field, Qt::Key_Backspace);
+    QCOMPARE(result(), QString("1 of 1, continued from the top"));
+    field->clear();
+    QCOMPARE(result(), QString());
 }
 
 void tst_SettingsAsText::findBarOfTheText()

@@ -38,6 +38,11 @@ private slots:
     void tabSkipsWhatIsHidden();
     void reloadedFileIsFiltered();
     void editingIsTakenFirst();
+    void tellsWhichMatch_data();
+    void tellsWhichMatch();
+    void countFollowsTheFile_data();
+    void countFollowsTheFile();
+    void countAfterClosing();
     void tabReachesEverySwitch();
 };
 
@@ -125,19 +130,20 @@ void tst_SettingsFiltered::showsOnly_data()
                         char const* result) {
         QTest::newRow(name) << text << switches << rows << result;
     };
-    row("no filter", "tab", "", qPrintable(All), "");
-    row("a key", "TAB", "o", "Editor: tab; Window: tabs", "2 keys");
-    row("a value", "serif", "o", "Editor: font", "1 key");
-    row("a section, with all its keys", "wind", "o", "Window: tabs color", "2 keys");
-    row("an empty section", "empty", "o", "Empty", "0 keys");
+    row("no filter", "tab", "", qPrintable(All), "1 of 2");
+    row("a key", "TAB", "o", "Editor: tab; Window: tabs", "1 of 2");
+    row("a value", "serif", "o", "Editor: font", "1 of 1");
+    row("a section, with all its keys", "wind", "o", "Window: tabs color", "1 of 1");
+    row("an empty section", "empty", "o", "Empty", "1 of 1");
     row("nothing", "none", "o", "", "No match");
     row("all", "", "o", qPrintable(All), "");
-    row("switched off again", "tab", "oo", qPrintable(All), "");
+    row("switched off again", "tab", "oo", qPrintable(All), "1 of 2");
     row("values that differ from their default", "", "d", "Editor: font tab; Window: color",
         "3 keys");
-    row("the same with a text", "tab", "od", "Editor: tab", "1 key");
+    row("the same with a text", "tab", "od", "Editor: tab", "1 of 1");
     row("the same with a text to find only", "tab", "d", "Editor: font tab; Window: color",
-        "3 keys");
+        "1 of 1");
+    row("a match that is hidden", "wrap", "d", "Editor: font tab; Window: color", "No match");
     row("changed values of an unchanged file", "", "c", "", "No match");
 }
 
@@ -338,7 +344,7 @@ void tst_SettingsFiltered::reloadedFileIsFiltered()
     QVERIFY(TestFiles::write(shown.file, QByteArray(Values).replace("font", "table")));
     shown.editor->Reload();
     QCOMPARE(shown.rows(), QString("Editor: table tab; Window: tabs"));
-    QCOMPARE(shown.result(), QString("3 keys"));
+    QCOMPARE(shown.result(), QString("1 of 3")); // the value of "table" is still Serif
 }
 
 void tst_SettingsFiltered::editingIsTakenFirst()
@@ -349,6 +355,128 @@ void tst_SettingsFiltered::editingIsTakenFirst()
     QTest::keyClicks(shown.field(), "mono");
     QCOMPARE(shown.rows(), QString("Editor: font"));
     QVERIFY(shown.bytes().contains("<font>Mono</font>"));
+}
+
+void tst_SettingsFiltered::tellsWhichMatch_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QString>("keys"); // n: next, p: previous, u and d: up and down in the tree
+    QTest::addColumn<QString>("current");
+    QTest::addColumn<QString>("result");
+
+    const auto row = [](char const* name, char const* text, char const* keys, char const* current,
+                        char const* result) {
+        QTest::newRow(name) << text << keys << current << result;
+    };
+    // "e" is in all names but the key "tab" and "tabs": Editor font(Serif) wrap(yes) Empty
+    row("the first", "e", "", "Editor", "1 of 4");
+    row("in another case", "E", "", "Editor", "1 of 4");
+    row("the next", "e", "n", "font", "2 of 4");
+    row("the last", "e", "nnn", "Empty", "4 of 4");
+    row("around the end", "e", "nnnn", "Editor", "1 of 4");
+    row("around the start", "e", "p", "Empty", "4 of 4");
+    row("back", "e", "nnp", "font", "2 of 4");
+    row("a row without a match", "e", "nnd", "tab", "4 matches");
+    row("the next after that", "e", "nndn", "Empty", "4 of 4");
+    row("the previous before that", "e", "nndp", "wrap", "3 of 4");
+    row("a match that one goes to", "e", "dd", "wrap", "3 of 4");
+    row("one match", "empty", "", "Empty", "1 of 1");
+    row("one match, elsewhere", "empty", "u", "tab", "1 match");
+    row("one match, again and again", "empty", "nnp", "Empty", "1 of 1");
+    row("in a name and its value, one match", "wrap", "", "wrap", "1 of 1");
+    row("no match", "zzz", "np", "Editor", "No match");
+}
+
+void tst_SettingsFiltered::tellsWhichMatch()
+{
+    QFETCH(QString, text);
+    QFETCH(QString, keys);
+    const ShownFilter shown;
+    shown.filter(text, "");
+    for (QChar key : keys) {
+        if (key == 'n' || key == 'p')
+            QTest::keyClick(shown.field(), Qt::Key_F3,
+                            key == 'p' ? Qt::ShiftModifier : Qt::NoModifier);
+        else
+            QTest::keyClick(shown.tree, key == 'u' ? Qt::Key_Up : Qt::Key_Down);
+    }
+    QTEST(shown.current(), "current");
+    QFETCH(QString, result);
+    QTRY_COMPARE_WITH_TIMEOUT(shown.result(), result, Patience);
+}
+
+void tst_SettingsFiltered::countFollowsTheFile_data()
+{
+    QTest::addColumn<QString>("change"); // of the current row, "font"
+    QTest::addColumn<QString>("result");
+    const auto row = [](char const* name, char const* change, char const* result) {
+        QTest::newRow(name) << change << result;
+    };
+    row("a value", "value", "2 matches");
+    row("a value taken back", "value undo", "1 of 3");
+    row("made again", "value undo redo", "2 matches");
+    row("a key less", "remove", "1 of 2");
+    row("a key less, taken back", "remove undo", "1 of 3");
+    row("a key more", "copy", "2 of 4");
+    row("moved past another", "down", "2 of 3");
+    row("moved past two", "down down", "3 of 3");
+    row("a file that was read again", "reload", "1 of 4");
+    row("only changed values", "only", "1 of 1");
+}
+
+void tst_SettingsFiltered::countFollowsTheFile()
+{
+    QFETCH(QString, change);
+    const ShownFilter shown;
+    SetValue(shown.tree, 2, "Serif 4"); // of the key "tab"
+    QVERIFY(shown.editor->Save());
+    GoTo(shown.tree, ItemCell(shown.tree, 0, 0, 0));
+    shown.filter("r", "");
+    QTest::keyClick(shown.field(), Qt::Key_A, Qt::ControlModifier);
+    QTest::keyClicks(shown.field(), "serif");
+    SetValue(shown.tree, 1, "serif"); // of the key "wrap"
+    GoTo(shown.tree, ItemCell(shown.tree, 0, 0, 0));
+    QTRY_COMPARE_WITH_TIMEOUT(shown.result(), QString("1 of 3"), Patience);
+
+    const QStringList changes = change.split(' ');
+    for (QString const& step : changes) {
+        if (step == "value")
+            SetValue(shown.tree, 0, "Sans");
+        else if (step == "reload")
+            QVERIFY(TestFiles::write(shown.file, QByteArray(Values)
+                                                     .replace("yes", "serif")
+                                                     .replace("4", "serif")
+                                                     .replace("1<", "serif<")));
+        if (step == "reload")
+            shown.editor->Reload();
+        else if (step == "undo")
+            QTest::keyClick(shown.tree, Qt::Key_Z, Qt::ControlModifier);
+        else if (step == "redo")
+            QTest::keyClick(shown.tree, Qt::Key_Z, Qt::ControlModifier | Qt::ShiftModifier);
+        else if (step == "remove")
+            QTest::keyClick(shown.tree, Qt::Key_Delete);
+        else if (step == "copy")
+            QTest::keyClick(shown.tree, Qt::Key_D, Qt::ControlModifier);
+        else if (step == "down")
+            QTest::keyClick(shown.tree, Qt::Key_Down, Qt::AltModifier);
+        else if (step == "only")
+            shown.press('c');
+        QCoreApplication::processEvents(); // or the result could still be the former one
+    }
+    QFETCH(QString, result);
+    QTRY_COMPARE_WITH_TIMEOUT(shown.result(), result, Patience);
+}
+
+// While the bar was closed, the file has changed.
+void tst_SettingsFiltered::countAfterClosing()
+{
+    const ShownFilter shown;
+    shown.filter("tab", "");
+    QTest::keyClick(shown.field(), Qt::Key_Escape);
+    GoTo(shown.tree, ItemCell(shown.tree, 0, 2, 0));
+    QTest::keyClick(shown.tree, Qt::Key_D, Qt::ControlModifier);
+    QTest::keyClick(shown.tree, Qt::Key_F, Qt::ControlModifier);
+    QCOMPARE(shown.result(), QString("2 of 3"));
 }
 
 void tst_SettingsFiltered::tabReachesEverySwitch()

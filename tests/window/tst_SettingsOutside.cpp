@@ -74,6 +74,8 @@ private slots:
     void somethingElseInItsPlace_data();
     void somethingElseInItsPlace();
     void folderIsGone();
+    void largeTextIsSavedElsewhere_data();
+    void largeTextIsSavedElsewhere();
     void readOnlyIsToldAtOnce();
     void ownersAreTold_data();
     void ownersAreTold();
@@ -217,6 +219,47 @@ void tst_SettingsOutside::folderIsGone()
     QCOMPARE(window->findChild<FileTabs*>()->tabToolTip(1), other);
     QCOMPARE(editor->accessibleName(), QString("other.cfg"));
     QVERIFY(Child<QAbstractButton>(window.get(), "Close other.cfg"));
+}
+
+void tst_SettingsOutside::largeTextIsSavedElsewhere_data()
+{
+    QTest::addColumn<bool>("returns");
+    QTest::newRow("the file is gone") << false;
+    QTest::newRow("the file is back") << true;
+}
+
+// Only its start is in the editor; that must not be taken for the file.
+void tst_SettingsOutside::largeTextIsSavedElsewhere()
+{
+    QFETCH(bool, returns);
+    const QByteArray large = "<a>" + QByteArray("<b>\n").repeated(400000);
+    const ShownSettings shown(large);
+    QVERIFY(QFile::remove(shown.file));
+    FileNotice* state = State(shown.editor);
+    QTRY_VERIFY_WITH_TIMEOUT(state->isVisible(), Patience);
+    const QString other = shown.folder() + "other.cfg";
+    QVERIFY(TestFiles::write(other, "other"));
+    QString told;
+    WindowTest::whenShown<QFileDialog>([&](QFileDialog* dialog) {
+        if (returns)
+            TestFiles::write(shown.file, large);
+        WindowTest::whenShown<QMessageBox>([&](QMessageBox* box) { // that other.cfg exists
+            WindowTest::whenShown<QMessageBox>([&](QMessageBox* failure) {
+                told = failure->text();
+                QTest::keyClick(failure, Qt::Key_Escape);
+            });
+            Click(box->button(QMessageBox::Yes));
+        });
+        dialog->findChild<QLineEdit*>("fileNameEdit")->setText(other);
+        QTest::keyClick(dialog->findChild<QLineEdit*>("fileNameEdit"), Qt::Key_Return);
+    });
+    Click(Button(state, "Save As..."));
+    QCOMPARE(TestFiles::read(other), returns ? large : QByteArray("other"));
+    QCOMPARE(TestFiles::read(other + ".bak"), QByteArray("other"));
+    QCOMPARE(shown.editor->path(), returns ? other : shown.file);
+    QCOMPARE(told, returns ? QString()
+                           : "Could not save " + other + ".\n" + shown.file +
+                                 " cannot be read any more.");
 }
 
 // Only to those who may not write it: the administrator may write everything.

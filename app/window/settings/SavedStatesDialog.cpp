@@ -110,12 +110,12 @@ void SavedStatesDialog::fill()
                   .arg(SavedStates::MaximumOfFile)
             : tr("The last %1 states of the file, newest first.").arg(SavedStates::MaximumOfFile));
     SettingsDocument document =
-        states.isEmpty() ? SettingsDocument() : SettingsFileReader::Read(states.first().path);
+        states.isEmpty() ? SettingsDocument() : SettingsFileReader::ReadShown(states.first().path);
     for (int i = 0; i < states.size(); ++i) {
         SavedStates::State const& state = states.at(i);
         const bool isOldest = i + 1 == states.size();
         const SettingsDocument before =
-            isOldest ? SettingsDocument() : SettingsFileReader::Read(states.at(i + 1).path);
+            isOldest ? SettingsDocument() : SettingsFileReader::ReadShown(states.at(i + 1).path);
         auto* item = new QTreeWidgetItem(m_list);
         item->setText(TimeColumn,
                       LeftToRight(state.time.toString(QStringLiteral("yyyy-MM-dd HH:mm:ss"))));

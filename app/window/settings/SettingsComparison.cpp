@@ -26,9 +26,21 @@ QByteArray BytesOf(QString const& path)
 
 } // namespace
 
+void SettingsComparison::tellNotCompared(QString const& path, SettingsDocument const& document)
+{
+    PlainMessageBox(
+        QMessageBox::Critical, m_parent,
+        QObject::tr("Cannot compare with %1.\n%2").arg(LeftToRight(path), document.error))
+        .exec();
+}
+
 void SettingsComparison::ShowSaving(QString const& path)
 {
-    SettingsDocument before = SettingsFileReader::Read(path);
+    SettingsDocument before = SettingsFileReader::ReadShown(path);
+    if (before.isTooLarge) {
+        tellNotCompared(path, before);
+        return;
+    }
     QVector<SettingsDocument::Loss> losses =
         before.losses + SettingsFileWriter::Losses(m_model->document());
     const int unlisted = before.lossCount - before.losses.size();
@@ -47,12 +59,9 @@ void SettingsComparison::ShowSaving(QString const& path)
 
 void SettingsComparison::CompareWith(QString const& path, QString const& title)
 {
-    const SettingsDocument other = SettingsFileReader::Read(path, SettingsFileReader::ShownKeys);
+    const SettingsDocument other = SettingsFileReader::ReadShown(path);
     if (!other.isParsed) {
-        PlainMessageBox(
-            QMessageBox::Critical, m_parent,
-            QObject::tr("Cannot compare with %1.\n%2").arg(LeftToRight(path), other.error))
-            .exec();
+        tellNotCompared(path, other);
         return;
     }
     DifferenceDialog dialog(QObject::tr("Compare With %1").arg(QFileInfo(path).fileName()),

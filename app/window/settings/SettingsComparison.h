@@ -11,6 +11,7 @@ namespace Velocor {
 
 class SettingsCommands;
 class SettingsModel;
+struct SettingsDocument;
 
 /// Compares the settings in an editor with files, in dialogs. GUI thread only.
 class SettingsComparison
@@ -32,6 +33,8 @@ public:
     void CompareWith(QString const& path, QString const& title);
 
 private:
+    void tellNotCompared(QString const& path, SettingsDocument const& document);
+
     SettingsModel* m_model;
     SettingsCommands* m_commands;
     QWidget* m_parent;

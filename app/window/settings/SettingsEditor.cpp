@@ -15,7 +15,6 @@
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
 
-#include <QFile>
 #include <QFileDialog>
 #include <QFileInfo>
 #include <QHBoxLayout>
@@ -27,13 +26,6 @@
 namespace Velocor {
 
 namespace {
-
-QByteArray WholeFile(QString const& path)
-{
-    QFile file(path);
-    const bool isOpen = QFileInfo(path).isFile() && file.open(QIODevice::ReadOnly);
-    return isOpen ? file.readAll() : QByteArray();
-}
 
 // The maximum length of each name in the heading of a dialog, in characters.
 constexpr int MaximumTitlePartLength = 200;
@@ -143,7 +135,7 @@ void SettingsEditor::Open(QString const& path)
     m_path = path;
     m_notice->Dismiss();
     m_fileNotice->SetFile(path); // first, so that it tells of a change while the file is read
-    const SettingsDocument document = SettingsFileReader::Read(path, SettingsFileReader::ShownKeys);
+    const SettingsDocument document = SettingsFileReader::ReadShown(path);
     m_saver.NoteRead(path, document);
     m_model.SetSaved(document);
     m_model.SetDefaults(SettingsDefaults::Of(path));
@@ -163,11 +155,12 @@ void SettingsEditor::Open(QString const& path)
 void SettingsEditor::Reload()
 {
     m_fileNotice->SetFile(m_path);
-    const SettingsDocument document =
-        SettingsFileReader::Read(m_path, SettingsFileReader::ShownKeys);
-    if (!ShowsTree() && m_text->isModified() && document.isReadable) {
-        m_text->Replace(WholeFile(m_path));
-        m_text->SetModified(false);
+    const SettingsDocument document = SettingsFileReader::ReadShown(m_path);
+    const QByteArray bytes = ShowsTree() ? QByteArray() : SettingsTextPage::BytesOf(m_path);
+    const bool fits = document.isReadable && bytes.size() <= SettingsTextPage::EditLimit;
+    if (!ShowsTree() && m_text->isModified() && fits) {
+        m_text->Replace(bytes);
+        m_text->SetModified(m_text->bytes() != bytes); // such as other line breaks than before
         m_saver.NoteRead(m_path, document);
         m_hasTree = false;
         return;
@@ -217,7 +210,7 @@ void SettingsEditor::CompareWithOther()
 void SettingsEditor::keepMine()
 {
     m_saver.AcceptFile();
-    m_model.SetSaved(SettingsFileReader::Read(m_path));
+    m_model.SetSaved(SettingsFileReader::ReadShown(m_path));
     m_fileNotice->SetFile(m_path);
     if (ShowsTree())
         m_commands.undoStack()->resetClean();
@@ -235,7 +228,9 @@ void SettingsEditor::saveAs()
     if (path.isEmpty())
         return;
     const bool isSaved = ShowsTree() ? m_saver.SaveAs(path, document())
-                                     : m_saver.SaveTextAs(path, m_text->bytes(), m_text->parsed());
+                         : m_text->isOnlyStart()
+                             ? m_saver.SaveCopyAs(path)
+                             : m_saver.SaveTextAs(path, m_text->bytes(), m_text->parsed());
     if (!isSaved)
         return;
     m_path = path;
@@ -276,10 +271,10 @@ void SettingsEditor::showTree(SettingsDocument const& document)
 void SettingsEditor::showMalformed(SettingsDocument const& document)
 {
     QString message = tr("Cannot show %1 as a tree: %2").arg(LeftToRight(m_path), document.error);
-    if (document.line > 0 && !document.hasTooManyKeys)
+    if (document.line > 0 && !document.isTooLarge)
         message += tr(" (line %1, column %2)").arg(document.line).arg(document.column);
     m_notice->ShowMessage(message);
-    m_text->Show(WholeFile(m_path), document);
+    m_text->Show(SettingsTextPage::BytesOf(m_path), document);
     m_shownText = m_text->bytes();
     showPage(TextPage);
 }
@@ -304,7 +299,7 @@ void SettingsEditor::ShowAsText()
     const bool isChanged = m_hasText ? m_treeChanged : isModified();
     const QByteArray content = SettingsFileWriter::ToBytes(document());
     if (!m_hasText)
-        m_text->Show(WholeFile(m_path), SettingsFileReader::Read(m_path));
+        m_text->Show(SettingsTextPage::BytesOf(m_path), SettingsFileReader::ReadShown(m_path));
     const bool isTooLarge = content.size() > SettingsTextPage::EditLimit;
     if (isChanged && (m_text->isReadOnly() || isTooLarge)) {
         Q_EMIT messageReported(tr("This file cannot be edited as text: save the changes first"));
@@ -326,10 +321,9 @@ void SettingsEditor::ShowAsTree()
     if (ShowsTree())
         return;
     const SettingsDocument parsed =
-        m_text->isReadOnly() ? SettingsFileReader::Read(m_path, SettingsFileReader::ShownKeys)
-                             : m_text->parsed();
-    if (parsed.hasTooManyKeys) {
-        Q_EMIT messageReported(tr("This file has too many keys to be shown as settings"));
+        m_text->isReadOnly() ? SettingsFileReader::ReadShown(m_path) : m_text->parsed();
+    if (parsed.isTooLarge) {
+        Q_EMIT messageReported(tr("This file is too large to be shown as settings"));
         return;
     }
     const SettingsDocument settings = parsed.WithErrorAsLoss();
@@ -406,7 +400,7 @@ void SettingsEditor::ShowStates()
 // As a tree if it is one; else as text, which every state is.
 void SettingsEditor::bringBack(QString const& statePath, QString const& title)
 {
-    const SettingsDocument state = SettingsFileReader::Read(statePath);
+    const SettingsDocument state = SettingsFileReader::ReadShown(statePath);
     if (!state.isReadable) {
         Q_EMIT messageReported(tr("The state of %1 is gone").arg(title));
         return;
@@ -418,7 +412,7 @@ void SettingsEditor::bringBack(QString const& statePath, QString const& title)
     } else {
         ShowAsText();
         if (!ShowsTree() && !m_text->isReadOnly())
-            m_text->Replace(WholeFile(statePath));
+            m_text->Replace(SettingsTextPage::BytesOf(statePath));
     }
     Q_EMIT messageReported(tr("Brought back the state of %1; save to keep it").arg(title));
 }

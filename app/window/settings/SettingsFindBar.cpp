@@ -14,7 +14,26 @@
 #include <QLineEdit>
 #include <QToolButton>
 
+#include <algorithm>
+#include <iterator>
+
 namespace Velocor {
+
+namespace {
+
+// A section comes before its items.
+bool IsBefore(SettingsModel::Match const& match, SettingsModel::Place place)
+{
+    return match.place.section != place.section ? match.place.section < place.section
+                                                : match.place.item < place.item;
+}
+
+bool IsAt(SettingsModel::Match const& match, SettingsModel::Place place)
+{
+    return match.place.section == place.section && match.place.item == place.item;
+}
+
+} // namespace
 
 SettingsFindBar::SettingsFindBar(SettingsTree* tree, SettingsModel const* model, QWidget* parent)
     : QWidget(parent), m_tree(tree), m_model(model), m_text(new QLineEdit),
@@ -41,6 +60,13 @@ SettingsFindBar::SettingsFindBar(SettingsTree* tree, SettingsModel const* model,
     connect(next, &QToolButton::clicked, this, [this] { FindNext(1); });
     connect(close, &QToolButton::clicked, this, &SettingsFindBar::Close);
     connect(m_text, &QLineEdit::textChanged, this, &SettingsFindBar::search);
+    m_soon.setSingleShot(true);
+    m_soon.setInterval(0); // one command may change many values
+    connect(&m_soon, &QTimer::timeout, this, &SettingsFindBar::showResult);
+    connect(m_model, &SettingsModel::applied, this, &SettingsFindBar::noteChange);
+    connect(m_model, &SettingsModel::modelReset, this, &SettingsFindBar::noteChange);
+    connect(m_tree->selectionModel(), &QItemSelectionModel::currentChanged, &m_soon,
+            QOverload<>::of(&QTimer::start));
 
     auto* layout = new FlowLayout(6, this);
     layout->addWidget(m_text);
@@ -79,6 +105,7 @@ void SettingsFindBar::Open()
     show();
     if (wasHidden)
         Refresh();
+    showResult();
     m_text->setFocus();
     m_text->selectAll();
 }
@@ -112,6 +139,7 @@ void SettingsFindBar::Refresh()
 // Without a filter, only the current row changes.
 void SettingsFindBar::search()
 {
+    m_isStale = true;
     const SettingsFilter wanted = filter();
     if (wanted.isEmpty() && m_model->filter().isEmpty()) {
         find(1, true);
@@ -129,17 +157,66 @@ void SettingsFindBar::FindNext(int step)
         find(step, false);
 }
 
+// Around the end, so the only match is found even if it is where one is.
 void SettingsFindBar::find(int step, bool fromCurrent)
 {
-    const QString text = m_text->text();
-    const bool isFound = text.isEmpty() || m_tree->Find(text, step, fromCurrent);
-    const int shown = m_model->shownCount();
-    if (!isFound || m_model->rowCount() == 0)
-        m_result->setText(tr("No match"));
-    else if (m_model->filter().isEmpty())
-        m_result->clear();
-    else
-        m_result->setText(shown == 1 ? tr("1 key") : tr("%L1 keys").arg(shown));
+    std::vector<SettingsModel::Match> const& all = matches();
+    if (!all.empty()) {
+        const SettingsModel::Place place = SettingsModel::PlaceOf(m_tree->currentIndex());
+        auto match = std::lower_bound(all.begin(), all.end(), place, IsBefore);
+        const bool isCurrent = match != all.end() && IsAt(*match, place);
+        if (step < 0 && !(isCurrent && fromCurrent))
+            match = std::prev(match == all.begin() ? all.end() : match);
+        else if (step > 0 && isCurrent && !fromCurrent)
+            ++match;
+        if (match == all.end())
+            match = all.begin();
+        m_tree->GoTo(m_model->IndexOf(match->place, match->column));
+    }
+    showResult();
+}
+
+// None without a text.
+std::vector<SettingsModel::Match> const& SettingsFindBar::matches()
+{
+    if (m_isStale) {
+        const QString text = m_text->text();
+        m_matches = text.isEmpty() ? std::vector<SettingsModel::Match>() : m_model->FindAll(text);
+        m_isStale = false;
+    }
+    return m_matches;
+}
+
+void SettingsFindBar::noteChange()
+{
+    m_isStale = true;
+    m_soon.start();
+}
+
+void SettingsFindBar::showResult()
+{
+    if (!isHidden())
+        m_result->setText(resultText());
+}
+
+// Of a text, its matches; otherwise what the switches show.
+QString SettingsFindBar::resultText()
+{
+    if (m_text->text().isEmpty()) {
+        if (m_model->filter().isEmpty())
+            return QString();
+        return m_model->rowCount() == 0 ? tr("No match")
+                                        : tr("%Ln key(s)", nullptr, m_model->shownCount());
+    }
+    std::vector<SettingsModel::Match> const& all = matches();
+    if (all.empty())
+        return tr("No match");
+    const SettingsModel::Place place = SettingsModel::PlaceOf(m_tree->currentIndex());
+    const auto match = std::lower_bound(all.begin(), all.end(), place, IsBefore);
+    const auto count = static_cast<int>(all.size());
+    if (match == all.end() || !IsAt(*match, place))
+        return tr("%Ln match(es)", nullptr, count);
+    return tr("%L1 of %L2").arg(match - all.begin() + 1).arg(count);
 }
 
 void SettingsFindBar::keyPressEvent(QKeyEvent* event)

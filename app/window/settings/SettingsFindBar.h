@@ -3,7 +3,12 @@
 
 #pragma once
 
+#include "app/window/settings/SettingsModel.h"
+
+#include <QTimer>
 #include <QWidget>
+
+#include <vector>
 
 class QLabel;
 class QLineEdit;
@@ -11,13 +16,12 @@ class QToolButton;
 
 namespace Velocor {
 
-class SettingsModel;
 class SettingsTree;
-struct SettingsFilter;
 
 /// Finds names and values that contain a text, in any letter case, and goes to them in the tree, or
 /// makes it show only them, only what was changed, or only what differs from defaults. Hidden until
-/// it is opened. GUI thread only.
+/// it is opened; then it tells which match of how many is current, whatever is changed. GUI thread
+/// only.
 class SettingsFindBar : public QWidget
 {
     Q_OBJECT
@@ -48,6 +52,10 @@ private:
     SettingsFilter filter() const;
     void search();
     void find(int step, bool fromCurrent);
+    std::vector<SettingsModel::Match> const& matches();
+    void noteChange();
+    void showResult();
+    QString resultText();
     QToolButton* makeButton(QString const& text, QString const& name, QString const& toolTip);
     QToolButton* makeSwitch(QString const& text, QString const& toolTip);
 
@@ -58,6 +66,9 @@ private:
     QToolButton* m_onlyChanged;
     QToolButton* m_onlyDiffering;
     QLabel* m_result;
+    std::vector<SettingsModel::Match> m_matches; ///< of the text, in the order of the tree
+    bool m_isStale = true;                       ///< m_matches are those of a former text or file
+    QTimer m_soon;                               ///< runs from a change until the result is shown
 };
 
 } // namespace Velocor

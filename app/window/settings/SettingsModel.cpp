@@ -263,51 +263,24 @@ QModelIndex SettingsModel::ItemBeside(QModelIndex const& index, int step) const
     return QModelIndex();
 }
 
-// In the order of the tree, around its end.
-SettingsModel::Row SettingsModel::rowBeside(Row row, int step) const
+std::vector<SettingsModel::Match> SettingsModel::FindAll(QString const& text) const
 {
-    const int count = m_shownSections.count();
-    if (step > 0) {
-        if (row.item + 1 < itemCount(row.section))
-            return Row{row.section, row.item + 1};
-        return Row{(row.section + 1) % count, -1};
-    }
-    if (row.item >= 0)
-        return Row{row.section, row.item - 1};
-    const int section = (row.section + count - 1) % count;
-    return Row{section, itemCount(section) - 1};
-}
-
-QModelIndex SettingsModel::matchIn(Row row, CaselessText const& text) const
-{
-    const int number = m_shownSections.at(row.section);
-    SettingsDocument::Section const& section = m_document.sections.at(number);
-    if (row.item < 0)
-        return text.IsIn(section.name) ? index(row.section, NameColumn) : QModelIndex();
-    SettingsDocument::Item const& item =
-        section.items.at(m_rows[static_cast<std::size_t>(number)]->items.at(row.item));
-    const bool isName = text.IsIn(item.key);
-    if (!isName && !text.IsIn(item.value))
-        return QModelIndex();
-    return index(row.item, isName ? NameColumn : ValueColumn, index(row.section, NameColumn));
-}
-
-QModelIndex SettingsModel::Find(QString const& text, QModelIndex const& from, int step,
-                                bool withFrom) const
-{
-    if (m_shownSections.count() == 0)
-        return QModelIndex();
     const CaselessText wanted(text);
-    Row start;
-    if (from.isValid())
-        start = IsSection(from) ? Row{from.row(), -1} : Row{parent(from).row(), from.row()};
-    Row row = withFrom ? start : rowBeside(start, step);
-    const Row last = withFrom ? rowBeside(start, -step) : start;
-    for (;; row = rowBeside(row, step)) {
-        const QModelIndex match = matchIn(row, wanted);
-        if (match.isValid() || (row.section == last.section && row.item == last.item))
-            return match;
+    std::vector<Match> matches;
+    for (int row = 0; row < m_shownSections.count(); ++row) {
+        const int number = m_shownSections.at(row);
+        SettingsDocument::Section const& section = m_document.sections.at(number);
+        if (wanted.IsIn(section.name))
+            matches.push_back({{number, -1}, NameColumn});
+        SettingsRows const& items = m_rows[static_cast<std::size_t>(number)]->items;
+        for (int i = 0; i < items.count(); ++i) {
+            SettingsDocument::Item const& item = section.items.at(items.at(i));
+            const bool isName = wanted.IsIn(item.key);
+            if (isName || wanted.IsIn(item.value))
+                matches.push_back({{number, items.at(i)}, isName ? NameColumn : ValueColumn});
+        }
     }
+    return matches;
 }
 
 SettingsModel::Place SettingsModel::PlaceOf(QModelIndex const& index)

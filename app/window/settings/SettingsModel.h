@@ -17,8 +17,6 @@
 
 namespace Velocor {
 
-class CaselessText;
-
 /// A settings document as a tree: sections at the top, their keys and values below, those that a
 /// filter shows. What an edit changes stays shown until the filter is set again. GUI thread.
 ///
@@ -41,6 +39,13 @@ public:
     {
         int section = -1;
         int item = -1; ///< -1 for the section itself
+    };
+
+    /// A cell whose text contains another.
+    struct Match
+    {
+        Place place;
+        Column column = NameColumn;
     };
 
     explicit SettingsModel(QObject* parent = nullptr) : QAbstractItemModel(parent) {}
@@ -88,13 +93,9 @@ public:
     /// @param step  1, or -1 for the previous one
     QModelIndex ItemBeside(QModelIndex const& index, int step) const;
 
-    /// The next cell that is shown and whose text contains another in any letter case, around the
-    /// end; of a row, the first. Invalid if there is none.
-    ///
-    /// @param from  a row, or the first one if it is invalid
-    /// @param step  1, or -1 for the previous one
-    /// @param withFrom  whether to look at that row first instead of last
-    QModelIndex Find(QString const& text, QModelIndex const& from, int step, bool withFrom) const;
+    /// The cells that are shown and whose text contains another in any letter case, in the order of
+    /// the tree; of a row, only the first.
+    std::vector<Match> FindAll(QString const& text) const;
 
     /// Makes the value of a row count as one of a kind, until another document is shown. The
     /// choice is that of its section and key, whatever the value becomes.
@@ -145,13 +146,6 @@ private:
         SettingsRows items;
     };
 
-    /// A row, by its position in the tree.
-    struct Row
-    {
-        int section = 0;
-        int item = -1; ///< -1 for the section itself
-    };
-
     SettingsEdit applyInsertion(SettingsEdit const& edit);
     SettingsEdit applyRemoval(SettingsEdit const& edit);
     SettingsEdit applyMove(SettingsEdit const& edit);
@@ -166,8 +160,6 @@ private:
     QVariant valueData(Place place, int role) const;
     QPair<QString, QString> namesOf(QModelIndex const& index) const;
     QVariant lookOf(QModelIndex const& index, int role) const;
-    Row rowBeside(Row row, int step) const;
-    QModelIndex matchIn(Row row, CaselessText const& text) const;
 
     SettingsDocument m_document;
     QHash<QPair<QString, QString>, ValueKind> m_chosenKinds; ///< by section and key

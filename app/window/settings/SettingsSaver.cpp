@@ -160,6 +160,19 @@ bool SettingsSaver::SaveTextAs(QString const& path, QByteArray const& text,
     return true;
 }
 
+bool SettingsSaver::SaveCopyAs(QString const& path)
+{
+    SettingsSaver other = saverOf(path);
+    if (!other.makeBackup())
+        return false;
+    QString error;
+    const bool isSaved = SettingsFileWriter::SaveCopy(path, m_path, &error);
+    if (!other.noteOutcome(isSaved, error))
+        return false;
+    *this = other;
+    return true;
+}
+
 // Tells the user of a failure.
 bool SettingsSaver::noteOutcome(bool isSaved, QString const& error)
 {

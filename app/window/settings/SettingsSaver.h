@@ -53,6 +53,9 @@ public:
     /// As SaveAs(), with a text.
     bool SaveTextAs(QString const& path, QByteArray const& text, SettingsDocument const& parsed);
 
+    /// As SaveAs(), with a copy of the file, however large.
+    bool SaveCopyAs(QString const& path);
+
     /// What saving a document of this file would lose, as for NoteRead().
     void NoteLosses(SettingsDocument const& document);
 

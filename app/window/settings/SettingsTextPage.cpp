@@ -10,6 +10,8 @@
 #include "app/window/widgets/PlainText.h"
 
 #include <QAction>
+#include <QFile>
+#include <QFileInfo>
 #include <QHBoxLayout>
 #include <QKeyEvent>
 #include <QLabel>
@@ -126,6 +128,13 @@ QPushButton* SettingsTextPage::makeCommandButton(int command)
     return button;
 }
 
+QByteArray SettingsTextPage::BytesOf(QString const& path)
+{
+    QFile file(path);
+    const bool isOpen = QFileInfo(path).isFile() && file.open(QIODevice::ReadOnly);
+    return isOpen ? file.read(EditLimit + 1) : QByteArray();
+}
+
 void SettingsTextPage::Show(QByteArray const& bytes, SettingsDocument const& parsed)
 {
     m_original = bytes;
@@ -224,11 +233,11 @@ void SettingsTextPage::showState()
 {
     const QString found = Contents(m_parsed);
     QString state;
-    const bool isMalformed = !m_parsed.isParsed && !m_parsed.hasTooManyKeys;
+    const bool isMalformed = !m_parsed.isParsed && !m_parsed.isTooLarge;
     if (m_parsed.isParsed)
         state = tr("This text can be read: %1.").arg(found);
-    else if (m_parsed.hasTooManyKeys)
-        state = tr("This file has more keys than can be shown as settings.");
+    else if (m_parsed.isTooLarge)
+        state = tr("This file is too large to be shown as settings.");
     else if (m_parsed.line > 0)
         state = tr("Line %1, column %2: %3. Programs get what is before it: %4.")
                     .arg(m_parsed.line)
@@ -236,14 +245,14 @@ void SettingsTextPage::showState()
                     .arg(m_parsed.error, found);
     else
         state = m_parsed.error;
-    if (isReadOnly() && m_original.size() > EditLimit)
+    if (isReadOnly() && isOnlyStart())
         state += tr(" Only the start of the file is shown, and it cannot be edited as text.");
     else if (isReadOnly())
         state += tr(" This file cannot be edited as text.");
     m_state->setText(state);
     m_text->SetError(isMalformed ? m_parsed.line : 0, m_parsed.column);
     m_actions.at(GoToErrorCommand)->setEnabled(isMalformed && m_parsed.line > 0);
-    m_actions.at(ShowSettingsCommand)->setEnabled(!m_parsed.hasTooManyKeys);
+    m_actions.at(ShowSettingsCommand)->setEnabled(!m_parsed.isTooLarge);
     m_save->setEnabled(isModified());
     Q_EMIT stateChanged();
 }

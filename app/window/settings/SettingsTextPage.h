@@ -49,10 +49,15 @@ public:
     /// Their actions, owned by the page, in the same order.
     QList<QAction*> const& commands() const { return m_actions; }
 
+    /// What Show() needs of a file: all of it, or a little more than is shown. Empty if it cannot
+    /// be read.
+    static QByteArray BytesOf(QString const& path);
+
     /// Shows the content of a file. It is read-only if it is too large, could not be read, or
     /// contains characters that a text field changes.
     ///
-    /// @param parsed  what reading the bytes resulted in
+    /// @param bytes  of BytesOf()
+    /// @param parsed  what reading the file resulted in
     void Show(QByteArray const& bytes, SettingsDocument const& parsed);
 
     /// Replaces the text in one step, which can be undone. The encoding stays that of the file.
@@ -65,6 +70,9 @@ public:
     SettingsDocument const& parsed();
 
     bool isReadOnly() const;
+
+    /// Whether bytes() are only the start of the file.
+    bool isOnlyStart() const { return m_original.size() > EditLimit; }
 
     /// Whether bytes() differ from what is in the file.
     bool isModified() const;

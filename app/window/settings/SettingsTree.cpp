@@ -199,7 +199,7 @@ void SettingsTree::SetFilter(SettingsFilter const& filter)
             collapse(section);
     }
     const QModelIndex same = m_model->IndexOf(place);
-    GoTo(same.isValid() ? same : m_model->Find(filter.text, QModelIndex(), 1, true));
+    GoTo(same.isValid() ? same : m_model->index(0, SettingsModel::NameColumn));
     updateActions();
 }
 
@@ -217,13 +217,6 @@ void SettingsTree::GoTo(QModelIndex const& index)
 void SettingsTree::GoToChanged()
 {
     GoTo(m_changed);
-}
-
-bool SettingsTree::Find(QString const& text, int step, bool fromCurrent)
-{
-    const QModelIndex match = m_model->Find(text, currentIndex(), step, fromCurrent);
-    GoTo(match);
-    return match.isValid();
 }
 
 void SettingsTree::OpenFind()

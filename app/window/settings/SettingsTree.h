@@ -63,11 +63,6 @@ public:
     /// Goes to what was changed last.
     void GoToChanged();
 
-    /// Goes to the next cell that contains a text; as SettingsModel::Find().
-    ///
-    /// @return whether there is one
-    bool Find(QString const& text, int step, bool fromCurrent);
-
     bool isEditing() const;
 
     /// Ends the editing of a cell, and takes what was typed.

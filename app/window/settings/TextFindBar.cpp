@@ -10,7 +10,10 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QPlainTextEdit>
+#include <QTextBlock>
 #include <QToolButton>
+
+#include <algorithm>
 
 namespace Velocor {
 
@@ -31,7 +34,17 @@ TextFindBar::TextFindBar(QPlainTextEdit* text, QWidget* parent)
     connect(previous, &QToolButton::clicked, this, [this] { FindNext(-1); });
     connect(next, &QToolButton::clicked, this, [this] { FindNext(1); });
     connect(close, &QToolButton::clicked, this, &TextFindBar::Close);
-    connect(m_wanted, &QLineEdit::textChanged, this, [this] { find(1, true); });
+    connect(m_wanted, &QLineEdit::textChanged, this, [this] {
+        m_isStale = true;
+        find(1, true);
+    });
+    m_soon.setSingleShot(true);
+    m_soon.setInterval(0);
+    connect(&m_soon, &QTimer::timeout, this, &TextFindBar::showResult);
+    connect(m_text, &QPlainTextEdit::textChanged, this, &TextFindBar::noteChange);
+    connect(m_text, &QPlainTextEdit::selectionChanged, &m_soon, QOverload<>::of(&QTimer::start));
+    connect(m_text, &QPlainTextEdit::cursorPositionChanged, &m_soon,
+            QOverload<>::of(&QTimer::start));
 
     auto* layout = new QHBoxLayout(this);
     layout->setContentsMargins(0, 0, 0, 0);
@@ -56,6 +69,7 @@ QToolButton* TextFindBar::makeButton(QChar sign, QString const& name, QString co
 void TextFindBar::Open()
 {
     show();
+    showResult();
     m_wanted->setFocus();
     m_wanted->selectAll();
 }
@@ -77,25 +91,79 @@ void TextFindBar::FindNext(int step)
 // While one types, the match may grow where it is.
 void TextFindBar::find(int step, bool fromSelection)
 {
-    m_result->clear();
-    const QString wanted = m_wanted->text();
-    if (wanted.isEmpty())
-        return;
-    QTextCursor from = m_text->textCursor();
-    if (fromSelection)
-        from.setPosition(from.selectionStart());
-    const QTextDocument::FindFlags flags =
-        step < 0 ? QTextDocument::FindBackward : QTextDocument::FindFlags();
-    QTextCursor match = m_text->document()->find(wanted, from, flags);
-    if (match.isNull()) {
-        from.movePosition(step < 0 ? QTextCursor::End : QTextCursor::Start);
-        match = m_text->document()->find(wanted, from, flags);
-        m_result->setText(match.isNull() ? tr("No match")
-                          : step < 0     ? tr("Continued from the bottom")
-                                         : tr("Continued from the top"));
+    QVector<int> const& all = matches();
+    m_wrap = 0;
+    if (!all.isEmpty()) {
+        const QTextCursor selected = m_text->textCursor();
+        const int length = m_wanted->text().size();
+        const int start = fromSelection ? selected.selectionStart() : selected.selectionEnd();
+        auto match = std::lower_bound(all.begin(), all.end(), start);
+        if (step < 0)
+            match = std::upper_bound(all.begin(), all.end(), selected.selectionStart() - length);
+        if (match == (step < 0 ? all.begin() : all.end())) {
+            m_wrap = step;
+            match = step < 0 ? all.end() : all.begin();
+        }
+        QTextCursor found(m_text->document());
+        found.setPosition(step < 0 ? *(match - 1) : *match);
+        m_wrappedTo = found.position();
+        found.setPosition(m_wrappedTo + length, QTextCursor::KeepAnchor);
+        m_text->setTextCursor(found);
     }
-    if (!match.isNull())
-        m_text->setTextCursor(match);
+    showResult();
+}
+
+// None without a text to find. A non-breaking space looks like a space, so it is one here.
+QVector<int> const& TextFindBar::matches()
+{
+    if (!m_isStale)
+        return m_matches;
+    m_isStale = false;
+    m_matches.clear();
+    const QString wanted = m_wanted->text().replace(QChar::Nbsp, QLatin1Char(' '));
+    QTextBlock block = m_text->document()->begin();
+    for (; block.isValid() && !wanted.isEmpty(); block = block.next()) {
+        const QString line = block.text().replace(QChar::Nbsp, QLatin1Char(' '));
+        int at = line.indexOf(wanted, 0, Qt::CaseInsensitive);
+        for (; at >= 0; at = line.indexOf(wanted, at + wanted.size(), Qt::CaseInsensitive))
+            m_matches.append(block.position() + at);
+    }
+    return m_matches;
+}
+
+void TextFindBar::noteChange()
+{
+    m_isStale = true;
+    m_soon.start();
+}
+
+void TextFindBar::showResult()
+{
+    if (isHidden())
+        return;
+    const QString wanted = m_wanted->text();
+    QVector<int> const& all = matches();
+    const QTextCursor selected = m_text->textCursor();
+    const int start = selected.selectionStart();
+    const auto match = std::lower_bound(all.begin(), all.end(), start);
+    const bool isSelected =
+        match != all.end() && *match == start && selected.selectionEnd() == start + wanted.size();
+    const int number = isSelected ? static_cast<int>(match - all.begin()) + 1 : 0;
+    const int wrap = start == m_wrappedTo ? m_wrap : 0;
+    m_result->setText(wanted.isEmpty() ? QString() : resultText(number, all.size(), wrap));
+}
+
+// The number of the match that is selected is 0 if none is.
+QString TextFindBar::resultText(int number, int count, int wrap)
+{
+    if (count == 0)
+        return tr("No match");
+    if (number == 0)
+        return tr("%Ln match(es)", nullptr, count);
+    const QString place = wrap == 0  ? tr("%L1 of %L2")
+                          : wrap < 0 ? tr("%L1 of %L2, continued from the bottom")
+                                     : tr("%L1 of %L2, continued from the top");
+    return place.arg(number).arg(count);
 }
 
 void TextFindBar::keyPressEvent(QKeyEvent* event)

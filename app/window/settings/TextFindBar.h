@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include <QTimer>
+#include <QVector>
 #include <QWidget>
 
 class QLabel;
@@ -12,8 +14,9 @@ class QToolButton;
 
 namespace Velocor {
 
-/// Finds a text, in any letter case, in a text editor and selects it there. Hidden until it is
-/// opened. GUI thread only.
+/// Finds a text, in any letter case, in a text editor and selects it there, and tells which match
+/// of how many that is. Matches do not overlap, and are within a line. Hidden until it is opened.
+/// GUI thread only.
 class TextFindBar : public QWidget
 {
     Q_OBJECT
@@ -39,11 +42,20 @@ protected:
 
 private:
     void find(int step, bool fromSelection);
+    QVector<int> const& matches();
+    void noteChange();
+    void showResult();
+    static QString resultText(int number, int count, int wrap);
     QToolButton* makeButton(QChar sign, QString const& name, QString const& toolTip);
 
     QPlainTextEdit* m_text;
     QLineEdit* m_wanted;
     QLabel* m_result;
+    QVector<int> m_matches; ///< positions in the text, ascending
+    bool m_isStale = true;  ///< m_matches are those of a former text
+    int m_wrap = 0;         ///< the step that went around the end; 0 if the last one did not
+    int m_wrappedTo = -1;   ///< the position of the match to which it went
+    QTimer m_soon;          ///< runs from a change until the result is shown
 };
 
 } // namespace Velocor
