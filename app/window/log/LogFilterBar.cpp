@@ -139,6 +139,8 @@ void LogFilterBar::SetSpan(LogSpan const& span)
     };
     m_since->setText(textOf(span.since));
     m_until->setText(textOf(span.until));
+    m_since->setCursorPosition(0); // the date matters more than the milliseconds
+    m_until->setCursorPosition(0);
     apply();
 }
 
