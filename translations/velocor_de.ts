@@ -944,6 +944,10 @@ Erstellt %1
         <source>%1: %L2 entries, %L3 problems</source>
         <translation>%1: %L2 Einträge, %L3 Probleme</translation>
     </message>
+    <message>
+        <source>%1 to %2</source>
+        <translation>%1 bis %2</translation>
+    </message>
 </context>
 <context>
     <name>Velocor::CurrentLine</name>
@@ -1626,10 +1630,6 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <translation>Weitere Filter</translation>
     </message>
     <message>
-        <source>More terms, terms to hide, least severity, context</source>
-        <translation>Weitere Begriffe, auszublendende Begriffe, geringster Schweregrad, Umgebung</translation>
-    </message>
-    <message>
         <source>Terms</source>
         <translation>Begriffe</translation>
     </message>
@@ -1708,6 +1708,54 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
     <message>
         <source>The regular expression takes too long at line %L1, nothing is filtered.</source>
         <translation>Der reguläre Ausdruck dauert in Zeile %L1 zu lange, nichts wird gefiltert.</translation>
+    </message>
+    <message>
+        <source>More terms, terms to hide, times, least severity, context</source>
+        <translation>Weitere Begriffe, auszublendende Begriffe, Zeiten, geringster Schweregrad, Kontext</translation>
+    </message>
+    <message>
+        <source>A date, a time or both (2026-11-20, 14:03, 2026-11-20 14:03), or an interval until now such as -2h, -30m or -1d.</source>
+        <translation>Ein Datum, eine Uhrzeit oder beides (2026-11-20, 14:03, 2026-11-20 14:03) oder eine Spanne bis jetzt wie -2h, -30m oder -1d.</translation>
+    </message>
+    <message>
+        <source>Times shown</source>
+        <translation>Gezeigte Zeiten</translation>
+    </message>
+    <message>
+        <source>Show all times</source>
+        <translation>Alle Zeiten zeigen</translation>
+    </message>
+    <message>
+        <source>Only from %1 to %2</source>
+        <translation>Nur von %1 bis %2</translation>
+    </message>
+    <message>
+        <source>Only from %1 on</source>
+        <translation>Nur ab %1</translation>
+    </message>
+    <message>
+        <source>Only until %1</source>
+        <translation>Nur bis %1</translation>
+    </message>
+    <message>
+        <source>From</source>
+        <translation>Von</translation>
+    </message>
+    <message>
+        <source>Show only entries from this time on.</source>
+        <translation>Nur Einträge ab dieser Zeit zeigen.</translation>
+    </message>
+    <message>
+        <source>Until</source>
+        <translation>Bis</translation>
+    </message>
+    <message>
+        <source>Show only entries up to this time.</source>
+        <translation>Nur Einträge bis zu dieser Zeit zeigen.</translation>
+    </message>
+    <message>
+        <source>Not a time, which is not filtered: %1</source>
+        <translation>Keine Zeit, daher nicht gefiltert: %1</translation>
     </message>
 </context>
 <context>

@@ -944,6 +944,10 @@ Créé le %1
         <source>%1: %L2 entries, %L3 problems</source>
         <translation>%1&#xa0;: %L2 entrées, %L3 problèmes</translation>
     </message>
+    <message>
+        <source>%1 to %2</source>
+        <translation>%1 à %2</translation>
+    </message>
 </context>
 <context>
     <name>Velocor::CurrentLine</name>
@@ -1626,10 +1630,6 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <translation>Autres filtres</translation>
     </message>
     <message>
-        <source>More terms, terms to hide, least severity, context</source>
-        <translation>Autres termes, termes à masquer, gravité minimale, contexte</translation>
-    </message>
-    <message>
         <source>Terms</source>
         <translation>Termes</translation>
     </message>
@@ -1708,6 +1708,54 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
     <message>
         <source>The regular expression takes too long at line %L1, nothing is filtered.</source>
         <translation>L’expression régulière prend trop de temps à la ligne %L1, rien n’est filtré.</translation>
+    </message>
+    <message>
+        <source>More terms, terms to hide, times, least severity, context</source>
+        <translation>Autres termes, termes à masquer, heures, gravité minimale, contexte</translation>
+    </message>
+    <message>
+        <source>A date, a time or both (2026-11-20, 14:03, 2026-11-20 14:03), or an interval until now such as -2h, -30m or -1d.</source>
+        <translation>Une date, une heure ou les deux (2026-11-20, 14:03, 2026-11-20 14:03), ou une durée jusqu’à maintenant, comme -2h, -30m ou -1d.</translation>
+    </message>
+    <message>
+        <source>Times shown</source>
+        <translation>Heures affichées</translation>
+    </message>
+    <message>
+        <source>Show all times</source>
+        <translation>Afficher toutes les heures</translation>
+    </message>
+    <message>
+        <source>Only from %1 to %2</source>
+        <translation>Seulement de %1 à %2</translation>
+    </message>
+    <message>
+        <source>Only from %1 on</source>
+        <translation>Seulement à partir de %1</translation>
+    </message>
+    <message>
+        <source>Only until %1</source>
+        <translation>Seulement jusqu’à %1</translation>
+    </message>
+    <message>
+        <source>From</source>
+        <translation>De</translation>
+    </message>
+    <message>
+        <source>Show only entries from this time on.</source>
+        <translation>Afficher seulement les entrées à partir de cette heure.</translation>
+    </message>
+    <message>
+        <source>Until</source>
+        <translation>Jusqu’à</translation>
+    </message>
+    <message>
+        <source>Show only entries up to this time.</source>
+        <translation>Afficher seulement les entrées jusqu’à cette heure.</translation>
+    </message>
+    <message>
+        <source>Not a time, which is not filtered: %1</source>
+        <translation>Ce n’est pas une heure, rien n’est filtré : %1</translation>
     </message>
 </context>
 <context>

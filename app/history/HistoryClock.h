@@ -3,7 +3,11 @@
 
 #pragma once
 
+#include "app/logfile/LogLineParser.h"
+
 #include <QtGlobal>
+
+#include <functional>
 
 namespace Velocor {
 
@@ -30,6 +34,16 @@ public:
     /// @param end  the time of a stamp of this run for a first day of 0
     /// @param latest  the time that it must not be after
     static qint64 FirstDay(qint64 end, qint64 latest);
+
+    /// Gives the next stamp of a run, in the order of the file; returns false if there is none.
+    using NextStamp = std::function<bool(LogLineParser::Parts& parts)>;
+
+    /// The midnight before the first stamp of a run, if that has no date. Only then does it ask for
+    /// more than the first stamp.
+    ///
+    /// @param latest  the time that the run must not end after; is set to that of its first stamp,
+    ///                if there is one
+    static qint64 FindFirstDay(NextStamp const& next, qint64& latest);
 
 private:
     qint64 m_firstDay;

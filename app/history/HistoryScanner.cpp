@@ -3,7 +3,12 @@
 
 #include "app/history/HistoryScanner.h"
 
+#include "app/history/HistoryTime.h"
+
+#include <QFileInfo>
 #include <QTimer>
+
+#include <algorithm>
 
 namespace Velocor {
 
@@ -18,7 +23,7 @@ HistoryScanner::HistoryScanner(QObject* parent)
     : QObject(parent), m_scanner(new LogScanner(this)),
       m_older([this] { return isCurrentRequest(); },
               [this](int percent) { Q_EMIT progressed(m_request, percent); }),
-      m_rows(std::make_shared<LogRows>())
+      m_inSpan([this] { return isCurrentRequest(); }), m_rows(std::make_shared<LogRows>())
 {
     qRegisterMetaType<HistoryUpdate>();
     connect(m_scanner, &LogScanner::updated, this, &HistoryScanner::take);
@@ -44,11 +49,14 @@ void HistoryScanner::Open(int request, QString const& path, LogLineParser const&
         m_folded.clear();
     m_request = request;
     m_path = path;
+    m_parser = parser;
     m_isAll = isAll;
     m_isReset = true;
     m_hasCurrent = false;
     m_sinceEnds.invalidate();
     const LogFilter whole = wholeFilter(filter);
+    m_span = filter.span();
+    m_inSpan.Forget();
     if (m_isAll)
         m_older.Open(path, parser, whole);
     else
@@ -75,6 +83,7 @@ void HistoryScanner::SetWatched(bool watched)
 void HistoryScanner::SetFilter(int request, LogFilter const& filter)
 {
     const LogFilter whole = wholeFilter(filter);
+    m_span = filter.span();
     m_older.SetFilter(whole);
     m_request = request;
     m_isReset = true;
@@ -108,9 +117,8 @@ LogFilter HistoryScanner::wholeFilter(LogFilter filter) const
 void HistoryScanner::take(LogUpdate const& update)
 {
     if (!m_isAll) {
-        HistoryUpdate one;
-        static_cast<LogUpdate&>(one) = update;
-        Q_EMIT updated(one);
+        m_current = update;
+        reportOne();
         return;
     }
     m_current = update;
@@ -124,6 +132,45 @@ void HistoryScanner::take(LogUpdate const& update)
         m_older.ReadAgain();
     if (m_older.Prepare(m_folded))
         report(false);
+}
+
+void HistoryScanner::reportOne()
+{
+    HistoryUpdate one;
+    static_cast<LogUpdate&>(one) = m_current;
+    if (m_span.isLimited()) {
+        RunList runs;
+        runs.Add(m_current.runStarts, 0, m_current.rows->lines().size(), 0);
+        one.rows = rowsInSpan(*m_current.rows, runs);
+        if (!one.rows)
+            return; // another request follows
+        one.isReset = one.isReset || m_isReset;
+        if (!one.isReset)
+            one.Compare(*m_rows);
+        m_rows = one.rows;
+    }
+    m_isReset = false;
+    Q_EMIT updated(one);
+}
+
+// Null if another request is to be answered.
+std::shared_ptr<LogRows const> HistoryScanner::rowsInSpan(LogRows const& rows, RunList const& runs)
+{
+    const std::shared_ptr<OlderLogFiles const> older = m_isAll ? m_files : nullptr;
+    const auto modified = [](QString const& path) {
+        const qint64 time = QFileInfo(path).lastModified().toMSecsSinceEpoch();
+        return std::max<qint64>(0, HistoryTime::OfEpoch(time));
+    };
+    std::vector<RowsInSpan::Run> spans;
+    for (HistoryRun const& run : runs.runs()) {
+        const qint64 start = rows.lines().start(run.firstLine);
+        const bool isOlder = older && start < older->size();
+        spans.push_back({run.firstLine, run.endLine,
+                         modified(isOlder ? older->path(older->FileAt(start)) : m_path)});
+    }
+    LogLineParser parser = m_isAll ? m_older.parser() : m_parser;
+    parser.SetFileType(m_current.type);
+    return m_inSpan.Of(rows, spans, LogSource(m_path, older), parser, m_span);
 }
 
 // The older files may have changed without the current one.
@@ -222,7 +269,9 @@ void HistoryScanner::report(bool isFolding)
 
     HistoryUpdate update;
     static_cast<LogUpdate&>(update) = m_current;
-    update.rows = std::make_shared<LogRows>(rows);
+    update.rows = m_span.isLimited() ? rowsInSpan(rows, runs) : std::make_shared<LogRows>(rows);
+    if (!update.rows)
+        return; // another request follows
     update.isReset = m_isReset;
     if (!m_isReset)
         update.Compare(*m_rows);

@@ -5,6 +5,7 @@
 
 #include "app/history/HistoryUpdate.h"
 #include "app/history/OlderHistory.h"
+#include "app/history/RowsInSpan.h"
 #include "app/history/RunEnds.h"
 #include "app/history/RunList.h"
 #include "app/logfile/LogFilter.h"
@@ -78,6 +79,8 @@ private:
     bool isCurrentRequest() const { return m_currentRequest == m_request; }
     LogFilter wholeFilter(LogFilter filter) const;
     void take(LogUpdate const& update);
+    void reportOne();
+    std::shared_ptr<LogRows const> rowsInSpan(LogRows const& rows, RunList const& runs);
     void checkOlder();
     void checkEnds();
     void appendCurrentLines();
@@ -91,8 +94,11 @@ private:
     bool m_isAll = false;
     bool m_isWatched = false;
     QString m_path;
+    LogLineParser m_parser;
 
     OlderHistory m_older;
+    LogSpan m_span;
+    RowsInSpan m_inSpan;
     std::shared_ptr<OlderLogFiles const> m_files; // whose lines are in m_lines
     LineTable m_lines;                            // of all files
     LineTable m_appended;                         // of the current file, as they are in m_lines

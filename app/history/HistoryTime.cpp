@@ -32,6 +32,21 @@ qint64 HistoryTime::OfEpoch(qint64 milliseconds)
     return ForeignStamp::KeyOfEpoch(milliseconds);
 }
 
+qint64 HistoryTime::OfUser(QString const& text, qint64 now)
+{
+    const LogPlace place = LogPlace::Parse(text);
+    switch (place.kind) {
+    case LogPlace::DateTime:
+        return place.value;
+    case LogPlace::Time:
+        return now - now % Milliseconds::Day + place.value;
+    case LogPlace::Interval:
+        return qMax<qint64>(0, now + place.value);
+    default:
+        return -1;
+    }
+}
+
 QByteArray HistoryTime::Text(qint64 time)
 {
     const QDateTime moment = DateTime(time);

@@ -5,6 +5,7 @@
 
 #include <QByteArray>
 #include <QDateTime>
+#include <QString>
 
 namespace Velocor {
 
@@ -26,6 +27,13 @@ public:
     ///
     /// @param milliseconds  since 1970, in UTC
     static qint64 OfEpoch(qint64 milliseconds);
+
+    /// The time that a user means: a date, a time of today, both, or an interval until now such as
+    /// "-2h"; see LogPlace.
+    ///
+    /// @param now  as Now()
+    /// @return -1 if the text is none
+    static qint64 OfUser(QString const& text, qint64 now);
 
     /// A time for files, such as "2026-11-20T14:03:02.007". Uses no locale, so that it works while
     /// a program exits.

@@ -7,7 +7,6 @@
 #include "app/history/HistoryLines.h"
 #include "app/history/RunEnds.h"
 #include "app/logfile/LogFileList.h"
-#include "app/logfile/Milliseconds.h"
 
 #include <QFileInfo>
 
@@ -20,9 +19,6 @@ namespace {
 
 // A log rotates at the start of its program, so twice in a row is rare.
 constexpr int MaximumTries = 10;
-
-// A midnight that leaves room for clocks that are set back over it.
-constexpr qint64 SomeDay = 10000 * Milliseconds::Day;
 
 QStringList OldestFirst(QStringList paths)
 {
@@ -128,27 +124,20 @@ void LogHistory::findFirstDays()
 qint64 LogHistory::findFirstDay(size_t run, qint64& latest) const
 {
     HistoryLines lines(m_files[m_runs[run].file]);
-    HistoryClock clock(SomeDay);
-    qint64 first = -1;
-    qint64 end = -1;
-    for (size_t line = m_runs[run].firstLine; line < m_runs[run].endLine; ++line) {
-        if (!(lines.mark(line) & LogRows::Timed))
-            continue;
-        const LogLineParser::Parts parts = lines.Parts(lines.Content(line));
-        if (parts.timeKey < 0)
-            continue;
-        if (parts.hasDate) {
-            latest = first < 0 ? parts.timeKey : std::min(latest, parts.timeKey);
-            break;
+    size_t line = m_runs[run].firstLine;
+    const auto next = [&](LogLineParser::Parts& parts) {
+        for (; line < m_runs[run].endLine; ++line) {
+            if (!(lines.mark(line) & LogRows::Timed))
+                continue;
+            parts = lines.Parts(lines.Content(line));
+            if (parts.timeKey < 0)
+                continue;
+            ++line;
+            return true;
         }
-        end = clock.Read(parts.timeKey, false);
-        first = first < 0 ? end : first;
-    }
-    if (first < 0)
-        return 0;
-    const qint64 day = HistoryClock::FirstDay(end - SomeDay, latest);
-    latest = day + first - SomeDay;
-    return day;
+        return false;
+    };
+    return HistoryClock::FindFirstDay(next, latest);
 }
 
 void LogHistory::ReadTimes()

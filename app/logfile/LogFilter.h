@@ -4,6 +4,7 @@
 #pragma once
 
 #include "app/logfile/LogEntry.h"
+#include "app/logfile/LogSpan.h"
 #include "app/logfile/LogTerms.h"
 
 #include <QPair>
@@ -14,7 +15,7 @@
 
 namespace Velocor {
 
-/// Which lines of a log are shown: by severity, by text, by run.
+/// Which lines of a log are shown: by severity, by text, by time, by run.
 ///
 /// A plain value; any thread may use its own copy.
 ///
@@ -48,6 +49,11 @@ public:
     /// Whether entries of runs before the newest are shown.
     void SetEarlierRuns(bool shown) { m_earlierRuns = shown; }
     bool earlierRuns() const { return m_earlierRuns; }
+
+    /// Sets from when to when entries are shown. A line of another file tells no date, so this is
+    /// decided by whoever knows the times of the whole log; a LogIndex does not look at it.
+    void SetSpan(LogSpan const& span) { m_span = span; }
+    LogSpan const& span() const { return m_span; }
 
     /// Whether there is any text or term.
     bool hasText() const
@@ -94,6 +100,7 @@ private:
     LogTerms m_required;
     LogTerms m_hidden;
     int m_context = 0;
+    LogSpan m_span;
     QStringMatcher m_matcher;        // prepared once for many lines
     QRegularExpression m_expression; // to find lines
     QRegularExpression m_marking;    // to mark matches while painting, which must be quick

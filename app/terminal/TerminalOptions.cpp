@@ -4,9 +4,7 @@
 #include "app/terminal/TerminalOptions.h"
 
 #include "app/history/HistoryTime.h"
-#include "app/logfile/LogPlace.h"
 #include "app/logfile/LogSeverities.h"
-#include "app/logfile/Milliseconds.h"
 
 #include <QCommandLineParser>
 #include <QObject>
@@ -145,12 +143,12 @@ void Parser::read(TerminalOptions& options) const
     readFilter(options);
     readContext(options);
     readFormat(options);
-    if (!readTime("since", options.since, options.error) ||
-        !readTime("until", options.until, options.error))
+    if (!readTime("since", options.span.since, options.error) ||
+        !readTime("until", options.span.until, options.error))
         return;
 
     const bool selectsLines = isSet("severity") || isSet("match") || isSet("exclude") ||
-                              isSet("context") || options.hasTimes();
+                              isSet("context") || options.span.isLimited();
     options.showsPatterns = isSet("patterns");
     options.showsRuns =
         isSet("runs") || (options.names.isEmpty() && !selectsLines && !options.isMerged &&
@@ -220,15 +218,8 @@ bool Parser::readTime(char const* name, qint64& time, QString& error) const
 {
     if (!isSet(name))
         return true;
-    const LogPlace place = LogPlace::Parse(value(name));
-    const qint64 now = HistoryTime::Now();
-    if (place.kind == LogPlace::DateTime)
-        time = place.value;
-    else if (place.kind == LogPlace::Time)
-        time = now - now % Milliseconds::Day + place.value;
-    else if (place.kind == LogPlace::Interval)
-        time = qMax<qint64>(0, now + place.value);
-    else
+    time = HistoryTime::OfUser(value(name), HistoryTime::Now());
+    if (time < 0)
         error = QObject::tr("Not a time: %1. Times are such as 2026-11-20, 14:03, \"2026-11-20 "
                             "14:03\" or, until now, -2h, -30m and -1d.")
                     .arg(value(name));

@@ -18,8 +18,7 @@ struct TerminalOptions
 
     QStringList names; ///< of files and programs; "-" is standard input
     LogFilter filter;
-    qint64 since = -1; ///< time of an entry, as HistoryCursor::time(); -1: no limit
-    qint64 until = -1;
+    LogSpan span; ///< of times as HistoryCursor::time() gives them
     bool isMerged = false;
     bool follows = false;
     bool showsRuns = false;
@@ -29,8 +28,6 @@ struct TerminalOptions
 
     QByteArray answer; ///< to --help and --version: print only this
     QString error;     ///< why the command line is wrong, for users; empty if it is right
-
-    bool hasTimes() const { return since >= 0 || until >= 0; }
 
     /// Reads a command line, whose first argument is the name of the program.
     static TerminalOptions Parse(QStringList const& arguments);

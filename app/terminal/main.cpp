@@ -56,7 +56,6 @@ private:
     void print(PrintedLog const& source, HistoryCursor& cursor, LineWriter& writer);
     void addFollower(PrintedLog const& source, LogHistory const& history, LineWriter& writer);
     void follow();
-    bool isInSpan(qint64 time) const;
 
     TerminalOptions m_options;
     LogSources m_sources;
@@ -116,13 +115,6 @@ void Command::print(TextTable const& table)
     table.Print(m_options.format, m_output);
 }
 
-bool Command::isInSpan(qint64 time) const
-{
-    if (!m_options.hasTimes())
-        return true;
-    return time >= 0 && time >= m_options.since && (m_options.until < 0 || time <= m_options.until);
-}
-
 // Of entries; their further lines do not count.
 void Command::printPatterns()
 {
@@ -132,7 +124,7 @@ void Command::printPatterns()
         HistoryCursor cursor(*history, true);
         while (cursor.Next()) {
             const LogEntry entry = cursor.file().parser().Parse(cursor.content());
-            if (entry.isEntry && isInSpan(cursor.time()))
+            if (entry.isEntry && m_options.span.Contains(cursor.time()))
                 patterns.Add(entry.severity, entry.message, cursor.time());
         }
     }
@@ -144,7 +136,7 @@ void Command::print(PrintedLog const& source, HistoryCursor& cursor, LineWriter&
     // It is printed once it is complete.
     const bool isIncomplete =
         m_options.follows && cursor.start() >= cursor.file().rows().complete();
-    if (isIncomplete || !isInSpan(cursor.time()))
+    if (isIncomplete || !m_options.span.Contains(cursor.time()))
         return;
     m_isFound = true;
     writer.Write({source.name, cursor.file().path(), cursor.file().parser(), cursor.bytes(),
@@ -157,7 +149,7 @@ void Command::addFollower(PrintedLog const& source, LogHistory const& history, L
         return;
     const QString path = source.log.isEmpty() ? source.files.last() : source.log;
     const auto print = [this, &writer](PrintedLine const& line) {
-        if (isInSpan(line.time))
+        if (m_options.span.Contains(line.time))
             writer.Write(line);
     };
     const auto flush = [this] {
@@ -212,7 +204,7 @@ void Command::printLines()
     for (PrintedLog const& source : m_sources.sources())
         names.append(source.name);
     const auto writer = LineWriter::Make(m_options, isatty(STDOUT_FILENO) == 1, names, m_output);
-    const bool withTimes = m_options.hasTimes() || m_options.format == TerminalOptions::Csv ||
+    const bool withTimes = m_options.span.isLimited() || m_options.format == TerminalOptions::Csv ||
                            m_options.format == TerminalOptions::Json;
     if (m_options.isMerged)
         printMerged(*writer);

@@ -10,7 +10,10 @@
 #include "app/window/widgets/SeverityIcons.h"
 
 #include <QHelpEvent>
+#include <QLabel>
+#include <QLineEdit>
 #include <QTextDocument>
+#include <QToolButton>
 #include <QToolTip>
 #include <QWheelEvent>
 
@@ -92,6 +95,48 @@ QVector<int> BarsWith(MainWindow& window, LogEntry::Severity severity)
     return bars;
 }
 
+template <class Widget>
+Widget* Find(QWidget* parent, char const* name)
+{
+    const QList<Widget*> all = parent->findChildren<Widget*>();
+    for (Widget* widget : all) {
+        if (widget->accessibleName() == name)
+            return widget;
+    }
+    return nullptr;
+}
+
+QLabel* SpanText(MainWindow& window)
+{
+    return Find<QLabel>(Panel(window), "Times shown");
+}
+
+QToolButton* RemoveSpan(MainWindow& window)
+{
+    return Find<QToolButton>(Panel(window), "Show all times");
+}
+
+void TypeTime(MainWindow& window, char const* field, char const* text)
+{
+    Find<QToolButton>(Panel(window), "More filters")->setChecked(true);
+    auto* edit = Find<QLineEdit>(Panel(window), field);
+    edit->setFocus();
+    QTest::keyClick(edit, Qt::Key_A, Qt::ControlModifier);
+    QTest::keyClick(edit, Qt::Key_Delete);
+    QTest::keyClicks(edit, text);
+}
+
+void Drag(MainWindow& window, int from, int to)
+{
+    QTest::mousePress(Strip(window), Qt::LeftButton, Qt::NoModifier, CenterOf(window, from));
+    // A real move has its button, which QTest::mouseMove() lacks.
+    const QPoint end = CenterOf(window, to);
+    QMouseEvent move(QEvent::MouseMove, end, Strip(window)->mapToGlobal(end), Qt::LeftButton,
+                     Qt::LeftButton, Qt::NoModifier);
+    QCoreApplication::sendEvent(Strip(window), &move);
+    QTest::mouseRelease(Strip(window), Qt::LeftButton, Qt::NoModifier, end);
+}
+
 void Turn(MainWindow& window, int steps)
 {
     const QPoint place = CenterOf(window, BarCount(window) / 2);
@@ -117,7 +162,10 @@ class tst_ActivityInWindow : public WindowTestCase
 private slots:
     void bars();
     void clickGoesThere();
-    void draggingZooms();
+    void draggingFilters();
+    void spanFollowsTheLog();
+    void spanByKeys();
+    void spanTyped();
     void wheelZooms();
     void keys();
     void keysMoveOn();
@@ -176,23 +224,75 @@ void tst_ActivityInWindow::clickGoesThere()
     QCOMPARE(View(*window)->currentIndex().row(), 0);
 }
 
-void tst_ActivityInWindow::draggingZooms()
+// The second quarter of the log; the button beside the times shows all again.
+void tst_ActivityInWindow::draggingFilters()
 {
     const WindowTest test(Log());
     const auto window = ShowWith(1000);
-    const int bars = BarCount(*window);
-    const int row = View(*window)->currentIndex().row();
-    QTest::mousePress(Strip(*window), Qt::LeftButton, Qt::NoModifier, CenterOf(*window, bars / 2));
-    // A real move has its button, which QTest::mouseMove() lacks.
-    const QPoint end = CenterOf(*window, bars / 4);
-    QMouseEvent move(QEvent::MouseMove, end, Strip(*window)->mapToGlobal(end), Qt::LeftButton,
-                     Qt::LeftButton, Qt::NoModifier);
-    QCoreApplication::sendEvent(Strip(*window), &move);
-    QTest::mouseRelease(Strip(*window), Qt::LeftButton, Qt::NoModifier, end);
-    QTRY_VERIFY_WITH_TIMEOUT(Entries(*window) < 300, Patience);
-    QVERIFY(Entries(*window) > 200);
-    QCOMPARE(View(*window)->currentIndex().row(), row);
-    QCOMPARE(Rows(*window), 1000);
+    Drag(*window, BarCount(*window) / 2, BarCount(*window) / 4);
+    QTRY_VERIFY_WITH_TIMEOUT(Rows(*window) < 300, Patience);
+    QVERIFY(Rows(*window) > 200);
+    QTRY_COMPARE_WITH_TIMEOUT(Entries(*window), size_t(Rows(*window)), Patience);
+    QVERIFY2(SpanText(*window)->text().startsWith("Only from 2025-03-03 09:04:"),
+             qPrintable(SpanText(*window)->text()));
+    QVERIFY(SpanText(*window)->isVisible());
+    QTest::mouseClick(RemoveSpan(*window), Qt::LeftButton);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1000, Patience);
+    QVERIFY(!SpanText(*window)->isVisible());
+    QVERIFY(View(*window)->hasFocus());
+}
+
+// New entries in the span appear, later ones do not.
+void tst_ActivityInWindow::spanFollowsTheLog()
+{
+    const WindowTest test(Log(400));
+    const auto window = ShowWith(400);
+    TypeTime(*window, "From", "2025-03-03 09:05:00");
+    TypeTime(*window, "Until", "2025-03-03 09:08:19");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
+    QVERIFY(TestFiles::writeOver(test.logFile(), Log(450)));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 150, Patience);
+    QVERIFY(TestFiles::writeOver(test.logFile(), Log(1000)));
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 200, Patience);
+    QTest::keyClick(window.get(), Qt::Key_L, Qt::ControlModifier);
+    QTest::keyClicks(QApplication::focusWidget(), "line 31");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 10, Patience); // not line 31
+}
+
+void tst_ActivityInWindow::spanByKeys()
+{
+    const WindowTest test(Log());
+    const auto window = ShowWith(1000);
+    ActivityStrip* strip = Strip(*window);
+    strip->setFocus();
+    const qint64 until = strip->activity().TimeOf(3) - strip->activity().from;
+    QTest::keyClick(strip, Qt::Key_Home);
+    QTest::keyClick(strip, Qt::Key_Right, Qt::ShiftModifier);
+    QTest::keyClick(strip, Qt::Key_Right, Qt::ShiftModifier);
+    QVERIFY(Status(*window).startsWith("2025-03-03 09:00:00 to 2025-03-03 09:00:"));
+    QTest::keyClick(strip, Qt::Key_Return);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), static_cast<int>((until + 999) / 1000), Patience);
+    QTest::keyClick(strip, Qt::Key_Escape);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1000, Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(Entries(*window), size_t(1000), Patience);
+    QTest::keyClick(strip, Qt::Key_Escape);
+    QVERIFY(View(*window)->hasFocus());
+}
+
+// What is no time is told, and filters nothing.
+void tst_ActivityInWindow::spanTyped()
+{
+    const WindowTest test(Log());
+    const auto window = ShowWith(1000);
+    TypeTime(*window, "Until", "2025-03-03 09:01");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 61, Patience);
+    QCOMPARE(SpanText(*window)->text(), QString("Only until 2025-03-03 09:01:00"));
+    TypeTime(*window, "Until", "tea");
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 1000, Patience);
+    const auto* error = Find<QLabel>(Panel(*window), "Filter error");
+    QCOMPARE(error->text(), QString("Not a time, which is not filtered: tea"));
+    TypeTime(*window, "Until", "");
+    QTRY_VERIFY_WITH_TIMEOUT(!error->isVisible(), Patience);
 }
 
 void tst_ActivityInWindow::wheelZooms()

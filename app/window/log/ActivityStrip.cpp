@@ -140,6 +140,7 @@ void ActivityStrip::take(Activity const& activity)
     m_isCounting = false;
     m_activity = activity;
     m_chosen = std::min(m_chosen, barCount() - 1);
+    m_anchor = std::min(m_anchor, barCount() - 1);
     describe();
     update();
     countSoon();
@@ -266,7 +267,7 @@ void ActivityStrip::paintEvent(QPaintEvent* /*event*/)
     if (m_pressed >= 0 && m_dragged >= 0)
         painter.fillRect(BarRect(m_pressed) | BarRect(m_dragged), marked);
     else if (m_chosen >= 0)
-        painter.fillRect(BarRect(m_chosen), marked);
+        painter.fillRect(BarRect(m_chosen) | BarRect(m_anchor < 0 ? m_chosen : m_anchor), marked);
     size_t most = 1;
     for (Activity::Bar const& bar : m_activity.bars)
         most = std::max(most, bar.entries());
@@ -312,6 +313,7 @@ bool ActivityStrip::goTo(int bar)
 void ActivityStrip::choose(int bar)
 {
     m_chosen = bar;
+    m_anchor = -1;
     update();
     if (bar >= 0)
         Q_EMIT messageReported(textOf(bar));
@@ -347,7 +349,7 @@ void ActivityStrip::mouseReleaseEvent(QMouseEvent* event)
     if (last >= barCount()) // counted again meanwhile
         return;
     if (!isClick) {
-        show(m_activity.TimeOf(first), m_activity.TimeOf(last + 1));
+        chooseSpan(first, last);
     } else {
         choose(-1);
         if (goTo(last))
@@ -365,6 +367,7 @@ void ActivityStrip::show(qint64 from, qint64 to)
     m_from = isAll ? -1 : from;
     m_to = isAll ? -1 : to;
     m_chosen = -1;
+    m_anchor = -1;
     m_timer.stop();
     count();
     update();
@@ -412,12 +415,70 @@ bool ActivityStrip::moveOn(int step)
     return true;
 }
 
+// The last moment of the last bar is the one before the next bar.
+void ActivityStrip::chooseSpan(int one, int other)
+{
+    const LogSpan span{m_activity.TimeOf(std::min(one, other)),
+                       m_activity.TimeOf(std::max(one, other) + 1) - 1};
+    m_chosen = -1;
+    m_anchor = -1;
+    m_from = -1;
+    m_to = -1;
+    Q_EMIT spanChosen(span);
+}
+
+void ActivityStrip::extendTo(int bar)
+{
+    m_anchor = m_anchor >= 0 ? m_anchor : m_chosen >= 0 ? m_chosen : bar;
+    m_chosen = bar;
+    update();
+    Q_EMIT messageReported(
+        tr("%1 to %2")
+            .arg(timeText(m_activity.TimeOf(std::min(m_anchor, m_chosen))),
+                 timeText(m_activity.TimeOf(std::max(m_anchor, m_chosen) + 1) - 1)));
+}
+
+// With Shift; returns false if the key chooses no bar.
+bool ActivityStrip::extend(int key)
+{
+    const int last = barCount() - 1;
+    if (key == Qt::Key_Left)
+        extendTo(m_chosen < 0 ? last : std::max(0, m_chosen - 1));
+    else if (key == Qt::Key_Right)
+        extendTo(std::min(last, m_chosen + 1));
+    else if (key == Qt::Key_Home)
+        extendTo(0);
+    else if (key == Qt::Key_End)
+        extendTo(last);
+    else
+        return false;
+    return true;
+}
+
+// One step back for each call, in the end to the table.
+void ActivityStrip::leave()
+{
+    if (m_anchor >= 0)
+        choose(-1);
+    else if (m_from >= 0)
+        show(m_activity.first, m_activity.last + 1);
+    else if (m_model->filter().span().isLimited())
+        Q_EMIT spanChosen(LogSpan());
+    else
+        m_view->setFocus();
+}
+
 void ActivityStrip::keyPressEvent(QKeyEvent* event)
 {
     if (m_activity.state != Activity::Known || barCount() == 0) {
-        QWidget::keyPressEvent(event);
+        if (event->key() == Qt::Key_Escape && m_model->filter().span().isLimited())
+            Q_EMIT spanChosen(LogSpan()); // the span may have left nothing
+        else
+            QWidget::keyPressEvent(event);
         return;
     }
+    if ((event->modifiers() & Qt::ShiftModifier) && extend(event->key()))
+        return;
     const int bar = m_chosen < 0 ? barCount() / 2 : m_chosen;
     switch (event->key()) {
     case Qt::Key_Left:
@@ -434,7 +495,10 @@ void ActivityStrip::keyPressEvent(QKeyEvent* event)
         break;
     case Qt::Key_Return:
     case Qt::Key_Enter:
-        goTo(m_chosen < 0 ? 0 : m_chosen);
+        if (m_anchor >= 0)
+            chooseSpan(m_anchor, m_chosen);
+        else
+            goTo(m_chosen < 0 ? 0 : m_chosen);
         break;
     case Qt::Key_Plus:
     case Qt::Key_Equal:
@@ -444,10 +508,7 @@ void ActivityStrip::keyPressEvent(QKeyEvent* event)
         zoom(bar, 1 / ZoomStep);
         break;
     case Qt::Key_Escape:
-        if (m_from < 0)
-            m_view->setFocus();
-        else
-            show(m_activity.first, m_activity.last + 1);
+        leave();
         break;
     default:
         QWidget::keyPressEvent(event);

@@ -4,6 +4,7 @@
 #pragma once
 
 #include "app/logfile/ActivityCounter.h"
+#include "app/logfile/LogSpan.h"
 
 #include <QThread>
 #include <QTimer>
@@ -17,9 +18,10 @@ class LogView;
 /// When a log was busy: a bar for each moment, as high as there were entries, with the problems
 /// among them in their colors. It stands for the rows that the view shows, and follows them.
 ///
-/// A click goes to the first entry of a bar, dragging and the wheel zoom. With the keyboard, Left,
-/// Right, Home and End choose a bar, Enter goes there, Plus and Minus zoom, and Escape shows all
-/// times again. Counting runs in a thread of its own. GUI thread.
+/// A click goes to the first entry of a bar, dragging shows only entries of these times, and the
+/// wheel zooms. With the keyboard, Left, Right, Home and End choose a bar, Enter goes there, Plus
+/// and Minus zoom; with Shift, the former choose several bars, and Enter shows only their times.
+/// Escape shows all times again. Counting runs in a thread of its own. GUI thread.
 class ActivityStrip : public QWidget
 {
     Q_OBJECT
@@ -47,6 +49,9 @@ Q_SIGNALS:
 
     /// What the keyboard has chosen, for the status bar.
     void messageReported(QString const& text);
+
+    /// Only entries of these times are to be shown.
+    void spanChosen(Velocor::LogSpan const& span);
 
     // To the counter's thread.
     void countRequested(Velocor::ActivityRequest const& request);
@@ -81,6 +86,10 @@ private:
     void show(qint64 from, qint64 to);
     void zoom(int bar, double factor);
     bool moveOn(int step);
+    void extendTo(int bar);
+    bool extend(int key);
+    void chooseSpan(int one, int other);
+    void leave();
 
     LogModel* m_model;
     LogView* m_view;
@@ -94,6 +103,7 @@ private:
     qint64 m_to = -1;
     Activity m_activity;
     int m_chosen = -1;  // bar
+    int m_anchor = -1;  // the other end, if several are chosen
     int m_pressed = -1; // bars, while the mouse button is down
     int m_dragged = -1;
     QTimer m_timer;

@@ -3,6 +3,7 @@
 
 #include "app/window/log/LogFilterBar.h"
 
+#include "app/history/HistoryTime.h"
 #include "app/logfile/LogSeverities.h"
 #include "app/window/log/SeveritySwitches.h"
 #include "app/window/widgets/FlowLayout.h"
@@ -52,6 +53,7 @@ LogFilterBar::LogFilterBar(QWidget* parent)
     layout->setSpacing(4);
     layout->addLayout(firstRow);
     layout->addWidget(secondRow);
+    layout->addWidget(makeSpanRow());
     layout->addWidget(m_error);
 
     m_typing.setSingleShot(true);
@@ -80,7 +82,8 @@ QLayout* LogFilterBar::makeFirstRow()
     m_more->setCheckable(true);
     m_more->setFocusPolicy(Qt::TabFocus);
     m_more->setAccessibleName(tr("More filters"));
-    m_more->setToolTip(PlainToolTip(tr("More terms, terms to hide, least severity, context")));
+    m_more->setToolTip(
+        PlainToolTip(tr("More terms, terms to hide, times, least severity, context")));
 
     auto* row = new FlowLayout(Gap);
     for (QWidget* widget : {static_cast<QWidget*>(m_text), static_cast<QWidget*>(earlier),
@@ -103,8 +106,93 @@ QLineEdit* LogFilterBar::makeTerms(QString const& name, QString const& toolTip)
     return field;
 }
 
+QLineEdit* LogFilterBar::makeTime(QString const& name, QString const& toolTip)
+{
+    QLineEdit* field =
+        makeTerms(name, toolTip + QLatin1Char(' ') +
+                            tr("A date, a time or both (2026-11-20, 14:03, 2026-11-20 14:03), or "
+                               "an interval until now such as -2h, -30m or -1d."));
+    field->setPlaceholderText(name);
+    connect(field, &QLineEdit::textChanged, this, &LogFilterBar::readSpan);
+    return field;
+}
+
+// "-2h" is two hours before it was typed: the times stay when something else is changed.
+void LogFilterBar::readSpan()
+{
+    m_filter.SetSpan({readTime(m_since), readTime(m_until)});
+}
+
+qint64 LogFilterBar::readTime(QLineEdit const* field)
+{
+    return HistoryTime::OfUser(field->text(), HistoryTime::Now());
+}
+
+void LogFilterBar::SetSpan(LogSpan const& span)
+{
+    const auto textOf = [](qint64 time) {
+        return QString::fromLatin1(time < 0 ? QByteArray() : HistoryTime::Text(time))
+            .replace(QLatin1Char('T'), QLatin1Char(' '));
+    };
+    m_since->setText(textOf(span.since));
+    m_until->setText(textOf(span.until));
+    m_since->setCursorPosition(0); // the date matters more than the milliseconds
+    m_until->setCursorPosition(0);
+    apply();
+}
+
+QWidget* LogFilterBar::makeSpanRow()
+{
+    m_span = NewPlainLabel();
+    m_span->setAccessibleName(tr("Times shown"));
+    m_span->setTextInteractionFlags(Qt::TextSelectableByMouse);
+    auto* remove = new QToolButton;
+    remove->setText(QStringLiteral("\u00d7"));
+    remove->setAutoRaise(true);
+    remove->setFocusPolicy(Qt::TabFocus);
+    remove->setAccessibleName(tr("Show all times"));
+    remove->setToolTip(PlainToolTip(tr("Show all times")));
+    connect(remove, &QToolButton::clicked, this, [this] {
+        SetSpan(LogSpan());
+        if (parentWidget())
+            parentWidget()->setFocus(); // passed on to the table
+    });
+    auto* times = new QWidget;
+    auto* row = new QHBoxLayout(times);
+    row->setContentsMargins(0, 0, 0, 0);
+    row->setSpacing(6);
+    row->addWidget(m_span);
+    row->addWidget(remove);
+    row->addStretch(1);
+    times->hide();
+    return times;
+}
+
+void LogFilterBar::showSpan()
+{
+    const LogSpan span = m_filter.span();
+    const auto textOf = [](qint64 time) {
+        const bool isWhole = time % 1000 == 0;
+        return HistoryTime::DateTime(time).toString(
+            isWhole ? QStringLiteral("yyyy-MM-dd HH:mm:ss")
+                    : QStringLiteral("yyyy-MM-dd HH:mm:ss.zzz"));
+    };
+    QString text;
+    if (span.since >= 0 && span.until >= 0)
+        text = tr("Only from %1 to %2").arg(textOf(span.since), textOf(span.until));
+    else if (span.since >= 0)
+        text = tr("Only from %1 on").arg(textOf(span.since));
+    else if (span.until >= 0)
+        text = tr("Only until %1").arg(textOf(span.until));
+    m_span->setText(text);
+    m_span->parentWidget()->setVisible(span.isLimited());
+}
+
 QWidget* LogFilterBar::makeSecondRow()
 {
+    m_since = makeTime(tr("From"), tr("Show only entries from this time on."));
+    m_until = makeTime(tr("Until"), tr("Show only entries up to this time."));
+
     m_required = makeTerms(tr("Terms that lines also contain"),
                            tr("Show only lines that contain all of these terms, too. "
                               "Blanks separate terms; \"two words\" are one."));
@@ -120,6 +208,8 @@ QWidget* LogFilterBar::makeSecondRow()
     row->addWidget(m_required);
     row->addWidget(NewPlainLabel(tr("Hide:")));
     row->addWidget(m_hidden);
+    row->addWidget(m_since);
+    row->addWidget(m_until);
     row->addWidget(m_least);
     row->addWidget(m_context);
     second->hide();
@@ -160,7 +250,7 @@ QComboBox* LogFilterBar::makeContext()
 void LogFilterBar::showMore()
 {
     const int count = (m_required->text().isEmpty() ? 0 : 1) +
-                      (m_hidden->text().isEmpty() ? 0 : 1) +
+                      (m_hidden->text().isEmpty() ? 0 : 1) + (m_filter.span().isLimited() ? 1 : 0) +
                       (m_context->currentIndex() > 0 ? 1 : 0);
     m_more->setText(count > 0 ? tr("More (%1)").arg(count) : tr("More"));
 }
@@ -278,6 +368,8 @@ void LogFilterBar::Clear()
     m_text->clear();
     m_required->clear();
     m_hidden->clear();
+    m_since->clear();
+    m_until->clear();
     m_context->setCurrentIndex(0);
     m_severities->ShowAll(); // applies everything
 }
@@ -302,15 +394,26 @@ void LogFilterBar::apply()
                       LogTerms(m_hidden->text(), m_case->isChecked()));
     m_filter.SetContext(m_context->currentData().toInt());
     showMore();
+    showSpan();
 
     const bool isExpression = m_expression->isChecked();
     const QString error = isExpression ? LogFilter::ErrorOf(m_text->text()) : QString();
     showError(error.isEmpty()
-                  ? QString()
+                  ? timeError()
                   : tr("Invalid regular expression, nothing is filtered: %1").arg(error));
     m_filter.SetText(error.isEmpty() ? m_text->text() : QString(), isExpression,
                      m_case->isChecked());
     Q_EMIT filterChanged();
+}
+
+// While a time is being typed, it may be none yet.
+QString LogFilterBar::timeError() const
+{
+    for (QLineEdit const* field : {m_since, m_until}) {
+        if (!field->text().trimmed().isEmpty() && HistoryTime::OfUser(field->text(), 0) < 0)
+            return tr("Not a time, which is not filtered: %1").arg(field->text());
+    }
+    return QString();
 }
 
 void LogFilterBar::showError(QString const& error)
@@ -325,7 +428,7 @@ void LogFilterBar::ShowSlowLine(size_t line)
         showError(tr("The regular expression takes too long at line %L1, nothing is filtered.")
                       .arg(static_cast<qulonglong>(line)));
     else if (m_filter.hasText())
-        showError(QString());
+        showError(timeError());
 }
 
 void LogFilterBar::ShowCounts(LogCounts const& counts)

@@ -24,7 +24,7 @@ class SeveritySwitches;
 
 /// The filter controls of a log view: text, match options, one button per severity and one for
 /// lines without a severity; in a second row, which is shown on demand, more terms, a least
-/// severity, and context.
+/// severity, times, and context. A third row tells the times while they are limited.
 class LogFilterBar : public QWidget
 {
     Q_OBJECT
@@ -61,6 +61,9 @@ public:
     void FilterBy(LogEntry::Severity severity);
     void Hide(LogEntry::Severity severity);
 
+    /// Shows only entries of these times, besides all else.
+    void SetSpan(LogSpan const& span);
+
     /// Sets where the last filter texts are kept, newest first; shared with other bars.
     void SetHistory(std::shared_ptr<QStringList> const& history) { m_history = history; }
 
@@ -84,7 +87,13 @@ private:
     QCheckBox* makeOption(QString const& text, QString const& name, QString const& toolTip);
     QLayout* makeFirstRow();
     QLineEdit* makeTerms(QString const& name, QString const& toolTip);
+    QLineEdit* makeTime(QString const& name, QString const& toolTip);
     QWidget* makeSecondRow();
+    QWidget* makeSpanRow();
+    static qint64 readTime(QLineEdit const* field);
+    void readSpan();
+    void showSpan();
+    QString timeError() const;
     QComboBox* makeLeastSeverity();
     QComboBox* makeContext();
     void focusTerms(QLineEdit* field);
@@ -102,6 +111,9 @@ private:
     QToolButton* m_more = nullptr;
     QLineEdit* m_required = nullptr;
     QLineEdit* m_hidden = nullptr;
+    QLineEdit* m_since = nullptr;
+    QLineEdit* m_until = nullptr;
+    QLabel* m_span = nullptr;
     QComboBox* m_least = nullptr;
     QComboBox* m_context = nullptr;
     QLabel* m_error;

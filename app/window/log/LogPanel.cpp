@@ -130,6 +130,8 @@ void LogPanel::connectParts()
             Q_EMIT messageReported(message);
     });
     connect(m_activity, &ActivityStrip::messageReported, this, &LogPanel::messageReported);
+    connect(m_activity, &ActivityStrip::spanChosen, this,
+            [this](LogSpan const& span) { m_filterBar->SetSpan(span); });
     connect(m_goTo, &LogGoTo::started, this, &LogPanel::messageReported);
 }
 
