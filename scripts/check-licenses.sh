@@ -40,8 +40,10 @@ reuse spdx
 # Its templates are compiled into the program.
 entry librapidxml-dev "$(dpkg-query -W -f='${Version}' librapidxml-dev)" STATIC_LINK
 objdump -p "$program" | sed -n 's/^ *NEEDED *//p' | while read -r library; do
+    [[ $library != libtork* ]] || continue # its sources are listed above
     path=$(ldd "$program" | sed -n "s|^\s*$library => \(/.*\) (0x.*|\1|p")
-    [ -z "$path" ] || dpkg-query -S "*/$library" | sed -n "s|: .*/$library\$||p"
+    # A package may have the file below /usr, and ldd find it without.
+    [ -z "$path" ] || dpkg-query -S "*${path#/usr}" | sed -n "s|: .*/$library\$||p"
 done | sort -u | while read -r package; do
     entry "$package" "$(dpkg-query -W -f='${Version}' "$package")" DYNAMIC_LINK
 done

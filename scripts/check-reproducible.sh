@@ -26,4 +26,5 @@ unset CMAKE_GENERATOR CMAKE_C_COMPILER_LAUNCHER CMAKE_CXX_COMPILER_LAUNCHER
     -c 'dpkg-buildpackage --build=binary --no-sign' . '../*.deb') >"$work/reprotest.txt" 2>&1 ||
     { tail -n 40 "$work/reprotest.txt" && exit 1; }
 grep -q 'Reproduction successful' "$work/reprotest.txt"
-echo "reproducible: all packages have the same bytes, whatever varies"
+count=$(grep -Ec '^[0-9a-f]{64}  .*\.deb$' "$work/reprotest.txt")
+echo "reproducible: $count packages have the same bytes, whatever varies"

@@ -14,7 +14,8 @@ set(expected
     lib/cmake/Tork${SUFFIX}/TorkTargets.cmake
     lib/cmake/Tork${SUFFIX}/VelocorTargets.cmake
     lib/pkgconfig/tork${SUFFIX}.pc
-    lib/pkgconfig/velocor-frame${SUFFIX}.pc)
+    lib/pkgconfig/velocor-frame${SUFFIX}.pc
+    share/licenses/tork/MIT.txt)
 if(NOT EXISTS "${PREFIX}/Velocor.app")
     list(APPEND expected share/Tork/Velocor/velocor.defaults.cfg)
 endif()

@@ -40,6 +40,7 @@ private slots:
     void savesByteForByte();
     void shownButNotEdited_data();
     void shownButNotEdited();
+    void errorJustTyped();
     void characterOutsideTheEncoding();
     void whatCanBeReadIsOffered();
     void treeAndTextShowTheSameChanges();
@@ -232,6 +233,19 @@ void tst_SettingsAsText::shownButNotEdited()
     QVERIFY(!shown.editor->isModified());
     shown.press(Qt::Key_S, Qt::ControlModifier);
     QCOMPARE(shown.saved(), content);
+}
+
+// F8 does not wait for the pause after which the text is read.
+void tst_SettingsAsText::errorJustTyped()
+{
+    const ShownText shown(Settings);
+    shown.press(Qt::Key_T, Qt::ControlModifier);
+    shown.text->setTextCursor(shown.text->document()->find("Serif"));
+    QTest::keyClicks(shown.text, "</");
+    shown.press(Qt::Key_Home, Qt::ControlModifier);
+    shown.press(Qt::Key_F8);
+    QCOMPARE(shown.text->textCursor().blockNumber(), 2);
+    QVERIFY2(shown.state().startsWith("Line 3, column "), qPrintable(shown.state()));
 }
 
 void tst_SettingsAsText::characterOutsideTheEncoding()

@@ -304,6 +304,7 @@ void SettingsTextPage::keyPressEvent(QKeyEvent* event)
     const QVector<SettingsTextCommand> all = AllCommands();
     for (int i = 0; i < all.size(); ++i) {
         if (all.at(i).key == pressed) {
+            parsed(); // what was just typed decides which actions are enabled
             m_actions.at(i)->trigger();
             return;
         }
