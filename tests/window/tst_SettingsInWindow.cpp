@@ -758,14 +758,14 @@ void tst_SettingsInWindow::finds_data()
                         char const* result) {
         QTest::newRow(name) << text << keys << current << result;
     };
-    row("a value", "3", "", "C/z value", "");
-    row("a name in another case", "Y", "", "A/y name", "");
-    row("a section", "b", "", "B name", "");
-    row("where it is already", "a", "", "A name", "");
-    row("the only match again", "z", "nn", "C/z name", "");
-    row("around the end", "a", "n", "A name", "");
-    row("from name to value", "1", "", "A/x value", "");
-    row("the previous one, around the start", "c", "p", "C name", "");
+    row("a value", "3", "", "C/z value", "1 of 1");
+    row("a name in another case", "Y", "", "A/y name", "1 of 1");
+    row("a section", "b", "", "B name", "1 of 1");
+    row("where it is already", "a", "", "A name", "1 of 1");
+    row("the only match again", "z", "nn", "C/z name", "1 of 1");
+    row("around the end", "a", "n", "A name", "1 of 1");
+    row("from name to value", "1", "", "A/x value", "1 of 1");
+    row("the previous one, around the start", "c", "p", "C name", "1 of 1");
     row("nowhere", "none", "", "A name", "No match");
     row("nowhere, asked again", "none", "np", "A name", "No match");
 }
