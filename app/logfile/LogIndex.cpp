@@ -180,8 +180,7 @@ bool LogIndex::Feed(char const* bytes, int count)
         char const* const lineEnd = m_lineEnd.Find(at, end, m_position + (at - bytes), before);
         const int length = static_cast<int>((lineEnd ? lineEnd : end) - at);
         if (lineEnd && !m_lineIsPartial) {
-            if (m_filter.hasText() && m_candidate < m_lineStart)
-                m_candidate = m_lineStart + distanceOfCandidate(at, end);
+            findCandidate(at, end);
             if (!addLine(at, length, true))
                 return false;
         } else {
@@ -206,9 +205,14 @@ bool LogIndex::Feed(char const* bytes, int count)
 // Candidates are looked for in all bytes rather than in each line, for the goal "filter by
 // expression in a terminal" in docs/performance.md; compared in tst_PlainSearch. A line in UTF-16
 // is narrowed before it is searched.
-std::ptrdiff_t LogIndex::distanceOfCandidate(char const* at, char const* end) const
+//
+// @param at  where a line starts
+void LogIndex::findCandidate(char const* at, char const* end)
 {
-    return m_parser.fileType().encoding.isWide() ? 0 : m_search.Find(at, end) - at;
+    if (!m_filter.hasText() || m_candidate >= m_lineStart)
+        return;
+    const bool isWide = m_parser.fileType().encoding.isWide();
+    m_candidate = m_lineStart + (isWide ? 0 : m_search.Find(at, end) - at);
 }
 
 void LogIndex::End()

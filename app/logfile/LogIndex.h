@@ -206,7 +206,7 @@ private:
     bool addLine(char const* line, int length, bool complete);
     quint8 markOf(LogLineParser::Parts const& parts);
     int contentLength(char const* line, int length, bool complete) const;
-    std::ptrdiff_t distanceOfCandidate(char const* at, char const* end) const;
+    void findCandidate(char const* at, char const* end);
     LogFilter::Match matchOf(char const* line, int length, size_t index);
     qint64 endOf(size_t line) const;
     void searchLine(char const* line, qint64 length);
