@@ -1576,7 +1576,7 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
     </message>
     <message>
         <source>Whole family, by time</source>
-        <translation>Ganze Familie, nach Zeit</translation>
+        <translation>Protokolle der Familie nach Zeit</translation>
     </message>
     <message>
         <source>The logs of all programs of the family as one</source>
@@ -2932,7 +2932,7 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
     </message>
     <message>
         <source>&amp;Whole Family, by Time</source>
-        <translation>Ganze &amp;Familie, nach Zeit</translation>
+        <translation>Protokolle &amp;der Familie nach Zeit</translation>
     </message>
     <message>
         <source>Ctrl+Alt+F</source>

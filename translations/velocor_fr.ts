@@ -1576,7 +1576,7 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
     </message>
     <message>
         <source>Whole family, by time</source>
-        <translation>Toute la famille, par heure</translation>
+        <translation>Journaux de la famille, par date</translation>
     </message>
     <message>
         <source>The logs of all programs of the family as one</source>
@@ -2932,7 +2932,7 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
     </message>
     <message>
         <source>&amp;Whole Family, by Time</source>
-        <translation>Toute la &amp;famille, par heure</translation>
+        <translation>&amp;Journaux de la famille, par date</translation>
     </message>
     <message>
         <source>Ctrl+Alt+F</source>

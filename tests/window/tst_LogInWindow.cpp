@@ -863,7 +863,7 @@ void tst_LogInWindow::olderFiles()
     auto* files = Child<QComboBox>(window.get(), "Log file");
     QVERIFY(files);
     files->showPopup();
-    QCOMPARE(files->count(), 4); // and all of them
+    QCOMPARE(files->count(), 5); // and all of them, and the whole family
     QVERIFY2(files->itemText(1).startsWith("app.log.1 ("), qPrintable(files->itemText(1)));
     QWidget* list = files->view();
     QTest::keyClick(list, Qt::Key_Down);

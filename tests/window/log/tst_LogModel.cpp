@@ -150,7 +150,7 @@ void tst_LogModel::columns()
 {
     LogModel model;
     open(model, "2025-03-03 09:02:11.031 Warning dT:[250] hello\nmore\n");
-    QCOMPARE(model.columnCount(), 5);
+    QCOMPARE(model.columnCount(), 6);
     QCOMPARE(model.rowCount(), 2);
     QCOMPARE(model.index(0, 0).data().toString(), QString("2025-03-03 09:02:11.031"));
     QCOMPARE(model.index(0, 1).data().toString(), QString("Warning"));
@@ -165,7 +165,7 @@ void tst_LogModel::columns()
     QStringList titles;
     for (int column = 0; column < model.columnCount(); ++column)
         titles.append(model.headerData(column, Qt::Horizontal, Qt::DisplayRole).toString());
-    QCOMPARE(titles, QStringList({"Time", "Severity", "Elapsed", "Since", "Message"}));
+    QCOMPARE(titles, QStringList({"Time", "Severity", "Elapsed", "Since", "Program", "Message"}));
 }
 
 void tst_LogModel::details()
@@ -201,7 +201,7 @@ void tst_LogModel::details()
     QStringList titles;
     for (int column = 0; column < model.columnCount(); ++column)
         titles.append(model.headerData(column, Qt::Horizontal, Qt::DisplayRole).toString());
-    QCOMPARE(titles, QStringList({"Time", "Severity", "Elapsed", "Since", "Message"}));
+    QCOMPARE(titles, QStringList({"Time", "Severity", "Elapsed", "Since", "Program", "Message"}));
     QVERIFY(!model.headerData(0, Qt::Vertical, Qt::DisplayRole).isValid());
     QVERIFY(!model.headerData(0, Qt::Horizontal, Qt::FontRole).isValid());
 }
