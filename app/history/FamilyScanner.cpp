@@ -220,7 +220,7 @@ void FamilyScanner::Open(int request, QString const& path, LogLineParser const& 
                          LogFilter const& filter, bool isAll)
 {
     m_request = request;
-    if (m_isFamily || m_logs.empty()) {
+    if (m_isFamily || m_logs.size() != 1) {
         close();
         {
             const QMutexLocker lock(&m_mutex);
@@ -410,7 +410,7 @@ void FamilyScanner::mergeRows(LogRows& rows) const
     constexpr qint64 Last = std::numeric_limits<qint64>::max();
     while (true) {
         size_t first = logs.size();
-        size_t second = logs.size(); // whose line comes after those of the first one
+        size_t second = first; // whose line comes after those of the first one
         const auto isBefore = [&logs](size_t a, size_t b) {
             return b == logs.size() || logs[a].key() < logs[b].key();
         };

@@ -90,7 +90,7 @@ bool LogKeys::readStamps(LineTable const& lines, LogSource const& source,
         if (isKnown)
             stamps.push_back(m_stamps[known]);
         else
-            stamps.push_back(lines.mark(line) & LogRows::Timed
+            stamps.push_back((lines.mark(line) & LogRows::Timed) != 0
                                  ? reader.Read(start, lines.check(line))
                                  : NoStamp);
     }

@@ -7,6 +7,11 @@
 
 namespace Velocor {
 
+size_t LogSource::LogAt(qint64 offset) const
+{
+    return logs && offset >= 0 ? static_cast<size_t>(offset / LogSize) : 0;
+}
+
 std::vector<LogSource::File> LogSource::Files() const
 {
     std::vector<File> files;
