@@ -3,8 +3,6 @@
 
 #include "app/logfile/ActivityCounter.h"
 
-#include <QFileInfo>
-
 #include <algorithm>
 
 namespace Velocor {
@@ -41,14 +39,6 @@ ActivityCounter::ActivityCounter(QObject* parent) : QObject(parent)
 {
     qRegisterMetaType<ActivityRequest>();
     qRegisterMetaType<Activity>();
-}
-
-void ActivityCounter::open()
-{
-    m_file.close();
-    m_file.setFileName(m_request.path);
-    if (QFileInfo(m_request.path).isFile())
-        m_file.open(QIODevice::ReadOnly | QIODevice::Unbuffered);
 }
 
 // A line that continues an entry is none.
@@ -101,10 +91,11 @@ LogCounts ActivityCounter::countsBefore(size_t row) const
 LogLineParser::Parts ActivityCounter::read(size_t row)
 {
     const qint64 start = m_rows->start(row);
-    if (start < 0 || !(m_rows->mark(row) & LogRows::Timed) || !m_file.seek(start))
+    if (start < 0 || !(m_rows->mark(row) & LogRows::Timed) || !m_file.isOpen() ||
+        !m_file.Seek(start))
         return LogLineParser::Parts();
     LogFileType const& type = m_request.parser.fileType();
-    const QByteArray bytes = m_file.read(StampLimit);
+    const QByteArray bytes = m_file.Read(StampLimit);
     char const* const last = type.lineEnd().Find(bytes.constBegin(), bytes.constEnd(), 0, '\0');
     char const* line = bytes.constData();
     int length = last ? static_cast<int>(last - line) + 1 - type.lineEnd().size() : bytes.size();
@@ -200,12 +191,12 @@ void ActivityCounter::Count(ActivityRequest const& request)
 {
     if (m_currentRequest > request.number)
         return;
-    if (request.path != m_request.path) {
+    if (request.source != m_request.source) {
         m_rows.reset();
         m_times.clear();
     }
     m_request = request;
-    open();
+    m_file.Open(request.source);
     addUp();
     Activity activity;
     activity.number = request.number;
@@ -228,7 +219,7 @@ void ActivityCounter::Count(ActivityRequest const& request)
         if (!isCancelled())
             fill(activity);
     }
-    m_file.close();
+    m_file.Close();
     if (!isCancelled())
         Q_EMIT counted(activity);
 }

@@ -3,14 +3,14 @@
 
 #pragma once
 
+#include "app/logfile/LogBytes.h"
 #include "app/logfile/LogEntry.h"
 #include "app/logfile/LogLineParser.h"
 #include "app/logfile/LogRows.h"
+#include "app/logfile/LogSource.h"
 
-#include <QFile>
 #include <QMetaType>
 #include <QObject>
-#include <QString>
 
 #include <atomic>
 #include <memory>
@@ -23,7 +23,7 @@ namespace Velocor {
 struct ActivityRequest
 {
     int number = 0;
-    QString path;
+    LogSource source;
     LogLineParser parser;
     std::shared_ptr<LogRows const> rows;
     qint64 from = -1; ///< the time to begin with, as LogTimeReader::Stamp::key; -1 for all times
@@ -102,7 +102,6 @@ private:
     };
 
     bool isCancelled() const { return m_currentRequest > m_request.number; }
-    void open();
     void addUp();
     void forgetTimes(size_t same);
     void addRow(size_t row, LogCounts& counts) const;
@@ -117,7 +116,7 @@ private:
 
     std::atomic<int> m_currentRequest{0};
     ActivityRequest m_request;
-    QFile m_file;
+    LogBytes m_file;
     std::shared_ptr<LogRows const> m_rows;      // of the last request
     std::vector<LogCounts> m_sums;              // of the rows before each block
     std::unordered_map<size_t, qint64> m_times; // of rows, as known from them or those above

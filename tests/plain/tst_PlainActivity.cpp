@@ -112,9 +112,32 @@ private:
         return all;
     }
 
+    // All of the log in one file, or its start in older ones.
+    LogSource write()
+    {
+        if (m_draws->once(2)) {
+            same("written", TestFiles::write(m_path, m_log), true);
+            return m_path;
+        }
+        auto older = std::make_shared<OlderLogFiles>();
+        int start = 0;
+        for (int file = 0; file < 2; ++file) {
+            const int end = m_log.indexOf('\n', start + m_draws->below(m_log.size() - start + 1));
+            const QString path = m_path + '.' + QString::number(file);
+            same("written", TestFiles::write(path, m_log.mid(start, end + 1 - start)), true);
+            auto opened = std::make_shared<QFile>(path);
+            same("opened", opened->open(QIODevice::ReadOnly | QIODevice::Unbuffered), true);
+            older->Add(path, opened, opened->size(), QByteArray());
+            start += static_cast<int>(opened->size());
+        }
+        tell("older files with # bytes", start);
+        same("written", TestFiles::write(m_path, m_log.mid(start)), true);
+        return {m_path, older};
+    }
+
     void compare()
     {
-        same("written", TestFiles::write(m_path, m_log), true);
+        const LogSource source = write();
         LogIndex index(LogLineParser(), m_filter, true);
         index.Begin();
         index.Feed(m_log.constData(), m_log.size());
@@ -128,7 +151,7 @@ private:
 
         ActivityRequest request;
         request.number = ++m_number;
-        request.path = m_path;
+        request.source = source;
         request.rows = m_rows;
         request.parts = 1 + m_draws->below(m_draws->once(4) ? 500 : 20);
         if (m_draws->once(2)) {

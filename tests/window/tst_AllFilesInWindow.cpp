@@ -7,6 +7,7 @@
 #include "WindowTestCase.h"
 
 #include "app/history/RunEnds.h"
+#include "app/window/log/ActivityStrip.h"
 #include "app/window/log/LogModel.h"
 #include "app/window/log/LogView.h"
 #include "support/TestFiles.h"
@@ -112,6 +113,7 @@ private slots:
     void filter();
     void find();
     void problems();
+    void activity();
     void copied();
     void saved();
     void marks();
@@ -317,6 +319,38 @@ void tst_AllFilesInWindow::problems()
     QCOMPARE(View(*window)->currentIndex().row(), RowOf(*window, "i"));
     QVERIFY2(Panel(*window)->summary().contains("4 problems"),
              qPrintable(Panel(*window)->summary()));
+}
+
+// The bars of all days, and from each of them to its entries.
+void tst_AllFilesInWindow::activity()
+{
+    const WindowTest test;
+    WriteFiles(test.logFile());
+    const auto window = WindowTest::show();
+    ShowAll(*window);
+    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    QTest::keyClick(window.get(), Qt::Key_A, Qt::ControlModifier | Qt::AltModifier);
+    auto* strip = Panel(*window)->findChild<ActivityStrip*>();
+    QVector<int> busy;
+    const auto find = [&] {
+        busy.clear();
+        std::vector<Activity::Bar> const& bars = strip->activity().bars;
+        for (size_t bar = 0; bar < bars.size(); ++bar) {
+            if (bars[bar].entries() > 0)
+                busy.append(static_cast<int>(bar));
+        }
+        return busy.size();
+    };
+    QTRY_COMPARE_WITH_TIMEOUT(find(), 5, Patience);
+    QCOMPARE(busy.first(), 0);
+    char const* const messages[] = {"a", "c", "e", "g", "i"};
+    const size_t entries[] = {3, 2, 3, 2, 2}; // a line without a time has that of the row above
+    for (int day = 0; day < 5; ++day) {
+        QCOMPARE(strip->activity().bars[static_cast<size_t>(busy[day])].entries(), entries[day]);
+        QTest::mouseClick(strip, Qt::LeftButton, Qt::NoModifier,
+                          strip->BarRect(busy[day]).center());
+        QCOMPARE(View(*window)->currentIndex().row(), RowOf(*window, messages[day]));
+    }
 }
 
 void tst_AllFilesInWindow::copied()

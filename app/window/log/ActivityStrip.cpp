@@ -121,7 +121,7 @@ void ActivityStrip::count()
     startCounter();
     ActivityRequest request;
     request.number = ++m_number;
-    request.path = m_path;
+    request.source = m_model->source();
     request.parser = m_model->parser();
     request.rows = m_model->state().rows;
     request.from = m_from;
