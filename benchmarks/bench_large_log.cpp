@@ -10,31 +10,24 @@
 // time.
 
 #include "app/window/log/LogModel.h"
-#include "app/window/log/LogView.h"
 #include "support/LargeLog.h"
 #include "support/Measurements.h"
 #include "support/Processes.h"
 #include "support/ScratchFolder.h"
+#include "support/ShownLog.h"
+#include "support/TimedLines.h"
 
 #include <QApplication>
 #include <QElapsedTimer>
-#include <QEventLoop>
 #include <QFile>
 #include <QStorageInfo>
-#include <QTimer>
 
 #include <algorithm>
 #include <array>
 #include <chrono>
-#include <cmath>
 #include <cstdio>
 #include <cstring>
-#include <fcntl.h>
-#include <functional>
-#include <malloc.h>
 #include <memory>
-#include <mutex>
-#include <random>
 #include <thread>
 #include <unistd.h>
 
@@ -51,48 +44,10 @@ QString SizeText(qint64 bytes)
                             : QStringLiteral("%1 MiB").arg(bytes / MiB);
 }
 
-double FirstNumber(QByteArray const& text, char const* key)
-{
-    const int start = text.indexOf(key) + int(qstrlen(key));
-    return text.mid(start, 20).trimmed().split(' ').first().toDouble();
-}
-
-double OwnMemoryInKiB()
-{
-    ::malloc_trim(0); // memory that was already freed is not the view's
-    return FirstNumber(ReadAll(QStringLiteral("/proc/self/status")), "VmRSS:");
-}
-
-int OpenToAppend(QString const& fileName)
-{
-    const int file = ::open(QFile::encodeName(fileName), O_WRONLY | O_APPEND | O_CLOEXEC);
-    Require(file >= 0, fileName + QStringLiteral(" cannot be written"));
-    return file;
-}
-
-void Write(int file, QByteArray const& text)
-{
-    Require(::write(file, text.constData(), size_t(text.size())) == text.size(),
-            QStringLiteral("the log cannot be written"));
-}
-
-void RunEventLoopFor(int milliseconds)
-{
-    QEventLoop loop;
-    QTimer::singleShot(milliseconds, &loop, &QEventLoop::quit);
-    loop.exec();
-}
-
-void RunEventLoopUntil(std::function<bool()> const& isDone)
-{
-    while (!isDone())
-        QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents);
-}
-
 // A growing log, in a process of its own: bench_large_log --append FILE PER-SECOND SECONDS LINES
 int AppendLines(QStringList const& arguments)
 {
-    const int file = OpenToAppend(arguments[2]);
+    const AppendedLog file(arguments[2]);
     const int perSecond = arguments[3].toInt();
     const std::chrono::microseconds pause(std::max(1000, 1000000 / perSecond));
     const int pauses = int(arguments[4].toInt() * 1000000LL / pause.count());
@@ -102,129 +57,12 @@ int AppendLines(QStringList const& arguments)
         QByteArray text;
         for (int line = 0; line < std::max(1, perSecond / 1000); ++line)
             log.Append(text);
-        Write(file, text);
+        file.Append(text);
         next += pause;
         std::this_thread::sleep_until(next);
     }
-    ::close(file);
     return 0;
 }
-
-// Writes a line now and then, and takes the time until each of them has arrived somewhere.
-class TimedLines
-{
-public:
-    TimedLines(QString const& fileName, qint64 lines, int count) : m_count(count)
-    {
-        m_thread = std::thread([this, fileName, lines, count] {
-            const int file = OpenToAppend(fileName);
-            LargeLog log(lines);
-            std::mt19937 random{20260303};
-            for (int i = 0; i < count; ++i) {
-                std::this_thread::sleep_for(std::chrono::milliseconds(20 + random() % 40));
-                QByteArray text;
-                log.Append(text);
-                const std::lock_guard<std::mutex> lock(m_mutex);
-                m_written.push_back(std::chrono::steady_clock::now());
-                Write(file, text);
-            }
-            ::close(file);
-        });
-    }
-    ~TimedLines() { m_thread.join(); }
-    TimedLines(TimedLines const&) = delete;
-    TimedLines& operator=(TimedLines const&) = delete;
-
-    // So many lines have arrived by now.
-    void NoteArrived(size_t lines)
-    {
-        const auto now = std::chrono::steady_clock::now();
-        const std::lock_guard<std::mutex> lock(m_mutex);
-        for (size_t i = m_times.size(); i < std::min(lines, m_written.size()); ++i)
-            m_times.push_back(std::chrono::duration<double, std::nano>(now - m_written[i]).count());
-    }
-
-    bool isOver() const { return m_times.size() >= size_t(m_count); }
-    std::vector<double> const& times() const { return m_times; }
-
-private:
-    int m_count;
-    std::mutex m_mutex;
-    std::vector<std::chrono::steady_clock::time_point> m_written;
-    std::vector<double> m_times;
-    std::thread m_thread; // the last one: it uses the others
-};
-
-double Percentile(std::vector<double>& times, double share)
-{
-    std::sort(times.begin(), times.end());
-    const double rank = std::ceil(share * double(times.size()));
-    return times[std::max<size_t>(1, size_t(rank)) - 1];
-}
-
-// The view of a log, and what is known about its painting.
-class ShownLog : public LogView
-{
-public:
-    explicit ShownLog(LogModel* model) : LogView(model), m_model(model)
-    {
-        resize(1080, 680);
-        show();
-        bool isPainted = false;
-        m_afterPaint = [&] {
-            isPainted = true;
-        };
-        RunEventLoopUntil([&] { return isPainted; });
-        m_afterPaint = nullptr;
-    }
-
-    void Open(QString const& fileName)
-    {
-        m_model->Open(fileName, LogLineParser(), false);
-        RunEventLoopUntil([&] { return !m_model->isReading(); });
-    }
-
-    // The time until rows fill the view.
-    double OpenToFirstPage(QString const& fileName)
-    {
-        double time = 0;
-        QElapsedTimer timer;
-        m_afterPaint = [&] {
-            if (time == 0 && rowAt(viewport()->height() - 1) >= 0)
-                time = double(timer.nsecsElapsed());
-        };
-        timer.start();
-        m_model->Open(fileName, LogLineParser(), false);
-        RunEventLoopUntil([&] { return time > 0; });
-        m_afterPaint = nullptr;
-        return time;
-    }
-
-    void TimeLines(TimedLines& lines)
-    {
-        const int before = m_model->rowCount();
-        m_afterPaint = [&] {
-            const int rows = m_model->rowCount();
-            const QRect last = visualRect(m_model->index(rows - 1, 0));
-            if (viewport()->rect().intersects(last))
-                lines.NoteArrived(size_t(rows - before));
-        };
-        RunEventLoopUntil([&] { return lines.isOver(); });
-        m_afterPaint = nullptr;
-    }
-
-protected:
-    void paintEvent(QPaintEvent* event) override
-    {
-        LogView::paintEvent(event);
-        if (m_afterPaint)
-            m_afterPaint();
-    }
-
-private:
-    LogModel* m_model;
-    std::function<void()> m_afterPaint;
-};
 
 // Opens a file in a process of its own, whose memory is not what another file has left:
 // bench_large_log --open FILE SHORT-FILE
@@ -236,11 +74,11 @@ int OpenOnce(QStringList const& arguments)
     }
     LogModel model;
     ShownLog view(&model);
-    const double memoryBefore = OwnMemoryInKiB();
+    const double memoryBefore = OwnMemoryKiB();
     const double before = OwnProcessorTime();
     view.Open(arguments[2]);
     const double time = OwnProcessorTime() - before;
-    std::printf("%d %.0f %.0f\n", model.rowCount(), time, OwnMemoryInKiB() - memoryBefore);
+    std::printf("%d %.0f %.0f\n", model.rowCount(), time, OwnMemoryKiB() - memoryBefore);
     return 0;
 }
 
@@ -497,7 +335,7 @@ private:
         {
             const RunningProcess tail({"tail", "-n", "0", "-f", m_log}, RunningProcess::ToPipe);
             tail.WaitUntilIdle();
-            TimedLines lines(m_log, m_lines, count);
+            TimedLines lines({m_log}, m_lines, count);
             std::array<char, 4096> buffer;
             size_t seen = 0;
             while (!lines.isOver()) {
@@ -506,25 +344,16 @@ private:
                 seen += size_t(std::count(buffer.begin(), buffer.begin() + size, '\n'));
                 lines.NoteArrived(seen);
             }
-            keepTimes(group, "tail -f, until it is in a pipe", lines.times());
+            m_measurements.addPercentiles(group, "tail -f, until it is in a pipe", lines.times());
         }
         restoreLog();
         LogModel model;
         ShownLog view(&model);
         view.Open(m_log);
-        TimedLines lines(m_log, m_lines, count);
+        TimedLines lines({m_log}, m_lines, count);
         view.TimeLines(lines);
-        keepTimes(group, "velocor, until it is painted", lines.times());
+        m_measurements.addPercentiles(group, "velocor, until it is painted", lines.times());
         restoreLog();
-    }
-
-    void keepTimes(QString const& group, char const* name, std::vector<double> times)
-    {
-        m_measurements.addRow(group, name,
-                              {{"p50", Percentile(times, 0.5), "ns"},
-                               {"p99", Percentile(times, 0.99), "ns"},
-                               {"p99.9", Percentile(times, 0.999), "ns"},
-                               {"worst", Percentile(times, 1), "ns"}});
     }
 
     // 10 GiB if there is room for the file and the view; otherwise as much as there is room for.
@@ -532,8 +361,7 @@ private:
     {
         if (m_quick)
             return m_size;
-        const QByteArray text = ReadAll(QStringLiteral("/proc/meminfo"));
-        const auto memory = qint64(FirstNumber(text, "MemAvailable:") * 1024);
+        const auto memory = qint64(AvailableMemoryKiB() * 1024);
         const qint64 room = QStorageInfo(m_folder.path()).bytesAvailable();
         const qint64 size = std::min(memory / 2, room * 3 / 4) / GiB * GiB;
         return std::max(GiB, std::min(10 * GiB, size));

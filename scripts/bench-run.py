@@ -71,6 +71,12 @@ LARGE_SETTINGS = [
 ]
 FOLLOWING = "following 50 lines a second, share of a processor"
 WRITTEN = "a line written until it is seen"
+FOLLOWED = "10 programs followed, a line written until it is seen"
+SEVERAL_FILES = [
+    "20 files as one, open",
+    "20 files as one, find a text",
+    "20 files as one, filter by text",
+]
 LONGEST_TURN = "longest turn of the event loop, 10,000 lines a second"
 PARSES = ["parse generated document", "parse shared MIME database"]
 
@@ -158,6 +164,17 @@ SECTIONS = {
             Limit([GIANT_LOG + WRITTEN], "velocor", 60e6, "ns", "p99.9"),
             Limit(["..., first page"], "velocor", 50e6, quick=True),
             Limit(["..., " + LONGEST_TURN], "velocor", 16e6, quick=True),
+        ],
+    ),
+    "history": Section(
+        "Several logs as one",
+        [("bench_history", "display")],
+        (5, 2),
+        goals=[
+            Goal(SEVERAL_FILES, "20 files", 1.2, "one file"),
+            Limit(["20 files as one, memory a line"], "20 files", 6, "bytes"),
+            Limit(["strip of time over 20 files as one"], "a change of zoom", 30e6, "ns", "worst"),
+            Limit([FOLLOWED], "velocor", 100e6, "ns", "p99"),
         ],
     ),
     "terminal": Section(

@@ -9,11 +9,20 @@
 #include <QJsonDocument>
 #include <QJsonObject>
 
+#include <algorithm>
+#include <cmath>
+
 namespace {
 
 QString NameOf(QString const& group, char const* contestant)
 {
     return group + '|' + QLatin1String(contestant);
+}
+
+double Percentile(std::vector<double> const& sorted, double share)
+{
+    const double rank = std::ceil(share * double(sorted.size()));
+    return sorted[std::max<size_t>(1, size_t(rank)) - 1];
 }
 
 } // namespace
@@ -45,6 +54,17 @@ void Measurements::addRow(QString const& group, char const* contestant,
                                       {"run_type", "row"},
                                       {"threads", 1},
                                       {"columns", columns}});
+}
+
+void Measurements::addPercentiles(QString const& group, char const* contestant,
+                                  std::vector<double> times)
+{
+    std::sort(times.begin(), times.end());
+    addRow(group, contestant,
+           {{"p50", Percentile(times, 0.5), "ns"},
+            {"p99", Percentile(times, 0.99), "ns"},
+            {"p99.9", Percentile(times, 0.999), "ns"},
+            {"worst", times.back(), "ns"}});
 }
 
 void Measurements::save(QString const& fileName) const

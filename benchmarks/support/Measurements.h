@@ -32,6 +32,10 @@ public:
     /// have the same columns.
     void addRow(QString const& group, char const* contestant, std::vector<Figure> const& figures);
 
+    /// The same for times in nanoseconds, of which those are shown that shares of them did not
+    /// exceed.
+    void addPercentiles(QString const& group, char const* contestant, std::vector<double> times);
+
     /// Writes all of them; exits if that fails.
     void save(QString const& fileName) const;
 

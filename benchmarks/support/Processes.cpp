@@ -13,6 +13,7 @@
 #include <csignal>
 #include <ctime>
 #include <fcntl.h>
+#include <malloc.h>
 #include <spawn.h>
 #include <sys/resource.h>
 #include <sys/wait.h>
@@ -78,6 +79,17 @@ double OwnProcessorTime()
     rusage usage = {};
     ::getrusage(RUSAGE_SELF, &usage);
     return TimeOf(usage);
+}
+
+double OwnMemoryKiB()
+{
+    ::malloc_trim(0); // memory that was already freed is not in use
+    return ValueOf(QStringLiteral("/proc/self/status"), "VmRSS");
+}
+
+double AvailableMemoryKiB()
+{
+    return ValueOf(QStringLiteral("/proc/meminfo"), "MemAvailable");
 }
 
 ProcessCost RunToEnd(QStringList const& command)

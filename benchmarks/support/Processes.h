@@ -12,6 +12,12 @@
 /// The processor time of this process so far, in nanoseconds.
 double OwnProcessorTime();
 
+/// The memory of this process in KiB, without what has already been freed.
+double OwnMemoryKiB();
+
+/// The memory that is free on this machine, or could be, in KiB.
+double AvailableMemoryKiB();
+
 /// What a process needed from its start to its end.
 struct ProcessCost
 {
