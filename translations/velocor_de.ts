@@ -3742,6 +3742,10 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <source>This file is too large to be shown as settings</source>
         <translation>Diese Datei ist zu groß, um als Einstellungen gezeigt zu werden</translation>
     </message>
+    <message>
+        <source>Edit Text</source>
+        <translation>Text bearbeiten</translation>
+    </message>
 </context>
 <context>
     <name>Velocor::SettingsFindBar</name>

@@ -3742,6 +3742,10 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <source>This file is too large to be shown as settings</source>
         <translation>Ce fichier est trop volumineux pour être affiché comme réglages</translation>
     </message>
+    <message>
+        <source>Edit Text</source>
+        <translation>Modifier le texte</translation>
+    </message>
 </context>
 <context>
     <name>Velocor::SettingsFindBar</name>

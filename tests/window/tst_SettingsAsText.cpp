@@ -180,12 +180,14 @@ void tst_SettingsAsText::undoneAndRedone()
     const ShownText shown(Broken);
     QVERIFY(!Action(*shown.window, "Undo")->isEnabled());
     shown.mend();
-    QVERIFY(Action(*shown.window, "Undo")->isEnabled());
+    QVERIFY(Action(*shown.window, "Undo Edit Text")->isEnabled());
+    QVERIFY(!Action(*shown.window, "Redo")->isEnabled());
     shown.press(Qt::Key_Z, Qt::ControlModifier);
     QCOMPARE(shown.page->bytes(), Broken);
     QVERIFY(!shown.editor->isModified());
+    QVERIFY(!Action(*shown.window, "Undo")->isEnabled());
     Child<QPushButton>(shown.editor, "Dismiss notice")->setFocus();
-    Action(*shown.window, "Redo")->trigger();
+    Action(*shown.window, "Redo Edit Text")->trigger();
     QCOMPARE(shown.page->bytes(), Settings);
 }
 

@@ -460,12 +460,16 @@ bool SettingsEditor::CanRedo() const
 
 QString SettingsEditor::UndoText() const
 {
-    return ShowsTree() ? m_commands.undoStack()->undoText() : QString();
+    if (ShowsTree())
+        return m_commands.undoStack()->undoText();
+    return m_text->canUndo() ? tr("Edit Text") : QString();
 }
 
 QString SettingsEditor::RedoText() const
 {
-    return ShowsTree() ? m_commands.undoStack()->redoText() : QString();
+    if (ShowsTree())
+        return m_commands.undoStack()->redoText();
+    return m_text->canRedo() ? tr("Edit Text") : QString();
 }
 
 void SettingsEditor::Undo()
