@@ -530,7 +530,7 @@ void tst_SettingsAsText::keysAreInTheMenu()
     QStringList entries;
     const QList<QAction*> actions = menu->actions();
     for (QAction const* action : actions) {
-        entries.append(ActionText(action));
+        entries.append(ActionText(action) + '\t' + action->shortcut().toString());
         QVERIFY(!action->statusTip().isEmpty());
     }
     QCOMPARE(entries, QStringList({"Go to Error\tF8", "Show as Settings\tCtrl+T", "Find\tCtrl+F",

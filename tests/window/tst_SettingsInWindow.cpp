@@ -825,7 +825,7 @@ void tst_SettingsInWindow::commandsAreInTheMenus()
     QString letters;
     const QList<QAction*> actions = menu->actions();
     for (QAction const* action : actions) {
-        entries.append(ActionText(action));
+        entries.append(ActionText(action) + '\t' + action->shortcut().toString());
         QVERIFY(!action->statusTip().isEmpty());
         letters += action->text().at(action->text().indexOf('&') + 1).toLower();
     }

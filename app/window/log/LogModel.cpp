@@ -575,6 +575,27 @@ int LogModel::columnCount(QModelIndex const& parent) const
     return parent.isValid() ? 0 : static_cast<int>(ColumnCount);
 }
 
+QString LogModel::accessibleText(int row, int column) const
+{
+    if (IsFoldable(row)) {
+        const QString run = RunText(runOf(row), ProgramLogs::NameOf(m_path));
+        return column > 0 ? QString() : IsFolded(row) ? tr("%1, folded").arg(run) : run;
+    }
+    return column == TimeColumn && m_marks.contains(LineStart(row))
+               ? tr("Marked: %1").arg(cellText(row, TimeColumn))
+               : cellText(row, column);
+}
+
+// Of a row that is no heading.
+QVariant LogModel::icon(int row, int column) const
+{
+    if (column == SeverityColumn && entry(row).isEntry)
+        return SeverityIcons::Icon(entry(row).severity, QGuiApplication::palette());
+    if (column == ProgramColumn && m_state.family)
+        return ProgramColors::Icon(LogOf(row), QGuiApplication::palette());
+    return QVariant();
+}
+
 QVariant LogModel::data(QModelIndex const& index, int role) const
 {
     const int row = index.row();
@@ -585,19 +606,9 @@ QVariant LogModel::data(QModelIndex const& index, int role) const
     case Qt::DisplayRole:
         return cellText(row, index.column());
     case Qt::AccessibleTextRole:
-        if (IsFoldable(row)) {
-            const QString run = RunText(runOf(row), ProgramLogs::NameOf(m_path));
-            return index.column() > 0 ? QString() : IsFolded(row) ? tr("%1, folded").arg(run) : run;
-        }
-        return index.column() == TimeColumn && m_marks.contains(LineStart(row))
-                   ? tr("Marked: %1").arg(cellText(row, TimeColumn))
-                   : cellText(row, index.column());
+        return accessibleText(row, index.column());
     case Qt::DecorationRole:
-        if (index.column() == SeverityColumn && !isHeading(row) && entry(row).isEntry)
-            return SeverityIcons::Icon(entry(row).severity, QGuiApplication::palette());
-        if (index.column() == ProgramColumn && m_state.family && !isHeading(row))
-            return ProgramColors::Icon(LogOf(row), QGuiApplication::palette());
-        return QVariant();
+        return isHeading(row) ? QVariant() : icon(row, index.column());
     case Qt::ToolTipRole:
         return PlainToolTip(LeftToRight(toolTip(row, index.column())));
     case Qt::TextAlignmentRole:

@@ -236,6 +236,8 @@ private:
     QString headingText(int row) const;
     QString cellText(int row, int column) const;
     QString toolTip(int row, int column) const;
+    QString accessibleText(int row, int column) const;
+    QVariant icon(int row, int column) const;
 
     QThread m_thread;
     FamilyScanner* m_scanner = nullptr;

@@ -103,9 +103,10 @@ void SettingsTextPage::makeActions()
 {
     const QVector<SettingsTextCommand> all = AllCommands();
     for (SettingsTextCommand const& command : all) {
-        // Shown, but not grabbed: keyPressEvent() handles it.
-        const QString key = command.key.toString(QKeySequence::NativeText);
-        auto* action = new QAction(command.text + QLatin1Char('\t') + key, this);
+        // For menus to show. The page never has the focus, so keyPressEvent() handles it.
+        auto* action = new QAction(command.text, this);
+        action->setShortcut(command.key);
+        action->setShortcutContext(Qt::WidgetShortcut);
         action->setStatusTip(command.statusTip);
         connect(action, &QAction::triggered, this, command.work);
         m_actions.append(action);
@@ -115,13 +116,12 @@ void SettingsTextPage::makeActions()
 QPushButton* SettingsTextPage::makeCommandButton(int command)
 {
     QAction const* action = m_actions.at(command);
-    const QStringList parts = action->text().split(QLatin1Char('\t'));
-    auto* button = new QPushButton(parts.first());
+    auto* button = new QPushButton(action->text());
     button->setAutoDefault(false);
     button->setMinimumWidth(button->sizeHint().width() +
                             2 * button->fontMetrics().averageCharWidth());
-    button->setToolTip(
-        PlainToolTip(QStringLiteral("%1 (%2)").arg(action->statusTip(), parts.last())));
+    const QString key = action->shortcut().toString(QKeySequence::NativeText);
+    button->setToolTip(PlainToolTip(QStringLiteral("%1 (%2)").arg(action->statusTip(), key)));
     connect(button, &QPushButton::clicked, action, &QAction::trigger);
     connect(action, &QAction::changed, button,
             [button, action] { button->setEnabled(action->isEnabled()); });

@@ -100,9 +100,11 @@ void SettingsTree::makeActions()
 {
     const QVector<SettingsCommand> all = AllCommands();
     for (SettingsCommand const& command : all) {
-        // Shown, but not grabbed: keyPressEvent() handles it.
-        const QString key = command.keys.first().toString(QKeySequence::NativeText);
-        auto* action = new QAction(command.text + QLatin1Char('\t') + key, this);
+        // Only while the tree itself has the focus: it would take the key from fields. Others,
+        // and what a field does not use, are up to keyPressEvent().
+        auto* action = new QAction(command.text, this);
+        action->setShortcut(command.keys.first());
+        action->setShortcutContext(Qt::WidgetShortcut);
         action->setStatusTip(command.statusTip);
         connect(action, &QAction::triggered, this, command.work);
         m_actions.append(action);
