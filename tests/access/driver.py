@@ -341,8 +341,7 @@ class Program:
             entries = part.children()
             if entries and entries[0].role == "popup menu":
                 entries = entries[0].children()
-            # Some entries show a shortcut, which Qt takes for a part of the name.
-            part = next((e for e in entries if e.name.split("\t")[0] == name), None)
+            part = next((e for e in entries if e.name == name), None)
             if part is None:
                 raise Failed(f"no {name!r} among {[entry.name for entry in entries]}")
         return part

@@ -15,6 +15,7 @@ from driver import ENABLED, LARGE_ROLES, Failed, desktop, in_own_session, runnin
 from tasks import LOG, SETTINGS
 
 CONTROLS = {
+    "button menu",
     "check box",
     "combo box",
     "label",
@@ -52,6 +53,8 @@ def problems(part, where):
         yield f"unknown role: {what}"
     if role in CONTROLS and not name:
         yield f"no name: {what}"
+    if "\t" in name:
+        yield f"a key in the name: {what}"
     if role in TARGETS and part.has(ENABLED):
         _, _, width, height = part.rectangle()
         if 0 < min(width, height) < LEAST:
@@ -81,6 +84,9 @@ def main():
         run.write("Filter by text", "message")
         run.find("text", "Terms that lines also contain")
         found += look(run, "log")
+        run.menu("View", "Whole Family, by Time")
+        run.find("button menu", "Programs: 2 of 2")
+        found += look(run, "family")
         for dialog in DIALOGS:
             run.menu(*dialog)
             wait(dialog[1], lambda: len(run.windows()) > 1)
