@@ -30,12 +30,12 @@ packages_of() {
     Darwin/lint) echo clang-format@14 llvm@14 shellcheck ;;
     Darwin/test | Darwin/wayland | Darwin/package | Darwin/package-test | Darwin/consumers) ;;
     */build) echo g++ cmake ninja-build qtbase5-dev qttools5-dev librapidxml-dev ;;
-    */qt6) echo qt6-base-dev qt6-5compat-dev qt6-tools-dev qt6-l10n-tools ;;
+    */qt6) echo qt6-base-dev qt6-5compat-dev qt6-tools-dev qt6-l10n-tools qt6-translations-l10n ;;
     */wayland) echo qtwayland5 ;;
     */test)
         echo xvfb xauth shared-mime-info pkg-config valgrind doxygen locales-all dpkg-dev \
             at-spi2-core dbus dbus-daemon python3-gi openbox xdotool \
-            desktop-file-utils libspdlog-dev
+            desktop-file-utils libspdlog-dev qttranslations5-l10n
         ;;
     */bench)
         echo python3 xvfb xauth shared-mime-info libbenchmark-dev libspdlog-dev liblog4cplus-dev \

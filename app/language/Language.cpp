@@ -91,9 +91,12 @@ void Language::Use(QString const& code)
     qDeleteAll(QCoreApplication::instance()->findChildren<QTranslator*>(ObjectName()));
     // The last one installed is asked first. English has the plural forms of what the others lack.
     Install(QLocale(QStringLiteral("en")), QStringLiteral("velocor"), Catalogs());
-    Install(locale, QStringLiteral("qtbase"), TorkQt::TranslationsFolder());
     const bool isTranslated = locale.language() != QLocale::English &&
                               Install(locale, QStringLiteral("velocor"), Catalogs());
+    // Not without ours: one of a language that is written from right to left would mirror a window
+    // with English texts.
+    if (isTranslated)
+        Install(locale, QStringLiteral("qtbase"), TorkQt::TranslationsFolder());
     UsedCode() =
         isTranslated ? locale.name().section(QLatin1Char('_'), 0, 0) : QStringLiteral("en");
 }

@@ -24,9 +24,9 @@ struct Language
     static QString Used();
 
     /// Makes the application use a language: its texts, and Qt's own if Qt's catalog is installed.
-    /// What no catalog has stays English. It replaces the language that was used before; texts that
-    /// were translated by then stay as they are. Numbers and dates are always those of the system.
-    /// To be called from the GUI thread.
+    /// What no catalog has stays English; a language without a catalog of ours, all of it. It
+    /// replaces the language that was used before; texts that were translated by then stay as they
+    /// are. Numbers and dates are always those of the system. To be called from the GUI thread.
     ///
     /// @param code  a code of All(); anything else selects the system's language
     static void Use(QString const& code);

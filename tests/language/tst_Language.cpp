@@ -32,6 +32,7 @@ private slots:
     void texts_data();
     void texts();
     void textsOfQt();
+    void languageThatIsMissing();
 };
 
 void tst_Language::all()
@@ -61,7 +62,7 @@ void tst_Language::texts_data()
     row("English", "en", "en", "Green", "0 lines", "1 line", "2 lines");
     row("German", "de", "de", "Gr\xC3\xBCn", "0 Zeilen", "1 Zeile", "2 Zeilen");
     row("French has no plural of zero", "fr", "fr", "Vert", "0 ligne", "1 ligne", "2 lignes");
-    // The tests run in the locales C, de_DE and fr_FR.
+    // The tests run in the locales C, ar_TN, de_DE and fr_FR.
     const QLocale::Language system = QLocale::system().language();
     for (char const* code : {"", "xx", "tlh_KX", "de\n", "../de"}) {
         const QByteArray name = QByteArray("language of the system for \"") + code + "\"";
@@ -90,14 +91,25 @@ void tst_Language::texts()
 
 void tst_Language::textsOfQt()
 {
-    if (!QDir(TorkQt::TranslationsFolder()).exists("qtbase_de.qm"))
-        QSKIP("Qt's own translations are not installed");
+    QVERIFY(QDir(TorkQt::TranslationsFolder()).exists("qtbase_de.qm"));
     Language::Use("de");
     QCOMPARE(Translated("QPlatformTheme", "Cancel"), QString("Abbrechen"));
     Language::Use("fr");
     QCOMPARE(Translated("QPlatformTheme", "Cancel"), QString("Annuler"));
     Language::Use("en");
     QCOMPARE(Translated("QPlatformTheme", "Cancel"), QString("Cancel"));
+}
+
+// Of it, Qt has texts, and a direction.
+void tst_Language::languageThatIsMissing()
+{
+    if (QLocale::system().language() != QLocale::Arabic)
+        QSKIP("for the run in Arabic");
+    QVERIFY(QDir(TorkQt::TranslationsFolder()).exists("qtbase_ar.qm"));
+    Language::Use("de");
+    Language::Use(QString());
+    QCOMPARE(Translated("QPlatformTheme", "Cancel"), QString("Cancel"));
+    QCOMPARE(Translated("QGuiApplication", "QT_LAYOUT_DIRECTION"), QString("QT_LAYOUT_DIRECTION"));
 }
 
 QTEST_GUILESS_MAIN(tst_Language)
