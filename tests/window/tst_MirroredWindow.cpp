@@ -17,6 +17,7 @@
 #include "app/window/widgets/PlainText.h"
 
 #include <QComboBox>
+#include <QGlyphRun>
 #include <QHeaderView>
 #include <QLabel>
 #include <QMenuBar>
@@ -88,7 +89,11 @@ bool readsLeftToRight(QString const& text, QString const& part)
     layout.endLayout();
     qreal last = -1;
     for (int i = start; i < start + part.size(); ++i) {
-        const qreal left = line.cursorToX(i);
+        // Not cursorToX(), whose place between two directions depends on the version of Qt.
+        const QList<QGlyphRun> runs = line.glyphRuns(i, 1);
+        if (runs.size() != 1 || runs[0].positions().isEmpty())
+            return false;
+        const qreal left = runs[0].positions().at(0).x();
         if (left <= last)
             return false;
         last = left;
