@@ -34,7 +34,7 @@ packages_of() {
     */wayland) echo qtwayland5 ;;
     */test)
         echo xvfb xauth shared-mime-info pkg-config valgrind doxygen locales-all dpkg-dev \
-            at-spi2-core dbus dbus-daemon python3-gi openbox xdotool \
+            at-spi2-core dbus dbus-daemon python3-gi openbox orca xdotool \
             desktop-file-utils libspdlog-dev qttranslations5-l10n
         ;;
     */bench)

@@ -994,6 +994,13 @@ Erstellt %1
         <source>%1 – %2</source>
         <translation>%1 – %2</translation>
     </message>
+    <message numerus="yes">
+        <source>%Ln new problem(s): %1</source>
+        <translation>
+            <numerusform>%Ln neues Problem: %1</numerusform>
+            <numerusform>%Ln neue Probleme: %1</numerusform>
+        </translation>
+    </message>
 </context>
 <context>
     <name>Velocor::DifferenceDialog</name>

@@ -36,6 +36,16 @@
     </message>
 </context>
 <context>
+    <name>Velocor::CurrentTab</name>
+    <message numerus="yes">
+        <source>%Ln new problem(s): %1</source>
+        <translation>
+            <numerusform>%Ln new problem: %1</numerusform>
+            <numerusform>%Ln new problems: %1</numerusform>
+        </translation>
+    </message>
+</context>
+<context>
     <name>Velocor::DifferenceDialog</name>
     <message numerus="yes">
         <source>%Ln difference(s)</source>

@@ -994,6 +994,13 @@ Créé le %1
         <source>%1 – %2</source>
         <translation>%1 – %2</translation>
     </message>
+    <message numerus="yes">
+        <source>%Ln new problem(s): %1</source>
+        <translation>
+            <numerusform>%Ln nouveau problème&#xa0;: %1</numerusform>
+            <numerusform>%Ln nouveaux problèmes&#xa0;: %1</numerusform>
+        </translation>
+    </message>
 </context>
 <context>
     <name>Velocor::DifferenceDialog</name>

@@ -74,6 +74,8 @@ QAccessibleInterface* CreatePart(QString const& className, QObject* object)
         auto* label = qobject_cast<QLabel*>(object);
         return label && !label->accessibleName().isEmpty() ? new NamedLabel(label) : nullptr;
     }
+    if (className == QLatin1String("Velocor::Announcer"))
+        return new QAccessibleWidget(qobject_cast<QWidget*>(object), QAccessible::Notification);
     if (className == QLatin1String("QSplitterHandle")) {
         auto* handle = qobject_cast<QSplitterHandle*>(object);
         return handle ? new QAccessibleWidget(handle, QAccessible::Separator,

@@ -6,8 +6,10 @@
 #include "app/window/ApplicationProperty.h"
 #include "app/window/FileTabs.h"
 #include "app/window/MainMenus.h"
+#include "app/window/log/LogModel.h"
 #include "app/window/log/LogPanel.h"
 #include "app/window/settings/SettingsEditor.h"
+#include "app/window/widgets/Announcer.h"
 #include "app/window/widgets/ElidedLabel.h"
 #include "app/window/widgets/PlainText.h"
 
@@ -17,11 +19,23 @@
 
 namespace Velocor {
 
+namespace {
+
+// So that one burst of problems is one announcement.
+constexpr int NewsInterval = 1000; // milliseconds
+
+constexpr int MaximumNewsLength = 200;
+
+} // namespace
+
 CurrentTab::CurrentTab(FileTabs* tabs, MenuActions const& actions, ElidedLabel* summary,
                        QWidget* window)
     : m_tabs(tabs), m_actions(actions), m_summary(summary), m_window(window)
 {
     connect(m_tabs, &FileTabs::stateChanged, this, &CurrentTab::Update);
+    m_news.setSingleShot(true);
+    m_news.setInterval(NewsInterval);
+    connect(&m_news, &QTimer::timeout, this, &CurrentTab::announceProblems);
 }
 
 void CurrentTab::Update()
@@ -37,6 +51,35 @@ void CurrentTab::Update()
     m_summary->setToolTip(PlainToolTip(log ? QString() : LeftToRight(path)));
     if (log)
         updateSwitches(log);
+    countProblems(log);
+}
+
+// Those that the log got since the last time, not those of another tab, filter or file.
+void CurrentTab::countProblems(LogPanel const* log)
+{
+    HistoryUpdate const* state = log ? &log->model()->state() : nullptr;
+    const size_t problems = state ? state->rows->problems() : 0;
+    const bool isSame = state && log == m_log && !state->isReset && !state->isFolding;
+    if (!isSame)
+        m_newProblems = 0;
+    else if (problems > m_problems)
+        m_newProblems += problems - m_problems;
+    m_log = log;
+    m_problems = problems;
+    if (m_newProblems > 0 && !m_news.isActive())
+        m_news.start();
+}
+
+void CurrentTab::announceProblems()
+{
+    if (!m_log || m_newProblems == 0)
+        return;
+    LogModel const* model = m_log->model();
+    const int row = model->FindProblem(model->rowCount(), -1);
+    const QString last = row < 0 ? QString() : model->MessageText(row);
+    Announcer::Say(m_window, tr("%Ln new problem(s): %1", nullptr, static_cast<int>(m_newProblems))
+                                 .arg(Shortened(last, MaximumNewsLength)));
+    m_newProblems = 0;
 }
 
 void CurrentTab::updateEditing()

@@ -4,6 +4,8 @@
 #pragma once
 
 #include <QObject>
+#include <QPointer>
+#include <QTimer>
 
 class QWidget;
 
@@ -31,11 +33,17 @@ private:
     void updateEditing();
     void updateTitle();
     void updateSwitches(LogPanel const* log);
+    void countProblems(LogPanel const* log);
+    void announceProblems();
 
     FileTabs* m_tabs;
     MenuActions const& m_actions;
     ElidedLabel* m_summary;
     QWidget* m_window;
+    QPointer<LogPanel const> m_log; // whose problems are counted
+    size_t m_problems = 0;
+    size_t m_newProblems = 0; // not announced yet
+    QTimer m_news;
 };
 
 } // namespace Velocor

@@ -4,15 +4,25 @@
 #include "app/window/log/FindControl.h"
 
 #include "app/window/log/LogFindBar.h"
+#include "app/window/log/LogModel.h"
 #include "app/window/log/LogSearch.h"
 #include "app/window/log/LogView.h"
+#include "app/window/widgets/Announcer.h"
+#include "app/window/widgets/PlainText.h"
 
 #include <QItemSelectionModel>
 
 namespace Velocor {
 
+namespace {
+
+constexpr int MaximumSaidLength = 200;
+
+} // namespace
+
 FindControl::FindControl(LogModel* model, LogView* view, LogFindBar* bar, QObject* parent)
-    : QObject(parent), m_view(view), m_bar(bar), m_search(new LogSearch(model, this))
+    : QObject(parent), m_model(model), m_view(view), m_bar(bar),
+      m_search(new LogSearch(model, this))
 {
     connect(bar, &LogFindBar::textChanged, this, &FindControl::applyText);
     connect(bar, &LogFindBar::stepRequested, this, &FindControl::Next);
@@ -57,14 +67,18 @@ void FindControl::goToFound()
         return;
     m_wantedStep = 0;
     if (answer == LogSearch::Answer::None) {
-        if (m_search->text().hasText() && m_search->slowLine() == 0)
+        if (m_search->text().hasText() && m_search->slowLine() == 0) {
             Q_EMIT messageReported(tr("Not found"));
+            Announcer::Say(m_view, tr("Not found"));
+        }
         return;
     }
     m_view->GoToRow(row);
     const QString wrapped =
         step > 0 ? tr("Continued from the top") : tr("Continued from the bottom");
     Q_EMIT messageReported(answer == LogSearch::Answer::Wrapped ? wrapped : QString());
+    if (!m_view->hasFocus()) // then, it is said as the current row
+        Announcer::Say(m_view, Shortened(m_model->MessageText(row), MaximumSaidLength));
 }
 
 void FindControl::showFound()

@@ -46,6 +46,7 @@ private:
     void showFound();
     QString countText() const;
 
+    LogModel* m_model;
     LogView* m_view;
     LogFindBar* m_bar;
     LogSearch* m_search;

@@ -3,6 +3,7 @@
 
 #include "app/window/settings/FieldHint.h"
 
+#include "app/window/widgets/Announcer.h"
 #include "app/window/widgets/BlendedColor.h"
 #include "app/window/widgets/PlainText.h"
 
@@ -39,7 +40,9 @@ FieldHint::FieldHint(QLineEdit* field) : QObject(field), m_field(field), m_label
 
 void FieldHint::Show(QString const& problem)
 {
-    m_field->setAccessibleDescription(problem); // is announced when it changes
+    m_field->setAccessibleDescription(problem);
+    if (problem != m_label->text())
+        Announcer::Say(m_field, problem);
     m_label->setText(problem);
     QPalette colors = QGuiApplication::palette();
     if (!problem.isEmpty())
