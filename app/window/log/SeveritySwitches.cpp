@@ -19,8 +19,8 @@ namespace Velocor {
 
 namespace {
 
-constexpr int Margin = 5; // pixels
-constexpr int Gap = 4;    // of Qt, between icon and text, in pixels
+constexpr int Margin = 5;  // pixels
+constexpr int IconGap = 4; // of Qt, between icon and text, in pixels
 
 // Qt replaces the shortcut of a button along with its text.
 void SetText(QToolButton* button, QString const& text)
@@ -73,7 +73,7 @@ void SeveritySwitches::updateWidths()
 {
     for (QToolButton* button : qAsConst(m_buttons)) {
         const int number = button->fontMetrics().boundingRect(QStringLiteral("888M")).width();
-        button->setFixedWidth(Margin + button->iconSize().width() + Gap + number + Margin);
+        button->setFixedWidth(Margin + button->iconSize().width() + IconGap + number + Margin);
     }
 }
 
