@@ -5,6 +5,7 @@
 
 #include "app/settingsfile/SettingsFileWriter.h"
 #include "app/settingsfile/SettingsText.h"
+#include "support/ProcessLimits.h"
 #include "support/TestFiles.h"
 
 #include <QTemporaryDir>
@@ -25,11 +26,15 @@ private slots:
     void textOfBytes_data();
     void textOfBytes();
     void anyBytesComeBack();
+    void firstLineBreak();
     void unwritable_data();
     void unwritable();
     void saveKeepsTheRights_data();
     void saveKeepsTheRights();
     void saveFollowsALink();
+    void saveReplacesOwnFiles();
+    void fullDiskOfAnotherUsersFile_data();
+    void fullDiskOfAnotherUsersFile();
     void savesOnlyToFiles();
 };
 
@@ -42,6 +47,7 @@ void tst_SettingsText::textOfBytes_data()
     QTest::newRow("Latin-1") << QByteArray("\xE4") << QString(QChar(0xe4));
     QTest::newRow("byte order mark") << QByteArray("\xEF\xBB\xBF<a>") << "<a>";
     QTest::newRow("carriage returns") << QByteArray("a\r\nb\r\n") << "a\nb\n";
+    QTest::newRow("one carriage return") << QByteArray("a\r\n") << "a\n";
     QTest::newRow("mixed line breaks") << QByteArray("a\r\nb\n") << "a\r\nb\n";
     QTest::newRow("nothing") << QByteArray() << "";
 }
@@ -76,6 +82,12 @@ void tst_SettingsText::anyBytesComeBack()
         QCOMPARE(file.ToBytes(file.text), bytes);
         QCOMPARE(file.FirstUnwritable(file.text), -1);
     }
+}
+
+// A file without line breaks gets those of this system.
+void tst_SettingsText::firstLineBreak()
+{
+    QCOMPARE(SettingsText::Of("a").ToBytes("a\nb"), QByteArray("a\nb"));
 }
 
 void tst_SettingsText::unwritable_data()
@@ -140,6 +152,46 @@ void tst_SettingsText::saveFollowsALink()
     QCOMPARE(TestFiles::read(path), QByteArray("new"));
     QVERIFY(SettingsFileWriter::SaveBytes(folder.filePath("created"), "new", &error));
     QCOMPARE(TestFiles::read(folder.filePath("created")), QByteArray("new"));
+}
+
+// So that a program that reads it meanwhile has all of the old one. Another user's is written over,
+// because a new file would not be theirs.
+void tst_SettingsText::saveReplacesOwnFiles()
+{
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("x.cfg");
+    QVERIFY(TestFiles::write(path, "old"));
+    QFile reader(path);
+    QVERIFY(reader.open(QIODevice::ReadOnly));
+    QString error;
+    QVERIFY(SettingsFileWriter::SaveBytes(path, "new", &error));
+    QCOMPARE(reader.readAll(), QByteArray("old"));
+    QCOMPARE(TestFiles::read(path), QByteArray("new"));
+}
+
+void tst_SettingsText::fullDiskOfAnotherUsersFile_data()
+{
+    QTest::addColumn<int>("size");
+    QTest::newRow("small file") << 1000;
+    QTest::newRow("large file") << 1000000;
+}
+
+void tst_SettingsText::fullDiskOfAnotherUsersFile()
+{
+    QFETCH(int, size);
+    if (geteuid() != 0)
+        QSKIP("only the administrator can give files away");
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("x.cfg");
+    QVERIFY(TestFiles::write(path, "old"));
+    QCOMPARE(chown(QFile::encodeName(path).constData(), 1234, 1235), 0);
+    if (!ProcessLimits::limitFileSize(100))
+        QSKIP("the size of files cannot be limited here");
+    QString error;
+    const bool isSaved = SettingsFileWriter::SaveBytes(path, QByteArray(size, 'x'), &error);
+    ProcessLimits::unlimitFileSize();
+    QVERIFY(!isSaved);
+    QVERIFY(!error.isEmpty());
 }
 
 void tst_SettingsText::savesOnlyToFiles()
