@@ -9,12 +9,16 @@
 #include "app/history/RunEnds.h"
 #include "app/history/RunMarkFile.h"
 #include "support/OpenFiles.h"
+#include "support/ProcessLimits.h"
 #include "support/TestFiles.h"
 
 #include <QTemporaryDir>
 #include <QtTest>
 
+#include <cstdlib>
 #include <fcntl.h>
+#include <sys/stat.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
 using namespace Velocor;
@@ -41,6 +45,11 @@ class tst_RunMark : public QObject
 private slots:
     void init();
     void oneLife();
+    void longLife();
+    void everybodyMayReadAndWrite();
+    void withoutStandardInput();
+    void endsOnceAtExit();
+    void markThatCannotBeWritten();
     void noLog();
     void noFolder();
     void secondMark();
@@ -88,6 +97,97 @@ void tst_RunMark::oneLife()
     QVERIFY(ends[0].end >= ends[0].start && ends[0].end <= HistoryTime::Now());
     const qint64 now = HistoryTime::Now();
     QVERIFY(RunMark::ProgramStart() <= now && RunMark::ProgramStart() > now - 3600 * 1000);
+}
+
+void tst_RunMark::longLife()
+{
+    const int before = openFileCount();
+    {
+        const RunMark mark(m_log);
+        mark.NoteLongLife();
+        const QString path = folder() + '/' + RunMarkFile::NamesIn(folder())[0];
+        QCOMPARE(TestFiles::read(path + ".long"), QByteArray(""));
+        QVERIFY(QFile::exists(path + ".long"));
+        QCOMPARE(openFileCount(), before + 1);
+    }
+    QVERIFY(!QFile::exists(folder()));
+}
+
+// As far as their umask allows; several users may share a log.
+void tst_RunMark::everybodyMayReadAndWrite()
+{
+    const mode_t mask = umask(0);
+    const auto rightsOf = [](QString const& path) {
+        struct stat status = {};
+        return stat(QFile::encodeName(path).constData(), &status) == 0 ? status.st_mode & 07777 : 0;
+    };
+    {
+        const RunMark mark(m_log);
+        mark.NoteLongLife();
+        const QString path = folder() + '/' + RunMarkFile::NamesIn(folder())[0];
+        QCOMPARE(rightsOf(path), mode_t(0666));
+        QCOMPARE(rightsOf(path + ".long"), mode_t(0666));
+    }
+    QCOMPARE(rightsOf(record()), mode_t(0666));
+    umask(mask);
+}
+
+// A program that was started without one may get its descriptor for any file.
+void tst_RunMark::withoutStandardInput()
+{
+    const int before = openFileCount();
+    const int input = ::dup(0);
+    ::close(0);
+    {
+        const RunMark mark(m_log);
+        QCOMPARE(RunMarkFile::NamesIn(folder()).size(), 1);
+        QVERIFY(::fcntl(0, F_GETFD) >= 0);
+    }
+    const bool isClosed = ::fcntl(0, F_GETFD) < 0;
+    QCOMPARE(RunEnds::Of(m_log).size(), size_t(1));
+    {
+        const int file = ::open("/dev/null", O_RDONLY); // so that the next ones get it
+        const RunMark mark(m_log);
+        ::close(file);
+        mark.NoteLongLife();
+    }
+    const bool isStillClosed = ::fcntl(0, F_GETFD) < 0;
+    ::dup2(input, 0);
+    ::close(input);
+    QVERIFY(isClosed && isStillClosed);
+    QCOMPARE(RunEnds::Of(m_log).size(), size_t(2));
+    QCOMPARE(openFileCount(), before);
+}
+
+// A mark may be deleted after all others were told to end.
+void tst_RunMark::endsOnceAtExit()
+{
+    const pid_t child = fork();
+    if (child == 0) {
+        static std::unique_ptr<RunMark> mark;
+        mark = std::make_unique<RunMark>(m_log);
+        std::exit(0);
+    }
+    int status = 0;
+    QCOMPARE(waitpid(child, &status, 0), child);
+    QCOMPARE(status, 0);
+    QCOMPARE(TestFiles::read(record()).count('\n'), 1);
+    QVERIFY(!QFile::exists(folder()));
+}
+
+void tst_RunMark::markThatCannotBeWritten()
+{
+    const int before = openFileCount();
+    if (!ProcessLimits::limitFileSize(10))
+        QSKIP("the size of files cannot be limited here");
+    {
+        const RunMark mark(m_log);
+        ProcessLimits::unlimitFileSize();
+        mark.NoteLongLife();
+        QCOMPARE(openFileCount(), before);
+        QCOMPARE(QDir(folder()).entryList(QDir::AllEntries | QDir::NoDotAndDotDot), QStringList());
+    }
+    QVERIFY(!QFile::exists(record()));
 }
 
 void tst_RunMark::noLog()
@@ -198,6 +298,7 @@ void tst_RunMark::recordIsShortened_data()
     QTest::addColumn<bool>("isShortened");
     QTest::newRow("at the limit") << (512 << 10) << false;
     QTest::newRow("above the limit") << (512 << 10) + 1 << true;
+    QTest::newRow("above the limit, half of it at the end of a line") << (512 << 10) + 63 << true;
 }
 
 // To half of it, from a whole line on.
