@@ -17,6 +17,7 @@
 
 #include <cstdlib>
 #include <fcntl.h>
+#include <memory>
 #include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -24,6 +25,9 @@
 using namespace Velocor;
 
 namespace {
+
+// Deleted last when the program exits, because it is made first.
+std::unique_ptr<RunMark> s_lastMark;
 
 // As one that a program left behind that began then.
 bool LeaveBehind(QString const& path, qint64 start)
@@ -48,6 +52,7 @@ private slots:
     void longLife();
     void everybodyMayReadAndWrite();
     void withoutStandardInput();
+    void endsOnceAtExit_data();
     void endsOnceAtExit();
     void markThatCannotBeWritten();
     void noLog();
@@ -159,13 +164,23 @@ void tst_RunMark::withoutStandardInput()
     QCOMPARE(openFileCount(), before);
 }
 
-// A mark may be deleted after all others were told to end.
+void tst_RunMark::endsOnceAtExit_data()
+{
+    QTest::addColumn<bool>("isDeleted");
+    QTest::newRow("never deleted") << false;
+    QTest::newRow("deleted after all marks were told to end") << true;
+}
+
 void tst_RunMark::endsOnceAtExit()
 {
+    QFETCH(bool, isDeleted);
     const pid_t child = fork();
     if (child == 0) {
-        static std::unique_ptr<RunMark> mark;
-        mark = std::make_unique<RunMark>(m_log);
+        auto mark = std::make_unique<RunMark>(m_log);
+        if (isDeleted)
+            s_lastMark = std::move(mark);
+        else
+            static_cast<void>(mark.release());
         std::exit(0);
     }
     int status = 0;

@@ -112,22 +112,25 @@ void tst_SettingsText::unwritable()
 
 void tst_SettingsText::saveKeepsTheRights_data()
 {
-    QTest::addColumn<bool>("isForeign");
-    QTest::newRow("own file") << false;
-    QTest::newRow("another user's file") << true;
+    QTest::addColumn<unsigned>("owner");
+    QTest::addColumn<unsigned>("group");
+    QTest::newRow("own file") << geteuid() << getegid();
+    QTest::newRow("another user's file") << 1234U << 1235U;
+    QTest::newRow("another group's file") << geteuid() << 1235U;
+    QTest::newRow("another user's file of the own group") << 1234U << getegid();
 }
 
 void tst_SettingsText::saveKeepsTheRights()
 {
-    QFETCH(bool, isForeign);
-    if (isForeign && geteuid() != 0)
+    QFETCH(unsigned, owner);
+    QFETCH(unsigned, group);
+    if ((owner != geteuid() || group != getegid()) && geteuid() != 0)
         QSKIP("only the administrator can give files away");
     const QTemporaryDir folder;
     const QString path = folder.filePath("x.cfg");
     QVERIFY(TestFiles::write(path, "a longer one"));
     const QByteArray name = QFile::encodeName(path);
-    if (isForeign)
-        QCOMPARE(chown(name.constData(), 1234, 1235), 0);
+    QCOMPARE(chown(name.constData(), owner, group), 0);
     QCOMPARE(chmod(name.constData(), 0640), 0);
     QString error;
     QVERIFY(SettingsFileWriter::SaveBytes(path, "new", &error));
@@ -135,8 +138,8 @@ void tst_SettingsText::saveKeepsTheRights()
     struct stat status = {};
     QCOMPARE(stat(name.constData(), &status), 0);
     QCOMPARE(status.st_mode & 0777U, 0640U);
-    QCOMPARE(status.st_uid, isForeign ? 1234U : geteuid());
-    QCOMPARE(status.st_gid, isForeign ? 1235U : getegid());
+    QCOMPARE(status.st_uid, owner);
+    QCOMPARE(status.st_gid, group);
 }
 
 void tst_SettingsText::saveFollowsALink()
