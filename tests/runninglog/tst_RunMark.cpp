@@ -61,6 +61,7 @@ private slots:
     void othersAreUsingTheFolder();
     void collects_data();
     void collects();
+    void collectsInTheirOrder();
     void recordThatCannotBeWritten_data();
     void recordThatCannotBeWritten();
     void recordIsShortened_data();
@@ -177,6 +178,7 @@ void tst_RunMark::endsOnceAtExit()
     const pid_t child = fork();
     if (child == 0) {
         auto mark = std::make_unique<RunMark>(m_log);
+        RunMark(m_folder->filePath("logs/other.log")); // does not matter any more
         if (isDeleted)
             s_lastMark = std::move(mark);
         else
@@ -285,6 +287,20 @@ void tst_RunMark::collects()
         QCOMPARE(end.start, start);
         QCOMPARE(end.end, RunMark::ProgramStart());
     }
+}
+
+// That of their starts, not of their names.
+void tst_RunMark::collectsInTheirOrder()
+{
+    const qint64 start = RunMark::ProgramStart() - 60000;
+    QVERIFY(LeaveBehind(folder() + "/1.run", start + 2));
+    QVERIFY(LeaveBehind(folder() + "/2.run", start));
+    QVERIFY(LeaveBehind(folder() + "/3.run", start + 1));
+    RunMark mark(m_log);
+    const std::vector<RunEnd> ends = mark.CollectOthers();
+    QCOMPARE(ends.size(), size_t(3));
+    for (int number = 0; number < 3; ++number)
+        QCOMPARE(ends[static_cast<size_t>(number)].start, start + number);
 }
 
 // What the mark tells is not lost.
