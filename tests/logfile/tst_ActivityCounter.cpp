@@ -40,6 +40,9 @@ private slots:
     void blocksOfRows();
     void lineThatGrows();
     void anotherFile();
+    void fileThatShrank();
+    void earlierRuns_data();
+    void earlierRuns();
     void headings();
     void obsoleteRequest();
 
@@ -285,6 +288,46 @@ void tst_ActivityCounter::anotherFile()
     m_request.path = write(Seconds(1).repeated(3) + Seconds(4).right(Seconds(1).size()), "b.log");
     QCOMPARE(count().bars[0].entries(), size_t(3));
     QCOMPARE(m_activity.bars[1].entries(), size_t(1));
+}
+
+// The last line that is left has the last time.
+void tst_ActivityCounter::fileThatShrank()
+{
+    index(Seconds(4));
+    write(Seconds(3));
+    QCOMPARE(count().state, Activity::Known);
+    QCOMPARE(m_activity.last - m_activity.first, qint64(2000));
+}
+
+void tst_ActivityCounter::earlierRuns_data()
+{
+    QTest::addColumn<bool>("isShownFirst");
+    QTest::newRow("shown, then hidden") << true;
+    QTest::newRow("hidden, then shown") << false;
+}
+
+// Rows of the newest run have other numbers then.
+void tst_ActivityCounter::earlierRuns()
+{
+    QFETCH(bool, isShownFirst);
+    const QByteArray newest = Seconds(4);
+    index(newest + entry("09:00:00.000", "Trace", "x", true).repeated(4));
+    const LineTable lines = m_request.rows->lines();
+    LogRows only(lines);
+    only.AddLines(0, 4);
+    LogRows all(lines);
+    all.AddHeading(LogRows::EarlierHeading);
+    all.AddLines(4, 8);
+    all.EndEarlier();
+    all.AddLines(0, 4);
+    m_request.parts = 2;
+    for (const bool isShown : {isShownFirst, !isShownFirst}) {
+        m_request.rows = std::make_shared<LogRows>(isShown ? all : only);
+        Activity const& activity = count();
+        QCOMPARE(activity.bars[0].entries(), size_t(isShown ? 4 : 2));
+        QCOMPARE(activity.bars[1].entries(), size_t(isShown ? 4 : 2));
+        QCOMPARE(activity.bars[0].start, qint64(isShown ? newest.size() : 0));
+    }
 }
 
 // A heading has no place in the file.
