@@ -19,8 +19,8 @@ COPY = WORK / "source"
 # The folders whose sources are changed, and the tests, or their folders, that may notice: each group
 # is built and run only for what the ones before it did not notice.
 PROOFS = "tst_Faults tst_SystemLimits tst_SuddenDeath tst_Load tst_Life"
-PLAIN_LOGS = ("tst_PlainLineParser tst_PlainLineTable tst_PlainLogFileType tst_PlainLogIndex tst_PlainLogRows "
-              "tst_PlainSearch tst_LogLives")
+PLAIN_LOGS = ("tst_PlainActivity tst_PlainLineParser tst_PlainLineTable tst_PlainLogFileType "
+              "tst_PlainLogIndex tst_PlainLogRows tst_PlainSearch tst_LogLives")
 ROOMS = {
     "common/config": ("config", "plain", PROOFS),
     "common/log": ("log", "plain", PROOFS),

@@ -280,15 +280,14 @@ def compilable(name, first, text, path, arguments, unit_path):
         if not errors:
             return mutants, changed
         bad = set()
-        for error in errors:
-            for place in [error, *error.children]:
-                if not place.location.file or place.location.file.name != path:
-                    continue
-                around = [r for r in regions if r[0] <= place.location.offset < r[1]]
-                if around:
-                    bad.update(min(around, key=lambda r: r[1] - r[0])[2])
-                    break
+        # Errors in a template are noted where this source uses it.
+        places = [[p.location.offset for p in [error, *error.children]
+                   if p.location.file and p.location.file.name == path] for error in errors]
+        for own in places:
+            around = next(filter(None, ([r for r in regions if r[0] <= at < r[1]] for at in own)), None)
+            if around:
+                bad.update(min(around, key=lambda r: r[1] - r[0])[2])
         if not bad:  # it only causes the error, as the size of an array does
-            at = next(e.location.offset for e in errors if e.location.file and e.location.file.name == path)
+            at = next(filter(None, places))[0]
             bad.update(min(regions, key=lambda r: min(abs(r[0] - at), abs(r[1] - at)))[2])
         mutants = [m for m in mutants if m["id"] not in bad]

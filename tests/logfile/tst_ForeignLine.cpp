@@ -81,6 +81,12 @@ private slots:
     void keys();
     void epochs_data();
     void epochs();
+    void resolutions_data();
+    void resolutions();
+    void programs_data();
+    void programs();
+    void wholeLines();
+    void journalExports();
     void epochText();
     void anyBytes();
 };
@@ -297,6 +303,19 @@ void tst_ForeignLine::formats_data()
     row("priority, and a letter that is none", "<34>E, [x] y", "", fatal, "E, [x] y");
     row("JSON, empty message before another", R"({"message":"","level":"info","msg":"x"})", "",
         note, "x");
+    row("RFC 5424, one letter after the version", "<11>1 x", "", error, "x");
+    row("a priority and one digit", "<11>1 ", "", error, "1 ");
+    row("kernel, facility of eight letters", "authpriv:err: x", "", error, "x");
+    row("Ruby, nothing after the stamp", "I, [2026-11-22T14:03:02] x", "2026-11-22T14:03:02", note,
+        "x");
+    row("level at the end of the stamp's brackets", "[2026-11-22T14:03:02Z WARN] x",
+        "2026-11-22T14:03:02Z", warning, "x");
+    row("two words in front of the level, one in brackets", "2026-11-22 14:03:02 [net] a ERROR x",
+        "2026-11-22 14:03:02", error, "[net] a ERROR x");
+    row("level first, another as the stamp's letter", "ERROR I1122 14:03:02.000000 x",
+        "1122 14:03:02.000000", error, "x");
+    row("slashes in brackets that are no date", "2026-11-22 14:03:02 ERROR [ab/cde/fghijklm] x",
+        "2026-11-22 14:03:02", error, "[ab/cde/fghijklm] x");
     row("JSON", R"({"time":"2026-11-22T14:03:02Z","level":"error","msg":"disk full"})",
         "2026-11-22T14:03:02Z", error, "disk full");
     row("JSON, level by number", R"({"level":50,"time":"14:03:02","pid":71,"msg":"x"})", "14:03:02",
@@ -331,6 +350,16 @@ void tst_ForeignLine::formats_data()
         R"({"date":"2026-11-20","timestamp":"2026-11-22 14:03:02","t":"09:00:00","event":"a",)"
         R"("message":"b","text":"c","severity":"info","priority":"3"})",
         "2026-11-22 14:03:02", note, "b");
+    row("JSON, a time that is none before another", R"({"time":"soon","t":"09:00:00","msg":"x"})",
+        "09:00:00", none, "x");
+    row("JSON, a level that is none before another",
+        R"({"level":"high","severity":"warning","msg":"x"})", "", warning, "x");
+    row("JSON, the same name twice",
+        R"({"t":"09:00:00","t":"10:00:00","s":"E","s":"I","msg":"a","msg":"b"})", "09:00:00", error,
+        "a");
+    row("JSON, empty level", R"({"level":"","msg":"x"})", "", none, "x");
+    row("JSON, level of three digits", R"({"level":"030","msg":"x"})", "", note, "x");
+    row("JSON, level of four digits", R"({"level":"0030","msg":"x"})", "", none, "x");
     row("JSON without a message", R"({"level":"info","a":1})", "", note,
         R"({"level":"info","a":1})");
     row("JSON that is cut", R"({"level":"info","msg":"abc)", "", note,
@@ -430,6 +459,13 @@ void tst_ForeignLine::noEntries_data()
     row("small letter and stamp", "e1122 14:03:02.123456 x");
     row("letter, blank and compact stamp", "x E1122 14:03:02");
     row("blank before known pairs", " level=error msg=x");
+    row("symbol without a time", "(EE) failed");
+    row("only a level's letter in brackets", "[E]");
+    row("empty brackets first", "[] x");
+    row("unknown facility", "game  :err   : x");
+    row("process without a number", ":M 22 Nov 2026 14:03:02.123 * Ready");
+    row("process that is no number", "x:M 22 Nov 2026 14:03:02.123 * Ready");
+    row("letter, blank and stamp without brackets", "E 2026-11-22 14:03:02 x");
     row("unknown pair first", "a=1 level=error msg=x");
 }
 
@@ -455,7 +491,7 @@ void tst_ForeignLine::zeroBytes()
     QCOMPARE(line.message.length, 3);
 }
 
-// A severity counts in the first 512 bytes.
+// A severity counts in the first 512 bytes, and so do colors.
 void tst_ForeignLine::longLines()
 {
     const QByteArray stamp("2026-11-22 14:03:02 ");
@@ -468,6 +504,11 @@ void tst_ForeignLine::longLines()
         QCOMPARE(found.severity, end <= 512 ? LogEntry::Error : LogEntry::None);
         QCOMPARE(found.message.start, stamp.size());
         QCOMPARE(found.message.length, line.size() - stamp.size());
+    }
+    for (char const* last : {"\x1b[0m", "\x1b[31m"}) { // ends at 512 or 513
+        const QByteArray line = QByteArray("\x1b[0m").repeated(127) + last + "ERROR: x";
+        const ForeignLine found = ForeignLine::Read(line.constData(), line.size(), QDate());
+        QCOMPARE(found.isEntry, line.indexOf('E') == 512);
     }
 }
 
@@ -544,7 +585,69 @@ void tst_ForeignLine::epochText()
              QDateTime::fromMSecsSinceEpoch(0).toString(format));
     QCOMPARE(ForeignLine::EpochText("1795442582.25", 13),
              QDateTime::fromMSecsSinceEpoch(1795442582250).toString(format));
+    QCOMPARE(ForeignLine::EpochText("17954425825", 10),
+             QDateTime::fromMSecsSinceEpoch(1795442582000).toString(format));
     QCOMPARE(ForeignLine::EpochText("179544258", 9), QString());
+}
+
+// How far the stamp may be off, in milliseconds.
+void tst_ForeignLine::resolutions_data()
+{
+    QTest::addColumn<QByteArray>("line");
+    QTest::addColumn<int>("resolution");
+    const auto row = [](char const* name, char const* line, int resolution) {
+        QTest::newRow(name) << QByteArray(line) << resolution;
+    };
+    row("seconds", "2026-11-22 14:03:02 x", 1000);
+    row("fraction", "2026-11-22 14:03:02.5 x", 1);
+    row("seconds in an object", R"({"time":"2026-11-22 14:03:02"})", 1000);
+    row("fraction in an object", R"({"time":"2026-11-22 14:03:02.5"})", 1);
+    row("seconds since 1970", R"({"time":1795442582})", 1);
+}
+
+void tst_ForeignLine::resolutions()
+{
+    QFETCH(QByteArray, line);
+    QTEST(ForeignLine::Read(line.constData(), line.size(), QDate()).resolution, "resolution");
+}
+
+void tst_ForeignLine::programs_data()
+{
+    QTest::addColumn<QByteArray>("line");
+    QTest::addColumn<QByteArray>("program");
+    const auto row = [](char const* name, char const* line, char const* program) {
+        QTest::newRow(name) << QByteArray(line) << QByteArray(program);
+    };
+    row("identifier", R"({"SYSLOG_IDENTIFIER":"app","MESSAGE":"x"})", "app");
+    row("command", R"({"_COMM":"app.bin","MESSAGE":"x"})", "app.bin");
+    row("identifier before the command",
+        R"({"SYSLOG_IDENTIFIER":"app","_COMM":"app.bin","MESSAGE":"x"})", "app");
+    row("identifier after the command",
+        R"({"_COMM":"app.bin","SYSLOG_IDENTIFIER":"app","MESSAGE":"x"})", "app");
+    row("the same name twice", R"({"_COMM":"a","_COMM":"b","MESSAGE":"x"})", "a");
+    row("neither", R"({"MESSAGE":"x"})", "");
+}
+
+void tst_ForeignLine::programs()
+{
+    QFETCH(QByteArray, line);
+    const ForeignLine found = ForeignLine::Read(line.constData(), line.size(), QDate());
+    QTEST(line.mid(found.program.start, found.program.length), "program");
+}
+
+void tst_ForeignLine::wholeLines()
+{
+    const ForeignLine found = ForeignLine::Read("and so on", 9, QDate());
+    QVERIFY(!found.isEntry);
+    QCOMPARE(found.message.start, 0);
+    QCOMPARE(found.message.length, 9);
+}
+
+void tst_ForeignLine::journalExports()
+{
+    QVERIFY(ForeignLine::IsJournalExport("__CURSOR=", 9));
+    QVERIFY(!ForeignLine::IsJournalExport("__CURSOR=", 8));
+    QVERIFY(!ForeignLine::IsJournalExport("__CURSOR:", 9));
 }
 
 // No bytes are read beyond the line, and the parts are within it. Also meant for the sanitizers.

@@ -38,7 +38,10 @@ private slots:
     void places();
     void withoutDates();
     void withoutTimes();
+    void withoutRows();
+    void withoutAFile();
     void beforeTheFirstEntry();
+    void linesWithoutTimesAtTheEnds();
     void secondsSinceTheStart_data();
     void secondsSinceTheStart();
     void timeAtTheEndOfALongLine();
@@ -122,6 +125,7 @@ void tst_LogLocator::places_data()
     row("forward, without a current row", "+0s", -1, LogLocation::Beyond, 5);
     row("back by a millisecond", "-1ms", 4, LogLocation::Found, 2);
     row("back, before the start", "-2d", 4, LogLocation::Beyond, 0);
+    row("forward, after the end, from a continued entry", "+10d", 3, LogLocation::Beyond, 5);
 }
 
 void tst_LogLocator::places()
@@ -157,12 +161,48 @@ void tst_LogLocator::withoutTimes()
     QCOMPARE(nowhere.row, -1);
 }
 
+void tst_LogLocator::withoutRows()
+{
+    const LogLocation location = locate("", "1", -1);
+    QCOMPARE(location.answer, LogLocation::Found);
+    QCOMPARE(location.row, -1);
+}
+
+void tst_LogLocator::withoutAFile()
+{
+    LogLocateRequest request;
+    request.source = m_folder.filePath("none.log");
+    request.rows = std::make_shared<LogRows>();
+    LogLocation found;
+    LogLocator locator;
+    connect(&locator, &LogLocator::located, this,
+            [&](LogLocation const& location) { found = location; });
+    request.place = LogPlace::Parse("2");
+    locator.Locate(request);
+    QCOMPARE(found.answer, LogLocation::NoSuchLine);
+    request.place = LogPlace::Parse("10:00");
+    locator.Locate(request);
+    QCOMPARE(found.answer, LogLocation::NoTimes);
+}
+
 // The lines above the first entry have its time.
 void tst_LogLocator::beforeTheFirstEntry()
 {
     const QByteArray log = "a\n" + TwoDays();
     QCOMPARE(locate(log, "22:00", 0).row, 1);
     QCOMPARE(locate(log, "22:30", 0).row, 2);
+    QCOMPARE(locate("a\n" + log, "22:00", 0).row, 2);
+}
+
+// They are not the end of the log, but belong to the entries next to them.
+void tst_LogLocator::linesWithoutTimesAtTheEnds()
+{
+    const LogLocation end = locate(TwoDays() + "a\n", "11:00", 4);
+    QCOMPARE(end.answer, LogLocation::Beyond);
+    QCOMPARE(end.row, 5);
+    const LogLocation start = locate("a\n" + TwoDays(), "-2d", 5);
+    QCOMPARE(start.answer, LogLocation::Beyond);
+    QCOMPARE(start.row, 1);
 }
 
 // The first entry of a system that starts has the time 0.
@@ -275,12 +315,14 @@ void tst_LogLocator::obsoleteRequest()
     QCOMPARE(locate(TwoDays(), "4", -1).row, 3);
 }
 
+// After every 100,000 rows.
 void tst_LogLocator::tellsHowFarItIs()
 {
-    QByteArray log = QByteArray("2025-03-03 09:00:00.000 Trace x\n").repeated(250 * 1000);
+    const int others = 303028;
+    QByteArray log = QByteArray("2025-03-03 09:00:00.000 Trace x\n").repeated(others);
     log += "2025-03-03 10:00:00.000 Trace x\n";
-    QCOMPARE(locate(log, "10:00", -1).row, 250 * 1000);
-    QCOMPARE(m_percents, QList<int>({39, 79}));
+    QCOMPARE(locate(log, "10:00", -1).row, others);
+    QCOMPARE(m_percents, QList<int>({32, 65, 99}));
     QCOMPARE(locate(log, "9:00", -1).row, 0);
     QVERIFY(m_percents.isEmpty());
 }

@@ -191,7 +191,8 @@ void tst_LogMarkFinder::obsoleteRequest()
     QVERIFY(TestFiles::write(m_file, "a\n"));
     const LogMark mark = LogMark::Of(m_file, 0);
     QCOMPARE(find({mark}, 2).size(), 0);
-    QCOMPARE(find({mark}, 1).size(), 1);
+    const QVector<LogMark> current = find({mark}, 1);
+    QVERIFY(current.size() == 1 && current[0].isFound);
 }
 
 QTEST_GUILESS_MAIN(tst_LogMarkFinder)

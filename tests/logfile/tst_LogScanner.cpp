@@ -130,6 +130,10 @@ class tst_LogScanner : public QObject
 private slots:
     void init();
     void reportsWhatItRead();
+    void reportsWhatLinesHave_data();
+    void reportsWhatLinesHave();
+    void reportsRuns();
+    void reportsASlowLine();
     void changes_data();
     void changes();
     void unchangedFiles_data();
@@ -137,6 +141,8 @@ private slots:
     void seamLostWithinATick();
     void oneUpdateForManyChanges();
     void typeOfALongFirstLine();
+    void typeOfAGrowingFile_data();
+    void typeOfAGrowingFile();
     void queuedRequest();
     void missingFiles_data();
     void missingFiles();
@@ -200,6 +206,47 @@ void tst_LogScanner::reportsWhatItRead()
     QCOMPARE(update.lines, size_t(2));
     QCOMPARE(reader.Rows(), Lines(text));
     QCOMPARE(reader.polls, 0);
+}
+
+void tst_LogScanner::reportsWhatLinesHave_data()
+{
+    QTest::addColumn<QByteArray>("text");
+    QTest::addColumn<bool>("hasTimes");
+    QTest::addColumn<bool>("hasSeverities");
+    QTest::newRow("entries") << run(2, QTime(9, 0), "x") << true << true;
+    QTest::newRow("text") << QByteArray("a\nb\n") << false << false;
+}
+
+void tst_LogScanner::reportsWhatLinesHave()
+{
+    QFETCH(QByteArray, text);
+    QVERIFY(TestFiles::write(m_file, text));
+    Reader reader(m_file);
+    reader.Open(1);
+    QTEST(reader.updates.last().hasTimes, "hasTimes");
+    QTEST(reader.updates.last().hasSeverities, "hasSeverities");
+}
+
+void tst_LogScanner::reportsRuns()
+{
+    QVERIFY(TestFiles::write(
+        m_file, writtenOver(run(9, QTime(9, 0), "old", true), run(3, QTime(10, 0), "new"))));
+    Reader reader(m_file);
+    reader.Open(1);
+    QCOMPARE(reader.updates.last().runStarts, (std::vector<size_t>{0, 3}));
+}
+
+// Nothing is searched after a line that an expression takes too long for.
+void tst_LogScanner::reportsASlowLine()
+{
+    QVERIFY(TestFiles::write(m_file, entry("09:00:03.000", "Trace", QString(40, 'a') + '-') +
+                                         run(3, QTime(10, 0), "x")));
+    LogFilter filter;
+    QVERIFY(filter.SetText("(a+)+[b-z]$", true, true));
+    Reader reader(m_file);
+    reader.Open(1, filter);
+    QCOMPARE(reader.updates.last().slowLine, size_t(1));
+    QCOMPARE(reader.updates.last().rows->size(), size_t(4));
 }
 
 void tst_LogScanner::changes_data()
@@ -369,6 +416,36 @@ void tst_LogScanner::typeOfALongFirstLine()
     Reader reader(m_file);
     reader.Open(1);
     QVERIFY(reader.updates.last().type.isForeign);
+}
+
+void tst_LogScanner::typeOfAGrowingFile_data()
+{
+    QTest::addColumn<QByteArray>("before");
+    QTest::addColumn<QByteArray>("more");
+    QTest::addColumn<bool>("isForeign");
+    QTest::addColumn<bool>("isReset"); // because the lines are split in another way
+    const QByteArray foreign = QByteArray("Nov 22 14:03:02 host app[7]: x\n").repeated(3);
+    QTest::newRow("not known before") << QByteArray("a\n") << foreign << true << true;
+    QTest::newRow("known before") << foreign << foreign << true << false;
+    QTest::newRow("own log") << run(3, QTime(9, 0), "x") << run(2, QTime(9, 1), "y") << false
+                             << false;
+    QTest::newRow("not known yet") << QByteArray("a\n") << QByteArray("b\n") << false << false;
+}
+
+// The first lines may not have said whose it is.
+void tst_LogScanner::typeOfAGrowingFile()
+{
+    QFETCH(QByteArray, before);
+    QFETCH(QByteArray, more);
+    QVERIFY(TestFiles::write(m_file, before));
+    Reader reader(m_file);
+    reader.Open(1);
+    QVERIFY(TestFiles::writeOver(m_file, before + more));
+    reader.scanner.Poll();
+    QCOMPARE(reader.updates.size(), 2);
+    QTEST(reader.updates.last().type.isForeign, "isForeign");
+    QTEST(reader.updates.last().isReset, "isReset");
+    QCOMPARE(reader.Rows(), Lines(before + more));
 }
 
 // A request from another thread comes as an event.

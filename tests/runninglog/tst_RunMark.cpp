@@ -9,17 +9,25 @@
 #include "app/history/RunEnds.h"
 #include "app/history/RunMarkFile.h"
 #include "support/OpenFiles.h"
+#include "support/ProcessLimits.h"
 #include "support/TestFiles.h"
 
 #include <QTemporaryDir>
 #include <QtTest>
 
+#include <cstdlib>
 #include <fcntl.h>
+#include <memory>
+#include <sys/stat.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
 using namespace Velocor;
 
 namespace {
+
+// Deleted last when the program exits, because it is made first.
+std::unique_ptr<RunMark> s_lastMark;
 
 // As one that a program left behind that began then.
 bool LeaveBehind(QString const& path, qint64 start)
@@ -41,12 +49,19 @@ class tst_RunMark : public QObject
 private slots:
     void init();
     void oneLife();
+    void longLife();
+    void everybodyMayReadAndWrite();
+    void withoutStandardInput();
+    void endsOnceAtExit_data();
+    void endsOnceAtExit();
+    void markThatCannotBeWritten();
     void noLog();
     void noFolder();
     void secondMark();
     void othersAreUsingTheFolder();
     void collects_data();
     void collects();
+    void collectsInTheirOrder();
     void recordThatCannotBeWritten_data();
     void recordThatCannotBeWritten();
     void recordIsShortened_data();
@@ -88,6 +103,108 @@ void tst_RunMark::oneLife()
     QVERIFY(ends[0].end >= ends[0].start && ends[0].end <= HistoryTime::Now());
     const qint64 now = HistoryTime::Now();
     QVERIFY(RunMark::ProgramStart() <= now && RunMark::ProgramStart() > now - 3600 * 1000);
+}
+
+void tst_RunMark::longLife()
+{
+    const int before = openFileCount();
+    {
+        const RunMark mark(m_log);
+        mark.NoteLongLife();
+        const QString path = folder() + '/' + RunMarkFile::NamesIn(folder())[0];
+        QCOMPARE(TestFiles::read(path + ".long"), QByteArray(""));
+        QVERIFY(QFile::exists(path + ".long"));
+        QCOMPARE(openFileCount(), before + 1);
+    }
+    QVERIFY(!QFile::exists(folder()));
+}
+
+// As far as their umask allows; several users may share a log.
+void tst_RunMark::everybodyMayReadAndWrite()
+{
+    const mode_t mask = umask(0);
+    const auto rightsOf = [](QString const& path) {
+        struct stat status = {};
+        return stat(QFile::encodeName(path).constData(), &status) == 0 ? status.st_mode & 07777 : 0;
+    };
+    {
+        const RunMark mark(m_log);
+        mark.NoteLongLife();
+        const QString path = folder() + '/' + RunMarkFile::NamesIn(folder())[0];
+        QCOMPARE(rightsOf(path), mode_t(0666));
+        QCOMPARE(rightsOf(path + ".long"), mode_t(0666));
+    }
+    QCOMPARE(rightsOf(record()), mode_t(0666));
+    umask(mask);
+}
+
+// A program that was started without one may get its descriptor for any file.
+void tst_RunMark::withoutStandardInput()
+{
+    const int before = openFileCount();
+    const int input = ::dup(0);
+    ::close(0);
+    {
+        const RunMark mark(m_log);
+        QCOMPARE(RunMarkFile::NamesIn(folder()).size(), 1);
+        QVERIFY(::fcntl(0, F_GETFD) >= 0);
+    }
+    const bool isClosed = ::fcntl(0, F_GETFD) < 0;
+    QCOMPARE(RunEnds::Of(m_log).size(), size_t(1));
+    {
+        const int file = ::open("/dev/null", O_RDONLY); // so that the next ones get it
+        const RunMark mark(m_log);
+        ::close(file);
+        mark.NoteLongLife();
+    }
+    const bool isStillClosed = ::fcntl(0, F_GETFD) < 0;
+    ::dup2(input, 0);
+    ::close(input);
+    QVERIFY(isClosed && isStillClosed);
+    QCOMPARE(RunEnds::Of(m_log).size(), size_t(2));
+    QCOMPARE(openFileCount(), before);
+}
+
+void tst_RunMark::endsOnceAtExit_data()
+{
+    QTest::addColumn<bool>("isDeleted");
+    QTest::newRow("never deleted") << false;
+    QTest::newRow("deleted after all marks were told to end") << true;
+}
+
+void tst_RunMark::endsOnceAtExit()
+{
+    QFETCH(bool, isDeleted);
+    const pid_t child = fork();
+    if (child == 0) {
+        auto mark = std::make_unique<RunMark>(m_log);
+        RunMark(m_folder->filePath("logs/other.log")); // does not matter any more
+        if (isDeleted)
+            s_lastMark = std::move(mark);
+        else
+            static_cast<void>(mark.release());
+        std::exit(0);
+    }
+    int status = 0;
+    QCOMPARE(waitpid(child, &status, 0), child);
+    QCOMPARE(status, 0);
+    QCOMPARE(TestFiles::read(record()).count('\n'), 1);
+    QVERIFY(!QFile::exists(folder()));
+}
+
+void tst_RunMark::markThatCannotBeWritten()
+{
+    const int before = openFileCount();
+    if (!ProcessLimits::limitFileSize(10))
+        QSKIP("the size of files cannot be limited here");
+    {
+        const RunMark mark(m_log);
+        ProcessLimits::unlimitFileSize();
+        mark.NoteLongLife();
+        QCOMPARE(openFileCount(), before);
+        QCOMPARE(QDir(folder()).entryList(QDir::AllEntries | QDir::NoDotAndDotDot), QStringList());
+    }
+    QVERIFY(!QFile::exists(record()));
 }
 
 void tst_RunMark::noLog()
@@ -172,6 +289,20 @@ void tst_RunMark::collects()
     }
 }
 
+// That of their starts, not of their names.
+void tst_RunMark::collectsInTheirOrder()
+{
+    const qint64 start = RunMark::ProgramStart() - 60000;
+    QVERIFY(LeaveBehind(folder() + "/1.run", start + 2));
+    QVERIFY(LeaveBehind(folder() + "/2.run", start));
+    QVERIFY(LeaveBehind(folder() + "/3.run", start + 1));
+    RunMark mark(m_log);
+    const std::vector<RunEnd> ends = mark.CollectOthers();
+    QCOMPARE(ends.size(), size_t(3));
+    for (int number = 0; number < 3; ++number)
+        QCOMPARE(ends[static_cast<size_t>(number)].start, start + number);
+}
+
 // What the mark tells is not lost.
 void tst_RunMark::recordThatCannotBeWritten_data()
 {
@@ -198,6 +329,7 @@ void tst_RunMark::recordIsShortened_data()
     QTest::addColumn<bool>("isShortened");
     QTest::newRow("at the limit") << (512 << 10) << false;
     QTest::newRow("above the limit") << (512 << 10) + 1 << true;
+    QTest::newRow("above the limit, half of it at the end of a line") << (512 << 10) + 63 << true;
 }
 
 // To half of it, from a whole line on.

@@ -11,6 +11,7 @@
 #include "support/SmallDisk.h"
 #include "support/TestRun.h"
 
+#include <QFileSystemWatcher>
 #include <QProcess>
 #include <QRegularExpression>
 #include <QStorageInfo>
@@ -56,6 +57,7 @@ private slots:
     void healthWithoutALimit();
     void healthTellsOfChanges_data();
     void healthTellsOfChanges();
+    void healthFollowsTheLog();
 };
 
 // Where the window looks for other programs.
@@ -440,7 +442,8 @@ void tst_RunningLog::health()
 void tst_RunningLog::healthTellsOfChanges_data()
 {
     QTest::addColumn<QString>("change");
-    for (char const* change : {"another program", "no log file", "log file", "other permissions"})
+    for (char const* change :
+         {"another program", "no log file", "log file", "an entry", "other permissions"})
         QTest::newRow(change) << change;
 }
 
@@ -459,9 +462,31 @@ void tst_RunningLog::healthTellsOfChanges()
         QVERIFY(QFile::remove(test.logFile()));
     else if (change == "log file")
         TorkLog::logger()->trace("the first entry");
+    else if (change == "an entry")
+        TorkLog::logger()->trace("another entry");
     else
         QVERIFY(QFile::setPermissions(test.logFile(), QFile::ReadOwner));
     QTRY_VERIFY_WITH_TIMEOUT(told.count() > 0, 20000);
+}
+
+// Changes of the file that was the log's before are nobody's concern any more.
+void tst_RunningLog::healthFollowsTheLog()
+{
+    const TestRun test;
+    LogHealth health;
+    const auto isWatched = [&health](QString const& path) {
+        auto const* watcher = health.findChild<QFileSystemWatcher*>();
+        return (watcher->files() + watcher->directories()).contains(path);
+    };
+    TorkLog::logger()->trace("an entry");
+    QCOMPARE(health.Check(), QString());
+    QVERIFY(isWatched(test.logFile()));
+    TorkLog::shutdown();
+    TorkLog::initialize(test.folder() + "data/logs/", "other", QString(), true);
+    TorkLog::logger()->trace("an entry");
+    QCOMPARE(health.Check(), QString());
+    QVERIFY(isWatched(RunningLog::FileName()));
+    QVERIFY(!isWatched(test.logFile()));
 }
 
 void tst_RunningLog::healthDirectoryInTheWay()

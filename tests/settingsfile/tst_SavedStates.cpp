@@ -9,6 +9,7 @@
 #include <QTemporaryDir>
 #include <QtTest>
 
+#include <ctime>
 #include <sys/stat.h>
 
 using namespace Velocor;
@@ -19,6 +20,8 @@ class tst_SavedStates : public QObject
 
 private slots:
     void newestFirst();
+    void laterThanAllOthers();
+    void timesInAnyZone();
     void sameContentIsKeptOnce();
     void tenOfAFile();
     void boundedInAll_data();
@@ -83,6 +86,39 @@ void tst_SavedStates::newestFirst()
     QCOMPARE(kept.first().size, qint64(5));
 }
 
+// The clock may have been set back.
+void tst_SavedStates::laterThanAllOthers()
+{
+    const Place place;
+    QCOMPARE(place.keep("x.cfg", "one"), QString());
+    const QString kept = place.states().Of(place.path("x.cfg")).first().path;
+    const QString hash = QFileInfo(kept).fileName().left(41);
+    QVERIFY(QFile::rename(kept, place.path("kept/" + hash + "29990101T000000999.cfg")));
+    QCOMPARE(place.keep("x.cfg", "two"), QString());
+    QCOMPARE(place.contents("x.cfg"), QList<QByteArray>({"two", "one"}));
+    QVERIFY(QFile::exists(place.path("kept/" + hash + "29990101T000001000.cfg")));
+}
+
+// A kept state has the same name in each of them.
+void tst_SavedStates::timesInAnyZone()
+{
+    const QByteArray zone = qgetenv("TZ");
+    for (char const* other : {"UTC-9", "UTC+7"}) {
+        qputenv("TZ", other);
+        tzset();
+        const Place place;
+        const QDateTime before = QDateTime::currentDateTime();
+        QCOMPARE(place.keep("x.cfg", "one"), QString());
+        const QDateTime time = place.states().Of(place.path("x.cfg")).first().time;
+        QVERIFY(time >= before && time < before.addSecs(3600));
+    }
+    if (zone.isEmpty())
+        qunsetenv("TZ");
+    else
+        qputenv("TZ", zone);
+    tzset();
+}
+
 void tst_SavedStates::sameContentIsKeptOnce()
 {
     const Place place;
@@ -108,9 +144,13 @@ void tst_SavedStates::boundedInAll_data()
 {
     QTest::addColumn<int>("files");
     QTest::addColumn<int>("size");
+    QTest::addColumn<int>("newest"); // its size
     QTest::addColumn<int>("left");
-    QTest::newRow("in number") << SavedStates::MaximumOfAll + 3 << 1 << SavedStates::MaximumOfAll;
-    QTest::newRow("in size") << 35 << int(SavedStates::MaximumFileSize) << 32;
+    const int most = SavedStates::MaximumFileSize;
+    QTest::newRow("in number") << SavedStates::MaximumOfAll + 3 << 1 << 1
+                               << SavedStates::MaximumOfAll;
+    QTest::newRow("in size") << 35 << most << most << 32;
+    QTest::newRow("by one byte") << 33 << most << 1 << 32;
 }
 
 // The oldest go first, whosever they are.
@@ -118,6 +158,7 @@ void tst_SavedStates::boundedInAll()
 {
     QFETCH(int, files);
     QFETCH(int, size);
+    QFETCH(int, newest);
     const Place place;
     const QString hash(40, 'a');
     QVERIFY(QDir().mkpath(place.path("kept")));
@@ -125,7 +166,7 @@ void tst_SavedStates::boundedInAll()
         const QString name = hash + "-20200101T000000" + QString::number(i).rightJustified(3, '0');
         QVERIFY(TestFiles::write(place.path("kept/" + name + ".cfg"), QByteArray(size, 'x')));
     }
-    QCOMPARE(place.keep("x.cfg", QByteArray(size, 'y')), QString());
+    QCOMPARE(place.keep("x.cfg", QByteArray(newest, 'y')), QString());
     QTEST(place.fileCount(), "left");
     QCOMPARE(place.contents("x.cfg").size(), 1);
     QVERIFY(!QFile::exists(place.path("kept/" + hash + "-20200101T000000001.cfg")));
@@ -208,6 +249,11 @@ void tst_SavedStates::strangersStay()
         QCOMPARE(place.keep("x.cfg", QByteArray::number(i)), QString());
     QVERIFY(place.states().RemoveAll(place.path("x.cfg")));
     QCOMPARE(TestFiles::listing(place.path("kept")), QStringList({"notes.cfg: notes"}));
+
+    for (int i = 0; i < SavedStates::MaximumOfAll; ++i)
+        QVERIFY(TestFiles::write(place.path(QString("kept/notes%1.cfg").arg(i)), "notes"));
+    QCOMPARE(place.keep("x.cfg", "x"), QString());
+    QCOMPARE(place.fileCount(), SavedStates::MaximumOfAll + 2);
 }
 
 void tst_SavedStates::failureIsTold()

@@ -76,6 +76,8 @@ private slots:
     void sameValues_data();
     void sameValues();
     void valueByName();
+    void errorAsLoss_data();
+    void errorAsLoss();
     void save();
     void saveFails();
     void savesNothingInPlaceOfAFile_data();
@@ -122,8 +124,8 @@ void tst_SettingsFile::read_data()
         "Line 2: the name of the section \"\xC3\xA9\"");
     row("section named like the root", "<R><a>1</a></R>", "", 2,
         "Line 2: the element \"R\", which has the same name as the root element");
-    const auto declared = [](char const* name, char const* declaration, int lossCount) {
-        QTest::newRow(name) << QByteArray(declaration) + QByteArray("<R><S><a>1</a></S></R>")
+    const auto declared = [](char const* name, QByteArray const& declaration, int lossCount) {
+        QTest::newRow(name) << declaration + QByteArray("<R><S><a>1</a></S></R>")
                             << QString("[S] a=1") << lossCount
                             << QString(lossCount > 0 ? "Line 1: the XML declaration" : "");
     };
@@ -131,6 +133,9 @@ void tst_SettingsFile::read_data()
     declared("declaration of UTF-8", "<?xml version='1.0' encoding=\"utf-8\"?>\n", 0);
     declared("declaration of Latin-1", "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?>", 1);
     declared("declaration of standing alone", "<?xml version='1.0' standalone='yes'?>", 1);
+    const QByteArray blanks(180, ' '); // a declaration of 200 bytes is looked at
+    declared("long declaration", "<?xml" + blanks + "version='1.0'?>", 0);
+    declared("longer declaration", "<?xml " + blanks + "version='1.0'?>", 1);
 }
 
 void tst_SettingsFile::read()
@@ -255,6 +260,7 @@ void tst_SettingsFile::readsWhatTheStoreReads_data()
     QTest::newRow("comment in a value") << QByteArray("<S><a>x<!-- c -->y</a></S>");
     QTest::newRow("comment before a value") << QByteArray("<S><a><!-- c -->y</a></S>");
     QTest::newRow("long value") << "<S><a>" + QByteArray(100000, 'x') + "</a></S>";
+    QTest::newRow("prefix") << QByteArray("<S xmlns:p='u'><p:a>1</p:a></S>");
     QTest::newRow("Latin-1 bytes") << QByteArray("<S><a>\xE9t\xE9</a></S>");
 }
 
@@ -355,7 +361,7 @@ void tst_SettingsFile::readsUpToASize_data()
     QTest::newRow("as large") << SettingsFileReader::ShownSize << false;
     QTest::newRow("one byte more") << SettingsFileReader::ShownSize + 1 << true;
     QTest::newRow("two gigabytes") << (qint64(1) << 31) << true;
-    QTest::newRow("far more than memory") << (qint64(1) << 42) << true;
+    QTest::newRow("four gigabytes") << (qint64(1) << 32) << true;
 }
 
 // The files have holes, so they take no space.
@@ -381,6 +387,7 @@ void tst_SettingsFile::copiesAFile_data()
     QTest::addColumn<QByteArray>("before");
     QTest::newRow("nothing") << QByteArray() << QByteArray("old");
     QTest::newRow("less than a piece") << QByteArray("<R/>") << QByteArray("longer than that");
+    QTest::newRow("a piece and a byte") << QByteArray((1 << 16) + 1, 'x') << QByteArray();
     QTest::newRow("several pieces") << QByteArray("0123456789").repeated(100000) << QByteArray();
 }
 
@@ -447,6 +454,7 @@ void tst_SettingsFile::losses()
     QFETCH(bool, isKept);
     const SettingsDocument document = OneValue(value);
     QCOMPARE(SettingsFileWriter::Losses(document).isEmpty(), isKept);
+    QCOMPARE(SettingsFileWriter::ValueProblem(value).isEmpty(), isKept);
 
     const QTemporaryDir folder;
     QString error;
@@ -513,6 +521,7 @@ void tst_SettingsFile::reasons()
     QFETCH(QString, reason);
     QCOMPARE(SettingsDocument::TextsOf(SettingsFileWriter::Losses(OneValue(value))),
              QStringList("S / k: " + reason));
+    QCOMPARE(SettingsFileWriter::ValueProblem(value), reason);
 }
 
 void tst_SettingsFile::manyLosses_data()
@@ -586,6 +595,36 @@ void tst_SettingsFile::valueByName()
     document.SetValue("T", "b", "4");
     document.SetValue("U", "a", "5");
     QCOMPARE(Joined(document), QString("[S] a=1 [T] a=3 b=4 [U] a=5"));
+}
+
+void tst_SettingsFile::errorAsLoss_data()
+{
+    QTest::addColumn<QByteArray>("bytes");
+    QTest::addColumn<QString>("root");
+    QTest::addColumn<QStringList>("losses");
+    QTest::newRow("none") << QByteArray("<R>\n<!--c--><S/></R>") << "R"
+                          << QStringList("Line 2: the comment \"c\"");
+    QTest::newRow("after another loss")
+        << QByteArray("<R>\n<!--c--><S><a>1</a>") << "R"
+        << QStringList({"Line 2: everything from there on (unexpected end of file)",
+                        "Line 2: the comment \"c\""});
+    QTest::newRow("no root") << QByteArray() << "VelocorSettings"
+                             << QStringList(
+                                    "Line 1: everything from there on (unexpected end of file)");
+}
+
+// What could be read of a damaged file can be edited.
+void tst_SettingsFile::errorAsLoss()
+{
+    QFETCH(QByteArray, bytes);
+    QFETCH(QStringList, losses);
+    const SettingsDocument parsed = SettingsFileReader::ReadBytes(bytes);
+    const SettingsDocument document = parsed.WithErrorAsLoss();
+    QVERIFY(document.isParsed);
+    QTEST(document.rootName, "root");
+    QCOMPARE(SettingsDocument::TextsOf(document.losses), losses);
+    QCOMPARE(document.lossCount, losses.size());
+    QVERIFY(document.HasSameValues(parsed));
 }
 
 void tst_SettingsFile::save()

@@ -5,6 +5,7 @@
 
 #include "app/settingsfile/SettingsFileWriter.h"
 #include "app/settingsfile/SettingsText.h"
+#include "support/ProcessLimits.h"
 #include "support/TestFiles.h"
 
 #include <QTemporaryDir>
@@ -25,11 +26,15 @@ private slots:
     void textOfBytes_data();
     void textOfBytes();
     void anyBytesComeBack();
+    void firstLineBreak();
     void unwritable_data();
     void unwritable();
     void saveKeepsTheRights_data();
     void saveKeepsTheRights();
     void saveFollowsALink();
+    void saveReplacesOwnFiles();
+    void fullDiskOfAnotherUsersFile_data();
+    void fullDiskOfAnotherUsersFile();
     void savesOnlyToFiles();
 };
 
@@ -42,6 +47,7 @@ void tst_SettingsText::textOfBytes_data()
     QTest::newRow("Latin-1") << QByteArray("\xE4") << QString(QChar(0xe4));
     QTest::newRow("byte order mark") << QByteArray("\xEF\xBB\xBF<a>") << "<a>";
     QTest::newRow("carriage returns") << QByteArray("a\r\nb\r\n") << "a\nb\n";
+    QTest::newRow("one carriage return") << QByteArray("a\r\n") << "a\n";
     QTest::newRow("mixed line breaks") << QByteArray("a\r\nb\n") << "a\r\nb\n";
     QTest::newRow("nothing") << QByteArray() << "";
 }
@@ -78,6 +84,12 @@ void tst_SettingsText::anyBytesComeBack()
     }
 }
 
+// A file without line breaks gets those of this system.
+void tst_SettingsText::firstLineBreak()
+{
+    QCOMPARE(SettingsText::Of("a").ToBytes("a\nb"), QByteArray("a\nb"));
+}
+
 void tst_SettingsText::unwritable_data()
 {
     QTest::addColumn<QByteArray>("file");
@@ -100,22 +112,25 @@ void tst_SettingsText::unwritable()
 
 void tst_SettingsText::saveKeepsTheRights_data()
 {
-    QTest::addColumn<bool>("isForeign");
-    QTest::newRow("own file") << false;
-    QTest::newRow("another user's file") << true;
+    QTest::addColumn<unsigned>("owner");
+    QTest::addColumn<unsigned>("group");
+    QTest::newRow("own file") << geteuid() << getegid();
+    QTest::newRow("another user's file") << 1234U << 1235U;
+    QTest::newRow("another group's file") << geteuid() << 1235U;
+    QTest::newRow("another user's file of the own group") << 1234U << getegid();
 }
 
 void tst_SettingsText::saveKeepsTheRights()
 {
-    QFETCH(bool, isForeign);
-    if (isForeign && geteuid() != 0)
+    QFETCH(unsigned, owner);
+    QFETCH(unsigned, group);
+    if ((owner != geteuid() || group != getegid()) && geteuid() != 0)
         QSKIP("only the administrator can give files away");
     const QTemporaryDir folder;
     const QString path = folder.filePath("x.cfg");
     QVERIFY(TestFiles::write(path, "a longer one"));
     const QByteArray name = QFile::encodeName(path);
-    if (isForeign)
-        QCOMPARE(chown(name.constData(), 1234, 1235), 0);
+    QCOMPARE(chown(name.constData(), owner, group), 0);
     QCOMPARE(chmod(name.constData(), 0640), 0);
     QString error;
     QVERIFY(SettingsFileWriter::SaveBytes(path, "new", &error));
@@ -123,8 +138,8 @@ void tst_SettingsText::saveKeepsTheRights()
     struct stat status = {};
     QCOMPARE(stat(name.constData(), &status), 0);
     QCOMPARE(status.st_mode & 0777U, 0640U);
-    QCOMPARE(status.st_uid, isForeign ? 1234U : geteuid());
-    QCOMPARE(status.st_gid, isForeign ? 1235U : getegid());
+    QCOMPARE(status.st_uid, owner);
+    QCOMPARE(status.st_gid, group);
 }
 
 void tst_SettingsText::saveFollowsALink()
@@ -140,6 +155,46 @@ void tst_SettingsText::saveFollowsALink()
     QCOMPARE(TestFiles::read(path), QByteArray("new"));
     QVERIFY(SettingsFileWriter::SaveBytes(folder.filePath("created"), "new", &error));
     QCOMPARE(TestFiles::read(folder.filePath("created")), QByteArray("new"));
+}
+
+// So that a program that reads it meanwhile has all of the old one. Another user's is written over,
+// because a new file would not be theirs.
+void tst_SettingsText::saveReplacesOwnFiles()
+{
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("x.cfg");
+    QVERIFY(TestFiles::write(path, "old"));
+    QFile reader(path);
+    QVERIFY(reader.open(QIODevice::ReadOnly));
+    QString error;
+    QVERIFY(SettingsFileWriter::SaveBytes(path, "new", &error));
+    QCOMPARE(reader.readAll(), QByteArray("old"));
+    QCOMPARE(TestFiles::read(path), QByteArray("new"));
+}
+
+void tst_SettingsText::fullDiskOfAnotherUsersFile_data()
+{
+    QTest::addColumn<int>("size");
+    QTest::newRow("small file") << 1000;
+    QTest::newRow("large file") << 1000000;
+}
+
+void tst_SettingsText::fullDiskOfAnotherUsersFile()
+{
+    QFETCH(int, size);
+    if (geteuid() != 0)
+        QSKIP("only the administrator can give files away");
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("x.cfg");
+    QVERIFY(TestFiles::write(path, "old"));
+    QCOMPARE(chown(QFile::encodeName(path).constData(), 1234, 1235), 0);
+    if (!ProcessLimits::limitFileSize(100))
+        QSKIP("the size of files cannot be limited here");
+    QString error;
+    const bool isSaved = SettingsFileWriter::SaveBytes(path, QByteArray(size, 'x'), &error);
+    ProcessLimits::unlimitFileSize();
+    QVERIFY(!isSaved);
+    QVERIFY(!error.isEmpty());
 }
 
 void tst_SettingsText::savesOnlyToFiles()
