@@ -1574,6 +1574,14 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <source>Every run that the files still have, oldest first</source>
         <translation>Jeder Lauf, den die Dateien noch enthalten, der älteste zuerst</translation>
     </message>
+    <message>
+        <source>Whole family, by time</source>
+        <translation>Ganze Familie, nach Zeit</translation>
+    </message>
+    <message>
+        <source>The logs of all programs of the family as one</source>
+        <translation>Die Protokolle aller Programme der Familie als eines</translation>
+    </message>
 </context>
 <context>
     <name>Velocor::LogFilterBar</name>
@@ -1969,6 +1977,10 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <source>Message</source>
         <translation>Meldung</translation>
     </message>
+    <message>
+        <source>Program</source>
+        <translation>Programm</translation>
+    </message>
 </context>
 <context>
     <name>Velocor::LogOverview</name>
@@ -2022,6 +2034,10 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
     <message>
         <source>Kind of file</source>
         <translation>Art der Datei</translation>
+    </message>
+    <message>
+        <source>Add Logs</source>
+        <translation>Protokolle hinzufügen</translation>
     </message>
 </context>
 <context>
@@ -2914,6 +2930,18 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <source>List what messages have in common, and how often</source>
         <translation>Auflisten, was Meldungen gemeinsam haben, und wie oft</translation>
     </message>
+    <message>
+        <source>&amp;Whole Family, by Time</source>
+        <translation>Ganze &amp;Familie, nach Zeit</translation>
+    </message>
+    <message>
+        <source>Ctrl+Alt+F</source>
+        <translation>Ctrl+Alt+F</translation>
+    </message>
+    <message>
+        <source>Show the logs of all programs of the family as one</source>
+        <translation>Die Protokolle aller Programme der Familie als eines zeigen</translation>
+    </message>
 </context>
 <context>
     <name>Velocor::MainToolBar</name>
@@ -3297,6 +3325,25 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
 %2</source>
         <translation>%1 konnte nicht gespeichert werden.
 %2</translation>
+    </message>
+</context>
+<context>
+    <name>Velocor::ProgramsButton</name>
+    <message>
+        <source>Which programs&apos; lines are shown</source>
+        <translation>Von welchen Programmen Zeilen gezeigt werden</translation>
+    </message>
+    <message>
+        <source>&amp;Show All</source>
+        <translation>&amp;Alle zeigen</translation>
+    </message>
+    <message>
+        <source>&amp;Add Logs...</source>
+        <translation>&amp;Protokolle hinzufügen...</translation>
+    </message>
+    <message>
+        <source>&amp;Programs: %1 of %2</source>
+        <translation>&amp;Programme: %1 von %2</translation>
     </message>
 </context>
 <context>

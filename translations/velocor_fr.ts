@@ -1574,6 +1574,14 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <source>Every run that the files still have, oldest first</source>
         <translation>Chaque exécution que les fichiers contiennent encore, la plus ancienne d’abord</translation>
     </message>
+    <message>
+        <source>Whole family, by time</source>
+        <translation>Toute la famille, par heure</translation>
+    </message>
+    <message>
+        <source>The logs of all programs of the family as one</source>
+        <translation>Les journaux de tous les programmes de la famille en un seul</translation>
+    </message>
 </context>
 <context>
     <name>Velocor::LogFilterBar</name>
@@ -1969,6 +1977,10 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <source>Message</source>
         <translation>Message</translation>
     </message>
+    <message>
+        <source>Program</source>
+        <translation>Programme</translation>
+    </message>
 </context>
 <context>
     <name>Velocor::LogOverview</name>
@@ -2022,6 +2034,10 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
     <message>
         <source>Kind of file</source>
         <translation>Type de fichier</translation>
+    </message>
+    <message>
+        <source>Add Logs</source>
+        <translation>Ajouter des journaux</translation>
     </message>
 </context>
 <context>
@@ -2914,6 +2930,18 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <source>List what messages have in common, and how often</source>
         <translation>Lister ce que les messages ont en commun, et combien de fois</translation>
     </message>
+    <message>
+        <source>&amp;Whole Family, by Time</source>
+        <translation>Toute la &amp;famille, par heure</translation>
+    </message>
+    <message>
+        <source>Ctrl+Alt+F</source>
+        <translation>Ctrl+Alt+F</translation>
+    </message>
+    <message>
+        <source>Show the logs of all programs of the family as one</source>
+        <translation>Afficher les journaux de tous les programmes de la famille en un seul</translation>
+    </message>
 </context>
 <context>
     <name>Velocor::MainToolBar</name>
@@ -3297,6 +3325,25 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
 %2</source>
         <translation>%1 n’a pas pu être enregistré.
 %2</translation>
+    </message>
+</context>
+<context>
+    <name>Velocor::ProgramsButton</name>
+    <message>
+        <source>Which programs&apos; lines are shown</source>
+        <translation>De quels programmes les lignes sont affichées</translation>
+    </message>
+    <message>
+        <source>&amp;Show All</source>
+        <translation>&amp;Tout afficher</translation>
+    </message>
+    <message>
+        <source>&amp;Add Logs...</source>
+        <translation>&amp;Ajouter des journaux...</translation>
+    </message>
+    <message>
+        <source>&amp;Programs: %1 of %2</source>
+        <translation>&amp;Programmes : %1 sur %2</translation>
     </message>
 </context>
 <context>

@@ -22,6 +22,13 @@ namespace Velocor {
 class HistoryClock
 {
 public:
+    /// A time stamp as LogLineParser::Parts has it.
+    struct Stamp
+    {
+        qint64 key = -1;
+        bool hasDate = false;
+    };
+
     /// @param firstDay  the midnight before the first stamp, if that has no date; 0 if unknown
     explicit HistoryClock(qint64 firstDay = 0) : m_firstDay(firstDay) {}
 

@@ -278,6 +278,7 @@ void HistoryScanner::report(bool isFolding)
     m_isReset = false;
     m_rows = update.rows;
     update.runs = std::make_shared<std::vector<RunHeading>>(runs.headings());
+    update.runLines = std::make_shared<std::vector<HistoryRun>>(runs.runs());
     update.isFolding = isFolding;
     m_older.AddTo(update);
     Q_EMIT updated(update);

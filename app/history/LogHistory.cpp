@@ -118,9 +118,7 @@ void LogHistory::findFirstDays()
     }
 }
 
-// Only looks beyond the first stamp if that has no date.
-//
-// @param latest  is set to the time of the run's first stamp, if any
+// @param latest  as HistoryClock::FirstDay()
 qint64 LogHistory::findFirstDay(size_t run, qint64& latest) const
 {
     HistoryLines lines(m_files[m_runs[run].file]);

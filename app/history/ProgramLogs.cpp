@@ -5,9 +5,11 @@
 
 #include "app/logfile/LogFileList.h"
 
+#include <QCoreApplication>
 #include <QDir>
 #include <QFileInfo>
 #include <QStringList>
+#include <QVariant>
 
 namespace Velocor {
 
@@ -50,6 +52,12 @@ QList<ProgramLog> ProgramLogs::In(QString const& folder)
         }
     }
     return logs;
+}
+
+QString ProgramLogs::FamilyFolder()
+{
+    const QString data = QCoreApplication::instance()->property("DataPath").toString();
+    return QFileInfo(QDir::cleanPath(data)).path();
 }
 
 QList<ProgramLog> ProgramLogs::Named(QString const& name, QList<ProgramLog> const& logs)

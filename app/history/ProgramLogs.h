@@ -25,6 +25,9 @@ public:
     /// @param folder  that of the organization, which has the data folders
     static QList<ProgramLog> In(QString const& folder);
 
+    /// That folder, known by the data folder of the running program.
+    static QString FamilyFolder();
+
     /// Those of one program, or one of them.
     ///
     /// @param name  as ProgramLog::name, or of a program with several logs; upper and lower case

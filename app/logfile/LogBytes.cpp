@@ -12,10 +12,16 @@ namespace Velocor {
 bool LogBytes::Open(LogSource const& source)
 {
     Close();
+    m_position = 0;
+    for (size_t log = 0; source.logs && log < source.logs->size(); ++log) {
+        m_logs.push_back(std::make_unique<LogBytes>());
+        m_isOpen = m_logs.back()->Open((*source.logs)[log]) || m_isOpen;
+    }
+    if (source.logs)
+        return m_isOpen;
     m_file.setFileName(source.path);
     m_older = source.older;
     m_start = source.start();
-    m_position = 0;
     // Opening a pipe would block.
     m_isOpen =
         QFileInfo(source.path).isFile() && m_file.open(QIODevice::ReadOnly | QIODevice::Unbuffered);
@@ -26,9 +32,17 @@ bool LogBytes::Open(LogSource const& source)
 void LogBytes::Close()
 {
     m_file.close();
+    m_logs.clear();
     m_older.reset();
     m_start = 0;
     m_isOpen = false;
+}
+
+qint64 LogBytes::size() const
+{
+    if (m_logs.empty())
+        return m_start + m_file.size();
+    return static_cast<qint64>(m_logs.size() - 1) * LogSource::LogSize + m_logs.back()->size();
 }
 
 bool LogBytes::Seek(qint64 offset)
@@ -37,8 +51,23 @@ bool LogBytes::Seek(qint64 offset)
     return offset >= 0;
 }
 
+qint64 LogBytes::readLog(char* data, qint64 count)
+{
+    const qint64 log = m_position / LogSource::LogSize;
+    if (log >= static_cast<qint64>(m_logs.size()))
+        return 0;
+    LogBytes& bytes = *m_logs[static_cast<size_t>(log)];
+    if (!bytes.isOpen() || !bytes.Seek(m_position - log * LogSource::LogSize))
+        return 0;
+    const qint64 read = bytes.Read(data, count);
+    m_position += std::max<qint64>(read, 0);
+    return read;
+}
+
 qint64 LogBytes::Read(char* data, qint64 count)
 {
+    if (!m_logs.empty())
+        return readLog(data, count);
     qint64 total = 0;
     while (total < count && m_position < m_start) {
         const qint64 more = m_older->Read(m_position, data + total, count - total);

@@ -8,6 +8,9 @@
 #include <QByteArray>
 #include <QFile>
 
+#include <memory>
+#include <vector>
+
 namespace Velocor {
 
 /// Reads the bytes of a log, without a buffer and with a file handle of its own. One thread at a
@@ -20,7 +23,7 @@ class LogBytes
 {
 public:
     /// @return false if it is not a regular file or cannot be read. If there are older ones, a log
-    ///         need not have a current file
+    ///         need not have a current file; of several logs, one that can be read is enough
     bool Open(LogSource const& source);
 
     void Close();
@@ -29,8 +32,8 @@ public:
     /// Why the file could not be opened.
     QString error() const { return m_file.errorString(); }
 
-    /// The number of bytes now.
-    qint64 size() const { return m_start + m_file.size(); }
+    /// The number of bytes now; of several logs, the offset of the last one's end.
+    qint64 size() const;
 
     /// The offset of the next byte to read.
     qint64 position() const { return m_position; }
@@ -38,7 +41,7 @@ public:
     /// @return false if the offset is negative; it may be beyond the end
     bool Seek(qint64 offset);
 
-    /// Reads up to `count` bytes, fewer only at the end.
+    /// Reads up to `count` bytes, fewer only at the end of a log.
     ///
     /// @return how many have been read, or -1 if they cannot be read
     qint64 Read(char* data, qint64 count);
@@ -47,11 +50,14 @@ public:
     QByteArray Read(qint64 count);
 
 private:
+    qint64 readLog(char* data, qint64 count);
+
     QFile m_file;
     std::shared_ptr<OlderLogFiles const> m_older;
     qint64 m_start = 0; // of the file
     qint64 m_position = 0;
     bool m_isOpen = false;
+    std::vector<std::unique_ptr<LogBytes>> m_logs; // if there are several
 };
 
 } // namespace Velocor

@@ -145,6 +145,8 @@ void LogFinder::report(size_t searched, bool isComplete)
 
 qint64 LogFinder::numberOfLine(qint64 start) const
 {
+    if (m_request.source.logs) // whose bytes are not next to each other
+        return static_cast<qint64>(m_request.rows->lines().LineAt(start)) + 1;
     LogBytes log;
     if (!log.Open(m_request.source))
         return 0;

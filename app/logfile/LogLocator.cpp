@@ -21,6 +21,11 @@ qint64 StartOfLine(LogLocateRequest const& request, std::function<bool()> const&
 {
     const LogLineEnd lineEnd = request.parser.fileType().lineEnd();
     qint64 number = request.place.value;
+    if (request.source.logs) { // whose bytes are not next to each other
+        LineTable const& lines = request.rows->lines();
+        const bool exists = number >= 1 && number <= static_cast<qint64>(lines.size());
+        return exists ? lines.start(static_cast<size_t>(number) - 1) : -1;
+    }
     LogBytes log;
     if (number == 1 || !log.Open(request.source))
         return number == 1 ? 0 : -1;

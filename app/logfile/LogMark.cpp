@@ -19,15 +19,16 @@ constexpr qint64 LookBack = 64 << 10; // bytes
 qint64 StartAbove(LogSource const& source, qint64 start, LogLineEnd const& lineEnd)
 {
     LogBytes log;
-    const qint64 from = std::max<qint64>(0, start - LookBack);
-    if (start <= 0 || !log.Open(source) || !log.Seek(from))
+    const qint64 first = source.logs ? start - start % LogSource::LogSize : 0; // of this log
+    const qint64 from = std::max(first, start - LookBack);
+    if (start <= first || !log.Open(source) || !log.Seek(from))
         return -1;
     const QByteArray bytes = log.Read(start - from - lineEnd.size());
     char const* at = bytes.constBegin();
     while (char const* last =
                lineEnd.Find(at, bytes.constEnd(), from + (at - bytes.constBegin()), '\0'))
         at = last + 1;
-    return at == bytes.constBegin() && from > 0 ? -1 : from + (at - bytes.constBegin());
+    return at == bytes.constBegin() && from > first ? -1 : from + (at - bytes.constBegin());
 }
 
 } // namespace

@@ -34,11 +34,20 @@ public:
         const QByteArray identity = isNeeded ? LogMark::IdentityOf(line) : QByteArray();
         close(identity);
         for (int i = 0; isNeeded && i < m_marks.size(); ++i) {
-            if (m_marks.at(i).line == identity)
+            const bool isSameLog =
+                m_marks.at(i).start / LogSource::LogSize == start / LogSource::LogSize;
+            if (isSameLog && m_marks.at(i).line == identity)
                 offer(i, start);
         }
         m_above = QByteArray(line.constData(), line.size());
         m_hasAbove = true;
+    }
+
+    // The lines so far are those of one log; the next one is of another.
+    void endLog()
+    {
+        close(QByteArray());
+        m_hasAbove = false;
     }
 
     QVector<LogMark> end()
@@ -105,13 +114,17 @@ void LogMarkFinder::Find(int request, LogSource const& source, QVector<LogMark> 
 {
     Candidates candidates(marks);
     LogLineReader reader;
-    qint64 start = reader.Open(source, type) ? 0 : -1;
-    while (start >= 0 && m_currentRequest <= request) {
-        const QByteArray line = reader.Line(start);
-        if (reader.nextStart() <= start)
-            break;
-        candidates.take(line, start);
-        start = reader.nextStart();
+    const size_t logs = !reader.Open(source, type) ? 0 : source.logs ? source.logs->size() : 1;
+    for (size_t log = 0; log < logs; ++log) {
+        qint64 start = static_cast<qint64>(log) * LogSource::LogSize;
+        while (m_currentRequest <= request) {
+            const QByteArray line = reader.Line(start);
+            if (reader.nextStart() <= start)
+                break;
+            candidates.take(line, start);
+            start = reader.nextStart();
+        }
+        candidates.endLog();
     }
     if (m_currentRequest <= request)
         Q_EMIT found(request, candidates.end());

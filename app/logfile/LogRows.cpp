@@ -38,7 +38,7 @@ quint8 LogRows::mark(size_t row) const
         return LogEntry::None;
     const quint8 mark = RowMark(m_lines.mark(lineOf(part, row)));
     const bool isContext =
-        part.kind == Part::Listed && (m_numbers.at(part.first + row - part.firstRow) & IsContext);
+        part.isList() && (m_numbers.at(part.first + row - part.firstRow) & IsContext);
     return isContext ? mark | Context | Alone : mark;
 }
 
@@ -88,6 +88,15 @@ void LogRows::AddLine(size_t line, bool isContext)
     ++m_size;
 }
 
+void LogRows::AddMergedLine(size_t line, bool isContext)
+{
+    if (m_parts.empty())
+        m_parts.push_back({Part::Merged, m_size, m_numbers.size()});
+    m_numbers.Append(static_cast<quint32>(line) | (isContext ? IsContext : 0));
+    m_problems += IsProblemMark(m_lines.mark(line));
+    ++m_size;
+}
+
 void LogRows::AddRows(LogRows const& rows, size_t first, size_t end, size_t offset)
 {
     if (first == end)
@@ -107,12 +116,12 @@ void LogRows::Truncate(size_t row)
     for (size_t removed = row; removed < m_size; ++removed)
         m_problems -= isProblem(removed);
     while (!m_parts.empty() && m_parts.back().firstRow >= row) {
-        if (m_parts.back().kind == Part::Listed)
+        if (m_parts.back().isList())
             m_numbers.Truncate(m_parts.back().first);
         m_headings -= m_parts.back().isHeading();
         m_parts.pop_back();
     }
-    if (!m_parts.empty() && m_parts.back().kind == Part::Listed)
+    if (!m_parts.empty() && m_parts.back().isList())
         m_numbers.Truncate(m_parts.back().first + row - m_parts.back().firstRow);
     m_size = std::min(m_size, row);
 }
@@ -147,8 +156,34 @@ size_t LogRows::rowOfLine(Part const& part, size_t line) const
     return from;
 }
 
+// The rows are in no order that would help.
+int LogRows::mergedRowNear(qint64 start) const
+{
+    const size_t line = m_lines.LineAt(start);
+    int before = -1;
+    int after = -1;
+    size_t lineBefore = 0;
+    size_t lineAfter = m_lines.size();
+    for (size_t row = 0; row < m_size; ++row) {
+        const size_t other = m_numbers.at(row) & ~IsContext;
+        if (other <= line && (before < 0 || other > lineBefore)) {
+            before = static_cast<int>(row);
+            lineBefore = other;
+        } else if (other > line && other < lineAfter) {
+            after = static_cast<int>(row);
+            lineAfter = other;
+        }
+    }
+    if (before < 0 || after < 0)
+        return std::max(before, after);
+    const qint64 distanceBefore = qAbs(start - m_lines.start(lineBefore));
+    return distanceBefore <= m_lines.start(lineAfter) - start ? before : after;
+}
+
 int LogRows::RowNear(qint64 start) const
 {
+    if (!m_parts.empty() && m_parts.back().kind == Part::Merged)
+        return mergedRowNear(start);
     int nearest = -1;
     qint64 least = std::numeric_limits<qint64>::max();
     const auto compare = [&](size_t row) {
@@ -177,7 +212,8 @@ size_t LogRows::CountSame(LogRows const& other) const
     Part const& part = m_parts.back();
     Part const& otherPart = other.m_parts.back();
     const size_t headings = part.firstRow - m_earlier;
-    const bool isSameKind = part.kind == otherPart.kind && part.first == otherPart.first &&
+    const bool isSameKind = part.kind != Part::Merged && part.kind == otherPart.kind &&
+                            part.first == otherPart.first &&
                             headings == otherPart.firstRow - other.m_earlier;
     if (!isSameKind || part.isHeading() || headings > 1)
         return 0;

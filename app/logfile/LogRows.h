@@ -144,6 +144,10 @@ public:
     /// Adds a row for one line, which must be among the first 2^31.
     void AddLine(size_t line, bool isContext);
 
+    /// The same for lines of several logs by time, in any order. Such rows are all of the newest
+    /// run, and there must be no others.
+    void AddMergedLine(size_t line, bool isContext);
+
     /// Adds the rows of one run of another file, without its heading.
     ///
     /// @param rows  of a table whose lines are in this one, too
@@ -182,16 +186,17 @@ public:
 
 private:
     // Rows that are next to each other: a heading, lines in the order of the file without a gap,
-    // or such lines with gaps, which are listed.
+    // such lines with gaps, which are listed, or a list of lines in any order.
     struct Part
     {
-        enum Kind { Heading, Lines, Listed };
+        enum Kind { Heading, Lines, Listed, Merged };
 
         Kind kind;
         size_t firstRow;
         size_t first; // line, or position in the list; of a heading, its negated start
 
         bool isHeading() const { return kind == Heading; }
+        bool isList() const { return kind == Listed || kind == Merged; }
         qint64 heading() const { return -static_cast<qint64>(first); }
     };
 
@@ -209,11 +214,12 @@ private:
     size_t lineOf(Part const& part, size_t row) const
     {
         const size_t position = part.first + row - part.firstRow;
-        return part.kind == Part::Listed ? m_numbers.at(position) & ~IsContext : position;
+        return part.isList() ? m_numbers.at(position) & ~IsContext : position;
     }
 
     size_t endOf(Part const& part) const;
     size_t rowOfLine(Part const& part, size_t line) const;
+    int mergedRowNear(qint64 start) const;
     bool isProblem(size_t row) const;
 
     LineTable m_lines;

@@ -69,8 +69,7 @@ LogSources::LogSources(QStringList const& names, bool joinsFiles) : m_joinsFiles
 
 QString LogSources::FamilyFolder()
 {
-    const QString data = QCoreApplication::instance()->property("DataPath").toString();
-    return QFileInfo(QDir::cleanPath(data)).path();
+    return ProgramLogs::FamilyFolder();
 }
 
 void LogSources::add(QString const& name)

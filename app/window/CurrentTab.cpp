@@ -81,6 +81,7 @@ void CurrentTab::updateSwitches(LogPanel const* log)
     m_actions.pause->setChecked(log->isPaused());
     m_actions.follow->setChecked(log->isFollowing());
     m_actions.allFiles->setChecked(log->showsAllFiles());
+    m_actions.family->setChecked(log->showsFamily());
     m_actions.earlierRuns->setChecked(log->showsEarlierRuns());
     const QList<QAction*> encodings = m_actions.encodings->actions();
     for (QAction* action : encodings)

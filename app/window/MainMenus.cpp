@@ -200,6 +200,10 @@ void MainMenus::addMovement(QMenu* menu)
         addSwitchForLog(menu, tr("All Files, &by Time"), QKeySequence(tr("Ctrl+Shift+A")),
                         tr("Show the older files of the log, too, as one, each run with a heading"),
                         [](LogPanel* log, bool shown) { log->SetAllFiles(shown); });
+    m_actions.family =
+        addSwitchForLog(menu, tr("&Whole Family, by Time"), QKeySequence(tr("Ctrl+Alt+F")),
+                        tr("Show the logs of all programs of the family as one"),
+                        [](LogPanel* log, bool shown) { log->SetFamily(shown); });
     m_actions.earlierRuns =
         addSwitchForLog(menu, tr("&Earlier Runs"), QKeySequence(tr("Ctrl+Shift+E")),
                         tr("Show entries from earlier runs"),

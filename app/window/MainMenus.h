@@ -40,6 +40,7 @@ struct MenuActions
     QAction* nextPane = nullptr;
     QAction* previousPane = nullptr;
     QAction* allFiles = nullptr;
+    QAction* family = nullptr;
     QAction* earlierRuns = nullptr;
     QAction* pause = nullptr;
     QAction* follow = nullptr;

@@ -6,6 +6,8 @@
 #include <QFileInfo>
 #include <QSaveFile>
 
+#include <algorithm>
+
 namespace Velocor {
 
 LineSaver::LineSaver(LogSource const& source, QVector<qint64> const& starts,
@@ -57,10 +59,9 @@ bool LineSaver::isSource(QFileInfo const& target) const
     const auto isSame = [&target](QString const& path) {
         return target.canonicalFilePath() == QFileInfo(path).canonicalFilePath();
     };
-    bool isOne = isSame(m_source.path);
-    for (size_t file = 0; m_source.older && file < m_source.older->count(); ++file)
-        isOne = isOne || isSame(m_source.older->path(file));
-    return isOne;
+    const std::vector<LogSource::File> files = m_source.Files();
+    return std::any_of(files.begin(), files.end(),
+                       [&](LogSource::File const& file) { return isSame(file.path); });
 }
 
 QString LineSaver::save()
@@ -70,7 +71,7 @@ QString LineSaver::save()
         return tr("Not a regular file");
     if (target.exists() && isSource(target))
         return tr("This is the log itself");
-    if (!m_source.older && !QFileInfo(m_source.path).isFile())
+    if (!m_source.older && !m_source.logs && !QFileInfo(m_source.path).isFile())
         return tr("The log no longer exists");
     LogBytes from;
     if (!from.Open(m_source))

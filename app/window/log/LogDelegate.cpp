@@ -261,8 +261,9 @@ void LogDelegate::paintContent(QPainter* painter, QStyleOptionViewItem const& op
         cell.state &= ~QStyle::State_HasFocus;
     }
     // The filter searches neither translated names nor what is not in the line.
-    const bool isMarkable =
-        index.column() != LogModel::SeverityColumn && index.column() != LogModel::SinceColumn;
+    const bool isMarkable = index.column() != LogModel::SeverityColumn &&
+                            index.column() != LogModel::SinceColumn &&
+                            index.column() != LogModel::ProgramColumn;
     const QVector<QTextLayout::FormatRange> formats =
         isMarkable && (m_filter.hasText() || m_found.hasText())
             ? marks(cell.text, index.data(LogModel::LineRole).toString())

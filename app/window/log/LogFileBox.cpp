@@ -28,11 +28,12 @@ void LogFileBox::Open(QString const& path)
     addItem(LeftToRight(QFileInfo(path).fileName()), path);
 }
 
-void LogFileBox::SetShown(QString const& path, bool isAll)
+void LogFileBox::SetShown(QString const& path, bool isAll, bool isFamily)
 {
-    const bool isOther = isAll != m_isAll;
+    const bool isOther = isAll != m_isAll || isFamily != m_isFamily;
     m_shown = path;
     m_isAll = isAll;
+    m_isFamily = isFamily;
     if (isOther)
         fill();
     setToolTip(PlainToolTip(LeftToRight(path)));
@@ -59,13 +60,19 @@ void LogFileBox::fill()
     addItem(tr("All files, by time"));
     setItemData(count() - 1, PlainToolTip(tr("Every run that the files still have, oldest first")),
                 Qt::ToolTipRole);
-    setCurrentIndex(m_isAll ? count() - 1 : findData(m_shown));
+    addItem(tr("Whole family, by time"));
+    setItemData(count() - 1, PlainToolTip(tr("The logs of all programs of the family as one")),
+                Qt::ToolTipRole);
+    setCurrentIndex(m_isFamily ? count() - 1 : m_isAll ? count() - 2 : findData(m_shown));
 }
 
 void LogFileBox::choose(int position)
 {
     const QString file = itemData(position).toString();
-    if (file.isEmpty() && !m_isAll)
+    const bool isFamily = position == count() - 1 && file.isEmpty();
+    if (isFamily && !m_isFamily)
+        Q_EMIT familyChosen();
+    else if (file.isEmpty() && !isFamily && (!m_isAll || m_isFamily))
         Q_EMIT allChosen();
     else if (!file.isEmpty() && (file != m_shown || m_isAll))
         Q_EMIT fileChosen(file);

@@ -8,7 +8,8 @@
 
 namespace Velocor {
 
-/// The choice between a log file, the older ones beside it, and all of them as one. GUI thread.
+/// The choice between a log file, the older ones beside it, all of them as one, and the logs of all
+/// programs as one. GUI thread.
 class LogFileBox : public QComboBox
 {
     Q_OBJECT
@@ -22,7 +23,8 @@ public:
     /// Says which file is shown.
     ///
     /// @param isAll  whether the older ones of that log are shown with it
-    void SetShown(QString const& path, bool isAll);
+    /// @param isFamily  whether the logs of all programs are shown with it
+    void SetShown(QString const& path, bool isAll, bool isFamily = false);
 
     void showPopup() override;
 
@@ -33,12 +35,16 @@ Q_SIGNALS:
     /// The user has chosen to see all of them as one.
     void allChosen();
 
+    /// The user has chosen to see the logs of all programs as one.
+    void familyChosen();
+
 private:
     void fill();
     void choose(int position);
 
     QString m_shown;
     bool m_isAll = false;
+    bool m_isFamily = false;
 };
 
 } // namespace Velocor

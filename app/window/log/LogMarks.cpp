@@ -41,14 +41,11 @@ void LogMarks::Load()
 // The files are known only when they have been read; each has marks of its own.
 void LogMarks::load()
 {
-    m_marks = m_store ? m_store->Marks(m_source.path) : QVector<LogMark>();
-    for (LogMark& mark : m_marks)
-        mark.start += m_source.start();
-    const size_t older = m_store && m_source.older ? m_source.older->count() : 0;
-    for (size_t file = 0; file < older; ++file) {
-        QVector<LogMark> marks = m_store->Marks(m_source.older->path(file));
+    m_marks.clear();
+    for (LogSource::File const& file : m_source.Files()) {
+        QVector<LogMark> marks = m_store ? m_store->Marks(file.path) : QVector<LogMark>();
         for (LogMark& mark : marks)
-            mark.start += m_source.older->start(file);
+            mark.start += file.start;
         m_marks += marks;
     }
     ++m_request;
@@ -196,24 +193,23 @@ QString LogMarks::save()
     update();
     if (!m_store)
         return QString();
-    return m_source.older ? saveAll() : m_store->SetMarks(m_source.path, m_marks);
+    return m_source.older || m_source.logs ? saveAll() : m_store->SetMarks(m_source.path, m_marks);
 }
 
 // Each mark with the file in which its line is, also if that has been renamed.
 QString LogMarks::saveAll()
 {
-    OlderLogFiles const& older = *m_source.older;
-    std::vector<QVector<LogMark>> marks(older.count() + 1);
-    for (LogMark mark : qAsConst(m_marks)) {
-        const size_t file = older.FileAt(mark.start);
-        mark.start -= file < older.count() ? older.start(file) : older.size();
-        marks[file].append(mark);
-    }
     QString problem;
-    for (size_t file = 0; file < marks.size(); ++file) {
-        const QString path = file < older.count() ? older.path(file) : m_source.path;
-        if (!marks[file].isEmpty() || !m_store->Marks(path).isEmpty())
-            problem = m_store->SetMarks(path, marks[file]);
+    for (LogSource::File const& file : m_source.Files()) {
+        QVector<LogMark> marks;
+        for (LogMark mark : qAsConst(m_marks)) {
+            if (m_source.FileAt(mark.start).start != file.start)
+                continue;
+            mark.start -= file.start;
+            marks.append(mark);
+        }
+        if (!marks.isEmpty() || !m_store->Marks(file.path).isEmpty())
+            problem = m_store->SetMarks(file.path, marks);
     }
     return problem;
 }

@@ -3,10 +3,11 @@
 
 #include "app/window/log/LogModel.h"
 
-#include "app/history/HistoryScanner.h"
+#include "app/history/FamilyScanner.h"
 #include "app/history/ProgramLogs.h"
 #include "app/logfile/LogIndex.h"
 #include "app/logfile/LogSeverities.h"
+#include "app/window/log/ProgramColors.h"
 #include "app/window/log/RunText.h"
 #include "app/window/log/ShownText.h"
 #include "app/window/widgets/FileSizeText.h"
@@ -74,16 +75,18 @@ void LogModel::startScanner()
 {
     if (m_scanner)
         return;
-    m_scanner = new HistoryScanner;
+    m_scanner = new FamilyScanner;
     m_scanner->moveToThread(&m_thread);
     connect(&m_thread, &QThread::finished, m_scanner, &QObject::deleteLater);
-    connect(this, &LogModel::openRequested, m_scanner, &HistoryScanner::Open);
-    connect(this, &LogModel::filterRequested, m_scanner, &HistoryScanner::SetFilter);
-    connect(this, &LogModel::foldRequested, m_scanner, &HistoryScanner::SetFolded);
-    connect(this, &LogModel::watchRequested, m_scanner, &HistoryScanner::SetWatched);
-    connect(this, &LogModel::pollRequested, m_scanner, &HistoryScanner::Poll);
-    connect(m_scanner, &HistoryScanner::updated, this, &LogModel::take);
-    connect(m_scanner, &HistoryScanner::progressed, this, [this](int request, int percent) {
+    connect(this, &LogModel::openRequested, m_scanner, &FamilyScanner::Open);
+    connect(this, &LogModel::filterRequested, m_scanner, &FamilyScanner::SetFilter);
+    connect(this, &LogModel::familyRequested, m_scanner, &FamilyScanner::OpenFamily);
+    connect(this, &LogModel::hideRequested, m_scanner, &FamilyScanner::SetHidden);
+    connect(this, &LogModel::foldRequested, m_scanner, &FamilyScanner::SetFolded);
+    connect(this, &LogModel::watchRequested, m_scanner, &FamilyScanner::SetWatched);
+    connect(this, &LogModel::pollRequested, m_scanner, &FamilyScanner::Poll);
+    connect(m_scanner, &FamilyScanner::updated, this, &LogModel::take);
+    connect(m_scanner, &FamilyScanner::progressed, this, [this](int request, int percent) {
         if (request == m_request && m_reading)
             Q_EMIT progressed(percent);
     });
@@ -91,17 +94,41 @@ void LogModel::startScanner()
     Q_EMIT watchRequested(!m_paused);
 }
 
-void LogModel::Open(QString const& path, LogLineParser const& parser, bool isCurrent, bool isAll)
+void LogModel::setFile(QString const& path, LogLineParser const& parser, bool isCurrent)
 {
     m_path = path;
     m_parser = parser;
     m_parser.SetChosenEncoding(m_chosenEncoding);
     m_parser.SetOwn(isCurrent);
     m_isCurrent = isCurrent;
-    m_isAll = isAll;
     m_spans.MeasureFromAbove();
     m_lines.clear();
+}
+
+void LogModel::Open(QString const& path, LogLineParser const& parser, bool isCurrent, bool isAll)
+{
+    setFile(path, parser, isCurrent);
+    m_isAll = isAll;
+    m_isFamily = false;
     Reload();
+}
+
+void LogModel::OpenFamily(QString const& path, QList<ProgramLog> const& logs,
+                          LogLineParser const& parser, QSet<QString> const& hidden)
+{
+    setFile(path, parser, false);
+    m_isAll = true;
+    m_isFamily = true;
+    m_logs = logs;
+    m_hidden = hidden;
+    Reload();
+}
+
+void LogModel::SetHiddenLogs(QSet<QString> const& hidden)
+{
+    m_hidden = hidden;
+    if (m_isFamily && m_scanner)
+        Q_EMIT hideRequested(hidden);
 }
 
 void LogModel::Reload()
@@ -112,7 +139,10 @@ void LogModel::Reload()
     m_reading = true;
     m_awaitsReset = true;
     m_scanner->SetCurrentRequest(++m_request);
-    Q_EMIT openRequested(m_request, m_path, m_parser, m_filter, m_isAll);
+    if (m_isFamily)
+        Q_EMIT familyRequested(m_request, m_logs, m_parser, m_filter, m_hidden);
+    else
+        Q_EMIT openRequested(m_request, m_path, m_parser, m_filter, m_isAll);
 }
 
 void LogModel::SetEncoding(LogEncoding encoding)
@@ -192,6 +222,8 @@ void LogModel::applyChange(HistoryUpdate const& update)
         beginRemoveRows(QModelIndex(), at, at - difference - 1);
     else if (difference > 0)
         beginInsertRows(QModelIndex(), at, at + difference - 1);
+    if (m_state.logs != update.logs)
+        m_file.Close();
     m_state = update;
     m_rowCount += difference;
     if (difference < 0)
@@ -251,6 +283,33 @@ bool LogModel::openFile() const
     return m_file.Open(source());
 }
 
+// How much to read of a line: a last one ended where its file did when the row was made.
+qint64 LogModel::knownLength(int row, qint64 most) const
+{
+    LogRows const& rows = *m_state.rows;
+    const qint64 start = LineStart(row);
+    qint64 complete = rows.complete();
+    qint64 end = rows.end();
+    if (m_state.family) {
+        FamilyLog const& log = (*m_state.family)[static_cast<size_t>(LogOf(row))];
+        complete = log.complete;
+        end = log.end;
+    }
+    return start < complete ? most : std::min(most, end - start);
+}
+
+LogSource LogModel::source() const
+{
+    LogSource source(m_path, m_state.older);
+    source.logs = m_state.logs;
+    return source;
+}
+
+int LogModel::LogOf(int row) const
+{
+    return static_cast<int>(source().LogAt(LineStart(row)));
+}
+
 // Up to `limit` bytes of a line, without its line end. Null if the file cannot be read.
 QByteArray LogModel::readBytes(int row, qint64 limit) const
 {
@@ -261,7 +320,7 @@ QByteArray LogModel::readBytes(int row, qint64 limit) const
 
     // A last line may have got longer since.
     const qint64 most = limit + LongestLineEnd;
-    const qint64 length = start < rows.complete() ? most : std::min(most, rows.end() - start);
+    const qint64 length = knownLength(row, most);
     const qint64 first = std::min<qint64>(length, 1024);
     const LogLineEnd lineEnd = m_parser.fileType().lineEnd();
     QByteArray bytes = m_file.Read(first);
@@ -282,8 +341,7 @@ qint64 LogModel::lengthOf(int row) const
 {
     LogRows const& rows = *m_state.rows;
     const qint64 start = rows.start(static_cast<size_t>(row));
-    const qint64 most =
-        start < rows.complete() ? MeasuredLength : std::min(MeasuredLength, rows.end() - start);
+    const qint64 most = knownLength(row, MeasuredLength);
     if (!openFile() || !m_file.Seek(start))
         return 0;
     const LogLineEnd lineEnd = m_parser.fileType().lineEnd();
@@ -449,19 +507,15 @@ void LogModel::SetFolded(int row, bool folded)
 
 QString LogModel::FileOf(int row) const
 {
-    const size_t file = m_state.older ? m_state.older->FileAt(LineStart(row)) : 0;
-    return m_state.older && file < m_state.older->count() ? m_state.older->path(file) : m_path;
+    return source().FileAt(LineStart(row)).path;
 }
 
 size_t LogModel::FirstLineOfFile(int row) const
 {
     LineTable const& lines = m_state.rows->lines();
-    if (!m_state.older || m_state.older->count() == 0 || lines.isEmpty())
+    if (lines.isEmpty() || (!m_state.logs && (!m_state.older || m_state.older->count() == 0)))
         return 0;
-    const size_t file = m_state.older->FileAt(LineStart(row));
-    const qint64 start =
-        file < m_state.older->count() ? m_state.older->start(file) : m_state.older->size();
-    return lines.LineAt(start);
+    return lines.LineAt(source().FileAt(LineStart(row)).start);
 }
 
 QString LogModel::headingText(int row) const
@@ -488,6 +542,8 @@ QString LogModel::cellText(int row, int column) const
         return entry(row).elapsed.isEmpty() ? QString() : tr("%1 ms").arg(entry(row).elapsed);
     case SinceColumn:
         return m_spans.Since(row);
+    case ProgramColumn:
+        return m_state.family ? (*m_state.family)[static_cast<size_t>(LogOf(row))].name : QString();
     default:
         return entry(row).message;
     }
@@ -497,6 +553,8 @@ QString LogModel::toolTip(int row, int column) const
 {
     if (isHeading(row))
         return QString();
+    if (column == ProgramColumn)
+        return FileOf(row);
     const QString note = m_marks.value(LineStart(row));
     if (!note.isEmpty() && column != MessageColumn)
         return tr("Note: %1").arg(note);
@@ -537,6 +595,8 @@ QVariant LogModel::data(QModelIndex const& index, int role) const
     case Qt::DecorationRole:
         if (index.column() == SeverityColumn && !isHeading(row) && entry(row).isEntry)
             return SeverityIcons::Icon(entry(row).severity, QGuiApplication::palette());
+        if (index.column() == ProgramColumn && m_state.family && !isHeading(row))
+            return ProgramColors::Icon(LogOf(row), QGuiApplication::palette());
         return QVariant();
     case Qt::ToolTipRole:
         return PlainToolTip(LeftToRight(toolTip(row, index.column())));
@@ -591,6 +651,8 @@ QVariant LogModel::headerData(int section, Qt::Orientation orientation, int role
         return tr("Elapsed");
     case SinceColumn:
         return m_spans.base().isEmpty() ? tr("Since") : tr("Since Chosen");
+    case ProgramColumn:
+        return tr("Program");
     default:
         return tr("Message");
     }

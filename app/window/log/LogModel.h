@@ -4,6 +4,7 @@
 #pragma once
 
 #include "app/history/HistoryUpdate.h"
+#include "app/history/ProgramLogs.h"
 #include "app/logfile/LogBytes.h"
 #include "app/logfile/LogEntry.h"
 #include "app/logfile/LogFilter.h"
@@ -13,18 +14,19 @@
 #include <QAbstractTableModel>
 #include <QCache>
 #include <QHash>
+#include <QSet>
 #include <QThread>
 
 #include <memory>
 
 namespace Velocor {
 
-class HistoryScanner;
+class FamilyScanner;
 
 /// A log file as a table, live: time, severity, elapsed time, time since another entry, and message
 /// of each line, oldest first.
 ///
-/// Lines are read from the file when a view needs them; all searching is done by a HistoryScanner
+/// Lines are read from the file when a view needs them; all searching is done by a FamilyScanner
 /// in another thread. A line that is not in the file anymore, because the log has overwritten it,
 /// is shown as gone until the next update; what is in its place is not. Heading rows separate the
 /// runs. GUI thread.
@@ -42,6 +44,7 @@ public:
         SeverityColumn,
         ElapsedColumn,
         SinceColumn,
+        ProgramColumn, ///< whose log the line is in, if there are several
         MessageColumn,
         ColumnCount
     };
@@ -65,8 +68,26 @@ public:
     /// @param isAll  whether to show the older files of the log, too, as one; see HistoryScanner
     void Open(QString const& path, LogLineParser const& parser, bool isCurrent, bool isAll = false);
 
+    /// Shows several logs, each with its older files, as one by time.
+    ///
+    /// @param path  whose tab this is
+    /// @param hidden  paths of logs that are not shown
+    void OpenFamily(QString const& path, QList<ProgramLog> const& logs, LogLineParser const& parser,
+                    QSet<QString> const& hidden);
+
+    /// Shows only some of these logs.
+    ///
+    /// @param hidden  as above
+    void SetHiddenLogs(QSet<QString> const& hidden);
+
     /// Whether the older files of the log are shown, too.
     bool isAll() const { return m_isAll; }
+
+    /// Whether several logs are shown; then isAll(), too.
+    bool isFamily() const { return m_isFamily; }
+
+    /// Which of several logs the line of a row is in; 0 if there is only one.
+    int LogOf(int row) const;
 
     /// Whether a row is a heading that folds.
     bool IsFoldable(int row) const;
@@ -145,7 +166,7 @@ public:
     QString const& path() const { return m_path; }
 
     /// Where the bytes of the lines are.
-    LogSource source() const { return {m_path, m_state.older}; }
+    LogSource source() const;
 
     /// The file that the line of a row is in.
     QString FileOf(int row) const;
@@ -176,6 +197,10 @@ Q_SIGNALS:
     // To the scanner's thread. Fully qualified, because queued connections look up types by name.
     void openRequested(int request, QString const& path, Velocor::LogLineParser const& parser,
                        Velocor::LogFilter const& filter, bool isAll);
+    void familyRequested(int request, QList<Velocor::ProgramLog> const& logs,
+                         Velocor::LogLineParser const& parser, Velocor::LogFilter const& filter,
+                         QSet<QString> const& hidden);
+    void hideRequested(QSet<QString> const& hidden);
     void foldRequested(quint64 run, bool folded);
     void filterRequested(int request, Velocor::LogFilter const& filter);
     void watchRequested(bool watched);
@@ -193,11 +218,13 @@ private:
     };
 
     void startScanner();
+    void setFile(QString const& path, LogLineParser const& parser, bool isCurrent);
     void take(HistoryUpdate const& update);
     void reset(HistoryUpdate const& update);
     void applyChange(HistoryUpdate const& update);
     bool isHeading(int row) const;
     bool openFile() const;
+    qint64 knownLength(int row, qint64 most) const;
     QByteArray readBytes(int row, qint64 limit) const;
     qint64 lengthOf(int row) const;
     Line readLine(int row) const;
@@ -211,13 +238,16 @@ private:
     QString toolTip(int row, int column) const;
 
     QThread m_thread;
-    HistoryScanner* m_scanner = nullptr;
+    FamilyScanner* m_scanner = nullptr;
     bool m_paused = false;
     std::shared_ptr<HistoryUpdate const> m_heldBack; // the last update that arrived after the pause
     bool m_reading = false;
     bool m_awaitsReset = false; // what was requested has not been reported yet
     bool m_isCurrent = false;
     bool m_isAll = false;
+    bool m_isFamily = false;
+    QList<ProgramLog> m_logs; // of the family
+    QSet<QString> m_hidden;
     int m_request = 0;
 
     QString m_path;

@@ -21,15 +21,20 @@
 #include "app/window/log/LogTableMenu.h"
 #include "app/window/log/LogView.h"
 #include "app/window/log/PatternDialog.h"
+#include "app/window/log/ProgramsButton.h"
 #include "app/window/log/RunningLogParser.h"
 #include "app/window/log/WheelZoom.h"
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
 
+#include <QFileDialog>
+#include <QFileInfo>
 #include <QHBoxLayout>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QSplitter>
+
+#include <algorithm>
 
 namespace Velocor {
 
@@ -37,8 +42,8 @@ LogPanel::LogPanel(QWidget* parent)
     : QWidget(parent), m_model(new LogModel(this)), m_view(new LogView(m_model)),
       m_numbers(new LineNumberMargin(m_view)), m_activity(new ActivityStrip(m_model, m_view)),
       m_overview(new LogOverview(m_model, m_view)), m_files(new LogFileBox),
-      m_filterBar(new LogFilterBar), m_findBar(new LogFindBar), m_line(new CurrentLine),
-      m_splitter(new QSplitter(Qt::Vertical)),
+      m_programs(new ProgramsButton), m_filterBar(new LogFilterBar), m_findBar(new LogFindBar),
+      m_line(new CurrentLine), m_splitter(new QSplitter(Qt::Vertical)),
       m_find(new FindControl(m_model, m_view, m_findBar, this)),
       m_marks(new MarkControl(m_model, m_view, this)),
       m_copier(new LineCopier(m_model, m_view, this)), m_goTo(new LogGoTo(m_model, this))
@@ -83,6 +88,8 @@ void LogPanel::makeLayout()
     top->setSpacing(8);
     top->addWidget(label);
     top->addWidget(m_files, 1);
+    top->addWidget(m_programs);
+    m_programs->hide();
 
     m_splitter->setAccessibleName(tr("Log entries and current line"));
     m_splitter->setChildrenCollapsible(false);
@@ -105,6 +112,10 @@ void LogPanel::connectParts()
     connect(m_files, &LogFileBox::fileChosen, this,
             [this](QString const& file) { showFile(file, false); });
     connect(m_files, &LogFileBox::allChosen, this, [this] { SetAllFiles(true); });
+    connect(m_files, &LogFileBox::familyChosen, this, [this] { SetFamily(true); });
+    connect(m_programs, &ProgramsButton::hiddenChanged, this,
+            [this] { m_model->SetHiddenLogs(m_programs->hidden()); });
+    connect(m_programs, &ProgramsButton::addRequested, this, &LogPanel::askForLogs);
     connect(m_filterBar, &LogFilterBar::filterChanged, this, [this] {
         m_model->SetFilter(m_filterBar->filter());
         m_view->UpdateMarks();
@@ -173,13 +184,20 @@ void LogPanel::Open(QString const& path, bool isCurrent)
     showFile(path, false);
 }
 
-void LogPanel::showFile(QString const& path, bool isAll)
+void LogPanel::showFile(QString const& path, bool isAll, bool isFamily)
 {
-    m_files->SetShown(path, isAll);
+    m_files->SetShown(path, isAll, isFamily);
+    m_programs->setVisible(isFamily);
     const LogEncoding kept = m_store ? m_store->Encoding(path) : LogEncoding::Automatic;
     if (kept != LogEncoding::Automatic)
         m_model->SetEncoding(kept);
-    m_model->Open(path, RunningLogParser(), path == m_currentPath, isAll);
+    if (isFamily) {
+        const QList<ProgramLog> logs = familyLogs();
+        m_programs->SetLogs(logs);
+        m_model->OpenFamily(path, logs, RunningLogParser(), m_programs->hidden());
+    } else {
+        m_model->Open(path, RunningLogParser(), path == m_currentPath, isAll);
+    }
     m_marks->Load();
     updatePlaceholder();
     Q_EMIT stateChanged();
@@ -244,7 +262,50 @@ void LogPanel::SetAllFiles(bool shown)
 
 bool LogPanel::showsAllFiles() const
 {
-    return m_model->isAll();
+    return m_model->isAll() && !m_model->isFamily();
+}
+
+void LogPanel::SetFamily(bool shown)
+{
+    if (shown != showsFamily())
+        showFile(LogFileList::CurrentOf(path()), shown, shown);
+}
+
+bool LogPanel::showsFamily() const
+{
+    return m_model->isFamily();
+}
+
+// Also the log of this tab, wherever it is.
+QList<ProgramLog> LogPanel::familyLogs() const
+{
+    QList<ProgramLog> logs = ProgramLogs::In(ProgramLogs::FamilyFolder());
+    const QStringList others = QStringList(LogFileList::CurrentOf(path())) + m_added;
+    for (QString const& other : others) {
+        const bool isKnown = std::any_of(logs.begin(), logs.end(), [&other](ProgramLog const& log) {
+            return QFileInfo(log.path) == QFileInfo(other);
+        });
+        if (!isKnown)
+            logs.append({ProgramLogs::NameOf(other), other});
+    }
+    return logs;
+}
+
+void LogPanel::AddToFamily(QStringList const& paths)
+{
+    for (QString const& file : paths)
+        m_added.append(LogFileList::CurrentOf(QFileInfo(file).absoluteFilePath()));
+    m_added.removeDuplicates();
+    if (showsFamily())
+        showFile(path(), true, true);
+}
+
+void LogPanel::askForLogs()
+{
+    const QStringList paths =
+        QFileDialog::getOpenFileNames(this, tr("Add Logs"), QFileInfo(path()).absolutePath());
+    if (!paths.isEmpty())
+        AddToFamily(paths);
 }
 
 LogEncoding LogPanel::chosenEncoding() const

@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include "app/history/ProgramLogs.h"
 #include "app/logfile/LogEncoding.h"
 #include "app/window/log/FindControl.h"
 #include "app/window/log/LineCopier.h"
@@ -33,6 +34,7 @@ class LogModel;
 class LogOverview;
 class LogView;
 class NoticeBar;
+class ProgramsButton;
 
 /// A log view with its controls: choice of older files, filter, table, and the text of the current
 /// line.
@@ -64,6 +66,16 @@ public:
     /// Shows the older files of the log, too, as one; or only the current one again.
     void SetAllFiles(bool shown);
     bool showsAllFiles() const;
+
+    /// Shows the logs of all programs of the family, and those added by the user, as one; or only
+    /// this log's current file again.
+    void SetFamily(bool shown);
+    bool showsFamily() const;
+
+    /// Shows further logs with those of the family.
+    ///
+    /// @param paths  of their files; those that are shown already are left out
+    void AddToFamily(QStringList const& paths);
 
     /// Reads the file in another encoding, also in the next session; Automatic finds out which.
     void SetEncoding(LogEncoding encoding);
@@ -187,7 +199,9 @@ private:
     void connectParts();
     void connectView();
     void connectModel();
-    void showFile(QString const& path, bool isAll);
+    void showFile(QString const& path, bool isAll, bool isFamily = false);
+    QList<ProgramLog> familyLogs() const;
+    void askForLogs();
     void showCurrentLine();
     void updatePlaceholder();
     void showContent();
@@ -201,6 +215,7 @@ private:
     ActivityStrip* m_activity;
     LogOverview* m_overview;
     LogFileBox* m_files;
+    ProgramsButton* m_programs;
     LogFilterBar* m_filterBar;
     LogFindBar* m_findBar;
     CurrentLine* m_line;
@@ -212,6 +227,7 @@ private:
     NoticeBar* m_content = nullptr; // null until there is something to tell
     LogMarkStore* m_store = nullptr;
     std::shared_ptr<HighlightRules> m_rules;
+    QStringList m_added;   // logs that the user has added to the family
     QString m_currentPath; // the log of the running program; empty for other logs
     int m_percent = 100;
 };

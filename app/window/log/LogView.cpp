@@ -40,6 +40,7 @@ LogView::LogView(LogModel* model, QWidget* parent)
     setModel(model);
     SetDefaultWidths();
     hideColumn(LogModel::SinceColumn);
+    hideColumn(LogModel::ProgramColumn);
     connect(verticalScrollBar(), &QScrollBar::valueChanged, this, &LogView::noteScrolled);
     connect(model, &LogModel::modelAboutToBeReset, this, &LogView::noteCurrent);
     connect(model, &LogModel::refreshed, this, &LogView::afterRefresh);
@@ -98,6 +99,8 @@ void LogView::SetDefaultWidths()
                    metrics.boundingRect(QStringLiteral("00000 ms")).width() + padding);
     setColumnWidth(LogModel::SinceColumn,
                    metrics.boundingRect(QStringLiteral("00 min 00 s")).width() + padding);
+    setColumnWidth(LogModel::ProgramColumn,
+                   metrics.boundingRect(QStringLiteral("Sample Program")).width() + 24 + padding);
     for (int column = 0; column < LogModel::MessageColumn; ++column)
         setColumnWidth(column,
                        std::max(columnWidth(column), horizontalHeader()->sectionSizeHint(column)));
@@ -322,6 +325,7 @@ void LogView::afterRefresh()
     setColumnHidden(LogModel::SeverityColumn, !state.hasSeverities && state.lines > 0);
     setColumnHidden(LogModel::ElapsedColumn, !state.hasElapsed);
     setColumnHidden(LogModel::SinceColumn, !m_showsSince || !state.hasTimes);
+    setColumnHidden(LogModel::ProgramColumn, !state.family);
     fitTimes();
     if (m_hasOtherRows || measuredRows() > MostMeasuredRows)
         forgetHeights();

@@ -41,7 +41,7 @@ RowSpans::Span RowSpans::between(Time const& from, Time const& to)
     return span;
 }
 
-// An entry of an earlier run is not the one above.
+// An entry of an earlier run is not the one above, nor is one of another program.
 RowSpans::Span RowSpans::spanAbove(int row) const
 {
     const Time time = timeOf(row);
@@ -49,7 +49,8 @@ RowSpans::Span RowSpans::spanAbove(int row) const
         return Span();
     const int end = std::max(-1, row - 1 - MostAbove);
     for (int above = row - 1; above > end && m_model.LineStart(above) >= 0; --above) {
-        if (m_model.state().rows->mark(static_cast<size_t>(above)) & LogRows::Timed)
+        if ((m_model.state().rows->mark(static_cast<size_t>(above)) & LogRows::Timed) &&
+            m_model.LogOf(above) == m_model.LogOf(row))
             return between(timeOf(above), time);
     }
     return Span();
