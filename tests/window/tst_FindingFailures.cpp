@@ -71,17 +71,20 @@ private slots:
 void tst_FindingFailures::crashTwoRunsAgo()
 {
     const WindowTest test;
-    TestFiles::write(test.logFile() + ".2", QuietRun("01") + Line("01", 55, "Fatal", "Out of ink"));
+    TestFiles::write(test.logFile() + ".2", QuietRun("01") +
+                                                Line("01", 51, "Warning", "Little ink") +
+                                                Line("01", 52, "Trace", "Page 50 laid out") +
+                                                Line("01", 55, "Fatal", "Out of ink"));
     TestFiles::write(test.logFile() + ".1", QuietRun("02"));
     TestFiles::write(test.logFile(), QuietRun("03"));
     const auto window = WindowTest::show();
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 50, Patience);
     QTest::keyClick(window.get(), Qt::Key_A, Qt::ControlModifier | Qt::ShiftModifier);
-    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 154, Patience); // with three headings
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 156, Patience); // with three headings
     QTest::keyClick(window.get(), Qt::Key_F8, Qt::ShiftModifier);
     QTRY_COMPARE_WITH_TIMEOUT(Current(*window), QString("Out of ink"), Patience);
     QTest::keyClick(View(*window), Qt::Key_Up); // what led to it
-    QCOMPARE(Current(*window), QString("Page 49 laid out"));
+    QCOMPARE(Current(*window), QString("Page 50 laid out"));
 }
 
 void tst_FindingFailures::programsThatQuarrel()
