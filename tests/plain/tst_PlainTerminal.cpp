@@ -2,10 +2,15 @@
 // SPDX-License-Identifier: MIT
 
 // Compares what velocor-log prints of random logs, with random options, with what the log view
-// shows of each file, and with a filter that looks at each line of an entry.
+// shows of each file, and with a filter that looks at each line of an entry. With a span of time,
+// and of all files of a log, with what the log view's own scanner shows.
 
 #include "app/ProgramRuns.h"
+#include "app/history/HistoryScanner.h"
+#include "app/history/HistoryTime.h"
 #include "app/logfile/LogIndex.h"
+#include "app/logfile/LogLineReader.h"
+#include "app/logfile/Milliseconds.h"
 
 #include "ProgramLife.h"
 #include "Rounds.h"
@@ -14,6 +19,7 @@
 #include <QTemporaryDir>
 #include <QtTest>
 
+#include <algorithm>
 #include <memory>
 
 using namespace Velocor;
@@ -27,6 +33,7 @@ struct Options
     QString excluded;
     QVector<int> severities; // empty: all
     int context = 0;
+    LogSpan span;
 };
 
 class Generator
@@ -56,6 +63,29 @@ public:
             options.arguments << "--context" << QString::number(options.context);
         }
         return options;
+    }
+
+    // Limits the times, mostly to those near some of a log's lines.
+    void addSpan(Options& options, ProgramLife const& life)
+    {
+        const QList<QByteArray> lines = life.lines();
+        const qint64 offset = HistoryTime::FromText("1970-01-01T00:00") -
+                              QDate(1970, 1, 1).toJulianDay() * Milliseconds::Day;
+        QVector<qint64> times{HistoryTime::OfEpoch(life.clock())};
+        for (QByteArray const& line : lines) {
+            if (ProgramLife::Line const* written = life.written(line))
+                times.append(written->time + offset);
+        }
+        std::sort(times.begin(), times.end());
+        const auto some = [&](char const* option, int first) {
+            if (chance(3))
+                return qint64(-1);
+            const qint64 time = times[first + below(times.size() - first)] + below(3) - 1;
+            options.arguments << option << QString::fromLatin1(HistoryTime::Text(time));
+            return time;
+        };
+        options.span.since = some("--since", 0);
+        options.span.until = some("--until", times.size() / 2);
     }
 
     int below(int limit) { return static_cast<int>(m_random() % static_cast<unsigned>(limit)); }
@@ -144,6 +174,40 @@ QByteArray Filtered(QVector<Seen> const& lines, Options const& options)
     return text;
 }
 
+// The filter of the log view.
+LogFilter FilterOf(Options const& options)
+{
+    LogFilter filter;
+    for (int severity = 0; severity <= LogEntry::None && !options.severities.isEmpty(); ++severity)
+        filter.SetSeverity(static_cast<LogEntry::Severity>(severity),
+                           options.severities.contains(severity));
+    filter.SetText(options.expression, true, true);
+    if (!options.excluded.isEmpty())
+        filter.SetTerms(LogTerms(), LogTerms(LogTerms::Quoted(options.excluded), true));
+    filter.SetContext(options.context);
+    filter.SetSpan(options.span);
+    return filter;
+}
+
+// What the log view shows of a file or of all files of a log, each line with a line end.
+QByteArray Viewed(QString const& path, LogLineParser const& parser, Options const& options,
+                  bool isAll)
+{
+    HistoryUpdate update;
+    HistoryScanner scanner;
+    QObject::connect(&scanner, &HistoryScanner::updated, &scanner,
+                     [&](HistoryUpdate const& now) { update = now; });
+    scanner.Open(0, path, parser, FilterOf(options), isAll);
+    QByteArray text;
+    LogLineReader reader;
+    reader.Open({path, update.older}, update.type);
+    for (size_t row = 0; update.rows && row < update.rows->size(); ++row) {
+        if (!update.rows->isHeading(row))
+            text += reader.Line(update.rows->start(row)) + '\n';
+    }
+    return text;
+}
+
 } // namespace
 
 class tst_PlainTerminal : public QObject
@@ -152,9 +216,11 @@ class tst_PlainTerminal : public QObject
 
 private slots:
     void randomFilters();
+    void randomSpans();
     void cleanupTestCase();
 
 private:
+    QStringList makeLog(ProgramLife& life, Generator& generator);
     void compare(ProgramLife& life, QStringList const& files, Options const& options);
     QByteArray expected(QString const& path, LogLineParser parser, Options const& options);
 
@@ -163,6 +229,8 @@ private:
     int m_filters = 0;
     int m_empty = 0;
     qint64 m_bytes = 0;
+    int m_spans = 0;
+    int m_cut = 0; // spans that leave out some of the lines, but not all
 };
 
 // Of one file, as the log view shows it and as the plain filter does.
@@ -194,14 +262,7 @@ QByteArray tst_PlainTerminal::expected(QString const& path, LogLineParser parser
         end = starts[run - 1];
     }
 
-    LogFilter filter;
-    for (int severity = 0; severity <= LogEntry::None && !options.severities.isEmpty(); ++severity)
-        filter.SetSeverity(static_cast<LogEntry::Severity>(severity),
-                           options.severities.contains(severity));
-    filter.SetText(options.expression, true, true);
-    if (!options.excluded.isEmpty())
-        filter.SetTerms(LogTerms(), LogTerms(LogTerms::Quoted(options.excluded), true));
-    filter.SetContext(options.context);
+    const LogFilter filter = FilterOf(options);
     LogIndex filtering(parser, filter);
     filtering.Begin();
     filtering.Feed(bytes.constData(), bytes.size());
@@ -230,6 +291,26 @@ void tst_PlainTerminal::compare(ProgramLife& life, QStringList const& files, Opt
     m_bytes += all.size();
 }
 
+// Lets a program live and writes its files and the settings that tell how to read them; returns the
+// paths of the files.
+QStringList tst_PlainTerminal::makeLog(ProgramLife& life, Generator& generator)
+{
+    for (int step = generator.below(40); step >= 0; --step)
+        life.step();
+    life.save();
+    const QFileInfo log(life.path());
+    QFile settings(log.dir().filePath("logsettings.cfg"));
+    if (!settings.open(QIODevice::WriteOnly))
+        return {};
+    settings.write("<LogSettings><config><dateTimeFormat>" + life.formats()[0].toLatin1() +
+                   "</dateTimeFormat></config></LogSettings>\n");
+    QStringList files;
+    const QStringList names = log.dir().entryList({log.fileName() + "*"}, QDir::Files, QDir::Name);
+    for (QString const& name : names)
+        files.append(log.dir().filePath(name));
+    return files;
+}
+
 void tst_PlainTerminal::randomFilters()
 {
     std::mt19937 random(Rounds::seed());
@@ -237,20 +318,10 @@ void tst_PlainTerminal::randomFilters()
     while (m_filters < count) {
         const quint32 seed = random();
         Generator generator(seed);
-        const QString path = m_folder.filePath("program.log");
-        ProgramLife life(path, 0, 1741000000000 + generator.below(100000000), seed + 1);
-        for (int step = generator.below(40); step >= 0; --step)
-            life.step();
-        life.save();
-        QFile settings(m_folder.filePath("logsettings.cfg"));
-        QVERIFY(settings.open(QIODevice::WriteOnly));
-        settings.write("<LogSettings><config><dateTimeFormat>" + life.formats()[0].toLatin1() +
-                       "</dateTimeFormat></config></LogSettings>\n");
-        settings.close();
-        QStringList files;
-        for (QString const& name :
-             QDir(m_folder.path()).entryList({"program.log*"}, QDir::Files, QDir::Name))
-            files.append(m_folder.filePath(name));
+        ProgramLife life(m_folder.filePath("program.log"), 0,
+                         1741000000000 + generator.below(100000000), seed + 1);
+        const QStringList files = makeLog(life, generator);
+        QVERIFY(!files.isEmpty());
         for (int i = 0; i < 4; ++i)
             compare(life, files, generator.next());
         if (QTest::currentTestFailed()) {
@@ -264,8 +335,50 @@ void tst_PlainTerminal::randomFilters()
     QVERIFY(m_empty < count / 2);
 }
 
+// Of the current file or of a program's whole log.
+void tst_PlainTerminal::randomSpans()
+{
+    const QString folder = m_folder.filePath("data/yourorganization/Notes/logs");
+    QVERIFY(QDir().mkpath(folder));
+    const QString path = folder + "/notes.log";
+    std::mt19937 random(Rounds::seed());
+    const int count = Rounds::count(40, 10000, 100000);
+    while (m_spans < count) {
+        const quint32 seed = random();
+        Generator generator(seed);
+        ProgramLife life(path, 0, 1741000000000 + generator.below(100000000), seed + 1);
+        const QStringList files = makeLog(life, generator);
+        const LogLineParser parser(life.formats(), {});
+        for (int i = 0; i < 4 && QFile::exists(path); ++i) {
+            const bool isAll = generator.chance(2);
+            Options options = generator.next();
+            const QByteArray whole = Viewed(path, parser, options, isAll);
+            generator.addSpan(options, life);
+            const QByteArray viewed = Viewed(path, parser, options, isAll);
+            const ProgramResult result =
+                RunProgram(VELOCOR_LOG, QStringList(isAll ? "notes" : path) + options.arguments,
+                           PrivateEnvironment(m_folder.path()));
+            QByteArray printed = result.output;
+            if (!printed.isEmpty() && !printed.endsWith('\n'))
+                printed += '\n'; // the last line of the file has no end
+            if (printed != viewed)
+                qWarning("span %d, of seed %u", m_spans, seed);
+            QCOMPARE(printed, viewed);
+            QCOMPARE(result.exitCode, viewed.isEmpty() ? 1 : 0);
+            QCOMPARE(result.errors, QByteArray());
+            ++m_spans;
+            m_cut += !viewed.isEmpty() && viewed != whole;
+        }
+        for (QString const& file : files)
+            QFile::remove(file);
+    }
+    QVERIFY2(m_cut > count / 10, qPrintable(QString::number(m_cut)));
+}
+
 void tst_PlainTerminal::cleanupTestCase()
 {
+    std::printf("plain terminal: %d filters with spans of time, %d that leave out some lines\n",
+                m_spans, m_cut);
     std::printf("plain terminal: %d filters, %d that nothing matches, %lld bytes printed\n",
                 m_filters, m_empty, static_cast<long long>(m_bytes));
     std::fflush(stdout);

@@ -225,6 +225,16 @@ void TakeActivity(MainWindow& window, Camera const& camera)
     QTest::qWait(500);
     panel->GoToProblem(-1);
     camera.take(window, "activity");
+
+    auto* more = ByName<QAbstractButton>(panel, "More filters");
+    more->setChecked(true);
+    ByName<QLineEdit>(panel, "From")->setText("2025-03-03 14:35");
+    ByName<QLineEdit>(panel, "Until")->setText("2025-03-03 14:42");
+    QTest::qWait(1000);
+    panel->GoToProblem(-1);
+    camera.take(window, "times");
+    panel->ClearFilter();
+    more->setChecked(false);
     Trigger(window, "Activity");
     Trigger(window, "Close Tab");
 }
