@@ -98,7 +98,7 @@ QString tst_ActivityCounter::write(QByteArray const& log, char const* name) cons
 
 void tst_ActivityCounter::index(QByteArray const& log)
 {
-    m_request.path = write(log);
+    m_request.source = write(log);
     LogIndex index(m_request.parser, LogFilter(), true);
     index.Begin();
     index.Feed(log.constData(), log.size());
@@ -262,7 +262,7 @@ void tst_ActivityCounter::lineThatGrows()
     const QByteArray all = first + "ing x\n" + entry("10:00:01.000", "Trace", "x");
     LogIndex index(LogLineParser(), LogFilter(), true);
     index.Begin();
-    m_request.path = write(all);
+    m_request.source = write(all);
     index.Feed(first.constData(), first.size());
     index.End();
     m_request.rows = std::make_shared<LogRows>(index.Rows(LogFilter()));
@@ -285,7 +285,7 @@ void tst_ActivityCounter::anotherFile()
     m_request.parts = 2;
     index(Seconds(4));
     QCOMPARE(count().bars[0].entries(), size_t(2));
-    m_request.path = write(Seconds(1).repeated(3) + Seconds(4).right(Seconds(1).size()), "b.log");
+    m_request.source = write(Seconds(1).repeated(3) + Seconds(4).right(Seconds(1).size()), "b.log");
     QCOMPARE(count().bars[0].entries(), size_t(3));
     QCOMPARE(m_activity.bars[1].entries(), size_t(1));
 }
@@ -334,7 +334,7 @@ void tst_ActivityCounter::earlierRuns()
 void tst_ActivityCounter::headings()
 {
     const QByteArray log = DemoLog::lifelike();
-    m_request.path = write(log);
+    m_request.source = write(log);
     LogIndex index(LogLineParser(), LogFilter(), false);
     index.Begin();
     index.Feed(log.constData(), log.size());
