@@ -34,7 +34,7 @@ packages_of() {
     */wayland) echo qtwayland5 ;;
     */test)
         echo xvfb xauth shared-mime-info pkg-config valgrind doxygen locales-all dpkg-dev \
-            at-spi2-core dbus dbus-daemon python3-gi openbox orca xdotool \
+            at-spi2-core dbus dbus-daemon python3-gi openbox xdotool \
             desktop-file-utils libspdlog-dev qttranslations5-l10n
         ;;
     */bench)
@@ -42,6 +42,7 @@ packages_of() {
             liblog4cxx-dev libboost-dev libboost-log-dev libgoogle-glog-dev libkf5config-dev \
             libpugixml-dev libxml2-dev grep ripgrep ugrep lnav glogg
         ;;
+    */orca) echo orca ;;
     */fuzz) echo clang-14 libclang-rt-14-dev ;;
     */package) echo dpkg-dev debhelper doxygen lintian devscripts blhc desktop-file-utils appstream man-db ;;
     */package-test) echo debootstrap piuparts autopkgtest ;;

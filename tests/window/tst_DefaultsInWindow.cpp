@@ -93,8 +93,7 @@ void tst_DefaultsInWindow::withoutDefaultsNothingChanges()
 {
     const ShownDefaults shown((QByteArray()));
     QVERIFY(!shown.isBold(0, 1) && !shown.isBold(2, 0));
-    for (char const* text :
-         {"Back to Default", "All Back to Default"})
+    for (char const* text : {"Back to Default", "All Back to Default"})
         QVERIFY(!Action(*shown.window, text)->isEnabled());
     GoTo(shown.tree, ItemCell(shown.tree, 0, 1, 0));
     QTest::keyClick(shown.tree, Qt::Key_Backspace, Qt::ControlModifier);
