@@ -3,6 +3,7 @@
 
 #include "app/history/FamilyScanner.h"
 
+#include "app/history/FamilyChange.h"
 #include "app/history/HistoryScanner.h"
 
 #include <QMutexLocker>
@@ -24,9 +25,9 @@ struct FamilyScanner::Log
     LogKeys keys;
     bool hasKeys = false; // those of the update
 
-    // Among the lines of all logs, as merged last.
+    // Among the lines of all logs, as merged last and before.
     LineTable lines;
-    size_t firstLine = 0;
+    FamilyLines place;
 
     bool isOther(LogFileType const& type) const
     {
@@ -35,9 +36,6 @@ struct FamilyScanner::Log
 };
 
 namespace {
-
-// How far apart two changes may be for the rows between them to be found again.
-constexpr size_t MostChanged = 64;
 
 qint64 StartOf(size_t log)
 {
@@ -59,8 +57,7 @@ public:
 
     void AddTo(LogRows& rows)
     {
-        rows.AddMergedLine(m_firstLine + m_rows->line(m_row),
-                           m_rows->mark(m_row) & LogRows::Context);
+        rows.AddMergedLine(m_firstLine + m_rows->line(m_row), m_rows->isContext(m_row));
         ++m_row;
         Skip();
     }
@@ -78,78 +75,6 @@ private:
     size_t m_firstLine;
     size_t m_row = 0;
     qint64 m_key = 0;
-};
-
-// What differs between two lists of rows: some rows in one place, and more at the end.
-class FamilyChange
-{
-public:
-    FamilyChange(LogRows const& before, LogRows const& after)
-        : m_before(before), m_after(after), m_beforeStarts(before), m_afterStarts(after)
-    {}
-
-    void Find(HistoryUpdate& update)
-    {
-        const size_t shorter = std::min(m_before.size(), m_after.size());
-        size_t same = 0;
-        while (same < shorter && isSame(same, same))
-            ++same;
-        update.changeAt = same;
-        update.removed = 0;
-        update.inserted = 0;
-        update.changedTail = 0;
-        update.isReset = same < m_before.size() && !findNext(update);
-    }
-
-private:
-    bool isSame(size_t before, size_t after)
-    {
-        return m_before.mark(before) == m_after.mark(after) &&
-               m_before.check(before) == m_after.check(after) &&
-               m_beforeStarts.start(before) == m_afterStarts.start(after);
-    }
-
-    bool isSameToEnd(size_t before, size_t after)
-    {
-        if (m_after.size() - after < m_before.size() - before)
-            return false;
-        while (before < m_before.size() && isSame(before, after)) {
-            ++before;
-            ++after;
-        }
-        return before == m_before.size();
-    }
-
-    // Otherwise, lines that are in both lists would get the rows of others, and a view would lose
-    // the current one. At the end, any rows could be said to be removed.
-    static bool isOnePlace(size_t removed, size_t inserted, bool isAtEnd)
-    {
-        return (removed <= 1 && inserted <= 1) || (!isAtEnd && (removed == 0 || inserted == 0));
-    }
-
-    // Where the rows are the same again.
-    bool findNext(HistoryUpdate& update)
-    {
-        const size_t at = update.changeAt;
-        const size_t mostRemoved = std::min(MostChanged, m_before.size() - at);
-        const size_t mostInserted = std::min(MostChanged, m_after.size() - at);
-        for (size_t removed = 0; removed <= mostRemoved; ++removed) {
-            for (size_t inserted = 0; inserted <= mostInserted; ++inserted) {
-                if (!isOnePlace(removed, inserted, at + removed == m_before.size()) ||
-                    !isSameToEnd(at + removed, at + inserted))
-                    continue;
-                update.removed = removed;
-                update.inserted = inserted;
-                return true;
-            }
-        }
-        return false;
-    }
-
-    LogRows const& m_before;
-    LogRows const& m_after;
-    LogRows::Reader m_beforeStarts;
-    LogRows::Reader m_afterStarts;
 };
 
 } // namespace
@@ -381,7 +306,8 @@ void FamilyScanner::appendLines()
     for (size_t number = 0; number < m_logs.size(); ++number) {
         Log& log = *m_logs[number];
         LineTable const& lines = log.update.rows->lines();
-        size_t line = isSame ? log.lines.CountSame(lines) : 0;
+        log.place.same = log.lines.CountSame(lines);
+        size_t line = isSame ? log.place.same : 0;
         const bool isWhole = isSame && line == lines.size() && line == log.lines.size();
         if (isSame && !isWhole)
             m_lines.Truncate(end + line);
@@ -393,7 +319,8 @@ void FamilyScanner::appendLines()
                                lines.check(line));
         }
         log.lines = lines;
-        log.firstLine = end;
+        log.place.before = log.place.after;
+        log.place.after = end;
         end += lines.size();
     }
 }
@@ -405,7 +332,7 @@ void FamilyScanner::mergeRows(LogRows& rows) const
     std::vector<FamilyRows> logs;
     for (auto const& log : m_logs) {
         if (log->isShown && !log->isOther(type))
-            logs.emplace_back(*log->update.rows, log->keys, log->firstLine);
+            logs.emplace_back(*log->update.rows, log->keys, log->place.after);
     }
     constexpr qint64 Last = std::numeric_limits<qint64>::max();
     while (true) {
@@ -431,6 +358,14 @@ void FamilyScanner::mergeRows(LogRows& rows) const
         while (!logs[first].isEnd() &&
                (logs[first].key() < limit || (isFirstOfBoth && logs[first].key() == limit)));
     }
+}
+
+std::vector<FamilyLines> FamilyScanner::linesOfLogs() const
+{
+    std::vector<FamilyLines> lines;
+    for (auto const& log : m_logs)
+        lines.push_back(log->place);
+    return lines;
 }
 
 // All but the rows.
@@ -490,7 +425,7 @@ void FamilyScanner::report(bool isFolding)
     update.isFolding = isFolding;
     update.isReset = m_isReset;
     if (!m_isReset)
-        FamilyChange(*m_rows, rows).Find(update);
+        FamilyChange(*m_rows, rows, linesOfLogs()).Find(update);
     m_isReset = false;
     m_rows = update.rows;
     m_isTaken = false;

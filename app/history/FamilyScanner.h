@@ -25,6 +25,7 @@ class QTimer;
 namespace Velocor {
 
 class HistoryScanner;
+struct FamilyLines;
 
 /// Reads one log for a view of it or several logs, each with its older files, as one by time.
 ///
@@ -97,6 +98,7 @@ private:
     void makeSource();
     void appendLines();
     void mergeRows(LogRows& rows) const;
+    std::vector<FamilyLines> linesOfLogs() const;
     HistoryUpdate summary() const;
 
     std::atomic<int> m_currentRequest{0};

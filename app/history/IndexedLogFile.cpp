@@ -75,6 +75,12 @@ bool IndexedLogFile::Search(OlderLogFiles const& files, qint64 start, LogFilter 
     return true;
 }
 
+void IndexedLogFile::TakeLines(LineTable const& lines)
+{
+    m_index.TakeLines(lines);
+    m_rows.SetLines(lines, m_rows.newestEnd(), m_rows.complete(), m_rows.end());
+}
+
 QByteArray IndexedLogFile::Separator() const
 {
     return m_index.completeOffset() < m_index.nextOffset() ? m_lineEnd.bytes() : QByteArray();

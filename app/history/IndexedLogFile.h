@@ -38,6 +38,9 @@ public:
     bool Search(OlderLogFiles const& files, qint64 start, LogFilter const& filter,
                 std::function<bool()> const& goesOn);
 
+    /// Takes a table with the same lines instead of its own, because it shares memory with others.
+    void TakeLines(LineTable const& lines);
+
     /// Finds the rows of a filter with the same text.
     void MakeRows(LogFilter const& filter) { m_rows = m_index.Rows(filter); }
 

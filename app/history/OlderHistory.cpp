@@ -156,7 +156,8 @@ bool OlderHistory::read()
         done += file.size();
         reportProgress(done, total);
     }
-    join();
+    joinLines();
+    joinRuns();
     m_isRead = true;
     m_isSearched = true;
     return true;
@@ -180,7 +181,7 @@ void OlderHistory::reportProgress(qint64 done, qint64 total)
     m_progressed(m_percent);
 }
 
-void OlderHistory::join()
+void OlderHistory::joinLines()
 {
     auto older = std::make_shared<OlderLogFiles>();
     m_lines = LineTable();
@@ -194,16 +195,30 @@ void OlderHistory::join()
         older->Add(file.path(), file.file(), file.size(), file.Separator());
     }
     m_older = older;
+    for (size_t file = 0; file < m_files.size(); ++file)
+        m_files[file].TakeLines(
+            m_lines.Part(m_firstLines[file], endOfFile(file), m_older->start(file)));
+}
 
+void OlderHistory::joinRuns()
+{
     m_runs = RunList();
     for (size_t file = 0; file < m_files.size(); ++file) {
-        const size_t end = file + 1 < m_files.size() ? m_firstLines[file + 1] : m_lines.size();
-        m_runs.Add(m_files[file].index().RunStarts(), m_firstLines[file], end,
+        LogIndex const& index = m_files[file].index();
+        const size_t first = m_runs.size();
+        m_runs.Add(index.RunStarts(), m_firstLines[file], endOfFile(file),
                    IndexedLogFile::IdentityOf(m_files[file].path()));
+        const bool isOneRun = m_runs.size() == first + 1;
+        for (size_t run = first; run < m_runs.size(); ++run)
+            m_runs.NoteCounts(run, isOneRun ? index.counts() : m_runs.CountsOf(run, m_lines));
     }
-    for (size_t run = 0; run < m_runs.size(); ++run)
-        m_runs.NoteCounts(run, m_runs.CountsOf(run, m_lines));
     m_runs.NoteTimes(0, m_lines, LogSource(m_path, m_older), m_parser);
+}
+
+// The line after the last one of a file, in the table.
+size_t OlderHistory::endOfFile(size_t file) const
+{
+    return file + 1 < m_files.size() ? m_firstLines[file + 1] : m_lines.size();
 }
 
 void OlderHistory::makeRows(QSet<quint64> const& folded)

@@ -80,7 +80,9 @@ private:
     bool read();
     bool search();
     void reportProgress(qint64 done, qint64 total);
-    void join();
+    void joinLines();
+    void joinRuns();
+    size_t endOfFile(size_t file) const;
     void makeRows(QSet<quint64> const& folded);
 
     std::function<bool()> m_goesOn;

@@ -164,52 +164,86 @@ void LineTable::Block::unpack()
     palette.clear();
 }
 
-qint64 LineTable::start(size_t line) const
+qint64 LineTable::startInBlocks(size_t number) const
 {
     size_t position = 0;
-    return m_blocks.at(line).start(line % BlockSize, position);
+    return m_blocks.at(number).start(number % BlockSize, position);
+}
+
+qint64 LineTable::start(size_t line) const
+{
+    return startInBlocks(m_first + line) - m_offset;
 }
 
 void LineTable::Append(qint64 start, quint8 mark, quint16 check)
 {
-    const size_t position = size() % BlockSize;
+    if (m_blocks.size() > m_first + m_size)
+        cut();
+    const qint64 shifted = start + m_offset;
+    const size_t position = (m_first + m_size) % BlockSize;
     Block& last = m_blocks.Grow();
     if (position > 0)
-        PutLength(last.lengths, start - m_lastStart);
+        PutLength(last.lengths, shifted - m_lastStart);
     if (position % GroupSize == 0)
-        last.groups.push_back({start, last.lengths.size()});
+        last.groups.push_back({shifted, last.lengths.size()});
     last.marks.push_back(mark);
     last.checks.push_back(check);
-    m_lastStart = start;
+    m_lastStart = shifted;
+    ++m_size;
 }
 
 void LineTable::SetMark(size_t line, quint8 mark)
 {
-    m_blocks.Edit(line, [=](Block& block) { block.marks[line % BlockSize] = mark; });
+    const size_t number = m_first + line;
+    m_blocks.Edit(number, [=](Block& block) { block.marks[number % BlockSize] = mark; });
 }
 
 void LineTable::Truncate(size_t line)
 {
-    if (line >= size())
+    if (line >= m_size)
         return;
-    m_blocks.Truncate(line);
-    m_lastStart = line > 0 ? start(line - 1) : 0;
+    m_size = line;
+    cut();
+}
+
+LineTable LineTable::Part(size_t first, size_t end, qint64 offset) const
+{
+    if (first == end)
+        return LineTable();
+    LineTable part = *this;
+    part.m_first += first;
+    part.m_size = end - first;
+    part.m_offset += offset;
+    return part;
+}
+
+// Removes the lines of others after the last one.
+void LineTable::cut()
+{
+    if (m_size == 0) { // a new first line may start before the lines of others
+        *this = LineTable();
+        return;
+    }
+    m_blocks.Truncate(m_first + m_size);
+    m_lastStart = startInBlocks(m_first + m_size - 1);
 }
 
 size_t LineTable::LineAt(qint64 offset) const
 {
     // The last block that starts at the offset or before it.
-    size_t position = 0;
-    size_t end = (size() - 1) / BlockSize + 1;
+    const qint64 shifted = offset + m_offset;
+    size_t position = m_first / BlockSize;
+    size_t end = (m_first + m_size - 1) / BlockSize + 1;
     while (end - position > 1) {
         const size_t middle = position + (end - position) / 2;
-        if (m_blocks.at(middle * BlockSize).groups.front().start > offset)
+        if (m_blocks.at(middle * BlockSize).groups.front().start > shifted)
             end = middle;
         else
             position = middle;
     }
     const size_t first = position * BlockSize;
-    return first + m_blocks.at(first).lineAt(offset);
+    const size_t number = first + m_blocks.at(first).lineAt(shifted);
+    return std::min(std::max(number, m_first) - m_first, m_size - 1);
 }
 
 // By groups, for the goal for following in docs/performance.md: the last block is compared for each
@@ -217,11 +251,14 @@ size_t LineTable::LineAt(qint64 offset) const
 size_t LineTable::CountSame(LineTable const& other) const
 {
     const size_t end = std::min(size(), other.size());
+    const bool isAligned = m_first == other.m_first && m_offset == other.m_offset;
     Reader reader(*this);
     Reader otherReader(other);
-    size_t line = m_blocks.CountShared(other.m_blocks);
+    size_t line = 0;
+    if (isAligned)
+        line = std::max(m_blocks.CountShared(other.m_blocks), m_first) - m_first;
     while (line < end) {
-        if (line % GroupSize == 0 && hasSameGroup(line, other))
+        if (isAligned && (m_first + line) % GroupSize == 0 && hasSameGroup(line, other))
             line += GroupSize;
         else if (mark(line) == other.mark(line) && check(line) == other.check(line) &&
                  reader.start(line) == otherReader.start(line))
@@ -229,27 +266,30 @@ size_t LineTable::CountSame(LineTable const& other) const
         else
             break;
     }
-    return line;
+    return std::min(line, end);
 }
 
+// Of tables whose first lines are at the same place in the blocks.
 bool LineTable::hasSameGroup(size_t line, LineTable const& other) const
 {
-    return m_blocks.at(line).hasSame(line % BlockSize / GroupSize, other.m_blocks.at(line));
+    const size_t number = m_first + line;
+    return m_blocks.at(number).hasSame(number % BlockSize / GroupSize, other.m_blocks.at(number));
 }
 
 qint64 LineTable::Reader::start(size_t line)
 {
-    if (line - m_first >= m_count) {
-        m_first = line - line % GroupSize;
-        m_count = std::min(m_lines->size() - m_first, GroupSize);
-        Block const& block = m_lines->m_blocks.at(line);
+    const size_t number = m_lines->m_first + line;
+    if (number - m_first >= m_count) {
+        m_first = number - number % GroupSize;
+        m_count = std::min(m_lines->m_blocks.size() - m_first, GroupSize);
+        Block const& block = m_lines->m_blocks.at(number);
         Group const& group = block.groups[m_first % BlockSize / GroupSize];
         quint8 const* at = block.lengths.data() + group.position;
         m_starts[0] = group.start;
         for (size_t next = 1; next < m_count; ++next)
             m_starts[next] = m_starts[next - 1] + TakeLength(at);
     }
-    return m_starts[line - m_first];
+    return m_starts[number - m_first] - m_lines->m_offset;
 }
 
 } // namespace Velocor

@@ -30,13 +30,21 @@ class LineTable
     static constexpr size_t GroupSize = 128;
 
 public:
-    size_t size() const { return m_blocks.size(); }
+    size_t size() const { return m_size; }
     bool isEmpty() const { return size() == 0; }
 
     /// Where a line starts in the file, in bytes. Takes longer than the other two; see Reader.
     qint64 start(size_t line) const;
-    quint8 mark(size_t line) const { return m_blocks.at(line).mark(line % BlockSize); }
-    quint16 check(size_t line) const { return m_blocks.at(line).checks[line % BlockSize]; }
+    quint8 mark(size_t line) const
+    {
+        const size_t number = m_first + line;
+        return m_blocks.at(number).mark(number % BlockSize);
+    }
+    quint16 check(size_t line) const
+    {
+        const size_t number = m_first + line;
+        return m_blocks.at(number).checks[number % BlockSize];
+    }
 
     /// Adds a line.
     ///
@@ -55,6 +63,12 @@ public:
     /// How many of the first lines are the same in another table. Shared blocks are not compared.
     size_t CountSame(LineTable const& other) const;
 
+    /// The lines from `first` to the one before `end` as a table of their own, which shares all
+    /// blocks.
+    ///
+    /// @param offset  what the starts are less by
+    LineTable Part(size_t first, size_t end, qint64 offset) const;
+
     /// Lines in a block.
     static constexpr size_t BlockSize = 16384;
 
@@ -69,7 +83,7 @@ public:
 
     private:
         LineTable const* m_lines;
-        size_t m_first = 0; // line
+        size_t m_first = 0; // in the blocks
         size_t m_count = 0;
         std::array<qint64, GroupSize> m_starts{};
     };
@@ -104,10 +118,16 @@ private:
         void unpack();
     };
 
+    qint64 startInBlocks(size_t number) const;
+    void cut();
     bool hasSameGroup(size_t line, LineTable const& other) const;
 
+    // There may be other lines before the first one and after the last one.
     GrowingBlocks<Block, BlockSize> m_blocks;
-    qint64 m_lastStart = 0; // of the last line
+    size_t m_first = 0;
+    size_t m_size = 0;
+    qint64 m_offset = 0;    // of the starts in the blocks
+    qint64 m_lastStart = 0; // of the last line in the blocks
 };
 
 } // namespace Velocor

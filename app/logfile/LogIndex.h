@@ -123,6 +123,9 @@ public:
     /// The number of lines in the file.
     size_t size() const { return m_lines.size(); }
 
+    /// Takes a table with the same lines instead of its own, because it shares memory with others.
+    void TakeLines(LineTable const& lines) { m_lines = lines; }
+
     /// The numbers of entries in the file. None stands for entries without a severity and for other
     /// lines that do not continue an entry; see LogRows::Continued.
     LogCounts const& counts() const { return m_counts; }

@@ -37,9 +37,7 @@ quint8 LogRows::mark(size_t row) const
     if (part.isHeading())
         return LogEntry::None;
     const quint8 mark = RowMark(m_lines.mark(lineOf(part, row)));
-    const bool isContext =
-        part.isList() && (m_numbers.at(part.first + row - part.firstRow) & IsContext);
-    return isContext ? mark | Context | Alone : mark;
+    return isContextOf(part, row) ? mark | Context | Alone : mark;
 }
 
 quint16 LogRows::check(size_t row) const
@@ -104,11 +102,15 @@ void LogRows::AddRows(LogRows const& rows, size_t first, size_t end, size_t offs
     Part const& part = rows.partOf(first);
     if (part.kind == Part::Lines) {
         const size_t line = rows.lineOf(part, first) + offset;
-        AddLines(line, line + end - first);
+        const bool isAll = end - first == rows.size();
+        if (isAll)
+            AddLines(line, line + end - first, rows.problems());
+        else
+            AddLines(line, line + end - first);
         return;
     }
     for (size_t row = first; row < end; ++row)
-        AddLine(rows.lineOf(part, row) + offset, rows.mark(row) & Context);
+        AddLine(rows.lineOf(part, row) + offset, rows.isContext(row));
 }
 
 void LogRows::Truncate(size_t row)
@@ -227,6 +229,38 @@ size_t LogRows::CountSame(LogRows const& other) const
         same = std::min(same, m_numbers.CountSame(other.m_numbers));
     }
     return headings + std::min(same, rowOfLine(part, sameLines) - part.firstRow);
+}
+
+// Where the rows of a part that are the same in other rows end, if they have the same part.
+size_t LogRows::endOfSame(Part const& part, size_t sameLines, size_t sameNumbers) const
+{
+    if (part.isHeading())
+        return endOf(part);
+    if (part.kind == Part::Merged || (part.isList() && sameNumbers < part.first))
+        return part.firstRow;
+    const size_t end = rowOfLine(part, sameLines);
+    return part.isList() ? std::min(end, part.firstRow + sameNumbers - part.first) : end;
+}
+
+// The fast path for following a log with large older files, see docs/performance.md;
+// tst_PlainLogRows compares row by row.
+size_t LogRows::CountSameFirst(LogRows const& other) const
+{
+    const size_t sameLines = m_lines.CountSame(other.m_lines);
+    const size_t sameNumbers = m_numbers.CountSame(other.m_numbers);
+    size_t same = 0;
+    for (size_t i = 0; i < std::min(m_parts.size(), other.m_parts.size()); ++i) {
+        Part const& part = m_parts[i];
+        Part const& otherPart = other.m_parts[i];
+        const bool isSamePlace = part.kind == otherPart.kind && part.first == otherPart.first &&
+                                 part.firstRow == otherPart.firstRow;
+        if (!isSamePlace)
+            break;
+        same = std::min(endOfSame(part, sameLines, sameNumbers), other.endOf(otherPart));
+        if (same < endOf(part))
+            break;
+    }
+    return same;
 }
 
 } // namespace Velocor

@@ -100,6 +100,7 @@ public:
     }
 
     bool isHeading(size_t row) const { return partOf(row).isHeading(); }
+    bool isContext(size_t row) const { return isContextOf(partOf(row), row); }
 
     /// The position in lines(); meaningless for a heading.
     size_t line(size_t row) const { return lineOf(partOf(row), row); }
@@ -132,6 +133,10 @@ public:
     /// How many rows of the newest run, from its first one, are known to be the same in other rows.
     /// There may be more. Takes the same time however many there are.
     size_t CountSame(LogRows const& other) const;
+
+    /// How many rows, from the first one of all, are known to be the same in other rows. There may
+    /// be more. Takes the same time however many there are.
+    size_t CountSameFirst(LogRows const& other) const;
 
     void AddHeading(qint64 start);
 
@@ -217,7 +222,13 @@ private:
         return part.isList() ? m_numbers.at(position) & ~IsContext : position;
     }
 
+    bool isContextOf(Part const& part, size_t row) const
+    {
+        return part.isList() && (m_numbers.at(part.first + row - part.firstRow) & IsContext);
+    }
+
     size_t endOf(Part const& part) const;
+    size_t endOfSame(Part const& part, size_t sameLines, size_t sameNumbers) const;
     size_t rowOfLine(Part const& part, size_t line) const;
     int mergedRowNear(qint64 start) const;
     bool isProblem(size_t row) const;

@@ -67,6 +67,8 @@ public:
             setMark();
         else if (kind < 54)
             keep();
+        else if (kind < 58)
+            takePart();
         else
             look();
     }
@@ -133,6 +135,26 @@ private:
         if (m_kept.size() == 3)
             m_kept.erase(m_kept.begin() + m_draws->below(3));
         m_kept.push_back({m_table, m_plain});
+    }
+
+    // Only of its end, of its start, or of both.
+    void takePart()
+    {
+        if (m_plain.empty())
+            return;
+        if (m_draws->once(2))
+            keep();
+        const int size = int(m_plain.size());
+        const int first = m_draws->once(3) ? 0 : m_draws->below(qMin(size, 20000) + 1);
+        const int end = m_draws->once(3) ? size : first + m_draws->below(size - first + 1);
+        const qint64 offset = first == size || m_draws->once(3) ? 0 : m_plain[size_t(first)].start;
+        tell("take lines # to #", first, end);
+        tell("with starts less by #", offset);
+        m_table = m_table.Part(size_t(first), size_t(end), offset);
+        m_plain = PlainTable(m_plain.begin() + first, m_plain.begin() + end);
+        for (PlainLine& line : m_plain)
+            line.start -= offset;
+        m_end = m_plain.empty() ? 0 : m_plain.back().start;
     }
 
     void look()

@@ -312,6 +312,7 @@ private:
         update.rows = std::make_shared<LogRows>(rows);
         update.Compare(m_before);
         same("update", Numbers(update), Numbers(PlainCompare(PlainRows(m_before), whole)));
+        compareFirst(PlainRows(m_before), grown, m_before.CountSameFirst(rows));
         for (int i = 0; i < 3; ++i) {
             const qint64 start = m_draws->below(m_file.size() + 100);
             same("row near", rows.RowNear(start), whole.rowNear(start));
@@ -319,6 +320,16 @@ private:
         if (m_draws->once(4))
             m_older = m_before;
         m_before = rows;
+    }
+
+    // Those that are known to be the same are the same.
+    void compareFirst(PlainRows const& before, PlainRows const& after, size_t known)
+    {
+        const size_t shorter = qMin(before.rows.size(), after.rows.size());
+        size_t count = 0;
+        while (count < shorter && before.rows[count] == after.rows[count])
+            ++count;
+        same("rows known to be the same", known > count ? known : 0, size_t(0));
     }
 
     QByteArray m_passed;
