@@ -8,14 +8,28 @@
 #include <QAction>
 #include <QEvent>
 
+#include <algorithm>
+
 namespace Velocor {
+
+namespace {
+
+constexpr int UsualIconSize = 20; // pixels
+
+} // namespace
 
 MainToolBar::MainToolBar(QWidget* parent) : QToolBar(parent)
 {
     setAccessibleName(tr("Tools"));
     setMovable(false);
     setContextMenuPolicy(Qt::PreventContextMenu); // the window's would hide it behind the menu item
-    setIconSize(QSize(20, 20));
+    updateIconSize();
+}
+
+void MainToolBar::updateIconSize()
+{
+    const int size = std::max(UsualIconSize, fontMetrics().height());
+    setIconSize(QSize(size, size));
 }
 
 void MainToolBar::AddTool(QAction* action, ActionIcons::Name icon)
@@ -38,6 +52,8 @@ void MainToolBar::AddSpace()
 void MainToolBar::changeEvent(QEvent* event)
 {
     QToolBar::changeEvent(event);
+    if (event->type() == QEvent::FontChange)
+        updateIconSize();
     if (event->type() != QEvent::PaletteChange)
         return;
     for (Tool const& tool : qAsConst(m_tools))

@@ -7,12 +7,16 @@
 #include "app/window/widgets/Contrast.h"
 
 #include <QAbstractScrollArea>
+#include <QApplication>
 #include <QEvent>
+#include <QFontMetrics>
 #include <QMetaEnum>
 #include <QPainter>
 #include <QPalette>
 #include <QStyleOption>
 #include <QWidget>
+
+#include <algorithm>
 
 namespace Velocor {
 
@@ -117,6 +121,28 @@ QSize ReachableStyle::sizeFromContents(ContentsType type, QStyleOption const* op
     case CT_ToolButton:
         return IsSeparator(type, option) ? usual
                                          : usual.expandedTo(QSize(LeastTarget, LeastTarget));
+    default:
+        return usual;
+    }
+}
+
+int ReachableStyle::pixelMetric(PixelMetric metric, QStyleOption const* option,
+                                QWidget const* widget) const
+{
+    const int usual = QProxyStyle::pixelMetric(metric, option, widget);
+    const QFontMetrics font = widget ? widget->fontMetrics() : QFontMetrics(QApplication::font());
+    switch (metric) {
+    case PM_ButtonIconSize:
+    case PM_ListViewIconSize:
+    case PM_SmallIconSize:
+    case PM_TabBarIconSize:
+    case PM_ToolBarIconSize:
+        return std::max(usual, font.height());
+    case PM_ExclusiveIndicatorHeight:
+    case PM_ExclusiveIndicatorWidth:
+    case PM_IndicatorHeight:
+    case PM_IndicatorWidth:
+        return std::max(usual, font.height() * 2 / 3);
     default:
         return usual;
     }

@@ -28,6 +28,10 @@ public:
     QSize sizeFromContents(ContentsType type, QStyleOption const* option, QSize const& size,
                            QWidget const* widget) const override;
 
+    /// Icons and check boxes grow with the text beside them, if that is larger than usual.
+    int pixelMetric(PixelMetric metric, QStyleOption const* option,
+                    QWidget const* widget) const override;
+
     /// Fields and check boxes have a frame that can be seen in any colors.
     ///
     /// The part with the keyboard focus has a frame, also where Fusion shows nothing, as on lists,

@@ -12,6 +12,7 @@
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QPushButton>
+#include <QStyle>
 
 namespace Velocor {
 
@@ -54,13 +55,15 @@ void NoticeBar::updateColors()
     colors.setColor(QPalette::Window, Blended(outer.color(QPalette::Base), warning, Tint));
     if (palette().color(QPalette::Window) != colors.color(QPalette::Window))
         setPalette(colors);
-    m_icon->setPixmap(SeverityIcons::Icon(LogEntry::Warning, outer).pixmap(16));
+    const int size = style()->pixelMetric(QStyle::PM_SmallIconSize, nullptr, this);
+    m_icon->setPixmap(SeverityIcons::Icon(LogEntry::Warning, outer).pixmap(size));
 }
 
 void NoticeBar::changeEvent(QEvent* event)
 {
     QFrame::changeEvent(event);
-    if (event->type() == QEvent::PaletteChange || event->type() == QEvent::ParentChange)
+    if (event->type() == QEvent::PaletteChange || event->type() == QEvent::ParentChange ||
+        event->type() == QEvent::FontChange || event->type() == QEvent::StyleChange)
         updateColors();
 }
 
