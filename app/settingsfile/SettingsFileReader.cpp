@@ -102,6 +102,24 @@ void SettingsFileReader::noteLossAt(int depth, QString const& what)
                               QObject::tr("Line %1: %2").arg(m_locator->lineNumber()).arg(what)});
 }
 
+bool SettingsFileReader::startPrefixMapping(QString const& prefix, QString const& uri)
+{
+    m_namespaces.append(uri);
+    return TorkConfigFileDocHandler::startPrefixMapping(prefix, uri);
+}
+
+// The store knows elements by their names without prefix.
+void SettingsFileReader::noteLossOfNamespaces(int depth, QString const& localName,
+                                              QString const& qName)
+{
+    for (QString const& uri : qAsConst(m_namespaces))
+        noteLossAt(depth,
+                   QObject::tr("the namespace \"%1\" declared by \"%2\"").arg(uri, localName));
+    m_namespaces.clear();
+    if (qName != localName)
+        noteLossAt(depth, QObject::tr("the prefix of \"%1\"").arg(qName));
+}
+
 bool SettingsFileReader::startElement(QString const& namespaceURI, QString const& localName,
                                       QString const& qName, QXmlAttributes const& attributes)
 {
@@ -119,6 +137,7 @@ bool SettingsFileReader::startElement(QString const& namespaceURI, QString const
         m_section = localName;
     else if (newDepth == 3)
         m_item = localName;
+    noteLossOfNamespaces(newDepth, localName, qName);
     for (int i = 0; i < attributes.count(); ++i)
         noteLossAt(
             newDepth,

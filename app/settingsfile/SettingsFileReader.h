@@ -59,9 +59,11 @@ private:
     static void read(QIODevice& device, SettingsDocument& document, int mostKeys);
     void noteLoss(QString const& what) { noteLossAt(depth(), what); }
     void noteLossAt(int depth, QString const& what);
+    void noteLossOfNamespaces(int depth, QString const& localName, QString const& qName);
     void noteLossOfValue();
 
     void setDocumentLocator(QXmlLocator* locator) override { m_locator = locator; }
+    bool startPrefixMapping(QString const& prefix, QString const& uri) override;
     bool startElement(QString const& namespaceURI, QString const& localName, QString const& qName,
                       QXmlAttributes const& attributes) override;
     bool endElement(QString const& namespaceURI, QString const& localName,
@@ -80,6 +82,7 @@ private:
     QString m_section;                // the names of the last section and item that began
     QString m_item;
     bool m_isAfterValue = false; // in the same item
+    QStringList m_namespaces;    // declared by the element that begins next
 };
 
 } // namespace Velocor

@@ -199,6 +199,10 @@ void tst_SettingsFile::lossTexts_data()
     row("attributes", "<R x='1'><S y='2'><a n:z='3' w='4'>v</a></S></R>",
         {"Line 1: the attribute \"x\" of \"R\"", "Line 1: the attribute \"y\" of \"S\"",
          "Line 1: the attribute \"n:z\" of \"a\"", "Line 1: the attribute \"w\" of \"a\""});
+    row("namespaces", "<R xmlns='u'><p:S xmlns:p='v'><p:a>1</p:a><b xmlns:q='w'>2</b></p:S></R>",
+        {"Line 1: the namespace \"u\" declared by \"R\"",
+         "Line 1: the namespace \"v\" declared by \"S\"", "Line 1: the prefix of \"p:S\"",
+         "Line 1: the prefix of \"p:a\"", "Line 1: the namespace \"w\" declared by \"b\""});
     row("key thrice", "<R><S><a>1</a><a>2</a><a>3</a></S></R>",
         {"Line 1: the first value of \"a\", replaced by a second one",
          "Line 1: the first value of \"a\", replaced by a second one"});
