@@ -3,6 +3,7 @@
 
 #include "app/runninglog/LogHealth.h"
 
+#include "app/language/LeftToRight.h"
 #include "app/runninglog/InstanceList.h"
 #include "app/runninglog/RunningLog.h"
 #include "common/log/TorkLog.h"
@@ -68,9 +69,10 @@ QString LogHealth::writingProblem()
     const QFileInfo file(RunningLog::FileName());
     const bool usable = file.isFile() && file.isWritable();
     if (!log->errorString().isEmpty() && !usable)
-        return QObject::tr("Cannot write the log: %1").arg(log->errorString());
+        return QObject::tr("Cannot write the log: %1").arg(LeftToRight(log->errorString()));
     if (file.exists() && !usable)
-        return QObject::tr("Cannot write the log: %1 is not writable").arg(file.filePath());
+        return QObject::tr("Cannot write the log: %1 is not writable")
+            .arg(LeftToRight(file.filePath()));
 
     // Where there is no limit, both are 0.
     const QStorageInfo storage(file.path());

@@ -3,6 +3,7 @@
 
 #include "app/runninglog/LogPreferences.h"
 
+#include "app/language/LeftToRight.h"
 #include "app/runninglog/RunningLog.h"
 #include "common/config/TorkConfigFile.h"
 #include "common/config/TorkConfigText.h"
@@ -126,7 +127,8 @@ QString LogPreferences::save(unsigned maxFileSize, unsigned files) const
     const SettingsFile readBack(fileName);
     const bool arrived = readBack.isLoaded() && readBack.ToXml() == file.ToXml();
     return arrived ? QString()
-                   : QObject::tr("The settings file %1 is incomplete after saving.").arg(fileName);
+                   : QObject::tr("The settings file %1 is incomplete after saving.")
+                         .arg(LeftToRight(fileName));
 }
 
 // A control character would break log lines.

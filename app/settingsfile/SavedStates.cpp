@@ -3,6 +3,8 @@
 
 #include "app/settingsfile/SavedStates.h"
 
+#include "app/language/LeftToRight.h"
+
 #include <QCryptographicHash>
 #include <QDir>
 #include <QFile>
@@ -72,9 +74,9 @@ QString SavedStates::makeFolder() const
     const QFileInfo folder(m_folder.left(m_folder.size() - 1));
     const bool isThere = folder.isDir() && !folder.isSymLink();
     if (!isThere && !QDir().mkpath(m_folder))
-        return QObject::tr("Cannot create the folder %1").arg(m_folder);
+        return QObject::tr("Cannot create the folder %1").arg(LeftToRight(m_folder));
     if (!QFile::setPermissions(m_folder, own))
-        return QObject::tr("Cannot protect the folder %1").arg(m_folder);
+        return QObject::tr("Cannot protect the folder %1").arg(LeftToRight(m_folder));
     return QString();
 }
 

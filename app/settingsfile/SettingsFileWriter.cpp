@@ -3,6 +3,7 @@
 
 #include "app/settingsfile/SettingsFileWriter.h"
 
+#include "app/language/LeftToRight.h"
 #include "app/settingsfile/SettingsFileReader.h"
 #include "common/config/TorkConfigFile.h"
 #include "common/config/TorkConfigText.h"
@@ -200,7 +201,7 @@ bool SettingsFileWriter::SaveCopy(QString const& path, QString const& original, 
 {
     QFile content(original);
     if (!QFileInfo(original).isFile() || !content.open(QIODevice::ReadOnly)) {
-        *error = QObject::tr("%1 cannot be read any more.").arg(original);
+        *error = QObject::tr("%1 cannot be read any more.").arg(LeftToRight(original));
         return false;
     }
     return SaveContent(path, content, error);
@@ -215,7 +216,7 @@ bool SettingsFileWriter::KeepBackup(QString const& path, QString* error)
         return false;
     }
     if (QFile::exists(copy) && !QFile::remove(copy)) {
-        *error = QObject::tr("Cannot replace the file %1.").arg(copy);
+        *error = QObject::tr("Cannot replace the file %1.").arg(LeftToRight(copy));
         return false;
     }
     QFile file(path);

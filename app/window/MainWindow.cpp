@@ -28,6 +28,8 @@
 #include "app/window/widgets/ElidedLabel.h"
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
+#include "app/window/widgets/TallArea.h"
+#include "app/window/widgets/TurningSplitter.h"
 
 #include <QActionGroup>
 #include <QCloseEvent>
@@ -36,7 +38,6 @@
 #include <QMenuBar>
 #include <QPushButton>
 #include <QScreen>
-#include <QSplitter>
 #include <QStatusBar>
 #include <QVBoxLayout>
 
@@ -137,7 +138,7 @@ void MainWindow::makeTabs()
 {
     m_notice = new NoticeBar;
     m_tabs = new FileTabs(&m_marks);
-    m_splitter = new QSplitter;
+    m_splitter = new TurningSplitter;
     m_splitter->setAccessibleName(tr("Places and files"));
     m_splitter->setChildrenCollapsible(false);
     m_splitter->addWidget(m_tabs);
@@ -147,7 +148,7 @@ void MainWindow::makeTabs()
     layout->setContentsMargins(0, 0, 0, 0);
     layout->setSpacing(0);
     layout->addWidget(m_notice);
-    layout->addWidget(m_splitter, 1);
+    layout->addWidget(new TallArea(m_splitter), 1);
     setCentralWidget(content);
     content->show(); // Qt would do it in the next turn of the event loop
 
@@ -349,7 +350,7 @@ void MainWindow::saveState()
     MenuActions const& actions = m_menus->actions();
     m_settings.NoteGeometry(this);
     m_settings.SetFlag(QStringLiteral("placesShown"), actions.showPlaces->isChecked());
-    if (actions.showPlaces->isChecked())
+    if (actions.showPlaces->isChecked() && m_splitter->orientation() == Qt::Horizontal)
         m_settings.SetNumbers(QStringLiteral("panes"), m_splitter->sizes());
     m_textFont->Save(m_settings);
     m_settings.SetFlag(QStringLiteral("lineWrap"), actions.lineWrap->isChecked());

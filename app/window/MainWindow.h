@@ -15,7 +15,6 @@
 #include <vector>
 
 class QMenu;
-class QSplitter;
 
 namespace Velocor {
 
@@ -30,6 +29,7 @@ class NoticeBar;
 class PlacesPanel;
 class RunMark;
 class TextFont;
+class TurningSplitter;
 class WindowDialogs;
 
 /// The main window: the live log, program identity and file locations, other log and settings
@@ -97,7 +97,7 @@ private:
     QString m_startupMessage; ///< about a damaged settings file
     NoticeBar* m_notice = nullptr;
     NoticeBar* m_health = nullptr; ///< above the program's log
-    QSplitter* m_splitter = nullptr;
+    TurningSplitter* m_splitter = nullptr;
     PlacesPanel* m_places = nullptr; ///< null until they are shown
     MainToolBar* m_toolBar = nullptr;
     FileTabs* m_tabs = nullptr; ///< null until the window is complete

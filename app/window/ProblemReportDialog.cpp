@@ -31,20 +31,21 @@ namespace Velocor {
 
 namespace {
 
-constexpr int TypingPause = 300;        // milliseconds
-constexpr int ChoicesWidth = 250;       // pixels
+constexpr int TypingPause = 300;  // milliseconds
+constexpr int ChoicesWidth = 250; // pixels
+constexpr int LeastLines = 4;
 constexpr int MaximumShownSecret = 100; // characters
 
 } // namespace
 
 ProblemReportDialog::ProblemReportDialog(QList<ReportPart> const& parts, Redactor const& redactor,
                                          QWidget* parent)
-    : QDialog(parent), m_parts(parts), m_redactor(redactor), m_secrets(new QListWidget),
+    : FittingDialog(parent), m_parts(parts), m_redactor(redactor), m_secrets(new QListWidget),
       m_words(new QLineEdit), m_files(new QComboBox), m_text(new QPlainTextEdit),
       m_marks(new PlaceholderMarks(m_text->document()))
 {
     setWindowTitle(tr("Save Report"));
-    auto* middle = new QHBoxLayout;
+    auto* middle = new QBoxLayout(QBoxLayout::LeftToRight);
     middle->addLayout(newChoices());
     middle->addLayout(newPreview(), 1);
 
@@ -68,6 +69,8 @@ ProblemReportDialog::ProblemReportDialog(QList<ReportPart> const& parts, Redacto
     m_wordsTimer.setInterval(TypingPause);
     connect(&m_wordsTimer, &QTimer::timeout, this, &ProblemReportDialog::update);
     update();
+    if (layout->totalMinimumSize().width() > Room().width())
+        middle->setDirection(QBoxLayout::TopToBottom);
     // With a wrapped label, Qt does not see to the least height.
     const int width = std::max(760, layout->sizeHint().width());
     resize(width, std::max(540, layout->heightForWidth(width)));
@@ -105,6 +108,7 @@ QLayout* ProblemReportDialog::newChoices()
     secretsLabel->setBuddy(m_secrets);
     m_secrets->setAccessibleName(tr("Replaced by placeholders"));
     m_secrets->setMinimumWidth(ChoicesWidth);
+    m_secrets->setMinimumHeight(LeastLines * m_secrets->fontMetrics().lineSpacing());
     m_secrets->setSizePolicy(QSizePolicy::Preferred, QSizePolicy::Expanding);
     connect(m_secrets, &QListWidget::itemChanged, this, &ProblemReportDialog::choose);
     layout->addSpacing(6);
@@ -127,6 +131,7 @@ QLayout* ProblemReportDialog::newPreview()
     row->addWidget(m_files, 1);
 
     m_text->setReadOnly(true);
+    m_text->setMinimumHeight(LeastLines * m_text->fontMetrics().lineSpacing());
     ShowUnwrapped(m_text);
     m_text->setAccessibleName(tr("Report"));
     m_text->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);

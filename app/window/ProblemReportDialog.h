@@ -6,8 +6,8 @@
 #include "app/report/Redactor.h"
 #include "app/report/Report.h"
 #include "app/report/ReportPart.h"
+#include "app/window/widgets/FittingDialog.h"
 
-#include <QDialog>
 #include <QList>
 #include <QString>
 #include <QTimer>
@@ -28,7 +28,7 @@ class PlaceholderMarks;
 
 /// Makes a report of a problem: the user chooses its parts and what placeholders replace, and sees
 /// each file as it will be saved, with the placeholders marked.
-class ProblemReportDialog : public QDialog
+class ProblemReportDialog : public FittingDialog
 {
     Q_OBJECT
 

@@ -19,7 +19,7 @@ namespace Velocor {
 
 ReportDialog::ReportDialog(QString const& title, QString const& heading, QString const& text,
                            QWidget* parent)
-    : QDialog(parent), m_text(new QPlainTextEdit(text))
+    : FittingDialog(parent), m_text(new QPlainTextEdit(text))
 {
     setWindowTitle(title);
     m_text->setReadOnly(true);

@@ -3,7 +3,8 @@
 
 #pragma once
 
-#include <QDialog>
+#include "app/window/widgets/FittingDialog.h"
+
 #include <QString>
 
 class QPlainTextEdit;
@@ -11,7 +12,7 @@ class QPlainTextEdit;
 namespace Velocor {
 
 /// Shows a text about the program that can be copied.
-class ReportDialog : public QDialog
+class ReportDialog : public FittingDialog
 {
     Q_OBJECT
 

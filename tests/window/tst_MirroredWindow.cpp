@@ -8,6 +8,9 @@
 #include "WindowParts.h"
 #include "WindowTestCase.h"
 
+#include "app/runninglog/LogHealth.h"
+#include "app/settingsfile/SavedStates.h"
+#include "app/settingsfile/SettingsFileWriter.h"
 #include "app/window/log/ActivityStrip.h"
 #include "app/window/log/LineNumberMargin.h"
 #include "app/window/log/LogOverview.h"
@@ -35,6 +38,10 @@ using DemoLog::entry;
 
 using Painter = std::function<QImage(MainWindow&, PseudoLanguage const&)>;
 Q_DECLARE_METATYPE(Painter)
+
+// What fails, and the path that the message names.
+using Failure = std::function<QPair<QString, QString>(TestRun const&)>;
+Q_DECLARE_METATYPE(Failure)
 
 namespace {
 
@@ -79,7 +86,9 @@ bool readsLeftToRight(QString const& text, QString const& part)
     const int start = text.indexOf(part);
     if (start < 0)
         return false;
-    QTextLayout layout(text, QApplication::font());
+    QFont font = QApplication::font();
+    font.setLetterSpacing(QFont::AbsoluteSpacing, 1); // without ligatures: one glyph a character
+    QTextLayout layout(text, font);
     QTextOption option;
     option.setTextDirection(Qt::RightToLeft);
     layout.setTextOption(option);
@@ -117,6 +126,8 @@ private slots:
     void staysLeftToRight();
     void pathsInSentences_data();
     void pathsInSentences();
+    void pathsInErrors_data();
+    void pathsInErrors();
     void controlsAreMirrored();
     void sidesOfTheLog();
     void iconsAreNotMirrored();
@@ -215,7 +226,7 @@ void tst_MirroredWindow::pathsInSentences()
     QFETCH(QByteArray, content);
     const PseudoLanguage language(PseudoLanguage::Mirrored);
     const WindowTest test(OddLog);
-    const QString path = test.folder() + "a.cfg";
+    const QString path = test.folder() + "office.cfg";
     if (!content.isEmpty())
         QVERIFY(TestFiles::write(path, content));
     const auto window = WindowTest::show({path});
@@ -231,6 +242,45 @@ void tst_MirroredWindow::pathsInSentences()
         QVERIFY2(readsLeftToRight(text, path), qPrintable(text));
     const QString place = Child<QLabel>(window.get(), language.of("Documents"))->text();
     QVERIFY2(readsLeftToRight(place, test.folder() + "documents/"), qPrintable(place));
+}
+
+void tst_MirroredWindow::pathsInErrors_data()
+{
+    QTest::addColumn<Failure>("fail");
+    const auto row = [](char const* name, Failure const& fail) {
+        QTest::newRow(name) << fail;
+    };
+    row("log that is a folder", [](TestRun const& run) {
+        TorkLog::logger()->setEnable(true);
+        QFile::remove(run.logFile());
+        QDir().mkpath(run.logFile());
+        return qMakePair(LogHealth().Check(), run.logFile());
+    });
+    row("folder that cannot be created", [](TestRun const& run) {
+        const QString folder = run.logFile() + "/states/";
+        return qMakePair(SavedStates(folder).Keep(run.logFile()), folder);
+    });
+    row("file that is gone", [](TestRun const& run) {
+        QString error;
+        const QString original = run.folder() + "gone.cfg";
+        SettingsFileWriter::SaveCopy(run.folder() + "a.cfg", original, &error);
+        return qMakePair(error, original);
+    });
+    row("backup that is a folder", [](TestRun const& run) {
+        QString error;
+        QDir().mkpath(run.logFile() + ".bak");
+        SettingsFileWriter::KeepBackup(run.logFile(), &error);
+        return qMakePair(error, run.logFile() + ".bak");
+    });
+}
+
+void tst_MirroredWindow::pathsInErrors()
+{
+    QFETCH(Failure, fail);
+    const PseudoLanguage language(PseudoLanguage::Mirrored);
+    const TestRun run(OddLog);
+    const auto failed = fail(run);
+    QVERIFY2(readsLeftToRight(failed.first, failed.second), qPrintable(failed.first));
 }
 
 void tst_MirroredWindow::controlsAreMirrored()

@@ -18,7 +18,7 @@
 namespace Velocor {
 
 GoToDialog::GoToDialog(qint64 lines, bool hasCurrent, QWidget* parent)
-    : QDialog(parent), m_lines(lines), m_hasCurrent(hasCurrent), m_text(new QLineEdit),
+    : FittingDialog(parent), m_lines(lines), m_hasCurrent(hasCurrent), m_text(new QLineEdit),
       m_error(NewPlainLabel())
 {
     setWindowTitle(tr("Go To"));

@@ -4,8 +4,7 @@
 #pragma once
 
 #include "app/logfile/LogPlace.h"
-
-#include <QDialog>
+#include "app/window/widgets/FittingDialog.h"
 
 class QLabel;
 class QLineEdit;
@@ -14,7 +13,7 @@ class QPushButton;
 namespace Velocor {
 
 /// Asks for a line number or a time to go to. Says what is wrong while the user types.
-class GoToDialog : public QDialog
+class GoToDialog : public FittingDialog
 {
     Q_OBJECT
 

@@ -27,7 +27,7 @@
 namespace Velocor {
 
 HighlightDialog::HighlightDialog(std::shared_ptr<HighlightRules> const& rules, QWidget* parent)
-    : QDialog(parent), m_shared(rules), m_before(rules->rules()), m_rules(rules->rules()),
+    : FittingDialog(parent), m_shared(rules), m_before(rules->rules()), m_rules(rules->rules()),
       m_list(new QListWidget), m_text(new QLineEdit), m_case(new QCheckBox(tr("&Match case"))),
       m_expression(new QCheckBox(tr("Regular &expression"))), m_color(new QComboBox),
       m_error(NewPlainLabel())

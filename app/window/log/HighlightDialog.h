@@ -4,8 +4,7 @@
 #pragma once
 
 #include "app/window/log/HighlightRules.h"
-
-#include <QDialog>
+#include "app/window/widgets/FittingDialog.h"
 
 #include <memory>
 
@@ -21,7 +20,7 @@ namespace Velocor {
 
 /// Changes the rules that highlight lines. The logs show each change at once; Cancel takes all of
 /// them back.
-class HighlightDialog : public QDialog
+class HighlightDialog : public FittingDialog
 {
     Q_OBJECT
 

@@ -8,6 +8,7 @@
 #include "app/window/log/SeveritySwitches.h"
 #include "app/window/widgets/FlowLayout.h"
 #include "app/window/widgets/PlainText.h"
+#include "app/window/widgets/WrappedLabel.h"
 
 #include <QCheckBox>
 #include <QComboBox>
@@ -30,7 +31,7 @@ constexpr int MaximumShown = 80; // characters of an earlier filter
 
 LogFilterBar::LogFilterBar(QWidget* parent)
     : QWidget(parent), m_text(new QLineEdit), m_severities(new SeveritySwitches),
-      m_error(NewPlainLabel())
+      m_error(new WrappedLabel)
 {
     m_text->setPlaceholderText(tr("Filter"));
     m_text->setClearButtonEnabled(true);
@@ -40,7 +41,6 @@ LogFilterBar::LogFilterBar(QWidget* parent)
     m_text->installEventFilter(this);
     m_error->setAccessibleName(tr("Filter error"));
     m_error->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
-    m_error->setWordWrap(true);
     m_error->hide();
 
     QLayout* firstRow = makeFirstRow();

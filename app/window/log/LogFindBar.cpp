@@ -5,6 +5,7 @@
 
 #include "app/window/widgets/FlowLayout.h"
 #include "app/window/widgets/PlainText.h"
+#include "app/window/widgets/WrappedLabel.h"
 
 #include <QCheckBox>
 #include <QKeyEvent>
@@ -31,7 +32,7 @@ QToolButton* NewButton(QString const& text, QString const& name, QString const& 
 } // namespace
 
 LogFindBar::LogFindBar(QWidget* parent)
-    : QWidget(parent), m_text(new QLineEdit), m_count(NewPlainLabel()), m_error(NewPlainLabel())
+    : QWidget(parent), m_text(new QLineEdit), m_count(NewPlainLabel()), m_error(new WrappedLabel)
 {
     setAccessibleName(tr("Find"));
     m_text->setPlaceholderText(tr("Find"));
@@ -44,7 +45,6 @@ LogFindBar::LogFindBar(QWidget* parent)
     m_count->setAccessibleName(tr("Lines found"));
     m_error->setAccessibleName(tr("Find error"));
     m_error->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
-    m_error->setWordWrap(true);
     m_error->hide();
 
     m_case = makeOption(tr("Aa"), tr("Match case when finding"));

@@ -21,7 +21,7 @@
 namespace Velocor {
 
 LogSettingsDialog::LogSettingsDialog(QWidget* parent)
-    : QDialog(parent), m_enabled(new QCheckBox(tr("&Enable logging"))),
+    : FittingDialog(parent), m_enabled(new QCheckBox(tr("&Enable logging"))),
       m_elapsed(new QCheckBox(tr("&Log time since the previous entry"))),
       m_echo(new QCheckBox(tr("Echo entries &to the console"))), m_maxFiles(new QSpinBox),
       m_elapsedPrefix(new QLineEdit), m_dateFormat(new QLineEdit), m_filePrefix(new QLineEdit),

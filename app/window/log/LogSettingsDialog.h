@@ -4,8 +4,7 @@
 #pragma once
 
 #include "app/runninglog/LogPreferences.h"
-
-#include <QDialog>
+#include "app/window/widgets/FittingDialog.h"
 
 class QCheckBox;
 class QDialogButtonBox;
@@ -17,7 +16,7 @@ class QSpinBox;
 namespace Velocor {
 
 /// Changes the log settings. Settings that take effect only after a restart are labeled so.
-class LogSettingsDialog : public QDialog
+class LogSettingsDialog : public FittingDialog
 {
     Q_OBJECT
 

@@ -29,7 +29,7 @@ constexpr int LongestMarkText = 200; // characters
 } // namespace
 
 MarkListDialog::MarkListDialog(LogMarks const& marks, LogView const& view, QWidget* parent)
-    : QDialog(parent), m_list(new QTreeWidget)
+    : FittingDialog(parent), m_list(new QTreeWidget)
 {
     setWindowTitle(tr("Marks"));
     setWindowFlags(windowFlags() & ~Qt::WindowContextHelpButtonHint);

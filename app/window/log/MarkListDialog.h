@@ -3,7 +3,8 @@
 
 #pragma once
 
-#include <QDialog>
+#include "app/window/widgets/FittingDialog.h"
+
 #include <QVector>
 
 class QTreeWidget;
@@ -14,7 +15,7 @@ class LogMarks;
 class LogView;
 
 /// Lists the marked lines that the view shows, with their notes, and lets the user choose one.
-class MarkListDialog : public QDialog
+class MarkListDialog : public FittingDialog
 {
     Q_OBJECT
 

@@ -14,7 +14,7 @@
 namespace Velocor {
 
 NoteDialog::NoteDialog(QString const& note, QWidget* parent)
-    : QDialog(parent), m_text(new QLineEdit(note))
+    : FittingDialog(parent), m_text(new QLineEdit(note))
 {
     setWindowTitle(tr("Note"));
     setWindowFlags(windowFlags() & ~Qt::WindowContextHelpButtonHint);

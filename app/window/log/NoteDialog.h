@@ -3,7 +3,8 @@
 
 #pragma once
 
-#include <QDialog>
+#include "app/window/widgets/FittingDialog.h"
+
 #include <QString>
 
 class QLineEdit;
@@ -11,7 +12,7 @@ class QLineEdit;
 namespace Velocor {
 
 /// Asks for a note on a line of a log.
-class NoteDialog : public QDialog
+class NoteDialog : public FittingDialog
 {
     Q_OBJECT
 

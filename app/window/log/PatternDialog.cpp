@@ -22,12 +22,13 @@ namespace Velocor {
 namespace {
 
 constexpr int LongestFilteredPattern = 500; // characters
+constexpr int LeastLines = 6;               // in view, with the titles and the scroll bar
 constexpr int WidestPatternColumn = 220;    // pixels, but for the pattern itself
 
 } // namespace
 
 PatternDialog::PatternDialog(LogModel const& model, QWidget* parent)
-    : QDialog(parent), m_patterns(new PatternModel(this)), m_list(new QTreeView),
+    : FittingDialog(parent), m_patterns(new PatternModel(this)), m_list(new QTreeView),
       m_state(NewPlainLabel()), m_isOwn(!model.parser().fileType().isForeign)
 {
     setWindowTitle(tr("Message Patterns"));
@@ -61,6 +62,7 @@ void PatternDialog::makeList()
     m_list->setLayoutDirection(Qt::LeftToRight);
     KeepLeftToRight(m_list->header());
     m_list->setRootIsDecorated(false);
+    m_list->setMinimumHeight(LeastLines * m_list->fontMetrics().lineSpacing());
     m_list->setUniformRowHeights(true);
     m_list->setAlternatingRowColors(true);
     m_list->setAllColumnsShowFocus(true);

@@ -4,8 +4,8 @@
 #pragma once
 
 #include "app/window/log/PatternCounter.h"
+#include "app/window/widgets/FittingDialog.h"
 
-#include <QDialog>
 #include <QThread>
 
 #include <memory>
@@ -23,7 +23,7 @@ class PatternModel;
 ///
 /// It counts the rows that there are when it is made, in a thread of its own; closing it cancels
 /// that.
-class PatternDialog : public QDialog
+class PatternDialog : public FittingDialog
 {
     Q_OBJECT
 

@@ -5,6 +5,7 @@
 
 #include "app/window/settings/DifferenceTree.h"
 #include "app/window/widgets/BlendedColor.h"
+#include "app/window/widgets/FlowLayout.h"
 #include "app/window/widgets/PlainText.h"
 #include "app/window/widgets/TextDialog.h"
 
@@ -66,7 +67,7 @@ void MarkOthers(QPlainTextEdit* text, QSet<QString> const& others)
 } // namespace
 
 DifferenceDialog::DifferenceDialog(QString const& title, QWidget* parent)
-    : QDialog(parent), m_summary(NewPlainLabel()), m_pages(new QStackedWidget),
+    : FittingDialog(parent), m_summary(NewPlainLabel()), m_pages(new QStackedWidget),
       m_tree(new DifferenceTree), m_leftLines(NewLines()), m_rightLines(NewLines()),
       m_onlyDifferences(new QCheckBox(tr("&Differences only"))),
       m_takeOver(new QPushButton(tr("&Take Over"))), m_undo(new QPushButton(tr("&Undo")))
@@ -99,10 +100,10 @@ DifferenceDialog::DifferenceDialog(QString const& title, QWidget* parent)
     connect(close, &QPushButton::clicked, this, &QDialog::accept);
     connect(m_tree, &QTreeWidget::itemSelectionChanged, this, &DifferenceDialog::updateButtons);
 
-    auto* buttons = new QHBoxLayout;
+    auto* buttons = new FlowLayout(6);
     buttons->addWidget(m_onlyDifferences);
     buttons->addWidget(lines);
-    buttons->addStretch(1);
+    buttons->AddStretch();
     buttons->addWidget(m_takeOver);
     buttons->addWidget(m_undo);
     buttons->addWidget(close);

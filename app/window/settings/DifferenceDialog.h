@@ -4,8 +4,7 @@
 #pragma once
 
 #include "app/settingsfile/SettingsDocument.h"
-
-#include <QDialog>
+#include "app/window/widgets/FittingDialog.h"
 
 class QCheckBox;
 class QLabel;
@@ -23,7 +22,7 @@ class DifferenceTree;
 ///     DifferenceDialog dialog(tr("What Will Be Written"), this);
 ///     dialog.SetSides({tr("Now"), before, bytesBefore}, {tr("After saving"), after, bytesAfter});
 ///     dialog.exec();
-class DifferenceDialog : public QDialog
+class DifferenceDialog : public FittingDialog
 {
     Q_OBJECT
 

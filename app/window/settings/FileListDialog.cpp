@@ -17,7 +17,7 @@
 namespace Velocor {
 
 FileListDialog::FileListDialog(QString const& name, QStringList const& entries, QWidget* parent)
-    : QDialog(parent), m_list(new QListWidget), m_problem(NewPlainLabel()),
+    : FittingDialog(parent), m_list(new QListWidget), m_problem(NewPlainLabel()),
       m_buttons(new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel))
 {
     setWindowTitle(tr("Edit File List"));

@@ -3,7 +3,8 @@
 
 #pragma once
 
-#include <QDialog>
+#include "app/window/widgets/FittingDialog.h"
+
 #include <QStringList>
 
 class QDialogButtonBox;
@@ -14,7 +15,7 @@ class QPushButton;
 namespace Velocor {
 
 /// Edits a list of recently used files: its entries, their number and their order. GUI thread only.
-class FileListDialog : public QDialog
+class FileListDialog : public FittingDialog
 {
     Q_OBJECT
 

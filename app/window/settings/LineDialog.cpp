@@ -13,7 +13,8 @@
 
 namespace Velocor {
 
-LineDialog::LineDialog(int line, int count, QWidget* parent) : QDialog(parent), m_line(new QSpinBox)
+LineDialog::LineDialog(int line, int count, QWidget* parent)
+    : FittingDialog(parent), m_line(new QSpinBox)
 {
     setWindowTitle(tr("Go to Line"));
     m_line->setRange(1, count);

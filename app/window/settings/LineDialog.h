@@ -3,14 +3,14 @@
 
 #pragma once
 
-#include <QDialog>
+#include "app/window/widgets/FittingDialog.h"
 
 class QSpinBox;
 
 namespace Velocor {
 
 /// Asks for the number of a line. GUI thread only.
-class LineDialog : public QDialog
+class LineDialog : public FittingDialog
 {
     Q_OBJECT
 

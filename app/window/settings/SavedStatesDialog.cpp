@@ -52,7 +52,7 @@ QString ChangeText(SettingsDocument const& before, SettingsDocument const& after
 
 SavedStatesDialog::SavedStatesDialog(SavedStates const& states, QString const& path,
                                      bool canCompare, QWidget* parent)
-    : QDialog(parent), m_states(states), m_path(path), m_canCompare(canCompare),
+    : FittingDialog(parent), m_states(states), m_path(path), m_canCompare(canCompare),
       m_heading(NewPlainLabel()), m_list(new QTreeWidget),
       m_compare(makeButton(tr("&Compare..."), tr("Show what differs from the editor"),
                            &SavedStatesDialog::compare)),

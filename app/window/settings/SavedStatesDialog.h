@@ -4,8 +4,7 @@
 #pragma once
 
 #include "app/settingsfile/SavedStates.h"
-
-#include <QDialog>
+#include "app/window/widgets/FittingDialog.h"
 
 class QLabel;
 class QPushButton;
@@ -15,7 +14,7 @@ namespace Velocor {
 
 /// Lists the saved states of a settings file, with what changed from each to the next. GUI thread
 /// only.
-class SavedStatesDialog : public QDialog
+class SavedStatesDialog : public FittingDialog
 {
     Q_OBJECT
 

@@ -12,12 +12,12 @@
 #include "app/window/settings/SettingsTextPage.h"
 #include "app/window/settings/SettingsTree.h"
 #include "app/window/settings/ValueEditing.h"
+#include "app/window/widgets/FlowLayout.h"
 #include "app/window/widgets/NoticeBar.h"
 #include "app/window/widgets/PlainText.h"
 
 #include <QFileDialog>
 #include <QFileInfo>
-#include <QHBoxLayout>
 #include <QMessageBox>
 #include <QPushButton>
 #include <QStackedWidget>
@@ -80,8 +80,8 @@ void SettingsEditor::connectParts()
     connect(undo, &QPushButton::clicked, this, &SettingsEditor::Undo);
 }
 
-// The tree uses members of this object, and both it and the stack of changes send signals when they
-// end. Qt would disconnect them only when this object is no more than a QObject.
+// The tree uses members of this object, and both it and the stack of changes send signals when
+// they end. Qt would disconnect them only when this object is no more than a QObject.
 SettingsEditor::~SettingsEditor()
 {
     disconnect(m_tree, nullptr, this, nullptr);
@@ -114,11 +114,11 @@ QWidget* SettingsEditor::makeTreePage()
             &SettingsEditor::updateButtons);
     connect(&m_model, &SettingsModel::modelReset, this, &SettingsEditor::updateButtons);
 
-    auto* buttons = new QHBoxLayout;
+    auto* buttons = new FlowLayout(6);
     buttons->addWidget(m_addSection);
     buttons->addWidget(m_addKey);
     buttons->addWidget(m_remove);
-    buttons->addStretch(1);
+    buttons->AddStretch();
     buttons->addWidget(m_save);
 
     auto* page = new QWidget;

@@ -7,12 +7,13 @@
 #include "app/window/settings/LineDialog.h"
 #include "app/window/settings/NumberedText.h"
 #include "app/window/settings/TextFindBar.h"
+#include "app/window/widgets/FlowLayout.h"
 #include "app/window/widgets/PlainText.h"
+#include "app/window/widgets/WrappedLabel.h"
 
 #include <QAction>
 #include <QFile>
 #include <QFileInfo>
-#include <QHBoxLayout>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QPushButton>
@@ -44,11 +45,10 @@ QString Contents(SettingsDocument const& document)
 
 SettingsTextPage::SettingsTextPage(QWidget* parent)
     : QWidget(parent), m_text(new NumberedText), m_find(new TextFindBar(m_text)),
-      m_state(NewPlainLabel()), m_save(new QPushButton(tr("Sa&ve")))
+      m_state(new WrappedLabel), m_save(new QPushButton(tr("Sa&ve")))
 {
     m_text->setAccessibleName(tr("File text"));
     m_state->setAccessibleName(tr("State of the text"));
-    m_state->setWordWrap(true);
     m_state->setTextInteractionFlags(Qt::TextSelectableByMouse);
     m_pause.setSingleShot(true);
     m_pause.setInterval(ParsePause);
@@ -56,10 +56,10 @@ SettingsTextPage::SettingsTextPage(QWidget* parent)
     m_save->setAutoDefault(false);
     m_save->setToolTip(PlainToolTip(tr("Save the file (Ctrl+S)")));
     connect(m_save, &QPushButton::clicked, this, &SettingsTextPage::saveRequested);
-    auto* buttons = new QHBoxLayout;
+    auto* buttons = new FlowLayout(6);
     buttons->addWidget(makeCommandButton(GoToErrorCommand));
     buttons->addWidget(makeCommandButton(ShowSettingsCommand));
-    buttons->addStretch(1);
+    buttons->AddStretch();
     buttons->addWidget(m_save);
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(0, 0, 0, 0);

@@ -33,7 +33,7 @@ void AddPixelField(QFormLayout* form, QString const& text, QSpinBox* field)
 }
 
 SizeDialog::SizeDialog(QString const& name, QSize size, QWidget* parent)
-    : QDialog(parent), m_width(NewPixelField(tr("Width"), 0, size.width())),
+    : FittingDialog(parent), m_width(NewPixelField(tr("Width"), 0, size.width())),
       m_height(NewPixelField(tr("Height"), 0, size.height()))
 {
     setWindowTitle(tr("Edit Size"));

@@ -3,7 +3,8 @@
 
 #pragma once
 
-#include <QDialog>
+#include "app/window/widgets/FittingDialog.h"
+
 #include <QSize>
 
 class QFormLayout;
@@ -12,7 +13,7 @@ class QSpinBox;
 namespace Velocor {
 
 /// Edits a size in pixels. GUI thread only.
-class SizeDialog : public QDialog
+class SizeDialog : public FittingDialog
 {
     Q_OBJECT
 

@@ -107,7 +107,7 @@ private:
 } // namespace
 
 ValueDialog::ValueDialog(QString const& name, QString const& value, QWidget* parent)
-    : QDialog(parent), m_value(value), m_mark(HasLongLine(value) ? FreeMark(value) : QChar()),
+    : FittingDialog(parent), m_value(value), m_mark(HasLongLine(value) ? FreeMark(value) : QChar()),
       m_text(new ValueEdit(m_mark))
 {
     setWindowTitle(QObject::tr("Edit Value"));

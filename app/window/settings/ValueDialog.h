@@ -3,7 +3,8 @@
 
 #pragma once
 
-#include <QDialog>
+#include "app/window/widgets/FittingDialog.h"
+
 #include <QString>
 
 class QPlainTextEdit;
@@ -19,7 +20,7 @@ namespace Velocor {
 ///     ValueDialog dialog(tr("Editor / style"), value, this);
 ///     if (dialog.exec() == QDialog::Accepted)
 ///         value = dialog.value();
-class ValueDialog : public QDialog
+class ValueDialog : public FittingDialog
 {
     Q_OBJECT
 

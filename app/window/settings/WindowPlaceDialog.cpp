@@ -77,7 +77,7 @@ private:
 
 WindowPlaceDialog::WindowPlaceDialog(QString const& name, QPoint const& position, QSize const& size,
                                      QWidget* parent)
-    : QDialog(parent),
+    : FittingDialog(parent),
       m_x(NewPixelField(tr("From the left"), std::numeric_limits<int>::min(), position.x())),
       m_y(NewPixelField(tr("From the top"), std::numeric_limits<int>::min(), position.y())),
       m_width(NewPixelField(tr("Width"), 0, size.width())),

@@ -3,7 +3,8 @@
 
 #pragma once
 
-#include <QDialog>
+#include "app/window/widgets/FittingDialog.h"
+
 #include <QSize>
 
 class QLabel;
@@ -15,7 +16,7 @@ class WindowPicture;
 
 /// Edits the place of a window, with a picture of the desktop that shows where the store would open
 /// it. GUI thread only.
-class WindowPlaceDialog : public QDialog
+class WindowPlaceDialog : public FittingDialog
 {
     Q_OBJECT
 

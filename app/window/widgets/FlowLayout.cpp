@@ -36,6 +36,14 @@ FlowLayout::~FlowLayout()
     qDeleteAll(m_items);
 }
 
+// Qt calls spacers empty, as hidden widgets are.
+void FlowLayout::AddStretch()
+{
+    auto* space = new QWidget;
+    space->setSizePolicy(QSizePolicy::Expanding, QSizePolicy::Ignored);
+    addWidget(space);
+}
+
 void FlowLayout::addItem(QLayoutItem* item)
 {
     m_items.append(item);
@@ -107,13 +115,18 @@ QSize FlowLayout::minimumSize() const
         if (!item->isEmpty())
             size = size.expandedTo(item->minimumSize());
     }
-    return size;
+    return size.expandedTo(QSize(0, m_height));
 }
 
 void FlowLayout::setGeometry(QRect const& rect)
 {
     QLayout::setGeometry(rect);
     const QList<Row> rows = rowsFor(rect.width());
+    const int needed = heightForWidth(rect.width());
+    if (needed != m_height) {
+        m_height = needed;
+        update();
+    }
     int top = rect.top();
     for (Row const& row : rows) {
         const int height = heightOf(row);

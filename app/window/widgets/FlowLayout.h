@@ -22,6 +22,9 @@ public:
     explicit FlowLayout(int spacing, QWidget* parent = nullptr);
     ~FlowLayout() override;
 
+    /// Adds room that has nothing else to share it with.
+    void AddStretch();
+
     void addItem(QLayoutItem* item) override;
     int count() const override { return static_cast<int>(m_items.size()); }
     QLayoutItem* itemAt(int index) const override { return m_items.value(index); }
@@ -31,6 +34,8 @@ public:
     bool hasHeightForWidth() const override { return true; }
     int heightForWidth(int width) const override;
     QSize sizeHint() const override;
+
+    /// As high as the rows in the width that it has: a splitter does not ask what a width needs.
     QSize minimumSize() const override;
     void setGeometry(QRect const& rect) override;
 
@@ -43,6 +48,7 @@ private:
     static int heightOf(Row const& row);
 
     QList<QLayoutItem*> m_items;
+    int m_height = 0; // of all rows
 };
 
 } // namespace Velocor

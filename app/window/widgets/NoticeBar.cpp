@@ -6,6 +6,7 @@
 #include "app/window/widgets/BlendedColor.h"
 #include "app/window/widgets/PlainText.h"
 #include "app/window/widgets/SeverityIcons.h"
+#include "app/window/widgets/WrappedLabel.h"
 
 #include <QEvent>
 #include <QGuiApplication>
@@ -23,11 +24,10 @@ constexpr qreal Tint = 0.18;
 } // namespace
 
 NoticeBar::NoticeBar(QString const& name, QWidget* parent)
-    : QFrame(parent), m_icon(NewPlainLabel()), m_label(NewPlainLabel())
+    : QFrame(parent), m_icon(NewPlainLabel()), m_label(new WrappedLabel)
 {
     setFrameShape(StyledPanel);
     setAutoFillBackground(true);
-    m_label->setWordWrap(true);
     m_label->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
     m_label->setAccessibleName(name);
     m_icon->setAccessibleName(tr("%1 icon").arg(name));

@@ -56,13 +56,6 @@ QLabel* NewPlainLabel(QString const& text)
     return label;
 }
 
-QString LeftToRight(QString const& text)
-{
-    const QChar embedding(0x202a);
-    const QChar end(0x202c);
-    return QGuiApplication::isRightToLeft() && !text.isEmpty() ? embedding + text + end : text;
-}
-
 // Qt aligns titles as the language of the window does.
 void KeepLeftToRight(QHeaderView* header)
 {

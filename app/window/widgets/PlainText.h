@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include "app/language/LeftToRight.h"
+
 #include <QMessageBox>
 #include <QString>
 
@@ -45,11 +47,6 @@ QString Shortened(QString const& text, int limit);
 ///
 /// @return owned by the caller, or by the layout that takes it
 QLabel* NewPlainLabel(QString const& text = QString());
-
-/// A path, a name or a value as part of a text that is shown. In a language that is written from
-/// right to left, it is enclosed in the characters that keep it left to right: its slashes, dots
-/// and numbers would change places. In other languages, it is returned as it is.
-QString LeftToRight(QString const& text);
 
 /// Shows the titles of columns from left to right in any language, as what is in the columns.
 void KeepLeftToRight(QHeaderView* header);
