@@ -763,6 +763,14 @@ Erstellt %1
         <source>%1 cannot be read any more.</source>
         <translation>%1 kann nicht mehr gelesen werden.</translation>
     </message>
+    <message>
+        <source>the namespace &quot;%1&quot; of &quot;%2&quot;</source>
+        <translation>der Namensraum „%1“ von „%2“</translation>
+    </message>
+    <message>
+        <source>the prefix of &quot;%1&quot;</source>
+        <translation>das Präfix von „%1“</translation>
+    </message>
 </context>
 <context>
     <name>RunText</name>

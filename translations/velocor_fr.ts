@@ -763,6 +763,14 @@ Créé le %1
         <source>%1 cannot be read any more.</source>
         <translation>%1 ne peut plus être lu.</translation>
     </message>
+    <message>
+        <source>the namespace &quot;%1&quot; of &quot;%2&quot;</source>
+        <translation>l’espace de noms «&#xa0;%1&#xa0;» de «&#xa0;%2&#xa0;»</translation>
+    </message>
+    <message>
+        <source>the prefix of &quot;%1&quot;</source>
+        <translation>le préfixe de «&#xa0;%1&#xa0;»</translation>
+    </message>
 </context>
 <context>
     <name>RunText</name>

@@ -60,8 +60,10 @@ private:
     void noteLoss(QString const& what) { noteLossAt(depth(), what); }
     void noteLossAt(int depth, QString const& what);
     void noteLossOfValue();
+    void noteNamespaces(int depth, QString const& localName, QString const& qName);
 
     void setDocumentLocator(QXmlLocator* locator) override { m_locator = locator; }
+    bool startPrefixMapping(QString const& prefix, QString const& uri) override;
     bool startElement(QString const& namespaceURI, QString const& localName, QString const& qName,
                       QXmlAttributes const& attributes) override;
     bool endElement(QString const& namespaceURI, QString const& localName,
@@ -79,6 +81,7 @@ private:
     QXmlLocator* m_locator = nullptr; // set before anything is read
     QString m_section;                // the names of the last section and item that began
     QString m_item;
+    QStringList m_namespaces;    // that the next element declares
     bool m_isAfterValue = false; // in the same item
 };
 
