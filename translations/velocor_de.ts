@@ -764,8 +764,8 @@ Erstellt %1
         <translation>%1 kann nicht mehr gelesen werden.</translation>
     </message>
     <message>
-        <source>the namespace &quot;%1&quot; declared by &quot;%2&quot;</source>
-        <translation>der Namensraum „%1“, den „%2“ angibt</translation>
+        <source>the namespace &quot;%1&quot; of &quot;%2&quot;</source>
+        <translation>der Namensraum „%1“ von „%2“</translation>
     </message>
     <message>
         <source>the prefix of &quot;%1&quot;</source>
@@ -3760,6 +3760,22 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
     <message>
         <source>Edit Text</source>
         <translation>Text bearbeiten</translation>
+    </message>
+    <message>
+        <source>%1 cannot be read</source>
+        <translation>%1 kann nicht gelesen werden</translation>
+    </message>
+    <message>
+        <source>The file is shown as text, where Undo brings your changes back.</source>
+        <translation>Die Datei wird als Text angezeigt; „Rückgängig“ bringt dort Ihre Änderungen zurück.</translation>
+    </message>
+    <message>
+        <source>Discard your changes to %1?</source>
+        <translation>Ihre Änderungen an %1 verwerfen?</translation>
+    </message>
+    <message>
+        <source>They cannot be brought back after reloading this file.</source>
+        <translation>Sie können nach dem Neuladen dieser Datei nicht zurückgeholt werden.</translation>
     </message>
 </context>
 <context>

@@ -764,8 +764,8 @@ Créé le %1
         <translation>%1 ne peut plus être lu.</translation>
     </message>
     <message>
-        <source>the namespace &quot;%1&quot; declared by &quot;%2&quot;</source>
-        <translation>l’espace de noms «&#xa0;%1&#xa0;» déclaré par «&#xa0;%2&#xa0;»</translation>
+        <source>the namespace &quot;%1&quot; of &quot;%2&quot;</source>
+        <translation>l’espace de noms «&#xa0;%1&#xa0;» de «&#xa0;%2&#xa0;»</translation>
     </message>
     <message>
         <source>the prefix of &quot;%1&quot;</source>
@@ -3760,6 +3760,22 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
     <message>
         <source>Edit Text</source>
         <translation>Modifier le texte</translation>
+    </message>
+    <message>
+        <source>%1 cannot be read</source>
+        <translation>%1 ne peut pas être lu</translation>
+    </message>
+    <message>
+        <source>The file is shown as text, where Undo brings your changes back.</source>
+        <translation>Le fichier est affiché comme texte&#x202f;; «&#xa0;Annuler&#xa0;» y rétablit vos modifications.</translation>
+    </message>
+    <message>
+        <source>Discard your changes to %1?</source>
+        <translation>Abandonner vos modifications de %1&#x202f;?</translation>
+    </message>
+    <message>
+        <source>They cannot be brought back after reloading this file.</source>
+        <translation>Elles ne pourront pas être rétablies après le rechargement de ce fichier.</translation>
     </message>
 </context>
 <context>

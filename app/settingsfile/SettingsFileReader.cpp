@@ -102,19 +102,17 @@ void SettingsFileReader::noteLossAt(int depth, QString const& what)
                               QObject::tr("Line %1: %2").arg(m_locator->lineNumber()).arg(what)});
 }
 
-bool SettingsFileReader::startPrefixMapping(QString const& prefix, QString const& uri)
+bool SettingsFileReader::startPrefixMapping(QString const&, QString const& uri)
 {
     m_namespaces.append(uri);
-    return TorkConfigFileDocHandler::startPrefixMapping(prefix, uri);
+    return true;
 }
 
-// The store knows elements by their names without prefix.
-void SettingsFileReader::noteLossOfNamespaces(int depth, QString const& localName,
-                                              QString const& qName)
+// To the store, a name is what follows its prefix.
+void SettingsFileReader::noteNamespaces(int depth, QString const& localName, QString const& qName)
 {
     for (QString const& uri : qAsConst(m_namespaces))
-        noteLossAt(depth,
-                   QObject::tr("the namespace \"%1\" declared by \"%2\"").arg(uri, localName));
+        noteLossAt(depth, QObject::tr("the namespace \"%1\" of \"%2\"").arg(uri, localName));
     m_namespaces.clear();
     if (qName != localName)
         noteLossAt(depth, QObject::tr("the prefix of \"%1\"").arg(qName));
@@ -137,7 +135,7 @@ bool SettingsFileReader::startElement(QString const& namespaceURI, QString const
         m_section = localName;
     else if (newDepth == 3)
         m_item = localName;
-    noteLossOfNamespaces(newDepth, localName, qName);
+    noteNamespaces(newDepth, localName, qName);
     for (int i = 0; i < attributes.count(); ++i)
         noteLossAt(
             newDepth,

@@ -59,8 +59,8 @@ private:
     static void read(QIODevice& device, SettingsDocument& document, int mostKeys);
     void noteLoss(QString const& what) { noteLossAt(depth(), what); }
     void noteLossAt(int depth, QString const& what);
-    void noteLossOfNamespaces(int depth, QString const& localName, QString const& qName);
     void noteLossOfValue();
+    void noteNamespaces(int depth, QString const& localName, QString const& qName);
 
     void setDocumentLocator(QXmlLocator* locator) override { m_locator = locator; }
     bool startPrefixMapping(QString const& prefix, QString const& uri) override;
@@ -81,8 +81,8 @@ private:
     QXmlLocator* m_locator = nullptr; // set before anything is read
     QString m_section;                // the names of the last section and item that began
     QString m_item;
+    QStringList m_namespaces;    // that the next element declares
     bool m_isAfterValue = false; // in the same item
-    QStringList m_namespaces;    // declared by the element that begins next
 };
 
 } // namespace Velocor

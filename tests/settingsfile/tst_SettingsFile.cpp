@@ -199,10 +199,16 @@ void tst_SettingsFile::lossTexts_data()
     row("attributes", "<R x='1'><S y='2'><a n:z='3' w='4'>v</a></S></R>",
         {"Line 1: the attribute \"x\" of \"R\"", "Line 1: the attribute \"y\" of \"S\"",
          "Line 1: the attribute \"n:z\" of \"a\"", "Line 1: the attribute \"w\" of \"a\""});
-    row("namespaces", "<R xmlns='u'><p:S xmlns:p='v'><p:a>1</p:a><b xmlns:q='w'>2</b></p:S></R>",
-        {"Line 1: the namespace \"u\" declared by \"R\"",
-         "Line 1: the namespace \"v\" declared by \"S\"", "Line 1: the prefix of \"p:S\"",
-         "Line 1: the prefix of \"p:a\"", "Line 1: the namespace \"w\" declared by \"b\""});
+    row("prefixes that are not declared", "<q:R><p:S><p:a>v</p:a></p:S></q:R>",
+        {"Line 1: the prefix of \"q:R\"", "Line 1: the prefix of \"p:S\"",
+         "Line 1: the prefix of \"p:a\""});
+    row("prefix that is declared", "<R xmlns:p='urn:x'>\n<S><p:a>v</p:a><b>w</b></S></R>",
+        {"Line 1: the namespace \"urn:x\" of \"R\"", "Line 2: the prefix of \"p:a\""});
+    row("namespace without a prefix", "<R>\n<S xmlns='urn:x'><a>v</a></S></R>",
+        {"Line 2: the namespace \"urn:x\" of \"S\""});
+    row("prefix that makes a key the same", "<R><S><p:a>1</p:a><q:a>2</q:a></S></R>",
+        {"Line 1: the prefix of \"p:a\"", "Line 1: the prefix of \"q:a\"",
+         "Line 1: the first value of \"a\", replaced by a second one"});
     row("key thrice", "<R><S><a>1</a><a>2</a><a>3</a></S></R>",
         {"Line 1: the first value of \"a\", replaced by a second one",
          "Line 1: the first value of \"a\", replaced by a second one"});
@@ -238,6 +244,8 @@ void tst_SettingsFile::lossesAreInTheirPlaces_data()
     row("deep in an item", "<S><a>1<d><e/></d></a></S>", "S/a S/a");
     row("empty item", "<S><a>1</a></S><T><b/></T>", "T/b");
     row("key twice", "<S><a>1</a><b>2</b><a>3</a></S>", "S/a");
+    row("prefix of an item", "<S><a>1</a><p:b>2</p:b></S>", "S/b");
+    row("namespace of a section", "<S/><T xmlns='urn:x'/>", "T/");
     row("section twice", "<S/><T/><S/>", "S/");
 }
 

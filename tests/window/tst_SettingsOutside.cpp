@@ -9,8 +9,10 @@
 
 #include "app/runninglog/LogPreferences.h"
 #include "app/settingsfile/SettingsFileReader.h"
+#include "app/settingsfile/SettingsFileWriter.h"
 #include "app/window/settings/FileNotice.h"
 #include "app/window/settings/SettingsEditor.h"
+#include "app/window/settings/SettingsTextPage.h"
 #include "app/window/widgets/NoticeBar.h"
 
 #include <QAbstractButton>
@@ -67,7 +69,15 @@ class tst_SettingsOutside : public WindowTestCase
 private slots:
     void changeIsToldAndReloaded();
     void reloadCanBeUndone();
+    void reloadOfWhatIsNoTreeCanBeUndone_data();
+    void reloadOfWhatIsNoTreeCanBeUndone();
+    void reloadAsksBeforeItLosesChanges_data();
+    void reloadAsksBeforeItLosesChanges();
+    void reloadStaysInTheTextAndCanBeUndone();
+    void reloadTellsWhatSavingWouldLose();
+    void reloadKeepsWhatIsShownOfAnUnreadableFile();
     void mineIsKept();
+    void lossesInTheirsAreTold();
     void savesOfOurOwnAreNotTold();
     void malformedFileIsReloaded();
     void removedFileIsToldAndSavedAgain();
@@ -118,6 +128,123 @@ void tst_SettingsOutside::reloadCanBeUndone()
     QCOMPARE(TestFiles::read(shown.file + ".bak"), WithFont("theirs"));
 }
 
+void tst_SettingsOutside::reloadOfWhatIsNoTreeCanBeUndone_data()
+{
+    QTest::addColumn<QByteArray>("theirs");
+    QTest::newRow("malformed") << QByteArray("<VelocorSettings><a>");
+    QTest::newRow("empty") << QByteArray();
+    QTest::newRow("another root element") << QByteArray("<Other><a><b>1</b></a></Other>");
+}
+
+// In the text: the tree has no way back from a file that it cannot show.
+void tst_SettingsOutside::reloadOfWhatIsNoTreeCanBeUndone()
+{
+    QFETCH(QByteArray, theirs);
+    const ShownSettings shown;
+    auto const* page = shown.editor->findChild<SettingsTextPage*>();
+    SetValue(shown.tree, 0, "mine");
+    QVERIFY(TestFiles::writeOver(shown.file, theirs));
+    QTRY_VERIFY_WITH_TIMEOUT(Button(State(shown.editor), "Reload")->isVisible(), Patience);
+    Click(Button(State(shown.editor), "Reload"));
+    QVERIFY(page->isVisible() && !State(shown.editor)->isVisible());
+    QCOMPARE(page->bytes(), theirs);
+    QVERIFY(!shown.editor->isModified());
+    const QString told = shown.editor->findChild<NoticeBar*>()->text();
+    QVERIFY2(told.endsWith("where Undo brings your changes back."), qPrintable(told));
+    Action(*shown.window, "Undo Edit Text")->trigger();
+    QCOMPARE(page->bytes(), WithFont("mine"));
+    QVERIFY(shown.editor->isModified());
+    shown.editor->ShowAsTree();
+    QCOMPARE(CellText(shown.tree, 0, 0, 1), QString("mine"));
+    QTest::keyClick(shown.window.get(), Qt::Key_S, Qt::ControlModifier); // asks nothing
+    QCOMPARE(TestFiles::read(shown.file), WithFont("mine"));
+}
+
+void tst_SettingsOutside::reloadAsksBeforeItLosesChanges_data()
+{
+    QTest::addColumn<QString>("mine");
+    QTest::addColumn<bool>("isDiscarded");
+    const QString beyondLatin1 = QChar(0x20ac);
+    QTest::newRow("a character that no text would have, kept") << beyondLatin1 << false;
+    QTest::newRow("a character that no text would have, discarded") << beyondLatin1 << true;
+    QTest::newRow("a line break that no text would have, kept") << QString("a\rb") << false;
+    QTest::newRow("larger than a text, discarded") << QString(2 << 20, 'x') << true;
+}
+
+void tst_SettingsOutside::reloadAsksBeforeItLosesChanges()
+{
+    QFETCH(QString, mine);
+    QFETCH(bool, isDiscarded);
+    const ShownSettings shown;
+    SettingsDocument changed = shown.editor->document();
+    changed.SetValue("Editor", "font", mine);
+    QVERIFY(TestFiles::writeOver(shown.file, SettingsFileWriter::ToBytes(changed)));
+    shown.editor->Reload();
+    SetValue(shown.tree, 1, "other");
+    if (CellText(shown.tree, 0, 0, 1) != mine && mine.size() < 100)
+        SetValue(shown.tree, 0, mine);
+    QVERIFY(TestFiles::writeOver(shown.file, "<VelocorSettings><a>"));
+    QTRY_VERIFY_WITH_TIMEOUT(Button(State(shown.editor), "Reload")->isVisible(), Patience);
+    QString told;
+    WindowTest::whenShown<QMessageBox>([&](QMessageBox* box) {
+        told = box->text();
+        Click(box->button(isDiscarded ? QMessageBox::Discard : QMessageBox::Cancel));
+    });
+    Click(Button(State(shown.editor), "Reload"));
+    QCOMPARE(told, QString("Discard your changes to some.cfg?"));
+    QCOMPARE(shown.tree->isVisible(), !isDiscarded);
+    QCOMPARE(shown.editor->isModified(), !isDiscarded);
+    QCOMPARE(Button(State(shown.editor), "Reload")->isVisible(), !isDiscarded);
+    if (!isDiscarded)
+        QCOMPARE(CellText(shown.tree, 0, 1, 1), QString("other"));
+}
+
+void tst_SettingsOutside::reloadStaysInTheTextAndCanBeUndone()
+{
+    const ShownSettings shown;
+    auto const* page = shown.editor->findChild<SettingsTextPage*>();
+    shown.editor->ShowAsText();
+    QVERIFY(TestFiles::writeOver(shown.file, WithFont("theirs")));
+    QTRY_VERIFY_WITH_TIMEOUT(State(shown.editor)->isVisible(), Patience);
+    Click(Button(State(shown.editor), "Reload"));
+    QVERIFY(page->isVisible() && !shown.editor->isModified());
+    QCOMPARE(page->bytes(), WithFont("theirs"));
+    shown.editor->Undo();
+    QCOMPARE(page->bytes(), Settings);
+    QVERIFY(shown.editor->isModified());
+}
+
+void tst_SettingsOutside::reloadTellsWhatSavingWouldLose()
+{
+    const ShownSettings shown;
+    auto const* notice = shown.editor->findChild<NoticeBar*>();
+    for (bool isLossy : {true, false}) {
+        QVERIFY(TestFiles::writeOver(shown.file, (isLossy ? "<!-- why -->" : "") + Settings));
+        QTRY_VERIFY_WITH_TIMEOUT(State(shown.editor)->isVisible(), Patience);
+        Click(Button(State(shown.editor), "Reload"));
+        QCOMPARE(notice->text(), QString(isLossy ? "Saving would lose 1 item in this file." : ""));
+    }
+}
+
+// Only for those whom permissions bind: the administrator may read everything.
+void tst_SettingsOutside::reloadKeepsWhatIsShownOfAnUnreadableFile()
+{
+    if (geteuid() == 0)
+        QSKIP("the administrator can read every file");
+    const ShownSettings shown;
+    SetValue(shown.tree, 0, "mine");
+    QVERIFY(TestFiles::writeOver(shown.file, WithFont("theirs")));
+    QTRY_VERIFY_WITH_TIMEOUT(State(shown.editor)->isVisible(), Patience);
+    QVERIFY(QFile::setPermissions(shown.file, QFileDevice::WriteOwner));
+    Click(Button(State(shown.editor), "Reload"));
+    QCOMPARE(Status(*shown.window), QString("some.cfg cannot be read"));
+    QVERIFY(shown.tree->isVisible() && shown.editor->isModified());
+    QCOMPARE(CellText(shown.tree, 0, 0, 1), QString("mine"));
+    QVERIFY(QFile::setPermissions(shown.file, QFileDevice::ReadOwner | QFileDevice::WriteOwner));
+    Click(Button(State(shown.editor), "Reload"));
+    QCOMPARE(CellText(shown.tree, 0, 0, 1), QString("theirs"));
+}
+
 void tst_SettingsOutside::mineIsKept()
 {
     const ShownSettings shown;
@@ -132,6 +259,22 @@ void tst_SettingsOutside::mineIsKept()
     // The next change is told again.
     QVERIFY(TestFiles::writeOver(shown.file, WithFont("others")));
     QTRY_VERIFY_WITH_TIMEOUT(State(shown.editor)->isVisible(), Patience);
+}
+
+void tst_SettingsOutside::lossesInTheirsAreTold()
+{
+    const ShownSettings shown;
+    QVERIFY(TestFiles::writeOver(shown.file, "<!-- why -->" + Settings));
+    QTRY_VERIFY_WITH_TIMEOUT(State(shown.editor)->isVisible(), Patience);
+    Click(Button(State(shown.editor), "Keep Mine"));
+    QString told;
+    WindowTest::whenShown<QMessageBox>([&](QMessageBox* box) {
+        told = box->informativeText();
+        QTest::keyClick(box, Qt::Key_Escape);
+    });
+    QTest::keyClick(shown.window.get(), Qt::Key_S, Qt::ControlModifier);
+    QCOMPARE(told, QString("Line 1: the comment \"why\""));
+    QCOMPARE(TestFiles::read(shown.file), "<!-- why -->" + Settings);
 }
 
 void tst_SettingsOutside::savesOfOurOwnAreNotTold()

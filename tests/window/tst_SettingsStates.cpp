@@ -30,6 +30,8 @@ private slots:
     void othersStateIsKeptToo();
     void stateIsBroughtBackAndUndone();
     void damagedStateIsBroughtBackAsText();
+    void commentsAreBroughtBackToo();
+    void takesThePlaceOfATextThatCannotBeEdited();
     void stateIsCompared();
     void removedAfterAsking();
     void backupStaysTheFirstState();
@@ -162,6 +164,39 @@ void tst_SettingsStates::damagedStateIsBroughtBackAsText()
     QCOMPARE(page->bytes(), broken);
     shown.editor->Undo();
     QCOMPARE(page->bytes(), Settings);
+}
+
+// The tree would bring back only its values.
+void tst_SettingsStates::commentsAreBroughtBackToo()
+{
+    const QByteArray commented = QByteArray(Settings).replace("<Editor>", "<!-- why --><Editor>");
+    const ShownStates shown(commented);
+    WindowTest::whenShown<QMessageBox>(
+        [](QMessageBox* box) { PressEnterOn(Button(box, "Save Anyway")); });
+    shown.save("mine");
+    QCOMPARE(TestFiles::read(shown.file), WithFont("mine"));
+    shown.open([](SavedStatesDialog* dialog) {
+        QTest::keyClick(dialog->findChild<QTreeWidget*>(), Qt::Key_End);
+        PressEnterOn(Button(dialog, "Bring Back"));
+    });
+    QVERIFY(shown.editor->Save());
+    QCOMPARE(TestFiles::read(shown.file), commented);
+}
+
+void tst_SettingsStates::takesThePlaceOfATextThatCannotBeEdited()
+{
+    const ShownStates shown;
+    shown.save("mine");
+    const QByteArray mixed = "<a>\r\n<b>\n</a>";
+    QVERIFY(TestFiles::writeOver(shown.file, mixed));
+    shown.editor->Reload();
+    auto const* page = shown.editor->findChild<SettingsTextPage*>();
+    QVERIFY(page->isVisible() && page->isReadOnly());
+    shown.open([](SavedStatesDialog* dialog) { PressEnterOn(Button(dialog, "Bring Back")); });
+    QCOMPARE(page->bytes(), WithFont("mine"));
+    QVERIFY(shown.editor->isModified());
+    QVERIFY(shown.editor->Save());
+    QCOMPARE(TestFiles::read(shown.file), WithFont("mine"));
 }
 
 void tst_SettingsStates::stateIsCompared()

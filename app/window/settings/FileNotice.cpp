@@ -54,6 +54,12 @@ void FileNotice::SetComparable(bool isComparable)
     check();
 }
 
+void FileNotice::TellChanged()
+{
+    m_known.exists = false;
+    check();
+}
+
 void FileNotice::check()
 {
     const QFileInfo file(m_path);

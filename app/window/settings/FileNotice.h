@@ -23,6 +23,9 @@ public:
     /// after each of both.
     void SetFile(QString const& path);
 
+    /// Tells again that the file was changed, after it was set: nobody has taken the change.
+    void TellChanged();
+
     /// Whether the editor has something to compare the file with.
     void SetComparable(bool isComparable);
 

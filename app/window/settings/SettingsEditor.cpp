@@ -23,6 +23,8 @@
 #include <QStackedWidget>
 #include <QTimer>
 
+#include <algorithm>
+
 namespace Velocor {
 
 namespace {
@@ -154,33 +156,91 @@ void SettingsEditor::Open(QString const& path)
 
 void SettingsEditor::Reload()
 {
+    const QFileInfo file(m_path);
+    if (!file.isReadable()) { // what is here may be all that is left
+        Q_EMIT messageReported(tr("%1 cannot be read").arg(LeftToRight(file.fileName())));
+        return;
+    }
     m_fileNotice->SetFile(m_path);
-    const SettingsDocument document = SettingsFileReader::ReadShown(m_path);
-    const QByteArray bytes = ShowsTree() ? QByteArray() : SettingsTextPage::BytesOf(m_path);
-    const bool fits = document.isReadable && bytes.size() <= SettingsTextPage::EditLimit;
-    if (!ShowsTree() && m_text->isModified() && fits) {
-        m_text->Replace(bytes);
-        m_text->SetModified(m_text->bytes() != bytes); // such as other line breaks than before
-        m_saver.NoteRead(m_path, document);
-        m_hasTree = false;
-        return;
-    }
-    const bool canUndo =
-        document.isParsed && ShowsTree() && document.rootName == m_model.document().rootName;
-    if (!canUndo) {
-        Open(m_path);
-        return;
-    }
     m_tree->EndEditing();
+    const SettingsDocument document = SettingsFileReader::ReadShown(m_path);
+    const bool canUndo =
+        ShowsTree() ? reloadTree(document) || reloadTreeAsText(document) : reloadText(document);
+    if (canUndo) {
+        m_saver.NoteRead(m_path, document);
+        m_model.SetSaved(document);
+        updateState();
+    } else if (!isModified() || confirmDiscard()) {
+        Open(m_path);
+    } else {
+        m_fileNotice->TellChanged();
+    }
+}
+
+// Returns whether the file could be taken into the tree as a change that can be undone.
+bool SettingsEditor::reloadTree(SettingsDocument const& document)
+{
+    if (!document.isParsed || document.rootName != m_model.document().rootName)
+        return false;
     const SettingsModel::Place place = SettingsModel::PlaceOf(m_tree->currentIndex());
     m_commands.Replace(document, tr("Reload"));
     m_commands.undoStack()->setClean();
-    m_saver.NoteRead(m_path, document);
-    m_model.SetSaved(document);
     m_find->Refresh();
     m_hasText = false;
     m_tree->GoTo(m_model.IndexOf(place));
     m_tree->setFocus();
+    m_notice->Dismiss();
+    tellLosses(document);
+    return true;
+}
+
+// A file that the tree cannot show takes the place of its changes as text, so that they can be
+// brought back there; unless they are not all in the text, or there are none.
+bool SettingsEditor::reloadTreeAsText(SettingsDocument const& document)
+{
+    const QByteArray bytes = SettingsTextPage::BytesOf(m_path);
+    const QByteArray mine = SettingsFileWriter::ToBytes(m_model.document());
+    const bool fits = std::max(bytes.size(), mine.size()) <= SettingsTextPage::EditLimit;
+    if (!isModified() || !fits || !SettingsFileWriter::Losses(m_model.document()).isEmpty())
+        return false;
+    m_hasText = false;
+    m_text->Show(mine, SettingsFileReader::ReadBytes(mine));
+    if (m_text->isReadOnly())
+        return false;
+    m_hasText = true;
+    showPage(TextPage);
+    m_notice->Dismiss();
+    if (!document.isParsed)
+        tellMalformed(document);
+    m_notice->ShowMessage(tr("The file is shown as text, where Undo brings your changes back."));
+    return reloadText(document);
+}
+
+// A malformed text that was left unchanged is not worth a change to undo: the file may have been
+// mended, and is then shown as a tree.
+bool SettingsEditor::reloadText(SettingsDocument const& document)
+{
+    const QByteArray bytes = SettingsTextPage::BytesOf(m_path);
+    const bool isWorth = m_text->isModified() || m_text->parsed().isParsed;
+    if (!isWorth || m_text->isReadOnly() || document.isTooLarge ||
+        bytes.size() > SettingsTextPage::EditLimit)
+        return false;
+    m_text->Replace(bytes);
+    m_text->SetModified(m_text->bytes() != bytes); // such as other line breaks than before
+    m_hasTree = false;
+    m_text->setFocus();
+    return true;
+}
+
+bool SettingsEditor::confirmDiscard()
+{
+    PlainMessageBox box(
+        QMessageBox::Warning, this,
+        tr("Discard your changes to %1?").arg(LeftToRight(QFileInfo(m_path).fileName())),
+        QMessageBox::Discard | QMessageBox::Cancel,
+        tr("They cannot be brought back after reloading this file."));
+    box.setDefaultButton(QMessageBox::Cancel);
+    return box.exec() == QMessageBox::Discard;
 }
 
 void SettingsEditor::ShowWhatWillBeWritten()
@@ -209,8 +269,10 @@ void SettingsEditor::CompareWithOther()
 // Saving has to write the file, even if nothing was changed here.
 void SettingsEditor::keepMine()
 {
+    const SettingsDocument document = SettingsFileReader::ReadShown(m_path);
     m_saver.AcceptFile();
-    m_model.SetSaved(SettingsFileReader::ReadShown(m_path));
+    m_saver.NoteLosses(document);
+    m_model.SetSaved(document);
     m_fileNotice->SetFile(m_path);
     if (ShowsTree())
         m_commands.undoStack()->resetClean();
@@ -248,6 +310,7 @@ void SettingsEditor::noteSaved()
         m_hasText = false;
     } else {
         m_text->SetModified(false);
+        m_hasTree = false; // the next one is that of this text
     }
     updateState();
     Q_EMIT saved();
@@ -263,17 +326,27 @@ void SettingsEditor::showTree(SettingsDocument const& document)
     m_find->Refresh();
     updateButtons();
     showPage(TreePage);
+    tellLosses(document);
+}
+
+void SettingsEditor::tellLosses(SettingsDocument const& document)
+{
     if (document.lossCount > 0)
         m_notice->ShowMessage(
             tr("Saving would lose %Ln item(s) in this file.", nullptr, document.lossCount));
 }
 
-void SettingsEditor::showMalformed(SettingsDocument const& document)
+void SettingsEditor::tellMalformed(SettingsDocument const& document)
 {
     QString message = tr("Cannot show %1 as a tree: %2").arg(LeftToRight(m_path), document.error);
     if (document.line > 0 && !document.isTooLarge)
         message += tr(" (line %1, column %2)").arg(document.line).arg(document.column);
     m_notice->ShowMessage(message);
+}
+
+void SettingsEditor::showMalformed(SettingsDocument const& document)
+{
+    tellMalformed(document);
     m_text->Show(SettingsTextPage::BytesOf(m_path), document);
     m_shownText = m_text->bytes();
     showPage(TextPage);
@@ -397,7 +470,7 @@ void SettingsEditor::ShowStates()
     dialog.exec();
 }
 
-// As a tree if it is one; else as text, which every state is.
+// As a tree if that is all of it; else as text, which every state is.
 void SettingsEditor::bringBack(QString const& statePath, QString const& title)
 {
     const SettingsDocument state = SettingsFileReader::ReadShown(statePath);
@@ -405,16 +478,31 @@ void SettingsEditor::bringBack(QString const& statePath, QString const& title)
         Q_EMIT messageReported(tr("The state of %1 is gone").arg(title));
         return;
     }
-    if (ShowsTree() && state.isParsed && state.rootName == document().rootName) {
+    const bool isTree =
+        state.isParsed && state.lossCount == 0 && state.rootName == document().rootName;
+    if (ShowsTree() && isTree) {
         m_commands.Replace(state, tr("Bring Back"));
         m_find->Refresh();
         m_tree->setFocus();
     } else {
         ShowAsText();
-        if (!ShowsTree() && !m_text->isReadOnly())
-            m_text->Replace(SettingsTextPage::BytesOf(statePath));
+        if (ShowsTree())
+            return; // it has told why
+        bringBackText(SettingsTextPage::BytesOf(statePath), state);
     }
     Q_EMIT messageReported(tr("Brought back the state of %1; save to keep it").arg(title));
+}
+
+// What is shown and cannot be edited is in the file, so that it need not be undone.
+void SettingsEditor::bringBackText(QByteArray const& bytes, SettingsDocument const& state)
+{
+    if (m_text->isReadOnly()) {
+        m_text->Show(bytes, state);
+        m_text->SetModified(true);
+        m_hasTree = false;
+    } else {
+        m_text->Replace(bytes);
+    }
 }
 
 bool SettingsEditor::ShowsTree() const
@@ -524,7 +612,6 @@ bool SettingsEditor::saveText()
         return !m_text->isReadOnly();
     if (!m_saver.SaveText(m_text->bytes(), m_text->parsed()))
         return false;
-    m_hasTree = false; // the next one is that of this text
     noteSaved();
     return true;
 }

@@ -62,7 +62,8 @@ public:
     /// @return false if the user cancels or saving fails
     bool MayClose();
 
-    /// Shows what is in the file now. Can be undone, unless the file is malformed.
+    /// Shows what is in the file now. Asks before changes are lost that cannot be brought back by
+    /// Undo, in the tree or in the text, and keeps what is shown if the file cannot be read.
     void Reload();
 
     /// Shows the file as it is and as saving would make it.
@@ -124,10 +125,17 @@ private:
     QPushButton* makeButton(QString const& text, QString const& toolTip);
     void showTree(SettingsDocument const& document);
     void showMalformed(SettingsDocument const& document);
+    void tellLosses(SettingsDocument const& document);
+    void tellMalformed(SettingsDocument const& document);
+    bool reloadTree(SettingsDocument const& document);
+    bool reloadTreeAsText(SettingsDocument const& document);
+    bool reloadText(SettingsDocument const& document);
+    bool confirmDiscard();
     void showPage(Page page);
     void noteTreeChange();
     bool saveText();
     void bringBack(QString const& statePath, QString const& title);
+    void bringBackText(QByteArray const& bytes, SettingsDocument const& state);
     void compareWithFile();
     void keepMine();
     void saveAs();
