@@ -113,6 +113,7 @@ bool SaveContent(QString const& path, QIODevice& content, QString* error)
         return false;
     }
     QSaveFile replacement(path);
+    replacement.setDirectWriteFallback(true); // where the folder is read-only, as the store does
     QFile original(path);
     QFileDevice& file =
         info.exists() && !IsOurs(info) ? static_cast<QFileDevice&>(original) : replacement;
@@ -206,6 +207,7 @@ bool SettingsFileWriter::SaveCopy(QString const& path, QString const& original, 
     }
     return SaveContent(path, content, error);
 }
+
 bool SettingsFileWriter::KeepBackup(QString const& path, QString* error)
 {
     const QString copy = path + QLatin1String(".bak");
@@ -215,14 +217,19 @@ bool SettingsFileWriter::KeepBackup(QString const& path, QString* error)
         *error = QObject::tr("Not a regular file");
         return false;
     }
-    if (QFile::exists(copy) && !QFile::remove(copy)) {
-        *error = QObject::tr("Cannot replace the file %1.").arg(LeftToRight(copy));
+
+    // The copy before stays until there is another one.
+    const QString next = copy + QLatin1String(".saving");
+    QFile::remove(next);
+    QFile file(path);
+    if (!file.copy(next)) {
+        *error = file.errorString();
         return false;
     }
-    QFile file(path);
-    if (file.copy(copy))
+    if ((!QFile::exists(copy) || QFile::remove(copy)) && QFile::rename(next, copy))
         return true;
-    *error = file.errorString();
+    QFile::remove(next);
+    *error = QObject::tr("Cannot replace the file %1.").arg(LeftToRight(copy));
     return false;
 }
 

@@ -122,12 +122,25 @@ LogPanel* FileTabs::addLog(QString const& path)
     return panel;
 }
 
+// However the path is spelled.
+QString FileTabs::ownerNoteOf(QString const& path) const
+{
+    const QFileInfo file(path);
+    for (auto note = m_ownerNotes.begin(); note != m_ownerNotes.end(); ++note) {
+        if (QFileInfo(note.key()).absoluteFilePath() == file.absoluteFilePath() ||
+            (file.exists() &&
+             QFileInfo(note.key()).canonicalFilePath() == file.canonicalFilePath()))
+            return note.value();
+    }
+    return QString();
+}
+
 SettingsEditor* FileTabs::addEditor(QString const& path)
 {
     auto* editor = new SettingsEditor;
     const QString name = QFileInfo(path).fileName();
     editor->setAccessibleName(name);
-    editor->SetOwnerNote(m_ownerNotes.value(QFileInfo(path).absoluteFilePath()));
+    editor->SetOwnerNote(ownerNoteOf(path));
     const QString dataPath = ApplicationProperty("DataPath");
     if (!dataPath.isEmpty())
         editor->SetStates(SavedStates(dataPath + QLatin1String("settings-states/")));

@@ -126,6 +126,7 @@ private:
     void addStepAction(QString const& text, QKeySequence::StandardKey keys,
                        QKeySequence const& other, int step);
     int positionOf(QString const& path) const;
+    QString ownerNoteOf(QString const& path) const;
     void addCloseButton(QWidget* page, QString const& name);
 
     LogMarkStore* m_marks;

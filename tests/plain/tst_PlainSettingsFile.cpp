@@ -23,8 +23,8 @@ using namespace Velocor;
 
 namespace {
 
-// Everything a document contains, one line each, except for white space between elements and
-// namespace prefixes, which mean nothing to the store. Consecutive pieces of text are joined.
+// Everything a document contains, one line each, except for white space between elements.
+// Consecutive pieces of text are joined.
 class Contents : public QXmlDefaultHandler
 {
 public:
@@ -40,7 +40,12 @@ public:
         return parses ? contents.m_lines : QStringList();
     }
 
-    bool startElement(QString const&, QString const& name, QString const&,
+    bool startPrefixMapping(QString const& prefix, QString const& uri) override
+    {
+        return add("namespace " + prefix + "=" + uri);
+    }
+
+    bool startElement(QString const&, QString const&, QString const& name,
                       QXmlAttributes const& attributes) override
     {
         add("<" + name);
@@ -50,7 +55,7 @@ public:
         return true;
     }
 
-    bool endElement(QString const&, QString const& name, QString const&) override
+    bool endElement(QString const&, QString const&, QString const& name) override
     {
         add(">" + name);
         m_isLeaf = false;
@@ -179,7 +184,7 @@ private:
     {
         document += "<" + element;
         if (chance(40))
-            document += " a='1'";
+            document += oneOf({" a='1'", " xmlns='urn:x'", " xmlns:n='urn:x'"});
         document += ">";
     }
 

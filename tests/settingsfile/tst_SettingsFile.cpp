@@ -14,6 +14,7 @@
 
 #include <fcntl.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 using namespace Velocor;
 
@@ -84,7 +85,10 @@ private slots:
     void savesNothingInPlaceOfAFile();
     void savedIncompletely();
     void fullDisk();
+    void savesTextInAReadOnlyFolder();
     void backup();
+    void fullDiskKeepsTheBackup();
+    void linkInPlaceOfTheBackup();
     void noBackup();
 };
 
@@ -709,6 +713,23 @@ void tst_SettingsFile::fullDisk()
     QCOMPARE(TestFiles::listing(folder.path()), QStringList("x.cfg: old\n"));
 }
 
+// Only for those whom permissions bind: the administrator may write to every folder.
+void tst_SettingsFile::savesTextInAReadOnlyFolder()
+{
+    if (geteuid() == 0)
+        QSKIP("the administrator can write to every folder");
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("x.cfg");
+    QVERIFY(TestFiles::write(path, "old and longer\n"));
+    const QFileDevice::Permissions readOnly = QFileDevice::ReadOwner | QFileDevice::ExeOwner;
+    QVERIFY(QFile::setPermissions(folder.path(), readOnly));
+    QString error;
+    const bool isSaved = SettingsFileWriter::SaveBytes(path, "new\n", &error);
+    QVERIFY(QFile::setPermissions(folder.path(), readOnly | QFileDevice::WriteOwner));
+    QVERIFY2(isSaved, qPrintable(error));
+    QCOMPARE(TestFiles::listing(folder.path()), QStringList("x.cfg: new\n"));
+}
+
 void tst_SettingsFile::backup()
 {
     const QTemporaryDir folder;
@@ -723,6 +744,37 @@ void tst_SettingsFile::backup()
         QCOMPARE(TestFiles::read(path), QByteArray(content));
     }
     QCOMPARE(error, QString());
+}
+
+void tst_SettingsFile::fullDiskKeepsTheBackup()
+{
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("x.cfg");
+    QVERIFY(TestFiles::write(path, QByteArray(1000, 'v')));
+    QVERIFY(TestFiles::write(path + ".bak", "old"));
+    if (!ProcessLimits::limitFileSize(100))
+        QSKIP("the size of files cannot be limited here");
+    QString error;
+    const bool isKept = SettingsFileWriter::KeepBackup(path, &error);
+    ProcessLimits::unlimitFileSize();
+    QVERIFY(!isKept && !error.isEmpty());
+    QCOMPARE(TestFiles::read(path + ".bak"), QByteArray("old"));
+    QCOMPARE(QDir(folder.path()).entryList(QDir::Files), QStringList({"x.cfg", "x.cfg.bak"}));
+}
+
+void tst_SettingsFile::linkInPlaceOfTheBackup()
+{
+    const QTemporaryDir folder;
+    const QString path = folder.filePath("x.cfg");
+    const QString other = folder.filePath("other");
+    QVERIFY(TestFiles::write(path, "one"));
+    QString error;
+    QVERIFY(TestFiles::write(other, "other"));
+    QVERIFY(QFile::link(other, path + ".bak"));
+    QVERIFY2(SettingsFileWriter::KeepBackup(path, &error), qPrintable(error));
+    QVERIFY(!QFileInfo(path + ".bak").isSymLink());
+    QCOMPARE(TestFiles::read(path + ".bak"), QByteArray("one"));
+    QCOMPARE(TestFiles::read(other), QByteArray("other"));
 }
 
 void tst_SettingsFile::noBackup()
@@ -742,13 +794,13 @@ void tst_SettingsFile::noBackup()
     QCOMPARE(error, "Cannot replace the file " + copy + ".");
     QVERIFY(QDir(copy).removeRecursively());
 
-    // A link to nowhere is no file that could be removed, and nothing is copied over it.
+    // A link to nowhere is no file that could be removed, and nothing is renamed over it.
+    error.clear();
     QVERIFY(QFile::link(folder.filePath("nowhere/y"), copy));
     QVERIFY(!SettingsFileWriter::KeepBackup(path, &error));
-    QFile file(path);
-    QVERIFY(!file.copy(copy));
-    QCOMPARE(error, file.errorString());
+    QCOMPARE(error, "Cannot replace the file " + copy + ".");
     QCOMPARE(TestFiles::read(path), QByteArray("one"));
+    QCOMPARE(QDir(folder.path()).entryList(QDir::Files), QStringList("x.cfg"));
 }
 
 QTEST_GUILESS_MAIN(tst_SettingsFile)

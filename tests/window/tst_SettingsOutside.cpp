@@ -431,6 +431,9 @@ void tst_SettingsOutside::ownersAreTold_data()
     QTest::addColumn<QString>("told");
     QTest::newRow("window") << "window"
                             << "settings of this window. It takes over what you save";
+    QTest::newRow("window, through a link")
+        << "link"
+        << "settings of this window. It takes over what you save";
     QTest::newRow("log") << "log"
                          << "settings of this program's log. It reads them at the next";
     QTest::newRow("nobody") << "nobody"
@@ -446,8 +449,10 @@ void tst_SettingsOutside::ownersAreTold()
     const QString file = owner == "window" ? test.settingsFile()
                          : owner == "log"  ? LogPreferences::FileName()
                                            : other;
+    if (owner == "link")
+        QVERIFY(QFile::link(test.settingsFile(), other));
     if (owner != "log")
-        QVERIFY(TestFiles::write(file, Settings));
+        QVERIFY(TestFiles::write(owner == "link" ? test.settingsFile() : file, Settings));
     const auto window = WindowTest::show();
     window->OpenFile(file);
     SettingsEditor const* editor = window->findChild<FileTabs*>()->currentEditor();
