@@ -7,6 +7,7 @@
 
 #include <QAction>
 #include <QEvent>
+#include <QToolButton>
 
 namespace Velocor {
 
@@ -26,6 +27,12 @@ void MainToolBar::AddTool(QAction* action, ActionIcons::Name icon)
     action->setToolTip(PlainToolTip(tr("%1 (%2)").arg(
         action->statusTip(), action->shortcut().toString(QKeySequence::NativeText))));
     addAction(action);
+    // Assistive technology toggles the button without a click, and Qt does not tell the action.
+    auto const* button = qobject_cast<QToolButton*>(widgetForAction(action));
+    connect(button, &QToolButton::toggled, action, [action](bool checked) {
+        if (action->isChecked() != checked)
+            action->trigger();
+    });
 }
 
 void MainToolBar::AddSpace()
