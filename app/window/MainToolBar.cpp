@@ -7,6 +7,7 @@
 
 #include <QAction>
 #include <QEvent>
+#include <QStyle>
 #include <QToolButton>
 
 namespace Velocor {
@@ -16,7 +17,7 @@ MainToolBar::MainToolBar(QWidget* parent) : QToolBar(parent)
     setAccessibleName(tr("Tools"));
     setMovable(false);
     setContextMenuPolicy(Qt::PreventContextMenu); // the window's would hide it behind the menu item
-    setIconSize(QSize(20, 20));
+    updateIconSize();
 }
 
 void MainToolBar::AddTool(QAction* action, ActionIcons::Name icon)
@@ -42,9 +43,18 @@ void MainToolBar::AddSpace()
     addWidget(space);
 }
 
+// Between those of menus and the large ones of tool bars that have nothing else.
+void MainToolBar::updateIconSize()
+{
+    const int size = style()->pixelMetric(QStyle::PM_SmallIconSize, nullptr, this) * 5 / 4;
+    setIconSize(QSize(size, size));
+}
+
 void MainToolBar::changeEvent(QEvent* event)
 {
     QToolBar::changeEvent(event);
+    if (event->type() == QEvent::FontChange || event->type() == QEvent::StyleChange)
+        updateIconSize();
     if (event->type() != QEvent::PaletteChange)
         return;
     for (Tool const& tool : qAsConst(m_tools))

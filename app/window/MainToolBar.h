@@ -28,6 +28,8 @@ protected:
     void changeEvent(QEvent* event) override;
 
 private:
+    void updateIconSize();
+
     struct Tool
     {
         QAction* action;

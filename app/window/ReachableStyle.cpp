@@ -7,6 +7,7 @@
 #include "app/window/widgets/Contrast.h"
 
 #include <QAbstractScrollArea>
+#include <QApplication>
 #include <QEvent>
 #include <QMetaEnum>
 #include <QPainter>
@@ -14,11 +15,14 @@
 #include <QStyleOption>
 #include <QWidget>
 
+#include <algorithm>
+
 namespace Velocor {
 
 namespace {
 
-constexpr int FrameShade = 140; // of Fusion's frames, in percent
+constexpr int UsualTextHeight = 18; // pixels; what has an icon is made for
+constexpr int FrameShade = 140;     // of Fusion's frames, in percent
 
 QColor FocusColor(QPalette const& palette, QColor const& ground, qreal least = PartContrast)
 {
@@ -163,6 +167,31 @@ void ReachableStyle::drawControl(ControlElement element, QStyleOption const* opt
                   FocusColor(option->palette,
                              option->palette.color(QPalette::Window).darker(FrameShade),
                              TextContrast)); // a thin line
+}
+
+int ReachableStyle::pixelMetric(PixelMetric metric, QStyleOption const* option,
+                                QWidget const* widget) const
+{
+    const int usual = QProxyStyle::pixelMetric(metric, option, widget);
+    switch (metric) {
+    case PM_ButtonIconSize:
+    case PM_ExclusiveIndicatorHeight:
+    case PM_ExclusiveIndicatorWidth:
+    case PM_IndicatorHeight:
+    case PM_IndicatorWidth:
+    case PM_ListViewIconSize:
+    case PM_SmallIconSize:
+    case PM_TabBarIconSize:
+    case PM_TabCloseIndicatorHeight:
+    case PM_TabCloseIndicatorWidth:
+    case PM_ToolBarIconSize: {
+        const QFontMetrics text =
+            widget ? widget->fontMetrics() : QFontMetrics(QApplication::font());
+        return usual * std::max(UsualTextHeight, text.height()) / UsualTextHeight;
+    }
+    default:
+        return usual;
+    }
 }
 
 // Those of Fusion can hardly be seen on dark colors.

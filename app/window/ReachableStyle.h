@@ -41,6 +41,10 @@ public:
     void drawControl(ControlElement element, QStyleOption const* option, QPainter* painter,
                      QWidget const* widget) const override;
 
+    /// Icons and check boxes grow with the text beside them.
+    int pixelMetric(PixelMetric metric, QStyleOption const* option = nullptr,
+                    QWidget const* widget = nullptr) const override;
+
     int styleHint(StyleHint hint, QStyleOption const* option, QWidget const* widget,
                   QStyleHintReturn* returned) const override;
 

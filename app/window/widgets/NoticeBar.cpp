@@ -13,6 +13,7 @@
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QPushButton>
+#include <QStyle>
 
 namespace Velocor {
 
@@ -54,7 +55,8 @@ void NoticeBar::updateColors()
     colors.setColor(QPalette::Window, Blended(outer.color(QPalette::Base), warning, Tint));
     if (palette().color(QPalette::Window) != colors.color(QPalette::Window))
         setPalette(colors);
-    m_icon->setPixmap(SeverityIcons::Icon(LogEntry::Warning, outer).pixmap(16));
+    m_icon->setPixmap(SeverityIcons::Icon(LogEntry::Warning, outer)
+                          .pixmap(style()->pixelMetric(QStyle::PM_SmallIconSize, nullptr, this)));
 }
 
 void NoticeBar::changeEvent(QEvent* event)
