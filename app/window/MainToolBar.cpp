@@ -7,16 +7,10 @@
 
 #include <QAction>
 #include <QEvent>
-
-#include <algorithm>
+#include <QStyle>
+#include <QToolButton>
 
 namespace Velocor {
-
-namespace {
-
-constexpr int UsualIconSize = 20; // pixels
-
-} // namespace
 
 MainToolBar::MainToolBar(QWidget* parent) : QToolBar(parent)
 {
@@ -24,12 +18,6 @@ MainToolBar::MainToolBar(QWidget* parent) : QToolBar(parent)
     setMovable(false);
     setContextMenuPolicy(Qt::PreventContextMenu); // the window's would hide it behind the menu item
     updateIconSize();
-}
-
-void MainToolBar::updateIconSize()
-{
-    const int size = std::max(UsualIconSize, fontMetrics().height());
-    setIconSize(QSize(size, size));
 }
 
 void MainToolBar::AddTool(QAction* action, ActionIcons::Name icon)
@@ -40,6 +28,12 @@ void MainToolBar::AddTool(QAction* action, ActionIcons::Name icon)
     action->setToolTip(PlainToolTip(tr("%1 (%2)").arg(
         action->statusTip(), action->shortcut().toString(QKeySequence::NativeText))));
     addAction(action);
+    // Assistive technology toggles the button without a click, and Qt does not tell the action.
+    auto const* button = qobject_cast<QToolButton*>(widgetForAction(action));
+    connect(button, &QToolButton::toggled, action, [action](bool checked) {
+        if (action->isChecked() != checked)
+            action->trigger();
+    });
 }
 
 void MainToolBar::AddSpace()
@@ -49,10 +43,17 @@ void MainToolBar::AddSpace()
     addWidget(space);
 }
 
+// Between those of menus and the large ones of tool bars that have nothing else.
+void MainToolBar::updateIconSize()
+{
+    const int size = style()->pixelMetric(QStyle::PM_SmallIconSize, nullptr, this) * 5 / 4;
+    setIconSize(QSize(size, size));
+}
+
 void MainToolBar::changeEvent(QEvent* event)
 {
     QToolBar::changeEvent(event);
-    if (event->type() == QEvent::FontChange)
+    if (event->type() == QEvent::FontChange || event->type() == QEvent::StyleChange)
         updateIconSize();
     if (event->type() != QEvent::PaletteChange)
         return;

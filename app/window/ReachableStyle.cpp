@@ -9,7 +9,6 @@
 #include <QAbstractScrollArea>
 #include <QApplication>
 #include <QEvent>
-#include <QFontMetrics>
 #include <QMetaEnum>
 #include <QPainter>
 #include <QPalette>
@@ -22,7 +21,8 @@ namespace Velocor {
 
 namespace {
 
-constexpr int FrameShade = 140; // of Fusion's frames, in percent
+constexpr int UsualTextHeight = 18; // pixels; what has an icon is made for
+constexpr int FrameShade = 140;     // of Fusion's frames, in percent
 
 QColor FocusColor(QPalette const& palette, QColor const& ground, qreal least = PartContrast)
 {
@@ -126,28 +126,6 @@ QSize ReachableStyle::sizeFromContents(ContentsType type, QStyleOption const* op
     }
 }
 
-int ReachableStyle::pixelMetric(PixelMetric metric, QStyleOption const* option,
-                                QWidget const* widget) const
-{
-    const int usual = QProxyStyle::pixelMetric(metric, option, widget);
-    const QFontMetrics font = widget ? widget->fontMetrics() : QFontMetrics(QApplication::font());
-    switch (metric) {
-    case PM_ButtonIconSize:
-    case PM_ListViewIconSize:
-    case PM_SmallIconSize:
-    case PM_TabBarIconSize:
-    case PM_ToolBarIconSize:
-        return std::max(usual, font.height());
-    case PM_ExclusiveIndicatorHeight:
-    case PM_ExclusiveIndicatorWidth:
-    case PM_IndicatorHeight:
-    case PM_IndicatorWidth:
-        return std::max(usual, font.height() * 2 / 3);
-    default:
-        return usual;
-    }
-}
-
 // The field in a spin box has no frame of its own.
 void ReachableStyle::drawComplexControl(ComplexControl control, QStyleOptionComplex const* option,
                                         QPainter* painter, QWidget const* widget) const
@@ -189,6 +167,31 @@ void ReachableStyle::drawControl(ControlElement element, QStyleOption const* opt
                   FocusColor(option->palette,
                              option->palette.color(QPalette::Window).darker(FrameShade),
                              TextContrast)); // a thin line
+}
+
+int ReachableStyle::pixelMetric(PixelMetric metric, QStyleOption const* option,
+                                QWidget const* widget) const
+{
+    const int usual = QProxyStyle::pixelMetric(metric, option, widget);
+    switch (metric) {
+    case PM_ButtonIconSize:
+    case PM_ExclusiveIndicatorHeight:
+    case PM_ExclusiveIndicatorWidth:
+    case PM_IndicatorHeight:
+    case PM_IndicatorWidth:
+    case PM_ListViewIconSize:
+    case PM_SmallIconSize:
+    case PM_TabBarIconSize:
+    case PM_TabCloseIndicatorHeight:
+    case PM_TabCloseIndicatorWidth:
+    case PM_ToolBarIconSize: {
+        const QFontMetrics text =
+            widget ? widget->fontMetrics() : QFontMetrics(QApplication::font());
+        return usual * std::max(UsualTextHeight, text.height()) / UsualTextHeight;
+    }
+    default:
+        return usual;
+    }
 }
 
 // Those of Fusion can hardly be seen on dark colors.

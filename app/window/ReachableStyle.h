@@ -28,10 +28,6 @@ public:
     QSize sizeFromContents(ContentsType type, QStyleOption const* option, QSize const& size,
                            QWidget const* widget) const override;
 
-    /// Icons and check boxes grow with the text beside them, if that is larger than usual.
-    int pixelMetric(PixelMetric metric, QStyleOption const* option,
-                    QWidget const* widget) const override;
-
     /// Fields and check boxes have a frame that can be seen in any colors.
     ///
     /// The part with the keyboard focus has a frame, also where Fusion shows nothing, as on lists,
@@ -44,6 +40,10 @@ public:
 
     void drawControl(ControlElement element, QStyleOption const* option, QPainter* painter,
                      QWidget const* widget) const override;
+
+    /// Icons and check boxes grow with the text beside them.
+    int pixelMetric(PixelMetric metric, QStyleOption const* option = nullptr,
+                    QWidget const* widget = nullptr) const override;
 
     int styleHint(StyleHint hint, QStyleOption const* option, QWidget const* widget,
                   QStyleHintReturn* returned) const override;

@@ -363,7 +363,7 @@ class Places:
     "see where the program keeps its files"
 
     def atspi(run):
-        run.menu("View", "Places")
+        run.press("check box", "Places")
 
     def keyboard(run):
         run.keys("F9")

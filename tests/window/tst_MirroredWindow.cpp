@@ -353,6 +353,7 @@ void tst_MirroredWindow::barsAndTimes()
         const PseudoLanguage language(writing);
         const WindowTest test(log);
         const auto window = WindowTest::show();
+        QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 100, Patience);
         auto* strip = window->findChild<ActivityStrip*>();
         QSignalSpy shown(strip, &ActivityStrip::shown);
         strip->SetShown(true);

@@ -57,6 +57,8 @@ class tst_TextSizes : public WindowTestCase
 private slots:
     void window_data();
     void window();
+    void icons_data();
+    void icons();
     void cells_data();
     void cells();
     void dialogs_data();
@@ -106,6 +108,27 @@ void tst_TextSizes::window()
             Action(*window, action)->trigger();
     }
     QTRY_COMPARE_WITH_TIMEOUT(problems(window.get()), QString(), Patience);
+}
+
+void tst_TextSizes::icons_data()
+{
+    cells_data();
+}
+
+// They are not much smaller than the letters beside them.
+void tst_TextSizes::icons()
+{
+    QFETCH(int, points);
+    useSize(points);
+    const WindowTest test(DemoLog::entry("12:00:00.000", "Notification", "entry"));
+    const auto window = WindowTest::show();
+    const int least = window->fontMetrics().ascent() * 3 / 4;
+    const QList<QToolButton*> tools = window->findChildren<QToolButton*>();
+    for (QToolButton const* tool : tools)
+        QVERIFY2(tool->iconSize().height() >= least, qPrintable(tool->accessibleName()));
+    for (auto metric : {QStyle::PM_SmallIconSize, QStyle::PM_IndicatorHeight,
+                        QStyle::PM_TabCloseIndicatorHeight, QStyle::PM_ListViewIconSize})
+        QVERIFY(window->style()->pixelMetric(metric, nullptr, window.get()) >= least);
 }
 
 void tst_TextSizes::cells_data()

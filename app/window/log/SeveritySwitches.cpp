@@ -19,8 +19,9 @@ namespace Velocor {
 
 namespace {
 
-constexpr int Margin = 5;  // pixels
-constexpr int IconGap = 4; // of Qt, between icon and text, in pixels
+constexpr int Margin = 5;     // pixels
+constexpr int IconGap = 4;    // of Qt, between icon and text, in pixels
+constexpr int LeastIcon = 16; // pixels; larger ones would need room that small screens lack
 
 // Qt replaces the shortcut of a button along with its text.
 void SetText(QToolButton* button, QString const& text)
@@ -72,8 +73,10 @@ void SeveritySwitches::updateIcons()
 void SeveritySwitches::updateWidths()
 {
     for (QToolButton* button : qAsConst(m_buttons)) {
+        const int icon = std::max(LeastIcon, button->fontMetrics().ascent() * 3 / 4);
+        button->setIconSize(QSize(icon, icon));
         const int number = button->fontMetrics().boundingRect(QStringLiteral("888M")).width();
-        button->setFixedWidth(Margin + button->iconSize().width() + IconGap + number + Margin);
+        button->setFixedWidth(Margin + icon + IconGap + number + Margin);
     }
 }
 

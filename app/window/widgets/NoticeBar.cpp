@@ -55,8 +55,8 @@ void NoticeBar::updateColors()
     colors.setColor(QPalette::Window, Blended(outer.color(QPalette::Base), warning, Tint));
     if (palette().color(QPalette::Window) != colors.color(QPalette::Window))
         setPalette(colors);
-    const int size = style()->pixelMetric(QStyle::PM_SmallIconSize, nullptr, this);
-    m_icon->setPixmap(SeverityIcons::Icon(LogEntry::Warning, outer).pixmap(size));
+    m_icon->setPixmap(SeverityIcons::Icon(LogEntry::Warning, outer)
+                          .pixmap(style()->pixelMetric(QStyle::PM_SmallIconSize, nullptr, this)));
 }
 
 void NoticeBar::changeEvent(QEvent* event)
