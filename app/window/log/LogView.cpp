@@ -17,6 +17,7 @@
 #include <QPainter>
 #include <QScopedValueRollback>
 #include <QScrollBar>
+#include <QStyle>
 
 #include <algorithm>
 
@@ -86,6 +87,7 @@ void LogView::SetDefaultWidths()
 {
     const QFontMetrics metrics = fontMetrics();
     const int padding = 16;
+    const int icon = style()->pixelMetric(QStyle::PM_SmallIconSize, nullptr, this) + 8;
     setColumnWidth(LogModel::TimeColumn,
                    metrics.boundingRect(QStringLiteral("2000-00-00 00:00:00.000")).width() +
                        padding);
@@ -94,13 +96,13 @@ void LogView::SetDefaultWidths()
         const QString name = LogSeverities::Name(static_cast<LogEntry::Severity>(i));
         severity = std::max(severity, metrics.boundingRect(name).width());
     }
-    setColumnWidth(LogModel::SeverityColumn, severity + 24 + padding);
+    setColumnWidth(LogModel::SeverityColumn, severity + icon + padding);
     setColumnWidth(LogModel::ElapsedColumn,
                    metrics.boundingRect(QStringLiteral("00000 ms")).width() + padding);
     setColumnWidth(LogModel::SinceColumn,
                    metrics.boundingRect(QStringLiteral("00 min 00 s")).width() + padding);
     setColumnWidth(LogModel::ProgramColumn,
-                   metrics.boundingRect(QStringLiteral("Sample Program")).width() + 24 + padding);
+                   metrics.boundingRect(QStringLiteral("Sample Program")).width() + icon + padding);
     for (int column = 0; column < LogModel::MessageColumn; ++column)
         setColumnWidth(column,
                        std::max(columnWidth(column), horizontalHeader()->sectionSizeHint(column)));
