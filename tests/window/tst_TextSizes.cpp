@@ -149,7 +149,8 @@ void tst_TextSizes::cells()
     QStyleOptionViewItem option;
     option.font = View(*window)->font();
     option.fontMetrics = QFontMetrics(option.font);
-    const int icon = View(*window)->style()->pixelMetric(QStyle::PM_SmallIconSize);
+    const int icon =
+        View(*window)->style()->pixelMetric(QStyle::PM_SmallIconSize, nullptr, View(*window));
     option.decorationSize = QSize(icon, icon);
     for (int column : {LogModel::TimeColumn, LogModel::SeverityColumn}) {
         const QModelIndex cell = View(*window)->model()->index(0, column);

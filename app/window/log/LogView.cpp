@@ -87,7 +87,7 @@ void LogView::SetDefaultWidths()
 {
     const QFontMetrics metrics = fontMetrics();
     const int padding = 16;
-    const int icon = style()->pixelMetric(QStyle::PM_SmallIconSize, nullptr, this) + padding / 2;
+    const int icon = style()->pixelMetric(QStyle::PM_SmallIconSize, nullptr, this) + 8;
     setColumnWidth(LogModel::TimeColumn,
                    metrics.boundingRect(QStringLiteral("2000-00-00 00:00:00.000")).width() +
                        padding);
