@@ -3,9 +3,11 @@
 
 // Compares what velocor-log prints of random logs, with random options, with what the log view
 // shows of each file, and with a filter that looks at each line of an entry. With a span of time,
-// and of all files of a log, with what the log view's own scanner shows.
+// and of all files of a log, with what the log view's own scanner shows; of several programs, with
+// what its scanner of a family shows.
 
 #include "app/ProgramRuns.h"
+#include "app/history/FamilyScanner.h"
 #include "app/history/HistoryScanner.h"
 #include "app/history/HistoryTime.h"
 #include "app/logfile/LogIndex.h"
@@ -189,7 +191,20 @@ LogFilter FilterOf(Options const& options)
     return filter;
 }
 
-// What the log view shows of a file or of all files of a log, each line with a line end.
+// What the log view shows, each line with a line end.
+QByteArray TextOf(HistoryUpdate const& update, LogSource const& source)
+{
+    QByteArray text;
+    LogLineReader reader;
+    reader.Open(source, update.type);
+    for (size_t row = 0; update.rows && row < update.rows->size(); ++row) {
+        if (!update.rows->isHeading(row))
+            text += reader.Line(update.rows->start(row)) + '\n';
+    }
+    return text;
+}
+
+// Of a file or of all files of a log.
 QByteArray Viewed(QString const& path, LogLineParser const& parser, Options const& options,
                   bool isAll)
 {
@@ -198,14 +213,21 @@ QByteArray Viewed(QString const& path, LogLineParser const& parser, Options cons
     QObject::connect(&scanner, &HistoryScanner::updated, &scanner,
                      [&](HistoryUpdate const& now) { update = now; });
     scanner.Open(0, path, parser, FilterOf(options), isAll);
-    QByteArray text;
-    LogLineReader reader;
-    reader.Open({path, update.older}, update.type);
-    for (size_t row = 0; update.rows && row < update.rows->size(); ++row) {
-        if (!update.rows->isHeading(row))
-            text += reader.Line(update.rows->start(row)) + '\n';
-    }
-    return text;
+    return TextOf(update, {path, update.older});
+}
+
+// Of several programs as one.
+QByteArray ViewedFamily(QList<ProgramLog> const& logs, LogLineParser const& parser,
+                        Options const& options)
+{
+    HistoryUpdate update;
+    FamilyScanner scanner;
+    QObject::connect(&scanner, &FamilyScanner::updated, &scanner,
+                     [&](HistoryUpdate const& now) { update = now; });
+    scanner.OpenFamily(0, logs, parser, FilterOf(options), {});
+    LogSource source;
+    source.logs = update.logs;
+    return TextOf(update, source);
 }
 
 } // namespace
@@ -217,6 +239,7 @@ class tst_PlainTerminal : public QObject
 private slots:
     void randomFilters();
     void randomSpans();
+    void randomFamilies();
     void cleanupTestCase();
 
 private:
@@ -231,6 +254,8 @@ private:
     qint64 m_bytes = 0;
     int m_spans = 0;
     int m_cut = 0; // spans that leave out some of the lines, but not all
+    int m_merges = 0;
+    int m_mixed = 0; // merges with lines of several programs
 };
 
 // Of one file, as the log view shows it and as the plain filter does.
@@ -375,8 +400,62 @@ void tst_PlainTerminal::randomSpans()
     QVERIFY2(m_cut > count / 10, qPrintable(QString::number(m_cut)));
 }
 
+// Of two or three programs, with and without a span of time.
+void tst_PlainTerminal::randomFamilies()
+{
+    static const QStringList names = {"Mail", "Notes", "Shop"};
+    std::mt19937 random(Rounds::seed());
+    const int count = Rounds::count(40, 10000, 100000);
+    while (m_merges < count) {
+        const quint32 seed = random();
+        Generator generator(seed);
+        const qint64 start = 1741000000000 + generator.below(100000000);
+        std::vector<std::unique_ptr<ProgramLife>> lives;
+        QList<ProgramLog> logs;
+        QStringList files;
+        for (int i = 2 + generator.below(2); i > 0; --i) {
+            QString const& name = names[i - 1];
+            const QString folder = m_folder.filePath("data/yourorganization/" + name + "/logs");
+            QVERIFY(QDir().mkpath(folder));
+            logs.append({name, folder + '/' + name.toLower() + ".log"});
+            lives.push_back(std::make_unique<ProgramLife>(logs.last().path, i, start, random()));
+            files += makeLog(*lives.back(), generator);
+        }
+        const bool isAlike = std::all_of(lives.begin(), lives.end(), [&](auto const& life) {
+            return life->formats() == lives[0]->formats() && QFile::exists(life->path());
+        });
+        for (int i = 0; i < 4 && isAlike; ++i) {
+            Options options = generator.next();
+            if (generator.chance(2))
+                generator.addSpan(options, *lives[0]);
+            QStringList arguments{"--merge"};
+            for (ProgramLog const& log : qAsConst(logs))
+                arguments.append(log.name);
+            const ProgramResult result = RunProgram(VELOCOR_LOG, arguments + options.arguments,
+                                                    PrivateEnvironment(m_folder.path()));
+            QByteArray printed = result.output;
+            if (!printed.isEmpty() && !printed.endsWith('\n'))
+                printed += '\n'; // the last line of a file has no end
+            const QByteArray viewed =
+                ViewedFamily(logs, LogLineParser(lives[0]->formats(), {}), options);
+            if (printed != viewed)
+                qWarning("merge %d, of seed %u", m_merges, seed);
+            QCOMPARE(printed, viewed);
+            QCOMPARE(result.exitCode, viewed.isEmpty() ? 1 : 0);
+            QCOMPARE(result.errors, QByteArray());
+            ++m_merges;
+            m_mixed += viewed.contains("P1 ") && viewed.contains("P2 ");
+        }
+        for (QString const& file : qAsConst(files))
+            QFile::remove(file);
+    }
+    QVERIFY2(m_mixed > count / 4, qPrintable(QString::number(m_mixed)));
+}
+
 void tst_PlainTerminal::cleanupTestCase()
 {
+    std::printf("plain terminal: %d merges, %d of them with lines of several programs\n", m_merges,
+                m_mixed);
     std::printf("plain terminal: %d filters with spans of time, %d that leave out some lines\n",
                 m_spans, m_cut);
     std::printf("plain terminal: %d filters, %d that nothing matches, %lld bytes printed\n",
