@@ -269,7 +269,7 @@ Erstellt %1
     </message>
     <message>
         <source>it was killed or crashed</source>
-        <translation>beendet worden oder abgestürzt</translation>
+        <translation>gewaltsam beendet oder abgestürzt</translation>
     </message>
     <message>
         <source>it is running</source>
@@ -784,7 +784,7 @@ Erstellt %1
     </message>
     <message>
         <source>killed or crashed</source>
-        <translation>beendet worden oder abgestürzt</translation>
+        <translation>gewaltsam beendet oder abgestürzt</translation>
     </message>
     <message>
         <source>still running</source>
@@ -3502,10 +3502,6 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
     <message>
         <source>Add Section</source>
         <translation>Abschnitt hinzufügen</translation>
-    </message>
-    <message>
-        <source>value</source>
-        <translation>wert</translation>
     </message>
     <message>
         <source>Add Key</source>

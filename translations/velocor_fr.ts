@@ -269,7 +269,7 @@ Créé le %1
     </message>
     <message>
         <source>it was killed or crashed</source>
-        <translation>tuée ou plantée</translation>
+        <translation>arrêtée de force ou plantée</translation>
     </message>
     <message>
         <source>it is running</source>
@@ -784,7 +784,7 @@ Créé le %1
     </message>
     <message>
         <source>killed or crashed</source>
-        <translation>tuée ou plantée</translation>
+        <translation>arrêtée de force ou plantée</translation>
     </message>
     <message>
         <source>still running</source>
@@ -3502,10 +3502,6 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
     <message>
         <source>Add Section</source>
         <translation>Ajouter une section</translation>
-    </message>
-    <message>
-        <source>value</source>
-        <translation>valeur</translation>
     </message>
     <message>
         <source>Add Key</source>

@@ -7,6 +7,8 @@
 #include "WindowTestCase.h"
 
 #include "app/language/Language.h"
+#include "app/window/FileTabs.h"
+#include "app/window/settings/SettingsEditor.h"
 
 #include "common/log/TorkLog.h"
 
@@ -15,6 +17,7 @@
 #include <QMenu>
 #include <QMenuBar>
 #include <QRegularExpression>
+#include <QTreeView>
 
 using namespace Velocor;
 using namespace WindowParts;
@@ -87,6 +90,24 @@ QMap<QString, QByteArray> FilesOfAWindow(QString const& language)
     return Files(test);
 }
 
+// A settings file with a key and a section that were added to it.
+QByteArray SettingsWithMore(QString const& language)
+{
+    const ChosenLanguage test(language);
+    const QString file = test.folder() + "shop.cfg";
+    if (!TestFiles::write(file, Settings))
+        qFatal("the settings file cannot be written");
+    const auto window = WindowTest::show();
+    window->OpenFile(file);
+    SettingsEditor* editor = window->findChild<FileTabs*>()->currentEditor();
+    auto* tree = editor->findChild<QTreeView*>();
+    tree->setCurrentIndex(tree->model()->index(0, 0));
+    QTest::keyClick(tree, Qt::Key_Insert);
+    QTest::keyClick(tree, Qt::Key_Insert, Qt::AltModifier);
+    editor->Save();
+    return TestFiles::read(file);
+}
+
 } // namespace
 
 class tst_LanguagesInWindow : public WindowTestCase
@@ -99,6 +120,7 @@ private slots:
     void unknownLanguage();
     void columnsFitTheLanguage();
     void filesDoNotDependOnIt();
+    void addedSettingsDoNotDependOnIt();
 
 protected slots:
     void cleanup() override;
@@ -191,6 +213,14 @@ void tst_LanguagesInWindow::filesDoNotDependOnIt()
         for (QString const& name : names)
             QCOMPARE(others.value(name).split('\n'), english.value(name).split('\n'));
     }
+}
+
+void tst_LanguagesInWindow::addedSettingsDoNotDependOnIt()
+{
+    const QByteArray english = SettingsWithMore("en");
+    QVERIFY(english.contains("<key>value</key>") && english.contains("<Section"));
+    for (char const* code : {"de", "fr"})
+        QCOMPARE(SettingsWithMore(code), english);
 }
 
 QTEST_MAIN(tst_LanguagesInWindow)

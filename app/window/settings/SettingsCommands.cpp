@@ -153,7 +153,7 @@ QModelIndex SettingsCommands::AddKey(QModelIndex const& near)
     const int end = m_model->document().sections.at(place.section).items.size();
     place.item = end;
     SettingsEdit edit = EditAt(SettingsEdit::InsertItem, place);
-    edit.addedItem = {freeName(place, QStringLiteral("key")), tr("value")};
+    edit.addedItem = {freeName(place, QStringLiteral("key")), QStringLiteral("value")};
     push({edit}, tr("Add Key"));
     return m_model->IndexOf(place);
 }
