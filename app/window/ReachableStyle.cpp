@@ -21,7 +21,7 @@ namespace Velocor {
 
 namespace {
 
-constexpr int UsualTextHeight = 18; // pixels; what has an icon is made for
+constexpr int UsualFontHeight = 18; // pixels; what has an icon is made for
 constexpr int FrameShade = 140;     // of Fusion's frames, in percent
 
 QColor FocusColor(QPalette const& palette, QColor const& ground, qreal least = PartContrast)
@@ -187,7 +187,7 @@ int ReachableStyle::pixelMetric(PixelMetric metric, QStyleOption const* option,
     case PM_ToolBarIconSize: {
         const QFontMetrics text =
             widget ? widget->fontMetrics() : QFontMetrics(QApplication::font());
-        return usual * std::max(UsualTextHeight, text.height()) / UsualTextHeight;
+        return usual * std::max(UsualFontHeight, text.height()) / UsualFontHeight;
     }
     default:
         return usual;
