@@ -28,22 +28,41 @@ void SettingsModel::SetDocument(SettingsDocument const& document)
     beginResetModel();
     m_document = document;
     m_chosenKinds.clear();
-    makeRows();
+    setRows(shownRows());
     endResetModel();
 }
 
-void SettingsModel::SetFilter(SettingsFilter const& filter)
+// For the goal that a key press answers within 16 ms: most keys of a longer text change few rows or
+// none, and all rows take longer to lay out than to find.
+bool SettingsModel::SetFilter(SettingsFilter const& filter)
 {
-    beginResetModel();
     m_filter = filter;
-    makeRows();
+    SettingsFilter::Shown shown = shownRows();
+    if (hasRows(shown))
+        return false;
+    beginResetModel();
+    setRows(std::move(shown));
     endResetModel();
+    return true;
 }
 
-void SettingsModel::makeRows()
+SettingsFilter::Shown SettingsModel::shownRows() const
 {
-    SettingsFilter::Shown shown = m_filter.Of(
-        m_document, m_filter.onlyChanged ? m_saved.AllValues() : SettingsValues(), m_defaults);
+    return m_filter.Of(m_document, m_filter.onlyChanged ? m_saved.AllValues() : SettingsValues(),
+                       m_defaults);
+}
+
+bool SettingsModel::hasRows(SettingsFilter::Shown const& shown) const
+{
+    return m_shownSections.numbers() == shown.sections &&
+           std::equal(m_rows.begin(), m_rows.end(), shown.items.begin(), shown.items.end(),
+                      [](std::unique_ptr<SectionRows> const& rows, std::vector<int> const& items) {
+                          return rows->items.numbers() == items;
+                      });
+}
+
+void SettingsModel::setRows(SettingsFilter::Shown shown)
+{
     m_shownSections = SettingsRows(std::move(shown.sections));
     m_rows.clear();
     for (std::vector<int>& items : shown.items)

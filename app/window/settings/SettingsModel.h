@@ -67,8 +67,11 @@ public:
     /// What is in the file, for a filter that is set later.
     void SetSaved(SettingsDocument const& saved) { m_saved = saved; }
 
-    /// Shows only some of the keys, from now on. Emits `modelReset`.
-    void SetFilter(SettingsFilter const& filter);
+    /// Shows only some of the keys, from now on. Emits `modelReset` if these are others than
+    /// before.
+    ///
+    /// @return whether they are
+    bool SetFilter(SettingsFilter const& filter);
     SettingsFilter const& filter() const { return m_filter; }
 
     /// The number of keys that are shown.
@@ -151,7 +154,9 @@ private:
     SettingsEdit applyMove(SettingsEdit const& edit);
     SettingsEdit applyText(SettingsEdit const& edit);
     void show(Place place);
-    void makeRows();
+    SettingsFilter::Shown shownRows() const;
+    bool hasRows(SettingsFilter::Shown const& shown) const;
+    void setRows(SettingsFilter::Shown shown);
     void renumber();
     SettingsRows& shownBeside(SettingsEdit const& edit);
     int itemCount(int sectionRow) const;

@@ -20,6 +20,9 @@ public:
     /// All entries of a list.
     static SettingsRows All(int count);
 
+    /// The numbers of the entries that are shown, in ascending order.
+    std::vector<int> const& numbers() const { return m_numbers; }
+
     int count() const { return static_cast<int>(m_numbers.size()); }
 
     /// The number of the entry in a row.

@@ -191,10 +191,13 @@ void SettingsTree::SetFilter(SettingsFilter const& filter)
 {
     EndEditing();
     const SettingsModel::Place place = SettingsModel::PlaceOf(currentIndex());
-    if (m_model->filter().isEmpty())
+    const bool wasEmpty = m_model->filter().isEmpty();
+    if (wasEmpty)
         noteCollapsed();
-    m_model->SetFilter(filter);
-    expandAll();
+    const bool hasOtherRows = m_model->SetFilter(filter);
+    if (hasOtherRows || (wasEmpty && !m_collapsed.isEmpty()))
+        expandAll();
+    viewport()->update();
     for (int row = 0; row < m_model->rowCount() && filter.isEmpty(); ++row) {
         const QModelIndex section = m_model->index(row, SettingsModel::NameColumn);
         if (m_collapsed.contains(section.data(Qt::EditRole).toString()))
