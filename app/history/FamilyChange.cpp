@@ -35,7 +35,7 @@ void FamilyChange::Find(HistoryUpdate& update)
 }
 
 // The fast path for following, see docs/performance.md: rows next to each other are of different
-// logs, so that finding their starts takes long. tst_PlainFamily compares with the starts.
+// logs, so that finding their starts takes long. tst_FamilyChange compares with the starts.
 bool FamilyChange::isSameLine(size_t before, size_t after) const
 {
     const size_t line = m_before.line(before);
