@@ -30,6 +30,7 @@
 #include "app/window/widgets/PlainText.h"
 #include "app/window/widgets/TallArea.h"
 #include "app/window/widgets/TurningSplitter.h"
+#include "app/window/widgets/UsualTextHeight.h"
 
 #include <QActionGroup>
 #include <QCloseEvent>
@@ -58,7 +59,6 @@ constexpr int IdleHealthInterval = 60000;  // milliseconds; nothing tells of a d
 constexpr int SuspiciousRuns = 3;          // in a row
 constexpr int MessageTime = 6000;          // milliseconds
 constexpr int MaximumMessageLength = 1000; // characters
-constexpr qreal UsualTextHeight = 18;      // pixels; larger text needs a larger window
 
 QIcon WindowIcon()
 {
@@ -271,7 +271,7 @@ void MainWindow::showPlaces(bool shown)
 void MainWindow::restoreFirstState()
 {
     if (QScreen const* screen = QGuiApplication::primaryScreen()) {
-        const qreal scale = std::max(1.0, fontMetrics().height() / UsualTextHeight);
+        const qreal scale = std::max(1.0, qreal(fontMetrics().height()) / UsualTextHeight);
         resize((QSize(1080, 680) * scale).boundedTo(screen->availableSize() * 9 / 10));
     }
 

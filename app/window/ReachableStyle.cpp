@@ -5,6 +5,7 @@
 
 #include "app/window/widgets/BlendedColor.h"
 #include "app/window/widgets/Contrast.h"
+#include "app/window/widgets/UsualTextHeight.h"
 
 #include <QAbstractScrollArea>
 #include <QApplication>
@@ -21,8 +22,7 @@ namespace Velocor {
 
 namespace {
 
-constexpr int UsualFontHeight = 18; // pixels; what has an icon is made for
-constexpr int FrameShade = 140;     // of Fusion's frames, in percent
+constexpr int FrameShade = 140; // of Fusion's frames, in percent
 
 QColor FocusColor(QPalette const& palette, QColor const& ground, qreal least = PartContrast)
 {
@@ -187,7 +187,7 @@ int ReachableStyle::pixelMetric(PixelMetric metric, QStyleOption const* option,
     case PM_ToolBarIconSize: {
         const QFontMetrics text =
             widget ? widget->fontMetrics() : QFontMetrics(QApplication::font());
-        return usual * std::max(UsualFontHeight, text.height()) / UsualFontHeight;
+        return usual * std::max(UsualTextHeight, text.height()) / UsualTextHeight;
     }
     default:
         return usual;
