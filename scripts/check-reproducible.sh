@@ -17,8 +17,8 @@ work=$(mktemp -d)
 tools=$(mktemp -d)
 trap 'rm -rf "$work" "$tools"' EXIT
 
-# reprotest calls "sudo -h localhost", which Debian's sudo refuses since an update for its security. Root
-# needs no sudo to become another user.
+# reprotest calls "sudo -h localhost", which Debian's sudo has refused since a security update. Root
+# can become another user without it.
 cat >"$tools/sudo" <<'SUDO'
 #!/bin/sh
 user=root group=root

@@ -44,7 +44,7 @@ void LogUpdate::Compare(LogRows const& before)
 
     Pair pair(before, after);
     const size_t shorter = std::min(before.earlier(), after.earlier());
-    size_t front = std::min(before.CountSameFirst(after), shorter);
+    size_t front = shorter > 0 ? std::min(before.CountSameFirst(after), shorter) : 0;
     while (front < shorter && pair.isSame(front, front))
         ++front;
     size_t back = 0;

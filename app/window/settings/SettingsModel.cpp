@@ -32,8 +32,8 @@ void SettingsModel::SetDocument(SettingsDocument const& document)
     endResetModel();
 }
 
-// For the goal that a key press answers within 16 ms: most keys of a longer text change few rows or
-// none, and all rows take longer to lay out than to find.
+// The same rows need not be laid out again, which takes longer than finding them: with 100,000
+// values, a key press is to be answered within 16 ms.
 bool SettingsModel::SetFilter(SettingsFilter const& filter)
 {
     m_filter = filter;

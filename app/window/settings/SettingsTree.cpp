@@ -197,7 +197,6 @@ void SettingsTree::SetFilter(SettingsFilter const& filter)
     const bool hasOtherRows = m_model->SetFilter(filter);
     if (hasOtherRows || (wasEmpty && !m_collapsed.isEmpty()))
         expandAll();
-    viewport()->update();
     for (int row = 0; row < m_model->rowCount() && filter.isEmpty(); ++row) {
         const QModelIndex section = m_model->index(row, SettingsModel::NameColumn);
         if (m_collapsed.contains(section.data(Qt::EditRole).toString()))
