@@ -8,7 +8,7 @@
 #include "app/history/RunEnds.h"
 #include "app/runninglog/RunMark.h"
 #include "plain/Rounds.h"
-#include "support/TestFiles.h"
+#include "support/LeftMark.h"
 
 #include <QProcess>
 #include <QTemporaryDir>
@@ -132,7 +132,9 @@ public:
             m_process.kill();
             if (!m_process.waitForFinished(Patience) || mine.size() != 1)
                 return false;
-            return kind == Killed || Change(kind, marks + '/' + mine[0]);
+            mine[0].prepend(marks + '/');
+            return kind == Killed || (kind == Restored ? LeftMark::restore(mine[0])
+                                                       : LeftMark::useProcessIdAgain(mine[0]));
         default:
             return End("r");
         }
@@ -166,19 +168,6 @@ private:
                ::kill(static_cast<pid_t>(m_process.processId()), signal) == 0 &&
                m_process.waitForFinished(Patience) &&
                m_process.exitStatus() == QProcess::NormalExit;
-    }
-
-    static bool Change(int kind, QString const& mark)
-    {
-        if (kind == ProcessIdInUse)
-            return QFile::rename(mark,
-                                 mark.section('-', 0, -2) +
-                                     QString("-%1.run").arg(QCoreApplication::applicationPid()));
-        QByteArrayList parts = TestFiles::read(mark).split(' ');
-        if (parts.size() != 4)
-            return false;
-        parts[1] = QByteArray::number(parts[1].toLongLong() - 60000);
-        return TestFiles::writeOver(mark, parts.join(' '));
     }
 
     QProcess m_process;

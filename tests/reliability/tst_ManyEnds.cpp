@@ -9,6 +9,7 @@
 #include "app/Installation.h"
 #include "app/history/RunEnds.h"
 #include "reliability/Figures.h"
+#include "support/LeftMark.h"
 #include "support/TestFiles.h"
 
 #include <QScopedValueRollback>
@@ -27,36 +28,8 @@ struct End
     char const* name;
     int signalNumber; // 0: the window is closed
     bool isTold;
-    bool (*change)(QString const& mark, pid_t process); // of what it left behind
+    bool (*change)(QString const& mark); // of what it left behind
 };
-
-// The file is the same, and older than its last change.
-bool Restore(QString const& mark, pid_t)
-{
-    QByteArrayList parts = TestFiles::read(mark).split(' ');
-    if (parts.size() != 4)
-        return false;
-    parts[1] = QByteArray::number(parts[1].toLongLong() - 60000);
-    return TestFiles::writeOver(mark, parts.join(' '));
-}
-
-bool MoveToAnotherComputer(QString const& mark, pid_t)
-{
-    return TestFiles::writeOver(mark, TestFiles::read(mark).trimmed() + "x\n");
-}
-
-bool Remove(QString const& mark, pid_t)
-{
-    return QFile::remove(mark);
-}
-
-bool UseProcessAgain(QString const& mark, pid_t process)
-{
-    QString living = mark;
-    living.replace(QString("-%1.").arg(process),
-                   QString("-%1.").arg(QCoreApplication::applicationPid()));
-    return living != mark && QFile::rename(mark, living);
-}
 
 const End Ends[] = {
     {"closed", 0, false, nullptr},
@@ -65,10 +38,13 @@ const End Ends[] = {
     {"killed", SIGKILL, true, nullptr},
     {"invalid memory access", SIGSEGV, true, nullptr},
     {"aborted", SIGABRT, true, nullptr},
-    {"killed, and its process ID used again", SIGKILL, true, UseProcessAgain},
-    {"restored from a backup", SIGKILL, false, Restore},
-    {"mark of another computer", SIGKILL, false, MoveToAnotherComputer},
-    {"mark removed", SIGKILL, false, Remove},
+    {"killed, and its process ID used again", SIGKILL, true, LeftMark::useProcessIdAgain},
+    {"restored from a backup", SIGKILL, false, LeftMark::restore},
+    {"mark of another computer", SIGKILL, false, LeftMark::moveToAnotherComputer},
+    {"mark removed", SIGKILL, false,
+     [](QString const& mark) {
+         return QFile::remove(mark);
+     }},
 };
 
 QString LogOf(Installation const& installation)
@@ -125,7 +101,7 @@ void tst_ManyEnds::end(Installation& installation, End const& how)
     program.Send(how.signalNumber);
     program.ExitCode();
     if (how.change)
-        QVERIFY(how.change(MarkOf(installation, process), process));
+        QVERIFY(how.change(MarkOf(installation, process)));
 }
 
 void tst_ManyEnds::ends()

@@ -111,16 +111,6 @@ bool CopyFolder(QString const& from, QString const& to)
     return QProcess::execute("cp", {"-a", from, to}) == 0;
 }
 
-// As from a backup: the file is the same, and older than its last change.
-bool MakeRestored(QString const& mark)
-{
-    QByteArrayList parts = TestFiles::read(mark).split(' ');
-    if (parts.size() != 4)
-        return false;
-    parts[1] = QByteArray::number(parts[1].toLongLong() - 60000);
-    return TestFiles::writeOver(mark, parts.join(' '));
-}
-
 } // namespace
 
 class tst_RunExits : public QObject
@@ -176,21 +166,15 @@ void tst_RunExits::endLike(Installation const& installation, RunningProgram& pro
                                                  {"terminal closed", SIGHUP},
                                                  {"invalid memory access", SIGSEGV},
                                                  {"aborted", SIGABRT}};
-    const pid_t id = program.Id();
     program.Send(signalsOf.value(how, SIGKILL));
     program.ExitCode();
     const QStringList marks = Marks(installation);
     if (how.startsWith("killed, ")) {
-        QString living = marks.value(0);
-        living.replace(QString("-%1.").arg(id),
-                       QString("-%1.").arg(QCoreApplication::applicationPid()));
-        QVERIFY(living != marks.value(0));
-        QVERIFY(QFile::rename(marks.value(0), living));
+        QVERIFY(LeftMark::useProcessIdAgain(marks.value(0)));
     } else if (how == "restored from a backup") {
-        QVERIFY(MakeRestored(marks.value(0)));
+        QVERIFY(LeftMark::restore(marks.value(0)));
     } else if (how == "mark of another computer") {
-        QVERIFY(TestFiles::writeOver(marks.value(0),
-                                     TestFiles::read(marks.value(0)).trimmed() + "x\n"));
+        QVERIFY(LeftMark::moveToAnotherComputer(marks.value(0)));
     } else if (how == "mark removed") {
         QVERIFY(QFile::remove(marks.value(0)));
     }
