@@ -80,7 +80,8 @@ private:
 } // namespace
 
 FamilyScanner::FamilyScanner(QObject* parent)
-    : QObject(parent), m_reportTimer(new QTimer(this)), m_rows(std::make_shared<LogRows>())
+    : QObject(parent), m_reportTimer(new QTimer(this)), m_rows(std::make_shared<LogRows>()),
+      m_repeats([this] { return isCurrentRequest(); })
 {
     qRegisterMetaType<HistoryUpdate>();
     qRegisterMetaType<LogFilter>();
@@ -145,6 +146,7 @@ void FamilyScanner::Open(int request, QString const& path, LogLineParser const& 
                          LogFilter const& filter, bool isAll)
 {
     m_request = request;
+    m_parser = parser;
     if (m_isFamily || m_logs.size() != 1) {
         close();
         {
@@ -244,7 +246,7 @@ void FamilyScanner::reportProgress(int percent)
 void FamilyScanner::take(Log& log, HistoryUpdate const& update)
 {
     if (!m_isFamily) {
-        Q_EMIT updated(update);
+        send(update);
         return;
     }
     log.scanner->NoteTaken();
@@ -429,6 +431,38 @@ void FamilyScanner::report(bool isFolding)
     m_isReset = false;
     m_rows = update.rows;
     m_isTaken = false;
+    send(update);
+}
+
+void FamilyScanner::SetFindsRepeats(bool finds)
+{
+    if (finds == m_findsRepeats)
+        return;
+    m_findsRepeats = finds;
+    if (!m_sent.rows || m_sent.isPartial || m_sent.request != m_currentRequest)
+        return; // the next report will show it
+    HistoryUpdate update = m_sent;
+    update.isReset = true;
+    update.isFolding = true;
+    send(update);
+}
+
+// While a file is still being read, its rows are shown without looking at them twice.
+void FamilyScanner::send(HistoryUpdate update)
+{
+    update.repeats.reset();
+    if (!m_findsRepeats || update.isPartial) {
+        m_repeats.Forget();
+    } else {
+        LogSource source(m_logs.front()->log.path, update.older);
+        source.logs = update.logs;
+        LogLineParser parser = m_parser;
+        parser.SetFileType(update.type);
+        update.repeats = m_repeats.Of(update, source, parser);
+        if (!update.repeats)
+            return; // another request follows
+    }
+    m_sent = update;
     Q_EMIT updated(update);
 }
 

@@ -6,6 +6,7 @@
 #include "app/history/HistoryUpdate.h"
 #include "app/history/LogKeys.h"
 #include "app/history/ProgramLogs.h"
+#include "app/history/RepeatGroups.h"
 #include "app/logfile/LogFilter.h"
 #include "app/logfile/LogLineParser.h"
 #include "app/logfile/LogScanner.h" // for signals to another thread, which need the types it declares
@@ -78,6 +79,9 @@ public Q_SLOTS:
     /// See HistoryScanner::SetFolded(). Several logs have no runs to fold.
     void SetFolded(quint64 run, bool folded);
 
+    /// Whether updates tell which rows repeat each other. All rows are then read.
+    void SetFindsRepeats(bool finds);
+
 Q_SIGNALS:
     void updated(Velocor::HistoryUpdate const& update);
     void progressed(int request, int percent);
@@ -100,6 +104,7 @@ private:
     void mergeRows(LogRows& rows) const;
     std::vector<FamilyLines> linesOfLogs() const;
     HistoryUpdate summary() const;
+    void send(HistoryUpdate update);
 
     std::atomic<int> m_currentRequest{0};
     std::atomic<bool> m_isTaken{true};
@@ -118,6 +123,10 @@ private:
     std::shared_ptr<std::vector<LogSource> const> m_sources;
     LineTable m_lines; // of all logs, one after the other
     std::shared_ptr<LogRows const> m_rows;
+
+    bool m_findsRepeats = false;
+    RepeatGroups m_repeats;
+    HistoryUpdate m_sent; // last
 };
 
 } // namespace Velocor

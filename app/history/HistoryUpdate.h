@@ -4,6 +4,7 @@
 #pragma once
 
 #include "app/history/HistoryRun.h"
+#include "app/history/RepeatGroup.h"
 #include "app/history/RunHeading.h"
 #include "app/logfile/LogSource.h"
 #include "app/logfile/LogUpdate.h"
@@ -38,7 +39,10 @@ struct HistoryUpdate : LogUpdate
     std::shared_ptr<std::vector<RunHeading> const> runs;     ///< oldest first; null likewise
     std::shared_ptr<std::vector<HistoryRun> const> runLines; ///< of these runs, in the same order
     QStringList unreadable; ///< paths of older files that cannot be read
-    bool isFolding = false; ///< follows HistoryScanner::SetFolded(), not a change of the log
+    bool isFolding = false; ///< follows a wish to fold or unfold, not a change of the log
+
+    /// The rows that repeat each other, by their first rows; null if nobody wants to know.
+    std::shared_ptr<std::vector<RepeatGroup> const> repeats;
 
     // If several logs are shown as one: their bytes, and what they are. The rows have no headings.
     std::shared_ptr<std::vector<LogSource> const> logs; ///< null otherwise

@@ -42,6 +42,9 @@ public:
         restart();
     }
 
+    /// The number of messages that differ in more than numbers; 30 by default.
+    void setKinds(int kinds) { m_kinds = kinds; }
+
     QStringList formats() const { return {m_format}; }
     QString const& path() const { return m_path; }
     qint64 clock() const { return m_clock; }
@@ -173,7 +176,7 @@ private:
     QByteArray tag()
     {
         return 'P' + m_program + " L" + QByteArray::number(++m_number) + ' ' +
-               QByteArray(below(30), 'm');
+               QByteArray(below(m_kinds), 'm');
     }
 
     // An entry of one or more lines, which are noted.
@@ -250,6 +253,7 @@ private:
     qint64 m_clock;
     qint64 m_lastTime = 0;
     int m_run = -1;
+    int m_kinds = 30;
     int m_number = 0;
     int m_position = 0;
     int m_saved = 0;
