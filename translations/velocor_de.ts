@@ -1996,6 +1996,20 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
         <source>Program</source>
         <translation>Programm</translation>
     </message>
+    <message numerus="yes">
+        <source>%Ln time(s)</source>
+        <translation>
+            <numerusform>%Ln-mal</numerusform>
+            <numerusform>%Ln-mal</numerusform>
+        </translation>
+    </message>
+    <message numerus="yes">
+        <source>%Ln time(s), %1</source>
+        <translation>
+            <numerusform>%Ln-mal, %1</numerusform>
+            <numerusform>%Ln-mal, %1</numerusform>
+        </translation>
+    </message>
 </context>
 <context>
     <name>Velocor::LogOverview</name>
@@ -2956,6 +2970,18 @@ Aus der Liste der zuletzt geöffneten Dateien entfernen?</translation>
     <message>
         <source>Show the logs of all programs of the family as one</source>
         <translation>Die Protokolle aller Programme der Familie als eines zeigen</translation>
+    </message>
+    <message>
+        <source>Fold &amp;Repeats</source>
+        <translation>&amp;Wiederholungen einklappen</translation>
+    </message>
+    <message>
+        <source>Ctrl+Alt+R</source>
+        <translation>Ctrl+Alt+R</translation>
+    </message>
+    <message>
+        <source>Show entries that differ from the one above only in numbers and quoted names as one row</source>
+        <translation>Einträge, die sich vom vorigen nur in Zahlen und zitierten Namen unterscheiden, als eine Zeile zeigen</translation>
     </message>
 </context>
 <context>

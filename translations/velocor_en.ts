@@ -96,6 +96,23 @@
     </message>
 </context>
 <context>
+    <name>Velocor::LogModel</name>
+    <message numerus="yes">
+        <source>%Ln time(s)</source>
+        <translation>
+            <numerusform>%Ln time</numerusform>
+            <numerusform>%Ln times</numerusform>
+        </translation>
+    </message>
+    <message numerus="yes">
+        <source>%Ln time(s), %1</source>
+        <translation>
+            <numerusform>%Ln time, %1</numerusform>
+            <numerusform>%Ln times, %1</numerusform>
+        </translation>
+    </message>
+</context>
+<context>
     <name>Velocor::SettingsCommands</name>
     <message numerus="yes">
         <source>Removed %Ln key(s): </source>

@@ -1996,6 +1996,20 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
         <source>Program</source>
         <translation>Programme</translation>
     </message>
+    <message numerus="yes">
+        <source>%Ln time(s)</source>
+        <translation>
+            <numerusform>%Ln fois</numerusform>
+            <numerusform>%Ln fois</numerusform>
+        </translation>
+    </message>
+    <message numerus="yes">
+        <source>%Ln time(s), %1</source>
+        <translation>
+            <numerusform>%Ln fois, %1</numerusform>
+            <numerusform>%Ln fois, %1</numerusform>
+        </translation>
+    </message>
 </context>
 <context>
     <name>Velocor::LogOverview</name>
@@ -2956,6 +2970,18 @@ Le retirer de la liste des fichiers récents&#x202f;?</translation>
     <message>
         <source>Show the logs of all programs of the family as one</source>
         <translation>Afficher les journaux de tous les programmes de la famille en un seul</translation>
+    </message>
+    <message>
+        <source>Fold &amp;Repeats</source>
+        <translation>&amp;Replier les répétitions</translation>
+    </message>
+    <message>
+        <source>Ctrl+Alt+R</source>
+        <translation>Ctrl+Alt+R</translation>
+    </message>
+    <message>
+        <source>Show entries that differ from the one above only in numbers and quoted names as one row</source>
+        <translation>Montrer en une seule ligne les entrées qui ne diffèrent de la précédente que par des nombres et des noms entre guillemets</translation>
     </message>
 </context>
 <context>

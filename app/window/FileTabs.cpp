@@ -114,6 +114,7 @@ LogPanel* FileTabs::addLog(QString const& path)
     panel->SetActivity(m_showsActivity);
     panel->SetSince(m_showsSince);
     panel->SetLeastGap(m_leastGap);
+    panel->SetFoldsRepeats(m_foldsRepeats);
     if (!path.isEmpty())
         panel->Open(path, false);
     setTabToolTip(addTab(panel, QString()), PlainToolTip(LeftToRight(path)));
@@ -309,6 +310,15 @@ void FileTabs::SetLeastGap(qint64 span)
     for (int i = 0; i < count(); ++i) {
         if (auto* log = qobject_cast<LogPanel*>(widget(i)))
             log->SetLeastGap(span);
+    }
+}
+
+void FileTabs::SetFoldsRepeats(bool folds)
+{
+    m_foldsRepeats = folds;
+    for (int i = 0; i < count(); ++i) {
+        if (auto* log = qobject_cast<LogPanel*>(widget(i)))
+            log->SetFoldsRepeats(folds);
     }
 }
 

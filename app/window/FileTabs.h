@@ -91,6 +91,9 @@ public:
     /// Shows gaps of at least so many milliseconds in all logs; 0: none.
     void SetLeastGap(qint64 span);
 
+    /// Folds entries that repeat the one above in all logs or not.
+    void SetFoldsRepeats(bool folds);
+
     /// Marks the tab of the program's log: there is a problem with it.
     void MarkOwnLog(bool marked);
 
@@ -139,6 +142,7 @@ private:
     bool m_hasNumbers = false;
     bool m_showsActivity = false;
     bool m_showsSince = false;
+    bool m_foldsRepeats = false;
     qint64 m_leastGap = 0; // milliseconds
 };
 

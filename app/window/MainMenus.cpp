@@ -298,6 +298,11 @@ void MainMenus::fillAnalyzeMenu(QMenu* menu)
                                 tr("Show the time since the entry above or since a chosen one"),
                                 [this](bool shown) { m_targets.tabs->SetSince(shown); });
     fillGapMenu(menu->addMenu(tr("&Gaps")));
+    m_actions.foldRepeats =
+        addSwitch(menu, tr("Fold &Repeats"), QKeySequence(tr("Ctrl+Alt+R")),
+                  tr("Show entries that differ from the one above only in numbers and quoted names "
+                     "as one row"),
+                  [this](bool folds) { m_targets.tabs->SetFoldsRepeats(folds); });
     addForLog(menu, tr("&Patterns..."), QKeySequence(tr("Ctrl+Alt+P")),
               tr("List what messages have in common, and how often"),
               [](LogPanel* log) { log->ShowPatterns(); });

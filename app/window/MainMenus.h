@@ -52,6 +52,7 @@ struct MenuActions
     QAction* lineNumbers = nullptr;
     QAction* activity = nullptr;
     QAction* since = nullptr;
+    QAction* foldRepeats = nullptr;
     QActionGroup* gaps = nullptr; ///< their data is the least gap shown, in milliseconds
     QAction* reopen = nullptr;
     QActionGroup* encodings = nullptr;

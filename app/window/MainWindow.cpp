@@ -294,6 +294,8 @@ void MainWindow::restoreState()
     actions.since->setChecked(m_settings.Flag(QStringLiteral("since"), false));
     m_tabs->SetSince(actions.since->isChecked());
     restoreGaps();
+    actions.foldRepeats->setChecked(m_settings.Flag(QStringLiteral("foldRepeats"), false));
+    m_tabs->SetFoldsRepeats(actions.foldRepeats->isChecked());
     m_tabs->highlightRules()->SetFromText(m_settings.Text(QStringLiteral("highlights")));
     restoreColumns();
     m_tabs->ownLog()->SetPaneSizes(m_settings.Numbers(QStringLiteral("linePane")));
@@ -359,6 +361,7 @@ void MainWindow::saveState()
     m_settings.SetFlag(QStringLiteral("since"), actions.since->isChecked());
     m_settings.SetNumbers(QStringLiteral("leastGap"),
                           {actions.gaps->checkedAction()->data().toInt()});
+    m_settings.SetFlag(QStringLiteral("foldRepeats"), actions.foldRepeats->isChecked());
     m_settings.SetText(QStringLiteral("highlights"), m_tabs->highlightRules()->ToText());
     m_settings.SetFlag(QStringLiteral("toolBarShown"), actions.showToolBar->isChecked());
     m_settings.SetNumbers(QStringLiteral("columns"), m_tabs->ownLog()->columnWidths());

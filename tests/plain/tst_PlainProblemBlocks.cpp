@@ -126,14 +126,11 @@ private:
         same("size", m_blocks.size(), m_marks.size());
     }
 
-    LogRows rows() const
+    ProblemBlocks::Marks rows() const
     {
-        LineTable lines;
-        for (size_t row = 0; row < m_marks.size(); ++row)
-            lines.Append(qint64(row) * 10, m_marks[row], 0);
-        LogRows rows(lines);
-        rows.AddLines(0, lines.size());
-        return rows;
+        return [this](size_t row) {
+            return m_marks[row];
+        };
     }
 
     // 0 for none, then the severities from the least to the worst.

@@ -202,6 +202,47 @@ void TakeLogViews(MainWindow& window, Camera const& camera)
     table->clearSelection();
 }
 
+// What a program writes that keeps trying.
+QByteArray Repetitive()
+{
+    QByteArray log;
+    QTime time(9, 10, 0, 20);
+    const auto add = [&](char const* severity, QString const& message) {
+        log += DemoLog::entry(time.toString("HH:mm:ss.zzz"), severity, message);
+        time = time.addMSecs(87 + 13 * (message.size() % 5));
+    };
+    add("Notification", "Synchronizing 1215 documents");
+    for (int document = 0; document < 61; ++document)
+        add("Trace",
+            QString("Sent \"minutes-%1.xml\", %2 bytes").arg(document).arg(811 * document));
+    for (int round = 1; round <= 5; ++round) {
+        add("Warning", QString("192.168.7.20 does not answer, next attempt in %1 s").arg(round));
+        time = time.addSecs(round);
+    }
+    add("Error", "Stopped after 5 attempts");
+    for (int document = 0; document < 24; ++document)
+        add("Trace", QString("Kept \"minutes-%1.xml\" for later").arg(61 + document));
+    add("Notification", "61 of 1215 documents are up to date");
+    return log;
+}
+
+void TakeRepeats(MainWindow& window, Camera const& camera)
+{
+    const QString path = Home + "logs/sync.log";
+    TestFiles::write(path, Repetitive());
+    window.OpenFile(path);
+    LogPanel* panel = window.findChild<FileTabs*>()->currentLog();
+    panel->SetFoldsRepeats(true);
+    QTest::qWait(500);
+    panel->GoToProblem(-1);
+    panel->GoToProblem(-1);
+    panel->model()->SetRepeatsOpen(panel->view()->CurrentRow(), true);
+    camera.take(window, "repeats");
+    window.findChild<FileTabs*>()->CloseCurrent();
+    QTest::qWait(100); // it is deleted only then
+    QFile::remove(path);
+}
+
 void TakeAllFiles(MainWindow& window, Camera const& camera)
 {
     LogPanel* panel = PanelOf(window);
@@ -328,6 +369,7 @@ void TakeAll(QString const& folder, QString const& suffix)
     window.show();
     QTest::qWait(1000);
     TakeLogViews(window, camera);
+    TakeRepeats(window, camera);
     TakeAllFiles(window, camera);
     TakeHighlights(window, camera);
     TakeActivity(window, camera);

@@ -97,7 +97,7 @@ std::shared_ptr<std::vector<int> const> const& FindControl::hits() const
 QString FindControl::countText() const
 {
     const auto count = static_cast<int>(m_search->hits()->size());
-    const int number = m_search->NumberOf(m_view->currentIndex().row());
+    const int number = m_search->NumberOf(m_view->CurrentRow());
     if (!m_search->text().hasText() || m_search->slowLine() > 0)
         return QString();
     if (!m_search->isComplete() && m_search->percent() < 99)

@@ -43,9 +43,9 @@ void LineNumberMargin::SetShown(bool shown)
     fit();
 }
 
-QString LineNumberMargin::TextOf(int row) const
+QString LineNumberMargin::TextOf(int tableRow) const
 {
-    const qulonglong number = m_view->LineNumber(row);
+    const qulonglong number = m_view->LineNumber(m_view->LogRowOf(tableRow));
     return number > 0 ? QLocale().toString(number) : QString();
 }
 

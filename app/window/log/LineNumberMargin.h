@@ -25,7 +25,7 @@ public:
     void SetShown(bool shown);
 
     /// The number that is shown beside a row; empty for a heading.
-    QString TextOf(int row) const;
+    QString TextOf(int tableRow) const;
 
 protected:
     bool eventFilter(QObject* watched, QEvent* event) override;

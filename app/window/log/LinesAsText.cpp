@@ -20,7 +20,7 @@ constexpr LogModel::Column CopiedColumns[] = {LogModel::TimeColumn, LogModel::Se
 
 bool IsHeading(LogModel const& model, int row)
 {
-    return model.index(row, 0).data(LogModel::HeadingRole).toBool();
+    return model.LineStart(row) < 0;
 }
 
 int LongestRun(QString const& text, QChar character)
@@ -52,7 +52,7 @@ QString ColumnName(LogModel const& model, int column)
 QString CellText(LogModel const& model, int row, int column)
 {
     return column == LogModel::MessageColumn ? model.MessageWithProgram(row)
-                                             : model.index(row, column).data().toString();
+                                             : model.CellText(row, column);
 }
 
 } // namespace

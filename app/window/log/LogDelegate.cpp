@@ -24,11 +24,13 @@ namespace {
 
 constexpr int MarkWidth = 3; // pixels, as is the next one
 constexpr int GapMargin = 8;
+constexpr int RepeatsMargin = 3;
 
 constexpr qreal ContextFade = 0.4;
 
 // Of the line above a gap.
 constexpr qreal GapStrength = 0.55;
+constexpr qreal RepeatsStrength = 0.16;
 
 QStyle const* StyleOf(QStyleOptionViewItem const& option)
 {
@@ -77,6 +79,12 @@ int GapWidth(QString const& gap, QFontMetrics const& metrics, int width)
         return 0;
     const int wanted = metrics.boundingRect(gap).width() + 2 * GapMargin;
     return 2 * wanted <= width ? wanted : 0;
+}
+
+// The room before a message for the number of entries that repeat it.
+int RepeatsWidth(QString const& repeats, QFontMetrics const& metrics)
+{
+    return repeats.isEmpty() ? 0 : metrics.boundingRect(repeats).width() + 4 * RepeatsMargin;
 }
 
 int TextMargin(QStyle const* style, QWidget const* widget)
@@ -235,6 +243,8 @@ void LogDelegate::paint(QPainter* painter, QStyleOptionViewItem const& option,
         return;
     }
     paintContent(painter, cell, index);
+    if (index.column() == LogModel::MessageColumn)
+        paintRepeats(painter, cell, index.data(LogModel::RepeatsRole).toString());
     const QString gap = index.data(LogModel::GapRole).toString();
     if (!gap.isEmpty())
         paintGap(painter, cell, index, gap);
@@ -255,9 +265,10 @@ void LogDelegate::paintContent(QPainter* painter, QStyleOptionViewItem const& op
     const int gapWidth = isMessage ? GapWidth(index.data(LogModel::GapRole).toString(),
                                               cell.fontMetrics, cell.rect.width())
                                    : 0;
-    if (gapWidth > 0) {
+    const QString repeats = isMessage ? index.data(LogModel::RepeatsRole).toString() : QString();
+    if (gapWidth > 0 || !repeats.isEmpty()) {
         paintEmpty(painter, cell);
-        cell.rect.setWidth(cell.rect.width() - gapWidth);
+        cell.rect.adjust(RepeatsWidth(repeats, cell.fontMetrics), 0, -gapWidth, 0);
         cell.state &= ~QStyle::State_HasFocus;
     }
     // The filter searches neither translated names nor what is not in the line.
@@ -349,6 +360,36 @@ void LogDelegate::paintGap(QPainter* painter, QStyleOptionViewItem const& option
     painter->restore();
 }
 
+QRect LogDelegate::RepeatsArea(QString const& repeats, QFont const& font, QRect const& cell)
+{
+    const QFontMetrics metrics(font);
+    return QRect(cell.left(), cell.top(), RepeatsWidth(repeats, metrics),
+                 std::min(cell.height(), RowHeight(metrics)));
+}
+
+void LogDelegate::paintRepeats(QPainter* painter, QStyleOptionViewItem const& option,
+                               QString const& repeats)
+{
+    if (repeats.isEmpty())
+        return;
+    const bool isSelected = option.state & QStyle::State_Selected;
+    QColor const& text =
+        option.palette.color(isSelected ? QPalette::HighlightedText : QPalette::Text);
+    const QColor ground = isSelected ? option.palette.color(QPalette::Highlight) : GroundOf(option);
+    const QRect area = RepeatsArea(repeats, option.font, option.rect)
+                           .adjusted(RepeatsMargin, 2, -RepeatsMargin, -2);
+    painter->save();
+    painter->setClipRect(option.rect);
+    painter->setRenderHint(QPainter::Antialiasing);
+    painter->setPen(Qt::NoPen);
+    painter->setBrush(Blended(ground, text, RepeatsStrength));
+    painter->drawRoundedRect(area, RepeatsMargin, RepeatsMargin);
+    painter->setPen(text);
+    painter->setFont(option.font);
+    painter->drawText(area, Qt::AlignCenter, repeats);
+    painter->restore();
+}
+
 // Later formats are drawn over earlier ones.
 QVector<QTextLayout::FormatRange> LogDelegate::marks(QString const& text, QString const& line) const
 {
@@ -378,16 +419,17 @@ void LogDelegate::paintHeading(QPainter* painter, QStyleOptionViewItem const& op
     painter->restore();
 }
 
-int LogDelegate::HeightOf(QString const& message, QString const& gap, QFont const& font,
-                          int width) const
+int LogDelegate::HeightOf(QString const& message, QString const& gap, QString const& repeats,
+                          QFont const& font, int width) const
 {
     QStyle const* style = QApplication::style();
+    const QFontMetrics metrics(font);
     QTextLayout layout(message, font);
     LayOut(layout,
-           width - GapWidth(gap, QFontMetrics(font), width) - 2 * TextMargin(style, nullptr),
+           width - GapWidth(gap, metrics, width) - RepeatsWidth(repeats, metrics) -
+               2 * TextMargin(style, nullptr),
            m_mostLines);
-    return qCeil(HeightOfLines(layout)) + RowHeight(QFontMetrics(font)) -
-           QFontMetrics(font).height();
+    return qCeil(HeightOfLines(layout)) + RowHeight(metrics) - metrics.height();
 }
 
 void LogDelegate::paintMarked(QPainter* painter, QStyleOptionViewItem const& option,

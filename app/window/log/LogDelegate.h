@@ -38,7 +38,14 @@ public:
     /// The height of a row with a message in a column of a width, in pixels.
     ///
     /// @param gap  as LogModel::GapRole
-    int HeightOf(QString const& message, QString const& gap, QFont const& font, int width) const;
+    /// @param repeats  as LogModel::RepeatsRole
+    int HeightOf(QString const& message, QString const& gap, QString const& repeats,
+                 QFont const& font, int width) const;
+
+    /// Where in the cell of a message it says how often it is repeated.
+    ///
+    /// @param repeats  as LogModel::RepeatsRole
+    static QRect RepeatsArea(QString const& repeats, QFont const& font, QRect const& cell);
 
     void paint(QPainter* painter, QStyleOptionViewItem const& option,
                QModelIndex const& index) const override;
@@ -58,6 +65,8 @@ private:
     static void paintUserMark(QPainter* painter, QStyleOptionViewItem const& option, bool hasNote);
     static void paintGap(QPainter* painter, QStyleOptionViewItem const& option,
                          QModelIndex const& index, QString const& gap);
+    static void paintRepeats(QPainter* painter, QStyleOptionViewItem const& option,
+                             QString const& repeats);
     static void paintHeading(QPainter* painter, QStyleOptionViewItem const& option);
 
     LogFilter m_filter;

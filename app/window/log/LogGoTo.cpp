@@ -66,9 +66,9 @@ void LogGoTo::Find(LogPlace const& place, int currentRow)
     request.place = place;
     request.rows = m_model->state().rows;
     request.currentRow = currentRow;
-    if (place.kind == LogPlace::Line && m_model->isAll() && m_model->rowCount() > 0)
+    if (place.kind == LogPlace::Line && m_model->isAll() && m_model->logRowCount() > 0)
         request.place.value += static_cast<qint64>(firstLine(currentRow));
-    m_isLong = place.kind != LogPlace::Line && m_model->rowCount() >= ManyRows;
+    m_isLong = place.kind != LogPlace::Line && m_model->logRowCount() >= ManyRows;
     if (m_isLong)
         Q_EMIT started(tr("Looking for that time..."));
     m_locator->SetCurrentRequest(m_number);
@@ -79,8 +79,8 @@ void LogGoTo::Find(LogPlace const& place, int currentRow)
 // line, of the newest one.
 size_t LogGoTo::firstLine(int currentRow) const
 {
-    int row = currentRow < 0 ? m_model->rowCount() - 1 : currentRow;
-    if (m_model->LineStart(row) < 0 && row + 1 < m_model->rowCount())
+    int row = currentRow < 0 ? m_model->logRowCount() - 1 : currentRow;
+    if (m_model->LineStart(row) < 0 && row + 1 < m_model->logRowCount())
         ++row; // from a heading to the first line below
     return m_model->FirstLineOfFile(row);
 }
@@ -91,7 +91,7 @@ void LogGoTo::take(LogLocation const& location)
     if (location.number != m_number)
         return;
     int row = location.row;
-    if (row >= 0 && (row >= m_model->rowCount() || m_model->LineStart(row) != location.start))
+    if (row >= 0 && (row >= m_model->logRowCount() || m_model->LineStart(row) != location.start))
         row = m_model->RowNear(location.start);
     QString message = MessageOf(location.answer);
     if (message.isEmpty() && m_isLong)

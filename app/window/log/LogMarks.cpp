@@ -63,13 +63,14 @@ void LogMarks::noteRefreshed()
         find();
     if (m_wasReset || m_haveMoved) {
         update();
-    } else if (m_model->rowCount() > m_rowCount && !m_marks.isEmpty()) {
+    } else if (m_model->logRowCount() > m_rowCount && !m_marks.isEmpty()) {
         auto rows = std::make_shared<std::vector<int>>(*m_rows);
         addRows(*rows, m_rowCount);
         m_rows = rows;
+        m_model->SetMarkedRows(m_rows);
         Q_EMIT changed();
     }
-    m_rowCount = m_model->rowCount();
+    m_rowCount = m_model->logRowCount();
     m_wasReset = false;
     m_haveMoved = false;
 }
@@ -125,7 +126,8 @@ void LogMarks::update()
     if (!notes.isEmpty())
         addRows(*rows, 0);
     m_rows = rows;
-    m_rowCount = m_model->rowCount();
+    m_model->SetMarkedRows(m_rows);
+    m_rowCount = m_model->logRowCount();
     Q_EMIT changed();
 }
 
@@ -172,7 +174,7 @@ QString LogMarks::Toggle(int row)
 
 QString LogMarks::SetNote(int row, QString const& note)
 {
-    if (row < 0 || row >= m_model->rowCount() || m_model->LineStart(row) < 0)
+    if (row < 0 || row >= m_model->logRowCount() || m_model->LineStart(row) < 0)
         return tr("Select a line first");
     int at = indexOf(row);
     if (at < 0) {

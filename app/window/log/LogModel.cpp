@@ -83,6 +83,7 @@ void LogModel::startScanner()
     connect(this, &LogModel::familyRequested, m_scanner, &FamilyScanner::OpenFamily);
     connect(this, &LogModel::hideRequested, m_scanner, &FamilyScanner::SetHidden);
     connect(this, &LogModel::foldRequested, m_scanner, &FamilyScanner::SetFolded);
+    connect(this, &LogModel::repeatsRequested, m_scanner, &FamilyScanner::SetFindsRepeats);
     connect(this, &LogModel::watchRequested, m_scanner, &FamilyScanner::SetWatched);
     connect(this, &LogModel::pollRequested, m_scanner, &FamilyScanner::Poll);
     connect(m_scanner, &FamilyScanner::updated, this, &LogModel::take);
@@ -92,6 +93,7 @@ void LogModel::startScanner()
     });
     m_thread.start();
     Q_EMIT watchRequested(!m_paused);
+    Q_EMIT repeatsRequested(m_foldsRepeats);
 }
 
 void LogModel::setFile(QString const& path, LogLineParser const& parser, bool isCurrent)
@@ -103,6 +105,7 @@ void LogModel::setFile(QString const& path, LogLineParser const& parser, bool is
     m_isCurrent = isCurrent;
     m_spans.MeasureFromAbove();
     m_lines.clear();
+    m_open.clear();
 }
 
 void LogModel::Open(QString const& path, LogLineParser const& parser, bool isCurrent, bool isAll)
@@ -191,7 +194,8 @@ void LogModel::take(HistoryUpdate const& update)
     if (!m_paused || !update.type.IsLike(m_parser.fileType()))
         m_lines.clear();
     m_parser.SetFileType(update.type);
-    if (update.isReset || m_awaitsReset || m_heldBack)
+    const bool isOtherFolding = bool(update.repeats) != bool(m_state.repeats);
+    if (update.isReset || isOtherFolding || m_awaitsReset || m_heldBack)
         reset(update);
     else
         applyChange(update);
@@ -207,43 +211,152 @@ void LogModel::reset(HistoryUpdate const& update)
     beginResetModel();
     m_file.Close();
     m_state = update;
-    m_rowCount = static_cast<int>(update.rows->size());
+    m_folded = foldedRows(update);
+    m_rowCount = m_folded.count();
     endResetModel();
 }
 
-// First the earlier runs, whose first rows the newest run overwrites, then the new rows at the end.
-// In between, views see the new rows except those at the end.
+// What was removed at the end is first, then come the earlier runs, whose first rows the newest run
+// overwrites, and at last the new rows at the end. In between, views see the new rows except those
+// at the end.
 void LogModel::applyChange(HistoryUpdate const& update)
 {
-    const int at = static_cast<int>(update.changeAt);
-    const int difference = static_cast<int>(update.inserted) - static_cast<int>(update.removed);
-    const int changed = static_cast<int>(std::min(update.inserted, update.removed));
+    const FoldedRows folded = foldedRows(update);
+    const auto tail = static_cast<int>(update.changedTail);
+    const int size = logRowCount() + static_cast<int>(update.inserted - update.removed);
+    const FoldedRows::Change change =
+        FoldedRows::ChangeOf(m_folded, folded,
+                             {static_cast<int>(update.changeAt), static_cast<int>(update.removed),
+                              static_cast<int>(update.inserted), tail,
+                              static_cast<int>(update.rows->size()) - size + tail});
+    if (change.newTail < change.tail) {
+        const int rest = m_rowCount - change.tail + change.newTail;
+        beginRemoveRows(QModelIndex(), rest, m_rowCount - 1);
+        m_rowCount = rest;
+        endRemoveRows();
+    }
+    const int difference = change.inserted - change.removed;
+    const int changed = std::min(change.inserted, change.removed);
     if (difference < 0)
-        beginRemoveRows(QModelIndex(), at, at - difference - 1);
+        beginRemoveRows(QModelIndex(), change.at, change.at - difference - 1);
     else if (difference > 0)
-        beginInsertRows(QModelIndex(), at, at + difference - 1);
+        beginInsertRows(QModelIndex(), change.at, change.at + difference - 1);
     if (m_state.logs != update.logs)
         m_file.Close();
     m_state = update;
+    m_folded = folded;
     m_rowCount += difference;
     if (difference < 0)
         endRemoveRows();
     else if (difference > 0)
         endInsertRows();
     if (changed > 0) {
-        const int first = at + std::max(difference, 0);
+        const int first = change.at + std::max(difference, 0);
         Q_EMIT dataChanged(index(first, 0), index(first + changed - 1, ColumnCount - 1));
     }
 
-    const int tail = static_cast<int>(update.changedTail);
-    if (tail > 0)
-        Q_EMIT dataChanged(index(m_rowCount - tail, 0), index(m_rowCount - 1, ColumnCount - 1));
-    const int total = static_cast<int>(update.rows->size());
-    if (total > m_rowCount) {
-        beginInsertRows(QModelIndex(), m_rowCount, total - 1);
-        m_rowCount = total;
+    const int changedTail = std::min(change.tail, change.newTail);
+    if (changedTail > 0)
+        Q_EMIT dataChanged(index(m_rowCount - changedTail, 0),
+                           index(m_rowCount - 1, ColumnCount - 1));
+    if (m_folded.count() > m_rowCount) {
+        beginInsertRows(QModelIndex(), m_rowCount, m_folded.count() - 1);
+        m_rowCount = m_folded.count();
         endInsertRows();
     }
+}
+
+quint64 LogModel::keyOf(HistoryUpdate const& update, RepeatGroup const& group)
+{
+    return static_cast<quint64>(update.rows->start(group.first)) << 16 |
+           update.rows->check(group.first);
+}
+
+FoldedRows LogModel::foldedRows(HistoryUpdate const& update) const
+{
+    return FoldedRows(static_cast<int>(update.rows->size()), update.repeats,
+                      [&](RepeatGroup const& group) {
+                          return !m_open.isEmpty() && m_open.contains(keyOf(update, group));
+                      });
+}
+
+void LogModel::SetFoldsRepeats(bool folds)
+{
+    if (folds == m_foldsRepeats)
+        return;
+    m_foldsRepeats = folds;
+    if (m_scanner)
+        Q_EMIT repeatsRequested(folds);
+}
+
+bool LogModel::AreRepeatsOpen(int row) const
+{
+    RepeatGroup const* const group = m_folded.GroupOf(row);
+    return group && m_open.contains(keyOf(m_state, *group));
+}
+
+void LogModel::SetRepeatsOpen(int row, bool open)
+{
+    RepeatGroup const* const group = m_folded.GroupOf(row);
+    if (!group || open == AreRepeatsOpen(row))
+        return;
+    if (open)
+        m_open.insert(keyOf(m_state, *group));
+    else
+        m_open.remove(keyOf(m_state, *group));
+    const int first = TableRowOf(static_cast<int>(group->first));
+    const int hidden = static_cast<int>(group->end - group->first) - 1;
+    if (open)
+        beginInsertRows(QModelIndex(), first + 1, first + hidden);
+    else
+        beginRemoveRows(QModelIndex(), first + 1, first + hidden);
+    m_folded = foldedRows(m_state);
+    m_rowCount = m_folded.count();
+    if (open)
+        endInsertRows();
+    else
+        endRemoveRows();
+    Q_EMIT dataChanged(index(first, 0), index(first, ColumnCount - 1));
+}
+
+void LogModel::SetMarkedRows(std::shared_ptr<std::vector<int> const> const& rows)
+{
+    m_markedRows = rows;
+}
+
+// Also if a row that this one hides is marked.
+bool LogModel::isMarked(int row) const
+{
+    RepeatGroup const* const group = m_folded.GroupOf(row);
+    if (!group || !m_markedRows || AreRepeatsOpen(row))
+        return m_marks.contains(LineStart(row));
+    const auto first = std::lower_bound(m_markedRows->begin(), m_markedRows->end(),
+                                        static_cast<int>(group->first));
+    return first != m_markedRows->end() && *first < static_cast<int>(group->end);
+}
+
+// At the first row of a group.
+QString LogModel::repeatsText(int row) const
+{
+    RepeatGroup const* const group = m_folded.GroupOf(row);
+    if (!group || static_cast<int>(group->first) != row)
+        return QString();
+    const QChar arrow(AreRepeatsOpen(row) ? 0x25be : 0x25b8);
+    return QStringLiteral("%1 %2%3").arg(arrow).arg(
+        QLocale().toString(static_cast<qulonglong>(group->entries)), QChar(0xd7)); // times
+}
+
+// The same, with the time of the last entry.
+QString LogModel::repeatsInWords(int row) const
+{
+    if (repeatsText(row).isEmpty())
+        return QString();
+    RepeatGroup const* const group = m_folded.GroupOf(row);
+    const int last = EntryRows(static_cast<int>(group->end) - 1).first;
+    const QString times = TimesText(entry(row).time, entry(last).time);
+    const auto count = static_cast<int>(group->entries);
+    return times.isEmpty() ? tr("%Ln time(s)", nullptr, count)
+                           : tr("%Ln time(s), %1", nullptr, count).arg(times);
 }
 
 void LogModel::SetMarks(QHash<qint64, QString> const& marks)
@@ -254,12 +367,12 @@ void LogModel::SetMarks(QHash<qint64, QString> const& marks)
 int LogModel::FindProblem(int row, int step) const
 {
     LogRows const& rows = *m_state.rows;
-    if (row >= 0 && row < m_rowCount)
+    if (row >= 0 && row < logRowCount())
         row = EntryRows(row).first;
-    for (row += step; row >= 0 && row < m_rowCount; row += step) {
+    for (row += step; row >= 0 && row < logRowCount(); row += step) {
         const auto position = static_cast<size_t>(row);
         if (LogSeverities::IsProblem(rows.severity(position)) &&
-            !(rows.mark(position) & LogRows::Continued))
+            !(rows.mark(position) & LogRows::Continued) && !m_folded.IsHidden(row))
             return row;
     }
     return -1;
@@ -268,7 +381,7 @@ int LogModel::FindProblem(int row, int step) const
 // While another log is being read, the rows are still those of the one before.
 bool LogModel::IsFoldable(int row) const
 {
-    return m_state.runs && row >= 0 && row < m_rowCount && isHeading(row);
+    return m_state.runs && row >= 0 && row < logRowCount() && isHeading(row);
 }
 
 bool LogModel::isHeading(int row) const
@@ -409,7 +522,7 @@ LogModel::Line const& LogModel::line(int row) const
 // shown must not take the place of those that are.
 QString LogModel::LineText(int row, int limit) const
 {
-    if (row < 0 || row >= m_rowCount || isHeading(row))
+    if (row < 0 || row >= logRowCount() || isHeading(row))
         return QString();
     Line const* known = knownLine(row);
     const Line line = known ? *known : readLine(row);
@@ -425,7 +538,7 @@ QString LogModel::LineText(int row, int limit) const
 LogEntry LogModel::wholeEntry(int row) const
 {
     LogEntry entry;
-    if (row < 0 || row >= m_rowCount || isHeading(row))
+    if (row < 0 || row >= logRowCount() || isHeading(row))
         return entry;
     Line const* known = knownLine(row);
     const Line line = known ? *known : readLine(row);
@@ -460,14 +573,14 @@ QPair<int, int> LogModel::EntryRows(int row) const
     while (first > 0 && continues(first))
         --first;
     int last = row;
-    while (last + 1 < m_rowCount && continues(last + 1))
+    while (last + 1 < logRowCount() && continues(last + 1))
         ++last;
     return qMakePair(first, last);
 }
 
 QString LogModel::EntryText(int row, int limit) const
 {
-    if (row < 0 || row >= m_rowCount)
+    if (row < 0 || row >= logRowCount())
         return QString();
     const QPair<int, int> rows = EntryRows(row);
     QString text;
@@ -484,7 +597,7 @@ QString LogModel::EntryText(int row, int limit) const
 
 bool LogModel::IsGone(int row) const
 {
-    if (row < 0 || row >= m_rowCount || isHeading(row))
+    if (row < 0 || row >= logRowCount() || isHeading(row))
         return false;
     Line const* known = knownLine(row);
     return known ? known->isGone : readLine(row).isGone;
@@ -528,7 +641,7 @@ QString LogModel::headingText(int row) const
     return m_isCurrent ? tr("This run") : tr("Latest run in this file");
 }
 
-QString LogModel::cellText(int row, int column) const
+QString LogModel::CellText(int row, int column) const
 {
     if (isHeading(row))
         return column == 0 ? headingText(row) : QString();
@@ -562,7 +675,9 @@ QString LogModel::toolTip(int row, int column) const
         return tr("Remainder of an entry that a later run overwrote");
     if (column != MessageColumn)
         return QString();
-    return cellText(row, column);
+    const QString repeats = repeatsInWords(row);
+    const QString text = CellText(row, column);
+    return repeats.isEmpty() ? text : text + QLatin1Char('\n') + repeats;
 }
 
 int LogModel::rowCount(QModelIndex const& parent) const
@@ -582,8 +697,22 @@ QString LogModel::accessibleText(int row, int column) const
         return column > 0 ? QString() : IsFolded(row) ? tr("%1, folded").arg(run) : run;
     }
     return column == TimeColumn && m_marks.contains(LineStart(row))
-               ? tr("Marked: %1").arg(cellText(row, TimeColumn))
-               : cellText(row, column);
+               ? tr("Marked: %1").arg(CellText(row, TimeColumn))
+               : CellText(row, column);
+}
+
+QVariant LogModel::accessibleDescription(int row, int column) const
+{
+    if (column != TimeColumn)
+        return QVariant();
+    QStringList parts;
+    const QString gap = m_spans.Gap(row);
+    if (!gap.isEmpty())
+        parts.append(tr("%1 after the entry above").arg(gap));
+    const QString repeats = repeatsInWords(row);
+    if (!repeats.isEmpty())
+        parts.append(AreRepeatsOpen(row) ? repeats : tr("%1, folded").arg(repeats));
+    return parts.isEmpty() ? QVariant() : parts.join(QStringLiteral("; "));
 }
 
 // Of a row that is no heading.
@@ -598,13 +727,13 @@ QVariant LogModel::icon(int row, int column) const
 
 QVariant LogModel::data(QModelIndex const& index, int role) const
 {
-    const int row = index.row();
-    if (!index.isValid() || row >= m_rowCount)
+    if (!index.isValid() || index.row() >= m_rowCount)
         return QVariant();
+    const int row = RowAt(index.row());
 
     switch (role) {
     case Qt::DisplayRole:
-        return cellText(row, index.column());
+        return CellText(row, index.column());
     case Qt::AccessibleTextRole:
         return accessibleText(row, index.column());
     case Qt::DecorationRole:
@@ -622,17 +751,17 @@ QVariant LogModel::data(QModelIndex const& index, int role) const
     case EarlierRole:
         return static_cast<size_t>(row) < m_state.rows->earlier();
     case MarkedRole:
-        return m_marks.contains(LineStart(row));
+        return isMarked(row);
     case ContextRole:
         return bool(m_state.rows->mark(static_cast<size_t>(row)) & LogRows::Context);
     case LineRole:
         return LineText(row, ShownLimit);
     case GapRole:
         return m_spans.Gap(row);
-    case Qt::AccessibleDescriptionRole: {
-        const QString gap = index.column() == TimeColumn ? m_spans.Gap(row) : QString();
-        return gap.isEmpty() ? QVariant() : tr("%1 after the entry above").arg(gap);
-    }
+    case RepeatsRole:
+        return repeatsText(row);
+    case Qt::AccessibleDescriptionRole:
+        return accessibleDescription(row, index.column());
     case NoteRole:
         return m_marks.value(LineStart(row));
     default:
@@ -673,7 +802,7 @@ Qt::ItemFlags LogModel::flags(QModelIndex const& index) const
 {
     if (!index.isValid())
         return Qt::NoItemFlags;
-    return isHeading(index.row())
+    return isHeading(RowAt(index.row()))
                ? Qt::ItemFlags(Qt::ItemIsEnabled)
                : Qt::ItemIsEnabled | Qt::ItemIsSelectable | Qt::ItemNeverHasChildren;
 }

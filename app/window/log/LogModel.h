@@ -9,6 +9,7 @@
 #include "app/logfile/LogEntry.h"
 #include "app/logfile/LogFilter.h"
 #include "app/logfile/LogLineParser.h"
+#include "app/window/log/FoldedRows.h"
 #include "app/window/log/RowSpans.h"
 
 #include <QAbstractTableModel>
@@ -30,6 +31,10 @@ class FamilyScanner;
 /// in another thread. A line that is not in the file anymore, because the log has overwritten it,
 /// is shown as gone until the next update; what is in its place is not. Heading rows separate the
 /// runs. GUI thread.
+///
+/// What repeats the entry above may be folded. Then the rows of indexes and of the model's signals
+/// are table rows, and all other rows are those of the log, also those that are hidden; see
+/// FoldedRows.
 ///
 ///     LogModel model;
 ///     model.Open(TorkLog::logger()->newLogFileName(), LogLineParser());
@@ -56,7 +61,8 @@ public:
         NoteRole,                    ///< the user's note on it
         LineRole,    ///< the start of the line in the file, of up to ShownLimit bytes
         ContextRole, ///< whether it is shown only as the context of others
-        GapRole      ///< the gap before the row, in words; empty if there is none
+        GapRole,     ///< the gap before the row, in words; empty if there is none
+        RepeatsRole  ///< how often the entry is repeated, with an arrow; empty if it is not
     };
 
     explicit LogModel(QObject* parent = nullptr);
@@ -98,6 +104,30 @@ public:
     /// Whether the rows under a heading are hidden.
     bool IsFolded(int row) const { return IsFoldable(row) && runOf(row).isFolded; }
 
+    /// Folds entries that repeat the one above: they become one row with their number. Takes effect
+    /// as soon as they have been found.
+    void SetFoldsRepeats(bool folds);
+    bool foldsRepeats() const { return m_foldsRepeats; }
+
+    /// Shows all rows of the group of entries that a row is in, or only the first one again. Does
+    /// nothing for other rows. Lasts until another log is opened.
+    void SetRepeatsOpen(int row, bool open);
+
+    /// The group of entries that repeat each other a row is in; null if there is none. Valid until
+    /// the rows change.
+    RepeatGroup const* RepeatsOf(int row) const { return m_folded.GroupOf(row); }
+
+    /// Whether all rows of its group are shown; false for rows in no group.
+    bool AreRepeatsOpen(int row) const;
+
+    /// See FoldedRows.
+    int RowAt(int tableRow) const { return m_folded.RowAt(tableRow); }
+    int TableRowOf(int row) const { return m_folded.TableRowOf(row); }
+    bool IsHidden(int row) const { return m_folded.IsHidden(row); }
+
+    /// The number of rows of the log.
+    int logRowCount() const { return static_cast<int>(m_state.rows->size()); }
+
     /// Reads the file again from the start.
     void Reload();
 
@@ -120,14 +150,20 @@ public:
     /// Sets the lines that the user has marked: where they start, and their notes.
     void SetMarks(QHash<qint64, QString> const& marks);
 
+    /// Sets the rows of these lines, ascending.
+    void SetMarkedRows(std::shared_ptr<std::vector<int> const> const& rows);
+
     /// The times between rows. Views have to be told if it is to measure something else.
     RowSpans& spans() { return m_spans; }
+
+    /// What a column shows of a row.
+    QString CellText(int row, int column) const;
 
     /// What a row shows of its line, with the start of the message; of a heading, nothing.
     LogEntry Entry(int row) const { return isHeading(row) ? LogEntry() : entry(row); }
 
     /// The first row of the nearest entry after (step 1) or before (step -1) that of `row` that is
-    /// a warning or worse; -1 if there is none.
+    /// a warning or worse; -1 if there is none. Those that are hidden do not count.
     int FindProblem(int row, int step) const;
 
     /// Where the line of a row starts in the file; negative for a heading.
@@ -202,6 +238,7 @@ Q_SIGNALS:
                          QSet<QString> const& hidden);
     void hideRequested(QSet<QString> const& hidden);
     void foldRequested(quint64 run, bool folded);
+    void repeatsRequested(bool wanted);
     void filterRequested(int request, Velocor::LogFilter const& filter);
     void watchRequested(bool watched);
     void pollRequested();
@@ -222,6 +259,11 @@ private:
     void take(HistoryUpdate const& update);
     void reset(HistoryUpdate const& update);
     void applyChange(HistoryUpdate const& update);
+    FoldedRows foldedRows(HistoryUpdate const& update) const;
+    static quint64 keyOf(HistoryUpdate const& update, RepeatGroup const& group);
+    QString repeatsText(int row) const;
+    QString repeatsInWords(int row) const;
+    bool isMarked(int row) const;
     bool isHeading(int row) const;
     bool openFile() const;
     qint64 knownLength(int row, qint64 most) const;
@@ -234,9 +276,9 @@ private:
     LogEntry wholeEntry(int row) const;
     RunHeading const& runOf(int row) const;
     QString headingText(int row) const;
-    QString cellText(int row, int column) const;
     QString toolTip(int row, int column) const;
     QString accessibleText(int row, int column) const;
+    QVariant accessibleDescription(int row, int column) const;
     QVariant icon(int row, int column) const;
 
     QThread m_thread;
@@ -257,8 +299,12 @@ private:
     LogEncoding m_chosenEncoding = LogEncoding::Automatic;
     LogFilter m_filter;
     HistoryUpdate m_state;
-    int m_rowCount = 0; // fewer than the rows of m_state only while a change is being signaled
+    FoldedRows m_folded;
+    bool m_foldsRepeats = false;
+    QSet<quint64> m_open; // groups of repeats
+    int m_rowCount = 0;   // fewer than those of m_folded only while a change is being signaled
     QHash<qint64, QString> m_marks;
+    std::shared_ptr<std::vector<int> const> m_markedRows;
     RowSpans m_spans{*this};
     mutable LogBytes m_file;
     mutable QCache<qint64, Line> m_lines;

@@ -62,10 +62,12 @@ LogOverview::LogOverview(LogModel* model, LogView* view, QWidget* parent)
     connect(model, &LogModel::rowsInserted, this, [this](QModelIndex const&, int first, int last) {
         m_problems.Insert(static_cast<size_t>(first), RowCount(first, last));
         m_isOutdated = true;
+        m_lookTimer.start(); // repeats may have been opened
     });
     connect(model, &LogModel::rowsRemoved, this, [this](QModelIndex const&, int first, int last) {
         m_problems.Remove(static_cast<size_t>(first), RowCount(first, last));
         m_isOutdated = true;
+        m_lookTimer.start();
     });
     connect(model, &LogModel::dataChanged, this,
             [this](QModelIndex const& first, QModelIndex const& last) {
@@ -108,11 +110,24 @@ void LogOverview::reset()
     m_isReset = true;
 }
 
+quint8 LogOverview::markAt(size_t tableRow) const
+{
+    const int row = m_model->RowAt(static_cast<int>(tableRow));
+    return m_model->state().rows->mark(static_cast<size_t>(row));
+}
+
+ProblemBlocks::Marks LogOverview::marks() const
+{
+    return [this](size_t tableRow) {
+        return markAt(tableRow);
+    };
+}
+
 // Between two refreshes, the rows of the model are those that the blocks have been told of.
 void LogOverview::look()
 {
     if (!m_problems.isComplete()) {
-        m_problems.Look(*m_model->state().rows, RowsAtOnce);
+        m_problems.Look(marks(), RowsAtOnce);
         m_isOutdated = true;
     }
     if (m_isOutdated && !m_showTimer.isActive()) {
@@ -167,8 +182,9 @@ int LogOverview::partCount() const
     return std::max(1, ground().height() - TickSize + 1);
 }
 
-// The first row of a part or of one below; the number of rows for the part after the last one.
-int LogOverview::firstRow(int part) const
+// The first table row of a part or of one below; the number of them for the part after the last
+// one.
+int LogOverview::firstTableRow(int part) const
 {
     const auto parts = static_cast<qint64>(m_worst.size());
     return static_cast<int>((qint64(part) * m_model->rowCount() + parts - 1) / parts);
@@ -181,7 +197,7 @@ void LogOverview::updateParts()
     const auto parts = static_cast<size_t>(partCount());
     if (!m_isOutdated && parts == m_worst.size())
         return;
-    m_worst = m_problems.Worst(*m_model->state().rows, parts);
+    m_worst = m_problems.Worst(marks(), parts);
     m_isOutdated = false;
 }
 
@@ -197,23 +213,25 @@ bool LogOverview::hasTick(Lane lane, int part) const
 // The row of a tick; -1 if there is none.
 int LogOverview::tickIn(Lane lane, int part) const
 {
-    const int first = firstRow(part);
-    const int end = firstRow(part + 1);
+    const int firstShown = firstTableRow(part);
+    const int endShown = firstTableRow(part + 1);
     if (lane != Problems) {
         if (!m_rows[lane])
             return -1;
+        const int first = m_model->RowAt(firstShown);
+        const int end = m_model->RowAt(endShown);
         const auto row = std::lower_bound(m_rows[lane]->begin(), m_rows[lane]->end(), first);
         return row != m_rows[lane]->end() && *row < end ? *row : -1;
     }
-    LogRows const& rows = *m_model->state().rows;
     LogEntry::Severity worst = ProblemBlocks::NoProblem;
     int found = -1;
-    for (int row = first; row < end; ++row) {
-        const LogEntry::Severity problem = ProblemBlocks::ProblemOf(rows, static_cast<size_t>(row));
+    for (int shown = firstShown; shown < endShown; ++shown) {
+        const LogEntry::Severity problem =
+            ProblemBlocks::ProblemOf(markAt(static_cast<size_t>(shown)));
         if (problem == worst || ProblemBlocks::Worse(problem, worst) == worst)
             continue;
         worst = problem;
-        found = row;
+        found = m_model->RowAt(shown);
     }
     return found;
 }
@@ -272,19 +290,16 @@ int LogOverview::rowAt(QPoint const& position) const
     }
     const int last = static_cast<int>(m_worst.size()) - 1;
     const int part = qBound(0, position.y() - ground().top(), last);
-    const int row = std::min(firstRow(part), m_model->rowCount() - 1);
+    const int row = m_model->RowAt(std::min(firstTableRow(part), m_model->rowCount() - 1));
     if (m_model->LineStart(row) >= 0) // not a heading
         return row;
-    return row + 1 < m_model->rowCount() ? row + 1 : row - 1;
+    return row + 1 < m_model->logRowCount() ? row + 1 : row - 1;
 }
 
 QString LogOverview::lineOf(int row) const
 {
-    const auto cell = [&](int column) {
-        return m_model->index(row, column).data().toString();
-    };
-    const QString text = cell(LogModel::TimeColumn) + QLatin1Char(' ') +
-                         cell(LogModel::MessageColumn).left(ToolTipLength);
+    const QString text = m_model->CellText(row, LogModel::TimeColumn) + QLatin1Char(' ') +
+                         m_model->CellText(row, LogModel::MessageColumn).left(ToolTipLength);
     return text.trimmed();
 }
 

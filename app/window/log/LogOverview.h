@@ -58,12 +58,14 @@ private:
         int rows[LaneCount] = {-1, -1, -1};
     };
 
+    quint8 markAt(size_t tableRow) const;
+    ProblemBlocks::Marks marks() const;
     void setRows(Lane lane, Rows const& rows);
     void reset();
     void look();
     QRect ground() const;
     int partCount() const;
-    int firstRow(int part) const;
+    int firstTableRow(int part) const;
     void updateParts();
     bool hasTick(Lane lane, int part) const;
     int tickIn(Lane lane, int part) const;

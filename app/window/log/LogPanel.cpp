@@ -355,9 +355,14 @@ void LogPanel::SetLeastGap(qint64 span)
     m_view->SetLeastGap(span);
 }
 
+void LogPanel::SetFoldsRepeats(bool folds)
+{
+    m_model->SetFoldsRepeats(folds);
+}
+
 void LogPanel::measure(bool isFromCurrent)
 {
-    if (m_view->MeasureFrom(isFromCurrent ? m_view->currentIndex().row() : -1))
+    if (m_view->MeasureFrom(isFromCurrent ? m_view->CurrentRow() : -1))
         Q_EMIT sinceRequested();
     else
         Q_EMIT messageReported(tr("This line has no time"));
@@ -409,12 +414,12 @@ void LogPanel::keyPressEvent(QKeyEvent* event)
 
 void LogPanel::AskGoTo()
 {
-    const int current = m_view->currentIndex().row();
+    const int current = m_view->CurrentRow();
     GoToDialog dialog(static_cast<qint64>(m_model->state().lines), current >= 0, this);
     if (dialog.exec() != QDialog::Accepted)
         return;
     m_view->setFocus();
-    m_goTo->Find(dialog.place(), m_view->currentIndex().row());
+    m_goTo->Find(dialog.place(), m_view->CurrentRow());
 }
 
 void LogPanel::ShowPatterns()
@@ -458,9 +463,9 @@ void LogPanel::showMenu(QPoint const& position, QModelIndex const& cell)
 QVector<qint64> LogPanel::LineStarts() const
 {
     QVector<qint64> starts;
-    starts.reserve(m_model->rowCount());
+    starts.reserve(m_model->logRowCount());
     LogRows::Reader reader(*m_model->state().rows);
-    for (int row = 0; row < m_model->rowCount(); ++row) {
+    for (int row = 0; row < m_model->logRowCount(); ++row) {
         const qint64 start = reader.start(static_cast<size_t>(row));
         if (start >= 0) // not a heading
             starts.append(start);
@@ -493,7 +498,7 @@ QString LogPanel::path() const
 
 QString LogPanel::summary() const
 {
-    const int row = m_view->currentIndex().row();
+    const int row = m_view->CurrentRow();
     return LogStateText::Summary(*m_model, m_percent, row, m_view->LineNumber(row));
 }
 
@@ -522,8 +527,9 @@ void LogPanel::showContent()
 void LogPanel::showCurrentLine()
 {
     const QModelIndex current = m_view->currentIndex();
-    m_line->SetText(current.isValid() ? m_model->EntryText(current.row(), LogIndex::LineLimit)
-                                      : QString());
+    m_line->SetText(current.isValid()
+                        ? m_model->EntryText(m_view->CurrentRow(), LogIndex::LineLimit)
+                        : QString());
     m_line->SetNote(m_marks->note());
     Q_EMIT stateChanged(); // the number of the line
 }

@@ -98,6 +98,9 @@ public:
     void SetSince(bool shown);
     void SetLeastGap(qint64 span);
 
+    /// See LogModel::SetFoldsRepeats().
+    void SetFoldsRepeats(bool folds);
+
     /// Adds a bar above the table. The panel takes ownership.
     void AddBar(QWidget* bar);
 

@@ -96,7 +96,7 @@ bool LogSearch::isComplete() const
 
 int LogSearch::percent() const
 {
-    const qint64 rows = m_model->rowCount();
+    const qint64 rows = m_model->logRowCount();
     return rows > 0 ? static_cast<int>(std::min<qint64>(99, m_hits.searched * qint64(100) / rows))
                     : 99;
 }
@@ -128,7 +128,7 @@ LogSearch::Answer LogSearch::Next(int row, int step, int& hit) const
         found = isAhead ? *after : hits.front();
     else
         found = isAhead ? *(from - 1) : hits.back();
-    if (!isComplete() && (found >= m_model->rowCount() ||
+    if (!isComplete() && (found >= m_model->logRowCount() ||
                           m_model->LineStart(found) != m_hits.rows->start(size_t(found))))
         return Answer::Unknown;
     hit = found;

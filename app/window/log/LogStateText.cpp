@@ -24,7 +24,7 @@ struct StateText
 qulonglong ShownLines(LogModel const& model)
 {
     LogRows const& rows = *model.state().rows;
-    return static_cast<qulonglong>(model.rowCount()) - rows.headings();
+    return static_cast<qulonglong>(rows.size() - rows.headings());
 }
 
 QString LinesShown(LogModel const& model)

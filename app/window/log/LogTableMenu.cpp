@@ -38,7 +38,7 @@ QString LogTableMenu::text() const
 {
     auto const* model = qobject_cast<LogModel const*>(m_cell.model());
     return model && m_cell.column() == LogModel::MessageColumn
-               ? model->MessageText(m_cell.row()).left(LogModel::ShownLimit)
+               ? model->MessageText(model->RowAt(m_cell.row())).left(LogModel::ShownLimit)
                : m_cell.data().toString();
 }
 

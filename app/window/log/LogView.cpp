@@ -46,8 +46,9 @@ LogView::LogView(LogModel* model, QWidget* parent)
     connect(model, &LogModel::modelAboutToBeReset, this, &LogView::noteCurrent);
     connect(model, &LogModel::refreshed, this, &LogView::afterRefresh);
     connect(this, &LogView::clicked, this, [this](QModelIndex const& index) {
-        if (m_model->IsFoldable(index.row()))
-            fold(index.row(), !m_model->IsFolded(index.row()));
+        const int row = m_model->RowAt(index.row());
+        if (m_model->IsFoldable(row))
+            fold(row, !m_model->IsFolded(row));
     });
 }
 
@@ -141,10 +142,8 @@ void LogView::focusInEvent(QFocusEvent* event)
 void LogView::keyPressEvent(QKeyEvent* event)
 {
     const bool isSideways = event->key() == Qt::Key_Left || event->key() == Qt::Key_Right;
-    if (isSideways && m_model->IsFoldable(currentIndex().row())) {
-        fold(currentIndex().row(), event->key() == Qt::Key_Left);
+    if (isSideways && foldByKey(event->key() == Qt::Key_Left))
         return;
-    }
     const QScopedValueRollback<bool> guard(m_goesSideways, isSideways);
     const bool isEnd = event->key() == Qt::Key_Home || event->key() == Qt::Key_End;
     if (!isEnd || !(event->modifiers() & Qt::ControlModifier)) {
@@ -339,7 +338,8 @@ void LogView::afterRefresh()
     if (m_hasOtherRows)
         viewport()->update();
     else if (state.runs) // the counts of the newest run
-        viewport()->update(visualRect(m_model->index(static_cast<int>(state.rows->earlier()), 0)));
+        viewport()->update(visualRect(
+            m_model->index(m_model->TableRowOf(static_cast<int>(state.rows->earlier())), 0)));
     m_hasOtherRows = false;
 }
 
@@ -348,7 +348,7 @@ void LogView::currentChanged(QModelIndex const& current, QModelIndex const& prev
 {
     WrappingTable::currentChanged(current, previous);
     m_currentText =
-        current.isValid() ? m_model->LineText(current.row(), LogModel::ShownLimit) : QString();
+        current.isValid() ? m_model->LineText(CurrentRow(), LogModel::ShownLimit) : QString();
 }
 
 // The rows under the heading are what the user looks at, not the newest one.
@@ -359,10 +359,57 @@ void LogView::fold(int row, bool folded)
     m_model->SetFolded(row, folded);
 }
 
+// Opens what the current row hides, or closes what it is in. Returns false if there is no such
+// thing.
+bool LogView::foldByKey(bool folded)
+{
+    const int row = CurrentRow();
+    if (m_model->IsFoldable(row)) {
+        fold(row, folded);
+        return true;
+    }
+    if (!m_model->RepeatsOf(row) || m_model->AreRepeatsOpen(row) != folded)
+        return false;
+    setRepeatsOpen(row, !folded);
+    return true;
+}
+
+// The first row of a group takes the place of those that are hidden.
+void LogView::setRepeatsOpen(int row, bool open)
+{
+    const int first = static_cast<int>(m_model->RepeatsOf(row)->first);
+    if (!open && CurrentRow() > first &&
+        m_model->RepeatsOf(CurrentRow()) == m_model->RepeatsOf(row))
+        select(m_model->index(m_model->TableRowOf(first), firstColumn()));
+    if (open)
+        SetFollowing(false);
+    m_model->SetRepeatsOpen(row, open);
+    m_hasOtherRows = false;
+    forgetHeights();
+    if (isWrapped())
+        updateGeometries();
+    viewport()->update();
+}
+
+// Qt selects the row, whatever was clicked on.
+void LogView::mousePressEvent(QMouseEvent* event)
+{
+    const QModelIndex cell = indexAt(event->pos());
+    const int row = cell.isValid() ? m_model->RowAt(cell.row()) : -1;
+    const QString repeats = cell.data(LogModel::RepeatsRole).toString();
+    const bool isOnRepeats =
+        event->button() == Qt::LeftButton && !event->modifiers() &&
+        cell.column() == LogModel::MessageColumn && !repeats.isEmpty() &&
+        LogDelegate::RepeatsArea(repeats, font(), visualRect(cell)).contains(event->pos());
+    WrappingTable::mousePressEvent(event);
+    if (isOnRepeats)
+        setRepeatsOpen(row, !m_model->AreRepeatsOpen(row));
+}
+
 void LogView::noteCurrent()
 {
     m_hasOtherRows = true;
-    const int row = currentIndex().row();
+    const int row = CurrentRow();
     m_keepsHeading = m_model->IsFoldable(row) && m_model->LineStart(row) == LogRows::NewestHeading;
     if (row < 0 || m_model->LineStart(row) < 0)
         return;
@@ -370,9 +417,10 @@ void LogView::noteCurrent()
     m_keptStart = m_model->LineStart(row);
     m_keptCheck = m_model->state().rows->check(static_cast<size_t>(row));
     m_keptText = m_currentText;
-    const int visible = viewport()->height() / std::max(1, rowHeight(row)) - 1;
-    m_wasInView = row >= rowAt(0) && row <= rowAt(0) + visible;
-    m_keptDistance = qBound(0, row - rowAt(0), std::max(0, visible));
+    const int tableRow = currentIndex().row();
+    const int visible = viewport()->height() / std::max(1, rowHeight(tableRow)) - 1;
+    m_wasInView = tableRow >= rowAt(0) && tableRow <= rowAt(0) + visible;
+    m_keptDistance = qBound(0, tableRow - rowAt(0), std::max(0, visible));
 }
 
 // The row of the line that was current or, if that is filtered out, the nearest one. If the file
@@ -387,7 +435,7 @@ int LogView::keptRow(qint64 start) const
     if (rows.lines().start(line) == start && rows.lines().check(line) == m_keptCheck)
         return near;
     const auto isKept = [&](int row) {
-        return row >= 0 && row < m_model->rowCount() &&
+        return row >= 0 && row < m_model->logRowCount() &&
                rows.check(static_cast<size_t>(row)) == m_keptCheck &&
                m_model->LineText(row, LogModel::ShownLimit) == m_keptText;
     };
@@ -407,7 +455,7 @@ void LogView::restoreCurrent()
         m_keepsHeading = false;
         const int row = static_cast<int>(m_model->state().rows->earlier());
         if (m_model->IsFoldable(row) && !currentIndex().isValid())
-            selectionModel()->setCurrentIndex(m_model->index(row, 0),
+            selectionModel()->setCurrentIndex(m_model->index(m_model->TableRowOf(row), 0),
                                               QItemSelectionModel::NoUpdate);
     }
     if (m_keptStart < 0 || m_model->isReading())
@@ -417,16 +465,17 @@ void LogView::restoreCurrent()
     const int row = m_model->path() == m_keptPath ? keptRow(start) : -1;
     if (row < 0 || currentIndex().isValid())
         return;
-    const QModelIndex index = m_model->index(row, firstColumn());
+    const int tableRow = m_model->TableRowOf(row);
+    const QModelIndex index = m_model->index(tableRow, firstColumn());
     select(index);
     if (m_following) {
         goToEnd();
-        if (!m_wasInView || row >= rowAt(0))
+        if (!m_wasInView || tableRow >= rowAt(0))
             return;
         SetFollowing(false);
     }
     updateGeometries(); // updates the scroll bar's range
-    verticalScrollBar()->setValue(row - m_keptDistance);
+    verticalScrollBar()->setValue(tableRow - m_keptDistance);
     if (isWrapped())
         scrollTo(index); // the rows above it may be higher than before
 }
@@ -447,7 +496,7 @@ void LogView::fitTimes()
 bool LogView::isSpanning(int row) const
 {
     return row >= 0 && row < m_model->rowCount() &&
-           m_model->state().rows->isHeading(static_cast<size_t>(row));
+           m_model->state().rows->isHeading(static_cast<size_t>(m_model->RowAt(row)));
 }
 
 // The heading cannot be selected, so no key would lead to it.
@@ -457,14 +506,24 @@ int LogView::topFor(int row, ScrollHint hint) const
     return top == 1 && row == 1 && isSpanning(0) && hint == EnsureVisible ? 0 : top;
 }
 
+int LogView::CurrentRow() const
+{
+    return currentIndex().isValid() ? m_model->RowAt(currentIndex().row()) : -1;
+}
+
+int LogView::LogRowOf(int tableRow) const
+{
+    return m_model->RowAt(tableRow);
+}
+
 int LogView::StartRow(int step) const
 {
     if (currentIndex().isValid())
-        return currentIndex().row();
+        return CurrentRow();
     if (step > 0)
-        return rowAt(0) - 1;
+        return m_model->RowAt(std::max(0, rowAt(0))) - 1;
     const int last = rowAt(viewport()->height() - 1);
-    return last < 0 ? m_model->rowCount() : last + 1;
+    return last < 0 ? m_model->logRowCount() : m_model->RowAt(last + 1);
 }
 
 // Qt does not scroll to hidden columns.
@@ -476,14 +535,14 @@ int LogView::firstColumn() const
     return column;
 }
 
-QModelIndex LogView::FirstCell(int row) const
+QModelIndex LogView::FirstCell(int tableRow) const
 {
-    return m_model->index(row, isSpanning(row) ? 0 : firstColumn());
+    return m_model->index(tableRow, isSpanning(tableRow) ? 0 : firstColumn());
 }
 
 qulonglong LogView::LineNumber(int row) const
 {
-    if (row < 0 || row >= m_model->rowCount() || m_model->LineStart(row) < 0)
+    if (row < 0 || row >= m_model->logRowCount() || m_model->LineStart(row) < 0)
         return 0;
     return m_model->state().rows->line(static_cast<size_t>(row)) - m_model->FirstLineOfFile(row) +
            1;
@@ -500,7 +559,7 @@ LogView::Jump LogView::GoToProblem(int step)
     int row = m_model->FindProblem(StartRow(step), step);
     if (row < 0) {
         jump = Jump::Wrapped;
-        row = m_model->FindProblem(step > 0 ? -1 : m_model->rowCount(), step);
+        row = m_model->FindProblem(step > 0 ? -1 : m_model->logRowCount(), step);
     }
     if (row < 0)
         return Jump::None;
@@ -522,10 +581,13 @@ void LogView::select(QModelIndex const& index)
 
 void LogView::GoToRow(int row)
 {
-    const QModelIndex index = m_model->index(row, firstColumn());
+    if (m_model->IsHidden(row))
+        setRepeatsOpen(row, true);
+    const int tableRow = m_model->TableRowOf(row);
+    const QModelIndex index = m_model->index(tableRow, firstColumn());
     select(index);
     scrollTo(index, PositionAtCenter);
-    if (row + 1 < m_model->rowCount())
+    if (tableRow + 1 < m_model->rowCount())
         SetFollowing(false);
 }
 
@@ -546,7 +608,8 @@ QList<int> LogView::SelectedRows() const
     QList<int> rows;
     const QItemSelection selection = selectionModel()->selection();
     for (QItemSelectionRange const& range : selection) {
-        for (int row = range.top(); row <= range.bottom() && rows.size() < MaximumCopiedLines;
+        const int end = m_model->RowAt(range.bottom() + 1);
+        for (int row = m_model->RowAt(range.top()); row < end && rows.size() < MaximumCopiedLines;
              ++row)
             rows.append(row);
     }

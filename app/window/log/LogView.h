@@ -21,6 +21,9 @@ class SteadyScrollBar;
 /// current line stays current when the file is read again, wherever it is then, and when the filter
 /// changes; if it is filtered out, the nearest one takes its place. If it was in view, it stays so,
 /// even if that ends following.
+///
+/// Rows are those of the log, as the functions of LogModel have them, also if repeats are folded. A
+/// key and a click open such a group and close it. Going to a row that it hides opens it.
 class LogView : public WrappingTable
 {
     Q_OBJECT
@@ -62,12 +65,18 @@ public:
     /// one, the view no longer follows the newest entry.
     void GoToRow(int row);
 
+    /// The current row; -1 if there is none.
+    int CurrentRow() const;
+
     /// The row to search from in a direction: the current one or, without one, the one outside of
     /// the rows in view.
     int StartRow(int step) const;
 
-    /// The first cell of a row that is shown.
-    QModelIndex FirstCell(int row) const;
+    /// The row of the log that a table row shows.
+    int LogRowOf(int tableRow) const;
+
+    /// The first cell of a table row that is shown.
+    QModelIndex FirstCell(int tableRow) const;
 
     /// The number of a row's line in its file, starting at 1; 0 for a heading and if there is no
     /// such row.
@@ -82,7 +91,8 @@ public:
     /// Sets the rules that highlight lines.
     void SetHighlightRules(std::shared_ptr<HighlightRules> const& rules);
 
-    /// The numbers of the selected rows in ascending order, at most MaximumCopiedLines.
+    /// The numbers of the selected rows in ascending order, at most MaximumCopiedLines; with those
+    /// that they hide.
     QList<int> SelectedRows() const;
 
     /// Rows are selected as a whole, so going from row to row does not scroll sideways; the Left
@@ -115,6 +125,7 @@ protected:
     int topFor(int row, ScrollHint hint) const override;
     void paintEvent(QPaintEvent* event) override;
     void contextMenuEvent(QContextMenuEvent* event) override;
+    void mousePressEvent(QMouseEvent* event) override;
     void changeEvent(QEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
     void focusInEvent(QFocusEvent* event) override;
@@ -134,6 +145,8 @@ private:
     void afterRefresh();
     void noteCurrent();
     void fold(int row, bool folded);
+    bool foldByKey(bool folded);
+    void setRepeatsOpen(int row, bool open);
     int keptRow(qint64 start) const;
     void restoreCurrent();
     int firstColumn() const;

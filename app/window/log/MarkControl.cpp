@@ -38,7 +38,7 @@ void MarkControl::report(QString const& message)
 
 void MarkControl::Toggle()
 {
-    report(m_marks->Toggle(m_view->currentIndex().row()));
+    report(m_marks->Toggle(m_view->CurrentRow()));
 }
 
 void MarkControl::AskNote()
@@ -48,9 +48,9 @@ void MarkControl::AskNote()
         report(tr("Select a line first"));
         return;
     }
-    NoteDialog dialog(m_marks->NoteOf(current.row()), m_window);
+    NoteDialog dialog(m_marks->NoteOf(m_model->RowAt(current.row())), m_window);
     if (dialog.exec() == QDialog::Accepted)
-        report(m_marks->SetNote(current.row(), dialog.note()));
+        report(m_marks->SetNote(m_model->RowAt(current.row()), dialog.note()));
 }
 
 void MarkControl::GoTo(int step)
@@ -91,7 +91,7 @@ void MarkControl::ShowList()
 
 bool MarkControl::isMarked() const
 {
-    return m_marks->isMarked(m_view->currentIndex().row());
+    return m_marks->isMarked(m_view->CurrentRow());
 }
 
 std::shared_ptr<std::vector<int> const> const& MarkControl::rows() const
@@ -101,7 +101,7 @@ std::shared_ptr<std::vector<int> const> const& MarkControl::rows() const
 
 QString MarkControl::note() const
 {
-    return m_marks->NoteOf(m_view->currentIndex().row());
+    return m_marks->NoteOf(m_view->CurrentRow());
 }
 
 void MarkControl::show()

@@ -65,11 +65,11 @@ void MarkListDialog::fill(LogMarks const& marks, LogView const& view)
         auto* item = new QTreeWidgetItem(m_list);
         item->setText(NumberColumn, QLocale().toString(view.LineNumber(row)));
         item->setTextAlignment(NumberColumn, Qt::AlignRight | Qt::AlignVCenter);
-        item->setText(StampColumn, model->index(row, LogModel::TimeColumn).data().toString());
+        item->setText(StampColumn, model->CellText(row, LogModel::TimeColumn));
         item->setText(NoteColumn, marks.NoteOf(row));
-        const QString message = model->index(row, LogModel::MessageColumn).data().toString();
+        const QString message = model->CellText(row, LogModel::MessageColumn);
         item->setText(TextColumn, Shortened(message, LongestMarkText));
-        if (row <= view.currentIndex().row())
+        if (row <= view.CurrentRow())
             current = m_starts.size();
         m_starts.append(model->LineStart(row));
     }

@@ -10,9 +10,8 @@
 
 namespace Velocor {
 
-LogEntry::Severity ProblemBlocks::ProblemOf(LogRows const& rows, size_t row)
+LogEntry::Severity ProblemBlocks::ProblemOf(quint8 mark)
 {
-    const quint8 mark = rows.mark(row);
     const auto severity = static_cast<LogEntry::Severity>(mark & LogRows::SeverityMask);
     return LogSeverities::IsProblem(severity) && !(mark & LogRows::Continued) ? severity
                                                                               : NoProblem;
@@ -104,7 +103,7 @@ void ProblemBlocks::Change(size_t first, size_t count)
     }
 }
 
-void ProblemBlocks::Look(LogRows const& rows, size_t limit)
+void ProblemBlocks::Look(Marks const& marks, size_t limit)
 {
     size_t first = 0;
     size_t looked = 0;
@@ -114,7 +113,7 @@ void ProblemBlocks::Look(LogRows const& rows, size_t limit)
         if (!block.isKnown) {
             LogEntry::Severity worst = NoProblem;
             for (size_t row = first; row < first + block.rows; ++row)
-                worst = Worse(worst, ProblemOf(rows, row));
+                worst = Worse(worst, ProblemOf(marks(row)));
             block.worst = static_cast<quint8>(worst);
             block.isKnown = true;
             --m_unknown;
@@ -124,7 +123,7 @@ void ProblemBlocks::Look(LogRows const& rows, size_t limit)
     }
 }
 
-std::vector<LogEntry::Severity> ProblemBlocks::Worst(LogRows const& rows, size_t parts) const
+std::vector<LogEntry::Severity> ProblemBlocks::Worst(Marks const& marks, size_t parts) const
 {
     std::vector<LogEntry::Severity> worst(parts, NoProblem);
     if (parts == 0)
@@ -141,7 +140,7 @@ std::vector<LogEntry::Severity> ProblemBlocks::Worst(LogRows const& rows, size_t
             } else {
                 for (size_t row = first; row < end; ++row) {
                     const size_t part = row * parts / m_size;
-                    worst[part] = Worse(worst[part], ProblemOf(rows, row));
+                    worst[part] = Worse(worst[part], ProblemOf(marks(row)));
                 }
             }
         }

@@ -8,11 +8,10 @@
 #include <QtGlobal>
 
 #include <cstddef>
+#include <functional>
 #include <vector>
 
 namespace Velocor {
-
-class LogRows;
 
 /// Where the problems are among the rows of a log: the worst severity of each few hundred rows.
 ///
@@ -22,16 +21,21 @@ class LogRows;
 ///
 ///     blocks.Reset(rows.size());
 ///     while (!blocks.isComplete())
-///         blocks.Look(rows, 100000);
-///     worst = blocks.Worst(rows, height);
+///         blocks.Look(marks, 100000);
+///     worst = blocks.Worst(marks, height);
 class ProblemBlocks
 {
 public:
     /// What a place without a problem has.
     static constexpr LogEntry::Severity NoProblem = LogEntry::None;
 
+    /// The mark of a row, as LogRows::mark().
+    using Marks = std::function<quint8(size_t row)>;
+
     /// The severity of a row that begins an entry and is a problem; NoProblem for others.
-    static LogEntry::Severity ProblemOf(LogRows const& rows, size_t row);
+    ///
+    /// @param mark  of the row
+    static LogEntry::Severity ProblemOf(quint8 mark);
 
     /// The worse of two problems.
     static LogEntry::Severity Worse(LogEntry::Severity a, LogEntry::Severity b);
@@ -50,9 +54,9 @@ public:
 
     /// Looks at unknown blocks, from the first one on.
     ///
-    /// @param rows   as many as this object has been told of
+    /// @param marks  of as many rows as this object has been told of
     /// @param limit  about how many rows to look at; at least one block is looked at
-    void Look(LogRows const& rows, size_t limit);
+    void Look(Marks const& marks, size_t limit);
 
     /// Whether all rows are known.
     bool isComplete() const { return m_unknown == 0; }
@@ -64,8 +68,8 @@ public:
     /// row `r` is in part `r * parts / size()`. Unknown rows count as none. Looks at the rows of
     /// few blocks only.
     ///
-    /// @param rows  as many as this object has been told of
-    std::vector<LogEntry::Severity> Worst(LogRows const& rows, size_t parts) const;
+    /// @param marks  of as many rows as this object has been told of
+    std::vector<LogEntry::Severity> Worst(Marks const& marks, size_t parts) const;
 
 private:
     static constexpr size_t BlockSize = 256; // at most

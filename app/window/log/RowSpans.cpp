@@ -58,7 +58,7 @@ RowSpans::Span RowSpans::spanAbove(int row) const
 
 bool RowSpans::MeasureFrom(int row)
 {
-    if (row < 0 || row >= m_model.rowCount())
+    if (row < 0 || row >= m_model.logRowCount())
         return false;
     const Time time = timeOf(m_model.EntryRows(row).first);
     if (time.key < 0)

@@ -16,16 +16,6 @@ struct RunTexts
     Q_DECLARE_TR_FUNCTIONS(RunText)
 };
 
-// With one date if both have the same.
-QString TimesOf(RunHeading const& run)
-{
-    if (run.start.isEmpty() || run.end == run.start)
-        return run.start;
-    const int space = run.start.indexOf(QLatin1Char(' ')) + 1;
-    const bool isSameDay = space > 0 && run.end.startsWith(run.start.left(space));
-    return RunTexts::tr("%1 to %2").arg(run.start, isSameDay ? run.end.mid(space) : run.end);
-}
-
 QString ExitOf(HistoryRun::Exit exit)
 {
     switch (exit) {
@@ -50,10 +40,19 @@ QString CountOf(size_t count, QString const& one, QString const& several)
 
 } // namespace
 
+QString TimesText(QString const& start, QString const& end)
+{
+    if (start.isEmpty() || end == start)
+        return start;
+    const int space = start.indexOf(QLatin1Char(' ')) + 1;
+    const bool isSameDay = space > 0 && end.startsWith(start.left(space));
+    return RunTexts::tr("%1 to %2").arg(start, isSameDay ? end.mid(space) : end);
+}
+
 QString RunText(RunHeading const& run, QString const& program)
 {
     QStringList parts = {
-        program, TimesOf(run), ExitOf(run.exit),
+        program, TimesText(run.start, run.end), ExitOf(run.exit),
         CountOf(run.warnings, RunTexts::tr("1 warning"), RunTexts::tr("%1 warnings")),
         CountOf(run.errors, RunTexts::tr("1 error"), RunTexts::tr("%1 errors"))};
     parts.removeAll(QString());

@@ -62,10 +62,10 @@ int WrappingTable::heightOf(int row) const
     if (known != m_heights.end())
         return known->second;
     const QModelIndex cell = model()->index(row, LogModel::MessageColumn);
-    const int height =
-        std::max(usualHeight(),
-                 m_delegate->HeightOf(cell.data().toString(),
-                                      cell.data(LogModel::GapRole).toString(), font(), m_width));
+    const int height = std::max(
+        usualHeight(),
+        m_delegate->HeightOf(cell.data().toString(), cell.data(LogModel::GapRole).toString(),
+                             cell.data(LogModel::RepeatsRole).toString(), font(), m_width));
     m_heights.emplace(row, height);
     return height;
 }
