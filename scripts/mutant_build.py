@@ -21,12 +21,14 @@ COPY = WORK / "source"
 PROOFS = "tst_Faults tst_SystemLimits tst_SuddenDeath tst_Load tst_Life"
 PLAIN_LOGS = ("tst_PlainActivity tst_PlainLineParser tst_PlainLineTable tst_PlainLogFileType "
               "tst_PlainLogIndex tst_PlainLogRows tst_PlainSearch tst_LogLives")
+PLAIN_HISTORIES = "tst_HistoryLives tst_PlainFamily tst_PlainPatterns tst_PlainRepeats tst_PlainTerminal"
+HISTORIES_IN_WINDOW = "tst_AllFilesInWindow tst_FamilyInWindow tst_RepeatsInWindow"
 ROOMS = {
     "common/config": ("config", "plain", PROOFS),
     "common/log": ("log", "plain", PROOFS),
     "common/xml": ("xml", "config plain", "hostile"),
-    "app/history": ("history", "tst_HistoryLives tst_PlainTerminal"),
-    "app/logfile": ("logfile", PLAIN_LOGS),
+    "app/history": ("history", PLAIN_HISTORIES, HISTORIES_IN_WINDOW),
+    "app/logfile": ("logfile", PLAIN_LOGS, f"history {PLAIN_HISTORIES}"),
     "app/report": ("report", "tst_PlainRedaction"),
     "app/settingsfile": ("settingsfile", "plain hostile", "window"),
     "app/runninglog": ("runninglog", "window"),
