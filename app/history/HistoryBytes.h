@@ -30,6 +30,7 @@ public:
 private:
     std::shared_ptr<QFile> m_file;
     QByteArray m_bytes;
+    int m_readAhead = 0; // bytes
     qint64 m_start = 0;
     QByteArray m_part; // always the same object, so that a part takes no memory
 };
