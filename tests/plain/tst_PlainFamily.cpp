@@ -53,6 +53,7 @@ private:
     Lines shown(HistoryUpdate const& update) const;
     Lines merged() const;
     bool hasOtherRuns(Lines const& found, Lines const& expected) const;
+    bool mayHaveHiddenRuns() const;
 
     QTemporaryDir m_folder{QFileInfo("/dev/shm").isWritable() ? "/dev/shm/tst_PlainFamily-XXXXXX"
                                                               : "tst_PlainFamily-XXXXXX"};
@@ -125,6 +126,14 @@ bool tst_PlainFamily::hasOtherRuns(Lines const& found, Lines const& expected) co
     return false;
 }
 
+// Whether the filter may hide that runs of one of the logs are in another order.
+bool tst_PlainFamily::mayHaveHiddenRuns() const
+{
+    const bool isFiltered = m_filter.hasText() || !m_filter.Shows(LogEntry::Trace);
+    return isFiltered && std::any_of(m_lives.begin(), m_lives.end(),
+                                     [](auto const& life) { return !life->isClear(); });
+}
+
 // Each time with other times of modification, by which changes are noticed.
 void tst_PlainFamily::save(int step)
 {
@@ -170,7 +179,7 @@ void tst_PlainFamily::compare()
     for (size_t row = 0; row < m_update.rows->size(); row += 7)
         QCOMPARE(m_update.rows->RowNear(m_update.rows->start(row)), int(row));
     ++m_merges;
-    if (hasOtherRuns(found, expected)) {
+    if (hasOtherRuns(found, expected) || (found != expected && mayHaveHiddenRuns())) {
         ++m_guesses;
         return;
     }

@@ -210,7 +210,7 @@ void tst_PlainRepeats::randomLives()
             return;
         }
     }
-    QVERIFY(m_groups > 50 * count);
+    QVERIFY(m_groups > 25 * count);
     QVERIFY(m_changes > 5 * count);
 }
 
