@@ -17,7 +17,7 @@ void OlderLogFiles::Add(QString const& path, std::shared_ptr<QFile> file, qint64
 
 size_t OlderLogFiles::FileAt(qint64 offset) const
 {
-    if (offset >= m_size)
+    if (m_files.empty() || offset >= m_size)
         return m_files.size();
     size_t file = m_files.size() - 1;
     while (file > 0 && m_files[file].start > offset)

@@ -22,6 +22,7 @@ class tst_PlainLineTable : public QObject
 private slots:
     void tables();
     void numbers();
+    void differentAtAnyLine();
 };
 
 namespace {
@@ -296,6 +297,33 @@ void tst_PlainLineTable::tables()
 void tst_PlainLineTable::numbers()
 {
     Program::compare<Numbers>("line numbers", Rounds::count(3000, 200000, 4000000), 30);
+}
+
+// Tables that share nothing: wherever they differ, and however little.
+void tst_PlainLineTable::differentAtAnyLine()
+{
+    constexpr size_t Count = 600;
+    const auto table = [](size_t other, qint64 later, int otherMark, int otherCheck) {
+        LineTable lines;
+        for (size_t line = 0; line < Count; ++line) {
+            const bool isOther = line == other;
+            lines.Append(qint64(line) * 70 + (line >= other ? later : 0),
+                         quint8((line % 5) ^ (isOther ? otherMark : 0)),
+                         quint16((line * 77) ^ (isOther ? otherCheck : 0)));
+        }
+        return lines;
+    };
+    const LineTable lines = table(Count, 0, 0, 0);
+    QCOMPARE(lines.CountSame(table(Count, 0, 0, 0)), Count);
+    for (size_t line = 0; line < Count; ++line) {
+        QCOMPARE(lines.CountSame(table(line, 1, 0, 0)), line);
+        QCOMPARE(lines.CountSame(table(line, 0, 1, 0)), line);
+        QCOMPARE(lines.CountSame(table(line, 0, 0, 1)), line);
+        LineTable shorter = table(Count, 0, 0, 0);
+        shorter.Truncate(line);
+        QCOMPARE(lines.CountSame(shorter), line);
+        QCOMPARE(shorter.CountSame(lines), line);
+    }
 }
 
 QTEST_APPLESS_MAIN(tst_PlainLineTable)
