@@ -15,6 +15,7 @@
 #include <QClipboard>
 #include <QComboBox>
 #include <QFileDialog>
+#include <QScrollBar>
 
 using namespace Velocor;
 using namespace WindowParts;
@@ -108,6 +109,8 @@ private slots:
     void howRunsEnded();
     void folding();
     void foldingWithKeys();
+    void leftGoesToTheHeading();
+    void leftScrollsFirst();
     void foldingOfTheNewest();
     void foldingWhilePaused();
     void filter();
@@ -232,6 +235,49 @@ void tst_AllFilesInWindow::foldingWithKeys()
     QCOMPARE(view->currentIndex().row(), HeadingRow(*window, "03-03"));
     QTest::keyClick(view, Qt::Key_Right);
     QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+}
+
+// From one run to the one before, however many lines they have.
+void tst_AllFilesInWindow::leftGoesToTheHeading()
+{
+    const WindowTest test;
+    WriteFiles(test.logFile());
+    const auto window = WindowTest::show();
+    ShowAll(*window);
+    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    LogView* view = View(*window);
+    view->setFocus();
+    QVERIFY(!view->currentIndex().isValid());
+    for (char const* day : {"03-05", "03-04", "03-03", "03-02", "03-01"}) {
+        QTest::keyClick(view, Qt::Key_Left);
+        QCOMPARE(view->currentIndex().row(), HeadingRow(*window, day));
+        QCOMPARE(Shown(*window), All); // no run is folded by it
+        QTest::keyClick(view, Qt::Key_Up);
+    }
+    QCOMPARE(view->currentIndex().row(), HeadingRow(*window, "03-01"));
+}
+
+// What has been scrolled sideways is scrolled back first.
+void tst_AllFilesInWindow::leftScrollsFirst()
+{
+    const WindowTest test;
+    WriteFiles(test.logFile());
+    const auto window = WindowTest::show();
+    ShowAll(*window);
+    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    LogView* view = View(*window);
+    view->setColumnWidth(LogModel::TimeColumn, 3 * view->width());
+    QScrollBar* across = view->horizontalScrollBar();
+    QTRY_VERIFY_WITH_TIMEOUT(across->maximum() > 0, Patience);
+    view->setFocus();
+    const int row = RowOf(*window, "f");
+    view->GoToRow(row);
+    across->setValue(across->maximum());
+    QTest::keyClick(view, Qt::Key_Left);
+    QCOMPARE(view->currentIndex().row(), row);
+    across->setValue(across->minimum());
+    QTest::keyClick(view, Qt::Key_Left);
+    QCOMPARE(view->currentIndex().row(), HeadingRow(*window, "03-03"));
 }
 
 void tst_AllFilesInWindow::foldingOfTheNewest()

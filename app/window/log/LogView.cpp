@@ -32,6 +32,14 @@ constexpr int MaximumMove = 500 * 1000;
 // In a log that is followed for days, they would take more and more memory.
 constexpr int MostMeasuredRows = 1000;
 
+// The heading above a row, or -1.
+int HeadingAbove(LogRows const& rows, int row)
+{
+    while (row >= 0 && !rows.isHeading(static_cast<size_t>(row)))
+        --row;
+    return row;
+}
+
 } // namespace
 
 LogView::LogView(LogModel* model, QWidget* parent)
@@ -143,6 +151,8 @@ void LogView::keyPressEvent(QKeyEvent* event)
 {
     const bool isSideways = event->key() == Qt::Key_Left || event->key() == Qt::Key_Right;
     if (isSideways && foldByKey(event->key() == Qt::Key_Left))
+        return;
+    if (event->key() == Qt::Key_Left && event->modifiers() == Qt::NoModifier && goToHeading())
         return;
     const QScopedValueRollback<bool> guard(m_goesSideways, isSideways);
     const bool isEnd = event->key() == Qt::Key_Home || event->key() == Qt::Key_End;
@@ -404,6 +414,22 @@ void LogView::mousePressEvent(QMouseEvent* event)
     WrappingTable::mousePressEvent(event);
     if (isOnRepeats)
         setRepeatsOpen(row, !m_model->AreRepeatsOpen(row));
+}
+
+// As in a tree, but only where the key has nothing left to scroll. A run may have millions of
+// lines, and how it ended is said at its other end.
+bool LogView::goToHeading()
+{
+    QScrollBar const* across = horizontalScrollBar();
+    const int leftmost = isRightToLeft() ? across->maximum() : across->minimum();
+    if (across->value() != leftmost || m_model->rowCount() == 0)
+        return false;
+    const int row = currentIndex().isValid() ? CurrentRow() : m_model->RowAt(lastRowInView());
+    const int heading = HeadingAbove(*m_model->state().rows, row);
+    if (heading < 0)
+        return false;
+    GoToRow(heading);
+    return true;
 }
 
 void LogView::noteCurrent()
