@@ -111,6 +111,8 @@ private slots:
     void foldingWithKeys();
     void leftGoesToTheHeading();
     void leftScrollsFirst();
+    void rightGoesToTheEndOfTheRun();
+    void currentHeadingHasAFrame();
     void foldingOfTheNewest();
     void foldingWhilePaused();
     void filter();
@@ -278,6 +280,46 @@ void tst_AllFilesInWindow::leftScrollsFirst()
     across->setValue(across->minimum());
     QTest::keyClick(view, Qt::Key_Left);
     QCOMPARE(view->currentIndex().row(), HeadingRow(*window, "03-03"));
+}
+
+void tst_AllFilesInWindow::rightGoesToTheEndOfTheRun()
+{
+    const WindowTest test;
+    WriteFiles(test.logFile());
+    const auto window = WindowTest::show();
+    ShowAll(*window);
+    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    LogView* view = View(*window);
+    view->setFocus();
+    for (char const* last : {"j", "h", "f", "d", "b"}) {
+        view->GoToRow(RowOf(*window, last));
+        QTest::keyClick(view, Qt::Key_Left);
+        QVERIFY(Panel(*window)->model()->IsFoldable(view->currentIndex().row()));
+        QTest::keyClick(view, Qt::Key_Right);
+        QCOMPARE(view->currentIndex().row(), RowOf(*window, last));
+    }
+    QCOMPARE(Shown(*window), All);
+}
+
+// A heading cannot be selected, so it has no background that tells.
+void tst_AllFilesInWindow::currentHeadingHasAFrame()
+{
+    const WindowTest test;
+    WriteFiles(test.logFile());
+    const auto window = WindowTest::show();
+    ShowAll(*window);
+    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    LogView* view = View(*window);
+    view->setFocus();
+    QTRY_VERIFY_WITH_TIMEOUT(view->hasFocus(), Patience);
+    view->GoToRow(RowOf(*window, "f"));
+    const int heading = HeadingRow(*window, "03-03");
+    const QRect place = view->visualRect(view->model()->index(heading, 0));
+    const QImage before = view->viewport()->grab(place).toImage();
+    QTest::keyClick(view, Qt::Key_Left);
+    QCOMPARE(view->currentIndex().row(), heading);
+    const QRect now = view->visualRect(view->model()->index(heading, 0));
+    QVERIFY(view->viewport()->grab(now).toImage() != before);
 }
 
 void tst_AllFilesInWindow::foldingOfTheNewest()

@@ -414,6 +414,9 @@ void LogDelegate::paintHeading(QPainter* painter, QStyleOptionViewItem const& op
         QStyleOptionFocusRect focus;
         focus.QStyleOption::operator=(option);
         focus.backgroundColor = background;
+        // It is not selected, so without the frame nobody could tell that it is the current row;
+        // many styles draw one only after Tab.
+        focus.state |= QStyle::State_KeyboardFocusChange;
         StyleOf(option)->drawPrimitive(QStyle::PE_FrameFocusRect, &focus, painter, option.widget);
     }
     painter->restore();

@@ -375,7 +375,7 @@ bool LogView::foldByKey(bool folded)
 {
     const int row = CurrentRow();
     if (m_model->IsFoldable(row)) {
-        fold(row, folded);
+        foldOrGoToEnd(row, folded);
         return true;
     }
     if (!m_model->RepeatsOf(row) || m_model->AreRepeatsOpen(row) != folded)
@@ -416,6 +416,20 @@ void LogView::mousePressEvent(QMouseEvent* event)
         setRepeatsOpen(row, !m_model->AreRepeatsOpen(row));
 }
 
+// Of a run whose lines are shown already, what it logged last is wanted most.
+void LogView::foldOrGoToEnd(int heading, bool folded)
+{
+    if (folded || m_model->IsFolded(heading)) {
+        fold(heading, folded);
+        return;
+    }
+    int last = heading;
+    while (last + 1 < m_model->logRowCount() && !m_model->IsFoldable(last + 1))
+        ++last;
+    if (last > heading)
+        GoToRow(m_model->RowAt(m_model->TableRowOf(last))); // without opening repeats
+}
+
 // As in a tree, but only where the key has nothing left to scroll. A run may have millions of
 // lines, and how it ended is said at its other end.
 bool LogView::goToHeading()
@@ -449,8 +463,8 @@ void LogView::noteCurrent()
     m_keptDistance = qBound(0, tableRow - rowAt(0), std::max(0, visible));
 }
 
-// The row of the line that was current or, if that is filtered out, the nearest one. If the file
-// was replaced, the line may be at another place of it; -1 if it is gone.
+// The row of the line that was current or, if that is filtered out, the nearest one. If the
+// file was replaced, the line may be at another place of it; -1 if it is gone.
 int LogView::keptRow(qint64 start) const
 {
     LogRows const& rows = *m_model->state().rows;
@@ -506,8 +520,8 @@ void LogView::restoreCurrent()
         scrollTo(index); // the rows above it may be higher than before
 }
 
-// Other programs' stamps may be longer than the log's own. Once for a file, or users could not make
-// the column narrow.
+// Other programs' stamps may be longer than the log's own. Once for a file, or users could not
+// make the column narrow.
 void LogView::fitTimes()
 {
     LogUpdate const& state = m_model->state();

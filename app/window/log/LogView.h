@@ -147,6 +147,7 @@ private:
     void fold(int row, bool folded);
     bool foldByKey(bool folded);
     void setRepeatsOpen(int row, bool open);
+    void foldOrGoToEnd(int heading, bool folded);
     bool goToHeading();
     int keptRow(qint64 start) const;
     void restoreCurrent();
