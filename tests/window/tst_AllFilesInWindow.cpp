@@ -111,6 +111,7 @@ private slots:
     void foldingWithKeys();
     void leftGoesToTheHeading();
     void leftScrollsFirst();
+    void leftStaysWithoutHeadings();
     void rightGoesToTheEndOfTheRun();
     void currentHeadingHasAFrame();
     void foldingOfTheNewest();
@@ -280,6 +281,19 @@ void tst_AllFilesInWindow::leftScrollsFirst()
     across->setValue(across->minimum());
     QTest::keyClick(view, Qt::Key_Left);
     QCOMPARE(view->currentIndex().row(), HeadingRow(*window, "03-03"));
+}
+
+void tst_AllFilesInWindow::leftStaysWithoutHeadings()
+{
+    const WindowTest test;
+    TestFiles::write(test.logFile(), Run("2025-03-05", "ij"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), QString("ij"), Patience);
+    LogView* view = View(*window);
+    view->setFocus();
+    view->GoToRow(RowOf(*window, "j"));
+    QTest::keyClick(view, Qt::Key_Left);
+    QCOMPARE(view->currentIndex().row(), RowOf(*window, "j"));
 }
 
 void tst_AllFilesInWindow::rightGoesToTheEndOfTheRun()

@@ -64,6 +64,7 @@ class tst_FindingFailures : public WindowTestCase
 
 private slots:
     void crashTwoRunsAgo();
+    void crashWithoutAWord();
     void programsThatQuarrel();
     void warningsThatGrow();
 };
@@ -84,6 +85,35 @@ void tst_FindingFailures::crashTwoRunsAgo()
     QTest::keyClick(window.get(), Qt::Key_F8, Qt::ShiftModifier);
     QTRY_COMPARE_WITH_TIMEOUT(Current(*window), QString("Out of ink"), Patience);
     QTest::keyClick(View(*window), Qt::Key_Up); // what led to it
+    QCOMPARE(Current(*window), QString("Page 50 laid out"));
+}
+
+// No problem was logged, so only the runs lead to it.
+void tst_FindingFailures::crashWithoutAWord()
+{
+    const WindowTest test;
+    TestFiles::write(test.logFile() + ".2", QuietRun("01") +
+                                                Line("01", 52, "Trace", "Page 50 laid out") +
+                                                Line("01", 55, "Trace", "Opening page 51"));
+    TestFiles::write(test.logFile() + ".1", QuietRun("02"));
+    TestFiles::write(test.logFile(), QuietRun("03"));
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 50, Patience);
+    QTest::keyClick(window.get(), Qt::Key_A, Qt::ControlModifier | Qt::ShiftModifier);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 155, Patience); // with three headings
+    LogView* view = View(*window);
+    view->setFocus();
+    for (char const* day : {"2025-03-03", "2025-03-02", "2025-03-01"}) {
+        QTest::keyClick(view, Qt::Key_Left);
+        const QString heading =
+            view->currentIndex().sibling(view->currentIndex().row(), 0).data().toString();
+        QVERIFY2(heading.contains(day), qPrintable(heading));
+        if (day != QByteArray("2025-03-01"))
+            QTest::keyClick(view, Qt::Key_Up);
+    }
+    QTest::keyClick(view, Qt::Key_Right);
+    QCOMPARE(Current(*window), QString("Opening page 51"));
+    QTest::keyClick(view, Qt::Key_Up);
     QCOMPARE(Current(*window), QString("Page 50 laid out"));
 }
 
