@@ -390,6 +390,8 @@ void tst_SettingsByKind::separatorIsNoName()
         QPushButton const* ok = OkButton(dialog);
         auto const* problem = Child<QLabel>(dialog, "Problem with the files");
         const auto type = [&](QString const& text) {
+            // With the keyboard focus, the list gets a current item.
+            QTRY_VERIFY_WITH_TIMEOUT(list->currentIndex().isValid(), Patience);
             QTest::keyClick(list, Qt::Key_F2);
             QTRY_VERIFY_WITH_TIMEOUT(list->findChild<QLineEdit*>(), Patience);
             QTest::keyClicks(list->findChild<QLineEdit*>(), text);
