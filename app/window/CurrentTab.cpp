@@ -75,7 +75,7 @@ void CurrentTab::announceProblems()
     if (!m_log || m_newProblems == 0)
         return;
     LogModel const* model = m_log->model();
-    const int row = model->FindProblem(model->rowCount(), -1);
+    const int row = model->FindProblem(model->logRowCount(), -1);
     const QString last = row < 0 ? QString() : model->MessageText(row);
     Announcer::Say(m_window, tr("%Ln new problem(s): %1", nullptr, static_cast<int>(m_newProblems))
                                  .arg(Shortened(last, MaximumNewsLength)));

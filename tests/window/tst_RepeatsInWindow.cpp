@@ -119,6 +119,7 @@ private slots:
     void foundAmongHiddenRows();
     void problems();
     void marks();
+    void marksBelowAGroup();
     void copiesAllRows();
     void savesAllRows();
     void filters();
@@ -368,6 +369,21 @@ void tst_RepeatsInWindow::marks()
     QTest::keyClick(window.get(), Qt::Key_F2, Qt::ShiftModifier);
     QCOMPARE(Rows(*window), AllRows);
     QCOMPARE(TableRow(*window), 3);
+}
+
+// There are fewer rows in the table than the number of this one in the log.
+void tst_RepeatsInWindow::marksBelowAGroup()
+{
+    const WindowTest test(Log());
+    const auto window = WindowTest::show();
+    Fold(*window);
+    const int last = FoldedRowCount - 1;
+    QTest::keyClick(View(*window), Qt::Key_End);
+    QCOMPARE(TableRow(*window), last);
+    QTest::keyClick(window.get(), Qt::Key_M, Qt::ControlModifier);
+    QVERIFY(Data(*window, last, LogModel::TimeColumn, LogModel::MarkedRole).toBool());
+    QTest::keyClick(window.get(), Qt::Key_M, Qt::ControlModifier);
+    QVERIFY(!Data(*window, last, LogModel::TimeColumn, LogModel::MarkedRole).toBool());
 }
 
 void tst_RepeatsInWindow::copiesAllRows()

@@ -147,7 +147,7 @@ void LogMarks::addRows(std::vector<int>& rows, int from) const
 
 int LogMarks::indexOf(int row) const
 {
-    if (row < 0 || row >= m_model->rowCount())
+    if (row < 0 || row >= m_model->logRowCount())
         return -1;
     const qint64 start = m_model->LineStart(row);
     for (int i = 0; i < m_marks.size(); ++i) {
