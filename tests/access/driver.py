@@ -239,12 +239,12 @@ class News:
     def forget(self):
         self.changes.clear()
 
-    def of(self, name):
-        """What the next part of this name announces."""
+    def of(self, name, known=None):
+        """What the next part of this name announces, other than what is known: that may be late."""
 
         def said():
             for part, _ in self.changes:
-                if part.name == name and part.description:
+                if part.name == name and part.description not in ("", known):
                     return part.description
             return None
 
