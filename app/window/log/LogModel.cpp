@@ -223,7 +223,8 @@ void LogModel::applyChange(HistoryUpdate const& update)
 {
     const FoldedRows folded = foldedRows(update);
     const auto tail = static_cast<int>(update.changedTail);
-    const int size = logRowCount() + static_cast<int>(update.inserted - update.removed);
+    const int size = logRowCount() + static_cast<int>(update.inserted) -
+                     static_cast<int>(update.removed); // without new rows at the end
     const FoldedRows::Change change =
         FoldedRows::ChangeOf(m_folded, folded,
                              {static_cast<int>(update.changeAt), static_cast<int>(update.removed),
