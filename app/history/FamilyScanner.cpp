@@ -81,7 +81,7 @@ private:
 
 FamilyScanner::FamilyScanner(QObject* parent)
     : QObject(parent), m_reportTimer(new QTimer(this)), m_rows(std::make_shared<LogRows>()),
-      m_repeats([this] { return isCurrentRequest(); })
+      m_repeats([this] { return isCurrentRequest() && m_findsRepeats; })
 {
     qRegisterMetaType<HistoryUpdate>();
     qRegisterMetaType<LogFilter>();
@@ -436,9 +436,15 @@ void FamilyScanner::report(bool isFolding)
 
 void FamilyScanner::SetFindsRepeats(bool finds)
 {
-    if (finds == m_findsRepeats)
-        return;
     m_findsRepeats = finds;
+    QMetaObject::invokeMethod(this, "updateRepeats");
+}
+
+// Of several changes, only the last one counts.
+void FamilyScanner::updateRepeats()
+{
+    if (m_findsRepeats == bool(m_sent.repeats))
+        return;
     if (!m_sent.rows || m_sent.isPartial || m_sent.request != m_currentRequest)
         return; // the next report will show it
     HistoryUpdate update = m_sent;
@@ -447,23 +453,35 @@ void FamilyScanner::SetFindsRepeats(bool finds)
     send(update);
 }
 
-// While a file is still being read, its rows are shown without looking at them twice.
+// While a file is still being read, its rows are shown without looking at them twice; only what is
+// added to rows that are known is compared at once. A file of several parts takes a while, so all
+// of its rows are shown before they are compared.
 void FamilyScanner::send(HistoryUpdate update)
 {
     update.repeats.reset();
-    if (!m_findsRepeats || update.isPartial) {
+    if (update.isReset)
         m_repeats.Forget();
-    } else {
-        LogSource source(m_logs.front()->log.path, update.older);
-        source.logs = update.logs;
-        LogLineParser parser = m_parser;
-        parser.SetFileType(update.type);
-        update.repeats = m_repeats.Of(update, source, parser);
-        if (!update.repeats)
+    const bool hasParts = m_sent.isPartial && m_sent.request == update.request;
+    if (!m_findsRepeats) {
+        m_repeats.Forget();
+    } else if (m_repeats.isKnown() || !(update.isPartial || hasParts)) {
+        findRepeats(update);
+        if (!update.repeats && !isCurrentRequest())
             return; // another request follows
     }
     m_sent = update;
     Q_EMIT updated(update);
+    if (hasParts)
+        updateRepeats();
+}
+
+void FamilyScanner::findRepeats(HistoryUpdate& update)
+{
+    LogSource source(m_logs.front()->log.path, update.older);
+    source.logs = update.logs;
+    LogLineParser parser = m_parser;
+    parser.SetFileType(update.type);
+    update.repeats = m_repeats.Of(update, source, parser);
 }
 
 } // namespace Velocor

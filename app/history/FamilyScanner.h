@@ -35,8 +35,8 @@ struct FamilyLines;
 /// order of the logs. They have no headings, and the offsets of a LogSource with several logs.
 ///
 /// Works as a HistoryScanner does: in a thread of its own, with numbered requests.
-/// SetCurrentRequest() and NoteTaken() may be called from any thread, everything else only from the
-/// scanner's.
+/// SetCurrentRequest(), NoteTaken() and SetFindsRepeats() may be called from any thread, everything
+/// else only from the scanner's.
 class FamilyScanner : public QObject
 {
     Q_OBJECT
@@ -50,6 +50,9 @@ public:
 
     /// See LogScanner::NoteTaken().
     void NoteTaken();
+
+    /// Whether updates tell which rows repeat each other. All rows are then read; false stops that.
+    void SetFindsRepeats(bool finds);
 
 public Q_SLOTS:
     /// Reads one log; see HistoryScanner::Open().
@@ -79,15 +82,13 @@ public Q_SLOTS:
     /// See HistoryScanner::SetFolded(). Several logs have no runs to fold.
     void SetFolded(quint64 run, bool folded);
 
-    /// Whether updates tell which rows repeat each other. All rows are then read.
-    void SetFindsRepeats(bool finds);
-
 Q_SIGNALS:
     void updated(Velocor::HistoryUpdate const& update);
     void progressed(int request, int percent);
 
 private Q_SLOTS:
     void reportPending();
+    void updateRepeats();
 
 private:
     struct Log;
@@ -105,6 +106,7 @@ private:
     std::vector<FamilyLines> linesOfLogs() const;
     HistoryUpdate summary() const;
     void send(HistoryUpdate update);
+    void findRepeats(HistoryUpdate& update);
 
     std::atomic<int> m_currentRequest{0};
     std::atomic<bool> m_isTaken{true};
@@ -124,7 +126,7 @@ private:
     LineTable m_lines; // of all logs, one after the other
     std::shared_ptr<LogRows const> m_rows;
 
-    bool m_findsRepeats = false;
+    std::atomic<bool> m_findsRepeats{false};
     RepeatGroups m_repeats;
     HistoryUpdate m_sent; // last
 };

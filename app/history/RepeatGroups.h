@@ -40,6 +40,9 @@ public:
     std::shared_ptr<List const> Of(LogUpdate const& update, LogSource const& source,
                                    LogLineParser const& parser);
 
+    /// Whether the next call need not read all rows, unless its update is a reset.
+    bool isKnown() const { return bool(m_groups); }
+
     /// Makes the next call read all rows.
     // Cppcheck does not see that the groups are a member.
     // cppcheck-suppress functionStatic

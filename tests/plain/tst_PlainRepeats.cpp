@@ -104,7 +104,7 @@ void tst_PlainRepeats::compare(HistoryUpdate const& update)
         QVERIFY(update.isReset);
     m_update = update;
     m_changes += !update.isReset;
-    QCOMPARE(bool(update.repeats), m_isFinding && !update.isPartial);
+    QVERIFY(update.isPartial || bool(update.repeats) == m_isFinding);
     if (!update.repeats)
         return;
     const std::vector<RepeatGroup> expected = repeats(update);

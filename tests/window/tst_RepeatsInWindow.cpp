@@ -90,6 +90,19 @@ void ClickRow(LogView* view, int row, int x)
                       QPoint(cell.left() + x, cell.center().y()));
 }
 
+// Read and compared in parts, for a while. Nothing in it is repeated.
+QByteArray LargeLog()
+{
+    QByteArray large;
+    for (int i = 0; i < 100000; ++i)
+        large += entry("09:00:00.000", "Trace", i % 2 ? "a page" : "a sheet");
+    for (int i = 0; i < 3; ++i)
+        large += large;
+    return large;
+}
+
+constexpr int LargeRows = 800000;
+
 bool Append(WindowTest const& test, QByteArray const& lines)
 {
     return TestFiles::writeOver(test.logFile(), TestFiles::read(test.logFile()) + lines);
@@ -134,6 +147,8 @@ private slots:
     void goesToALineOfTheNewestFile();
     void whatWasOpenInAnotherFile();
     void whileALargeFileIsRead();
+    void whileALargeFileGrows();
+    void changesOfMind();
     void kept();
 };
 
@@ -612,27 +627,66 @@ void tst_RepeatsInWindow::whatWasOpenInAnotherFile()
 void tst_RepeatsInWindow::whileALargeFileIsRead()
 {
     const WindowTest test(Log());
-    QByteArray large;
-    for (int i = 0; i < 100000; ++i)
-        large += entry("09:00:00.000", "Trace", i % 2 ? "a page" : "a sheet");
-    for (int i = 0; i < 3; ++i)
-        large += large;
+    const QByteArray large = LargeLog();
     QVERIFY(TestFiles::write(test.folder() + "large.log", Log() + large + Log()));
     const auto window = WindowTest::show();
     Fold(*window);
     bool wasPartial = false;
+    bool wasUnfolded = false;
     window->OpenFile(test.folder() + "large.log");
     connect(Panel(*window)->model(), &LogModel::refreshed, this, [&] {
+        wasUnfolded = wasUnfolded || Rows(*window) == LargeRows + 2 * AllRows;
         if (!wasPartial && Panel(*window)->model()->state().isPartial)
             View(*window)->GoToRow(AllRows - 1);
         wasPartial = wasPartial || Panel(*window)->model()->state().isPartial;
     });
-    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), 800000 + 2 * FoldedRowCount, Patience);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), LargeRows + 2 * FoldedRowCount, Patience);
     QVERIFY(wasPartial);
+    QVERIFY(wasUnfolded); // all rows, before they have been compared
     QCOMPARE(Message(*window, TableRow(*window)), QString("end"));
     QCOMPARE(TableRow(*window), FoldedRowCount - 1);
     QCOMPARE(Repeats(*window, Group), QString("\u25b8 5\u00d7"));
     QCOMPARE(Message(*window, Rows(*window) - 1), QString("end"));
+}
+
+// What is folded stays so, even if what was added is read in parts.
+void tst_RepeatsInWindow::whileALargeFileGrows()
+{
+    const WindowTest test(Log());
+    const auto window = WindowTest::show();
+    Fold(*window);
+    bool wasPartial = false;
+    bool wasUnfolded = false;
+    LogModel* model = Panel(*window)->model();
+    connect(model, &LogModel::refreshed, this, [&] {
+        wasPartial = wasPartial || model->state().isPartial;
+        wasUnfolded = wasUnfolded || !model->state().repeats;
+    });
+    QFile log(test.logFile());
+    QVERIFY(log.open(QIODevice::Append));
+    log.write(LargeLog() + Log());
+    log.close();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), LargeRows + 2 * FoldedRowCount, Patience);
+    QVERIFY(wasPartial);
+    QVERIFY(!wasUnfolded);
+}
+
+// Switching it off stops the comparison, so that many changes do not take their number of times.
+void tst_RepeatsInWindow::changesOfMind()
+{
+    const WindowTest test(Log() + LargeLog());
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), LargeRows + AllRows, Patience);
+    constexpr int Changes = 21;
+    int compared = 0;
+    LogModel* model = Panel(*window)->model();
+    connect(model, &LogModel::refreshed, this, [&] { compared += bool(model->state().repeats); });
+    for (int i = 0; i < Changes; ++i)
+        ToggleRepeats(*window);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), LargeRows + FoldedRowCount, Patience);
+    ToggleRepeats(*window);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), LargeRows + AllRows, Patience);
+    QVERIFY(compared < Changes / 2);
 }
 
 // The number takes some of the width of a message.

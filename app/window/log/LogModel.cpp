@@ -83,7 +83,6 @@ void LogModel::startScanner()
     connect(this, &LogModel::familyRequested, m_scanner, &FamilyScanner::OpenFamily);
     connect(this, &LogModel::hideRequested, m_scanner, &FamilyScanner::SetHidden);
     connect(this, &LogModel::foldRequested, m_scanner, &FamilyScanner::SetFolded);
-    connect(this, &LogModel::repeatsRequested, m_scanner, &FamilyScanner::SetFindsRepeats);
     connect(this, &LogModel::watchRequested, m_scanner, &FamilyScanner::SetWatched);
     connect(this, &LogModel::pollRequested, m_scanner, &FamilyScanner::Poll);
     connect(m_scanner, &FamilyScanner::updated, this, &LogModel::take);
@@ -93,7 +92,7 @@ void LogModel::startScanner()
     });
     m_thread.start();
     Q_EMIT watchRequested(!m_paused);
-    Q_EMIT repeatsRequested(m_foldsRepeats);
+    m_scanner->SetFindsRepeats(m_foldsRepeats);
 }
 
 void LogModel::setFile(QString const& path, LogLineParser const& parser, bool isCurrent)
@@ -287,7 +286,7 @@ void LogModel::SetFoldsRepeats(bool folds)
         return;
     m_foldsRepeats = folds;
     if (m_scanner)
-        Q_EMIT repeatsRequested(folds);
+        m_scanner->SetFindsRepeats(folds);
 }
 
 bool LogModel::AreRepeatsOpen(int row) const

@@ -238,7 +238,6 @@ Q_SIGNALS:
                          QSet<QString> const& hidden);
     void hideRequested(QSet<QString> const& hidden);
     void foldRequested(quint64 run, bool folded);
-    void repeatsRequested(bool wanted);
     void filterRequested(int request, Velocor::LogFilter const& filter);
     void watchRequested(bool watched);
     void pollRequested();
