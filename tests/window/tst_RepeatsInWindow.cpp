@@ -140,6 +140,7 @@ private slots:
     void lineNumbers();
     void goesToAHiddenLine();
     void inWords();
+    void numberIsNotMirrored();
     void ticksBesideTheScrollBar();
     void wrapped();
     void wrappedBesideTheNumber();
@@ -507,6 +508,26 @@ void tst_RepeatsInWindow::inWords()
 }
 
 // A tick is where its row is among those that are shown.
+// Nor is the rest of the table: lines of a log are in English.
+void tst_RepeatsInWindow::numberIsNotMirrored()
+{
+    const WindowTest test(Log());
+    const auto window = WindowTest::show();
+    Fold(*window);
+    LogView* view = View(*window);
+    const auto number = [&] {
+        const QRect cell = MessageCell(view, Group);
+        return view->viewport()
+            ->grab(LogDelegate::RepeatsArea(Repeats(*window, Group), view->font(), cell))
+            .toImage();
+    };
+    const QImage usual = number();
+    QApplication::setLayoutDirection(Qt::RightToLeft);
+    const QImage mirrored = number();
+    QApplication::setLayoutDirection(Qt::LeftToRight);
+    QCOMPARE(mirrored, usual);
+}
+
 void tst_RepeatsInWindow::ticksBesideTheScrollBar()
 {
     QByteArray log;

@@ -355,6 +355,7 @@ void LogDelegate::paintGap(QPainter* painter, QStyleOptionViewItem const& option
                          std::min(option.rect.height(), RowHeight(option.fontMetrics)));
         painter->setPen(Faded(text, ground));
         painter->setFont(option.font);
+        painter->setLayoutDirection(option.direction);
         painter->drawText(area, Qt::AlignCenter, gap);
     }
     painter->restore();
@@ -386,6 +387,7 @@ void LogDelegate::paintRepeats(QPainter* painter, QStyleOptionViewItem const& op
     painter->drawRoundedRect(area, RepeatsMargin, RepeatsMargin);
     painter->setPen(text);
     painter->setFont(option.font);
+    painter->setLayoutDirection(option.direction);
     painter->drawText(area, Qt::AlignCenter, repeats);
     painter->restore();
 }
