@@ -128,6 +128,8 @@ private slots:
     void grows();
     void keepsWhatIsOpen();
     void keepsTheCurrentLine();
+    void keepsWhatIsInView_data();
+    void keepsWhatIsInView();
     void whilePaused();
     void foundAmongHiddenRows();
     void problems();
@@ -318,6 +320,38 @@ void tst_RepeatsInWindow::keepsTheCurrentLine()
     ToggleRepeats(*window);
     QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), FoldedRowCount, Patience);
     QCOMPARE(TableRow(*window), Group);
+}
+
+void tst_RepeatsInWindow::keepsWhatIsInView_data()
+{
+    QTest::addColumn<bool>("hasCurrent");
+    QTest::newRow("no line is current") << false;
+    QTest::newRow("the current line is not in view") << true;
+}
+
+void tst_RepeatsInWindow::keepsWhatIsInView()
+{
+    QFETCH(const bool, hasCurrent);
+    constexpr int Groups = 40;
+    constexpr int Top = 25;
+    QByteArray log;
+    for (int i = 0; i < Groups; ++i)
+        log += Log();
+    const WindowTest test(log);
+    const auto window = WindowTest::show();
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), Groups * AllRows, Patience);
+    LogView* view = View(*window);
+    if (hasCurrent)
+        view->GoToRow(0);
+    view->verticalScrollBar()->setValue(Top * AllRows);
+    QCOMPARE(view->rowAt(0), Top * AllRows);
+    ToggleRepeats(*window);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), Groups * FoldedRowCount, Patience);
+    QCOMPARE(view->rowAt(0), Top * FoldedRowCount);
+    ToggleRepeats(*window);
+    QTRY_COMPARE_WITH_TIMEOUT(Rows(*window), Groups * AllRows, Patience);
+    QCOMPARE(view->rowAt(0), Top * AllRows);
+    QCOMPARE(TableRow(*window), hasCurrent ? 0 : -1);
 }
 
 void tst_RepeatsInWindow::whilePaused()

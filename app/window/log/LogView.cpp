@@ -20,6 +20,7 @@
 #include <QStyle>
 
 #include <algorithm>
+#include <utility>
 
 namespace Velocor {
 
@@ -343,6 +344,7 @@ void LogView::afterRefresh()
     if (isWrapped() && m_hasOtherRows)
         updateGeometries(); // a last line may have got longer
     restoreCurrent();
+    restoreTop();
     if (m_following && m_hasOtherRows)
         goToEnd();
     if (m_hasOtherRows)
@@ -449,6 +451,8 @@ bool LogView::goToHeading()
 void LogView::noteCurrent()
 {
     m_hasOtherRows = true;
+    const int top = rowAt(0);
+    m_topStart = m_following || top < 0 ? -1 : m_model->LineStart(m_model->RowAt(top));
     const int row = CurrentRow();
     m_keepsHeading = m_model->IsFoldable(row) && m_model->LineStart(row) == LogRows::NewestHeading;
     if (row < 0 || m_model->LineStart(row) < 0)
@@ -459,8 +463,10 @@ void LogView::noteCurrent()
     m_keptText = m_currentText;
     const int tableRow = currentIndex().row();
     const int visible = viewport()->height() / std::max(1, rowHeight(tableRow)) - 1;
-    m_wasInView = tableRow >= rowAt(0) && tableRow <= rowAt(0) + visible;
-    m_keptDistance = qBound(0, tableRow - rowAt(0), std::max(0, visible));
+    m_wasInView = tableRow >= top && tableRow <= top + visible;
+    m_keptDistance = qBound(0, tableRow - top, std::max(0, visible));
+    if (m_wasInView)
+        m_topStart = -1;
 }
 
 // The row of the line that was current or, if that is filtered out, the nearest one. If the
@@ -518,6 +524,17 @@ void LogView::restoreCurrent()
     verticalScrollBar()->setValue(tableRow - m_keptDistance);
     if (isWrapped())
         scrollTo(index); // the rows above it may be higher than before
+}
+
+// Folded or not, the lines are the same. Without the current one among those in view, the first of
+// these stays in its place.
+void LogView::restoreTop()
+{
+    const qint64 start = std::exchange(m_topStart, -1);
+    if (start < 0 || m_following || !m_model->state().isFolding)
+        return;
+    updateGeometries(); // updates the scroll bar's range
+    verticalScrollBar()->setValue(m_model->TableRowOf(m_model->RowNear(start)));
 }
 
 // Other programs' stamps may be longer than the log's own. Once for a file, or users could not

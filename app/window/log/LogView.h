@@ -151,6 +151,7 @@ private:
     bool goToHeading();
     int keptRow(qint64 start) const;
     void restoreCurrent();
+    void restoreTop();
     int firstColumn() const;
     int lastRowInView() const;
     void select(QModelIndex const& index);
@@ -173,6 +174,7 @@ private:
     QString m_keptPath;
     QString m_keptText;
     qint64 m_keptStart = -1;
+    qint64 m_topStart = -1;      // of the first row in view, unless the current one is kept there
     bool m_keepsHeading = false; // of the newest run
     quint16 m_keptCheck = 0;
     int m_keptDistance = 0;
