@@ -50,6 +50,22 @@ def problem(program, news):
         yield "its row", run.row(200), "2025-03-03 09:04:00.000 Error the disk is full"
 
 
+def problem_below_repeats(program, _news):
+    with running(program, {"a.log": LOG}) as run:
+        wait("all lines are read", lambda: run.rows() == 200)
+        run.keys("ctrl+alt+r")
+        wait("repeats are folded", lambda: run.rows() < 200)
+        with open(os.path.join(run.folder, "a.log"), "ab") as log:
+            log.write(b"2025-03-03 09:04:00.000 Error the disk is full\n")
+
+        def notified():  # it never shows
+            parts = (part for window in run.windows() for part in window.children())
+            return next((part.name for part in parts if part.role == "notification"), None)
+
+        said = wait("a notification", notified)
+        yield "a new problem below repeats", said, "1 new problem: the disk is full"
+
+
 def settings(program, news):
     with running(program, {"some.cfg": SETTINGS}) as run:
         wait("the settings", lambda: run.table("Settings"))
@@ -63,7 +79,7 @@ def main():
     program = os.path.abspath(sys.argv[1])
     news = News()
     failed = False
-    for part in (rows, hit, problem, settings):
+    for part in (rows, hit, problem, problem_below_repeats, settings):
         for what, said, expected in part(program, news):
             print(f"{'PASS  ' if said == expected else 'FAIL! '} {what}: {said!r}", flush=True)
             failed = failed or said != expected
