@@ -124,6 +124,7 @@ private slots:
     void opensWithKeys();
     void closesFromWithin();
     void opensWithTheMouse();
+    void twoQuickClicks();
     void opensAtTheEnd();
     void grows();
     void keepsWhatIsOpen();
@@ -241,6 +242,31 @@ void tst_RepeatsInWindow::opensWithTheMouse()
     QCOMPARE(TableRow(*window), Group);
     ClickRow(view, Group, width / 2);
     QCOMPARE(Rows(*window), FoldedRowCount);
+}
+
+// The second one opens and closes, too.
+void tst_RepeatsInWindow::twoQuickClicks()
+{
+    const WindowTest test(Log());
+    const auto window = WindowTest::show();
+    Fold(*window);
+    LogView* view = View(*window);
+    constexpr int InNumber = 10;
+    ClickRow(view, Group, InNumber);
+    QCOMPARE(Rows(*window), AllRows);
+    const QRect cell = MessageCell(view, Group);
+    const QPoint place(cell.left() + InNumber, cell.center().y());
+    const auto clickAgain = [&] {
+        QMouseEvent second(QEvent::MouseButtonDblClick, place, view->viewport()->mapToGlobal(place),
+                           Qt::LeftButton, Qt::LeftButton, Qt::NoModifier);
+        QApplication::sendEvent(view->viewport(), &second);
+        QTest::mouseRelease(view->viewport(), Qt::LeftButton, Qt::NoModifier, place);
+    };
+    clickAgain();
+    QCOMPARE(Rows(*window), FoldedRowCount);
+    clickAgain();
+    QCOMPARE(Rows(*window), AllRows);
+    QCOMPARE(TableRow(*window), Group);
 }
 
 // What was opened stays in view, although the view followed the newest entry.

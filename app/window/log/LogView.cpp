@@ -403,18 +403,33 @@ void LogView::setRepeatsOpen(int row, bool open)
     viewport()->update();
 }
 
+// The row whose number of repeats a click is on; -1 if it is elsewhere.
+int LogView::repeatsClicked(QMouseEvent const& event) const
+{
+    const QModelIndex cell = indexAt(event.pos());
+    const QString repeats = cell.data(LogModel::RepeatsRole).toString();
+    const bool isOnRepeats =
+        event.button() == Qt::LeftButton && !event.modifiers() &&
+        cell.column() == LogModel::MessageColumn && !repeats.isEmpty() &&
+        LogDelegate::RepeatsArea(repeats, font(), visualRect(cell)).contains(event.pos());
+    return isOnRepeats ? m_model->RowAt(cell.row()) : -1;
+}
+
 // Qt selects the row, whatever was clicked on.
 void LogView::mousePressEvent(QMouseEvent* event)
 {
-    const QModelIndex cell = indexAt(event->pos());
-    const int row = cell.isValid() ? m_model->RowAt(cell.row()) : -1;
-    const QString repeats = cell.data(LogModel::RepeatsRole).toString();
-    const bool isOnRepeats =
-        event->button() == Qt::LeftButton && !event->modifiers() &&
-        cell.column() == LogModel::MessageColumn && !repeats.isEmpty() &&
-        LogDelegate::RepeatsArea(repeats, font(), visualRect(cell)).contains(event->pos());
+    const int row = repeatsClicked(*event);
     WrappingTable::mousePressEvent(event);
-    if (isOnRepeats)
+    if (row >= 0)
+        setRepeatsOpen(row, !m_model->AreRepeatsOpen(row));
+}
+
+// Of two quick clicks, this is the second one.
+void LogView::mouseDoubleClickEvent(QMouseEvent* event)
+{
+    const int row = repeatsClicked(*event);
+    WrappingTable::mouseDoubleClickEvent(event);
+    if (row >= 0)
         setRepeatsOpen(row, !m_model->AreRepeatsOpen(row));
 }
 

@@ -126,6 +126,7 @@ protected:
     void paintEvent(QPaintEvent* event) override;
     void contextMenuEvent(QContextMenuEvent* event) override;
     void mousePressEvent(QMouseEvent* event) override;
+    void mouseDoubleClickEvent(QMouseEvent* event) override;
     void changeEvent(QEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
     void focusInEvent(QFocusEvent* event) override;
@@ -149,6 +150,7 @@ private:
     void setRepeatsOpen(int row, bool open);
     void foldOrGoToEnd(int heading, bool folded);
     bool goToHeading();
+    int repeatsClicked(QMouseEvent const& event) const;
     int keptRow(qint64 start) const;
     void restoreCurrent();
     void restoreTop();
