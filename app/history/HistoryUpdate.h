@@ -41,7 +41,8 @@ struct HistoryUpdate : LogUpdate
     QStringList unreadable; ///< paths of older files that cannot be read
     bool isFolding = false; ///< follows a wish to fold or unfold, not a change of the log
 
-    /// The rows that repeat each other, by their first rows; null if nobody wants to know.
+    /// The rows that repeat each other, by their first rows; null if that is not known,
+    /// because nobody has asked or not all rows have been compared yet.
     std::shared_ptr<std::vector<RepeatGroup> const> repeats;
 
     // If several logs are shown as one: their bytes, and what they are. The rows have no headings.

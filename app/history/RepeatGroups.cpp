@@ -61,11 +61,7 @@ public:
     }
 
 private:
-    bool continues(size_t row) const
-    {
-        const quint8 mark = m_rows.mark(row);
-        return (mark & LogRows::Continued) && !(mark & LogRows::Alone);
-    }
+    bool continues(size_t row) const { return LogRows::ContinuesEntry(m_rows.mark(row)); }
 
     // Null if the entry repeats nothing. The one before was asked for last.
     QString pattern(size_t first)

@@ -60,6 +60,9 @@ public:
                ((mark & Timed) || (mark & SeverityMask) != LogEntry::None);
     }
 
+    /// Whether a row with this mark belongs to the entry of the row above.
+    static bool ContinuesEntry(quint8 mark) { return (mark & Continued) && !(mark & Alone); }
+
     /// Whether a mark in a LineTable is that of a line that is continued, but not shown along with
     /// an entry.
     static bool IsAlone(quint8 mark) { return (mark & ContinuedAlone) == ContinuedAlone; }

@@ -566,8 +566,7 @@ QString LogModel::MessageWithProgram(int row) const
 QPair<int, int> LogModel::EntryRows(int row) const
 {
     const auto continues = [this](int other) {
-        const quint8 mark = m_state.rows->mark(static_cast<size_t>(other));
-        return (mark & LogRows::Continued) && !(mark & LogRows::Alone);
+        return LogRows::ContinuesEntry(m_state.rows->mark(static_cast<size_t>(other)));
     };
     int first = row;
     while (first > 0 && continues(first))

@@ -484,8 +484,8 @@ void LogView::noteCurrent()
         m_topStart = -1;
 }
 
-// The row of the line that was current or, if that is filtered out, the nearest one. If the
-// file was replaced, the line may be at another place of it; -1 if it is gone.
+// The row of the line that was current or, if that is filtered out, the nearest one. If the file
+// was replaced, the line may be at another place of it; -1 if it is gone.
 int LogView::keptRow(qint64 start) const
 {
     LogRows const& rows = *m_model->state().rows;
