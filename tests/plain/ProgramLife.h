@@ -119,6 +119,17 @@ public:
         }
     }
 
+    /// The same, with another time of modification for each step, by which changes are noticed.
+    void save(int step)
+    {
+        save();
+        QFile file(m_path);
+        if (!file.exists() || !file.open(QIODevice::ReadWrite))
+            return; // the log has been rotated, and nothing written since
+        const QDateTime modified = file.fileTime(QFileDevice::FileModificationTime);
+        file.setFileTime(modified.addMSecs(step), QFileDevice::FileModificationTime);
+    }
+
 private:
     int below(int limit) { return static_cast<int>(m_random() % static_cast<unsigned>(limit)); }
     bool chance(int oneIn) { return below(oneIn) == 0; }

@@ -4,9 +4,10 @@
 #pragma once
 
 #include <QByteArray>
-#include <QtGlobal>
+#include <QTest>
 
 #include <cstdio>
+#include <functional>
 #include <random>
 
 /// How many rounds a comparison with the plain version runs, and from which seed.
@@ -56,6 +57,23 @@ inline quint32 seed()
         return seed;
     }();
     return chosen;
+}
+
+/// Runs a test so many times, each with a seed of its own, until it fails; then tells which it was.
+///
+/// @return whether none has failed
+inline bool each(char const* what, int count, std::function<void(quint32 seed)> const& test)
+{
+    std::mt19937 random(seed());
+    for (int i = 0; i < count; ++i) {
+        const quint32 own = random();
+        test(own);
+        if (QTest::currentTestFailed()) {
+            qWarning("%s %d, of seed %u", what, i, own);
+            return false;
+        }
+    }
+    return true;
 }
 
 } // namespace Rounds

@@ -269,16 +269,9 @@ void tst_HistoryLives::live(quint32 seed)
 
 void tst_HistoryLives::randomLives()
 {
-    std::mt19937 random(Rounds::seed());
     const int count = Rounds::count(300, 10000, 100000);
-    for (int i = 0; i < count; ++i) {
-        const quint32 seed = random();
-        live(seed);
-        if (QTest::currentTestFailed()) {
-            qWarning("life %d, of seed %u", i, seed);
-            return;
-        }
-    }
+    if (!Rounds::each("life", count, [this](quint32 seed) { live(seed); }))
+        return;
     QVERIFY(m_lines > 20 * count);
     QVERIFY2(m_clearViews > m_views / 10, "the order can hardly ever be checked");
     QVERIFY2(m_clearMerges > count / 20, "the order by time can hardly ever be checked");

@@ -321,16 +321,9 @@ void tst_LogLives::live(quint32 seed)
 
 void tst_LogLives::randomLives()
 {
-    std::mt19937 random(Rounds::seed());
     const int count = Rounds::count(500, 20000);
-    for (int i = 0; i < count; ++i) {
-        const quint32 seed = random();
-        live(seed);
-        if (QTest::currentTestFailed()) {
-            qWarning("life %d, of seed %u", i, seed);
-            return;
-        }
-    }
+    if (!Rounds::each("life", count, [this](quint32 seed) { live(seed); }))
+        return;
     QVERIFY(m_lines > 100 * count);
     QVERIFY2(m_guesses < m_views / 20, "a clock that is set back is taken for a restart too often");
 }

@@ -96,6 +96,18 @@ void ClickRow(MainWindow& window, int row)
                       view->visualRect(view->model()->index(row, 0)).center());
 }
 
+// A window with the runs of all files.
+std::unique_ptr<MainWindow> ShowAllOf(WindowTest const& test)
+{
+    WriteFiles(test.logFile());
+    auto window = WindowTest::show();
+    ShowAll(*window);
+    [&] {
+        QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    }();
+    return window;
+}
+
 } // namespace
 
 class tst_AllFilesInWindow : public WindowTestCase
@@ -169,10 +181,7 @@ void tst_AllFilesInWindow::listShowsAll()
 void tst_AllFilesInWindow::headings()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     const QString dot = QStringLiteral("  %1  ").arg(QChar(0xb7));
     const QString arrow = QStringLiteral("%1  ").arg(QChar(0x25be));
     QCOMPARE(Heading(*window, "03-01"),
@@ -200,10 +209,7 @@ void tst_AllFilesInWindow::howRunsEnded()
 void tst_AllFilesInWindow::folding()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     ClickRow(*window, HeadingRow(*window, "03-02"));
     QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), QString("[01]ab[02][03]ef[04]restgh[05]ij"),
                               Patience);
@@ -223,10 +229,7 @@ void tst_AllFilesInWindow::folding()
 void tst_AllFilesInWindow::foldingWithKeys()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     LogView* view = View(*window);
     view->setFocus();
     view->GoToRow(RowOf(*window, "e"));
@@ -244,10 +247,7 @@ void tst_AllFilesInWindow::foldingWithKeys()
 void tst_AllFilesInWindow::leftGoesToTheHeading()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     LogView* view = View(*window);
     view->setFocus();
     QVERIFY(!view->currentIndex().isValid());
@@ -264,10 +264,7 @@ void tst_AllFilesInWindow::leftGoesToTheHeading()
 void tst_AllFilesInWindow::leftScrollsFirst()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     LogView* view = View(*window);
     view->setColumnWidth(LogModel::TimeColumn, 3 * view->width());
     QScrollBar* across = view->horizontalScrollBar();
@@ -299,10 +296,7 @@ void tst_AllFilesInWindow::leftStaysWithoutHeadings()
 void tst_AllFilesInWindow::rightGoesToTheEndOfTheRun()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     LogView* view = View(*window);
     view->setFocus();
     for (char const* last : {"j", "h", "f", "d", "b"}) {
@@ -319,10 +313,7 @@ void tst_AllFilesInWindow::rightGoesToTheEndOfTheRun()
 void tst_AllFilesInWindow::currentHeadingHasAFrame()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     LogView* view = View(*window);
     view->setFocus();
     QTRY_VERIFY_WITH_TIMEOUT(view->hasFocus(), Patience);
@@ -339,10 +330,7 @@ void tst_AllFilesInWindow::currentHeadingHasAFrame()
 void tst_AllFilesInWindow::foldingOfTheNewest()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     LogView* view = View(*window);
     view->setFocus();
     view->GoToRow(RowOf(*window, "i"));
@@ -358,10 +346,7 @@ void tst_AllFilesInWindow::foldingOfTheNewest()
 void tst_AllFilesInWindow::foldingWhilePaused()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     Panel(*window)->SetPaused(true);
     ClickRow(*window, HeadingRow(*window, "03-03"));
     QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), QString("[01]ab[02]restcd[03][04]restgh[05]ij"),
@@ -371,10 +356,7 @@ void tst_AllFilesInWindow::foldingWhilePaused()
 void tst_AllFilesInWindow::filter()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     auto* text = Child<QLineEdit>(window.get(), "Filter by text");
     text->setText("Trace"); // no line of the first and the last run
     QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), QString("[02]cd[03]ef[04]gh[05]"), Patience);
@@ -389,10 +371,7 @@ void tst_AllFilesInWindow::filter()
 void tst_AllFilesInWindow::find()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     View(*window)->GoToRow(0);
     Panel(*window)->OpenFind();
     auto* text = Child<QLineEdit>(window.get(), "Find text");
@@ -412,10 +391,7 @@ void tst_AllFilesInWindow::find()
 void tst_AllFilesInWindow::problems()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     View(*window)->GoToRow(RowOf(*window, "b"));
     QTest::keyClick(window.get(), Qt::Key_F8);
     QCOMPARE(View(*window)->currentIndex().row(), RowOf(*window, "i"));
@@ -427,10 +403,7 @@ void tst_AllFilesInWindow::problems()
 void tst_AllFilesInWindow::activity()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     QTest::keyClick(window.get(), Qt::Key_A, Qt::ControlModifier | Qt::AltModifier);
     auto* strip = Panel(*window)->findChild<ActivityStrip*>();
     QVector<int> busy;
@@ -458,10 +431,7 @@ void tst_AllFilesInWindow::activity()
 void tst_AllFilesInWindow::copied()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     View(*window)->setFocus();
     View(*window)->selectAll();
     Panel(*window)->CopySelected();
@@ -475,10 +445,7 @@ void tst_AllFilesInWindow::copied()
 void tst_AllFilesInWindow::saved()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     const QString target = test.folder() + "documents/saved.log";
     WindowTest::whenShown<QFileDialog>([&](QFileDialog* chooser) {
         auto* name = chooser->findChild<QLineEdit*>("fileNameEdit");
@@ -496,10 +463,7 @@ void tst_AllFilesInWindow::saved()
 void tst_AllFilesInWindow::marks()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     const auto isMarked = [&](char const* message) {
         const QModelIndex line =
             View(*window)->model()->index(RowOf(*window, message), LogModel::TimeColumn);
@@ -524,10 +488,7 @@ void tst_AllFilesInWindow::marks()
 void tst_AllFilesInWindow::marksAfterRotation()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     View(*window)->GoToRow(RowOf(*window, "j"));
     QTest::keyClick(window.get(), Qt::Key_M, Qt::ControlModifier);
     QFile::rename(test.logFile() + ".2", test.logFile() + ".3");
@@ -550,10 +511,7 @@ void tst_AllFilesInWindow::marksAfterRotation()
 void tst_AllFilesInWindow::numbers()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     View(*window)->GoToRow(RowOf(*window, "c"));
     QVERIFY2(Panel(*window)->summary().startsWith("Line 4 of app.log.1"),
              qPrintable(Panel(*window)->summary()));
@@ -564,10 +522,7 @@ void tst_AllFilesInWindow::numbers()
 void tst_AllFilesInWindow::olderFilesComeAndGo()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     const QString log = test.logFile();
     QFile::remove(log + ".2");
     QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), QString("[02]restcd[03]ef[04]restgh[05]ij"),
@@ -597,10 +552,7 @@ void tst_AllFilesInWindow::follows()
 void tst_AllFilesInWindow::writesOver()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     const QByteArray before = TestFiles::read(test.logFile());
     const QByteArray newest = Run("2025-03-05", "ij", "Error");
     const QByteArray k = "2025-03-05 08:01:00.000 Trace k\n";
@@ -620,10 +572,7 @@ void tst_AllFilesInWindow::writesOver()
 void tst_AllFilesInWindow::rotates()
 {
     const WindowTest test;
-    WriteFiles(test.logFile());
-    const auto window = WindowTest::show();
-    ShowAll(*window);
-    QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), All, Patience);
+    const auto window = ShowAllOf(test);
     ClickRow(*window, HeadingRow(*window, "03-03"));
     const QString folded("[01]ab[02]restcd[03][04]restgh[05]ij");
     QTRY_COMPARE_WITH_TIMEOUT(Shown(*window), folded, Patience);
